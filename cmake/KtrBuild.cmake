@@ -1,0 +1,36 @@
+# Language, warnings and sanitizers shared by every target of the project.
+set(CMAKE_CXX_STANDARD 20)
+set(CMAKE_CXX_STANDARD_REQUIRED ON)
+set(CMAKE_CXX_EXTENSIONS OFF)
+set(CMAKE_POSITION_INDEPENDENT_CODE ON)
+set(CMAKE_LIBRARY_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/lib)
+set(CMAKE_RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
+
+if(NOT CMAKE_BUILD_TYPE)
+    set(CMAKE_BUILD_TYPE Release)
+endif()
+
+find_program(KTR_CCACHE ccache)
+if(KTR_CCACHE)
+    set(CMAKE_CXX_COMPILER_LAUNCHER ${KTR_CCACHE})
+endif()
+
+add_library(ktr_warnings INTERFACE)
+target_compile_options(ktr_warnings INTERFACE -Wall -Wextra -Wpedantic -Wconversion -Wshadow -Werror)
+
+if(KTR_SANITIZE)
+    list(JOIN KTR_SANITIZE "," ktr_sanitizers)
+    add_compile_options(-fsanitize=${ktr_sanitizers} -fno-sanitize-recover=all -fno-omit-frame-pointer)
+    add_link_options(-fsanitize=${ktr_sanitizers})
+endif()
+
+# ktr_sources(<out> <folder>...): the .cpp files directly in these folders, sorted.
+function(ktr_sources out)
+    set(found "")
+    foreach(folder IN LISTS ARGN)
+        file(GLOB here CONFIGURE_DEPENDS ${folder}/*.cpp)
+        list(APPEND found ${here})
+    endforeach()
+    list(SORT found)
+    set(${out} ${found} PARENT_SCOPE)
+endfunction()

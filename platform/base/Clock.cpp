@@ -1,0 +1,8 @@
+#include "platform/base/Clock.h"
+
+namespace ktr::platform {
+
+Clock::~Clock() = default;
+Calendar::~Calendar() = default;
+
+}  // namespace ktr::platform
