@@ -1,0 +1,13 @@
+#pragma once
+
+#include "platform/base/Object.h"
+
+namespace ktr::platform {
+
+/// Root of what the assistant's server sends. Kinds are told apart with dynamic_pointer_cast.
+class KTR_API AssistantObject : public Object {
+  public:
+    ~AssistantObject() override;
+};
+
+}  // namespace ktr::platform

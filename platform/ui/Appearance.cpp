@@ -1,0 +1,7 @@
+#include "platform/ui/Appearance.h"
+
+namespace ktr::platform {
+
+AssistantAppearance::~AssistantAppearance() = default;
+
+}  // namespace ktr::platform

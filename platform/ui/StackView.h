@@ -1,0 +1,39 @@
+#pragma once
+
+#include <memory>
+#include <vector>
+
+#include "platform/ui/View.h"
+
+namespace ktr::platform {
+
+/// Places its arranged subviews one under the other, each as wide as the stack and as high as it fits at that width;
+/// what height is left goes to the last one. Hidden ones take no room. A subview that is not arranged is neither laid
+/// out, painted, hit nor spoken. No solver: cost is linear in what changed. Main thread.
+class KTR_API StackView : public View {
+  public:
+    enum class Axis { Horizontal, Vertical };
+
+    Axis axis() const { return axis_; }
+    /// Vertical is the one arrangement there is; the axis is kept as it was set.
+    void setAxis(Axis axis) { axis_ = axis; }
+    const std::vector<std::shared_ptr<View>>& arrangedSubviews() const { return arranged_; }
+    void addArrangedSubview(const std::shared_ptr<View>& view);
+    /// A view that is arranged already is moved; the index counts without it. An index beyond the end appends.
+    void insertArrangedSubview(const std::shared_ptr<View>& view, std::size_t index);
+    /// Takes the view out of the arrangement; it stays a subview.
+    void removeArrangedSubview(const std::shared_ptr<View>& view);
+
+    const std::vector<std::shared_ptr<View>>& presentedSubviews() const override { return arranged_; }
+    void layoutSubviews() override;
+    Size systemLayoutSizeFitting(const Size& target, double horizontalPriority, double verticalPriority) override;
+
+  protected:
+    void subviewsChanged() override;
+
+  private:
+    Axis axis_ = Axis::Vertical;
+    std::vector<std::shared_ptr<View>> arranged_;
+};
+
+}  // namespace ktr::platform

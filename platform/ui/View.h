@@ -1,0 +1,161 @@
+#pragma once
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "platform/base/Geometry.h"
+#include "platform/base/Object.h"
+#include "platform/layout/LayoutAnchor.h"
+#include "platform/layout/LayoutTypes.h"
+#include "platform/ui/Accessibility.h"
+#include "platform/ui/Color.h"
+#include "platform/ui/TapGestureRecognizer.h"
+#include "platform/ui/Touch.h"
+
+namespace ktr::platform {
+
+class Canvas;
+class LayoutConstraint;
+class LayoutScope;
+class Window;
+
+/// A rectangle in the retained tree. Owns its subviews; knows its superview weakly. Frames are points, in the
+/// superview's coordinates, and are never rounded. Main thread.
+class KTR_API View : public Object {
+  public:
+    View();
+    ~View() override;
+    /// False when the view cannot be made; the base always can.
+    virtual bool initWithFrame(const Rect& frame);
+
+    // Geometry
+    const Rect& frame() const { return frame_; }
+    void setFrame(const Rect& frame);
+    Rect bounds() const { return {0.0, 0.0, frame_.width, frame_.height}; }
+    /// The view's rectangle in the coordinates of the root of its tree.
+    Rect frameInRoot() const;
+
+    // Tree
+    std::shared_ptr<View> superview() const { return superview_.lock(); }
+    const std::vector<std::shared_ptr<View>>& subviews() const { return subviews_; }
+    /// Appends; a view that has another superview leaves it first. Adding an ancestor or the view itself does nothing.
+    void addSubview(const std::shared_ptr<View>& view);
+    void removeFromSuperview();
+    /// Paints and hits this subview last and first.
+    void bringSubviewToFront(const std::shared_ptr<View>& view);
+    bool isDescendantOf(const View& other) const;
+    /// The window at the root of the tree, or none.
+    std::shared_ptr<Window> window() const;
+    /// The subviews that are laid out, painted, hit and spoken; all of them unless a subclass arranges some.
+    virtual const std::vector<std::shared_ptr<View>>& presentedSubviews() const { return subviews_; }
+
+    // Look
+    bool hidden() const { return hidden_; }
+    void setHidden(bool hidden);
+    const Color& backgroundColor() const { return backgroundColor_; }
+    void setBackgroundColor(const Color& color);
+    /// Painted under the background colour, as the view's layer has it.
+    const Color& layerBackgroundColor() const { return layerBackgroundColor_; }
+    void setLayerBackgroundColor(const Color& color);
+    /// Paints the view and what it presents; `dirty` in the view's own coordinates. Views outside `dirty` are skipped.
+    void paint(Canvas& canvas, const Rect& dirty) const;
+    /// Asks the window to paint the view again.
+    void setNeedsDisplay();
+
+    // Layout (see docs/layout.md)
+    /// True (the default): the frame is taken as it stands. False: constraints place the view.
+    bool translatesAutoresizingMaskIntoConstraints() const { return translatesAutoresizingMask_; }
+    void setTranslatesAutoresizingMaskIntoConstraints(bool translates);
+    void addConstraint(const std::shared_ptr<LayoutConstraint>& constraint);
+    void addConstraints(const std::vector<std::shared_ptr<LayoutConstraint>>& constraints);
+    void removeConstraint(const std::shared_ptr<LayoutConstraint>& constraint);
+    /// The constraints that this view holds, in order of adding.
+    std::vector<std::shared_ptr<LayoutConstraint>> constraints() const;
+    LayoutAnchor anchor(LayoutAttribute attribute);
+    LayoutAnchor topAnchor() { return anchor(LayoutAttribute::Top); }
+    LayoutAnchor bottomAnchor() { return anchor(LayoutAttribute::Bottom); }
+    LayoutAnchor leftAnchor() { return anchor(LayoutAttribute::Left); }
+    LayoutAnchor rightAnchor() { return anchor(LayoutAttribute::Right); }
+    LayoutAnchor leadingAnchor() { return anchor(LayoutAttribute::Leading); }
+    LayoutAnchor trailingAnchor() { return anchor(LayoutAttribute::Trailing); }
+    LayoutAnchor widthAnchor() { return anchor(LayoutAttribute::Width); }
+    LayoutAnchor heightAnchor() { return anchor(LayoutAttribute::Height); }
+    LayoutAnchor centerXAnchor() { return anchor(LayoutAttribute::CenterX); }
+    LayoutAnchor centerYAnchor() { return anchor(LayoutAttribute::CenterY); }
+    LayoutAnchor firstBaselineAnchor() { return anchor(LayoutAttribute::FirstBaseline); }
+    LayoutAnchor lastBaselineAnchor() { return anchor(LayoutAttribute::LastBaseline); }
+    /// Defaults: hugging 250, compression resistance 750.
+    double contentHuggingPriority(LayoutAxis axis) const;
+    void setContentHuggingPriority(double priority, LayoutAxis axis);
+    double contentCompressionResistancePriority(LayoutAxis axis) const;
+    void setContentCompressionResistancePriority(double priority, LayoutAxis axis);
+    /// The content's own size when it may be `widthLimit` wide; none in a dimension without one.
+    virtual IntrinsicSize intrinsicContentSize(double widthLimit) const;
+    /// True for content whose height follows from its width (wrapped text): it is measured again once its width is
+    /// known.
+    virtual bool intrinsicHeightDependsOnWidth() const { return false; }
+    /// From the view's top to its first line's baseline, and from its last line's baseline to its bottom, in points,
+    /// when the view is as high as its content; 0 and 0 without text (the baselines are then the bottom).
+    virtual BaselineOffsets baselineOffsets() const;
+    /// To be called when the content's size may have changed.
+    void invalidateIntrinsicContentSize();
+    void setNeedsLayout();
+    /// Lays out this view and what it presents, where something changed.
+    void layoutIfNeeded();
+    /// Places the subviews. The base solves the view's constraints, if it holds any.
+    virtual void layoutSubviews();
+    /// The size that the view's constraints and content give for a target, the target's width and height wished at
+    /// these priorities; subclasses that arrange without constraints answer for themselves.
+    virtual Size systemLayoutSizeFitting(const Size& target, double horizontalPriority, double verticalPriority);
+
+    // Touch
+    bool userInteractionEnabled() const { return userInteractionEnabled_; }
+    void setUserInteractionEnabled(bool enabled) { userInteractionEnabled_ = enabled; }
+    void addGestureRecognizer(std::shared_ptr<TapGestureRecognizer> recognizer);
+    const std::vector<std::shared_ptr<TapGestureRecognizer>>& gestureRecognizers() const { return recognizers_; }
+    /// The deepest view that takes touches at a point in this view's coordinates, or none.
+    virtual std::shared_ptr<View> hitTest(Point point);
+    /// The base passes touches on to the superview.
+    virtual void touchesBegan(const Touches& touches, const TouchEvent& event);
+    virtual void touchesEnded(const Touches& touches, const TouchEvent& event);
+    virtual void touchesCancelled(const Touches& touches, const TouchEvent& event);
+
+    // Accessibility
+    /// What a screen reader says instead of the shown text; none: the shown text.
+    const std::optional<std::string>& accessibilityLabel() const { return accessibilityLabel_; }
+    void setAccessibilityLabel(std::optional<std::string> label);
+    virtual AccessibilityRole accessibilityRole() const { return AccessibilityRole::None; }
+    /// What a screen reader says of the view itself; empty for nothing.
+    virtual std::string accessibilityText() const;
+
+  protected:
+    /// Draws the view's own content, over its background and under its subviews, in its own coordinates.
+    virtual void draw(Canvas& canvas) const;
+    /// Called after a subview came or went, before layout.
+    virtual void subviewsChanged() {}
+    friend class LayoutScope;
+
+  private:
+    void setNeedsDisplay(const Rect& rect);
+
+    Rect frame_;
+    std::weak_ptr<View> superview_;
+    std::vector<std::shared_ptr<View>> subviews_;
+    std::vector<std::shared_ptr<TapGestureRecognizer>> recognizers_;
+    Color backgroundColor_ = Color::clear();
+    Color layerBackgroundColor_ = Color::clear();
+    std::optional<std::string> accessibilityLabel_;
+    ContentPriorities contentPriorities_;
+    std::unique_ptr<LayoutScope> scope_;
+    bool hidden_ = false;
+    bool translatesAutoresizingMask_ = true;
+    bool userInteractionEnabled_ = true;
+    /// This view's subviews have to be placed again.
+    bool needsLayout_ = true;
+    /// Some view below has to be laid out, though this one need not.
+    bool descendantNeedsLayout_ = false;
+};
+
+}  // namespace ktr::platform
