@@ -1,0 +1,49 @@
+#include "tests/support/PlatformTest.h"
+
+namespace ktr::test {
+
+PlatformTest::PlatformTest() {
+    platform->logSink = log;
+    platform->mainLoop = time;
+    platform->clock = time;
+    platform->calendar = calendar;
+    platform->decimalNumbers = numbers;
+    platform->region = region;
+    platform->assistant = assistant;
+    platform->localization = localization;
+    platform->contactStore = contacts;
+    platform->contactFormatter = contactFormatter;
+    platform->assistantContacts = assistantContacts;
+    platform->monogramMakers = monogramMakers;
+    platform->avatarImages = avatars;
+    platform->phoneNumbers = phoneNumbers;
+    platform->telephony = telephony;
+    platform->geodesy = geodesy;
+    platform->distanceCalculators = distances;
+    platform->locationManagers = locationManagers;
+    platform->device = device;
+    platform->textEngine = textEngine;
+    platform->images = images;
+    platform->appearance = appearance;
+    platform::Platform::install(platform);
+}
+
+PlatformTest::~PlatformTest() {
+    platform::Platform::install(nullptr);
+}
+
+void PlatformTest::TearDown() {
+    for (const auto& text : log->texts(platform::LogLevel::Error)) {
+        EXPECT_TRUE(expectedErrors_.contains(text)) << "unexpected error line: " << text;
+    }
+}
+
+std::shared_ptr<platform::PlatformLocation> PlatformTest::position(double latitude, double longitude, double accuracy) {
+    platform::PlatformLocation::Fix fix;
+    fix.coordinate = {latitude, longitude};
+    fix.horizontalAccuracy = accuracy;
+    fix.timestamp = platform::Date{kNoon};
+    return std::make_shared<platform::PlatformLocation>(fix);
+}
+
+}  // namespace ktr::test
