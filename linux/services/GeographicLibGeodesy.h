@@ -1,0 +1,14 @@
+#pragma once
+
+#include "platform/location/Geodesy.h"
+
+namespace ktr::linux_ {
+
+/// Geodesics by GeographicLib (C. F. F. Karney, "Algorithms for geodesics", J. Geodesy 87, 2013): exact to nanometres.
+/// Any thread.
+class GeographicLibGeodesy : public platform::Geodesy {
+  public:
+    double distance(const platform::Coordinate& from, const platform::Coordinate& to) const override;
+};
+
+}  // namespace ktr::linux_

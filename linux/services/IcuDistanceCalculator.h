@@ -1,0 +1,40 @@
+#pragma once
+
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "platform/client/DistanceCalculator.h"
+#include "platform/location/Geodesy.h"
+
+namespace ktr::linux_ {
+
+/// Which units a person wants whatever the locale says.
+enum class UnitSystem { Metric = 0, ImperialUS = 1, ImperialUK = 2 };
+
+/// Words distances as road signs do, by ICU: unit and rounding follow the region's custom for roads (Unicode CLDR unit
+/// preferences, usage "road"), words and digits the language. A no-break space stands between number and unit. The
+/// host's text "DISTANCE_TEXT", where the localization has one, frames the result ("%@"). Main thread.
+class IcuDistanceCalculator : public platform::DistanceCalculator {
+  public:
+    /// `override` is what the person's preferences ask for; none: the units of the settings' locale.
+    IcuDistanceCalculator(Settings settings, std::optional<UnitSystem> override,
+                          std::shared_ptr<platform::Geodesy> geodesy);
+    ~IcuDistanceCalculator() override;
+
+    std::optional<std::string> localizedDistance(const platform::PlatformLocation& from,
+                                                 const platform::PlatformLocation& to) override;
+    long measurementSystem() const override;
+    /// None for a distance that is negative or not finite.
+    std::optional<std::string> localizedDistance(double metres) const;
+
+  private:
+    struct Formatter;
+
+    Settings settings_;
+    UnitSystem system_;
+    std::shared_ptr<platform::Geodesy> geodesy_;
+    std::unique_ptr<Formatter> formatter_;
+};
+
+}  // namespace ktr::linux_

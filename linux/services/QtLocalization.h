@@ -1,0 +1,47 @@
+#pragma once
+
+#include <filesystem>
+#include <map>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "platform/assistant/Localization.h"
+
+class QTranslator;
+
+namespace ktr::linux_ {
+
+/// Texts from Qt's compiled translations (.qm): a file a bundle and language, named "<prefix>_<language>.qm", a context
+/// a table, the key as source text. Everything is read when a bundle is added. Main thread.
+class QtLocalization : public platform::Localization {
+  public:
+    /// The table that is meant when none is named.
+    static constexpr const char* kDefaultTable = "Localizable";
+    /// The bundle of the host's own texts.
+    static constexpr const char* kHostBundle = "org.ktr.host";
+    /// The bundle of the plugin that comes with this project.
+    static constexpr const char* kSnippetsBundle = "org.ktr.snippets";
+
+    /// BCP 47, such as "de-AT": looked for as it is, then with its last subtag dropped, and so on, then in English.
+    explicit QtLocalization(std::string language);
+    ~QtLocalization() override;
+
+    /// Reads a bundle's texts from `folder`; false when not even its English file can be read. Adding a bundle again
+    /// replaces it.
+    bool addBundle(const std::string& bundleIdentifier, const std::filesystem::path& folder, const std::string& prefix);
+
+    std::string text(const std::string& key, const std::string& bundleIdentifier,
+                     const std::optional<std::string>& table = std::nullopt,
+                     const std::optional<std::string>& defaultValue = std::nullopt) const override;
+    std::string hostBundleIdentifier() const override { return kHostBundle; }
+
+  private:
+    using Translators = std::vector<std::unique_ptr<QTranslator>>;
+
+    std::string language_;
+    /// By bundle; the most fitting language first, English last.
+    std::map<std::string, Translators> bundles_;
+};
+
+}  // namespace ktr::linux_

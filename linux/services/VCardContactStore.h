@@ -1,0 +1,23 @@
+#pragma once
+
+#include <filesystem>
+#include <memory>
+#include <string>
+
+#include "linux/services/MemoryContactStore.h"
+
+namespace ktr::linux_ {
+
+/// The contacts of a folder of vCards, or of a file of many, read once into memory. Main thread.
+class VCardContactStore : public MemoryContactStore {
+  public:
+    /// Reads the cards; a card that cannot be read is passed over with a log line (error level) that names the file and
+    /// the card's line. The result is none, and the error says why, when the path is missing or nothing can be read.
+    static platform::ContactFetch<std::shared_ptr<VCardContactStore>> load(
+        const std::filesystem::path& path, std::shared_ptr<PhonenumberLibrary> phoneNumbers,
+        const std::string& homeCountryCode);
+
+    using MemoryContactStore::MemoryContactStore;
+};
+
+}  // namespace ktr::linux_
