@@ -15,8 +15,9 @@ class KTR_API MonogramMaker {
   public:
     virtual ~MonogramMaker();
     virtual void setFont(const Font& font) = 0;
-    /// Tints the monograms that are made from here on; none: the contact's own colour.
-    virtual void setTintColor(const std::optional<Color>& color) = 0;
+    /// A maker like this one whose monograms have this colour (none: the contact's own); this one stays as it is. Never
+    /// none.
+    virtual std::shared_ptr<MonogramMaker> makerTintedWith(const std::optional<Color>& color) = 0;
     /// Never none; of an empty contact the blank figure.
     virtual std::shared_ptr<Image> monogramForContact(const Contact& contact) = 0;
 };

@@ -67,10 +67,15 @@ class FakeMonogramMaker : public MonogramMaker {
   public:
     explicit FakeMonogramMaker(std::shared_ptr<FakeMonogramMakers::Call> call) : call_(std::move(call)) {}
     void setFont(const Font& font) override { call_->font = font; }
-    void setTintColor(const std::optional<Color>& color) override { call_->tint = color; }
+    std::shared_ptr<MonogramMaker> makerTintedWith(const std::optional<Color>& color) override {
+        call_->tintsAsked.push_back(color);
+        auto tinted = std::make_shared<FakeMonogramMakers::Call>(*call_);
+        tinted->tint = color;
+        return std::make_shared<FakeMonogramMaker>(tinted);
+    }
     std::shared_ptr<Image> monogramForContact(const Contact& contact) override {
         auto image = std::make_shared<FakeImage>();
-        image->name = "monogram " + contact.identifier;
+        image->name = (call_->tint ? "tinted monogram " : "monogram ") + contact.identifier;
         image->points = {call_->diameter, call_->diameter};
         return image;
     }

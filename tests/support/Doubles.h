@@ -114,6 +114,8 @@ struct FakeMonogramMakers : platform::MonogramMakerFactory {
         double diameter = 0.0;
         std::optional<platform::Font> font;
         std::optional<platform::Color> tint;
+        /// The colours that tinted makers were asked for.
+        std::vector<std::optional<platform::Color>> tintsAsked;
     };
     /// One entry a maker made.
     std::vector<std::shared_ptr<Call>> calls;

@@ -1,0 +1,22 @@
+#pragma once
+
+#include "platform/base/Date.h"
+#include "platform/base/Value.h"
+
+namespace ktr {
+
+/// The entry with the text that a row shows.
+inline constexpr const char* LabelStringKey = "LabelStringKey";
+/// The entry with the text that a screen reader speaks.
+inline constexpr const char* LabelAccessibilityStringKey = "LabelAccessibilityStringKey";
+
+/// Says how old a fix is. Stateless. Main thread.
+class KTRVAUIUtils {
+  public:
+    /// Exactly two strings, under the keys above. The age is the whole seconds between now and the date, either way: a
+    /// date in the future reads like one as far in the past. Up to 30 s "now"; up to 59 s the fixed number 30; then
+    /// minutes; from 60 to 119 minutes the fixed number 1; then hours.
+    static platform::Dictionary dictionaryWithAgeStringsForDate(const platform::Date& date);
+};
+
+}  // namespace ktr
