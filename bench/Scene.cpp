@@ -1,0 +1,131 @@
+#include "bench/Scene.h"
+
+#include <malloc.h>
+
+#include <QGuiApplication>
+#include <algorithm>
+#include <chrono>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <fstream>
+#include <functional>
+#include <string>
+
+namespace ktr::bench {
+
+namespace {
+
+using Clock = std::chrono::steady_clock;
+
+double milliseconds(Clock::duration duration) { return std::chrono::duration<double, std::milli>(duration).count(); }
+
+/// The median time of as many calls as fit into the budget, five at least.
+double median(double budget, const std::function<void()>& work, const std::function<void()>& after = [] {}) {
+    std::vector<double> times;
+    const auto begin = Clock::now();
+    while (times.size() < 5 || milliseconds(Clock::now() - begin) < budget) {
+        const auto start = Clock::now();
+        work();
+        times.push_back(milliseconds(Clock::now() - start));
+        after();
+    }
+    std::nth_element(times.begin(), times.begin() + static_cast<std::ptrdiff_t>(times.size() / 2), times.end());
+    return times[times.size() / 2];
+}
+
+/// Resident memory, kilobytes (Linux, /proc).
+long residentKilobytes() {
+    std::ifstream status("/proc/self/status");
+    for (std::string line; std::getline(status, line);) {
+        if (line.rfind("VmRSS:", 0) == 0) {
+            return std::atol(line.c_str() + 6);
+        }
+    }
+    return 0;
+}
+
+long heapKilobytes() { return static_cast<long>(mallinfo2().uordblks / 1024); }
+
+QImage imageFor(const Scene& scene, const RowsFile& file) {
+    return QImage(static_cast<int>(file.width * file.scale), static_cast<int>(scene.height() * file.scale),
+                  QImage::Format_ARGB32_Premultiplied);
+}
+
+int writePicture(Scene& scene, const RowsFile& file, const char* path) {
+    scene.build(file, file.friends.size(), file.width);
+    QImage image = imageFor(scene, file);
+    scene.paint(image, file.scale);
+    if (!image.save(QString::fromLocal8Bit(path), "PNG")) {
+        std::fprintf(stderr, "%s: cannot be written\n", path);
+        return 1;
+    }
+    return 0;
+}
+
+int measure(Scene& scene, const RowsFile& file, double budget) {
+    const std::size_t count = file.friends.size();
+    scene.build(file, std::min<std::size_t>(count, 1), file.width);
+    scene.clear();
+    const long residentBefore = residentKilobytes();
+    const long heapBefore = heapKilobytes();
+    scene.build(file, count, file.width);
+    const long residentAfter = residentKilobytes();
+    const long heapAfter = heapKilobytes();
+    scene.clear();
+
+    const double build = median(
+        budget, [&] { scene.build(file, count, file.width); }, [&] { scene.clear(); });
+    scene.build(file, count, file.width);
+    bool next = false;
+    const double update = median(budget, [&] { scene.updateAll(next = !next); });
+    scene.updateAll(false);
+    const double same = median(budget, [&] { scene.updateAll(false); });
+    const double one = median(budget, [&] { scene.updateOne(count / 2, next = !next); });
+    double width = file.width;
+    const double resize = median(budget, [&] {
+        width = width < file.width ? file.width : file.width - 40.0;
+        scene.resize(width);
+    });
+    scene.resize(file.width);
+    QImage image = imageFor(scene, file);
+    const double paint = median(budget, [&] { scene.paint(image, file.scale); });
+    std::printf(
+        "RESULT build_ms=%.4f update_ms=%.4f update1_ms=%.4f resize_ms=%.4f paint_ms=%.4f rss_before_kb=%ld "
+        "rss_after_kb=%ld heap_before_kb=%ld heap_after_kb=%ld unchanged_ms=%.4f\n",
+        build, update, one, resize, paint, residentBefore, residentAfter, heapBefore, heapAfter, same);
+    return 0;
+}
+
+}  // namespace
+
+int runBenchProgram(int argc, char** argv, Scene& scene) {
+    const char* json = nullptr;
+    const char* png = nullptr;
+    const char* budget = nullptr;
+    for (int i = 1; i + 1 < argc; i += 2) {
+        if (std::strcmp(argv[i], "--json") == 0) {
+            json = argv[i + 1];
+        } else if (std::strcmp(argv[i], "--png") == 0) {
+            png = argv[i + 1];
+        } else if (std::strcmp(argv[i], "--bench") == 0) {
+            budget = argv[i + 1];
+        }
+    }
+    if (json == nullptr || (png == nullptr) == (budget == nullptr)) {
+        std::fprintf(stderr,
+                     "usage: %s --json FILE --png FILE     draws the rows of a file\n"
+                     "       %s --json FILE --bench MS     measures, about MS milliseconds a figure, prints one line\n",
+                     argv[0], argv[0]);
+        return 2;
+    }
+    qputenv("QT_QPA_PLATFORM", "offscreen");
+    const QGuiApplication application(argc, argv);
+    const auto file = readRowsFile(json);
+    if (!file || file->friends.empty()) {
+        return 1;
+    }
+    return png != nullptr ? writePicture(scene, *file, png) : measure(scene, *file, std::atof(budget));
+}
+
+}  // namespace ktr::bench
