@@ -1,0 +1,105 @@
+#include "app/AssistantObjectReader.h"
+
+#include "app/Scenario.h"
+#include "app/Words.h"
+
+namespace ktr::app {
+
+using namespace platform;
+
+namespace {
+
+/// Parts of a snippet may leave their kind out, since their place tells it; a wrong one is a slip.
+void expectKind(FieldReader& fields, const std::string& expected) {
+    const auto kind = fields.string("kind");
+    if (kind && *kind != expected) {
+        fields.complain("kind", "expected " + inQuotes(expected) + ", found " + inQuotes(*kind));
+    }
+}
+
+}  // namespace
+
+std::shared_ptr<AssistantObject> AssistantObjectReader::readSnippet(FieldReader& fields, std::string& kind) const {
+    const auto named = fields.string("kind");
+    if (!named) {
+        fields.complain("", "expected a member \"kind\" such as \"VAKtrLocationSnippet\"");
+        return nullptr;
+    }
+    kind = *named;
+    if (kind == "VAKtrLocationSnippet") {
+        return readLocationSnippet(fields);
+    }
+    return std::make_shared<UnknownAssistantObject>(kind);
+}
+
+std::shared_ptr<VAKtrLocationSnippet> AssistantObjectReader::readLocationSnippet(FieldReader& fields) const {
+    auto snippet = std::make_shared<VAKtrLocationSnippet>();
+    if (auto context = fields.string("searchContext")) {
+        snippet->searchContext = Url::fromText(*context);
+        if (!snippet->searchContext) {
+            fields.complain("searchContext", "expected a URL, without white space");
+        }
+    }
+    snippet->proximity = fields.string("proximity");
+    auto locations = std::make_shared<LocationList>();
+    fields.objects("locations", [&](FieldReader& location) { locations->push_back(readLocation(location)); });
+    snippet->locations = std::move(locations);
+    return snippet;
+}
+
+std::shared_ptr<VAKtrLocation> AssistantObjectReader::readLocation(FieldReader& fields) const {
+    expectKind(fields, "VAKtrLocation");
+    auto location = std::make_shared<VAKtrLocation>();
+    fields.object("friend", [&](FieldReader& person) { location->friend_ = readPersonAttribute(person); });
+    location->latitude = fields.number("latitude");
+    location->longitude = fields.number("longitude");
+    location->accuracy = fields.number("accuracy");
+    location->label = fields.string("label");
+    location->street = fields.string("street");
+    location->distance = fields.number("distance");
+    location->city = fields.string("city");
+    location->stateCode = fields.string("stateCode");
+    location->locationDate = readLocationDate(fields);
+    return location;
+}
+
+std::optional<double> AssistantObjectReader::readLocationDate(FieldReader& fields) const {
+    const auto date = fields.number("locationDate");
+    const auto age = fields.number("ageSeconds");
+    if (date && age) {
+        fields.complain("ageSeconds", "expected either locationDate or ageSeconds, found both");
+    }
+    return age ? std::optional(now_.secondsSinceReferenceDate - *age) : date;
+}
+
+std::shared_ptr<VAPersonAttribute> AssistantObjectReader::readPersonAttribute(FieldReader& fields) const {
+    expectKind(fields, "VAPersonAttribute");
+    auto attribute = std::make_shared<VAPersonAttribute>();
+    attribute->data = fields.string("data");
+    fields.object("object", [&](FieldReader& person) { attribute->object = readPerson(person); });
+    return attribute;
+}
+
+std::shared_ptr<VAPerson> AssistantObjectReader::readPerson(FieldReader& fields) const {
+    expectKind(fields, "VAPerson");
+    auto person = std::make_shared<VAPerson>();
+    person->fullName = fields.string("fullName");
+    person->firstName = fields.string("firstName");
+    person->lastName = fields.string("lastName");
+    person->identifier = fields.string("identifier");
+    fields.objects("emails", [&](FieldReader& email) {
+        expectKind(email, "VAEmail");
+        auto object = std::make_shared<VAEmail>();
+        object->emailAddress = email.string("emailAddress");
+        person->emails.push_back(std::move(object));
+    });
+    fields.objects("phones", [&](FieldReader& phone) {
+        expectKind(phone, "VAPhone");
+        auto object = std::make_shared<VAPhone>();
+        object->number = phone.string("number");
+        person->phones.push_back(std::move(object));
+    });
+    return person;
+}
+
+}  // namespace ktr::app

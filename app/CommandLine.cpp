@@ -1,0 +1,205 @@
+#include "app/CommandLine.h"
+
+#include <CLI/CLI.hpp>
+#include <algorithm>
+#include <charconv>
+#include <cmath>
+
+#include "app/Scenario.h"
+#include "app/Words.h"
+
+#ifndef KTR_VERSION
+#error "KTR_VERSION is given by the build"
+#endif
+
+namespace ktr::app {
+
+namespace {
+
+constexpr double kLongestRun = 7.0 * 86400.0;
+
+const char* const kFooter = R"(Exit status:
+  0  done
+  1  something could not be done: a file not written, contacts not read, no display
+  2  wrong use of the command line
+  3  a scenario cannot be read; one line says file, line, column, place and what was expected
+  4  an answer cannot be drawn: its kind, the text size, or a picture too large
+  5  the plugin cannot be loaded
+
+Environment:
+  KTR_PLUGIN       the plugin's library, when --plugin is not given
+  KTR_LOG          debug, info, default, error (as it comes) or off: which log lines are written
+  KTR_LOG_PRIVATE  show: names, handles, positions and URLs stand in log lines as they are)";
+
+const char* const kShowExamples = R"(Examples:
+  ktr show dinner.json
+  ktr show dinner.json show-all.json --dark
+  ktr show dinner.json --print-urls
+
+In the window: Tab and Shift+Tab walk the rows, Enter opens one, the arrow keys, Page Up, Page Down, Home and End scroll,
+Ctrl+Q closes.)";
+
+const char* const kRenderExamples = R"(Examples:
+  ktr render dinner.json -o dinner.png
+  ktr render dinner.json -o dinner.png --scale 2 --dark
+  ktr render dinner.json -o wide.pdf --width 1100
+  ktr render dinner.json -o later.svg --at +90 --language de
+
+A picture higher than 32,000 pixels is written in pieces: FILE-1.png, FILE-2.png, ...)";
+
+const char* const kDescribeExamples = R"(Examples:
+  ktr describe dinner.json
+  ktr describe dinner.json --language ar)";
+
+/// Texts as they were given; read into Options once the parser is content.
+struct Words {
+    std::string language, textSize, idiom, at;
+    bool dark = false;
+    bool light = false;
+};
+
+struct Parser {
+    CLI::App app{"Draws the answers to \"where is Ann?\" as an assistant's conversation.", "ktr"};
+    CLI::App* show = nullptr;
+    CLI::App* render = nullptr;
+    CLI::App* describe = nullptr;
+    Options options;
+    Words words;
+
+    Parser() {
+        app.set_version_flag("--version", std::string("ktr ") + KTR_VERSION);
+        app.require_subcommand(1);
+        app.footer(kFooter);
+        show = app.add_subcommand("show", "Opens a window on the conversation that scenarios tell");
+        render = app.add_subcommand("render", "Draws a scenario to a PNG, SVG or PDF file, without a display");
+        describe = app.add_subcommand("describe", "Prints what a screen reader would say, in reading order");
+        show->add_option("scenarios", options.scenarios, "Scenario files; one turn of the conversation each")
+            ->required()
+            ->type_name("SCENARIO");
+        show->add_flag("--print-urls", options.printUrls, "Print the URL of a tap instead of opening it");
+        for (CLI::App* command : {render, describe}) {
+            command->add_option("scenario", options.scenarios, "Scenario file")
+                ->required()
+                ->expected(1)
+                ->type_name("SCENARIO");
+            command
+                ->add_option("--at", words.at,
+                             "Moment: 2026-05-16T17:42:00+02:00, or +90 for 90 seconds after the start")
+                ->type_name("TIME");
+        }
+        render->add_option("-o,--output", options.output, "Picture to write")
+            ->required()
+            ->type_name("FILE.png|.svg|.pdf");
+        render->add_option("--scale", options.scale, "Pixels a point (1)")
+            ->type_name("NUMBER")
+            ->check(CLI::Range(0.25, 8.0));
+        for (CLI::App* command : {show, render, describe}) {
+            addCommon(*command);
+        }
+        show->footer(kShowExamples);
+        render->footer(kRenderExamples);
+        describe->footer(kDescribeExamples);
+    }
+
+    void addCommon(CLI::App& command) {
+        command.add_option("--width", options.width, "Width in points (400; 1100 on a tablet, desktop or display)")
+            ->type_name("POINTS")
+            ->check(CLI::Range(200.0, 8000.0));
+        command.add_option("--language", words.language, "Language of the texts, such as en, de, ar")->type_name("TAG");
+        command.add_option("--text-size", words.textSize, "XS, S, M, L, XL, XXL or XXXL")->type_name("SIZE");
+        command.add_option("--idiom", words.idiom, "phone, tablet, desktop or display")->type_name("IDIOM");
+        auto* dark = command.add_flag("--dark", words.dark, "Dark colours");
+        command.add_flag("--light", words.light, "Light colours")->excludes(dark);
+        command.add_flag("--high-contrast", options.highContrast, "Black and white, edges drawn");
+        command.add_option("--plugin", options.plugin, "The plugin's library")->type_name("PATH");
+    }
+};
+
+/// "+90" or "+90.5": seconds.
+std::optional<double> secondsOf(const std::string& text) {
+    double seconds = 0.0;
+    if (text.size() < 2 || text.front() != '+') {
+        return std::nullopt;
+    }
+    const char* end = text.data() + text.size();
+    const auto [stop, error] = std::from_chars(text.data() + 1, end, seconds, std::chars_format::fixed);
+    const bool whole = error == std::errc() && stop == end;
+    return whole && std::isfinite(seconds) && seconds >= 0.0 && seconds <= kLongestRun ? std::optional(seconds)
+                                                                                       : std::nullopt;
+}
+
+std::string wrong(const std::string& option, const std::string& expected, const std::string& found) {
+    return option + ": expected " + expected + ", found " + inQuotes(found);
+}
+
+/// Fills in what the words say; the complaint about the first wrong one, or an empty text.
+std::string readWords(const Words& words, Options& options) {
+    if (!words.language.empty()) {
+        if (!isLanguageTag(words.language)) {
+            return wrong("--language", "a language such as en-GB", words.language);
+        }
+        options.language = words.language;
+    }
+    if (!words.textSize.empty()) {
+        options.textSize = contentSizeCategoryNamed(words.textSize);
+        if (!options.textSize) {
+            return wrong("--text-size", "one of XS, S, M, L, XL, XXL, XXXL", words.textSize);
+        }
+    }
+    if (!words.idiom.empty()) {
+        options.idiom = idiomNamed(words.idiom);
+        if (!options.idiom) {
+            return wrong("--idiom", "one of phone, tablet, desktop, display", words.idiom);
+        }
+    }
+    if (!words.at.empty()) {
+        options.at = parseIsoTime(words.at);
+        options.atSeconds = secondsOf(words.at);
+        if (!options.at && !options.atSeconds) {
+            return wrong("--at", "a time such as 2026-05-16T17:42:00+02:00, or +90 for seconds up to a week", words.at);
+        }
+    }
+    if (words.dark || words.light) {
+        options.dark = words.dark;
+    }
+    return "";
+}
+
+bool endsWith(const std::string& text, const std::string& end) {
+    return text.size() > end.size() && text.compare(text.size() - end.size(), end.size(), end) == 0;
+}
+
+}  // namespace
+
+std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::string> arguments) {
+    Parser parser;
+    // The parser takes the arguments from the back.
+    std::reverse(arguments.begin(), arguments.end());
+    const auto misuse = [](const std::string& line) {
+        return Ending{ExitCode::Usage, "ktr: " + line + "\nSee ktr --help.\n"};
+    };
+    try {
+        parser.app.parse(std::move(arguments));
+    } catch (const CLI::CallForVersion& version) {
+        return Ending{ExitCode::Ok, std::string(version.what()) + "\n"};
+    } catch (const CLI::CallForHelp&) {
+        const auto asked = parser.app.get_subcommands();
+        return Ending{ExitCode::Ok, (asked.empty() ? &parser.app : asked.front())->help() + "\n"};
+    } catch (const CLI::ParseError& error) {
+        return misuse(error.what());
+    }
+    parser.options.command = parser.show->parsed()     ? Options::Command::Show
+                             : parser.render->parsed() ? Options::Command::Render
+                                                       : Options::Command::Describe;
+    if (const std::string complaint = readWords(parser.words, parser.options); !complaint.empty()) {
+        return misuse(complaint);
+    }
+    const std::string& output = parser.options.output;
+    if (parser.render->parsed() && !endsWith(output, ".png") && !endsWith(output, ".svg") &&
+        !endsWith(output, ".pdf")) {
+        return misuse(wrong("--output", "a file name that ends in .png, .svg or .pdf", output));
+    }
+    return parser.options;
+}
+
+}  // namespace ktr::app

@@ -1,0 +1,195 @@
+#include "app/ScenarioReader.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+#include <limits>
+
+#include "app/AssistantObjectReader.h"
+#include "app/FieldReader.h"
+#include "app/Words.h"
+
+namespace ktr::app {
+
+namespace {
+
+namespace fs = std::filesystem;
+using platform::Value;
+
+LocalizedText readLocalizedText(FieldReader& fields, const std::string& name) {
+    const Value* value = fields.member(name);
+    if (value == nullptr) {
+        return {};
+    }
+    if (const std::string* text = value->string()) {
+        return LocalizedText(*text);
+    }
+    LocalizedText texts;
+    const platform::Dictionary* languages = value->dictionary();
+    if (languages == nullptr) {
+        fields.complain(name, "expected a string, or an object of one text a language, found " + nameOfKind(*value));
+        return texts;
+    }
+    for (const auto& [language, text] : *languages) {
+        const JsonPath path = fields.path().member(name).member(language);
+        if (!isLanguageTag(language)) {
+            fields.complainAt(path, "expected a language such as \"en\" or \"pt-BR\"");
+        } else if (text.string() == nullptr) {
+            fields.complainAt(path, "expected a string, found " + nameOfKind(text));
+        } else {
+            texts.add(language, *text.string());
+        }
+    }
+    return texts;
+}
+
+/// A word of a closed list; `parse` gives none for any other.
+template <class Parse>
+auto readWord(FieldReader& fields, const std::string& name, const std::string& expected, Parse parse)
+    -> decltype(parse(std::string())) {
+    const auto text = fields.string(name);
+    if (!text) {
+        return std::nullopt;
+    }
+    auto word = parse(*text);
+    if (!word) {
+        fields.complain(name, "expected " + expected + ", found " + inQuotes(*text));
+    }
+    return word;
+}
+
+std::optional<std::string> languageTag(const std::string& text) {
+    return isLanguageTag(text) ? std::optional(text) : std::nullopt;
+}
+
+std::optional<std::string> countryCode(std::string text) {
+    if (text.size() != 2) {
+        return std::nullopt;
+    }
+    for (char& c : text) {
+        if (c >= 'a' && c <= 'z') {
+            c = static_cast<char>(c - 'a' + 'A');
+        }
+        if (c < 'A' || c > 'Z') {
+            return std::nullopt;
+        }
+    }
+    return text;
+}
+
+double readNeeded(FieldReader& fields, const std::string& name, double least, double most,
+                  std::optional<double> otherwise) {
+    const auto number = fields.number(name);
+    if (!number) {
+        if (!otherwise && fields.member(name) == nullptr) {
+            fields.complain("", "expected a member \"" + name + "\"");
+        }
+        return otherwise.value_or(0.0);
+    }
+    if (!(*number >= least && *number <= most)) {
+        fields.complain(name, most == std::numeric_limits<double>::infinity()
+                                  ? "expected a number of 0 or more"
+                                  : "expected a number from " + std::to_string(static_cast<int>(least)) + " to " +
+                                        std::to_string(static_cast<int>(most)));
+    }
+    return *number;
+}
+
+std::vector<ScenarioPosition> readPositions(FieldReader& fields) {
+    constexpr double kNoLimit = std::numeric_limits<double>::infinity();
+    std::vector<ScenarioPosition> positions;
+    fields.objects("positions", [&](FieldReader& entry) {
+        ScenarioPosition position;
+        position.at = readNeeded(entry, "at", 0.0, kNoLimit, 0.0);
+        position.coordinate.latitude = readNeeded(entry, "latitude", -90.0, 90.0, std::nullopt);
+        position.coordinate.longitude = readNeeded(entry, "longitude", -180.0, 180.0, std::nullopt);
+        position.accuracy = readNeeded(entry, "accuracy", 0.0, kNoLimit, position.accuracy);
+        if (!positions.empty() && position.at < positions.back().at) {
+            entry.complain("at", "expected the positions in the order of their time");
+        }
+        positions.push_back(position);
+    });
+    return positions;
+}
+
+std::vector<std::string> resolved(std::vector<std::string> paths, const std::string& file) {
+    const fs::path folder = fs::path(file).parent_path();
+    std::transform(paths.begin(), paths.end(), paths.begin(),
+                   [&](const std::string& path) { return (folder / fs::path(path)).lexically_normal().string(); });
+    return paths;
+}
+
+void readScenario(FieldReader& fields, platform::Date now, Scenario& scenario) {
+    scenario.clock = readWord(fields, "clock", "a date and time such as \"2026-05-16T17:42:00+02:00\"", parseIsoTime);
+    scenario.question = readLocalizedText(fields, "question");
+    scenario.sentence = readLocalizedText(fields, "sentence");
+    scenario.contacts = resolved(fields.stringOrStrings("contacts"), scenario.file);
+    scenario.language = readWord(fields, "language", "a language such as \"en-GB\"", languageTag);
+    scenario.region = readWord(fields, "region", "a locale such as \"en-GB\"", languageTag);
+    scenario.country = readWord(fields, "country", "a country of two letters such as \"GB\"", countryCode);
+    scenario.textSize = readWord(fields, "textSize", "one of XS, S, M, L, XL, XXL, XXXL, AX1, AX2, AX3, AX4, AX5",
+                                 contentSizeCategoryNamed);
+    scenario.idiom = readWord(fields, "idiom", "one of phone, tablet, desktop, display", idiomNamed);
+    scenario.positions = readPositions(fields);
+    scenario.dark = fields.boolean("dark");
+    const AssistantObjectReader objects(scenario.clock ? scenario.clock->date : now);
+    const bool present = fields.object(
+        "snippet", [&](FieldReader& snippet) { scenario.snippet = objects.readSnippet(snippet, scenario.kind); });
+    if (!present) {
+        fields.complain("", "expected a member \"snippet\", the assistant's answer");
+    }
+}
+
+}  // namespace
+
+std::variant<Scenario, ScenarioError> ScenarioReader::readText(std::string_view text, const std::string& file) const {
+    auto read = JsonReader::read(text);
+    if (const auto* error = std::get_if<JsonError>(&read)) {
+        return ScenarioError{file, error->position, error->path.text(), error->message};
+    }
+    const Value& root = std::get<Value>(read);
+    if (root.dictionary() == nullptr) {
+        return ScenarioError{file, JsonReader::locate(text, {}), "$", "expected an object, found " + nameOfKind(root)};
+    }
+    Complaints complaints;
+    FieldReader fields(*root.dictionary(), {}, complaints);
+    Scenario scenario;
+    scenario.file = file;
+    readScenario(fields, now_, scenario);
+    if (complaints) {
+        return ScenarioError{file, JsonReader::locate(text, complaints->path), complaints->path.text(),
+                             complaints->message};
+    }
+    return scenario;
+}
+
+std::variant<Scenario, ScenarioError> ScenarioReader::readFile(const std::string& file) const {
+    std::error_code failure;
+    const fs::file_status status = fs::status(file, failure);
+    if (status.type() == fs::file_type::not_found) {
+        return ScenarioError{file, std::nullopt, "", "there is no such file"};
+    }
+    if (fs::is_directory(status)) {
+        return ScenarioError{file, std::nullopt, "", "this is a folder, not a scenario file"};
+    }
+    std::ifstream stream(file, std::ios::binary);
+    if (!stream) {
+        return ScenarioError{file, std::nullopt, "", "the file cannot be opened"};
+    }
+    // One byte more than allowed tells too large from just fitting, also for a pipe whose size nobody knows.
+    std::string text;
+    std::string block(1u << 16, '\0');
+    while (text.size() <= kLargestJson &&
+           (stream.read(block.data(), static_cast<std::streamsize>(block.size())) || stream.gcount() > 0)) {
+        text.append(block.data(), static_cast<std::size_t>(stream.gcount()));
+    }
+    if (stream.bad()) {
+        return ScenarioError{file, std::nullopt, "", "the file cannot be read"};
+    }
+    if (text.size() > kLargestJson) {
+        return ScenarioError{file, std::nullopt, "", "the file is larger than 64 MiB"};
+    }
+    return readText(text, file);
+}
+
+}  // namespace ktr::app

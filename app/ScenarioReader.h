@@ -1,0 +1,27 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <string_view>
+#include <variant>
+
+#include "app/Scenario.h"
+#include "app/ScenarioError.h"
+
+namespace ktr::app {
+
+/// Reads scenario files. Main thread.
+class ScenarioReader {
+  public:
+    /// `now` stands for the scenario's own clock where the file has none; ages in seconds count back from it.
+    explicit ScenarioReader(platform::Date now) : now_(now) {}
+
+    std::variant<Scenario, ScenarioError> readFile(const std::string& file) const;
+    /// `file` names the text in messages, and its folder is what relative paths start from.
+    std::variant<Scenario, ScenarioError> readText(std::string_view text, const std::string& file) const;
+
+  private:
+    platform::Date now_;
+};
+
+}  // namespace ktr::app
