@@ -247,7 +247,9 @@ class Pass {
     bool fail(simdjson::error_code error) {
         const char* here = nullptr;
         const bool known = document_->current_location().get(here) == simdjson::SUCCESS;
-        return failAt(known ? offsetOf(here) : text_.size(), wordsFor(error));
+        const std::size_t offset = known ? offsetOf(here) : text_.size();
+        const bool ended = text_.find_first_not_of(" \t\r\n", offset) == std::string_view::npos;
+        return failAt(offset, ended ? "the text ends before its arrays and objects are closed" : wordsFor(error));
     }
     bool failAt(std::size_t offset, std::string message) {
         error_ = JsonError{positionAt(text_, offset), path_, std::move(message)};

@@ -143,6 +143,10 @@ void readScenario(FieldReader& fields, platform::Date now, Scenario& scenario) {
 }  // namespace
 
 std::variant<Scenario, ScenarioError> ScenarioReader::readText(std::string_view text, const std::string& file) const {
+    // Some editors begin UTF-8 with a byte-order mark; RFC 8259 lets readers ignore it.
+    if (text.starts_with("\xEF\xBB\xBF")) {
+        text.remove_prefix(3);
+    }
     auto read = JsonReader::read(text);
     if (const auto* error = std::get_if<JsonError>(&read)) {
         return ScenarioError{file, error->position, error->path.text(), error->message};
