@@ -93,6 +93,22 @@ void View::removeFromSuperview() {
     parent->setNeedsLayout();
 }
 
+void View::removeSubviews(const std::vector<std::shared_ptr<View>>& views) {
+    bool removed = false;
+    for (const auto& view : views) {
+        if (view && view->superview().get() == this) {
+            view->setNeedsDisplay();
+            view->superview_.reset();
+            removed = true;
+        }
+    }
+    if (removed) {
+        std::erase_if(subviews_, [](const auto& view) { return view->superview_.expired(); });
+        subviewsChanged();
+        setNeedsLayout();
+    }
+}
+
 void View::bringSubviewToFront(const std::shared_ptr<View>& view) {
     const auto found = std::find(subviews_.begin(), subviews_.end(), view);
     if (found != subviews_.end()) {

@@ -43,6 +43,8 @@ class KTR_API View : public Object {
     /// Appends; a view that has another superview leaves it first. Adding an ancestor or the view itself does nothing.
     void addSubview(const std::shared_ptr<View>& view);
     void removeFromSuperview();
+    /// Removes several subviews at once, at a cost linear in the number of subviews; others than subviews are ignored.
+    void removeSubviews(const std::vector<std::shared_ptr<View>>& views);
     /// Paints and hits this subview last and first.
     void bringSubviewToFront(const std::shared_ptr<View>& view);
     bool isDescendantOf(const View& other) const;

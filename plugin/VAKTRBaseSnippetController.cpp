@@ -1,0 +1,191 @@
+#include "plugin/VAKTRBaseSnippetController.h"
+
+#include <utility>
+
+#include "model/KTRVATheme.h"
+#include "model/LogCategory.h"
+#include "model/PluginBundle.h"
+#include "platform/base/MainLoop.h"
+#include "platform/base/Platform.h"
+#include "platform/layout/LayoutConstraint.h"
+#include "platform/map/MapLocationManager.h"
+#include "service/ContextValues.h"
+#include "service/KTRVAUtils.h"
+
+namespace ktr {
+
+using platform::Platform;
+using platform::StackView;
+
+namespace {
+
+constexpr double kMillisecondsASecond = 1000.0;
+
+}  // namespace
+
+bool VAKTRBaseSnippetController::initWithCueObject(const std::shared_ptr<platform::VASnippet>& snippet) {
+    if (!init()) {
+        return false;
+    }
+    LogCategory_Unspecified()->line("snippet: %@", snippet);
+    if (const auto located = std::dynamic_pointer_cast<platform::VAKtrLocationSnippet>(snippet)) {
+        setLocations(located->locations);
+        proximity_ = located->proximity;
+    }
+    if (snippet && snippet->searchContext) {
+        LogCategory_Unspecified()->line("searchContext: %@", *snippet->searchContext);
+        contextDict_ = KTRVAUtils::contextDictionaryForURL(*snippet->searchContext);
+        clientId_ = ContextValues::text(*contextDict_, "clientId");
+    }
+    setDefaultViewInsets({});
+    return true;
+}
+
+void VAKTRBaseSnippetController::setDelegate(const std::shared_ptr<platform::SnippetHostDelegate>& delegate) {
+    HostSnippetViewController::setDelegate(delegate);
+    if (!delegate) {
+        return;
+    }
+    const auto bundle = delegate->effectiveBundleForLocation(*this);
+    if (const auto maps = platform::shared<platform::MapLocationManager>()) {
+        maps->setEffectiveBundle(bundle);
+    }
+    refreshController_ = platform::create<RefreshController>(&RefreshController::initWithBundle, bundle);
+    if (contextDict_) {
+        refreshInterval_ = ContextValues::number(*contextDict_, "minCallbackIntervalInMS") / kMillisecondsASecond;
+        timeoutInterval_ = ContextValues::number(*contextDict_, "callbackTimeoutIntervalInMS") / kMillisecondsASecond;
+    }
+}
+
+void VAKTRBaseSnippetController::loadView() {
+    containerView_ = platform::create<StackView>(&StackView::initWithFrame, platform::Rect{});
+    containerView_->setTranslatesAutoresizingMaskIntoConstraints(false);
+    containerView_->setAxis(StackView::Axis::Vertical);
+    setView(containerView_);
+}
+
+void VAKTRBaseSnippetController::updateViewConstraints() {
+    const auto pinned = view();
+    if (const auto parent = pinned ? pinned->superview() : nullptr) {
+        using platform::LayoutAttribute;
+        for (const auto edge :
+             {LayoutAttribute::Top, LayoutAttribute::Left, LayoutAttribute::Right, LayoutAttribute::Bottom}) {
+            pinned->anchor(edge).constraintEqualTo(parent->anchor(edge))->setActive(true);
+        }
+    }
+    HostSnippetViewController::updateViewConstraints();
+}
+
+void VAKTRBaseSnippetController::viewWillAppear(bool animated) {
+    HostSnippetViewController::viewWillAppear(animated);
+    startReloadTimer();
+}
+
+void VAKTRBaseSnippetController::startReloadTimer() {
+    const auto installed = Platform::installed();
+    if (!installed || !installed->mainLoop) {
+        return;
+    }
+    // A timer that was held before goes on: only what is held when the view disappears is stopped. It does not keep
+    // the controller, and stops itself at the first firing after the controller is gone.
+    const auto itself = std::make_shared<std::weak_ptr<platform::Timer>>();
+    reloadTimer_ = installed->mainLoop->schedule(kReloadInterval, true, [target = platform::weak(this), itself] {
+        if (const auto self = target.lock()) {
+            self->reloadData();
+        } else if (const auto timer = itself->lock()) {
+            timer->invalidate();
+        }
+    });
+    *itself = reloadTimer_;
+}
+
+void VAKTRBaseSnippetController::viewWillDisappear(bool animated) {
+    HostSnippetViewController::viewWillDisappear(animated);
+    if (reloadTimer_) {
+        reloadTimer_->invalidate();
+        reloadTimer_ = nullptr;
+    }
+}
+
+double VAKTRBaseSnippetController::desiredHeightForWidth(double width) {
+    currentWidth_ = width;
+    if (!containerView_) {
+        return 0.0;
+    }
+    if (containerView_->window()) {
+        containerView_->layoutIfNeeded();
+    }
+    constexpr double priority = 750.0;
+    constexpr double compressed = platform::kCompressedFittingExtent;
+    return containerView_->systemLayoutSizeFitting({compressed, compressed}, priority, priority).height;
+}
+
+std::shared_ptr<platform::HeaderItem> VAKTRBaseSnippetController::sashItem() {
+    return std::make_shared<platform::HeaderItem>(AssistantLocalizedString("APPLICATION_NAME"),
+                                                  KTRVATheme::themeImageNamed("appIcon_dyn"));
+}
+
+void VAKTRBaseSnippetController::reloadData() {}
+
+void VAKTRBaseSnippetController::locationsUpdated(const std::shared_ptr<const platform::LocationList>& locations) {
+    setLocations(locations);
+    reloadData();
+    viewNeedsResize();
+}
+
+void VAKTRBaseSnippetController::refreshCancelled() {
+    refreshingCancelled_ = true;
+}
+
+void VAKTRBaseSnippetController::viewNeedsResize() {
+    if (const auto host = delegate()) {
+        host->heightDidChange(*this, true);
+    }
+}
+
+void VAKTRBaseSnippetController::handleURL(const platform::Url& url) {
+    openURL(url);
+}
+
+void VAKTRBaseSnippetController::openURL(const platform::Url& url) {
+    if (const auto host = delegate()) {
+        host->openUrl(*this, url, [url](bool opened) {
+            if (!opened) {
+                LogCategory_Unspecified()->write(platform::LogLevel::Error, "Unable to open url: %@", url);
+            }
+        });
+    }
+}
+
+void VAKTRBaseSnippetController::setLocations(const std::shared_ptr<const platform::LocationList>& locations) {
+    if (locations == sourceLocations_) {
+        return;
+    }
+    sourceLocations_ = locations;
+    Locations records;
+    if (locations) {
+        records.reserve(locations->size());
+        for (const auto& object : *locations) {
+            records.push_back(KTRVALocation::locationWithVelaLocation(object));
+        }
+    }
+    locations_ = std::move(records);
+}
+
+std::vector<std::shared_ptr<platform::VAPerson>> VAKTRBaseSnippetController::friends() const {
+    std::vector<std::shared_ptr<platform::VAPerson>> persons;
+    for (const auto& record : locations_) {
+        const auto object = record->velaLocation();
+        if (object && object->friend_ && object->friend_->object) {
+            persons.push_back(object->friend_->object);
+        }
+    }
+    return persons;
+}
+
+std::shared_ptr<KTRVALocation> VAKTRBaseSnippetController::disambiguatedLocation() const {
+    // Always the first one, with or without a coordinate; later ones are deliberately not looked at.
+    return locations_.empty() ? nullptr : locations_.front();
+}
+
+}  // namespace ktr

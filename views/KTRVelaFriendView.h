@@ -1,0 +1,95 @@
+#pragma once
+
+#include <memory>
+#include <optional>
+
+#include "model/KTRVALocation.h"
+#include "platform/base/NotificationCenter.h"
+#include "platform/contacts/ContactAvatarController.h"
+#include "platform/ui/Label.h"
+#include "views/CurrentLocationDelegate.h"
+#include "views/KTRVelaBaseView.h"
+
+namespace ktr {
+
+/// One friend: the avatar on the leading side; beside it the place, the name with the distance, and the age of the fix;
+/// a hairline at the bottom. A tap opens the friend. With an accessibility text size the row has no subviews, its
+/// labels are none and texts set on them go nowhere. Main thread.
+class KTRVelaFriendView : public KTRVelaBaseView {
+  public:
+    bool initWithFrame(const platform::Rect& frame) override;
+    /// Builds the subviews and their constraints.
+    virtual void setupView();
+    /// Fills the row from its record; every missing piece becomes an empty text. The avatar follows 0.1 seconds later.
+    virtual void updateView();
+
+    /// "wayloc://friend/" and the record's unformatted handle as it stands, nothing escaped. Never none.
+    std::optional<platform::Url> urlForTouch() override;
+    /// The least height that the row's constraints allow at its present width, points.
+    double estimagedHeightForView() override;
+    platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Link; }
+
+    /// The source of the user's own position, for the distance; held weakly.
+    std::shared_ptr<CurrentLocationDelegate> currentLocationDelegate() const { return currentLocationDelegate_.lock(); }
+    void setCurrentLocationDelegate(std::weak_ptr<CurrentLocationDelegate> delegate) {
+        currentLocationDelegate_ = std::move(delegate);
+    }
+    std::shared_ptr<KTRVALocation> location() const { return location_; }
+    /// Always fills the row anew, also for the record that it has: time has passed.
+    virtual void setLocation(std::shared_ptr<KTRVALocation> location);
+    /// A fresh position is awaited (true from the start): words the place text only, at the next filling.
+    bool isRefreshingLocation() const { return isRefreshingLocation_; }
+    void setIsRefreshingLocation(bool isRefreshing) { isRefreshingLocation_ = isRefreshing; }
+    bool separatorEnabled() const { return separatorEnabled_; }
+    /// Shows or hides the hairline. It is shown until this is first called, though the flag reads false.
+    void setSeparatorEnabled(bool enabled);
+    /// The row is the user's own in the show/hide-my-location snippet: no distance is shown.
+    bool isVisibility() const { return isVisibility_; }
+    void setIsVisibility(bool isVisibility) { isVisibility_ = isVisibility; }
+
+    std::shared_ptr<platform::ContactAvatarController> avatarViewController() const { return avatarViewController_; }
+    void setAvatarViewController(std::shared_ptr<platform::ContactAvatarController> controller) {
+        avatarViewController_ = std::move(controller);
+    }
+    std::shared_ptr<platform::Label> nameLabel() const { return nameLabel_; }
+    void setNameLabel(std::shared_ptr<platform::Label> label) { nameLabel_ = std::move(label); }
+    std::shared_ptr<platform::Label> locationLabel() const { return locationLabel_; }
+    void setLocationLabel(std::shared_ptr<platform::Label> label) { locationLabel_ = std::move(label); }
+    std::shared_ptr<platform::Label> timeLabel() const { return timeLabel_; }
+    void setTimeLabel(std::shared_ptr<platform::Label> label) { timeLabel_ = std::move(label); }
+    std::shared_ptr<platform::Label> distanceLabel() const { return distanceLabel_; }
+    void setDistanceLabel(std::shared_ptr<platform::Label> label) { distanceLabel_ = std::move(label); }
+    std::shared_ptr<platform::View> friendIconView() const { return friendIconView_; }
+    void setFriendIconView(std::shared_ptr<platform::View> view) { friendIconView_ = std::move(view); }
+    std::shared_ptr<platform::View> separatorView() const { return separatorView_; }
+    void setSeparatorView(std::shared_ptr<platform::View> view) { separatorView_ = std::move(view); }
+    /// Kept for subclasses; this row does not consult it.
+    bool constraintSetupCompleted() const { return constraintSetupCompleted_; }
+    void setConstraintSetupCompleted(bool completed) { constraintSetupCompleted_ = completed; }
+
+  private:
+    void setupAvatar();
+    void setupLabels();
+    void setupConstraints();
+    void updateAvatar();
+    void updatePlace();
+    void updateAge();
+    void updateDistance();
+
+    std::weak_ptr<CurrentLocationDelegate> currentLocationDelegate_;
+    std::shared_ptr<KTRVALocation> location_;
+    bool isRefreshingLocation_ = false;
+    bool separatorEnabled_ = false;
+    bool isVisibility_ = false;
+    std::shared_ptr<platform::ContactAvatarController> avatarViewController_;
+    std::shared_ptr<platform::Label> nameLabel_;
+    std::shared_ptr<platform::Label> locationLabel_;
+    std::shared_ptr<platform::Label> timeLabel_;
+    std::shared_ptr<platform::Label> distanceLabel_;
+    std::shared_ptr<platform::View> friendIconView_;
+    std::shared_ptr<platform::View> separatorView_;
+    bool constraintSetupCompleted_ = false;
+    platform::NotificationCenter::Token currentLocationUpdated_;
+};
+
+}  // namespace ktr
