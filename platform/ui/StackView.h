@@ -24,6 +24,10 @@ class KTR_API StackView : public View {
     /// Takes the view out of the arrangement; it stays a subview.
     void removeArrangedSubview(const std::shared_ptr<View>& view);
 
+    /// The whole arrangement in one step, at a cost linear in its length. A view that comes again is left out at its
+    /// later places; a view that is arranged no longer stays a subview. What is arranged so already costs nothing.
+    void setArrangedSubviews(const std::vector<std::shared_ptr<View>>& views);
+
     const std::vector<std::shared_ptr<View>>& presentedSubviews() const override { return arranged_; }
     void layoutSubviews() override;
     Size systemLayoutSizeFitting(const Size& target, double horizontalPriority, double verticalPriority) override;
