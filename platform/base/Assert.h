@@ -2,6 +2,7 @@
 
 #include <cassert>
 
+#include "platform/base/MainLoop.h"
 #include "platform/base/Platform.h"
 
 /// In debug builds, stops where something that belongs to the main thread is used from another.

@@ -1,0 +1,32 @@
+#include "model/LabelUtil.h"
+
+#include <algorithm>
+
+#include "platform/assistant/Localization.h"
+#include "platform/base/Platform.h"
+#include "platform/base/Utf8.h"
+
+namespace ktr {
+
+const std::vector<std::string>& LabelUtil::defaultLabelKeys() {
+    static const std::vector<std::string> keys = {"_$!<home>!$_", "_$!<work>!$_", "_$!<school>!$_", "_$!<gym>!$_",
+                                                  "_$!<other>!$_"};
+    return keys;
+}
+
+bool LabelUtil::isDefaultLabel(const std::optional<std::string>& label) {
+    const auto& keys = defaultLabelKeys();
+    return label && std::find(keys.begin(), keys.end(), platform::asciiLowercased(*label)) != keys.end();
+}
+
+std::optional<std::string> LabelUtil::keyForDefaultLabel(const std::string& text) {
+    const auto localization = platform::Platform::installed()->localization;
+    for (const std::string& key : defaultLabelKeys()) {
+        if (localization->text(key, localization->hostBundleIdentifier(), std::nullopt, "") == text) {
+            return key;
+        }
+    }
+    return std::nullopt;
+}
+
+}  // namespace ktr

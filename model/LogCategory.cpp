@@ -1,0 +1,23 @@
+#include "model/LogCategory.h"
+
+#include "model/PluginBundle.h"
+#include "platform/base/Platform.h"
+
+namespace ktr {
+
+namespace {
+
+class LogCategory : public platform::Log {
+  public:
+    LogCategory() : platform::Log(PluginBundle::kIdentifier, "_") {}
+    static std::shared_ptr<LogCategory> makeShared() { return std::make_shared<LogCategory>(); }
+};
+
+}  // namespace
+
+std::shared_ptr<const platform::Log> LogCategory_Unspecified() {
+    auto handle = platform::shared<LogCategory>();
+    return handle ? handle : LogCategory::makeShared();
+}
+
+}  // namespace ktr
