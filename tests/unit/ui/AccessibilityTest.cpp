@@ -1,0 +1,88 @@
+#include "platform/ui/Accessibility.h"
+
+#include "platform/ui/Label.h"
+#include "platform/ui/Window.h"
+#include "tests/support/PlatformTest.h"
+
+namespace ktr::test {
+
+using namespace platform;
+
+class AccessibilityTest : public PlatformTest {
+  public:
+    class Link : public View {
+      public:
+        AccessibilityRole accessibilityRole() const override { return AccessibilityRole::Link; }
+    };
+
+    static std::shared_ptr<Label> label(const std::string& text, const Rect& frame) {
+        auto made = create<Label>(&View::initWithFrame, frame);
+        made->setText(text);
+        return made;
+    }
+    static std::vector<std::string> textsOf(const AccessibilityNode& node) {
+        std::vector<std::string> texts;
+        for (const auto& child : node.children) {
+            texts.push_back(child.text);
+        }
+        return texts;
+    }
+
+    std::shared_ptr<Window> window = create<Window>(&View::initWithFrame, Rect{0, 0, 400, 800});
+};
+
+TEST_F(AccessibilityTest, ReadingOrder_IsTopToBottomThenLeadingToTrailing) {
+    window->addSubview(label("name", {82, 28, 200, 22}));
+    window->addSubview(label("age", {82, 50, 300, 18}));
+    window->addSubview(label("distance", {330, 28, 55, 22}));
+    window->addSubview(label("place", {82, 10, 300, 18}));
+    EXPECT_EQ(textsOf(accessibilityTree(window, false)),
+              (std::vector<std::string>{"place", "name", "distance", "age"}));
+    EXPECT_EQ(textsOf(accessibilityTree(window, true)), (std::vector<std::string>{"place", "distance", "name", "age"}));
+}
+
+TEST_F(AccessibilityTest, Label_IsSpokenInsteadOfTheText) {
+    const auto place = label("Harbour", {0, 0, 100, 20});
+    place->setAccessibilityLabel("At Harbour");
+    window->addSubview(place);
+    EXPECT_EQ(textsOf(accessibilityTree(window, false)), std::vector<std::string>{"At Harbour"});
+    place->setAccessibilityLabel(std::nullopt);
+    EXPECT_EQ(textsOf(accessibilityTree(window, false)), std::vector<std::string>{"Harbour"});
+}
+
+TEST_F(AccessibilityTest, HiddenAndEmptyViews_AreSilent) {
+    window->addSubview(label("", {0, 0, 100, 20}));
+    const auto hidden = label("hidden", {0, 20, 100, 20});
+    hidden->setHidden(true);
+    window->addSubview(hidden);
+    EXPECT_TRUE(accessibilityTree(window, false).children.empty());
+}
+
+TEST_F(AccessibilityTest, PlainViews_PassTheirChildrenOn) {
+    const auto plain = create<View>(&View::initWithFrame, Rect{0, 0, 100, 100});
+    plain->addSubview(label("inside", {5, 5, 50, 20}));
+    window->addSubview(plain);
+    const auto tree = accessibilityTree(window, false);
+    ASSERT_EQ(tree.children.size(), 1U);
+    EXPECT_EQ(tree.children[0].role, AccessibilityRole::Text);
+    EXPECT_EQ(tree.children[0].frame, (Rect{5, 5, 50, 20}));
+}
+
+TEST_F(AccessibilityTest, Press_FiresTheRecognizers_AndFailsOnceTheViewIsGone) {
+    auto link = create<Link>(&View::initWithFrame, Rect{0, 0, 100, 100});
+    int presses = 0;
+    link->addGestureRecognizer(std::make_shared<TapGestureRecognizer>([&] { ++presses; }));
+    link->addSubview(label("open", {0, 0, 50, 20}));
+    window->addSubview(link);
+    const auto tree = accessibilityTree(window, false);
+    ASSERT_EQ(tree.children.size(), 1U);
+    EXPECT_TRUE(tree.children[0].pressable);
+    EXPECT_TRUE(accessibilityPress(tree.children[0]));
+    EXPECT_EQ(presses, 1);
+    EXPECT_FALSE(accessibilityPress(tree.children[0].children[0]));
+    link->removeFromSuperview();
+    link.reset();
+    EXPECT_FALSE(accessibilityPress(tree.children[0]));
+}
+
+}  // namespace ktr::test
