@@ -12,7 +12,7 @@ namespace ktr::platform {
 
 /// Where text is laid out. Points.
 struct TextContainer {
-    /// May be infinite: one line a paragraph.
+    /// May be infinite: one line a paragraph, each beginning at the left edge whatever its alignment.
     double width = std::numeric_limits<double>::infinity();
     /// Rectangles, in the container's coordinates, that no line may touch.
     std::vector<Rect> exclusionPaths;

@@ -1,6 +1,6 @@
 #include "platform/ui/Label.h"
 
-#include <cmath>
+#include <limits>
 
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/base/Platform.h"
@@ -9,6 +9,9 @@
 namespace ktr::platform {
 
 namespace {
+
+/// How far a text may fall short of its room and still fit: what is lost in sums of doubles.
+constexpr double kFit = 0.01;
 
 bool interfaceIsRightToLeft() {
     const auto platform = Platform::installed();
@@ -85,19 +88,24 @@ std::shared_ptr<const TextLayout> Label::layoutForWidth(double width) const {
     return platform->textEngine->layOut(AttributedString(text_, font_), container);
 }
 
+std::shared_ptr<const TextLayout> Label::naturalLayout() const {
+    if (!natural_) {
+        natural_ = layoutForWidth(std::numeric_limits<double>::infinity());
+    }
+    return natural_;
+}
+
 IntrinsicSize Label::intrinsicContentSize(double widthLimit) const {
     if (text_.empty()) {
         // An empty line keeps its place: a row does not change its height while a text is on its way.
         return {0.0, font_.lineHeight()};
     }
-    if (!natural_) {
-        natural_ = layoutForWidth(std::numeric_limits<double>::infinity());
-    }
-    if (!natural_) {
+    const auto natural = naturalLayout();
+    if (!natural) {
         return {0.0, 0.0};
     }
-    if (numberOfLines_ == 1 || natural_->usedSize().width <= widthLimit) {
-        return {natural_->usedSize().width, natural_->usedSize().height};
+    if (numberOfLines_ == 1 || natural->usedSize().width <= widthLimit + kFit) {
+        return {natural->usedSize().width, natural->usedSize().height};
     }
     if (!drawn_ || drawnWidth_ != widthLimit) {
         drawn_ = layoutForWidth(widthLimit);
@@ -115,6 +123,12 @@ std::shared_ptr<const TextLayout> Label::textLayout() const {
         return nullptr;
     }
     const double width = bounds().width;
+    if (numberOfLines_ == 1) {
+        const auto natural = naturalLayout();
+        if (natural && !natural->isTruncated() && natural->usedSize().width <= width + kFit) {
+            return natural;
+        }
+    }
     if (!drawn_ || drawnWidth_ != width) {
         drawn_ = layoutForWidth(width);
         drawnWidth_ = width;
@@ -122,8 +136,18 @@ std::shared_ptr<const TextLayout> Label::textLayout() const {
     return drawn_;
 }
 
-double Label::textTop(const TextLayout& layout) const {
-    return (bounds().height - layout.usedSize().height) / 2.0;
+Point Label::textOrigin(const TextLayout& layout) const {
+    const double top = (bounds().height - layout.usedSize().height) / 2.0;
+    if (&layout != natural_.get()) {
+        return {0.0, top};
+    }
+    // The natural layout knows no edge to align to.
+    const double free = bounds().width - layout.usedSize().width;
+    const bool rightToLeft = alignment_ == TextAlignment::Natural && interfaceIsRightToLeft();
+    if (alignment_ == TextAlignment::Center) {
+        return {free / 2.0, top};
+    }
+    return {alignment_ == TextAlignment::Right || rightToLeft ? free : 0.0, top};
 }
 
 Rect Label::drawnTextRect() const {
@@ -131,7 +155,8 @@ Rect Label::drawnTextRect() const {
     if (!layout || layout->lines().empty()) {
         return {};
     }
-    return layout->lines().front().box.offsetBy(0.0, textTop(*layout));
+    const Point origin = textOrigin(*layout);
+    return layout->lines().front().box.offsetBy(origin.x, origin.y);
 }
 
 std::string Label::accessibilityText() const {
@@ -140,7 +165,7 @@ std::string Label::accessibilityText() const {
 
 void Label::draw(Canvas& canvas) const {
     if (const auto layout = textLayout()) {
-        canvas.draw(*layout, {0.0, textTop(*layout)}, textColor_);
+        canvas.draw(*layout, textOrigin(*layout), textColor_);
     }
 }
 

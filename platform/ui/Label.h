@@ -46,7 +46,10 @@ class KTR_API Label : public View {
   private:
     std::shared_ptr<const TextLayout> layoutForWidth(double width) const;
     void contentChanged();
-    double textTop(const TextLayout& layout) const;
+    /// The one line at its natural width, when it can be drawn as it stands.
+    std::shared_ptr<const TextLayout> naturalLayout() const;
+    /// Where the drawn text's container begins.
+    Point textOrigin(const TextLayout& layout) const;
 
     std::string text_;
     Font font_;
@@ -54,7 +57,8 @@ class KTR_API Label : public View {
     TextAlignment alignment_ = TextAlignment::Natural;
     int numberOfLines_ = 1;
     LineBreakMode lineBreakMode_ = LineBreakMode::TruncatingTail;
-    /// What was laid out last at the natural width and at the drawn width.
+    /// What was laid out last at the natural width (which serves for drawing too, where one line fits) and at another
+    /// width.
     mutable std::shared_ptr<const TextLayout> natural_;
     mutable std::shared_ptr<const TextLayout> drawn_;
     mutable double drawnWidth_ = -1.0;
