@@ -19,6 +19,10 @@ class KTR_API LayoutAnchor {
 
     std::shared_ptr<View> view() const { return view_.lock(); }
     LayoutAttribute attribute() const { return attribute_; }
+    /// Whether both are about one view (or none).
+    bool isSameView(const LayoutAnchor& other) const {
+        return !view_.owner_before(other.view_) && !other.view_.owner_before(view_);
+    }
 
     /// Constraints of priority 1000, not yet active. Constants in points.
     std::shared_ptr<LayoutConstraint> constraintEqualTo(const LayoutAnchor& other, double constant = 0.0) const;

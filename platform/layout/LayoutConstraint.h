@@ -29,6 +29,11 @@ class KTR_API LayoutConstraint : public Object {
     void setActive(bool active);
     bool isActive() const { return !owner_.expired(); }
 
+    /// Whether both say the same of the same views. Equal constraints are one: a view holds it once.
+    bool isEqualTo(const LayoutConstraint& other) const;
+    /// Whether a view that it is about has gone.
+    bool isOrphaned() const;
+
     std::string description() const override;
 
   private:

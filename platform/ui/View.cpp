@@ -31,6 +31,9 @@ void View::setFrame(const Rect& frame) {
     if (resized) {
         setNeedsLayout();
     }
+    if (const auto parent = superview(); parent && parent->scope_ && translatesAutoresizingMask_) {
+        LayoutScope::inputChanged(*parent);
+    }
     setNeedsDisplay();
 }
 
@@ -73,7 +76,7 @@ void View::addSubview(const std::shared_ptr<View>& view) {
     view->superview_ = weak(this);
     subviews_.push_back(view);
     subviewsChanged();
-    setNeedsLayout();
+    LayoutScope::inputChanged(*this);
     if (view->needsLayout_ || view->descendantNeedsLayout_) {
         descendantNeedsLayout_ = true;
     }
@@ -90,7 +93,7 @@ void View::removeFromSuperview() {
     std::erase(parent->subviews_, self);
     superview_.reset();
     parent->subviewsChanged();
-    parent->setNeedsLayout();
+    LayoutScope::inputChanged(*parent);
 }
 
 void View::removeSubviews(const std::vector<std::shared_ptr<View>>& views) {

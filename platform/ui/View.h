@@ -89,6 +89,7 @@ class KTR_API View : public Object {
     LayoutAnchor firstBaselineAnchor() { return anchor(LayoutAttribute::FirstBaseline); }
     LayoutAnchor lastBaselineAnchor() { return anchor(LayoutAttribute::LastBaseline); }
     /// Defaults: hugging 250, compression resistance 750.
+    const ContentPriorities& contentPriorities() const { return contentPriorities_; }
     double contentHuggingPriority(LayoutAxis axis) const;
     void setContentHuggingPriority(double priority, LayoutAxis axis);
     double contentCompressionResistancePriority(LayoutAxis axis) const;

@@ -1,0 +1,343 @@
+#include "platform/layout/LayoutEquations.h"
+
+#include <algorithm>
+#include <limits>
+
+namespace ktr::platform {
+
+namespace {
+
+constexpr double kUnlimited = std::numeric_limits<double>::infinity();
+
+bool isHorizontal(LayoutAttribute attribute) {
+    return attribute == LayoutAttribute::Left || attribute == LayoutAttribute::Right ||
+           attribute == LayoutAttribute::Leading || attribute == LayoutAttribute::Trailing ||
+           attribute == LayoutAttribute::CenterX;
+}
+
+bool followsDirection(LayoutAttribute attribute) {
+    return attribute == LayoutAttribute::Leading || attribute == LayoutAttribute::Trailing;
+}
+
+}  // namespace
+
+void LayoutEquations::build(View& owner, const std::vector<std::shared_ptr<LayoutConstraint>>& constraints,
+                            bool rightToLeft) {
+    *this = LayoutEquations();
+    rightToLeft_ = rightToLeft;
+    owner_.identity = &owner;
+    owner_.view = weak(&owner);
+    readContent(owner_, owner);
+    const auto plan = std::make_shared<Plan>();
+    plan->variables = 2;
+    plan->equations.reserve(constraints.size() + 32);
+    for (const auto& constraint : constraints) {
+        addConstraint(*constraint, *plan);
+    }
+    addContent(-1, *plan);
+    for (int i = 0; i < static_cast<int>(participants_.size()); ++i) {
+        if (participants_[i].isFixed) {
+            addFrame(i, *plan);
+        } else {
+            addContent(i, *plan);
+        }
+    }
+    constants_.reserve(plan->equations.size());
+    for (const Equation& equation : plan->equations) {
+        constants_.push_back(equation.constant);
+    }
+    plan_ = plan;
+    writeInputs();
+}
+
+bool LayoutEquations::isCurrent(const View& owner, bool rightToLeft) const {
+    const auto isSame = [](const Participant& p, const View& view) {
+        const IntrinsicSize size = p.isFixed ? IntrinsicSize{} : view.intrinsicContentSize(kUnlimited);
+        const ContentPriorities priorities = view.contentPriorities();
+        return p.hasWidth == size.width.has_value() && p.hasHeight == size.height.has_value() &&
+               p.priorities == priorities;
+    };
+    if (owner_.identity != &owner || rightToLeft_ != rightToLeft || hasStrangers_ || !isSame(owner_, owner)) {
+        return false;
+    }
+    return std::all_of(participants_.begin(), participants_.end(), [&isSame](const Participant& p) {
+        const auto view = p.view.lock();
+        return view && view->superview().get() == p.superview &&
+               view->translatesAutoresizingMaskIntoConstraints() == p.isFixed && isSame(p, *view);
+    });
+}
+
+/// The participant of a view below the owner; -1 for the owner, -2 for a stranger.
+int LayoutEquations::participantOf(const std::shared_ptr<View>& view, Plan& plan) {
+    if (!view) {
+        return -2;
+    }
+    if (view.get() == owner_.identity) {
+        return -1;
+    }
+    for (int i = 0; i < static_cast<int>(participants_.size()); ++i) {
+        if (participants_[i].identity == view.get()) {
+            return i;
+        }
+    }
+    const auto superview = view->superview();
+    const int parent = participantOf(superview, plan);
+    if (parent == -2) {
+        return -2;
+    }
+    Participant participant;
+    participant.view = view;
+    participant.identity = view.get();
+    participant.superview = superview.get();
+    participant.parent = parent;
+    participant.firstVariable = plan.variables;
+    participant.isFixed = view->translatesAutoresizingMaskIntoConstraints();
+    plan.variables += 4;
+    readContent(participant, *view);
+    participants_.push_back(std::move(participant));
+    return static_cast<int>(participants_.size()) - 1;
+}
+
+/// x or y in the owner's coordinates.
+std::vector<Term> LayoutEquations::position(int participant, bool isHorizontal) const {
+    std::vector<Term> terms;
+    for (int p = participant; p >= 0; p = participants_[p].parent) {
+        terms.push_back({participants_[p].firstVariable + (isHorizontal ? 0 : 1), 1.0});
+    }
+    return terms;
+}
+
+/// One side of a constraint. What follows the direction is measured from the edge where reading begins: in a
+/// right-to-left interface that is the owner's width minus the coordinate.
+LayoutEquations::End LayoutEquations::end(const LayoutAnchor& anchor, bool isMirrored, Plan& plan) {
+    End end;
+    if (anchor.attribute() == LayoutAttribute::None) {
+        return end;
+    }
+    const int p = participantOf(anchor.view(), plan);
+    end.isValid = p != -2;
+    if (!end.isValid) {
+        return end;
+    }
+    const VariableId width = p < 0 ? kOwnerWidth : participants_[p].firstVariable + 2;
+    const VariableId height = p < 0 ? kOwnerHeight : participants_[p].firstVariable + 3;
+    const LayoutAttribute attribute = anchor.attribute();
+    if (attribute == LayoutAttribute::Width || attribute == LayoutAttribute::Height) {
+        end.terms = {{attribute == LayoutAttribute::Width ? width : height, 1.0}};
+        return end;
+    }
+    const bool horizontal = isHorizontal(attribute);
+    end.terms = position(p, horizontal);
+    const VariableId extent = horizontal ? width : height;
+    switch (attribute) {
+        case LayoutAttribute::CenterX:
+        case LayoutAttribute::CenterY:
+            end.terms.push_back({extent, 0.5});
+            break;
+        case LayoutAttribute::Right:
+        case LayoutAttribute::Bottom:
+            end.terms.push_back({extent, 1.0});
+            break;
+        case LayoutAttribute::Leading:
+        case LayoutAttribute::Trailing:
+            if ((attribute == LayoutAttribute::Trailing) != isMirrored) {
+                end.terms.push_back({extent, 1.0});
+            }
+            break;
+        case LayoutAttribute::FirstBaseline:
+        case LayoutAttribute::LastBaseline:
+            // Content is centred on its view's height; a view without content has its baselines at its bottom.
+            end.hasBaseline = content(p).hasHeight;
+            end.participant = p;
+            end.isFirst = attribute == LayoutAttribute::FirstBaseline;
+            end.terms.push_back({extent, end.hasBaseline ? 0.5 : 1.0});
+            break;
+        default:
+            break;
+    }
+    if (isMirrored && horizontal) {
+        for (Term& term : end.terms) {
+            term.coefficient = -term.coefficient;
+        }
+        end.terms.push_back({kOwnerWidth, 1.0});
+    }
+    return end;
+}
+
+void LayoutEquations::addConstraint(const LayoutConstraint& constraint, Plan& plan) {
+    const bool isMirrored = rightToLeft_ && (followsDirection(constraint.first().attribute()) ||
+                                             followsDirection(constraint.second().attribute()));
+    End first = end(constraint.first(), isMirrored, plan);
+    const End second = end(constraint.second(), isMirrored, plan);
+    if (!first.isValid || !second.isValid) {
+        hasStrangers_ = true;
+        return;
+    }
+    Equation equation;
+    equation.terms = std::move(first.terms);
+    for (const Term& term : second.terms) {
+        equation.terms.push_back({term.variable, -constraint.multiplier() * term.coefficient});
+    }
+    equation.relation = constraint.relation();
+    equation.constant = constraint.constant();
+    equation.level = constraint.priority();
+    // The offsets stand on the left: they count with the opposite sign on the right.
+    if (first.hasBaseline) {
+        plan.baselines.push_back({plan.equations.size(), first.participant, first.isFirst, -1.0});
+    }
+    if (second.hasBaseline) {
+        plan.baselines.push_back({plan.equations.size(), second.participant, second.isFirst, constraint.multiplier()});
+    }
+    equation.isInput = first.hasBaseline || second.hasBaseline;
+    plan.equations.push_back(std::move(equation));
+}
+
+void LayoutEquations::addContent(int participant, Plan& plan) const {
+    const Participant& p = content(participant);
+    const auto addExtent = [&plan](VariableId variable, bool hasSize, double hugging, double resistance) {
+        const auto add = [&plan, variable](LayoutRelation relation, double level, bool isInput) {
+            plan.equations.push_back({{{variable, 1.0}}, relation, 0.0, std::min(level, kNotNegativeLevel), isInput});
+        };
+        if (hasSize) {
+            add(LayoutRelation::GreaterOrEqual, std::min(resistance, kContentLevel), true);
+            add(LayoutRelation::LessOrEqual, std::min(hugging, kContentLevel), true);
+        }
+        add(LayoutRelation::GreaterOrEqual, kNotNegativeLevel, false);
+    };
+    const VariableId width = participant < 0 ? kOwnerWidth : p.firstVariable + 2;
+    plan.contents.push_back({plan.equations.size(), participant});
+    addExtent(width, p.hasWidth, p.priorities.horizontalHugging, p.priorities.horizontalCompressionResistance);
+    addExtent(width + 1, p.hasHeight, p.priorities.verticalHugging, p.priorities.verticalCompressionResistance);
+}
+
+void LayoutEquations::addFrame(int participant, Plan& plan) const {
+    plan.frames.push_back({plan.equations.size(), participant});
+    for (VariableId i = 0; i < 4; ++i) {
+        const VariableId variable = participants_[participant].firstVariable + i;
+        plan.equations.push_back({{{variable, 1.0}}, LayoutRelation::Equal, 0.0, Solver::kInput, true});
+    }
+}
+
+void LayoutEquations::readContent(Participant& participant, const View& view) {
+    participant.priorities = view.contentPriorities();
+    if (participant.isFixed) {
+        participant.frame = view.frame();
+        return;
+    }
+    const IntrinsicSize size = view.intrinsicContentSize(kUnlimited);
+    participant.hasWidth = size.width.has_value();
+    participant.hasHeight = size.height.has_value();
+    participant.content = {size.width.value_or(0.0), size.height.value_or(0.0)};
+    participant.wraps = participant.hasHeight && view.intrinsicHeightDependsOnWidth();
+    if (participant.wraps && participant.lastWidth < participant.content.width) {
+        participant.content.height = view.intrinsicContentSize(participant.lastWidth).height.value_or(0.0);
+    }
+    participant.baselines = participant.hasHeight ? view.baselineOffsets() : BaselineOffsets{};
+}
+
+bool LayoutEquations::readInputs() {
+    if (const auto owner = owner_.view.lock()) {
+        readContent(owner_, *owner);
+    }
+    for (Participant& participant : participants_) {
+        if (const auto view = participant.view.lock()) {
+            readContent(participant, *view);
+        }
+    }
+    return writeInputs();
+}
+
+bool LayoutEquations::readHeightsFor(const Solver& solver) {
+    bool isWrapped = false;
+    const auto read = [&](Participant& participant, VariableId width) {
+        const auto view = participant.view.lock();
+        if (view && participant.wraps) {
+            participant.lastWidth = std::max(0.0, solver.value(width));
+            readContent(participant, *view);
+            isWrapped = true;
+        }
+    };
+    read(owner_, kOwnerWidth);
+    for (Participant& participant : participants_) {
+        read(participant, participant.firstVariable + 2);
+    }
+    return isWrapped && writeInputs();
+}
+
+/// What must be added to y + height / 2 to reach the baseline.
+double LayoutEquations::baselineOffset(int participant, bool isFirst) const {
+    const Participant& p = content(participant);
+    const double half = p.content.height / 2.0;
+    return isFirst ? p.baselines.firstFromTop - half : half - p.baselines.lastFromBottom;
+}
+
+bool LayoutEquations::writeInputs() {
+    bool isChanged = false;
+    const auto write = [&](std::size_t equation, double constant) {
+        isChanged = isChanged || constants_[equation] != constant;
+        constants_[equation] = constant;
+    };
+    for (const Source& source : plan_->contents) {
+        const Participant& p = content(source.participant);
+        std::size_t next = source.equation;
+        if (p.hasWidth) {
+            write(next++, p.content.width);
+            write(next++, p.content.width);
+        }
+        ++next;
+        if (p.hasHeight) {
+            write(next++, p.content.height);
+            write(next, p.content.height);
+        }
+    }
+    for (const Source& source : plan_->frames) {
+        const Rect& frame = participants_[source.participant].frame;
+        const double values[] = {frame.x, frame.y, frame.width, frame.height};
+        for (std::size_t i = 0; i < 4; ++i) {
+            write(source.equation + i, values[i]);
+        }
+    }
+    const std::vector<Baseline>& baselines = plan_->baselines;
+    for (std::size_t i = 0; i < baselines.size();) {
+        const std::size_t equation = baselines[i].equation;
+        double constant = plan_->equations[equation].constant;
+        for (; i < baselines.size() && baselines[i].equation == equation; ++i) {
+            constant += baselines[i].factor * baselineOffset(baselines[i].participant, baselines[i].isFirst);
+        }
+        write(equation, constant);
+    }
+    return isChanged;
+}
+
+std::vector<double> LayoutEquations::signature() const {
+    std::vector<double> signature;
+    signature.reserve(plan_->equations.size() * 8);
+    signature.push_back(plan_->variables);
+    for (const Equation& equation : plan_->equations) {
+        signature.push_back(equation.level);
+        signature.push_back(static_cast<double>(equation.relation) + (equation.isInput ? 8.0 : 0.0));
+        signature.push_back(equation.constant);
+        signature.push_back(static_cast<double>(equation.terms.size()));
+        for (const Term& term : equation.terms) {
+            signature.push_back(term.variable);
+            signature.push_back(term.coefficient);
+        }
+    }
+    for (const Source& source : plan_->contents) {
+        signature.push_back(source.participant);
+        signature.push_back(static_cast<double>(source.equation));
+    }
+    for (const Source& source : plan_->frames) {
+        signature.push_back(source.participant);
+        signature.push_back(static_cast<double>(source.equation));
+    }
+    for (const Baseline& baseline : plan_->baselines) {
+        signature.push_back(baseline.participant);
+        signature.push_back(static_cast<double>(baseline.equation));
+        signature.push_back(baseline.isFirst ? 1.0 : 0.0);
+        signature.push_back(baseline.factor);
+    }
+    return signature;
+}
+
+}  // namespace ktr::platform
