@@ -1,0 +1,97 @@
+#include "linux/ui/FontSetup.h"
+
+#include <QByteArray>
+#include <QFile>
+#include <QFontDatabase>
+#include <array>
+
+#include "linux/ui/FontChoice.h"
+
+namespace ktr::linux_ {
+
+namespace {
+
+constexpr const char* kTrueType = "/usr/share/fonts/truetype/noto/";
+constexpr const char* kOpenType = "/usr/share/fonts/opentype/noto/";
+
+/// Noto Sans and its scripts, each in Regular and Bold.
+constexpr std::array kPairs = {"NotoSans",         "NotoSansArabic",     "NotoSansHebrew",   "NotoSansArmenian",
+                               "NotoSansGeorgian", "NotoSansDevanagari", "NotoSansBengali",  "NotoSansGurmukhi",
+                               "NotoSansGujarati", "NotoSansOriya",      "NotoSansTamil",    "NotoSansTelugu",
+                               "NotoSansKannada",  "NotoSansMalayalam",  "NotoSansSinhala",  "NotoSansThai",
+                               "NotoSansLao",      "NotoSansMyanmar",    "NotoSansEthiopic", "NotoSansKhmer",
+                               "NotoSansThaana",   "NotoSansSymbols",    "NotoSansCherokee"};
+/// Those that come in Regular only.
+constexpr std::array kSingles = {"NotoSansSyriac", "NotoSansMongolian", "NotoSansSymbols2", "NotoSansMath"};
+
+QString file(const char* folder, const char* name, const char* ending) {
+    return QString::fromLatin1(folder) + QString::fromLatin1(name) + QString::fromLatin1(ending);
+}
+
+}  // namespace
+
+bool FontSetup::prepare(Mode mode, std::string* error) {
+    // An emboldened or slanted face is none of the design's; where a weight is missing, Regular serves.
+    bool done = qputenv("QT_NO_SYNTHESIZED_BOLD", "1") && qputenv("QT_NO_SYNTHESIZED_ITALIC", "1");
+    if (mode == Mode::Pinned) {
+        // A configuration without folders: fontconfig finds no font at all.
+        done = done && qputenv("FONTCONFIG_FILE", "/dev/null");
+    }
+    if (!done && error != nullptr) {
+        *error = "the environment for the fonts cannot be set";
+    }
+    return done;
+}
+
+QStringList FontSetup::pinnedFiles() {
+    QStringList files;
+    for (const char* name : kPairs) {
+        files << file(kTrueType, name, "-Regular.ttf") << file(kTrueType, name, "-Bold.ttf");
+    }
+    for (const char* name : kSingles) {
+        files << file(kTrueType, name, "-Regular.ttf");
+    }
+    files << file(kOpenType, "NotoSansCJK", "-Regular.ttc") << file(kOpenType, "NotoSansCJK", "-Bold.ttc");
+    files << file(kTrueType, "NotoColorEmoji", ".ttf");
+    return files;
+}
+
+std::vector<std::string> FontSetup::load(Mode mode) {
+    std::vector<std::string> missing;
+    if (mode == Mode::System) {
+        return missing;
+    }
+    for (const QString& name : pinnedFiles()) {
+        if (!QFile::exists(name) || QFontDatabase::addApplicationFont(name) < 0) {
+            missing.push_back(name.toStdString());
+        }
+    }
+    return missing;
+}
+
+bool FontSetup::hasBaseFamily() {
+    return QFontDatabase::hasFamily(FontChoice::baseFamily());
+}
+
+std::vector<FontSetup::Substitute> FontSetup::substitutes() {
+    std::vector<Substitute> list;
+    const std::string base = FontChoice::baseFamily().toStdString();
+    if (!hasBaseFamily()) {
+        list.push_back({base, "the system's sans-serif"});
+        return list;
+    }
+    for (const char* style : {"Light", "Thin"}) {
+        if (!FontChoice::hasStyle(FontChoice::baseFamily(), QString::fromLatin1(style))) {
+            list.push_back({base + " " + style, base + " Regular"});
+        }
+    }
+    // There is no rounded cut of the family, nor a semibold one in the packages that are pinned.
+    list.push_back({base + " Rounded", base});
+    list.push_back({base + " SemiBold", base + " Bold"});
+    if (!QFontDatabase::hasFamily(FontChoice::emojiFamily())) {
+        list.push_back({FontChoice::emojiFamily().toStdString(), "what the system has"});
+    }
+    return list;
+}
+
+}  // namespace ktr::linux_

@@ -1,0 +1,87 @@
+#pragma once
+
+#include <QTextLayout>
+#include <memory>
+#include <optional>
+#include <vector>
+
+#include "linux/ui/FontChoice.h"
+#include "linux/ui/PreparedText.h"
+#include "linux/ui/QtTextLayout.h"
+#include "platform/text/TextEngine.h"
+
+namespace ktr::linux_ {
+
+/// Sets one text in one container: shapes, breaks into lines, places them around exclusions, cuts the tail. Used once.
+/// Any thread, while a QGuiApplication exists.
+class LineBreaker {
+  public:
+    /// All three must outlive the breaker. The text must not be empty.
+    LineBreaker(const PreparedText& text, const platform::TextContainer& container, const FontChoice& fonts);
+
+    std::shared_ptr<const QtTextLayout> run();
+
+  private:
+    /// A stretch of a line that is free of exclusions. Points.
+    struct Span {
+        double x = 0.0;
+        double width = 0.0;
+        /// Where the nearest exclusion that narrows it ends; none without one.
+        std::optional<double> below;
+    };
+    /// How a line stands around its baseline. Points.
+    struct Metrics {
+        double height = 0.0;
+        double ascent = 0.0;
+    };
+    struct Placed {
+        Span span;
+        double width = 0.0;
+        double y = 0.0;
+        Metrics metrics;
+        qsizetype start = 0;
+        qsizetype length = 0;
+    };
+    /// Lines that were broken from the text's first `shaped` units.
+    struct Broken {
+        std::unique_ptr<QTextLayout> layout;
+        std::vector<Placed> lines;
+        bool overflows = false;
+    };
+
+    std::shared_ptr<const QtTextLayout> runOneLine();
+    std::shared_ptr<const QtTextLayout> runLines();
+    Broken breakLines(qsizetype shaped, bool grow) const;
+    void placeLine(QTextLine& line, double& y, bool grow, Placed& placed) const;
+    std::shared_ptr<const QtTextLayout> finish(Broken broken);
+
+    /// The layout of [from, to) with `tail` after it, its formats set, not yet broken.
+    std::unique_ptr<QTextLayout> makeLayout(qsizetype from, qsizetype to, const QString& tail, bool wrap) const;
+    std::unique_ptr<QTextLayout> shapeLine(qsizetype from, qsizetype to, const QString& tail) const;
+    std::shared_ptr<ShapedText> share(std::unique_ptr<QTextLayout> layout, qsizetype from, int lines) const;
+    /// The line from `from` cut so that it ends in an ellipsis and fits `room` points; none when not even that fits.
+    std::unique_ptr<QTextLayout> cutLine(qsizetype from, qsizetype to, double room) const;
+    /// The cut that is likely to fit, from one shaping of the uncut text.
+    std::size_t estimateCut(const std::vector<qsizetype>& cuts, qsizetype from, qsizetype to, double room) const;
+    QString ellipsisAfter(qsizetype from, qsizetype end) const;
+
+    Span spanAt(double y, double height) const;
+    Metrics metricsOf(qsizetype from, qsizetype to) const;
+    /// What the glyphs of a line need beyond its box, above and below, in whole points.
+    std::pair<double, double> overhang(const QTextLine& line, const Metrics& metrics) const;
+    double alignedX(const Placed& line, double lineEnd) const;
+    qsizetype lineEndFrom(qsizetype from) const;
+    /// How many units are likely to be enough for this many points of text; at a whole character.
+    qsizetype unitsFor(double points) const;
+    qsizetype wholeCharacter(qsizetype position) const;
+    int pixelSize(const platform::Font& font) const;
+
+    const PreparedText& text_;
+    const platform::TextContainer& container_;
+    const FontChoice& fonts_;
+    bool endless_;
+    double width_;
+    double scale_;
+};
+
+}  // namespace ktr::linux_

@@ -1,0 +1,111 @@
+#include "linux/ui/QtCanvas.h"
+
+#include <QPainter>
+#include <QTransform>
+#include <algorithm>
+#include <cmath>
+
+#include "linux/ui/QtImage.h"
+#include "linux/ui/QtTextLayout.h"
+
+namespace ktr::linux_ {
+
+namespace {
+
+/// Thinner than this is a line: one pixel, wherever it falls.
+constexpr double kLine = 1.5;
+/// Frames are sums of many terms: what is meant to be a half must not fall to either side by its last bits.
+constexpr double kSlack = 1e-6;
+
+struct Stretch {
+    double from = 0.0;
+    double to = 0.0;
+};
+
+/// In device pixels.
+Stretch snap(double from, double extent) {
+    const double start = std::floor(from + 0.5 + kSlack);
+    if (extent <= 0.0) {
+        return {start, start};
+    }
+    if (extent < kLine) {
+        return {start, start + 1.0};
+    }
+    return {start, std::max(start + 1.0, std::floor(from + extent + 0.5 + kSlack))};
+}
+
+}  // namespace
+
+QtCanvas::QtCanvas(QPainter& painter, const Palette& palette, double pixelsPerDeviceUnit)
+    : painter_(painter), palette_(palette), pixelsPerDeviceUnit_(std::max(pixelsPerDeviceUnit, 0.01)) {}
+
+QtCanvas::Grid QtCanvas::grid() const {
+    const QTransform t = painter_.deviceTransform();
+    const double k = pixelsPerDeviceUnit_;
+    return {t.m11() * k, t.m22() * k, t.dx() * k, t.dy() * k};
+}
+
+double QtCanvas::pixel() const {
+    return 1.0 / std::max(grid().scaleY, 1e-6);
+}
+
+QRectF QtCanvas::snapped(const platform::Rect& rect) const {
+    const Grid g = grid();
+    if (g.scaleX <= 0.0 || g.scaleY <= 0.0) {
+        return {rect.x, rect.y, rect.width, rect.height};
+    }
+    const Stretch x = snap(rect.x * g.scaleX + g.dx, rect.width * g.scaleX);
+    const Stretch y = snap(rect.y * g.scaleY + g.dy, rect.height * g.scaleY);
+    return {(x.from - g.dx) / g.scaleX, (y.from - g.dy) / g.scaleY, (x.to - x.from) / g.scaleX,
+            (y.to - y.from) / g.scaleY};
+}
+
+void QtCanvas::save() {
+    painter_.save();
+}
+
+void QtCanvas::restore() {
+    painter_.restore();
+}
+
+void QtCanvas::translate(double dx, double dy) {
+    painter_.translate(dx, dy);
+}
+
+void QtCanvas::clip(const platform::Rect& rect) {
+    painter_.setClipRect(snapped(rect), Qt::IntersectClip);
+}
+
+void QtCanvas::fill(const platform::Rect& rect, const platform::Color& color) {
+    if (color.isClear() || rect.width <= 0.0 || rect.height <= 0.0) {
+        return;
+    }
+    // The rectangle stands on whole pixels: smoothing its edges could only blur them by a rounding error.
+    const bool smooth = painter_.testRenderHint(QPainter::Antialiasing);
+    painter_.setRenderHint(QPainter::Antialiasing, false);
+    painter_.fillRect(snapped(rect), palette_.resolve(color));
+    painter_.setRenderHint(QPainter::Antialiasing, smooth);
+}
+
+void QtCanvas::draw(const platform::TextLayout& text, platform::Point origin, const platform::Color& color) {
+    const auto* layout = dynamic_cast<const QtTextLayout*>(&text);
+    if (layout == nullptr || layout->lines().empty()) {
+        return;
+    }
+    const Grid g = grid();
+    const double baseline = layout->lines().front().baseline;
+    double y = origin.y;
+    if (g.scaleY > 0.0) {
+        const double onDevice = (origin.y + baseline) * g.scaleY + g.dy;
+        y = (std::floor(onDevice + 0.5 + kSlack) - g.dy) / g.scaleY - baseline;
+    }
+    layout->draw(painter_, {origin.x, y}, palette_.resolve(color), palette_);
+}
+
+void QtCanvas::draw(const platform::Image& image, const platform::Rect& rect) {
+    if (const auto* picture = dynamic_cast<const QtImage*>(&image); picture != nullptr && rect.width > 0.0) {
+        picture->draw(painter_, snapped(rect), palette_);
+    }
+}
+
+}  // namespace ktr::linux_

@@ -1,0 +1,51 @@
+#pragma once
+
+#include <QRectF>
+
+#include "linux/ui/Palette.h"
+#include "platform/ui/Canvas.h"
+
+class QPainter;
+
+namespace ktr::linux_ {
+
+/// Paints views with a QPainter whose coordinates are points (its transformation, or its device's pixel ratio, makes
+/// pixels of them). Fills, clips and images are snapped to device pixels by their edges, so that neighbours meet; what
+/// is thinner than a pixel and a half is exactly one pixel thick. Baselines stand on whole pixels. Main thread.
+class QtCanvas final : public platform::Canvas {
+  public:
+    /// The painter and the palette must outlive the canvas. `pixelsPerDeviceUnit` refines the grid of a vector device,
+    /// whose units are not pixels: 2 snaps to halves of a unit.
+    QtCanvas(QPainter& painter, const Palette& palette, double pixelsPerDeviceUnit = 1.0);
+
+    void save() override;
+    void restore() override;
+    void translate(double dx, double dy) override;
+    void clip(const platform::Rect& rect) override;
+    void fill(const platform::Rect& rect, const platform::Color& color) override;
+    void draw(const platform::TextLayout& text, platform::Point origin, const platform::Color& color) override;
+    void draw(const platform::Image& image, const platform::Rect& rect) override;
+
+    /// For what a host paints around the views.
+    QPainter& painter() { return painter_; }
+    const Palette& palette() const { return palette_; }
+    /// The rectangle that `rect` becomes on the grid of device pixels, in points.
+    QRectF snapped(const platform::Rect& rect) const;
+    /// The size of a device pixel, points.
+    double pixel() const;
+
+  private:
+    struct Grid {
+        double scaleX = 1.0;
+        double scaleY = 1.0;
+        double dx = 0.0;
+        double dy = 0.0;
+    };
+    Grid grid() const;
+
+    QPainter& painter_;
+    const Palette& palette_;
+    double pixelsPerDeviceUnit_;
+};
+
+}  // namespace ktr::linux_

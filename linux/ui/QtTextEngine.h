@@ -1,0 +1,64 @@
+#pragma once
+
+#include <QString>
+#include <list>
+#include <memory>
+#include <mutex>
+#include <unordered_map>
+
+#include "linux/ui/FontChoice.h"
+#include "linux/ui/QtTextLayout.h"
+#include "platform/text/TextEngine.h"
+
+namespace ktr::linux_ {
+
+/// Shapes text with Qt. See platform::TextEngine. Notes beyond it:
+/// - A paragraph's direction is its first strong character's, the interface's without one.
+/// - With a limit of lines only as much text is shaped as can fit, however long it is. No line is measured wider than
+///   32,000 points: a longer one counts as cut.
+/// - Words are hyphenated at soft hyphens alone: a hyphenation factor above 0 has no dictionary to use.
+/// - Layouts are kept, the least recently used ones are dropped.
+/// Any thread, while a QGuiApplication exists.
+class QtTextEngine final : public platform::TextEngine {
+  public:
+    /// `language` (BCP 47) decides the forms of Han characters.
+    explicit QtTextEngine(const QString& language = {});
+
+    std::shared_ptr<const platform::TextLayout> layOut(const platform::AttributedString& text,
+                                                       const platform::TextContainer& container) override;
+    /// Drops what was kept: fonts depend on the language.
+    void setLanguage(const QString& language);
+    /// How many texts were shaped: what is asked for again is not.
+    std::size_t shapedCount() const;
+
+  private:
+    struct Key {
+        platform::AttributedString text;
+        platform::TextContainer container;
+        bool operator==(const Key&) const = default;
+    };
+    struct KeyHash {
+        std::size_t operator()(const Key& key) const;
+    };
+    struct Entry {
+        Key key;
+        std::shared_ptr<const QtTextLayout> layout;
+        std::size_t cost = 0;
+    };
+    using Entries = std::list<Entry>;
+
+    std::shared_ptr<const QtTextLayout> layOutOnce(const Key& key);
+    std::shared_ptr<const QtTextLayout> shape(const Key& key);
+    std::shared_ptr<const QtTextLayout> find(const Key& key);
+    void keep(const Key& key, const std::shared_ptr<const QtTextLayout>& layout);
+
+    mutable std::mutex mutex_;
+    FontChoice fonts_;
+    /// Most recently used first.
+    Entries entries_;
+    std::unordered_map<Key, Entries::iterator, KeyHash> index_;
+    std::size_t cost_ = 0;
+    std::size_t shaped_ = 0;
+};
+
+}  // namespace ktr::linux_
