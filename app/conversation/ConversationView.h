@@ -1,0 +1,34 @@
+#pragma once
+
+#include <memory>
+#include <vector>
+
+#include "app/conversation/CardShadow.h"
+#include "app/conversation/TurnView.h"
+#include "linux/ui/Palette.h"
+#include "platform/ui/View.h"
+
+namespace ktr::app {
+
+/// Turns from the oldest to the newest. It is laid out by `layOut` alone, never by constraints, since its height
+/// follows from its width. Main thread.
+class ConversationView : public platform::View {
+  public:
+    /// Adds a turn at the end.
+    void addTurn(const std::shared_ptr<TurnView>& turn);
+    const std::vector<std::shared_ptr<TurnView>>& turns() const { return turns_; }
+    /// Lays everything out for a width and takes the height that it needs, which is returned; points.
+    double layOut(double width);
+    /// What the host's own texts take their colours from.
+    void setPalette(const linux_::Palette& palette);
+
+  protected:
+    void draw(platform::Canvas& canvas) const override;
+
+  private:
+    std::vector<std::shared_ptr<TurnView>> turns_;
+    /// Painting keeps what it blurred.
+    mutable CardShadow shadow_;
+};
+
+}  // namespace ktr::app
