@@ -1,6 +1,8 @@
 #include "platform/ui/StackView.h"
 
 #include <algorithm>
+#include <unordered_set>
+#include <utility>
 
 #include "platform/base/Assert.h"
 #include "platform/layout/LayoutScope.h"
@@ -50,6 +52,32 @@ void StackView::removeArrangedSubview(const std::shared_ptr<View>& view) {
         LayoutScope::inputChanged(*this);
         setNeedsDisplay();
     }
+}
+
+void StackView::setArrangedSubviews(const std::vector<std::shared_ptr<View>>& views) {
+    KTR_ASSERT_MAIN_THREAD();
+    if (views == arranged_) {
+        return;
+    }
+    const std::unordered_set<std::shared_ptr<View>> before(arranged_.begin(), arranged_.end());
+    // Empty while subviews are added, so that each one is not compared with all of the arrangement.
+    arranged_.clear();
+    std::vector<std::shared_ptr<View>> after;
+    std::unordered_set<std::shared_ptr<View>> seen;
+    for (const auto& view : views) {
+        if (!view || isDescendantOf(*view) || !seen.insert(view).second) {
+            continue;
+        }
+        addSubview(view);
+        after.push_back(view);
+        if (!before.contains(view)) {
+            // What changed in it while it was not presented did not reach this stack.
+            view->setNeedsLayout();
+        }
+    }
+    arranged_ = std::move(after);
+    LayoutScope::inputChanged(*this);
+    setNeedsDisplay();
 }
 
 void StackView::subviewsChanged() {

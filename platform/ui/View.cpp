@@ -108,7 +108,7 @@ void View::removeSubviews(const std::vector<std::shared_ptr<View>>& views) {
     if (removed) {
         std::erase_if(subviews_, [](const auto& view) { return view->superview_.expired(); });
         subviewsChanged();
-        setNeedsLayout();
+        LayoutScope::inputChanged(*this);
     }
 }
 
