@@ -1,8 +1,11 @@
 #include "linux/ui/FontSetup.h"
 
 #include <QByteArray>
+#include <QDir>
 #include <QFile>
 #include <QFontDatabase>
+#include <QLoggingCategory>
+#include <QTemporaryFile>
 #include <array>
 
 #include "linux/ui/FontChoice.h"
@@ -20,7 +23,7 @@ constexpr std::array kPairs = {"NotoSans",         "NotoSansArabic",     "NotoSa
                                "NotoSansGujarati", "NotoSansOriya",      "NotoSansTamil",    "NotoSansTelugu",
                                "NotoSansKannada",  "NotoSansMalayalam",  "NotoSansSinhala",  "NotoSansThai",
                                "NotoSansLao",      "NotoSansMyanmar",    "NotoSansEthiopic", "NotoSansKhmer",
-                               "NotoSansThaana",   "NotoSansSymbols",    "NotoSansCherokee"};
+                               "NotoSansThaana",   "NotoSerifTibetan",   "NotoSansSymbols",  "NotoSansCherokee"};
 /// Those that come in Regular only.
 constexpr std::array kSingles = {"NotoSansSyriac", "NotoSansMongolian", "NotoSansSymbols2", "NotoSansMath"};
 
@@ -28,18 +31,38 @@ QString file(const char* folder, const char* name, const char* ending) {
     return QString::fromLatin1(folder) + QString::fromLatin1(name) + QString::fromLatin1(ending);
 }
 
+/// A configuration that lists no folders, so that fontconfig finds no font at all, in a file of the process's own.
+/// (From an unreadable or empty file fontconfig falls back to its built-in folders; what is no real file it does not
+/// open.)
+class EmptyConfiguration {
+  public:
+    EmptyConfiguration() {
+        file_.setFileTemplate(QDir::tempPath() + QStringLiteral("/ktr-fonts-XXXXXX.conf"));
+        written_ = file_.open() && file_.write("<?xml version=\"1.0\"?><fontconfig></fontconfig>") > 0 && file_.flush();
+    }
+    /// Empty when it could not be written.
+    QByteArray name() const { return written_ ? QFile::encodeName(file_.fileName()) : QByteArray(); }
+
+  private:
+    QTemporaryFile file_;  // removed with the object
+    bool written_ = false;
+};
+
 }  // namespace
 
 bool FontSetup::prepare(Mode mode, std::string* error) {
     // An emboldened or slanted face is none of the design's; where a weight is missing, Regular serves.
     bool done = qputenv("QT_NO_SYNTHESIZED_BOLD", "1") && qputenv("QT_NO_SYNTHESIZED_ITALIC", "1");
     if (mode == Mode::Pinned) {
-        // A configuration without folders: fontconfig finds no font at all.
-        done = done && qputenv("FONTCONFIG_FILE", "/dev/null");
+        static const EmptyConfiguration kEmpty;
+        const QByteArray file = kEmpty.name();
+        done = done && !file.isEmpty() && qputenv("FONTCONFIG_FILE", file);
     }
     if (!done && error != nullptr) {
         *error = "the environment for the fonts cannot be set";
     }
+    // Noto Sans leaves most scripts to fonts of their own, which is no news worth a line for each.
+    QLoggingCategory::setFilterRules(QStringLiteral("qt.text.font.*=false"));
     return done;
 }
 

@@ -93,11 +93,29 @@ std::unique_ptr<QTextLayout> LineBreaker::makeLayout(qsizetype from, qsizetype t
         range.format.setFont(fonts_.font(run.font, pixelSize(run.font), piece));
         formats.append(range);
     }
+    appendKeycaps(formats, piece, first.font);
     if (!formats.isEmpty()) {
         layout->setFormats(formats);
     }
     layout->setCacheEnabled(true);
     return layout;
+}
+
+void LineBreaker::appendKeycaps(QList<QTextLayout::FormatRange>& formats, const QString& piece,
+                                const platform::Font& font) const {
+    // A keycap is a digit with marks behind it: the text fonts would take the digit and leave an empty key.
+    constexpr char16_t kKeycap = 0x20E3;
+    constexpr char16_t kEmojiStyle = 0xFE0F;
+    for (qsizetype at = piece.indexOf(QChar(kKeycap)); at > 0; at = piece.indexOf(QChar(kKeycap), at + 1)) {
+        const qsizetype start = at - (at > 1 && piece[at - 1].unicode() == kEmojiStyle ? 2 : 1);
+        QTextLayout::FormatRange range;
+        range.start = static_cast<int>(start);
+        range.length = static_cast<int>(at - start + 1);
+        QFont keys = fonts_.font(font, pixelSize(font), {});
+        keys.setFamilies({FontChoice::emojiFamily(), FontChoice::baseFamily()});
+        range.format.setFont(keys);
+        formats.append(range);
+    }
 }
 
 std::shared_ptr<ShapedText> LineBreaker::share(std::unique_ptr<QTextLayout> layout, qsizetype from, int lines) const {
@@ -241,6 +259,10 @@ LineBreaker::Broken LineBreaker::breakLines(qsizetype shaped, bool grow) const {
         }
         Placed placed;
         placeLine(line, y, grow, placed);
+        // Only another script's font is taller than the box: what the base font sets needs no look at its glyphs.
+        const double below = placed.metrics.height - placed.metrics.ascent;
+        broken.tall = broken.tall || line.ascent() * scale_ > placed.metrics.ascent + 1.0 + kFit ||
+                      line.descent() * scale_ > below + 1.0 + kFit;
         broken.lines.push_back(placed);
     }
     broken.layout->endLayout();
@@ -259,7 +281,7 @@ std::shared_ptr<const QtTextLayout> LineBreaker::runLines() {
             shaped = wholeCharacter(std::min(whole, shaped * 2));
             continue;
         }
-        if (broken.lines.size() > 1) {
+        if (broken.lines.size() > 1 && broken.tall) {
             broken = breakLines(shaped, true);
         }
         return finish(std::move(broken));

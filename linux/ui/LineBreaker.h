@@ -47,6 +47,8 @@ class LineBreaker {
         std::unique_ptr<QTextLayout> layout;
         std::vector<Placed> lines;
         bool overflows = false;
+        /// Some line holds a font that is higher than the line's box.
+        bool tall = false;
     };
 
     std::shared_ptr<const QtTextLayout> runOneLine();
@@ -58,6 +60,8 @@ class LineBreaker {
     /// The layout of [from, to) with `tail` after it, its formats set, not yet broken.
     std::unique_ptr<QTextLayout> makeLayout(qsizetype from, qsizetype to, const QString& tail, bool wrap) const;
     std::unique_ptr<QTextLayout> shapeLine(qsizetype from, qsizetype to, const QString& tail) const;
+    void appendKeycaps(QList<QTextLayout::FormatRange>& formats, const QString& piece,
+                       const platform::Font& font) const;
     std::shared_ptr<ShapedText> share(std::unique_ptr<QTextLayout> layout, qsizetype from, int lines) const;
     /// The line from `from` cut so that it ends in an ellipsis and fits `room` points; none when not even that fits.
     std::unique_ptr<QTextLayout> cutLine(qsizetype from, qsizetype to, double room) const;

@@ -1,6 +1,7 @@
 #include "linux/ui/ScenePainter.h"
 
 #include <QBuffer>
+#include <QHashFunctions>
 #include <QImageWriter>
 #include <QPageSize>
 #include <QPainter>
@@ -24,6 +25,14 @@ std::string numbered(int width, int height) {
 std::string failure(const std::string& path, const QString& reason) {
     return path + ": cannot be written: " + reason.toStdString();
 }
+
+class FixedHashes {
+  public:
+    FixedHashes() { QHashSeed::setDeterministicGlobalSeed(); }
+    ~FixedHashes() { QHashSeed::resetRandomGlobalSeed(); }
+    FixedHashes(const FixedHashes&) = delete;
+    FixedHashes& operator=(const FixedHashes&) = delete;
+};
 
 /// The creation date in a PDF would make each run's file another one.
 QByteArray withoutDates(QByteArray pdf) {
@@ -99,6 +108,8 @@ bool ScenePainter::writeSvg(QIODevice& file, const Paint& paint) const {
 }
 
 bool ScenePainter::writePdf(QIODevice& file, const Paint& paint) const {
+    // Fonts stand in the file in the order of a hash: with a random seed each run would write another file.
+    const FixedHashes fixed;
     QByteArray data;
     QBuffer buffer(&data);
     buffer.open(QIODevice::WriteOnly);
