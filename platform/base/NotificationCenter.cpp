@@ -33,11 +33,15 @@ NotificationCenter::Token::~Token() {
 }
 
 void NotificationCenter::Token::remove() {
-    if (const auto state = state_.lock()) {
-        const std::lock_guard lock(state->mutex);
-        state->observers.erase(id_);
-    }
+    const auto state = state_.lock();
     state_.reset();
+    if (!state) {
+        return;
+    }
+    // The handler is destroyed outside the lock: it may own tokens itself.
+    decltype(state->observers)::node_type removed;
+    const std::lock_guard lock(state->mutex);
+    removed = state->observers.extract(id_);
 }
 
 NotificationCenter::NotificationCenter() : state_(std::make_shared<Token::State>()) {}
