@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <optional>
 #include <string>
 #include <unordered_map>
 #include <vector>
@@ -32,21 +33,22 @@ class MemoryContactStore : public platform::ContactStore {
   private:
     struct StoredNumber {
         std::size_t contact = 0;
-        std::string e164;  ///< empty for what is no number
-        bool complete = false;
+        std::size_t number = 0;
     };
 
-    void indexPhoneNumbers();
+    bool matches(const std::string& stored, const std::string& asked,
+                 const std::optional<PhoneNumberParts>& askedParts) const;
+    /// The contacts at these positions, each once, in the store's order.
     Contacts contactsAt(std::vector<std::size_t> positions) const;
 
     Contacts contacts_;
     std::shared_ptr<PhonenumberLibrary> phoneNumbers_;
     std::string homeCountryCode_;
-    bool phoneNumbersIndexed_ = false;
     std::unordered_map<std::string, std::vector<std::size_t>> byEmail_;
     std::unordered_map<std::string, std::size_t> byIdentifier_;
-    /// By national part; of what is no number, by its digits.
-    std::unordered_map<std::string, std::vector<StoredNumber>> byNationalPart_;
+    /// By the last digits: numbers that are the same end alike, however they are written. What shares them is compared
+    /// by the phone-number library when it is asked for, so that a large store costs nothing to start with.
+    std::unordered_map<std::string, std::vector<StoredNumber>> byLastDigits_;
 };
 
 }  // namespace ktr::linux_

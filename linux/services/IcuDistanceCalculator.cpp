@@ -1,0 +1,157 @@
+#include "linux/services/IcuDistanceCalculator.h"
+
+#include <cmath>
+#include <string_view>
+#include <utility>
+
+#include <unicode/locid.h>
+#include <unicode/numberformatter.h>
+#include <unicode/ulocdata.h>
+
+#include "platform/base/Format.h"
+
+namespace ktr::linux_ {
+
+namespace {
+
+constexpr const char* kFrameKey = "DISTANCE_TEXT";
+constexpr std::string_view kNoBreakSpace = "\u00a0";
+
+icu::Locale localeOf(const std::string& tag) {
+    UErrorCode status = U_ZERO_ERROR;
+    auto locale = icu::Locale::forLanguageTag(tag, status);
+    return U_FAILURE(status) || locale.isBogus() ? icu::Locale::getRoot() : locale;
+}
+
+std::string keyword(const icu::Locale& locale, const char* name) {
+    UErrorCode status = U_ZERO_ERROR;
+    const auto value = locale.getUnicodeKeywordValue<std::string>(name, status);
+    return U_SUCCESS(status) ? value : std::string();
+}
+
+/// What a locale says of units outright (Unicode locale keyword "ms").
+std::optional<UnitSystem> explicitSystem(const icu::Locale& locale) {
+    const std::string name = keyword(locale, "ms");
+    if (name == "metric") {
+        return UnitSystem::Metric;
+    }
+    if (name == "ussystem") {
+        return UnitSystem::ImperialUS;
+    }
+    if (name == "uksystem") {
+        return UnitSystem::ImperialUK;
+    }
+    return std::nullopt;
+}
+
+/// A region of which the system is the custom: the keyword "ms" alone does not choose the units of roads.
+std::string regionOf(UnitSystem system) {
+    switch (system) {
+        case UnitSystem::Metric:
+            return "DE";
+        case UnitSystem::ImperialUS:
+            return "US";
+        case UnitSystem::ImperialUK:
+            return "GB";
+    }
+    return "DE";
+}
+
+/// Two letters; empty when nothing is known.
+std::string regionOf(const icu::Locale& locale) {
+    const std::string overriding = keyword(locale, "rg");
+    if (overriding.size() >= 2) {
+        std::string region = overriding.substr(0, 2);
+        for (char& c : region) {
+            c = static_cast<char>(c >= 'a' && c <= 'z' ? c - 'a' + 'A' : c);
+        }
+        return region;
+    }
+    icu::Locale likely = locale;
+    UErrorCode status = U_ZERO_ERROR;
+    if (std::string_view(likely.getCountry()).empty()) {
+        likely.addLikelySubtags(status);
+    }
+    return U_SUCCESS(status) ? likely.getCountry() : "";
+}
+
+UnitSystem systemOf(const std::string& region) {
+    UErrorCode status = U_ZERO_ERROR;
+    const auto system = ulocdata_getMeasurementSystem(("und_" + region).c_str(), &status);
+    if (U_FAILURE(status)) {
+        return UnitSystem::Metric;
+    }
+    return system == UMS_US ? UnitSystem::ImperialUS : system == UMS_UK ? UnitSystem::ImperialUK : UnitSystem::Metric;
+}
+
+icu::Locale withRegionOverride(icu::Locale language, const std::string& region) {
+    UErrorCode status = U_ZERO_ERROR;
+    language.setUnicodeKeywordValue("ms", nullptr, status);
+    status = U_ZERO_ERROR;
+    if (region.size() == 2) {
+        language.setUnicodeKeywordValue("rg", region + "zzzz", status);
+    }
+    return language;
+}
+
+}  // namespace
+
+struct IcuDistanceCalculator::Formatter {
+    icu::number::LocalizedNumberFormatter road;
+    bool usable = false;
+};
+
+IcuDistanceCalculator::IcuDistanceCalculator(Settings settings, std::optional<UnitSystem> override,
+                                             std::shared_ptr<platform::Geodesy> geodesy)
+    : settings_(std::move(settings)),
+      system_(UnitSystem::Metric),
+      geodesy_(std::move(geodesy)),
+      formatter_(std::make_unique<Formatter>()) {
+    const icu::Locale units = localeOf(settings_.measurementSystemLocale);
+    if (!override) {
+        override = explicitSystem(units);
+    }
+    const std::string region = override ? regionOf(*override) : regionOf(units);
+    system_ = override ? *override : systemOf(region);
+    const icu::Locale language = localeOf(settings_.languageLocale.value_or(settings_.measurementSystemLocale));
+    // In Arabic the short form spells the unit out and inflects it; the narrow one is the abbreviation.
+    const bool narrow = std::string_view(language.getLanguage()) == "ar";
+    UErrorCode status = U_ZERO_ERROR;
+    formatter_->road =
+        icu::number::NumberFormatter::forSkeleton(
+            narrow ? u"unit/meter usage/road unit-width-narrow" : u"unit/meter usage/road unit-width-short", status)
+            .locale(withRegionOverride(language, region));
+    formatter_->usable = U_SUCCESS(status);
+}
+
+IcuDistanceCalculator::~IcuDistanceCalculator() = default;
+
+std::optional<std::string> IcuDistanceCalculator::localizedDistance(const platform::PlatformLocation& from,
+                                                                    const platform::PlatformLocation& to) {
+    return localizedDistance(geodesy_->distance(from.coordinate(), to.coordinate()));
+}
+
+std::optional<std::string> IcuDistanceCalculator::localizedDistance(double metres) const {
+    if (!formatter_->usable || !std::isfinite(metres) || metres < 0.0) {
+        return std::nullopt;
+    }
+    UErrorCode status = U_ZERO_ERROR;
+    std::string text;
+    formatter_->road.formatDouble(metres, status).toString(status).toUTF8String(text);
+    if (U_FAILURE(status)) {
+        return std::nullopt;
+    }
+    for (auto at = text.find(' '); at != std::string::npos; at = text.find(' ', at)) {
+        text.replace(at, 1, kNoBreakSpace);
+    }
+    if (const auto& texts = settings_.localizationDelegate) {
+        text = platform::formatted(texts->text(kFrameKey, texts->hostBundleIdentifier(), std::nullopt, "%@"), {text});
+    }
+    return text;
+}
+
+long IcuDistanceCalculator::measurementSystem() const {
+    return static_cast<long>(system_);
+}
+
+}  // namespace ktr::linux_

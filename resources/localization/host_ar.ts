@@ -1,0 +1,72 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="ar" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>TODAY</source>
+        <extracomment>Above a question; %@ is the time of day. English: “Today, %@”</extracomment>
+        <translation>اليوم، %@</translation>
+    </message>
+    <message>
+        <source>ASK</source>
+        <extracomment>In the empty field where the next question is written. English: “Ask about your friends”</extracomment>
+        <translation>اسأل عن أصدقائك</translation>
+    </message>
+    <message>
+        <source>ASK_SHORT</source>
+        <extracomment>The same with very large text. English: “Ask”</extracomment>
+        <translation>اسأل</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE</source>
+        <extracomment>Below the field: what is shown is kept up to date. English: “Live · updated just now”</extracomment>
+        <translation>مباشر · حُدّث للتو</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED</source>
+        <extracomment>Below the field; %@ is a number of minutes. Abbreviate the unit. English: “Paused · updated %@ min ago”</extracomment>
+        <translation>متوقف مؤقتًا · حُدّث قبل %@ د</translation>
+    </message>
+    <message>
+        <source>STATUS_LOCATING</source>
+        <extracomment>Below the field: the user’s own position is being found. English: “Finding where you are…”</extracomment>
+        <translation>جارٍ تحديد موقعك…</translation>
+    </message>
+    <message>
+        <source>STATUS_HIDDEN</source>
+        <extracomment>Below the field: friends cannot see the user. English: “Your location is hidden”</extracomment>
+        <translation>موقعك مخفيّ</translation>
+    </message>
+    <message>
+        <source>DISTANCE_TEXT</source>
+        <extracomment>A frame around each distance (%@, with its unit), for a language that needs one; usually %@ alone. English: “%@”</extracomment>
+        <translation>%@</translation>
+    </message>
+    <message>
+        <source>_$!&lt;home&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Home”</extracomment>
+        <translation>المنزل</translation>
+    </message>
+    <message>
+        <source>_$!&lt;work&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Work”</extracomment>
+        <translation>العمل</translation>
+    </message>
+    <message>
+        <source>_$!&lt;school&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “School”</extracomment>
+        <translation>المدرسة</translation>
+    </message>
+    <message>
+        <source>_$!&lt;gym&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Gym”</extracomment>
+        <translation>النادي الرياضي</translation>
+    </message>
+    <message>
+        <source>_$!&lt;other&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Other”</extracomment>
+        <translation>مكان آخر</translation>
+    </message>
+</context>
+</TS>

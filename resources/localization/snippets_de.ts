@@ -1,0 +1,162 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="de" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>APPLICATION_NAME</source>
+        <extracomment>The title of the card. English: “Friends”</extracomment>
+        <translation>Freunde</translation>
+    </message>
+    <message>
+        <source>LOCATING_FRIENDS</source>
+        <extracomment>Shown while nobody has been found yet. English: “Finding your friends…”</extracomment>
+        <translation>Deine Freunde werden gesucht …</translation>
+    </message>
+    <message>
+        <source>NO_FRIENDS_FOUND</source>
+        <extracomment>Nobody is at the place that was asked for. English: “No friends found there.”</extracomment>
+        <translation>Dort wurden keine Freunde gefunden.</translation>
+    </message>
+    <message>
+        <source>SHOW_ALL</source>
+        <extracomment>The last row of a list that shows only some friends; tapping it shows all. English: “Show all friends”</extracomment>
+        <translation>Alle Freunde anzeigen</translation>
+    </message>
+    <message>
+        <source>LOCATING</source>
+        <extracomment>In the place of a place, while one friend is still being looked for. English: “Locating…”</extracomment>
+        <translation>Standort wird gesucht …</translation>
+    </message>
+    <message>
+        <source>NO_LOCATION</source>
+        <extracomment>In the place of a place, when none is known. English: “No location found”</extracomment>
+        <translation>Kein Standort gefunden</translation>
+    </message>
+    <message>
+        <source>CITY_STATE_LABEL</source>
+        <extracomment>%1$@ is the city, %2$@ the state or its code; change their order where the language does. English: “%1$@, %2$@”</extracomment>
+        <translation>%1$@, %2$@</translation>
+    </message>
+    <message>
+        <source>HIDDEN_LOCATION</source>
+        <extracomment>In the user’s own row, in the place of a place, while friends cannot see it. English: “Hidden from friends”</extracomment>
+        <translation>Für Freunde verborgen</translation>
+    </message>
+    <message>
+        <source>LOCATED_NOW</source>
+        <extracomment>How old a position is: up to 30 seconds. English: “Now”</extracomment>
+        <translation>Jetzt</translation>
+    </message>
+    <message>
+        <source>LOCATED_LESS_THAN_30SECONDS</source>
+        <extracomment>How old a position is: 31 to 59 seconds. The key’s name is misleading; %@ is always 30. Abbreviate the unit so that no plural is needed. English: “Over %@ s ago”</extracomment>
+        <translation>Vor über %@ Sek.</translation>
+    </message>
+    <message>
+        <source>LOCATED_MINUTES</source>
+        <extracomment>How old a position is: %@ is 1 to 59. Abbreviate the unit so that no plural is needed. English: “%@ min ago”</extracomment>
+        <translation>Vor %@ Min.</translation>
+    </message>
+    <message>
+        <source>LOCATED_LESS_THAN_1HR</source>
+        <extracomment>How old a position is: 60 to 119 minutes. The key’s name is misleading; %@ is always 1. Abbreviate the unit. English: “Over %@ h ago”</extracomment>
+        <translation>Vor über %@ Std.</translation>
+    </message>
+    <message>
+        <source>LOCATED_MORE_THAN_1HR</source>
+        <extracomment>How old a position is: %@ is 2 or more. Abbreviate the unit so that no plural is needed. English: “%@ h ago”</extracomment>
+        <translation>Vor %@ Std.</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_NOW</source>
+        <extracomment>Read aloud: how old a position is, up to 30 seconds. English: “Located now”</extracomment>
+        <translation>Gerade eben geortet</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_LESS_THAN_30SECONDS</source>
+        <extracomment>Read aloud: 31 to 59 seconds; %@ is always 30. English: “Located more than %@ seconds ago”</extracomment>
+        <translation>Vor mehr als %@ Sekunden geortet</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_MINUTE</source>
+        <extracomment>Read aloud: one minute; %@ is always 1. English: “Located %@ minute ago”</extracomment>
+        <translation>Vor %@ Minute geortet</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_MINUTES</source>
+        <extracomment>Read aloud: %@ is 2 to 59; word it so that it is right for each of them. English: “Located %@ minutes ago”</extracomment>
+        <translation>Vor %@ Minuten geortet</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_LESS_THAN_1HR</source>
+        <extracomment>Read aloud: 60 to 119 minutes; %@ is always 1. English: “Located more than %@ hour ago”</extracomment>
+        <translation>Vor mehr als %@ Stunde geortet</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>
+        <extracomment>Read aloud: %@ is 2 or more; word it so that it is right for each of them. English: “Located %@ hours ago”</extracomment>
+        <translation>Vor %@ Stunden geortet</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_DISTANCE</source>
+        <extracomment>Read aloud: %@ is a distance with its unit. English: “%@ away”</extracomment>
+        <translation>%@ entfernt</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_AT_LABEL</source>
+        <extracomment>Read aloud: %@ is a place, such as “Fish Market”, “Home” or “Brinmouth, HB”. English: “At %@”</extracomment>
+        <translation>Ort: %@</translation>
+    </message>
+    <message>
+        <source>IMMEDIATE_LABEL</source>
+        <extracomment>A promise about one friend, of any gender: the user is told at once where they are. English: “You’ll hear where they are now”</extracomment>
+        <translation>Du erfährst sofort den Standort</translation>
+    </message>
+    <message>
+        <source>LEAVING_LABEL</source>
+        <extracomment>A promise about one friend, of any gender; %@ is a place. English: “You’ll hear when they leave %@”</extracomment>
+        <translation>Du bekommst Bescheid, sobald „%@“ verlassen wird</translation>
+    </message>
+    <message>
+        <source>ARRIVING_LABEL</source>
+        <extracomment>A promise about one friend, of any gender; %@ is a place. English: “You’ll hear when they arrive at %@”</extracomment>
+        <translation>Du bekommst Bescheid, sobald „%@“ erreicht ist</translation>
+    </message>
+    <message>
+        <source>LEAVING_LABEL_ABSOLUTE</source>
+        <extracomment>The same without a place. English: “You’ll hear when they leave”</extracomment>
+        <translation>Du bekommst Bescheid beim Aufbruch</translation>
+    </message>
+    <message>
+        <source>ARRIVING_LABEL_ABSOLUTE</source>
+        <extracomment>The same without a place. English: “You’ll hear when they arrive”</extracomment>
+        <translation>Du bekommst Bescheid bei der Ankunft</translation>
+    </message>
+    <message>
+        <source>_$!&lt;home&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Home”</extracomment>
+        <translation>Zuhause</translation>
+    </message>
+    <message>
+        <source>_$!&lt;work&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Work”</extracomment>
+        <translation>Arbeit</translation>
+    </message>
+    <message>
+        <source>_$!&lt;school&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “School”</extracomment>
+        <translation>Schule</translation>
+    </message>
+    <message>
+        <source>_$!&lt;gym&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Gym”</extracomment>
+        <translation>Fitnessstudio</translation>
+    </message>
+    <message>
+        <source>_$!&lt;other&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Other”</extracomment>
+        <translation>Anderer Ort</translation>
+    </message>
+</context>
+</TS>

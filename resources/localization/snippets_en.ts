@@ -1,0 +1,162 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="en" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>APPLICATION_NAME</source>
+        <extracomment>The title of the card</extracomment>
+        <translation>Friends</translation>
+    </message>
+    <message>
+        <source>LOCATING_FRIENDS</source>
+        <extracomment>Shown while nobody has been found yet</extracomment>
+        <translation>Finding your friends…</translation>
+    </message>
+    <message>
+        <source>NO_FRIENDS_FOUND</source>
+        <extracomment>Nobody is at the place that was asked for</extracomment>
+        <translation>No friends found there.</translation>
+    </message>
+    <message>
+        <source>SHOW_ALL</source>
+        <extracomment>The last row of a list that shows only some friends; tapping it shows all</extracomment>
+        <translation>Show all friends</translation>
+    </message>
+    <message>
+        <source>LOCATING</source>
+        <extracomment>In the place of a place, while one friend is still being looked for</extracomment>
+        <translation>Locating…</translation>
+    </message>
+    <message>
+        <source>NO_LOCATION</source>
+        <extracomment>In the place of a place, when none is known</extracomment>
+        <translation>No location found</translation>
+    </message>
+    <message>
+        <source>CITY_STATE_LABEL</source>
+        <extracomment>%1$@ is the city, %2$@ the state or its code; change their order where the language does</extracomment>
+        <translation>%1$@, %2$@</translation>
+    </message>
+    <message>
+        <source>HIDDEN_LOCATION</source>
+        <extracomment>In the user’s own row, in the place of a place, while friends cannot see it</extracomment>
+        <translation>Hidden from friends</translation>
+    </message>
+    <message>
+        <source>LOCATED_NOW</source>
+        <extracomment>How old a position is: up to 30 seconds</extracomment>
+        <translation>Now</translation>
+    </message>
+    <message>
+        <source>LOCATED_LESS_THAN_30SECONDS</source>
+        <extracomment>How old a position is: 31 to 59 seconds. The key’s name is misleading; %@ is always 30. Abbreviate the unit so that no plural is needed</extracomment>
+        <translation>Over %@ s ago</translation>
+    </message>
+    <message>
+        <source>LOCATED_MINUTES</source>
+        <extracomment>How old a position is: %@ is 1 to 59. Abbreviate the unit so that no plural is needed</extracomment>
+        <translation>%@ min ago</translation>
+    </message>
+    <message>
+        <source>LOCATED_LESS_THAN_1HR</source>
+        <extracomment>How old a position is: 60 to 119 minutes. The key’s name is misleading; %@ is always 1. Abbreviate the unit</extracomment>
+        <translation>Over %@ h ago</translation>
+    </message>
+    <message>
+        <source>LOCATED_MORE_THAN_1HR</source>
+        <extracomment>How old a position is: %@ is 2 or more. Abbreviate the unit so that no plural is needed</extracomment>
+        <translation>%@ h ago</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_NOW</source>
+        <extracomment>Read aloud: how old a position is, up to 30 seconds</extracomment>
+        <translation>Located now</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_LESS_THAN_30SECONDS</source>
+        <extracomment>Read aloud: 31 to 59 seconds; %@ is always 30</extracomment>
+        <translation>Located more than %@ seconds ago</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_MINUTE</source>
+        <extracomment>Read aloud: one minute; %@ is always 1</extracomment>
+        <translation>Located %@ minute ago</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_MINUTES</source>
+        <extracomment>Read aloud: %@ is 2 to 59; word it so that it is right for each of them</extracomment>
+        <translation>Located %@ minutes ago</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_LESS_THAN_1HR</source>
+        <extracomment>Read aloud: 60 to 119 minutes; %@ is always 1</extracomment>
+        <translation>Located more than %@ hour ago</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>
+        <extracomment>Read aloud: %@ is 2 or more; word it so that it is right for each of them</extracomment>
+        <translation>Located %@ hours ago</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_DISTANCE</source>
+        <extracomment>Read aloud: %@ is a distance with its unit</extracomment>
+        <translation>%@ away</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_AT_LABEL</source>
+        <extracomment>Read aloud: %@ is a place, such as “Fish Market”, “Home” or “Brinmouth, HB”</extracomment>
+        <translation>At %@</translation>
+    </message>
+    <message>
+        <source>IMMEDIATE_LABEL</source>
+        <extracomment>A promise about one friend, of any gender: the user is told at once where they are</extracomment>
+        <translation>You’ll hear where they are now</translation>
+    </message>
+    <message>
+        <source>LEAVING_LABEL</source>
+        <extracomment>A promise about one friend, of any gender; %@ is a place</extracomment>
+        <translation>You’ll hear when they leave %@</translation>
+    </message>
+    <message>
+        <source>ARRIVING_LABEL</source>
+        <extracomment>A promise about one friend, of any gender; %@ is a place</extracomment>
+        <translation>You’ll hear when they arrive at %@</translation>
+    </message>
+    <message>
+        <source>LEAVING_LABEL_ABSOLUTE</source>
+        <extracomment>The same without a place</extracomment>
+        <translation>You’ll hear when they leave</translation>
+    </message>
+    <message>
+        <source>ARRIVING_LABEL_ABSOLUTE</source>
+        <extracomment>The same without a place</extracomment>
+        <translation>You’ll hear when they arrive</translation>
+    </message>
+    <message>
+        <source>_$!&lt;home&gt;!$_</source>
+        <extracomment>A built-in name for a place</extracomment>
+        <translation>Home</translation>
+    </message>
+    <message>
+        <source>_$!&lt;work&gt;!$_</source>
+        <extracomment>A built-in name for a place</extracomment>
+        <translation>Work</translation>
+    </message>
+    <message>
+        <source>_$!&lt;school&gt;!$_</source>
+        <extracomment>A built-in name for a place</extracomment>
+        <translation>School</translation>
+    </message>
+    <message>
+        <source>_$!&lt;gym&gt;!$_</source>
+        <extracomment>A built-in name for a place</extracomment>
+        <translation>Gym</translation>
+    </message>
+    <message>
+        <source>_$!&lt;other&gt;!$_</source>
+        <extracomment>A built-in name for a place</extracomment>
+        <translation>Other</translation>
+    </message>
+</context>
+</TS>

@@ -1,0 +1,162 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="ja" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>APPLICATION_NAME</source>
+        <extracomment>The title of the card. English: “Friends”</extracomment>
+        <translation>友だち</translation>
+    </message>
+    <message>
+        <source>LOCATING_FRIENDS</source>
+        <extracomment>Shown while nobody has been found yet. English: “Finding your friends…”</extracomment>
+        <translation>友だちを探しています…</translation>
+    </message>
+    <message>
+        <source>NO_FRIENDS_FOUND</source>
+        <extracomment>Nobody is at the place that was asked for. English: “No friends found there.”</extracomment>
+        <translation>そこに友だちは見つかりませんでした。</translation>
+    </message>
+    <message>
+        <source>SHOW_ALL</source>
+        <extracomment>The last row of a list that shows only some friends; tapping it shows all. English: “Show all friends”</extracomment>
+        <translation>友だちをすべて表示</translation>
+    </message>
+    <message>
+        <source>LOCATING</source>
+        <extracomment>In the place of a place, while one friend is still being looked for. English: “Locating…”</extracomment>
+        <translation>位置情報を確認中…</translation>
+    </message>
+    <message>
+        <source>NO_LOCATION</source>
+        <extracomment>In the place of a place, when none is known. English: “No location found”</extracomment>
+        <translation>位置情報がありません</translation>
+    </message>
+    <message>
+        <source>CITY_STATE_LABEL</source>
+        <extracomment>%1$@ is the city, %2$@ the state or its code; change their order where the language does. English: “%1$@, %2$@”</extracomment>
+        <translation>%2$@ %1$@</translation>
+    </message>
+    <message>
+        <source>HIDDEN_LOCATION</source>
+        <extracomment>In the user’s own row, in the place of a place, while friends cannot see it. English: “Hidden from friends”</extracomment>
+        <translation>友だちに非公開</translation>
+    </message>
+    <message>
+        <source>LOCATED_NOW</source>
+        <extracomment>How old a position is: up to 30 seconds. English: “Now”</extracomment>
+        <translation>たった今</translation>
+    </message>
+    <message>
+        <source>LOCATED_LESS_THAN_30SECONDS</source>
+        <extracomment>How old a position is: 31 to 59 seconds. The key’s name is misleading; %@ is always 30. Abbreviate the unit so that no plural is needed. English: “Over %@ s ago”</extracomment>
+        <translation>%@秒以上前</translation>
+    </message>
+    <message>
+        <source>LOCATED_MINUTES</source>
+        <extracomment>How old a position is: %@ is 1 to 59. Abbreviate the unit so that no plural is needed. English: “%@ min ago”</extracomment>
+        <translation>%@分前</translation>
+    </message>
+    <message>
+        <source>LOCATED_LESS_THAN_1HR</source>
+        <extracomment>How old a position is: 60 to 119 minutes. The key’s name is misleading; %@ is always 1. Abbreviate the unit. English: “Over %@ h ago”</extracomment>
+        <translation>%@時間以上前</translation>
+    </message>
+    <message>
+        <source>LOCATED_MORE_THAN_1HR</source>
+        <extracomment>How old a position is: %@ is 2 or more. Abbreviate the unit so that no plural is needed. English: “%@ h ago”</extracomment>
+        <translation>%@時間前</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_NOW</source>
+        <extracomment>Read aloud: how old a position is, up to 30 seconds. English: “Located now”</extracomment>
+        <translation>たった今の位置情報です</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_LESS_THAN_30SECONDS</source>
+        <extracomment>Read aloud: 31 to 59 seconds; %@ is always 30. English: “Located more than %@ seconds ago”</extracomment>
+        <translation>%@秒以上前の位置情報です</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_MINUTE</source>
+        <extracomment>Read aloud: one minute; %@ is always 1. English: “Located %@ minute ago”</extracomment>
+        <translation>%@分前の位置情報です</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_MINUTES</source>
+        <extracomment>Read aloud: %@ is 2 to 59; word it so that it is right for each of them. English: “Located %@ minutes ago”</extracomment>
+        <translation>%@分前の位置情報です</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_LESS_THAN_1HR</source>
+        <extracomment>Read aloud: 60 to 119 minutes; %@ is always 1. English: “Located more than %@ hour ago”</extracomment>
+        <translation>%@時間以上前の位置情報です</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>
+        <extracomment>Read aloud: %@ is 2 or more; word it so that it is right for each of them. English: “Located %@ hours ago”</extracomment>
+        <translation>%@時間前の位置情報です</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_DISTANCE</source>
+        <extracomment>Read aloud: %@ is a distance with its unit. English: “%@ away”</extracomment>
+        <translation>%@離れています</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_AT_LABEL</source>
+        <extracomment>Read aloud: %@ is a place, such as “Fish Market”, “Home” or “Brinmouth, HB”. English: “At %@”</extracomment>
+        <translation>%@にいます</translation>
+    </message>
+    <message>
+        <source>IMMEDIATE_LABEL</source>
+        <extracomment>A promise about one friend, of any gender: the user is told at once where they are. English: “You’ll hear where they are now”</extracomment>
+        <translation>今いる場所をお知らせします</translation>
+    </message>
+    <message>
+        <source>LEAVING_LABEL</source>
+        <extracomment>A promise about one friend, of any gender; %@ is a place. English: “You’ll hear when they leave %@”</extracomment>
+        <translation>%@を出たらお知らせします</translation>
+    </message>
+    <message>
+        <source>ARRIVING_LABEL</source>
+        <extracomment>A promise about one friend, of any gender; %@ is a place. English: “You’ll hear when they arrive at %@”</extracomment>
+        <translation>%@に着いたらお知らせします</translation>
+    </message>
+    <message>
+        <source>LEAVING_LABEL_ABSOLUTE</source>
+        <extracomment>The same without a place. English: “You’ll hear when they leave”</extracomment>
+        <translation>出発したらお知らせします</translation>
+    </message>
+    <message>
+        <source>ARRIVING_LABEL_ABSOLUTE</source>
+        <extracomment>The same without a place. English: “You’ll hear when they arrive”</extracomment>
+        <translation>到着したらお知らせします</translation>
+    </message>
+    <message>
+        <source>_$!&lt;home&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Home”</extracomment>
+        <translation>自宅</translation>
+    </message>
+    <message>
+        <source>_$!&lt;work&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Work”</extracomment>
+        <translation>職場</translation>
+    </message>
+    <message>
+        <source>_$!&lt;school&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “School”</extracomment>
+        <translation>学校</translation>
+    </message>
+    <message>
+        <source>_$!&lt;gym&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Gym”</extracomment>
+        <translation>ジム</translation>
+    </message>
+    <message>
+        <source>_$!&lt;other&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Other”</extracomment>
+        <translation>その他</translation>
+    </message>
+</context>
+</TS>
