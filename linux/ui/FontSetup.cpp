@@ -4,9 +4,10 @@
 #include <QDir>
 #include <QFile>
 #include <QFontDatabase>
-#include <QLoggingCategory>
 #include <QTemporaryFile>
+#include <QtGlobal>
 #include <array>
+#include <cstdio>
 
 #include "linux/ui/FontChoice.h"
 
@@ -26,6 +27,21 @@ constexpr std::array kPairs = {"NotoSans",         "NotoSansArabic",     "NotoSa
                                "NotoSansThaana",   "NotoSerifTibetan",   "NotoSansSymbols",  "NotoSansCherokee"};
 /// Those that come in Regular only.
 constexpr std::array kSingles = {"NotoSansSyriac", "NotoSansMongolian", "NotoSansSymbols2", "NotoSansMath"};
+
+QtMessageHandler previousHandler = nullptr;
+
+/// Noto Sans leaves most scripts to fonts of their own. Qt says so for each script, and that is no news; there is no
+/// category to switch it off by.
+void passOn(QtMsgType type, const QMessageLogContext& context, const QString& text) {
+    if (text.contains(QLatin1String("OpenType support missing"))) {
+        return;
+    }
+    if (previousHandler != nullptr) {
+        previousHandler(type, context, text);
+    } else {
+        std::fprintf(stderr, "%s\n", qFormatLogMessage(type, context, text).toLocal8Bit().constData());
+    }
+}
 
 QString file(const char* folder, const char* name, const char* ending) {
     return QString::fromLatin1(folder) + QString::fromLatin1(name) + QString::fromLatin1(ending);
@@ -61,8 +77,11 @@ bool FontSetup::prepare(Mode mode, std::string* error) {
     if (!done && error != nullptr) {
         *error = "the environment for the fonts cannot be set";
     }
-    // Noto Sans leaves most scripts to fonts of their own, which is no news worth a line for each.
-    QLoggingCategory::setFilterRules(QStringLiteral("qt.text.font.*=false"));
+    static const bool kQuiet = [] {
+        previousHandler = qInstallMessageHandler(passOn);
+        return true;
+    }();
+    static_cast<void>(kQuiet);
     return done;
 }
 
