@@ -100,7 +100,9 @@ void FloorScene::updateAll(bool next) {
     }
 }
 
-void FloorScene::updateOne(std::size_t row, bool next) { fill(rows_[row], next); }
+void FloorScene::updateOne(std::size_t row, bool next) {
+    fill(rows_[row], next);
+}
 
 void FloorScene::resize(double width) {
     width_ = width;
@@ -109,7 +111,9 @@ void FloorScene::resize(double width) {
     }
 }
 
-double FloorScene::height() const { return static_cast<double>(rows_.size()) * kRowHeight; }
+double FloorScene::height() const {
+    return static_cast<double>(rows_.size()) * kRowHeight;
+}
 
 void FloorScene::paint(QImage& image, double scale) {
     image.fill(QColor("#FFFDF8"));

@@ -8,8 +8,8 @@
 
 namespace ktr::bench {
 
-/// The floor that ktr is measured against: the same texts in the same fonts, shaped and painted by Qt at positions that are
-/// known beforehand. No views, no layout engine, nothing kept beyond the shaped lines.
+/// The floor that ktr is measured against: the same texts in the same fonts, shaped and painted by Qt at positions that
+/// are known beforehand. No views, no layout engine, nothing kept beyond the shaped lines.
 class FloorScene : public Scene {
   public:
     void build(const RowsFile& file, std::size_t count, double width) override;

@@ -24,8 +24,8 @@ struct RowData {
     std::string color;
 };
 
-/// A rows file: {"scene": "rows", "width": 400, "scale": 2, "friends": [{"name", "initials", "color", "locality", "distance",
-/// "age", "next": {"name", "locality", "distance", "age"}}]}. Width in points.
+/// A rows file: {"scene": "rows", "width": 400, "scale": 2, "friends": [{"name", "initials", "color", "locality",
+/// "distance", "age", "next": {"name", "locality", "distance", "age"}}]}. Width in points.
 struct RowsFile {
     double width = 400.0;
     double scale = 2.0;

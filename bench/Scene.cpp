@@ -18,10 +18,13 @@ namespace {
 
 using Clock = std::chrono::steady_clock;
 
-double milliseconds(Clock::duration duration) { return std::chrono::duration<double, std::milli>(duration).count(); }
+double milliseconds(Clock::duration duration) {
+    return std::chrono::duration<double, std::milli>(duration).count();
+}
 
 /// The median time of as many calls as fit into the budget, five at least.
-double median(double budget, const std::function<void()>& work, const std::function<void()>& after = [] {}) {
+double median(
+    double budget, const std::function<void()>& work, const std::function<void()>& after = [] {}) {
     std::vector<double> times;
     const auto begin = Clock::now();
     while (times.size() < 5 || milliseconds(Clock::now() - begin) < budget) {
@@ -45,7 +48,9 @@ long residentKilobytes() {
     return 0;
 }
 
-long heapKilobytes() { return static_cast<long>(mallinfo2().uordblks / 1024); }
+long heapKilobytes() {
+    return static_cast<long>(mallinfo2().uordblks / 1024);
+}
 
 QImage imageFor(const Scene& scene, const RowsFile& file) {
     return QImage(static_cast<int>(file.width * file.scale), static_cast<int>(scene.height() * file.scale),
