@@ -1,0 +1,99 @@
+#include "plugin/KTRSnippetControllerFactory.h"
+
+#include "plugin/VAKTRMultipleLocationsSnippetController.h"
+#include "tests/support/Friends.h"
+#include "tests/support/PlatformTest.h"
+
+namespace ktr {
+
+using namespace platform;
+using test::placedFriend;
+using test::proximitySnippet;
+
+namespace {
+
+struct DerivedSnippet : VAKtrLocationSnippet {};
+
+struct UnknownObject : AssistantObject {
+    std::string description() const override { return "<Unknown>"; }
+};
+
+}  // namespace
+
+class KTRSnippetControllerFactoryTest : public test::PlatformTest {
+  protected:
+    static bool isMultipleLocations(const std::shared_ptr<HostSnippetViewController>& controller) {
+        return std::dynamic_pointer_cast<VAKTRMultipleLocationsSnippetController>(controller) != nullptr;
+    }
+
+    std::shared_ptr<KTRSnippetControllerFactory> factory_ = std::make_shared<KTRSnippetControllerFactory>();
+};
+
+TEST_F(KTRSnippetControllerFactoryTest, LocationsWithProximity_AreMultipleLocations) {
+    const auto controller =
+        factory_->viewControllerForSnippet(proximitySnippet({placedFriend("Ann", "ann@example.org")}));
+    EXPECT_TRUE(isMultipleLocations(controller));
+    EXPECT_EQ(controller.use_count(), 1);
+}
+
+TEST_F(KTRSnippetControllerFactoryTest, EmptyProximity_IsPresent) {
+    const auto snippet = proximitySnippet({});
+    snippet->proximity = "";
+    EXPECT_TRUE(isMultipleLocations(factory_->viewControllerForSnippet(snippet)));
+}
+
+TEST_F(KTRSnippetControllerFactoryTest, NoLocationsAtAll_StillAController) {
+    const auto snippet = proximitySnippet({});
+    snippet->locations = nullptr;
+    EXPECT_TRUE(isMultipleLocations(factory_->viewControllerForSnippet(snippet)));
+}
+
+TEST_F(KTRSnippetControllerFactoryTest, Subkind_CountsAsItsKind) {
+    const auto snippet = std::make_shared<DerivedSnippet>();
+    snippet->proximity = "dinner";
+    EXPECT_TRUE(isMultipleLocations(factory_->viewControllerForSnippet(snippet)));
+}
+
+TEST_F(KTRSnippetControllerFactoryTest, EachCall_MakesANewController) {
+    const auto snippet = proximitySnippet({});
+    EXPECT_NE(factory_->viewControllerForSnippet(snippet), factory_->viewControllerForSnippet(snippet));
+}
+
+TEST_F(KTRSnippetControllerFactoryTest, LocationsWithoutProximity_AreNotDrawnHoweverMany) {
+    const auto snippet = proximitySnippet({placedFriend("Ann", "a@example.org"), placedFriend("Bo", "b@example.org")});
+    snippet->proximity = std::nullopt;
+    EXPECT_EQ(factory_->viewControllerForSnippet(snippet), nullptr);
+    ASSERT_EQ(log->lines().size(), 1u);
+    EXPECT_EQ(log->lines()[0].format, "Unrecognized snippet CueObject passed to %@: %@");
+}
+
+TEST_F(KTRSnippetControllerFactoryTest, UnknownKindOrNone_IsNoneAndOneLine) {
+    EXPECT_EQ(factory_->viewControllerForSnippet(std::make_shared<UnknownObject>()), nullptr);
+    EXPECT_EQ(factory_->viewControllerForSnippet(std::make_shared<VASnippet>()), nullptr);
+    log->clear();
+    EXPECT_EQ(factory_->viewControllerForSnippet(nullptr), nullptr);
+    EXPECT_EQ(log->texts(),
+              std::vector<std::string>{"Unrecognized snippet CueObject passed to KTRSnippetControllerFactory: (null)"});
+}
+
+TEST_F(KTRSnippetControllerFactoryTest, AccessibilityTextSize_IsRefusedWithOneLine) {
+    device->category = ContentSizeCategory::AX1;
+    EXPECT_EQ(factory_->viewControllerForSnippet(proximitySnippet({})), nullptr);
+    ASSERT_EQ(log->lines().size(), 1u);
+    EXPECT_EQ(log->lines()[0].level, LogLevel::Default);
+    EXPECT_EQ(log->lines()[0].format, "There are no rows for accessibility text sizes yet; nothing is drawn for: %@");
+}
+
+TEST_F(KTRSnippetControllerFactoryTest, LargestOrdinaryTextSize_IsDrawn) {
+    device->category = ContentSizeCategory::XXXL;
+    EXPECT_NE(factory_->viewControllerForSnippet(proximitySnippet({})), nullptr);
+}
+
+TEST_F(KTRSnippetControllerFactoryTest, SpeakableNamespace_IsNoneForEverything) {
+    EXPECT_EQ(factory_->speakableNamespaceProviderForCueObject(proximitySnippet({})), nullptr);
+    EXPECT_EQ(factory_->speakableNamespaceProviderForCueObject(placedFriend("Ann", "a@example.org")), nullptr);
+    EXPECT_EQ(factory_->speakableNamespaceProviderForCueObject(std::make_shared<UnknownObject>()), nullptr);
+    EXPECT_EQ(factory_->speakableNamespaceProviderForCueObject(nullptr), nullptr);
+}
+
+}  // namespace ktr
