@@ -7,6 +7,7 @@
 
 #include "app/Scenario.h"
 #include "app/Words.h"
+#include "linux/ui/LinuxDevice.h"
 
 #ifndef KTR_VERSION
 #error "KTR_VERSION is given by the build"
@@ -141,13 +142,13 @@ std::string readWords(const Words& words, Options& options) {
         options.language = words.language;
     }
     if (!words.textSize.empty()) {
-        options.textSize = contentSizeCategoryNamed(words.textSize);
+        options.textSize = linux_::LinuxDevice::categoryNamed(words.textSize);
         if (!options.textSize) {
             return wrong("--text-size", "one of XS, S, M, L, XL, XXL, XXXL", words.textSize);
         }
     }
     if (!words.idiom.empty()) {
-        options.idiom = idiomNamed(words.idiom);
+        options.idiom = linux_::LinuxDevice::idiomNamed(words.idiom);
         if (!options.idiom) {
             return wrong("--idiom", "one of phone, tablet, desktop, display", words.idiom);
         }

@@ -1,7 +1,6 @@
 #include "app/Scenario.h"
 
 #include <algorithm>
-#include <array>
 #include <cctype>
 
 #include "platform/base/Utf8.h"
@@ -31,24 +30,6 @@ std::string LocalizedText::text(const std::string& language) const {
         }
     }
     return texts_.empty() ? "" : texts_.front().second;
-}
-
-std::optional<platform::ContentSizeCategory> contentSizeCategoryNamed(const std::string& name) {
-    constexpr std::array kNames = {"XS", "S", "M", "L", "XL", "XXL", "XXXL", "AX1", "AX2", "AX3", "AX4", "AX5"};
-    const auto found = std::find(kNames.begin(), kNames.end(), name);
-    if (found == kNames.end()) {
-        return std::nullopt;
-    }
-    return static_cast<platform::ContentSizeCategory>(found - kNames.begin());
-}
-
-std::optional<platform::UserInterfaceIdiom> idiomNamed(const std::string& name) {
-    constexpr std::array kNames = {"phone", "tablet", "desktop", "display"};
-    const auto found = std::find(kNames.begin(), kNames.end(), name);
-    if (found == kNames.end()) {
-        return std::nullopt;
-    }
-    return static_cast<platform::UserInterfaceIdiom>(found - kNames.begin());
 }
 
 bool isLanguageTag(const std::string& text) {

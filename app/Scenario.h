@@ -66,9 +66,6 @@ struct Scenario {
     std::optional<bool> dark;
 };
 
-/// By the names that files and options use ("XS" to "AX5"; "phone", "tablet", "desktop", "display"); none for another.
-std::optional<platform::ContentSizeCategory> contentSizeCategoryNamed(const std::string& name);
-std::optional<platform::UserInterfaceIdiom> idiomNamed(const std::string& name);
 /// Whether a text has the form of a language tag (BCP 47): letters and digits in groups of up to eight, joined by "-".
 bool isLanguageTag(const std::string& text);
 

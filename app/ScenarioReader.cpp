@@ -8,6 +8,7 @@
 #include "app/AssistantObjectReader.h"
 #include "app/FieldReader.h"
 #include "app/Words.h"
+#include "linux/ui/LinuxDevice.h"
 
 namespace ktr::app {
 
@@ -128,8 +129,9 @@ void readScenario(FieldReader& fields, platform::Date now, Scenario& scenario) {
     scenario.region = readWord(fields, "region", "a locale such as \"en-GB\"", languageTag);
     scenario.country = readWord(fields, "country", "a country of two letters such as \"GB\"", countryCode);
     scenario.textSize = readWord(fields, "textSize", "one of XS, S, M, L, XL, XXL, XXXL, AX1, AX2, AX3, AX4, AX5",
-                                 contentSizeCategoryNamed);
-    scenario.idiom = readWord(fields, "idiom", "one of phone, tablet, desktop, display", idiomNamed);
+                                 linux_::LinuxDevice::categoryNamed);
+    scenario.idiom =
+        readWord(fields, "idiom", "one of phone, tablet, desktop, display", linux_::LinuxDevice::idiomNamed);
     scenario.positions = readPositions(fields);
     scenario.dark = fields.boolean("dark");
     const AssistantObjectReader objects(scenario.clock ? scenario.clock->date : now);

@@ -23,6 +23,7 @@ class CardView : public platform::View {
     /// Asks the controller for its height at this width and lays everything out; the card's height, points.
     double heightForWidth(double width);
     void layoutSubviews() override;
+    platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Group; }
 
     /// The plugin's part of the card.
     const std::shared_ptr<platform::View>& content() const { return content_; }

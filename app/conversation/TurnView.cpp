@@ -13,9 +13,23 @@ using namespace platform;
 
 namespace {
 
-/// The end edge as a natural alignment has no name for it.
+/// What is said beside or above the card: a group of its own, so that it is read before the card wherever it stands.
+class SpeechView : public View {
+  public:
+    AccessibilityRole accessibilityRole() const override { return AccessibilityRole::Group; }
+};
+
+bool rightToLeft() {
+    return Platform::installed()->assistant->languageIsRightToLeft();
+}
+
+/// The end edge as an alignment: a natural one has no name for it.
 TextAlignment endAlignment() {
-    return Platform::installed()->assistant->languageIsRightToLeft() ? TextAlignment::Left : TextAlignment::Right;
+    return rightToLeft() ? TextAlignment::Left : TextAlignment::Right;
+}
+
+void place(View& view, const Rect& rect, double parentWidth) {
+    view.setFrame(mirrored(rect, parentWidth, rightToLeft()));
 }
 
 }  // namespace
@@ -24,6 +38,7 @@ bool TurnView::initWithFrame(const Rect& frame) {
     if (!View::initWithFrame(frame)) {
         return false;
     }
+    speech_ = create<SpeechView>(&SpeechView::initWithFrame, Rect{});
     time_ = create<Label>(&Label::initWithFrame, Rect{});
     time_->setFont(preferredFont(TextStyle::Footnote));
     bubble_ = create<BubbleView>(&BubbleView::initWithFrame, Rect{});
@@ -32,10 +47,11 @@ bool TurnView::initWithFrame(const Rect& frame) {
     sentence_->setNumberOfLines(0);
     sentence_->setLineBreakMode(LineBreakMode::WordWrapping);
     card_ = create<CardView>(&CardView::initWithFrame, Rect{});
-    for (const std::shared_ptr<View>& view : {std::shared_ptr<View>(time_), std::shared_ptr<View>(bubble_),
-                                              std::shared_ptr<View>(sentence_), std::shared_ptr<View>(card_)}) {
-        addSubview(view);
-    }
+    speech_->addSubview(time_);
+    speech_->addSubview(bubble_);
+    speech_->addSubview(sentence_);
+    addSubview(speech_);
+    addSubview(card_);
     return true;
 }
 
@@ -47,80 +63,85 @@ void TurnView::setTexts(const TurnTexts& texts) {
     sentence_->setHidden(texts.sentence.empty());
 }
 
-void TurnView::place(View& view, const Rect& rect) {
-    view.setFrame(mirrored(rect, width_, Platform::installed()->assistant->languageIsRightToLeft()));
-}
-
 double TurnView::sentenceHeight(double width) const {
     return wrappedSize(sentence_->text(), sentence_->font(), width).size.height;
 }
 
 double TurnView::layOut(double width, bool first) {
-    width_ = width;
     return width >= measures::kWideFrom ? layOutWide(width) : layOutNarrow(width, first);
 }
 
 double TurnView::layOutNarrow(double width, bool first) {
+    const double cardTop = layOutNarrowSpeech(width, first);
+    speech_->setFrame({0.0, 0.0, width, cardTop});
+    const double cardWidth = width - 2.0 * measures::kGutter;
+    const double cardHeight = card_->heightForWidth(cardWidth);
+    place(*card_, {measures::kGutter, cardTop, cardWidth, cardHeight}, width);
+    return cardTop + cardHeight;
+}
+
+double TurnView::layOutNarrowSpeech(double width, bool first) {
     double y = 0.0;
     time_->setHidden(!first || texts_.longTime.empty());
     if (!time_->hidden()) {
         time_->setText(texts_.longTime);
         time_->setTextAlignment(TextAlignment::Center);
         y += measures::kTimeAbove;
-        place(*time_, {measures::kGutter, y, width - 2.0 * measures::kGutter, time_->font().lineHeight()});
+        place(*time_, {measures::kGutter, y, width - 2.0 * measures::kGutter, time_->font().lineHeight()}, width);
         y += time_->font().lineHeight() + measures::kTimeBelow;
     } else {
         y += first ? measures::kTimeAbove : measures::kCardToQuestion;
     }
-    sentence_->setTextAlignment(TextAlignment::Natural);
     if (!bubble_->hidden()) {
         const Size size =
-            bubble_->sizeForWidth(std::min(width * measures::kBubbleShare, width - 2 * measures::kGutter));
-        place(*bubble_, {width - measures::kGutter - size.width, y, size.width, size.height});
+            bubble_->sizeForWidth(std::min(width * measures::kBubbleShare, width - 2.0 * measures::kGutter));
+        place(*bubble_, {width - measures::kGutter - size.width, y, size.width, size.height}, width);
         y += size.height + (sentence_->hidden() ? measures::kSentenceToCard : measures::kQuestionToSentence);
     }
     if (!sentence_->hidden()) {
         const double room = width - 2.0 * measures::kSentenceStart;
         const double height = sentenceHeight(room);
-        place(*sentence_, {measures::kSentenceStart, y, room, height});
+        sentence_->setTextAlignment(TextAlignment::Natural);
+        place(*sentence_, {measures::kSentenceStart, y, room, height}, width);
         y += height + measures::kSentenceToCard;
     }
-    const double cardWidth = width - 2.0 * measures::kGutter;
-    const double cardHeight = card_->heightForWidth(cardWidth);
-    place(*card_, {measures::kGutter, y, cardWidth, cardHeight});
-    return y + cardHeight;
+    return y;
 }
 
 double TurnView::layOutWide(double width) {
     const double cardWidth =
         std::min(measures::kWideCard, width - 2.0 * measures::kMargin - measures::kSpeechColumn - measures::kColumnGap);
-    const double all = measures::kSpeechColumn + measures::kColumnGap + cardWidth;
-    const double start = (width - all) / 2.0;
-    const double columnEnd = start + measures::kSpeechColumn;
-    const double textEnd = columnEnd - measures::kSpeechInset;
-    const double textWidth = measures::kSpeechColumn - measures::kSpeechInset;
+    const double start = (width - (measures::kSpeechColumn + measures::kColumnGap + cardWidth)) / 2.0;
+    const double speechHeight = layOutWideSpeech();
+    place(*speech_, {start, 0.0, measures::kSpeechColumn, speechHeight}, width);
+    const double cardHeight = card_->heightForWidth(cardWidth);
+    place(*card_, {start + measures::kSpeechColumn + measures::kColumnGap, 0.0, cardWidth, cardHeight}, width);
+    return std::max(speechHeight, cardHeight);
+}
+
+double TurnView::layOutWideSpeech() {
+    constexpr double kColumn = measures::kSpeechColumn;
+    constexpr double kTextWidth = kColumn - measures::kSpeechInset;
     double y = 0.0;
     if (!bubble_->hidden()) {
-        const Size size = bubble_->sizeForWidth(measures::kSpeechColumn);
-        place(*bubble_, {columnEnd - size.width, y, size.width, size.height});
+        const Size size = bubble_->sizeForWidth(kColumn);
+        place(*bubble_, {kColumn - size.width, y, size.width, size.height}, kColumn);
         y += size.height + measures::kQuestionToSentence;
     }
-    sentence_->setTextAlignment(endAlignment());
     if (!sentence_->hidden()) {
-        const double height = sentenceHeight(textWidth);
-        place(*sentence_, {textEnd - textWidth, y, textWidth, height});
+        const double height = sentenceHeight(kTextWidth);
+        sentence_->setTextAlignment(endAlignment());
+        place(*sentence_, {0.0, y, kTextWidth, height}, kColumn);
         y += height + measures::kSentenceToTime;
     }
     time_->setHidden(texts_.shortTime.empty());
     if (!time_->hidden()) {
         time_->setText(texts_.shortTime);
         time_->setTextAlignment(endAlignment());
-        place(*time_, {textEnd - textWidth, y, textWidth, time_->font().lineHeight()});
+        place(*time_, {0.0, y, kTextWidth, time_->font().lineHeight()}, kColumn);
         y += time_->font().lineHeight();
     }
-    const double cardHeight = card_->heightForWidth(cardWidth);
-    place(*card_, {columnEnd + measures::kColumnGap, 0.0, cardWidth, cardHeight});
-    return std::max(y, cardHeight);
+    return y;
 }
 
 }  // namespace ktr::app

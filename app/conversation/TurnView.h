@@ -27,6 +27,7 @@ class TurnView : public platform::View {
     /// Of the time.
     void setSoftColor(const platform::Color& color) { time_->setTextColor(color); }
     const std::shared_ptr<CardView>& card() const { return card_; }
+    platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Group; }
 
     /// Lays the turn out in a conversation of this width; its height, points. Only the first turn of a narrow
     /// conversation shows its time, above.
@@ -35,11 +36,13 @@ class TurnView : public platform::View {
   private:
     double layOutNarrow(double width, bool first);
     double layOutWide(double width);
-    void place(platform::View& view, const platform::Rect& rect);
+    /// The heights of what is said: the time, the question and the sentence.
+    double layOutNarrowSpeech(double width, bool first);
+    double layOutWideSpeech();
     double sentenceHeight(double width) const;
 
     TurnTexts texts_;
-    double width_ = 0.0;
+    std::shared_ptr<platform::View> speech_;
     std::shared_ptr<platform::Label> time_;
     std::shared_ptr<BubbleView> bubble_;
     std::shared_ptr<platform::Label> sentence_;

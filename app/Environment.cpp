@@ -1,0 +1,134 @@
+#include "app/Environment.h"
+
+#include <filesystem>
+#include <optional>
+
+#include "app/Resources.h"
+#include "app/ScenarioClock.h"
+#include "linux/services/ConfiguredAssistant.h"
+#include "linux/services/FilteredLogSink.h"
+#include "linux/services/GeographicLibGeodesy.h"
+#include "linux/services/IcuDistanceCalculatorFactory.h"
+#include "linux/services/IcuNumberFormatter.h"
+#include "linux/services/LocalCalendar.h"
+#include "linux/services/LocaleRegion.h"
+#include "linux/services/PhonenumberLibrary.h"
+#include "linux/services/PrefixedAssistantContacts.h"
+#include "linux/services/QtLocalization.h"
+#include "linux/services/QtMainLoop.h"
+#include "linux/services/ScenarioLocationManagerFactory.h"
+#include "linux/services/ScriptContactFormatter.h"
+#include "linux/services/SettingsTelephony.h"
+#include "linux/services/StderrLogSink.h"
+#include "linux/services/VCardContactStore.h"
+#include "linux/ui/LinuxDevice.h"
+#include "linux/ui/QtAppearance.h"
+#include "linux/ui/QtAvatarImages.h"
+#include "linux/ui/QtImageSource.h"
+#include "linux/ui/QtMonogramMakerFactory.h"
+#include "linux/ui/QtTextEngine.h"
+
+namespace ktr::app {
+
+namespace {
+
+using platform::Platform;
+
+std::vector<linux_::TimedPosition> walkOf(const std::vector<ScenarioPosition>& positions) {
+    std::vector<linux_::TimedPosition> walk;
+    for (const ScenarioPosition& position : positions) {
+        linux_::TimedPosition timed;
+        timed.seconds = position.at;
+        timed.fix.coordinate = position.coordinate;
+        timed.fix.horizontalAccuracy = position.accuracy;
+        timed.fix.verticalAccuracy = -1.0;
+        timed.fix.course = -1.0;
+        timed.fix.speed = -1.0;
+        walk.push_back(timed);
+    }
+    return walk;
+}
+
+/// The contacts of all paths in one store; none, and the reason in `error`, when one cannot be read.
+std::shared_ptr<platform::ContactStore> readContacts(const HostSettings& settings,
+                                                     const std::shared_ptr<linux_::PhonenumberLibrary>& phoneNumbers,
+                                                     platform::LogSink& log, std::string& error) {
+    const std::string country = settings.country.value_or("");
+    platform::ContactStore::Contacts all;
+    for (const std::string& path : settings.contacts) {
+        const auto loaded = linux_::VCardContactStore::load(path, phoneNumbers, country, log);
+        if (!loaded.result) {
+            error = "the contacts cannot be read: " + loaded.error.value_or(path);
+            return nullptr;
+        }
+        all.insert(all.end(), loaded.result->contacts().begin(), loaded.result->contacts().end());
+    }
+    return std::make_shared<linux_::MemoryContactStore>(std::move(all), phoneNumbers, country);
+}
+
+std::shared_ptr<linux_::QtLocalization> readTexts(const HostSettings& settings, std::string& error) {
+    auto texts = std::make_shared<linux_::QtLocalization>(settings.language);
+    const auto folder = resourceFolder() / "localization";
+    if (!texts->addBundle(linux_::QtLocalization::kSnippetsBundle, folder, "snippets") ||
+        !texts->addBundle(linux_::QtLocalization::kHostBundle, folder, "host")) {
+        error = "the program's texts cannot be read: " + folder.string();
+    }
+    return texts;
+}
+
+void addUserInterface(Platform& platform, const HostSettings& settings) {
+    auto device = std::make_shared<linux_::LinuxDevice>();
+    device->setUserInterfaceIdiom(settings.idiom);
+    device->setMainScreenScale(settings.scale);
+    device->setContentSizeCategory(settings.textSize);
+    platform.device = device;
+    platform.textEngine = std::make_shared<linux_::QtTextEngine>(QString::fromStdString(settings.language));
+    platform.images = std::make_shared<linux_::QtImageSource>((resourceFolder() / "images").string(), device);
+    platform.appearance = std::make_shared<linux_::QtAppearance>();
+    platform.avatarImages = std::make_shared<linux_::QtAvatarImages>();
+    platform.monogramMakers = std::make_shared<linux_::QtMonogramMakerFactory>();
+}
+
+}  // namespace
+
+std::variant<Environment, Failure> Environment::make(const HostSettings& settings, bool isVirtual) {
+    Environment environment;
+    environment.platform = std::make_shared<Platform>();
+    Platform& platform = *environment.platform;
+    platform.logSink = std::make_shared<linux_::FilteredLogSink>(
+        std::make_shared<linux_::StderrLogSink>(linux_::StderrLogSink::environmentShowsPrivate()),
+        linux_::FilteredLogSink::environmentLevel());
+    if (isVirtual) {
+        environment.virtualTime = std::make_shared<platform::VirtualTime>(settings.start);
+        platform.mainLoop = environment.virtualTime;
+        platform.clock = environment.virtualTime;
+    } else {
+        platform.mainLoop = std::make_shared<linux_::QtMainLoop>();
+        platform.clock = std::make_shared<ScenarioClock>(settings.start);
+    }
+    platform.calendar = std::make_shared<linux_::LocalCalendar>();
+    platform.assistant = std::make_shared<linux_::ConfiguredAssistant>(settings.language);
+    platform.region = std::make_shared<linux_::LocaleRegion>(settings.region);
+    platform.decimalNumbers = std::make_shared<linux_::IcuNumberFormatter>(settings.region);
+    platform.geodesy = std::make_shared<linux_::GeographicLibGeodesy>();
+    platform.distanceCalculators = std::make_shared<linux_::IcuDistanceCalculatorFactory>(platform.geodesy);
+    platform.locationManagers = std::make_shared<linux_::ScenarioLocationManagerFactory>(
+        walkOf(settings.positions), platform.mainLoop, platform.clock, platform.geodesy);
+    const auto phoneNumbers = std::make_shared<linux_::PhonenumberLibrary>();
+    platform.phoneNumbers = phoneNumbers;
+    platform.telephony = std::make_shared<linux_::SettingsTelephony>(settings.country);
+    platform.contactFormatter = std::make_shared<linux_::ScriptContactFormatter>();
+    platform.assistantContacts = std::make_shared<linux_::PrefixedAssistantContacts>();
+    std::string error;
+    platform.localization = readTexts(settings, error);
+    if (error.empty()) {
+        platform.contactStore = readContacts(settings, phoneNumbers, *platform.logSink, error);
+    }
+    if (!error.empty()) {
+        return Failure{ExitCode::Failure, error};
+    }
+    addUserInterface(platform, settings);
+    return environment;
+}
+
+}  // namespace ktr::app

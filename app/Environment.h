@@ -1,0 +1,24 @@
+#pragma once
+
+#include <memory>
+#include <variant>
+
+#include "app/Failure.h"
+#include "app/HostSettings.h"
+#include "platform/base/Platform.h"
+#include "platform/base/VirtualTime.h"
+
+namespace ktr::app {
+
+/// The platform of a conversation, put together from the Linux implementations. Main thread, while a QGuiApplication
+/// exists.
+struct Environment {
+    std::shared_ptr<platform::Platform> platform;
+    /// The platform's clock and loop when time is virtual; else none.
+    std::shared_ptr<platform::VirtualTime> virtualTime;
+
+    /// Not installed yet. A failure for contacts that cannot be read and for missing resources.
+    static std::variant<Environment, Failure> make(const HostSettings& settings, bool virtualTime);
+};
+
+}  // namespace ktr::app

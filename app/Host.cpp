@@ -1,0 +1,111 @@
+#include "app/Host.h"
+
+#include "app/ClockText.h"
+#include "app/Environment.h"
+#include "app/PluginFinder.h"
+#include "app/Words.h"
+#include "platform/assistant/AssistantSettings.h"
+#include "platform/assistant/Localization.h"
+#include "platform/base/Format.h"
+
+namespace ktr::app {
+
+using platform::Platform;
+
+namespace {
+
+/// Deferred work that is due within this time belongs to the picture; later steps of a scenario do not. Seconds.
+constexpr double kIdleHorizon = 1.0;
+
+}  // namespace
+
+std::variant<std::unique_ptr<Host>, Failure> Host::make(const HostSettings& settings, Time time,
+                                                        const std::string& pluginPath) {
+    std::unique_ptr<Host> host(new Host);
+    host->settings_ = settings;
+    const auto environment = Environment::make(settings, time == Time::Virtual);
+    if (const auto* failure = std::get_if<Failure>(&environment)) {
+        return *failure;
+    }
+    host->platform_ = std::get<Environment>(environment).platform;
+    host->virtualTime_ = std::get<Environment>(environment).virtualTime;
+    Platform::install(host->platform_);
+    auto plugin = Plugin::load(PluginFinder::find(pluginPath));
+    if (const auto* reason = std::get_if<std::string>(&plugin)) {
+        return Failure{ExitCode::Plugin, *reason};
+    }
+    host->plugin_ = std::move(std::get<std::unique_ptr<Plugin>>(plugin));
+    host->delegate_ = std::make_shared<HostDelegate>(
+        std::make_shared<platform::Bundle>(host->platform_->localization->hostBundleIdentifier()));
+    host->window_ = platform::create<platform::Window>(&platform::Window::initWithFrame, platform::Rect{});
+    host->conversation_ = platform::create<ConversationView>(&ConversationView::initWithFrame, platform::Rect{});
+    host->window_->addSubview(host->conversation_);
+    return host;
+}
+
+Host::~Host() {
+    if (conversation_) {
+        for (const auto& turn : conversation_->turns()) {
+            if (const auto& controller = turn->card()->controller()) {
+                controller->viewWillDisappear(false);
+            }
+        }
+    }
+    // Views and controllers come from the plugin, and all of them use the platform.
+    conversation_.reset();
+    window_.reset();
+    delegate_.reset();
+    plugin_.reset();
+    if (Platform::installed() == platform_) {
+        Platform::install(nullptr);
+    }
+}
+
+bool Host::rightToLeft() const {
+    return platform_->assistant->languageIsRightToLeft();
+}
+
+TurnTexts Host::textsOf(const Scenario& scenario) const {
+    TurnTexts texts;
+    const IsoTime asked = scenario.clock.value_or(IsoTime{settings_.start, settings_.offsetSeconds});
+    texts.shortTime = clockText(asked.date, asked.offsetSeconds, settings_.language, settings_.region);
+    const auto& localization = *platform_->localization;
+    texts.longTime =
+        platform::formatted(localization.text("TODAY", localization.hostBundleIdentifier(), std::nullopt, "%@"),
+                            {platform::FormatArgument(texts.shortTime)});
+    texts.question = scenario.question.text(settings_.language);
+    texts.sentence = scenario.sentence.text(settings_.language);
+    return texts;
+}
+
+std::optional<Failure> Host::addTurn(const Scenario& scenario) {
+    auto controller = plugin_->factory().viewControllerForSnippet(scenario.snippet);
+    if (!controller) {
+        return Failure{ExitCode::NotDrawn,
+                       scenario.file + ": the plugin draws no such answer: a " + scenario.kind +
+                           (scenario.kind == "VAKtrLocationSnippet" ? " without \"proximity\"" : "")};
+    }
+    auto turn = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
+    turn->setTexts(textsOf(scenario));
+    conversation_->addTurn(turn);
+    controller->setDelegate(delegate_);
+    turn->card()->setController(controller);
+    return std::nullopt;
+}
+
+double Host::layOut(double width) {
+    const double height = conversation_->layOut(width);
+    window_->setFrame({0.0, 0.0, width, height});
+    return height;
+}
+
+double Host::settle(double width) {
+    layOut(width);
+    if (virtualTime_) {
+        virtualTime_->advance(settings_.runSeconds);
+        virtualTime_->runUntilIdle(kIdleHorizon);
+    }
+    return layOut(width);
+}
+
+}  // namespace ktr::app

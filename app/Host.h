@@ -1,0 +1,62 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+#include <variant>
+
+#include "app/Failure.h"
+#include "app/HostDelegate.h"
+#include "app/HostSettings.h"
+#include "app/Plugin.h"
+#include "app/conversation/ConversationView.h"
+#include "platform/base/Platform.h"
+#include "platform/base/VirtualTime.h"
+#include "platform/ui/Window.h"
+
+namespace ktr::app {
+
+/// A complete host around one conversation: the installed platform, the plugin, and the view tree in which the plugin's
+/// answers stand. One at a time; a QGuiApplication exists as long as it does. Main thread.
+class Host {
+  public:
+    /// How time passes: only when told to, or by itself on Qt's event loop.
+    enum class Time { Virtual, Running };
+
+    /// Installs the platform, reads the contacts and loads the plugin.
+    static std::variant<std::unique_ptr<Host>, Failure> make(const HostSettings& settings, Time time,
+                                                             const std::string& pluginPath);
+    ~Host();
+    Host(const Host&) = delete;
+    Host& operator=(const Host&) = delete;
+
+    /// Adds a scenario's turn at the conversation's end; a failure when the plugin draws no such answer.
+    std::optional<Failure> addTurn(const Scenario& scenario);
+    /// Lets the virtual clock run to the moment that the settings name and on until nothing is due, laying out at
+    /// `width` before and after. The conversation's height, points.
+    double settle(double width);
+
+    const std::shared_ptr<platform::Window>& window() const { return window_; }
+    const std::shared_ptr<ConversationView>& conversation() const { return conversation_; }
+    HostDelegate& delegate() { return *delegate_; }
+    const HostSettings& settings() const { return settings_; }
+    bool rightToLeft() const;
+
+    /// Lays the conversation out and makes the window as large as it; the height, points.
+    double layOut(double width);
+
+  private:
+    Host() = default;
+    TurnTexts textsOf(const Scenario& scenario) const;
+
+    HostSettings settings_;
+    std::shared_ptr<platform::Platform> platform_;
+    std::shared_ptr<platform::VirtualTime> virtualTime_;
+    std::unique_ptr<Plugin> plugin_;
+    std::shared_ptr<HostDelegate> delegate_;
+    std::shared_ptr<platform::Window> window_;
+    std::shared_ptr<ConversationView> conversation_;
+};
+
+}  // namespace ktr::app

@@ -1,0 +1,133 @@
+#include "app/Program.h"
+
+#include <QApplication>
+#include <QDateTime>
+#include <cstdio>
+#include <cstdlib>
+#include <memory>
+#include <vector>
+
+#include "app/CommandLine.h"
+#include "app/Description.h"
+#include "app/Host.h"
+#include "app/RenderCommand.h"
+#include "app/ScenarioReader.h"
+#include "app/window/ShowCommand.h"
+#include "linux/services/SystemClock.h"
+#include "linux/ui/FontSetup.h"
+
+namespace ktr::app {
+
+namespace {
+
+ExitCode fail(const Failure& failure) {
+    std::fprintf(stderr, "ktr: %s\n", failure.line.c_str());
+    return failure.code;
+}
+
+/// The present moment in the session's time zone.
+IsoTime sessionNow() {
+    return {linux_::SystemClock().now(), QDateTime::currentDateTime().offsetFromUtc()};
+}
+
+std::variant<std::vector<Scenario>, Failure> readScenarios(const Options& options, platform::Date now) {
+    std::vector<Scenario> scenarios;
+    for (const std::string& file : options.scenarios) {
+        auto read = ScenarioReader(now).readFile(file);
+        if (const auto* error = std::get_if<ScenarioError>(&read)) {
+            return Failure{ExitCode::BadScenario, error->text()};
+        }
+        scenarios.push_back(std::move(std::get<Scenario>(read)));
+    }
+    return scenarios;
+}
+
+std::variant<std::unique_ptr<Host>, Failure> makeHost(const Options& options, const HostSettings& settings,
+                                                      const std::vector<Scenario>& scenarios, Host::Time time) {
+    auto made = Host::make(settings, time, options.plugin);
+    if (auto* host = std::get_if<std::unique_ptr<Host>>(&made)) {
+        for (const Scenario& scenario : scenarios) {
+            if (auto failure = (*host)->addTurn(scenario)) {
+                return *failure;
+            }
+        }
+    }
+    return made;
+}
+
+ExitCode runHeadless(const Options& options, const HostSettings& settings, const std::vector<Scenario>& scenarios) {
+    auto made = makeHost(options, settings, scenarios, Host::Time::Virtual);
+    if (const auto* failure = std::get_if<Failure>(&made)) {
+        return fail(*failure);
+    }
+    Host& host = *std::get<std::unique_ptr<Host>>(made);
+    if (options.command == Options::Command::Render) {
+        const auto failure = RenderCommand(host).write(options.output);
+        return failure ? fail(*failure) : ExitCode::Ok;
+    }
+    host.settle(settings.width);
+    const std::string text = describe(platform::accessibilityTree(host.window(), host.rightToLeft()));
+    if (std::fputs(text.c_str(), stdout) == EOF || std::fflush(stdout) != 0) {
+        return fail({ExitCode::Failure, "the description cannot be written"});
+    }
+    return ExitCode::Ok;
+}
+
+ExitCode runShow(const Options& options, const HostSettings& settings, const std::vector<Scenario>& scenarios) {
+    auto made = makeHost(options, settings, scenarios, Host::Time::Running);
+    if (const auto* failure = std::get_if<Failure>(&made)) {
+        return fail(*failure);
+    }
+    return ShowCommand(*std::get<std::unique_ptr<Host>>(made), options).run();
+}
+
+/// The display that a window needs; Qt ends the process when it looks for one in vain.
+bool hasDisplay() {
+    for (const char* name : {"DISPLAY", "WAYLAND_DISPLAY", "QT_QPA_PLATFORM"}) {
+        if (!qEnvironmentVariableIsEmpty(name)) {
+            return true;
+        }
+    }
+    return false;
+}
+
+ExitCode run(const Options& options, int argc, char** argv) {
+    const IsoTime now = sessionNow();
+    const auto read = readScenarios(options, options.at ? options.at->date : now.date);
+    if (const auto* failure = std::get_if<Failure>(&read)) {
+        return fail(*failure);
+    }
+    const auto& scenarios = std::get<std::vector<Scenario>>(read);
+    auto decided = HostSettings::decide(options, scenarios, now);
+    if (const auto* failure = std::get_if<Failure>(&decided)) {
+        return fail(*failure);
+    }
+    const auto& settings = std::get<HostSettings>(decided);
+    const bool window = options.command == Options::Command::Show;
+    if (window && !hasDisplay()) {
+        return fail({ExitCode::Failure, "there is no display to open a window on; `ktr render` draws without one"});
+    }
+    if (!window) {
+        qputenv("QT_QPA_PLATFORM", "offscreen");
+    }
+    linux_::FontSetup::prepare(linux_::FontSetup::Mode::System);
+    // Qt's own options are none of this program's: it sees the name alone.
+    int count = argc > 0 ? 1 : 0;
+    const std::unique_ptr<QGuiApplication> application(window ? new QApplication(count, argv)
+                                                              : new QGuiApplication(count, argv));
+    linux_::FontSetup::load(linux_::FontSetup::Mode::System);
+    return window ? runShow(options, settings, scenarios) : runHeadless(options, settings, scenarios);
+}
+
+}  // namespace
+
+ExitCode runProgram(int argc, char** argv) {
+    const auto parsed = CommandLine::parse(std::vector<std::string>(argv + (argc > 0 ? 1 : 0), argv + argc));
+    if (const auto* ending = std::get_if<CommandLine::Ending>(&parsed)) {
+        std::fputs(ending->text.c_str(), ending->code == ExitCode::Ok ? stdout : stderr);
+        return ending->code;
+    }
+    return run(std::get<Options>(parsed), argc, argv);
+}
+
+}  // namespace ktr::app

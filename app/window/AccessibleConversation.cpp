@@ -1,0 +1,192 @@
+#include "app/window/AccessibleConversation.h"
+
+#include "app/window/AccessibleNode.h"
+#include "app/window/AccessibleWidget.h"
+#include "app/window/ConversationWidget.h"
+
+namespace ktr::app {
+
+using platform::AccessibilityNode;
+using platform::AccessibilityRole;
+using platform::View;
+
+namespace {
+
+/// The conversations that somebody asked about; Qt's factory is a plain function, so they stand beside it. Emptied as
+/// the widgets go.
+std::unordered_map<const QObject*, std::unique_ptr<AccessibleConversation>>& conversations() {
+    static std::unordered_map<const QObject*, std::unique_ptr<AccessibleConversation>> all;
+    return all;
+}
+
+AccessibleConversation* known(const ConversationWidget& widget) {
+    const auto found = conversations().find(&widget);
+    return found == conversations().end() ? nullptr : found->second.get();
+}
+
+QAccessibleInterface* interfaceOf(const QString& /*className*/, QObject* object) {
+    auto* widget = dynamic_cast<ConversationWidget*>(object);
+    if (widget == nullptr) {
+        return nullptr;
+    }
+    auto& conversation = conversations()[widget];
+    if (!conversation) {
+        conversation = std::make_unique<AccessibleConversation>(*widget);
+    }
+    return new AccessibleWidget(*widget, *conversation);
+}
+
+void collectTexts(const AccessibilityNode& node, std::string& name) {
+    if (!node.text.empty()) {
+        name += (name.empty() ? "" : ", ") + node.text;
+    }
+    for (const AccessibilityNode& child : node.children) {
+        collectTexts(child, name);
+    }
+}
+
+}  // namespace
+
+void AccessibleConversation::install() {
+    static const bool installed = [] {
+        QAccessible::installFactory(interfaceOf);
+        return true;
+    }();
+    static_cast<void>(installed);
+}
+
+void AccessibleConversation::changed(ConversationWidget& widget) {
+    if (auto* conversation = known(widget)) {
+        conversation->update();
+    }
+}
+
+void AccessibleConversation::moved(ConversationWidget& widget) {
+    auto* conversation = known(widget);
+    if (conversation == nullptr) {
+        return;
+    }
+    for (const auto& [view, id] : conversation->interfaces_) {
+        if (auto* node = QAccessible::accessibleInterface(id)) {
+            QAccessibleEvent event(node, QAccessible::LocationChanged);
+            QAccessible::updateAccessibility(&event);
+        }
+    }
+}
+
+void AccessibleConversation::focused(ConversationWidget& widget) {
+    auto* conversation = known(widget);
+    const auto view = widget.rows().focused();
+    if (conversation == nullptr || !view) {
+        return;
+    }
+    if (auto* node = conversation->interfaceFor(view.get())) {
+        QAccessibleEvent event(node, QAccessible::Focus);
+        QAccessible::updateAccessibility(&event);
+    }
+}
+
+void AccessibleConversation::forget(ConversationWidget& widget) {
+    conversations().erase(&widget);
+}
+
+AccessibleConversation::~AccessibleConversation() {
+    for (const auto& [view, id] : interfaces_) {
+        QAccessible::deleteAccessibleInterface(id);
+    }
+}
+
+void AccessibleConversation::rebuild() {
+    entries_.clear();
+    topLevel_.clear();
+    const auto tree = platform::accessibilityTree(widget_.host().window(), widget_.host().rightToLeft());
+    for (const AccessibilityNode& node : tree.children) {
+        add(node, nullptr);
+    }
+    built_ = true;
+}
+
+void AccessibleConversation::add(const AccessibilityNode& node, const View* parent) {
+    const auto view = node.view.lock();
+    if (!view) {
+        return;
+    }
+    Entry entry;
+    entry.view = view;
+    entry.parent = parent;
+    entry.node = node;
+    entry.node.children.clear();
+    if (node.role == AccessibilityRole::Link) {
+        collectTexts(node, entry.name);
+    } else {
+        entry.name = node.text;
+    }
+    entries_[view.get()] = std::move(entry);
+    (parent == nullptr ? topLevel_ : entries_[parent].children).push_back(view.get());
+    for (const AccessibilityNode& child : node.children) {
+        add(child, view.get());
+    }
+}
+
+void AccessibleConversation::update() {
+    if (!built_) {
+        return;
+    }
+    const auto before = std::move(entries_);
+    const auto topBefore = topLevel_;
+    rebuild();
+    bool reordered = topBefore != topLevel_;
+    for (auto it = interfaces_.begin(); it != interfaces_.end();) {
+        const Entry* now = find(it->first);
+        const auto old = before.find(it->first);
+        // Another view may stand where a dropped one stood: then it is another node.
+        const bool same = now != nullptr && old != before.end() && old->second.view.lock() == now->view.lock();
+        auto* node = QAccessible::accessibleInterface(it->second);
+        if (!same || node == nullptr) {
+            QAccessible::deleteAccessibleInterface(it->second);
+            it = interfaces_.erase(it);
+            reordered = true;
+            continue;
+        }
+        if (old->second.name != now->name) {
+            QAccessibleEvent event(node, QAccessible::NameChanged);
+            QAccessible::updateAccessibility(&event);
+        }
+        reordered = reordered || old->second.children != now->children;
+        ++it;
+    }
+    if (reordered) {
+        QAccessibleEvent event(&widget_, QAccessible::ObjectReorder);
+        QAccessible::updateAccessibility(&event);
+    }
+}
+
+const AccessibleConversation::Entry* AccessibleConversation::find(const View* view) {
+    if (!built_) {
+        rebuild();
+    }
+    const auto found = entries_.find(view);
+    return found == entries_.end() ? nullptr : &found->second;
+}
+
+const std::vector<const View*>& AccessibleConversation::topLevel() {
+    if (!built_) {
+        rebuild();
+    }
+    return topLevel_;
+}
+
+QAccessibleInterface* AccessibleConversation::interfaceFor(const View* view) {
+    if (find(view) == nullptr) {
+        return nullptr;
+    }
+    const auto found = interfaces_.find(view);
+    if (found != interfaces_.end()) {
+        return QAccessible::accessibleInterface(found->second);
+    }
+    auto* node = new AccessibleNode(*this, view);
+    interfaces_[view] = QAccessible::registerAccessibleInterface(node);
+    return node;
+}
+
+}  // namespace ktr::app

@@ -1,0 +1,389 @@
+#include "app/window/ConversationWidget.h"
+
+#include <QApplication>
+#include <QKeyEvent>
+#include <QMouseEvent>
+#include <QPainter>
+#include <QStyle>
+#include <QTouchEvent>
+#include <algorithm>
+#include <cmath>
+
+#include "app/window/AccessibleConversation.h"
+#include "linux/ui/QtCanvas.h"
+
+namespace ktr::app {
+
+using linux_::ColorScheme;
+using linux_::Contrast;
+using linux_::Palette;
+
+namespace {
+
+constexpr int kBarWidth = 8;
+constexpr double kArrowStep = 40.0;
+/// A wheel's notch, in the eighths of a degree that Qt counts, and how far it goes in points.
+constexpr double kNotch = 120.0;
+constexpr double kNotchStep = 60.0;
+constexpr int kFrame = 16;         // milliseconds
+constexpr double kRingTurn = 1.2;  // seconds
+constexpr double kStillRing = 0.75;
+
+bool nothingMoves(const QWidget& widget) {
+    return widget.style()->styleHint(QStyle::SH_Widget_Animation_Duration, nullptr, &widget) == 0;
+}
+
+}  // namespace
+
+/// What the view tree asks of its window.
+class ConversationWidget::Client : public platform::WindowClient {
+  public:
+    explicit Client(ConversationWidget& widget) : widget_(widget) {}
+    void windowNeedsDisplay(const platform::Rect& rect) override {
+        const QRectF there(rect.x, rect.y - widget_.scrolled(), rect.width, rect.height);
+        widget_.update(there.toAlignedRect());
+    }
+    void windowNeedsLayout() override { widget_.requestLayout(); }
+
+  private:
+    ConversationWidget& widget_;
+};
+
+ConversationWidget::ConversationWidget(Host& host, QWidget* parent)
+    : QWidget(parent),
+      host_(host),
+      client_(std::make_shared<Client>(*this)),
+      touches_(std::make_shared<platform::TouchDispatcher>(host.window())),
+      rows_(host.window(), host.conversation(), host.rightToLeft()),
+      palette_(&Palette::of(ColorScheme::Light)),
+      bar_(new QScrollBar(Qt::Vertical, this)) {
+    setAttribute(Qt::WA_OpaquePaintEvent);
+    setAttribute(Qt::WA_AcceptTouchEvents);
+    setMouseTracking(true);
+    setFocusPolicy(Qt::StrongFocus);
+    setMinimumSize(280, 200);
+    setLayoutDirection(host.rightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
+    clock_.start();
+    bar_->setFocusPolicy(Qt::NoFocus);
+    bar_->setCursor(Qt::ArrowCursor);
+    connect(bar_, &QScrollBar::valueChanged, this, [this] {
+        update();
+        AccessibleConversation::moved(*this);
+    });
+    ringTimer_.setInterval(kFrame * 2);
+    connect(&ringTimer_, &QTimer::timeout, this, [this] { animateRings(); });
+    flingTimer_.setInterval(kFrame);
+    connect(&flingTimer_, &QTimer::timeout, this, [this] { fling(); });
+    host_.window()->setClient(client_);
+    host_.delegate().resize = [this](platform::HostSnippetViewController& controller, bool pinTop) {
+        resizeCard(controller, pinTop);
+    };
+    choosePalette();
+    AccessibleConversation::install();
+}
+
+ConversationWidget::~ConversationWidget() {
+    AccessibleConversation::forget(*this);
+    host_.delegate().resize = nullptr;
+}
+
+double ConversationWidget::seconds() const {
+    return static_cast<double>(clock_.nsecsElapsed()) * 1e-9;
+}
+
+void ConversationWidget::choosePalette() {
+    const bool systemIsDark = QApplication::palette().color(QPalette::Window).lightness() < 128;
+    const HostSettings& settings = host_.settings();
+    palette_ = &Palette::of(settings.dark.value_or(systemIsDark) ? ColorScheme::Dark : ColorScheme::Light,
+                            settings.highContrast ? Contrast::High : Contrast::Normal);
+    host_.conversation()->setPalette(*palette_);
+    QColor handle = palette_->inkSoft;
+    handle.setAlphaF(settings.highContrast ? 1.0F : 0.45F);
+    bar_->setStyleSheet(QStringLiteral("QScrollBar:vertical { background: transparent; width: %1px; border: none; }"
+                                       "QScrollBar::handle:vertical { background: %2; border-radius: 3px; margin: 1px; "
+                                       "min-height: 32px; }"
+                                       "QScrollBar::add-line, QScrollBar::sub-line { height: 0; }"
+                                       "QScrollBar::add-page, QScrollBar::sub-page { background: none; }")
+                            .arg(kBarWidth)
+                            .arg(handle.name(QColor::HexArgb)));
+    update();
+}
+
+void ConversationWidget::layOut() {
+    layoutRequested_ = false;
+    layingOut_ = true;
+    contentHeight_ = host_.layOut(width());
+    layingOut_ = false;
+    updateBar();
+    rows_.refresh();
+    animateRings();
+    update();
+    AccessibleConversation::changed(*this);
+}
+
+void ConversationWidget::requestLayout() {
+    if (layingOut_ || layoutRequested_) {
+        return;
+    }
+    layoutRequested_ = true;
+    QMetaObject::invokeMethod(
+        this,
+        [this] {
+            if (layoutRequested_) {
+                layOut();
+            }
+        },
+        Qt::QueuedConnection);
+}
+
+void ConversationWidget::updateBar() {
+    // Below the newest turn there is always room enough to bring it to the top.
+    const auto& turns = host_.conversation()->turns();
+    const double newest = turns.size() > 1 ? turns.back()->frame().y : 0.0;
+    const double extent = std::max(contentHeight_, newest + height());
+    const int most = std::max(static_cast<int>(std::ceil(extent)) - height(), 0);
+    bar_->setPageStep(height());
+    bar_->setRange(0, most);
+    bar_->setVisible(most > 0);
+    bar_->setGeometry(host_.rightToLeft() ? 0 : width() - kBarWidth, 0, kBarWidth, height());
+}
+
+void ConversationWidget::resizeCard(platform::HostSnippetViewController& controller, bool pinTop) {
+    const auto& turns = host_.conversation()->turns();
+    const auto turn = std::find_if(turns.begin(), turns.end(),
+                                   [&](const auto& t) { return t->card()->controller().get() == &controller; });
+    if (turn == turns.end()) {
+        return;
+    }
+    const auto edge = [&] {
+        const platform::Rect card = (*turn)->card()->frameInRoot();
+        return pinTop ? card.y : card.maxY();
+    };
+    const double before = edge();
+    layOut();
+    scrollTo(scrolled() + edge() - before);
+}
+
+void ConversationWidget::scrollTo(double y) {
+    bar_->setValue(static_cast<int>(std::lround(y)));
+}
+
+void ConversationWidget::scrollToNewest() {
+    const auto& turns = host_.conversation()->turns();
+    if (turns.size() > 1) {
+        scrollTo(turns.back()->frame().y);
+    }
+}
+
+void ConversationWidget::animateRings() {
+    const bool still = nothingMoves(*this);
+    bool any = false;
+    for (const auto& turn : host_.conversation()->turns()) {
+        const auto& ring = turn->card()->ring();
+        if (ring->hidden()) {
+            continue;
+        }
+        any = true;
+        ring->setShare(still ? kStillRing : 0.25);
+        ring->setTurn(still ? 0.0 : std::fmod(seconds() / kRingTurn, 1.0));
+    }
+    if (any && !still && !ringTimer_.isActive()) {
+        ringTimer_.start();
+    } else if (!any || still) {
+        ringTimer_.stop();
+    }
+}
+
+void ConversationWidget::paintEvent(QPaintEvent* event) {
+    if (layoutRequested_) {
+        layOut();
+    }
+    lastPainted_ = event->region();
+    QPainter painter(this);
+    painter.setRenderHints(QPainter::Antialiasing | QPainter::TextAntialiasing | QPainter::SmoothPixmapTransform);
+    painter.setClipRegion(event->region());
+    painter.fillRect(event->rect(), palette_->window);
+    painter.translate(0.0, -scrolled());
+    linux_::QtCanvas canvas(painter, *palette_);
+    const QRectF dirty = QRectF(event->rect()).translated(0.0, scrolled());
+    host_.window()->paint(canvas, {dirty.x(), dirty.y(), dirty.width(), dirty.height()});
+}
+
+void ConversationWidget::resizeEvent(QResizeEvent*) {
+    layOut();
+}
+
+void ConversationWidget::changeEvent(QEvent* event) {
+    if (event->type() == QEvent::ApplicationPaletteChange || event->type() == QEvent::PaletteChange) {
+        choosePalette();
+    }
+    QWidget::changeEvent(event);
+}
+
+// Pointers
+
+void ConversationWidget::wheelEvent(QWheelEvent* event) {
+    kinetic_.stop();
+    const double pixels = event->pixelDelta().isNull() ? event->angleDelta().y() / kNotch * kNotchStep
+                                                       : static_cast<double>(event->pixelDelta().y());
+    // A fine wheel turns by less than a pixel at a time.
+    wheelRest_ -= pixels;
+    const double whole = std::trunc(wheelRest_);
+    wheelRest_ -= whole;
+    scrollTo(scrolled() + whole);
+    rows_.hover(inTree(event->position()));
+    event->accept();
+}
+
+void ConversationWidget::mousePressEvent(QMouseEvent* event) {
+    rows_.clear();
+    if (event->button() == Qt::LeftButton) {
+        touches_->press(inTree(event->position()), seconds());
+    }
+}
+
+void ConversationWidget::mouseMoveEvent(QMouseEvent* event) {
+    touches_->move(inTree(event->position()), seconds());
+    rows_.hover(inTree(event->position()));
+}
+
+void ConversationWidget::mouseReleaseEvent(QMouseEvent* event) {
+    if (event->button() == Qt::LeftButton) {
+        touches_->release(inTree(event->position()), seconds());
+    }
+}
+
+void ConversationWidget::leaveEvent(QEvent*) {
+    rows_.hover(std::nullopt);
+}
+
+bool ConversationWidget::event(QEvent* event) {
+    switch (event->type()) {
+        case QEvent::TouchBegin:
+        case QEvent::TouchUpdate:
+        case QEvent::TouchEnd:
+        case QEvent::TouchCancel:
+            return touch(*static_cast<QTouchEvent*>(event));
+        default:
+            return QWidget::event(event);
+    }
+}
+
+bool ConversationWidget::touch(QTouchEvent& event) {
+    if (event.points().isEmpty()) {
+        return false;
+    }
+    // One finger scrolls and taps; further ones do nothing.
+    const QPointF at = event.points().first().position();
+    event.accept();
+    switch (event.type()) {
+        case QEvent::TouchBegin:
+            rows_.clear();
+            rows_.hover(std::nullopt);
+            // A finger that stops a fling taps nothing.
+            tap_ = kinetic_.isFlinging() ? std::nullopt : std::optional(at);
+            kinetic_.press(at.y(), seconds());
+            if (tap_) {
+                touches_->press(inTree(at), seconds());
+            }
+            break;
+        case QEvent::TouchUpdate: {
+            const double moved = kinetic_.drag(at.y(), seconds());
+            if (tap_ && std::hypot(at.x() - tap_->x(), at.y() - tap_->y()) > platform::TouchDispatcher::kSlop) {
+                touches_->cancel(seconds());
+                tap_.reset();
+            }
+            if (!tap_) {
+                scrollTo(scrolled() + moved);
+            }
+            break;
+        }
+        case QEvent::TouchEnd:
+            if (tap_) {
+                kinetic_.stop();
+                touches_->release(inTree(at), seconds());
+            } else {
+                kinetic_.release(seconds());
+                if (kinetic_.isFlinging()) {
+                    flingTimer_.start();
+                }
+            }
+            tap_.reset();
+            break;
+        default:
+            touches_->cancel(seconds());
+            tap_.reset();
+            break;
+    }
+    return true;
+}
+
+void ConversationWidget::fling() {
+    const int before = bar_->value();
+    wheelRest_ += kinetic_.step(seconds());
+    const double whole = std::trunc(wheelRest_);
+    wheelRest_ -= whole;
+    scrollTo(before + whole);
+    const bool atEnd = std::abs(whole) >= 1.0 && bar_->value() == before;
+    if (atEnd) {
+        kinetic_.stop();
+    }
+    if (!kinetic_.isFlinging()) {
+        wheelRest_ = 0.0;
+        flingTimer_.stop();
+    }
+}
+
+// Keyboard
+
+void ConversationWidget::showFocus() {
+    constexpr double kAround = 12.0;
+    if (const auto rect = rows_.focusedRect()) {
+        if (rect->y - kAround < scrolled()) {
+            scrollTo(rect->y - kAround);
+        } else if (rect->maxY() + kAround > scrolled() + height()) {
+            scrollTo(rect->maxY() + kAround - height());
+        }
+        AccessibleConversation::focused(*this);
+    }
+}
+
+bool ConversationWidget::focusNextPrevChild(bool next) {
+    if (rows_.step(next)) {
+        showFocus();
+        return true;
+    }
+    return QWidget::focusNextPrevChild(next);
+}
+
+void ConversationWidget::keyPressEvent(QKeyEvent* event) {
+    const double page = height() - kArrowStep;
+    switch (event->key()) {
+        case Qt::Key_Return:
+        case Qt::Key_Enter:
+        case Qt::Key_Space:
+            if (!rows_.press() && event->key() == Qt::Key_Space) {
+                scrollTo(scrolled() + (event->modifiers().testFlag(Qt::ShiftModifier) ? -page : page));
+            }
+            return;
+        case Qt::Key_Escape:
+            rows_.clear();
+            return;
+        case Qt::Key_Down:
+            return scrollTo(scrolled() + kArrowStep);
+        case Qt::Key_Up:
+            return scrollTo(scrolled() - kArrowStep);
+        case Qt::Key_PageDown:
+            return scrollTo(scrolled() + page);
+        case Qt::Key_PageUp:
+            return scrollTo(scrolled() - page);
+        case Qt::Key_Home:
+            return scrollTo(0.0);
+        case Qt::Key_End:
+            return scrollTo(bar_->maximum());
+        default:
+            QWidget::keyPressEvent(event);
+    }
+}
+
+}  // namespace ktr::app

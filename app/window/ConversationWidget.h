@@ -1,0 +1,87 @@
+#pragma once
+
+#include <QElapsedTimer>
+#include <QPointF>
+#include <QScrollBar>
+#include <QTimer>
+#include <QTouchEvent>
+#include <QWidget>
+#include <memory>
+#include <optional>
+
+#include "app/Host.h"
+#include "app/window/KineticScroll.h"
+#include "app/window/RowFocus.h"
+#include "linux/ui/Palette.h"
+#include "platform/ui/TouchDispatcher.h"
+#include "platform/ui/Window.h"
+
+namespace ktr::app {
+
+/// Shows a host's conversation: paints what changed, scrolls, and turns what mouse, pen, finger and keyboard do into
+/// touches. One point is one logical pixel. Main thread.
+class ConversationWidget : public QWidget {
+  public:
+    /// The host outlives the widget.
+    explicit ConversationWidget(Host& host, QWidget* parent = nullptr);
+    ~ConversationWidget() override;
+
+    Host& host() const { return host_; }
+    /// From the view tree's coordinates to the widget's: points that are scrolled away at the top.
+    double scrolled() const { return bar_->value(); }
+    void scrollTo(double y);
+    /// Puts the newest turn at the top.
+    void scrollToNewest();
+    const RowFocus& rows() const { return rows_; }
+    /// How often something was painted: what a test asks to see that only what changed is.
+    const QRegion& lastPainted() const { return lastPainted_; }
+
+  protected:
+    bool event(QEvent* event) override;
+    void paintEvent(QPaintEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
+    void wheelEvent(QWheelEvent* event) override;
+    void mousePressEvent(QMouseEvent* event) override;
+    void mouseMoveEvent(QMouseEvent* event) override;
+    void mouseReleaseEvent(QMouseEvent* event) override;
+    void leaveEvent(QEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+    void changeEvent(QEvent* event) override;
+    bool focusNextPrevChild(bool next) override;
+
+  private:
+    class Client;
+
+    void layOut();
+    void requestLayout();
+    /// Lays out again after a card's height changed; its top, or else its bottom, stays where it is on screen.
+    void resizeCard(platform::HostSnippetViewController& controller, bool pinTop);
+    void updateBar();
+    void choosePalette();
+    void animateRings();
+    bool touch(QTouchEvent& event);
+    void fling();
+    void showFocus();
+    platform::Point inTree(QPointF point) const { return {point.x(), point.y() + scrolled()}; }
+    double seconds() const;
+
+    Host& host_;
+    std::shared_ptr<Client> client_;
+    std::shared_ptr<platform::TouchDispatcher> touches_;
+    RowFocus rows_;
+    const linux_::Palette* palette_;
+    QScrollBar* bar_;
+    QTimer ringTimer_;
+    QTimer flingTimer_;
+    QElapsedTimer clock_;
+    KineticScroll kinetic_;
+    /// Where the finger went down, while it has not moved far enough to scroll.
+    std::optional<QPointF> tap_;
+    double contentHeight_ = 0.0;
+    double wheelRest_ = 0.0;
+    bool layingOut_ = false;
+    bool layoutRequested_ = false;
+    QRegion lastPainted_;
+};
+
+}  // namespace ktr::app

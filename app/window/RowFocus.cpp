@@ -1,0 +1,118 @@
+#include "app/window/RowFocus.h"
+
+#include <algorithm>
+
+namespace ktr::app {
+
+using platform::AccessibilityNode;
+using platform::Rect;
+using platform::View;
+
+namespace {
+
+void collectPressable(const AccessibilityNode& node, std::vector<AccessibilityNode>& out) {
+    if (node.pressable) {
+        out.push_back(node);
+    }
+    for (const AccessibilityNode& child : node.children) {
+        collectPressable(child, out);
+    }
+}
+
+/// A view's rectangle in a card's coordinates; none when it stands in another card, or in none any more.
+std::optional<Rect> rectIn(const CardView& card, const std::shared_ptr<View>& view) {
+    if (!view || !view->isDescendantOf(card)) {
+        return std::nullopt;
+    }
+    const Rect origin = card.frameInRoot();
+    return view->frameInRoot().offsetBy(-origin.x, -origin.y);
+}
+
+}  // namespace
+
+std::vector<AccessibilityNode> RowFocus::rows() const {
+    std::vector<AccessibilityNode> rows;
+    collectPressable(platform::accessibilityTree(root_, rightToLeft_), rows);
+    return rows;
+}
+
+void RowFocus::hover(const std::optional<platform::Point>& point) {
+    auto view = point ? root_->hitTest(*point) : nullptr;
+    const auto all = view ? rows() : std::vector<AccessibilityNode>();
+    const auto isRow = [&](const std::shared_ptr<View>& candidate) {
+        return std::any_of(all.begin(), all.end(), [&](const auto& row) { return row.view.lock() == candidate; });
+    };
+    while (view && !isRow(view)) {
+        view = view->superview();
+    }
+    if (view != hovered_.lock()) {
+        hovered_ = view;
+        markHover();
+    }
+}
+
+bool RowFocus::step(bool forward) {
+    const auto all = rows();
+    const auto current = focused_.lock();
+    const auto found =
+        std::find_if(all.begin(), all.end(), [&](const auto& row) { return current && row.view.lock() == current; });
+    std::optional<std::size_t> next;
+    if (found == all.end()) {
+        if (!all.empty()) {
+            next = forward ? 0 : all.size() - 1;
+        }
+    } else {
+        const auto at = static_cast<std::size_t>(found - all.begin());
+        if (forward ? at + 1 < all.size() : at > 0) {
+            next = forward ? at + 1 : at - 1;
+        }
+    }
+    if (next) {
+        focused_ = all[*next].view;
+    } else {
+        focused_.reset();
+    }
+    markFocus();
+    return next.has_value();
+}
+
+void RowFocus::clear() {
+    if (hasFocus()) {
+        focused_.reset();
+        markFocus();
+    }
+}
+
+bool RowFocus::press() const {
+    const auto current = focused_.lock();
+    for (const AccessibilityNode& row : rows()) {
+        if (current && row.view.lock() == current) {
+            return platform::accessibilityPress(row);
+        }
+    }
+    return false;
+}
+
+std::optional<Rect> RowFocus::focusedRect() const {
+    const auto view = focused_.lock();
+    return view && view->isDescendantOf(*root_) ? std::optional(view->frameInRoot()) : std::nullopt;
+}
+
+void RowFocus::refresh() {
+    markFocus();
+    markHover();
+}
+
+void RowFocus::markFocus() {
+    for (const auto& turn : conversation_->turns()) {
+        turn->card()->setFocus(rectIn(*turn->card(), focused_.lock()));
+    }
+}
+
+void RowFocus::markHover() {
+    for (const auto& turn : conversation_->turns()) {
+        turn->card()->setHighlight(rectIn(*turn->card(), hovered_.lock()));
+    }
+}
+
+}  // namespace ktr::app

@@ -1,0 +1,48 @@
+#pragma once
+
+#include <memory>
+#include <optional>
+
+#include "app/conversation/ConversationView.h"
+#include "platform/ui/Accessibility.h"
+#include "platform/ui/View.h"
+
+namespace ktr::app {
+
+/// Which row the pointer is over and which one the keyboard has, and the marks that say so. Rows are whatever can be
+/// opened. Main thread.
+class RowFocus {
+  public:
+    RowFocus(std::shared_ptr<platform::View> root, std::shared_ptr<ConversationView> conversation, bool rightToLeft)
+        : root_(std::move(root)), conversation_(std::move(conversation)), rightToLeft_(rightToLeft) {}
+
+    /// A point in the root's coordinates; none: the pointer has left, or is a finger.
+    void hover(const std::optional<platform::Point>& point);
+    /// Moves the keyboard's focus by one row; false at either end, where the focus leaves.
+    bool step(bool forward);
+    /// Takes the focus away, as any use of the pointer does.
+    void clear();
+    bool hasFocus() const { return !focused_.expired(); }
+    /// The view that has the focus, or none.
+    std::shared_ptr<platform::View> focused() const { return focused_.lock(); }
+    /// Opens the row that has the focus; false without one.
+    bool press() const;
+    /// Of the focused row, in the root's coordinates.
+    std::optional<platform::Rect> focusedRect() const;
+    /// Draws the marks anew after the rows moved.
+    void refresh();
+
+  private:
+    /// What can be opened, in reading order.
+    std::vector<platform::AccessibilityNode> rows() const;
+    void markFocus();
+    void markHover();
+
+    std::shared_ptr<platform::View> root_;
+    std::shared_ptr<ConversationView> conversation_;
+    bool rightToLeft_;
+    std::weak_ptr<platform::View> focused_;
+    std::weak_ptr<platform::View> hovered_;
+};
+
+}  // namespace ktr::app

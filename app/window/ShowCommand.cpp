@@ -1,0 +1,44 @@
+#include "app/window/ShowCommand.h"
+
+#include <QApplication>
+#include <QDesktopServices>
+#include <QShortcut>
+#include <QUrl>
+#include <cstdio>
+
+#include "app/window/ConversationWidget.h"
+
+namespace ktr::app {
+
+namespace {
+
+constexpr int kTallWindow = 820;
+constexpr int kWideWindow = 760;
+
+bool printUrl(const platform::Url& url) {
+    return std::printf("%s\n", url.text().c_str()) >= 0 && std::fflush(stdout) == 0;
+}
+
+bool openOnDesktop(const platform::Url& url) {
+    return QDesktopServices::openUrl(QUrl::fromEncoded(QByteArray::fromStdString(url.text())));
+}
+
+}  // namespace
+
+ExitCode ShowCommand::run() {
+    QGuiApplication::setApplicationName(QStringLiteral("ktr"));
+    host_.delegate().open = options_.printUrls ? printUrl : openOnDesktop;
+    ConversationWidget widget(host_);
+    widget.setWindowTitle(QStringLiteral("ktr"));
+    const int width = static_cast<int>(host_.settings().width);
+    widget.resize(width, width < 900 ? kTallWindow : kWideWindow);
+    for (const QKeySequence& keys : {QKeySequence(Qt::CTRL | Qt::Key_Q), QKeySequence(Qt::CTRL | Qt::Key_W)}) {
+        auto* shortcut = new QShortcut(keys, &widget);
+        QObject::connect(shortcut, &QShortcut::activated, &widget, &QWidget::close);
+    }
+    widget.show();
+    widget.scrollToNewest();
+    return QApplication::exec() == 0 ? ExitCode::Ok : ExitCode::Failure;
+}
+
+}  // namespace ktr::app
