@@ -29,7 +29,7 @@ constexpr std::array kLetterSizes = {LetterSize{42, 19}, LetterSize{54, 22}, Let
                                      LetterSize{89, 50}};
 
 struct Outline {
-    QPainterPath path;   ///< baseline at 0, the letters' ink centred on x = 0; at kOutlineSize
+    QPainterPath path;   ///< baseline at 0, the letters' advance centred on x = 0; at kOutlineSize
     double advance = 0;  ///< at kOutlineSize
 };
 
@@ -56,7 +56,7 @@ Outline outlineOf(const QString& letters) {
             outline.path.addPath(font.pathForGlyph(glyphs[i]).translated(positions[i]));
         }
     }
-    outline.path.translate(-outline.path.boundingRect().center().x(), -line.y() - line.ascent());
+    outline.path.translate(-outline.advance / 2.0, -line.y() - line.ascent());
     outline.path.setFillRule(Qt::WindingFill);
     return outline;
 }

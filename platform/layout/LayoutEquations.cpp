@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <limits>
 
+#include "platform/layout/LayoutScope.h"
+
 namespace ktr::platform {
 
 namespace {
@@ -34,6 +36,9 @@ void LayoutEquations::build(View& owner, const std::vector<std::shared_ptr<Layou
     for (const auto& constraint : constraints) {
         addConstraint(*constraint, *plan);
     }
+    for (int i = 0; i < static_cast<int>(participants_.size()); ++i) {
+        addOwnSizes(i, *plan);
+    }
     addContent(-1, *plan);
     for (int i = 0; i < static_cast<int>(participants_.size()); ++i) {
         if (participants_[i].isFixed) {
@@ -50,12 +55,11 @@ void LayoutEquations::build(View& owner, const std::vector<std::shared_ptr<Layou
     writeInputs();
 }
 
-bool LayoutEquations::isCurrent(const View& owner, bool rightToLeft) const {
-    const auto isSame = [](const Participant& p, const View& view) {
-        const IntrinsicSize size = p.isFixed ? IntrinsicSize{} : view.intrinsicContentSize(kUnlimited);
-        const ContentPriorities priorities = view.contentPriorities();
+bool LayoutEquations::isCurrent(View& owner, bool rightToLeft) const {
+    const auto isSame = [this](const Participant& p, View& view) {
+        const IntrinsicSize size = p.isFixed ? IntrinsicSize{} : contentOf(view);
         return p.hasWidth == size.width.has_value() && p.hasHeight == size.height.has_value() &&
-               p.priorities == priorities;
+               p.priorities == view.contentPriorities();
     };
     if (owner_.identity != &owner || rightToLeft_ != rightToLeft || hasStrangers_ || !isSame(owner_, owner)) {
         return false;
@@ -63,15 +67,36 @@ bool LayoutEquations::isCurrent(const View& owner, bool rightToLeft) const {
     return std::all_of(participants_.begin(), participants_.end(), [&isSame](const Participant& p) {
         const auto view = p.view.lock();
         return view && view->superview().get() == p.superview &&
-               view->translatesAutoresizingMaskIntoConstraints() == p.isFixed && isSame(p, *view);
+               view->translatesAutoresizingMaskIntoConstraints() == p.isFixed &&
+               LayoutScope::revisionOf(*view) == p.ownConstraints && isSame(p, *view);
     });
 }
 
-/// The participant of a view below the owner; -1 for the owner, -2 for a stranger.
-int LayoutEquations::participantOf(const std::shared_ptr<View>& view, Plan& plan) {
-    if (!view) {
-        return -2;
+/// The content's size; that of a view which places its subviews by constraints is what these need.
+IntrinsicSize LayoutEquations::contentOf(View& view) const {
+    const IntrinsicSize size = view.intrinsicContentSize(kUnlimited);
+    if (size.width || size.height || &view == owner_.identity || !LayoutScope::arrangesSubviews(view)) {
+        return size;
     }
+    const Size fitting = view.systemLayoutSizeFitting({kCompressedFittingExtent, kCompressedFittingExtent}, 1.0, 1.0);
+    return {fitting.width, fitting.height};
+}
+
+/// Whether the anchor's view is the owner or below it; true for none.
+bool LayoutEquations::isBelowOwner(const LayoutAnchor& anchor) const {
+    if (anchor.attribute() == LayoutAttribute::None) {
+        return true;
+    }
+    for (auto view = anchor.view(); view; view = view->superview()) {
+        if (view.get() == owner_.identity) {
+            return true;
+        }
+    }
+    return false;
+}
+
+/// The participant of a view below the owner; -1 for the owner.
+int LayoutEquations::participantOf(const std::shared_ptr<View>& view, Plan& plan) {
     if (view.get() == owner_.identity) {
         return -1;
     }
@@ -82,16 +107,14 @@ int LayoutEquations::participantOf(const std::shared_ptr<View>& view, Plan& plan
     }
     const auto superview = view->superview();
     const int parent = participantOf(superview, plan);
-    if (parent == -2) {
-        return -2;
-    }
     Participant participant;
     participant.view = view;
     participant.identity = view.get();
     participant.superview = superview.get();
     participant.parent = parent;
-    participant.firstVariable = plan.variables;
+    participant.width = plan.variables;
     participant.isFixed = view->translatesAutoresizingMaskIntoConstraints();
+    participant.ownConstraints = LayoutScope::revisionOf(*view);
     plan.variables += 4;
     readContent(participant, *view);
     participants_.push_back(std::move(participant));
@@ -102,7 +125,7 @@ int LayoutEquations::participantOf(const std::shared_ptr<View>& view, Plan& plan
 std::vector<Term> LayoutEquations::position(int participant, bool isHorizontal) const {
     std::vector<Term> terms;
     for (int p = participant; p >= 0; p = participants_[p].parent) {
-        terms.push_back({participants_[p].firstVariable + (isHorizontal ? 0 : 1), 1.0});
+        terms.push_back({isHorizontal ? participants_[p].x() : participants_[p].y(), 1.0});
     }
     return terms;
 }
@@ -115,12 +138,8 @@ LayoutEquations::End LayoutEquations::end(const LayoutAnchor& anchor, bool isMir
         return end;
     }
     const int p = participantOf(anchor.view(), plan);
-    end.isValid = p != -2;
-    if (!end.isValid) {
-        return end;
-    }
-    const VariableId width = p < 0 ? kOwnerWidth : participants_[p].firstVariable + 2;
-    const VariableId height = p < 0 ? kOwnerHeight : participants_[p].firstVariable + 3;
+    const VariableId width = content(p).width;
+    const VariableId height = content(p).height();
     const LayoutAttribute attribute = anchor.attribute();
     if (attribute == LayoutAttribute::Width || attribute == LayoutAttribute::Height) {
         end.terms = {{attribute == LayoutAttribute::Width ? width : height, 1.0}};
@@ -165,14 +184,14 @@ LayoutEquations::End LayoutEquations::end(const LayoutAnchor& anchor, bool isMir
 }
 
 void LayoutEquations::addConstraint(const LayoutConstraint& constraint, Plan& plan) {
+    if (!isBelowOwner(constraint.first()) || !isBelowOwner(constraint.second())) {
+        hasStrangers_ = true;
+        return;
+    }
     const bool isMirrored = rightToLeft_ && (followsDirection(constraint.first().attribute()) ||
                                              followsDirection(constraint.second().attribute()));
     End first = end(constraint.first(), isMirrored, plan);
     const End second = end(constraint.second(), isMirrored, plan);
-    if (!first.isValid || !second.isValid) {
-        hasStrangers_ = true;
-        return;
-    }
     Equation equation;
     equation.terms = std::move(first.terms);
     for (const Term& term : second.terms) {
@@ -204,27 +223,40 @@ void LayoutEquations::addContent(int participant, Plan& plan) const {
         }
         add(LayoutRelation::GreaterOrEqual, kNotNegativeLevel, false);
     };
-    const VariableId width = participant < 0 ? kOwnerWidth : p.firstVariable + 2;
     plan.contents.push_back({plan.equations.size(), participant});
-    addExtent(width, p.hasWidth, p.priorities.horizontalHugging, p.priorities.horizontalCompressionResistance);
-    addExtent(width + 1, p.hasHeight, p.priorities.verticalHugging, p.priorities.verticalCompressionResistance);
+    addExtent(p.width, p.hasWidth, p.priorities.horizontalHugging, p.priorities.horizontalCompressionResistance);
+    addExtent(p.height(), p.hasHeight, p.priorities.verticalHugging, p.priorities.verticalCompressionResistance);
 }
 
 void LayoutEquations::addFrame(int participant, Plan& plan) const {
     plan.frames.push_back({plan.equations.size(), participant});
-    for (VariableId i = 0; i < 4; ++i) {
-        const VariableId variable = participants_[participant].firstVariable + i;
+    const Participant& p = participants_[participant];
+    for (const VariableId variable : {p.x(), p.y(), p.width, p.height()}) {
         plan.equations.push_back({{{variable, 1.0}}, LayoutRelation::Equal, 0.0, Solver::kInput, true});
     }
 }
 
-void LayoutEquations::readContent(Participant& participant, const View& view) {
+/// What a view says of its own width and height, which its superview's scope solves.
+void LayoutEquations::addOwnSizes(int participant, Plan& plan) {
+    const auto view = participants_[participant].view.lock();
+    if (!view || participants_[participant].ownConstraints == 0) {
+        return;
+    }
+    for (const auto& constraint : view->constraints()) {
+        const auto second = constraint->second().view();
+        if (constraint->first().view() == view && (!second || second == view)) {
+            addConstraint(*constraint, plan);
+        }
+    }
+}
+
+void LayoutEquations::readContent(Participant& participant, View& view) const {
     participant.priorities = view.contentPriorities();
     if (participant.isFixed) {
         participant.frame = view.frame();
         return;
     }
-    const IntrinsicSize size = view.intrinsicContentSize(kUnlimited);
+    const IntrinsicSize size = contentOf(view);
     participant.hasWidth = size.width.has_value();
     participant.hasHeight = size.height.has_value();
     participant.content = {size.width.value_or(0.0), size.height.value_or(0.0)};
@@ -249,17 +281,17 @@ bool LayoutEquations::readInputs() {
 
 bool LayoutEquations::readHeightsFor(const Solver& solver) {
     bool isWrapped = false;
-    const auto read = [&](Participant& participant, VariableId width) {
+    const auto read = [&](Participant& participant) {
         const auto view = participant.view.lock();
         if (view && participant.wraps) {
-            participant.lastWidth = std::max(0.0, solver.value(width));
+            participant.lastWidth = std::max(0.0, solver.value(participant.width));
             readContent(participant, *view);
             isWrapped = true;
         }
     };
-    read(owner_, kOwnerWidth);
+    read(owner_);
     for (Participant& participant : participants_) {
-        read(participant, participant.firstVariable + 2);
+        read(participant);
     }
     return isWrapped && writeInputs();
 }

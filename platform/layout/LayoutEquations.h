@@ -14,8 +14,11 @@ namespace ktr::platform {
 /// relations, levels, the constants that constraints were written with) is the *structure*, equal for all rows of one
 /// class; the other constants are *inputs* that are read from the views each time.
 ///
-/// Variables: width and height of the owner (0 and 1), then x, y, width and height of each view that a constraint
-/// mentions, in its superview's coordinates.
+/// A constraint that a view holds on its own width and height counts in the scope above it too; where a view arranges
+/// subviews of its own, what these need is its content.
+///
+/// Variables: width and height of the owner (0 and 1), then width, height, x and y of each view that a constraint
+/// mentions, in its superview's coordinates: of a size and a place that nothing determines, the size is the smaller.
 class LayoutEquations {
   public:
     static constexpr VariableId kOwnerWidth = 0;
@@ -35,11 +38,16 @@ class LayoutEquations {
     /// A view that takes part.
     struct Participant {
         std::weak_ptr<View> view;
+        VariableId height() const { return width + 1; }
+        VariableId x() const { return width + 2; }
+        VariableId y() const { return width + 3; }
+
         const View* identity = nullptr;
         const View* superview = nullptr;
-        int parent = -1;  // its superview's participant, -1 for the owner
-        VariableId firstVariable = 0;
-        bool isFixed = false;  // its frame is taken as it stands
+        int parent = -1;              // its superview's participant, -1 for the owner
+        VariableId width = 0;         // height, x and y follow
+        bool isFixed = false;         // its frame is taken as it stands
+        unsigned ownConstraints = 0;  // the revision of those that it holds itself
         ContentPriorities priorities;
         bool hasWidth = false;
         bool hasHeight = false;
@@ -74,7 +82,7 @@ class LayoutEquations {
     /// Builds everything anew. `owner` holds the constraints.
     void build(View& owner, const std::vector<std::shared_ptr<LayoutConstraint>>& constraints, bool rightToLeft);
     /// Whether the views are still those that the equations were built for; false asks for a new build.
-    bool isCurrent(const View& owner, bool rightToLeft) const;
+    bool isCurrent(View& owner, bool rightToLeft) const;
     /// Reads the inputs from the views; true when some changed. The height of wrapped content is read for its last
     /// known width.
     bool readInputs();
@@ -96,16 +104,18 @@ class LayoutEquations {
         bool hasBaseline = false;
         int participant = -1;
         bool isFirst = false;
-        bool isValid = true;
     };
 
+    bool isBelowOwner(const LayoutAnchor& anchor) const;
     int participantOf(const std::shared_ptr<View>& view, Plan& plan);
     void addConstraint(const LayoutConstraint& constraint, Plan& plan);
     End end(const LayoutAnchor& anchor, bool isMirrored, Plan& plan);
     std::vector<Term> position(int participant, bool isHorizontal) const;
     void addContent(int participant, Plan& plan) const;
     void addFrame(int participant, Plan& plan) const;
-    static void readContent(Participant& participant, const View& view);
+    void addOwnSizes(int participant, Plan& plan);
+    void readContent(Participant& participant, View& view) const;
+    IntrinsicSize contentOf(View& view) const;
     bool writeInputs();
     double baselineOffset(int participant, bool isFirst) const;
     const Participant& content(int participant) const { return participant < 0 ? owner_ : participants_[participant]; }

@@ -28,8 +28,7 @@ bool LayoutScope::add(const std::shared_ptr<LayoutConstraint>& constraint) {
         return false;
     }
     constraints_.push_back(constraint);
-    structure_.reset();
-    inputChanged(owner_);
+    constraintsChanged();
     return true;
 }
 
@@ -40,9 +39,27 @@ bool LayoutScope::remove(const LayoutConstraint& constraint) {
         return false;
     }
     constraints_.erase(found);
+    constraintsChanged();
+    return true;
+}
+
+void LayoutScope::constraintsChanged() {
+    ++revision_;
+    arrangesSubviews_ = std::any_of(constraints_.begin(), constraints_.end(), [this](const auto& constraint) {
+        const auto first = constraint->first().view();
+        const auto second = constraint->second().view();
+        return (first && first.get() != &owner_) || (second && second.get() != &owner_);
+    });
     structure_.reset();
     inputChanged(owner_);
-    return true;
+}
+
+unsigned LayoutScope::revisionOf(const View& view) {
+    return view.scope_ ? view.scope_->revision_ : 0;
+}
+
+bool LayoutScope::arrangesSubviews(const View& view) {
+    return view.scope_ && view.scope_->arrangesSubviews_;
 }
 
 void LayoutScope::invalidate() {
@@ -104,9 +121,9 @@ void LayoutScope::apply(const Solver& solver) const {
     for (const LayoutEquations::Participant& participant : equations_.participants()) {
         const auto view = participant.view.lock();
         if (view && !participant.isFixed) {
-            const VariableId x = participant.firstVariable;
-            view->setFrame({solver.value(x), solver.value(x + 1), std::max(0.0, solver.value(x + 2)),
-                            std::max(0.0, solver.value(x + 3))});
+            view->setFrame({solver.value(participant.x()), solver.value(participant.y()),
+                            std::max(0.0, solver.value(participant.width)),
+                            std::max(0.0, solver.value(participant.height()))});
         }
     }
 }
@@ -135,9 +152,9 @@ Size LayoutScope::fittingSize(Size target, double horizontalPriority, double ver
 }
 
 std::string LayoutScope::nameOf(VariableId variable) const {
-    static constexpr const char* kParts[] = {".x", ".y", ".width", ".height"};
+    static constexpr const char* kParts[] = {".width", ".height", ".x", ".y"};
     if (variable < 2) {
-        return std::string("owner") + kParts[variable + 2];
+        return std::string("owner") + kParts[variable];
     }
     return "view" + std::to_string((variable - 2) / 4 + 1) + kParts[(variable - 2) % 4];
 }

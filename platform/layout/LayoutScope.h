@@ -38,6 +38,10 @@ class KTR_API LayoutScope {
     /// The layout input of `view` changed (its content, a priority, a constraint): it and all above it are laid out
     /// again, and what they remember of sizes is forgotten.
     static void inputChanged(View& view);
+    /// Grows whenever the constraints that a view holds change; 0 for a view that never held one.
+    static unsigned revisionOf(const View& view);
+    /// Whether a view holds constraints about views below it.
+    static bool arrangesSubviews(const View& view);
 
   private:
     struct Fitting {
@@ -46,6 +50,7 @@ class KTR_API LayoutScope {
         double verticalPriority = 0.0;
         Size size;
     };
+    void constraintsChanged();
     bool prepare();
     Solver& solved(Size target, double horizontalLevel, double verticalLevel);
     void apply(const Solver& solver) const;
@@ -56,6 +61,8 @@ class KTR_API LayoutScope {
     LayoutEquations equations_;
     std::shared_ptr<LayoutStructure> structure_;  // none: to be built
     std::vector<Fitting> fittings_;               // what was asked since an input changed
+    unsigned revision_ = 0;
+    bool arrangesSubviews_ = false;
     Size laidOut_{-1.0, -1.0};
     bool isDirty_ = true;   // the views are not placed for the present inputs
     bool isFresh_ = false;  // no input was reported to have changed since the inputs were read for a fitting
