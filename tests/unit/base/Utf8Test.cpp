@@ -2,8 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include "platform/base/Url.h"
-
 namespace ktr::test {
 namespace {
 
@@ -67,18 +65,6 @@ TEST(Utf8Test, LengthCountsCodePoints) {
 
 TEST(Utf8Test, LowerCasingIsAsciiAlone) {
     EXPECT_EQ(asciiLowercased("_$!<HOME>!$_ ÄÖ"), "_$!<home>!$_ ÄÖ");
-}
-
-TEST(UrlTest, HoldsItsTextVerbatim) {
-    const auto url = platform::Url::fromText("wayloc://friend/a@b.example?%zz");
-    ASSERT_TRUE(url);
-    EXPECT_EQ(url->text(), "wayloc://friend/a@b.example?%zz");
-}
-
-TEST(UrlTest, BlanksAndControlCharactersMakeNoUrl) {
-    for (const char* text : {"", "a b", "a\nb", "a\x7F", "\t"}) {
-        EXPECT_FALSE(platform::Url::fromText(text)) << testing::PrintToString(text);
-    }
 }
 
 }  // namespace

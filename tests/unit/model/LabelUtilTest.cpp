@@ -1,9 +1,5 @@
 #include "model/LabelUtil.h"
 
-#include <cmath>
-
-#include "model/NumberComparison.h"
-#include "model/TextWidth.h"
 #include "tests/support/PlatformTest.h"
 
 namespace ktr::test {
@@ -57,43 +53,6 @@ TEST_F(LabelUtilTest, KeyForDefaultLabel_AnAbsentTextIsEmpty_IsKept) {
     EXPECT_EQ(LabelUtil::keyForDefaultLabel(""), std::nullopt);
     localization->texts.clear();
     EXPECT_EQ(LabelUtil::keyForDefaultLabel(""), "_$!<home>!$_");
-}
-
-TEST(NumberComparisonTest, CloseIsAtMostTheThreshold) {
-    EXPECT_TRUE(isCloseToNumber(37.0000005, 37.0, 0.000001));
-    EXPECT_TRUE(isCloseToNumber(37.0, 37.0000005, 0.000001));
-    EXPECT_FALSE(isCloseToNumber(37.000002, 37.0, 0.000001));
-    EXPECT_TRUE(isCloseToNumber(1.5, 1.0, 0.5)) << "the threshold itself is close";
-    EXPECT_TRUE(isCloseToNumber(1.0, 1.0, 0.0));
-}
-
-TEST(NumberComparisonTest, NothingIsCloseToNaNOrWithinLessThanNothing) {
-    EXPECT_FALSE(isCloseToNumber(std::nan(""), 1.0, 10.0));
-    EXPECT_FALSE(isCloseToNumber(1.0, 1.0, -1.0));
-}
-
-class TextWidthTest : public PlatformTest {
-  protected:
-    static constexpr platform::Font kTenPoints{platform::FontFace::Text, platform::FontWeight::Regular, 10.0};
-};
-
-TEST_F(TextWidthTest, ATextThatFitsIsMeasuredOnce) {
-    EXPECT_EQ(stringConstrainedToWidth("abcde", 50.0, kTenPoints), "abcde");
-    EXPECT_EQ(textEngine->count(), 1);
-}
-
-TEST_F(TextWidthTest, AWiderTextComesBackUnchanged_IsKept) {
-    EXPECT_EQ(stringConstrainedToWidth("abcdefghij", 60.0, kTenPoints), "abcdefghij");
-    // Ten glyphs, then nine, eight, seven, six.
-    EXPECT_EQ(textEngine->count(), 5);
-}
-
-TEST_F(TextWidthTest, ShorteningEndsWithLessThanFourCharacters) {
-    EXPECT_EQ(stringConstrainedToWidth("äöü日本語", 1.0, kTenPoints), "äöü日本語");
-    // Six characters, five, four, and three, which is short enough.
-    EXPECT_EQ(textEngine->count(), 4);
-    EXPECT_EQ(stringConstrainedToWidth("", -1.0, kTenPoints), "");
-    EXPECT_EQ(stringConstrainedToWidth("\xFF\x80\x80\x80\x80", 1.0, kTenPoints), "\xFF\x80\x80\x80\x80");
 }
 
 }  // namespace
