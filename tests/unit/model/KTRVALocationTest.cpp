@@ -1,3 +1,4 @@
+// Longer than other tests: every case of the one record that all rows and maps read stands here.
 #include "model/KTRVALocation.h"
 
 #include <cmath>
