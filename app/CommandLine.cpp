@@ -30,6 +30,8 @@ const char* const kFooter = R"(Exit status:
 Environment:
   KTR_PLUGIN       the plugin's library, when --plugin is not given
   KTR_LOG          debug, info, default, error (as it comes) or off: which log lines are written
+  KTR_FONTS        pinned: only the Noto fonts, from their packaged files, for pictures that are compared
+  KTR_RESOURCES    the folder of images and texts, when not ../share/ktr beside the program's folder
   KTR_LOG_PRIVATE  show: names, handles, positions and URLs stand in log lines as they are)";
 
 const char* const kShowExamples = R"(Examples:

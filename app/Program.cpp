@@ -91,6 +91,34 @@ bool hasDisplay() {
     return false;
 }
 
+/// Qt's own remarks are none of the user's concern; what it finds critical is.
+void passOnQtMessage(QtMsgType type, const QMessageLogContext& /*context*/, const QString& text) {
+    if (type == QtCriticalMsg || type == QtFatalMsg) {
+        std::fprintf(stderr, "ktr: %s\n", text.toUtf8().constData());
+    }
+}
+
+/// KTR_FONTS=pinned sets texts from the same font files on every machine, for pictures that are compared.
+linux_::FontSetup::Mode fontMode() {
+    return qgetenv("KTR_FONTS") == "pinned" ? linux_::FontSetup::Mode::Pinned : linux_::FontSetup::Mode::System;
+}
+
+std::optional<Failure> prepareFonts() {
+    std::string error;
+    if (!linux_::FontSetup::prepare(fontMode(), &error)) {
+        return Failure{ExitCode::Failure, "the fonts cannot be set up: " + error};
+    }
+    return std::nullopt;
+}
+
+std::optional<Failure> loadFonts() {
+    const auto missing = linux_::FontSetup::load(fontMode());
+    if (!missing.empty()) {
+        return Failure{ExitCode::Failure, "a font file is missing: " + missing.front()};
+    }
+    return std::nullopt;
+}
+
 ExitCode run(const Options& options, int argc, char** argv) {
     const IsoTime now = sessionNow();
     const auto read = readScenarios(options, options.at ? options.at->date : now.date);
@@ -110,12 +138,17 @@ ExitCode run(const Options& options, int argc, char** argv) {
     if (!window) {
         qputenv("QT_QPA_PLATFORM", "offscreen");
     }
-    linux_::FontSetup::prepare(linux_::FontSetup::Mode::System);
+    qInstallMessageHandler(passOnQtMessage);
+    if (const auto failure = prepareFonts()) {
+        return fail(*failure);
+    }
     // Qt's own options are none of this program's: it sees the name alone.
     int count = argc > 0 ? 1 : 0;
     const std::unique_ptr<QGuiApplication> application(window ? new QApplication(count, argv)
                                                               : new QGuiApplication(count, argv));
-    linux_::FontSetup::load(linux_::FontSetup::Mode::System);
+    if (const auto failure = loadFonts()) {
+        return fail(*failure);
+    }
     return window ? runShow(options, settings, scenarios) : runHeadless(options, settings, scenarios);
 }
 

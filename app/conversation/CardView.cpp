@@ -107,8 +107,7 @@ void CardView::layOutHeader() {
     const double width = bounds().width;
     const bool rtl = rightToLeft();
     const auto place = [&](View& view, const Rect& rect) { view.setFrame(mirrored(rect, width, rtl)); };
-    constexpr double kIconTop = (measures::kHeaderHeight - measures::kHeaderIcon) / 2.0;
-    place(*icon_, {measures::kAxisAvatar - measures::kHeaderIcon / 2.0, kIconTop, measures::kHeaderIcon,
+    place(*icon_, {measures::kAxisAvatar - measures::kHeaderIcon / 2.0, measures::kHeaderIconTop, measures::kHeaderIcon,
                    measures::kHeaderIcon});
     const double ringStart = width - measures::kRingToEnd - measures::kRing;
     const double titleEnd = ring_->hidden() ? width - measures::kCardInset : ringStart - measures::kCardInset;

@@ -18,6 +18,7 @@ inline constexpr double kCardToQuestion = 22.0;
 // A card's header; x from the card's start edge
 inline constexpr double kHeaderHeight = 48.0;
 inline constexpr double kHeaderIcon = 28.0;
+inline constexpr double kHeaderIconTop = 11.0;  ///< a point below the middle: on the title's x-height, not its line box
 inline constexpr double kAxisAvatar = 42.0;
 inline constexpr double kAxisText = 82.0;
 inline constexpr double kCardInset = 15.0;
@@ -43,7 +44,7 @@ inline constexpr double kMargin = 40.0;
 inline constexpr double kSpeechColumn = 316.0;
 inline constexpr double kColumnGap = 24.0;
 inline constexpr double kWideCard = 680.0;
-inline constexpr double kSpeechInset = 4.0;  ///< of sentence and time from the column's end, under the bubble's curve
+inline constexpr double kSpeechInset = 3.0;  ///< of sentence and time from the column's end, under the bubble's curve
 inline constexpr double kSentenceToTime = 8.0;
 inline constexpr double kWideTop = 24.0;
 inline constexpr double kWideBottom = 40.0;
