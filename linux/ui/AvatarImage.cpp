@@ -10,6 +10,7 @@
 
 #include "linux/ui/FontChoice.h"
 #include "linux/ui/PersonColors.h"
+#include "linux/ui/ShapeRecipe.h"
 
 namespace ktr::linux_ {
 
@@ -34,18 +35,13 @@ struct Outline {
 };
 
 Outline outlineOf(const QString& letters) {
-    const FontChoice fonts;
-    const platform::Font bold{platform::FontFace::Text, platform::FontWeight::Bold, kOutlineSize};
-    QTextLayout layout(letters, fonts.font(bold, kOutlineSize, letters));
-    QTextOption option;
-    option.setWrapMode(QTextOption::NoWrap);
-    option.setTextDirection(letters.isRightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
-    option.setAlignment(Qt::AlignLeft | Qt::AlignAbsolute);
-    layout.setTextOption(option);
-    layout.beginLayout();
-    QTextLine line = layout.createLine();
-    line.setLineWidth(kOutlineSize * 100.0);
-    layout.endLayout();
+    ShapeRecipe recipe;
+    recipe.text = letters;
+    const auto stretches = FontChoice().stretches(letters);
+    recipe.font = {stretches.empty() ? FontChoice::baseFamily() : stretches.front().family, kOutlineSize, QFont::Bold};
+    recipe.direction = letters.isRightToLeft() ? Qt::RightToLeft : Qt::LeftToRight;
+    const auto layout = recipe.layout({{kOutlineSize * 100.0, QPointF()}});
+    const QTextLine line = layout->lineAt(0);
     Outline outline;
     outline.advance = line.naturalTextWidth();
     for (const QGlyphRun& run : line.glyphRuns()) {

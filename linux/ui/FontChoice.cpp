@@ -1,10 +1,7 @@
 #include "linux/ui/FontChoice.h"
 
 #include <QFontDatabase>
-#include <QSet>
-#include <algorithm>
 #include <array>
-#include <bitset>
 #include <utility>
 
 namespace ktr::linux_ {
@@ -86,38 +83,24 @@ QChar::Script scriptOf(char32_t c) {
     return script;
 }
 
-bool isSymbol(char32_t c) {
-    return (c >= 0x2100 && c <= 0x2BFF) || (c >= 0x1D400 && c <= 0x1FBFF);
+bool isHanScript(QChar::Script script) {
+    return script == QChar::Script_Han || script == QChar::Script_Hiragana || script == QChar::Script_Katakana ||
+           script == QChar::Script_Hangul || script == QChar::Script_Bopomofo;
 }
 
-using Scripts = std::bitset<QChar::ScriptCount>;
-
-struct Found {
-    Scripts scripts;
-    bool symbols = false;
-};
-
-Found scan(QStringView text) {
-    Found found;
-    // Enough of a text names its scripts; what a stray character beyond needs, the system's own fallback finds.
-    constexpr qsizetype kMost = 20000;
-    const qsizetype end = std::min(text.size(), kMost);
-    for (qsizetype i = 0; i < end; ++i) {
-        char32_t c = text[i].unicode();
-        if (c < 0x0590) {
-            if (c >= 0x0530) {
-                found.scripts.set(QChar::Script_Armenian);
-            }
-            continue;
+/// The script's own family, or an empty text for what the base family is for.
+QString ownFamily(QChar::Script script) {
+    for (const ScriptFamily& entry : kScriptFamilies) {
+        if (entry.script == script) {
+            return QString::fromLatin1(entry.family);
         }
-        if (text[i].isHighSurrogate() && i + 1 < text.size() && text[i + 1].isLowSurrogate()) {
-            c = QChar::surrogateToUcs4(text[i], text[i + 1]);
-            ++i;
-        }
-        found.scripts.set(static_cast<std::size_t>(scriptOf(c)));
-        found.symbols = found.symbols || isSymbol(c);
     }
-    return found;
+    return {};
+}
+
+bool staysWithPrevious(char32_t c) {
+    // Marks, joiners and the like; an emoji's parts are all in the base family's list anyway.
+    return QChar::script(c) == QChar::Script_Inherited || c == 0x200C || c == 0x200D || QChar::isMark(c);
 }
 
 }  // namespace
@@ -132,7 +115,15 @@ const QString& FontChoice::emojiFamily() {
     return kFamily;
 }
 
-QString FontChoice::hanFamily(bool kana, bool hangul) const {
+QString FontChoice::hanFamily(QStringView text) const {
+    bool kana = false;
+    bool hangul = false;
+    // Enough of a text shows what it is written in.
+    constexpr qsizetype kMost = 10000;
+    for (const QChar c : text.left(kMost)) {
+        kana = kana || c.script() == QChar::Script_Hiragana || c.script() == QChar::Script_Katakana;
+        hangul = hangul || c.script() == QChar::Script_Hangul;
+    }
     const QString language = language_.toLower();
     if (kana) {
         return QStringLiteral("Noto Sans CJK JP");
@@ -150,26 +141,37 @@ QString FontChoice::hanFamily(bool kana, bool hangul) const {
     return QStringLiteral("Noto Sans CJK JP");
 }
 
-QStringList FontChoice::families(QStringView text) const {
-    const Found found = scan(text);
-    QStringList list{baseFamily()};
-    for (const ScriptFamily& entry : kScriptFamilies) {
-        if (found.scripts.test(entry.script)) {
-            list.append(QString::fromLatin1(entry.family));
+std::vector<FontChoice::Stretch> FontChoice::stretches(QStringView text) const {
+    std::vector<Stretch> list;
+    QString han;
+    QChar::Script lastScript = QChar::Script_Latin;
+    for (qsizetype i = 0; i < text.size(); ++i) {
+        const qsizetype start = i;
+        char32_t c = text[i].unicode();
+        if (text[i].isHighSurrogate() && i + 1 < text.size() && text[i + 1].isLowSurrogate()) {
+            c = QChar::surrogateToUcs4(text[i], text[i + 1]);
+            ++i;
+        }
+        const bool known = !list.empty();
+        const QChar::Script script = c < 0x0530 ? QChar::Script_Latin : scriptOf(c);
+        if (known && (script == lastScript || staysWithPrevious(c))) {
+            list.back().length = i + 1 - list.back().start;
+            continue;
+        }
+        lastScript = script;
+        QString family = baseFamily();
+        if (isHanScript(script)) {
+            han = han.isEmpty() ? hanFamily(text) : han;
+            family = han;
+        } else if (const QString own = ownFamily(script); !own.isEmpty()) {
+            family = own;
+        }
+        if (known && list.back().family == family) {
+            list.back().length = i + 1 - list.back().start;
+        } else {
+            list.push_back({start, i + 1 - start, family});
         }
     }
-    const bool kana = found.scripts.test(QChar::Script_Hiragana) || found.scripts.test(QChar::Script_Katakana);
-    const bool hangul = found.scripts.test(QChar::Script_Hangul);
-    if (kana || hangul || found.scripts.test(QChar::Script_Han) || found.scripts.test(QChar::Script_Bopomofo)) {
-        list.append(hanFamily(kana, hangul));
-    }
-    // Before the text fonts the emoji font would take the digits; after the symbol fonts it would lose its colours.
-    list.append(emojiFamily());
-    if (found.symbols) {
-        list.append({QStringLiteral("Noto Sans Symbols"), QStringLiteral("Noto Sans Symbols2"),
-                     QStringLiteral("Noto Sans Math")});
-    }
-    list.append({QStringLiteral("DejaVu Sans"), QStringLiteral("sans-serif")});
     return list;
 }
 
@@ -177,7 +179,7 @@ bool FontChoice::hasStyle(const QString& family, const QString& style) {
     return QFontDatabase::styles(family).contains(style);
 }
 
-QFont FontChoice::font(const platform::Font& wanted, int pixelSize, QStringView text) const {
+FontSpec FontChoice::spec(const platform::Font& wanted, int pixelSize, const QString& family) {
     // Looked up once: fonts are added before the first text is shaped, if at all.
     static const bool kLight = hasStyle(baseFamily(), QStringLiteral("Light"));
     static const bool kThin = hasStyle(baseFamily(), QStringLiteral("Thin"));
@@ -187,8 +189,21 @@ QFont FontChoice::font(const platform::Font& wanted, int pixelSize, QStringView 
     } else if (weight == QFont::Normal && wanted.face == platform::FontFace::Thin && kThin) {
         weight = QFont::Thin;
     }
+    return {family, pixelSize, weight};
+}
+
+QFont FontSpec::font() const {
+    QStringList families{family};
+    if (family != FontChoice::baseFamily()) {
+        families.append(FontChoice::baseFamily());
+    }
+    // Before the text fonts the emoji font would take the digits; after the symbol fonts it would lose its colours.
+    families.append({FontChoice::emojiFamily(), QStringLiteral("Noto Sans Symbols"),
+                     QStringLiteral("Noto Sans Symbols2"), QStringLiteral("Noto Sans Math"),
+                     QStringLiteral("DejaVu Sans"), QStringLiteral("sans-serif")});
+    families.removeDuplicates();
     QFont font;
-    font.setFamilies(families(text));
+    font.setFamilies(families);
     font.setPixelSize(pixelSize);
     font.setWeight(weight);
     font.setHintingPreference(QFont::PreferNoHinting);

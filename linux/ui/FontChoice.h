@@ -3,33 +3,51 @@
 #include <QFont>
 #include <QString>
 #include <QStringList>
+#include <vector>
 
 #include "platform/ui/Font.h"
 
 namespace ktr::linux_ {
 
-/// Which fonts a text is set in. Any thread, while a QGuiApplication exists.
+/// A font as it can be made in any thread: a QFont keeps what the thread that used it has loaded.
+struct FontSpec {
+    QString family;
+    int pixelSize = 16;
+    QFont::Weight weight = QFont::Normal;
+
+    bool operator==(const FontSpec&) const = default;
+    /// The family, the base family behind it, then the emoji font, then symbols. Qt keeps this list for all fonts that
+    /// begin with the same family, so that it must not depend on anything else.
+    QFont font() const;
+};
+
+/// Which fonts a text is set in: Noto Sans, and for what has a script of its own the Noto font of that script. Any
+/// thread, while a QGuiApplication exists.
 class FontChoice {
   public:
+    /// A stretch of a text in one family.
+    struct Stretch {
+        qsizetype start = 0;
+        qsizetype length = 0;
+        QString family;
+    };
+
     /// `language` (BCP 47) decides the forms of Han characters where the text itself leaves them open.
     explicit FontChoice(QString language = {}) : language_(std::move(language)) {}
 
-    /// Noto Sans, then the families of the scripts that occur in the text, then the emoji font, then symbols. The list
-    /// holds only what the text can use: each further family would be opened for every character that is missing in the
-    /// ones before it.
-    QStringList families(QStringView text) const;
+    /// The families of a text, from its beginning to its end. Marks stay with what they stand on.
+    std::vector<Stretch> stretches(QStringView text) const;
+    /// The Noto Sans CJK family for the Han characters of a text.
+    QString hanFamily(QStringView text) const;
 
-    /// The font for a text at a whole size in pixels; regular, bold, and light or thin where they are installed.
-    QFont font(const platform::Font& font, int pixelSize, QStringView text) const;
-
+    /// Regular or bold, and light or thin where they are installed; no weight is ever synthesised.
+    static FontSpec spec(const platform::Font& font, int pixelSize, const QString& family);
     /// Whether the family has this style ("Light", "Thin", "Bold") as a font of its own.
     static bool hasStyle(const QString& family, const QString& style);
     static const QString& baseFamily();
     static const QString& emojiFamily();
 
   private:
-    QString hanFamily(bool kana, bool hangul) const;
-
     QString language_;
 };
 

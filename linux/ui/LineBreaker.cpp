@@ -33,7 +33,7 @@ double finite(double value) {
 LineBreaker::LineBreaker(const PreparedText& text, const platform::TextContainer& container, const FontChoice& fonts)
     : text_(text),
       container_(container),
-      fonts_(fonts),
+      stretches_(fonts.stretches(text.text)),
       endless_(!(container.width < kWidest)),
       width_(endless_ ? kWidest : std::max(0.0, container.width)) {
     const double size = std::clamp(finite(text.runs.front().font.size), 1.0, 1000.0);
@@ -69,57 +69,54 @@ qsizetype LineBreaker::lineEndFrom(qsizetype from) const {
     return end < 0 ? text_.text.size() : end;
 }
 
-std::unique_ptr<QTextLayout> LineBreaker::makeLayout(qsizetype from, qsizetype to, const QString& tail,
-                                                     bool wrap) const {
-    const QString piece = text_.text.mid(from, to - from) + tail;
+ShapeRecipe LineBreaker::recipe(qsizetype from, qsizetype to, const QString& tail, bool wrap) const {
+    ShapeRecipe made;
+    made.text = text_.text.mid(from, to - from) + tail;
+    made.wrap = wrap;
+    made.direction = text_.isRightToLeft(from, to, container_.rightToLeft) ? Qt::RightToLeft : Qt::LeftToRight;
     const auto& first = text_.runAt(from);
-    auto layout = std::make_unique<QTextLayout>(piece, fonts_.font(first.font, pixelSize(first.font), piece));
-    QTextOption option;
-    option.setWrapMode(wrap ? QTextOption::WrapAtWordBoundaryOrAnywhere : QTextOption::NoWrap);
-    option.setTextDirection(text_.isRightToLeft(from, to, container_.rightToLeft) ? Qt::RightToLeft : Qt::LeftToRight);
-    option.setAlignment(Qt::AlignLeft | Qt::AlignAbsolute);
-    layout->setTextOption(option);
-    QList<QTextLayout::FormatRange> formats;
+    made.font = FontChoice::spec(first.font, pixelSize(first.font), FontChoice::baseFamily());
+    // Each run is set in the families of its scripts; what the layout's own font sets needs no range.
+    auto stretch = std::partition_point(stretches_.begin(), stretches_.end(),
+                                        [from](const auto& s) { return s.start + s.length <= from; });
     for (const auto& run : text_.runs) {
-        const qsizetype begin = std::max(run.start, from);
-        qsizetype end = std::min(run.start + run.length, to);
-        if (begin >= end || run.font == first.font) {
-            continue;
+        const qsizetype runEnd = std::min(run.start + run.length, to);
+        for (; stretch != stretches_.end() && stretch->start < runEnd; ++stretch) {
+            const qsizetype begin = std::max({stretch->start, run.start, from});
+            const qsizetype end = std::min(stretch->start + stretch->length, runEnd);
+            const FontSpec font = FontChoice::spec(run.font, pixelSize(run.font), stretch->family);
+            if (begin < end && !(font == made.font)) {
+                made.ranges.push_back({begin - from, end - begin, font});
+            }
+            if (stretch->start + stretch->length > runEnd) {
+                break;  // the next run goes on in it
+            }
         }
-        end += end == to ? tail.size() : 0;
-        QTextLayout::FormatRange range;
-        range.start = static_cast<int>(begin - from);
-        range.length = static_cast<int>(end - begin);
-        range.format.setFont(fonts_.font(run.font, pixelSize(run.font), piece));
-        formats.append(range);
     }
-    appendKeycaps(formats, piece, first.font);
-    if (!formats.isEmpty()) {
-        layout->setFormats(formats);
+    if (!tail.isEmpty() && to > from) {
+        const auto& last = text_.runAt(to - 1);
+        made.ranges.push_back(
+            {to - from, tail.size(), FontChoice::spec(last.font, pixelSize(last.font), FontChoice::baseFamily())});
     }
-    layout->setCacheEnabled(true);
-    return layout;
+    appendKeycaps(made);
+    return made;
 }
 
-void LineBreaker::appendKeycaps(QList<QTextLayout::FormatRange>& formats, const QString& piece,
-                                const platform::Font& font) const {
+void LineBreaker::appendKeycaps(ShapeRecipe& recipe) {
     // A keycap is a digit with marks behind it: the text fonts would take the digit and leave an empty key.
     constexpr char16_t kKeycap = 0x20E3;
     constexpr char16_t kEmojiStyle = 0xFE0F;
-    for (qsizetype at = piece.indexOf(QChar(kKeycap)); at > 0; at = piece.indexOf(QChar(kKeycap), at + 1)) {
-        const qsizetype start = at - (at > 1 && piece[at - 1].unicode() == kEmojiStyle ? 2 : 1);
-        QTextLayout::FormatRange range;
-        range.start = static_cast<int>(start);
-        range.length = static_cast<int>(at - start + 1);
-        QFont keys = fonts_.font(font, pixelSize(font), {});
-        keys.setFamilies({FontChoice::emojiFamily(), FontChoice::baseFamily()});
-        range.format.setFont(keys);
-        formats.append(range);
+    const QString& text = recipe.text;
+    for (qsizetype at = text.indexOf(QChar(kKeycap)); at > 0; at = text.indexOf(QChar(kKeycap), at + 1)) {
+        const qsizetype start = at - (at > 1 && text[at - 1].unicode() == kEmojiStyle ? 2 : 1);
+        FontSpec keys = recipe.font;
+        keys.family = FontChoice::emojiFamily();
+        recipe.ranges.push_back({start, at - start + 1, keys});
     }
 }
 
-std::shared_ptr<ShapedText> LineBreaker::share(std::unique_ptr<QTextLayout> layout, qsizetype from, int lines) const {
-    const qsizetype to = from + layout->text().size();
+std::shared_ptr<ShapedText> LineBreaker::share(Shaped shaped, qsizetype from, int lines) const {
+    const qsizetype to = from + shaped.recipe.text.size();
     std::vector<ShapedText::ColorRange> colors;
     bool colored = false;
     for (const auto& run : text_.runs) {
@@ -136,7 +133,13 @@ std::shared_ptr<ShapedText> LineBreaker::share(std::unique_ptr<QTextLayout> layo
         // An ellipsis takes the colour of what it stands for.
         colors.back().length = static_cast<int>(to - from) - colors.back().start;
     }
-    return std::make_shared<ShapedText>(std::move(layout), scale_, lines, std::move(colors));
+    std::vector<ShapeRecipe::Line> placed;
+    for (int i = 0; i < lines; ++i) {
+        const QTextLine line = shaped.layout->lineAt(i);
+        placed.push_back({line.width(), line.position()});
+    }
+    return std::make_shared<ShapedText>(std::move(shaped.recipe), std::move(placed), scale_, std::move(colors),
+                                        std::move(shaped.layout));
 }
 
 LineBreaker::Metrics LineBreaker::metricsOf(qsizetype from, qsizetype to) const {
@@ -244,11 +247,13 @@ void LineBreaker::placeLine(QTextLine& line, double& y, bool grow, Placed& place
 
 LineBreaker::Broken LineBreaker::breakLines(qsizetype shaped, bool grow) const {
     Broken broken;
-    broken.layout = makeLayout(0, shaped, {}, true);
-    broken.layout->beginLayout();
+    broken.shaped.recipe = recipe(0, shaped, {}, true);
+    broken.shaped.layout = broken.shaped.recipe.layout();
+    QTextLayout* const layout = broken.shaped.layout.get();
+    layout->beginLayout();
     double y = 0.0;
     for (;;) {
-        QTextLine line = broken.layout->createLine();
+        QTextLine line = layout->createLine();
         if (!line.isValid()) {
             break;
         }
@@ -265,7 +270,7 @@ LineBreaker::Broken LineBreaker::breakLines(qsizetype shaped, bool grow) const {
                       line.descent() * scale_ > below + 1.0 + kFit;
         broken.lines.push_back(placed);
     }
-    broken.layout->endLayout();
+    layout->endLayout();
     return broken;
 }
 
@@ -290,10 +295,10 @@ std::shared_ptr<const QtTextLayout> LineBreaker::runLines() {
 
 std::shared_ptr<const QtTextLayout> LineBreaker::finish(Broken broken) {
     Placed& last = broken.lines.back();
-    std::unique_ptr<QTextLayout> tail;
+    Shaped tail;
     if (broken.overflows) {
         tail = cutLine(last.start, lineEndFrom(last.start), last.span.width);
-        last.width = tail ? tail->lineAt(0).naturalTextWidth() * scale_ : 0.0;
+        last.width = tail.width;
     }
     double end = 0.0;
     for (const Placed& line : broken.lines) {
@@ -303,16 +308,16 @@ std::shared_ptr<const QtTextLayout> LineBreaker::finish(Broken broken) {
     for (std::size_t i = 0; i < broken.lines.size(); ++i) {
         const Placed& line = broken.lines[i];
         lines.push_back({{alignedX(line, end), line.y, line.width, line.metrics.height}, line.y + line.metrics.ascent});
-        QTextLine shaped = broken.layout->lineAt(static_cast<int>(i));
+        QTextLine shaped = broken.shaped.layout->lineAt(static_cast<int>(i));
         shaped.setPosition(QPointF(lines.back().box.x / scale_, shaped.y()));
     }
     std::vector<QtTextLayout::Piece> pieces;
     const int kept = static_cast<int>(broken.lines.size()) - (broken.overflows ? 1 : 0);
     if (kept > 0) {
-        pieces.push_back({share(std::move(broken.layout), 0, kept), QPointF()});
+        pieces.push_back({share(std::move(broken.shaped), 0, kept), QPointF()});
     }
-    if (tail) {
-        QTextLine line = tail->lineAt(0);
+    if (tail.layout) {
+        QTextLine line = tail.layout->lineAt(0);
         line.setPosition(QPointF(lines.back().box.x / scale_, lines.back().baseline / scale_ - line.ascent()));
         pieces.push_back({share(std::move(tail), last.start, 1), QPointF()});
     }
@@ -330,39 +335,36 @@ std::shared_ptr<const QtTextLayout> LineBreaker::runOneLine() {
         y = *span.below;
         span = spanAt(y, metrics.height);
     }
-    qsizetype shaped = std::min(end, unitsFor(span.width));
-    auto layout = shapeLine(0, shaped, {});
-    double width = layout->lineAt(0).naturalTextWidth() * scale_;
-    while (width <= span.width + kFit && shaped < end) {
-        shaped = std::min(end, wholeCharacter(shaped * 2));
-        layout = shapeLine(0, shaped, {});
-        width = layout->lineAt(0).naturalTextWidth() * scale_;
+    qsizetype ahead = std::min(end, unitsFor(span.width));
+    Shaped shaped = shapeLine(0, ahead, {});
+    while (shaped.width <= span.width + kFit && ahead < end) {
+        ahead = std::min(end, wholeCharacter(ahead * 2));
+        shaped = shapeLine(0, ahead, {});
     }
-    const bool overflows = width > span.width + kFit || end < whole;
+    const bool overflows = shaped.width > span.width + kFit || end < whole;
     if (overflows) {
-        layout = cutLine(0, end, span.width);
-        width = layout ? layout->lineAt(0).naturalTextWidth() * scale_ : 0.0;
+        shaped = cutLine(0, end, span.width);
     }
+    const double width = shaped.width;
     const Placed placed = {span, width, y, metrics, 0, end};
     const double x = alignedX(placed, span.x + width);
     std::vector<QtTextLayout::Piece> pieces;
-    if (layout) {
-        QTextLine line = layout->lineAt(0);
+    if (shaped.layout) {
+        QTextLine line = shaped.layout->lineAt(0);
         line.setPosition(QPointF(x / scale_, (y + metrics.ascent) / scale_ - line.ascent()));
-        pieces.push_back({share(std::move(layout), 0, 1), QPointF()});
+        pieces.push_back({share(std::move(shaped), 0, 1), QPointF()});
     }
     std::vector<platform::TextLayout::Line> lines = {{{x, y, width, metrics.height}, y + metrics.ascent}};
     return std::make_shared<QtTextLayout>(std::move(pieces), std::move(lines), container_.lineFragmentPadding,
                                           overflows);
 }
 
-std::unique_ptr<QTextLayout> LineBreaker::shapeLine(qsizetype from, qsizetype to, const QString& tail) const {
-    auto layout = makeLayout(from, to, tail, false);
-    layout->beginLayout();
-    QTextLine line = layout->createLine();
-    line.setLineWidth(kWidest * 2.0);
-    layout->endLayout();
-    return layout;
+LineBreaker::Shaped LineBreaker::shapeLine(qsizetype from, qsizetype to, const QString& tail) const {
+    Shaped shaped;
+    shaped.recipe = recipe(from, to, tail, false);
+    shaped.layout = shaped.recipe.layout({{kWidest * 2.0, QPointF()}});
+    shaped.width = shaped.layout->lineAt(0).naturalTextWidth() * scale_;
+    return shaped;
 }
 
 QString LineBreaker::ellipsisAfter(qsizetype from, qsizetype end) const {
@@ -386,7 +388,7 @@ QString LineBreaker::ellipsisAfter(qsizetype from, qsizetype end) const {
     return tail;
 }
 
-std::unique_ptr<QTextLayout> LineBreaker::cutLine(qsizetype from, qsizetype to, double room) const {
+LineBreaker::Shaped LineBreaker::cutLine(qsizetype from, qsizetype to, double room) const {
     const qsizetype ahead = std::min(to, wholeCharacter(from + unitsFor(room)));
     // Where the text may be cut: between graphemes, longest first piece last.
     std::vector<qsizetype> cuts = {from};
@@ -395,21 +397,21 @@ std::unique_ptr<QTextLayout> LineBreaker::cutLine(qsizetype from, qsizetype to, 
     for (qsizetype at = finder.toNextBoundary(); at > 0; at = finder.toNextBoundary()) {
         cuts.push_back(from + at);
     }
-    std::unique_ptr<QTextLayout> best;
+    Shaped best;
     const auto fits = [&](std::size_t index) {
         qsizetype end = cuts[index];
         while (end > from && text_.text[end - 1].isSpace()) {
             --end;
         }
-        auto layout = shapeLine(from, end, ellipsisAfter(from, end));
-        if (layout->lineAt(0).naturalTextWidth() * scale_ > room + kFit) {
+        Shaped cut = shapeLine(from, end, ellipsisAfter(from, end));
+        if (cut.width > room + kFit) {
             return false;
         }
-        best = std::move(layout);
+        best = std::move(cut);
         return true;
     };
     if (!fits(0)) {
-        return nullptr;
+        return {};
     }
     // Invariant: what is cut at `low` fits, what is cut at `high` does not (or is beyond the text).
     std::size_t low = 0;
@@ -432,16 +434,16 @@ std::unique_ptr<QTextLayout> LineBreaker::cutLine(qsizetype from, qsizetype to, 
 
 std::size_t LineBreaker::estimateCut(const std::vector<qsizetype>& cuts, qsizetype from, qsizetype to,
                                      double room) const {
-    const auto layout = shapeLine(from, to, QString(QChar(0x2026)));
-    const QTextLine line = layout->lineAt(0);
-    const double all = line.naturalTextWidth() * scale_;
+    const Shaped shaped = shapeLine(from, to, QString(QChar(0x2026)));
+    const QTextLine line = shaped.layout->lineAt(0);
+    const double all = shaped.width;
     const double ellipsis =
         std::abs(line.cursorToX(static_cast<int>(to - from)) - line.cursorToX(static_cast<int>(to - from + 1))) *
         scale_;
     if (all <= 0.0) {
         return cuts.size() - 1;
     }
-    const bool rightToLeft = layout->textOption().textDirection() == Qt::RightToLeft;
+    const bool rightToLeft = shaped.recipe.direction == Qt::RightToLeft;
     const double edge = (rightToLeft ? all - (room - ellipsis) : room - ellipsis) / scale_;
     const qsizetype at = from + line.xToCursor(edge, QTextLine::CursorBetweenCharacters);
     const auto found = std::upper_bound(cuts.begin(), cuts.end(), at);

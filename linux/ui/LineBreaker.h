@@ -8,6 +8,7 @@
 #include "linux/ui/FontChoice.h"
 #include "linux/ui/PreparedText.h"
 #include "linux/ui/QtTextLayout.h"
+#include "linux/ui/ShapeRecipe.h"
 #include "platform/text/TextEngine.h"
 
 namespace ktr::linux_ {
@@ -16,7 +17,7 @@ namespace ktr::linux_ {
 /// Any thread, while a QGuiApplication exists.
 class LineBreaker {
   public:
-    /// All three must outlive the breaker. The text must not be empty.
+    /// Text and container must outlive the breaker. The text must not be empty.
     LineBreaker(const PreparedText& text, const platform::TextContainer& container, const FontChoice& fonts);
 
     std::shared_ptr<const QtTextLayout> run();
@@ -42,9 +43,16 @@ class LineBreaker {
         qsizetype start = 0;
         qsizetype length = 0;
     };
+    /// A text that this thread has shaped; without a layout there is nothing to draw.
+    struct Shaped {
+        ShapeRecipe recipe;
+        std::unique_ptr<QTextLayout> layout;
+        /// Of a single line, points.
+        double width = 0.0;
+    };
     /// Lines that were broken from the text's first `shaped` units.
     struct Broken {
-        std::unique_ptr<QTextLayout> layout;
+        Shaped shaped;
         std::vector<Placed> lines;
         bool overflows = false;
         /// Some line holds a font that is higher than the line's box.
@@ -57,14 +65,14 @@ class LineBreaker {
     void placeLine(QTextLine& line, double& y, bool grow, Placed& placed) const;
     std::shared_ptr<const QtTextLayout> finish(Broken broken);
 
-    /// The layout of [from, to) with `tail` after it, its formats set, not yet broken.
-    std::unique_ptr<QTextLayout> makeLayout(qsizetype from, qsizetype to, const QString& tail, bool wrap) const;
-    std::unique_ptr<QTextLayout> shapeLine(qsizetype from, qsizetype to, const QString& tail) const;
-    void appendKeycaps(QList<QTextLayout::FormatRange>& formats, const QString& piece,
-                       const platform::Font& font) const;
-    std::shared_ptr<ShapedText> share(std::unique_ptr<QTextLayout> layout, qsizetype from, int lines) const;
+    /// How [from, to) with `tail` after it is shaped.
+    ShapeRecipe recipe(qsizetype from, qsizetype to, const QString& tail, bool wrap) const;
+    static void appendKeycaps(ShapeRecipe& recipe);
+    Shaped shapeLine(qsizetype from, qsizetype to, const QString& tail) const;
+    /// Keeps the first lines for drawing; the text begins at `from`.
+    std::shared_ptr<ShapedText> share(Shaped shaped, qsizetype from, int lines) const;
     /// The line from `from` cut so that it ends in an ellipsis and fits `room` points; none when not even that fits.
-    std::unique_ptr<QTextLayout> cutLine(qsizetype from, qsizetype to, double room) const;
+    Shaped cutLine(qsizetype from, qsizetype to, double room) const;
     /// The cut that is likely to fit, from one shaping of the uncut text.
     std::size_t estimateCut(const std::vector<qsizetype>& cuts, qsizetype from, qsizetype to, double room) const;
     QString ellipsisAfter(qsizetype from, qsizetype end) const;
@@ -82,7 +90,7 @@ class LineBreaker {
 
     const PreparedText& text_;
     const platform::TextContainer& container_;
-    const FontChoice& fonts_;
+    std::vector<FontChoice::Stretch> stretches_;
     bool endless_;
     double width_;
     double scale_;
