@@ -98,7 +98,7 @@ void Optimizer::advance(int column, int direction, double distance) {
             const int e = t.rowEntity(r);
             const double change = cell * step;
             state_.values[e] += change;
-            state_.magnitudes[e] = std::max(state_.magnitudes[e], static_cast<float>(std::abs(change)));
+            state_.magnitudes[e] = std::max(state_.magnitudes[e], std::abs(change));
         }
     }
     state_.values[t.columnEntity(column)] += step;

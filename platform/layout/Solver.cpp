@@ -14,8 +14,7 @@ namespace {
 
 constexpr int kFree = -1;
 constexpr int kIgnored = -2;
-// Values are computed afresh after this many edits, the tableau after this many exchanges: no rounding adds up.
-constexpr int kEditsBetweenEvaluations = 64;
+// Values are computed afresh at each solve, the tableau after this many exchanges: no rounding adds up.
 constexpr int kExchangesBetweenRebuilds = 4000;
 
 using Entity = SolverProblem::Entity;
@@ -122,7 +121,7 @@ int Solver::insert(Entity entity, double scaledConstant) {
         p.entities.push_back(std::move(entity));
         state_.constants.push_back(0.0);
         state_.values.push_back(0.0);
-        state_.magnitudes.push_back(0.0F);
+        state_.magnitudes.push_back(0.0);
         state_.sides.push_back(Side::Any);
         reported_.push_back(false);
     } else {
@@ -133,7 +132,7 @@ int Solver::insert(Entity entity, double scaledConstant) {
     }
     state_.constants[at] = scaledConstant;
     state_.values[at] = 0.0;
-    state_.magnitudes[at] = static_cast<float>(std::abs(scaledConstant));
+    state_.magnitudes[at] = std::abs(scaledConstant);
     state_.sides[at] = Side::Any;
     return at;
 }
@@ -199,13 +198,9 @@ void Solver::insertRow(int entity) {
     p.order.insert(after, entity);
     Tableau& t = tableau();
     const int row = t.addRow(entity);
-    double value = -state_.constants[entity];
     for (const Term& term : e.terms) {
         t.addMultiple(row, static_cast<int>(term.variable), term.coefficient);
-        value += term.coefficient * state_.values[term.variable];
-        state_.magnitudes[entity] = std::max(state_.magnitudes[entity], state_.magnitudes[term.variable]);
     }
-    state_.values[entity] = value;
     changed_ = true;
 }
 
@@ -269,26 +264,8 @@ void Solver::setConstant(ConstraintId id, double constant) {
         insertRow(at);
         return;
     }
-    const double change = scaled - state_.constants[entity];
-    const auto size = static_cast<float>(std::max(std::abs(scaled), std::abs(state_.constants[entity])));
     state_.constants[entity] = scaled;
-    state_.magnitudes[entity] = std::max(state_.magnitudes[entity], size);
-    const Tableau& t = *state_.tableau;
-    ++edits_;
-    if (t.isRow(entity)) {
-        state_.values[entity] -= change;
-        return;
-    }
-    changed_ = changed_ || state_.values[entity] != 0.0;
-    const int column = t.columnOf(entity);
-    for (int r = 0; r < t.rows(); ++r) {
-        const double cell = t.at(r, column);
-        if (cell != 0.0) {
-            const int e = t.rowEntity(r);
-            state_.values[e] += cell * change;
-            state_.magnitudes[e] = std::max(state_.magnitudes[e], static_cast<float>(std::abs(cell) * size));
-        }
-    }
+    isEdited_ = true;
 }
 
 double Solver::constant(ConstraintId id) const {
@@ -301,9 +278,10 @@ double Solver::constant(ConstraintId id) const {
 }
 
 void Solver::solve(const Namer& name) {
-    if (!changed_ && edits_ == 0) {
+    if (!changed_ && !isEdited_) {
         return;
     }
+    state_.evaluate();
     if (changed_ || !isStillOptimal()) {
         if (state_.tableau->exchanges() > kExchangesBetweenRebuilds) {
             rebuild();
@@ -313,13 +291,9 @@ void Solver::solve(const Namer& name) {
         if (optimizer.isExhausted()) {
             platformLog().write(LogLevel::Debug, "The layout solver stopped early: too many steps");
         }
-        changed_ = false;
-        editsSinceEvaluation_ = 0;
-    } else if ((editsSinceEvaluation_ += edits_) > kEditsBetweenEvaluations) {
-        state_.evaluate();
-        editsSinceEvaluation_ = 0;
     }
-    edits_ = 0;
+    changed_ = false;
+    isEdited_ = false;
     reportDropped(name);
 }
 

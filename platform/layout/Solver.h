@@ -49,8 +49,8 @@ class KTR_API Solver {
     ConstraintId add(const LinearExpression& expression, LayoutRelation relation, double level);
     /// Takes back one add. An unknown id has no effect.
     void remove(ConstraintId id);
-    /// Changes the constant on the right. Costs one column, no elimination. A constraint that was added several times
-    /// is parted: only this id's changes.
+    /// Changes the constant on the right: no elimination, unless the answer needs another basis. A constraint that was
+    /// added several times is parted: only this id's changes.
     void setConstant(ConstraintId id, double constant);
     double constant(ConstraintId id) const;
     /// Constraints that differ.
@@ -93,8 +93,7 @@ class KTR_API Solver {
     std::vector<ConstraintId> freeHandles_;
     std::vector<bool> reported_;  // by entity: dropped, and the log says so
     bool changed_ = false;
-    int edits_ = 0;
-    int editsSinceEvaluation_ = 0;
+    bool isEdited_ = false;
 };
 
 }  // namespace ktr::platform

@@ -77,7 +77,7 @@ std::string Solver::dump(const Namer& name) const {
         out +=
             "  " + (name ? name(variable) : "v" + std::to_string(variable)) + " = " + number(state_.values[e]) + "\n";
     }
-    return out + (changed_ || edits_ > 0 ? "not solved since the last change\n" : "");
+    return out + (changed_ || isEdited_ ? "not solved since the last change\n" : "");
 }
 
 }  // namespace ktr::platform

@@ -6,11 +6,12 @@ namespace ktr::platform {
 
 void SolverState::evaluate() {
     const Tableau& t = *tableau;
-    std::vector<double> columns(t.columns());
+    columnSums.resize(t.columns());
+    std::vector<double>& columns = columnSums;
     for (int j = 0; j < t.columns(); ++j) {
         const int entity = t.columnEntity(j);
         columns[j] = values[entity] + (problem->entities[entity].isVariable ? 0.0 : constants[entity]);
-        magnitudes[entity] = static_cast<float>(std::abs(columns[j]));
+        magnitudes[entity] = std::abs(columns[j]);
     }
     for (const int variable : problem->variables) {
         if (!t.isRow(variable)) {
@@ -25,7 +26,7 @@ void SolverState::evaluate() {
             magnitude += std::abs(part);
         }
         values[variable] = sum;
-        magnitudes[variable] = static_cast<float>(magnitude);
+        magnitudes[variable] = magnitude;
     }
     for (const int constraint : problem->order) {
         if (!t.isRow(constraint)) {
@@ -35,10 +36,10 @@ void SolverState::evaluate() {
         double magnitude = std::abs(sum);
         for (const Term& term : problem->entities[constraint].terms) {
             sum += term.coefficient * values[term.variable];
-            magnitude += std::abs(term.coefficient) * static_cast<double>(magnitudes[term.variable]);
+            magnitude += std::abs(term.coefficient) * magnitudes[term.variable];
         }
         values[constraint] = sum;
-        magnitudes[constraint] = static_cast<float>(magnitude);
+        magnitudes[constraint] = magnitude;
     }
 }
 

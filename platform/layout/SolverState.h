@@ -43,12 +43,13 @@ struct SolverState {
     std::shared_ptr<Tableau> tableau;  ///< never written to while it is shared
     std::vector<double> constants;
     std::vector<double> values;
-    std::vector<float> magnitudes;  ///< the largest number that went into a value: sets its tolerance
+    std::vector<double> magnitudes;  ///< the largest number that went into a value: sets its tolerance
     std::vector<Side> sides;
+    std::vector<double> columnSums;  ///< scratch of evaluate
 
     /// What counts as zero for this entity's value. Points beyond a millionth are noise; a sum of huge numbers carries
     /// its own rounding, a few hundred units in the last place.
-    double tolerance(int entity) const { return 1e-9 + 1e-13 * static_cast<double>(magnitudes[entity]); }
+    double tolerance(int entity) const { return 1e-9 + 1e-13 * magnitudes[entity]; }
 
     /// By how much the entity is missed, signed and scaled: 0 when it is met.
     double miss(int entity) const {

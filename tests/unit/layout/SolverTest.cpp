@@ -362,6 +362,18 @@ TEST_F(SolverTest, HugeNumbers_KeepTheSmallOnesExact) {
     EXPECT_DOUBLE_EQ(solver.error(wish), 1e9 - 3.5);
 }
 
+TEST_F(SolverTest, NumbersBeyondReason_End) {
+    const ConstraintId width = add(x, kEqual, 1e308, Solver::kInput);
+    solver.add(1e308 * y - 1e308 * x, kEqual, Solver::kRequired);
+    solver.add(1e-308 * z - 1e308 * y + 1e308, kAtLeast, 500.0);
+    add(z, kAtMost, -1e308, 500.0);
+    solver.solve();
+    EXPECT_EQ(solver.value(x), 1e308);
+    solver.setConstant(width, 3.0);
+    solver.solve();
+    EXPECT_EQ(solver.value(x), 3.0);
+}
+
 TEST_F(SolverTest, TinyAndHugeFactors_AreAlike) {
     solver.add(1e-9 * x - 5e-9, kEqual, Solver::kRequired);
     solver.add(1e9 * y - 1e9 * x - 2e9, kEqual, Solver::kRequired);
