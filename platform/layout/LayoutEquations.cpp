@@ -341,6 +341,14 @@ bool LayoutEquations::writeInputs() {
     return isChanged;
 }
 
+std::string LayoutEquations::nameOf(VariableId variable) {
+    static constexpr const char* kParts[] = {".width", ".height", ".x", ".y"};
+    if (variable < 2) {
+        return std::string("owner") + kParts[variable];
+    }
+    return "view" + std::to_string((variable - 2) / 4 + 1) + kParts[(variable - 2) % 4];
+}
+
 std::vector<double> LayoutEquations::signature() const {
     std::vector<double> signature;
     signature.reserve(plan_->equations.size() * 8);

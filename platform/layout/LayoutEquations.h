@@ -2,6 +2,7 @@
 
 #include <limits>
 #include <memory>
+#include <string>
 #include <vector>
 
 #include "platform/layout/LayoutConstraint.h"
@@ -95,6 +96,8 @@ class LayoutEquations {
     const std::vector<Participant>& participants() const { return participants_; }
     /// By equation: the constant on the right, inputs included.
     const std::vector<double>& constants() const { return constants_; }
+    /// "owner.width", "view1.x" ...: views in the order in which constraints mention them.
+    static std::string nameOf(VariableId variable);
     /// Equal for equal plans only.
     std::vector<double> signature() const;
 

@@ -151,18 +151,10 @@ Size LayoutScope::fittingSize(Size target, double horizontalPriority, double ver
     return size;
 }
 
-std::string LayoutScope::nameOf(VariableId variable) const {
-    static constexpr const char* kParts[] = {".width", ".height", ".x", ".y"};
-    if (variable < 2) {
-        return std::string("owner") + kParts[variable];
-    }
-    return "view" + std::to_string((variable - 2) / 4 + 1) + kParts[(variable - 2) % 4];
-}
-
 std::string LayoutScope::dump() {
     prepare();
     const Solver& solver = solved(owner_.frame().size(), Solver::kInput, Solver::kInput);
-    return solver.dump([this](VariableId variable) { return nameOf(variable); });
+    return solver.dump(LayoutEquations::nameOf);
 }
 
 }  // namespace ktr::platform

@@ -54,7 +54,6 @@ class KTR_API LayoutScope {
     bool prepare();
     Solver& solved(Size target, double horizontalLevel, double verticalLevel);
     void apply(const Solver& solver) const;
-    std::string nameOf(VariableId variable) const;
 
     View& owner_;
     std::vector<std::shared_ptr<LayoutConstraint>> constraints_;

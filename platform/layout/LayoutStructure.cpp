@@ -39,7 +39,7 @@ Solver& LayoutStructure::solved(const std::vector<double>& constants, Size targe
             solver.setConstant(static_cast<ConstraintId>(i + 2), constants[i]);
         }
     }
-    solver.solve();
+    solver.solve(LayoutEquations::nameOf);
     return solver;
 }
 

@@ -81,6 +81,11 @@ void StackView::setArrangedSubviews(const std::vector<std::shared_ptr<View>>& vi
 }
 
 void StackView::subviewsChanged() {
+    const bool isGrown = subviews().size() > knownSubviews_;
+    knownSubviews_ = subviews().size();
+    if (isGrown) {
+        return;  // a subview that came changes no arrangement: a thousand rows are not looked through a thousand times
+    }
     std::erase_if(arranged_, [this](const auto& view) { return view->superview().get() != this; });
 }
 

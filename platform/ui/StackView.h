@@ -38,6 +38,7 @@ class KTR_API StackView : public View {
   private:
     Axis axis_ = Axis::Vertical;
     std::vector<std::shared_ptr<View>> arranged_;
+    std::size_t knownSubviews_ = 0;
 };
 
 }  // namespace ktr::platform
