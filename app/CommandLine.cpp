@@ -61,6 +61,20 @@ struct Words {
     bool light = false;
 };
 
+/// The library's own range check lets "nan" through.
+CLI::Validator range(double least, double most) {
+    const std::string expected =
+        "a number from " + CLI::detail::to_string(least) + " to " + CLI::detail::to_string(most);
+    const auto check = [least, most, expected](std::string& text) {
+        double number = 0.0;
+        const char* end = text.data() + text.size();
+        const auto [stop, error] = std::from_chars(text.data(), end, number);
+        const bool fits = error == std::errc() && stop == end && number >= least && number <= most;
+        return fits ? std::string() : "expected " + expected + ", found " + inQuotes(text);
+    };
+    return CLI::Validator(check, "");
+}
+
 struct Parser {
     CLI::App app{"Draws the answers to \"where is Ann?\" as an assistant's conversation.", "ktr"};
     CLI::App* show = nullptr;
@@ -95,7 +109,7 @@ struct Parser {
             ->type_name("FILE.png|.svg|.pdf");
         render->add_option("--scale", options.scale, "Pixels a point (1)")
             ->type_name("NUMBER")
-            ->check(CLI::Range(0.25, 8.0));
+            ->check(range(0.25, 8.0));
         for (CLI::App* command : {show, render, describe}) {
             addCommon(*command);
         }
@@ -107,7 +121,7 @@ struct Parser {
     void addCommon(CLI::App& command) {
         command.add_option("--width", options.width, "Width in points (400; 1100 on a tablet, desktop or display)")
             ->type_name("POINTS")
-            ->check(CLI::Range(200.0, 8000.0));
+            ->check(range(200.0, 8000.0));
         command.add_option("--language", words.language, "Language of the texts, such as en, de, ar")->type_name("TAG");
         command.add_option("--text-size", words.textSize, "XS, S, M, L, XL, XXL or XXXL")->type_name("SIZE");
         command.add_option("--idiom", words.idiom, "phone, tablet, desktop or display")->type_name("IDIOM");
@@ -187,7 +201,7 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
         return Ending{ExitCode::Ok, std::string(version.what()) + "\n"};
     } catch (const CLI::CallForHelp&) {
         const auto asked = parser.app.get_subcommands();
-        return Ending{ExitCode::Ok, (asked.empty() ? &parser.app : asked.front())->help() + "\n"};
+        return Ending{ExitCode::Ok, (asked.empty() ? parser.app.help() : asked.front()->help("ktr")) + "\n"};
     } catch (const CLI::ParseError& error) {
         return misuse(error.what());
     }

@@ -14,6 +14,8 @@ namespace ondemand = simdjson::ondemand;
 using platform::Dictionary;
 using platform::Value;
 
+const char* const kEndsEarly = "the text ends before its arrays and objects are closed";
+
 JsonPosition positionAt(std::string_view text, std::size_t offset) {
     offset = std::min(offset, text.size());
     const std::string_view before = text.substr(0, offset);
@@ -233,6 +235,9 @@ class Pass {
             }
             return true;
         }
+        if (text_.find_first_of(",]} \t\r\n", start_) == std::string_view::npos) {
+            return failAt(text_.size(), kEndsEarly);
+        }
         double real = 0.0;
         if (value.get_double().get(real)) {
             return failAt(start_, wordsFor(simdjson::NUMBER_ERROR));
@@ -249,7 +254,7 @@ class Pass {
         const bool known = document_->current_location().get(here) == simdjson::SUCCESS;
         const std::size_t offset = known ? offsetOf(here) : text_.size();
         const bool ended = text_.find_first_not_of(" \t\r\n", offset) == std::string_view::npos;
-        return failAt(offset, ended ? "the text ends before its arrays and objects are closed" : wordsFor(error));
+        return failAt(offset, ended ? kEndsEarly : wordsFor(error));
     }
     bool failAt(std::size_t offset, std::string message) {
         error_ = JsonError{positionAt(text_, offset), path_, std::move(message)};

@@ -1,0 +1,119 @@
+#include "app/CommandLine.h"
+
+#include <gtest/gtest.h>
+
+namespace ktr::app {
+
+namespace {
+
+Options parsed(const std::vector<std::string>& arguments) {
+    const auto result = CommandLine::parse(arguments);
+    if (const auto* ending = std::get_if<CommandLine::Ending>(&result)) {
+        ADD_FAILURE() << ending->text;
+        return {};
+    }
+    return std::get<Options>(result);
+}
+
+CommandLine::Ending ending(const std::vector<std::string>& arguments) {
+    const auto result = CommandLine::parse(arguments);
+    const auto* found = std::get_if<CommandLine::Ending>(&result);
+    EXPECT_NE(found, nullptr);
+    return found == nullptr ? CommandLine::Ending{} : *found;
+}
+
+TEST(KTRCommandLineTest, Show_TakesSeveralScenarios) {
+    const Options options = parsed({"show", "a.json", "b.json", "--print-urls", "--dark"});
+    EXPECT_EQ(options.command, Options::Command::Show);
+    EXPECT_EQ(options.scenarios, (std::vector<std::string>{"a.json", "b.json"}));
+    EXPECT_TRUE(options.printUrls);
+    EXPECT_EQ(options.dark, true);
+}
+
+TEST(KTRCommandLineTest, Render_TakesEveryOption) {
+    const Options options =
+        parsed({"render",  "a.json",          "-o",   "x/a.svg",     "--width",  "320",     "--scale",
+                "2.5",     "--language",      "ar",   "--text-size", "XXL",      "--idiom", "tablet",
+                "--light", "--high-contrast", "--at", "+90.5",       "--plugin", "p"});
+    EXPECT_EQ(options.command, Options::Command::Render);
+    EXPECT_EQ(options.output, "x/a.svg");
+    EXPECT_EQ(options.width, 320.0);
+    EXPECT_EQ(options.scale, 2.5);
+    EXPECT_EQ(options.language, "ar");
+    EXPECT_EQ(options.textSize, platform::ContentSizeCategory::XXL);
+    EXPECT_EQ(options.idiom, platform::UserInterfaceIdiom::Tablet);
+    EXPECT_EQ(options.dark, false);
+    EXPECT_TRUE(options.highContrast);
+    EXPECT_EQ(options.atSeconds, 90.5);
+    EXPECT_FALSE(options.at);
+    EXPECT_EQ(options.plugin, "p");
+}
+
+TEST(KTRCommandLineTest, Describe_LeavesOpenWhatIsNotSaid) {
+    const Options options = parsed({"describe", "a.json"});
+    EXPECT_EQ(options.command, Options::Command::Describe);
+    EXPECT_FALSE(options.dark || options.language || options.textSize || options.idiom || options.at);
+}
+
+TEST(KTRCommandLineTest, At_TakesAMoment) {
+    const Options options = parsed({"describe", "a.json", "--at", "2026-05-16T17:42:00+02:00"});
+    ASSERT_TRUE(options.at);
+    EXPECT_EQ(options.at->offsetSeconds, 7200);
+}
+
+TEST(KTRCommandLineTest, Help_HasExamplesAndTheExitStatus) {
+    const auto all = ending({"--help"});
+    EXPECT_EQ(all.code, ExitCode::Ok);
+    EXPECT_NE(all.text.find("Exit status:"), std::string::npos);
+    for (const char* command : {"show", "render", "describe"}) {
+        const auto help = ending({command, "--help"});
+        EXPECT_EQ(help.code, ExitCode::Ok);
+        EXPECT_NE(help.text.find(std::string("  ktr ") + command), std::string::npos) << help.text;
+    }
+}
+
+TEST(KTRCommandLineTest, Version_IsPrinted) {
+    const auto version = ending({"--version"});
+    EXPECT_EQ(version.code, ExitCode::Ok);
+    EXPECT_EQ(version.text.rfind("ktr ", 0), 0u);
+}
+
+TEST(KTRCommandLineTest, Misuse_IsToldWithStatusTwo) {
+    const std::vector<std::vector<std::string>> cases = {
+        {},
+        {"paint"},
+        {"show"},
+        {"render", "a.json"},
+        {"render", "a.json", "-o", "a.gif"},
+        {"render", "a.json", "-o", ".png"},
+        {"render", "a.json", "b.json", "-o", "a.png"},
+        {"render", "a.json", "-o", "a.png", "--scale", "0"},
+        {"render", "a.json", "-o", "a.png", "--scale", "nan"},
+        {"render", "a.json", "-o", "a.png", "--width", "1e9"},
+        {"render", "a.json", "-o", "a.png", "--width", "wide"},
+        {"describe", "a.json", "--at", "soon"},
+        {"describe", "a.json", "--at", "+"},
+        {"describe", "a.json", "--at", "+-5"},
+        {"describe", "a.json", "--at", "+1e3"},
+        {"describe", "a.json", "--at", "+999999999"},
+        {"describe", "a.json", "--language", "en_GB"},
+        {"describe", "a.json", "--text-size", "huge"},
+        {"describe", "a.json", "--idiom", "watch"},
+        {"describe", "a.json", "--dark", "--light"},
+        {"describe", "a.json", "--unknown"},
+        {"show", "a.json", "--scale", "2"},
+    };
+    for (const auto& arguments : cases) {
+        std::string line;
+        for (const auto& argument : arguments) {
+            line += " " + argument;
+        }
+        const auto end = ending(arguments);
+        EXPECT_EQ(end.code, ExitCode::Usage) << line;
+        EXPECT_EQ(end.text.rfind("ktr: ", 0), 0u) << line << ": " << end.text;
+    }
+}
+
+}  // namespace
+
+}  // namespace ktr::app

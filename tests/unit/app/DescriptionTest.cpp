@@ -1,0 +1,42 @@
+#include "app/Description.h"
+
+#include <gtest/gtest.h>
+
+namespace ktr::app {
+
+namespace {
+
+using platform::AccessibilityNode;
+using platform::AccessibilityRole;
+
+AccessibilityNode node(AccessibilityRole role, std::string text, std::vector<AccessibilityNode> children = {}) {
+    AccessibilityNode made;
+    made.role = role;
+    made.text = std::move(text);
+    made.children = std::move(children);
+    return made;
+}
+
+TEST(KTRDescriptionTest, Describe_WritesALineAnElementInOrder) {
+    const auto tree = node(AccessibilityRole::Group, "",
+                           {node(AccessibilityRole::Text, "Where is Ann?"),
+                            node(AccessibilityRole::Group, "",
+                                 {node(AccessibilityRole::Text, "Friends"),
+                                  node(AccessibilityRole::Link, "",
+                                       {node(AccessibilityRole::Text, "At Work"), node(AccessibilityRole::Image, "Ann"),
+                                        node(AccessibilityRole::Text, "Located now")})}),
+                            node(AccessibilityRole::Image, "Map")});
+    EXPECT_EQ(describe(tree), "Where is Ann?\nFriends\nAt Work, Ann, Located now (link)\nMap (image)\n");
+}
+
+TEST(KTRDescriptionTest, Describe_KeepsLineEndsOutOfALine) {
+    EXPECT_EQ(describe(node(AccessibilityRole::Text, "a\nb\tc")), "a b c\n");
+}
+
+TEST(KTRDescriptionTest, Describe_OfNothingIsEmpty) {
+    EXPECT_EQ(describe(node(AccessibilityRole::Group, "")), "");
+}
+
+}  // namespace
+
+}  // namespace ktr::app
