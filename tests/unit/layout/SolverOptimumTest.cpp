@@ -163,10 +163,10 @@ class SolverOptimumTest : public PlatformTest {
     static constexpr int kSystems = 1500;
 
     void SetUp() override { variables = 0; }
-    void makeSystem() {
-        variables = static_cast<std::size_t>(1 + random.below(3));
+    void makeSystem(int mostVariables = 3, int mostRows = 8) {
+        variables = static_cast<std::size_t>(1 + random.below(mostVariables));
         rows.clear();
-        for (int i = random.below(8); i >= 0; --i) {
+        for (int i = random.below(mostRows); i >= 0; --i) {
             rows.push_back(random.row(variables));
         }
         solver = Solver();
@@ -279,6 +279,24 @@ TEST_F(SolverOptimumTest, OrderOfSolving_DoesNotMatter) {
         solver.solve();
         for (VariableId v = 0; v < variables; ++v) {
             ASSERT_NEAR(solver.value(v), stepwise.value(v), kClose) << solver.dump();
+        }
+    }
+}
+
+TEST_F(SolverOptimumTest, LargeSystems_ReachOneAnswerOnEveryWay) {
+    for (int i = 0; i < 100; ++i) {
+        makeSystem(15, 50);
+        Solver stepwise = solver;
+        for (const Row& row : rows) {
+            add(solver, row, row.constant);
+            const ConstraintId id = add(stepwise, row, random.below(50));
+            stepwise.solve();
+            stepwise.setConstant(id, row.constant);
+        }
+        solver.solve();
+        stepwise.solve();
+        for (VariableId v = 0; v < variables; ++v) {
+            ASSERT_NEAR(solver.value(v), stepwise.value(v), 1e-6 * (1.0 + std::abs(solver.value(v)))) << solver.dump();
         }
     }
 }
