@@ -45,10 +45,12 @@ const Color kBlack = Color::rgb(0, 0, 0);
 }  // namespace
 
 TEST_P(QtCanvasTest, Hairline_IsOnePixelWhereverItFalls) {
-    for (int i = 0; i < 97; ++i) {
-        image_.fill(Qt::white);
-        canvas_.fill({0, 10 + i * 0.173, 20, 1.0 / GetParam()}, kBlack);
-        EXPECT_EQ(paintedRows().size(), 1U) << i;
+    for (const double pixels : {0.5, 1.0, 1.4}) {
+        for (int i = 0; i < 97; ++i) {
+            image_.fill(Qt::white);
+            canvas_.fill({0, 10 + i * 0.173, 20, pixels / GetParam()}, kBlack);
+            EXPECT_EQ(paintedRows().size(), 1U) << i;
+        }
     }
 }
 

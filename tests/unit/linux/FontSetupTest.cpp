@@ -1,0 +1,39 @@
+#include "linux/ui/FontSetup.h"
+
+#include <gtest/gtest.h>
+
+#include <QFontDatabase>
+#include <set>
+
+namespace ktr::linux_ {
+
+// The tests' own application runs with the pinned fonts.
+
+TEST(FontSetupTest, PinnedFonts_AreTheOnlyOnes) {
+    EXPECT_TRUE(FontSetup::hasBaseFamily());
+    EXPECT_TRUE(QFontDatabase::hasFamily(QStringLiteral("Noto Sans CJK JP")));
+    EXPECT_TRUE(QFontDatabase::hasFamily(QStringLiteral("Noto Color Emoji")));
+    // Three names are Qt's own for whatever there is.
+    const QStringList aliases = {QStringLiteral("Monospace"), QStringLiteral("Sans Serif"), QStringLiteral("Serif")};
+    for (const QString& family : QFontDatabase::families()) {
+        EXPECT_TRUE(family.startsWith(u"Noto ") || aliases.contains(family)) << family.toStdString();
+    }
+}
+
+TEST(FontSetupTest, Substitutes_AreNamed) {
+    std::set<std::string> wanted;
+    for (const auto& substitute : FontSetup::substitutes()) {
+        wanted.insert(substitute.wanted);
+        EXPECT_FALSE(substitute.used.empty());
+    }
+    EXPECT_EQ(wanted,
+              (std::set<std::string>{"Noto Sans Light", "Noto Sans Thin", "Noto Sans Rounded", "Noto Sans SemiBold"}));
+}
+
+TEST(FontSetupTest, SystemMode_LoadsNothing) {
+    const auto before = QFontDatabase::families();
+    EXPECT_TRUE(FontSetup::load(FontSetup::Mode::System).empty());
+    EXPECT_EQ(QFontDatabase::families(), before);
+}
+
+}  // namespace ktr::linux_

@@ -1,0 +1,202 @@
+#include "linux/ui/QtImageSource.h"
+
+#include <QBuffer>
+#include <QFile>
+#include <QPainter>
+#include <QTemporaryDir>
+
+#include "linux/ui/ImageDecoder.h"
+#include "linux/ui/LinuxDevice.h"
+#include "tests/support/PlatformTest.h"
+
+namespace ktr::linux_ {
+
+using platform::UserInterfaceIdiom;
+
+namespace {
+
+class QtImageSourceTest : public test::PlatformTest {
+  protected:
+    static std::string square(const std::string& color, int size = 10) {
+        const std::string side = std::to_string(size);
+        return R"(<svg xmlns="http://www.w3.org/2000/svg" width=")" + side + R"(" height=")" + side +
+               R"("><rect width="100" height="100" fill=")" + color + R"("/></svg>)";
+    }
+    void put(const std::string& name, const std::string& content, const std::string& bundle = "org.test") {
+        QDir(folder_.path()).mkpath(QString::fromStdString(bundle));
+        QFile file(folder_.filePath(QString::fromStdString(bundle + "/" + name)));
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+        file.write(content.data(), static_cast<qint64>(content.size()));
+    }
+    QtImageSource source() { return QtImageSource(folder_.path().toStdString(), linuxDevice_); }
+    static QColor colorOf(const platform::Image& image, ColorScheme scheme = ColorScheme::Light, double scale = 1.0,
+                          Contrast contrast = Contrast::Normal) {
+        QImage canvas(40, 40, QImage::Format_ARGB32_Premultiplied);
+        canvas.fill(Qt::transparent);
+        QPainter painter(&canvas);
+        painter.scale(scale, scale);
+        dynamic_cast<const QtImage&>(image).draw(painter, QRectF(0, 0, 10, 10), Palette::of(scheme, contrast));
+        return canvas.pixelColor(3, 3);
+    }
+
+    QTemporaryDir folder_;
+    std::shared_ptr<LinuxDevice> linuxDevice_ = std::make_shared<LinuxDevice>();
+};
+
+platform::Bytes encoded(const QImage& image, const char* format) {
+    QByteArray data;
+    QBuffer buffer(&data);
+    buffer.open(QIODevice::WriteOnly);
+    image.save(&buffer, format);
+    return {data.begin(), data.end()};
+}
+
+}  // namespace
+
+TEST_F(QtImageSourceTest, NamedImage_IsTheBundlesOwn) {
+    put("mark.svg", square("#ff0000", 16));
+    auto found = source();
+    const auto image = found.imageNamed("mark", "org.test");
+    ASSERT_NE(image, nullptr);
+    EXPECT_EQ(image->size(), (platform::Size{16, 16}));
+    EXPECT_EQ(found.imageNamed("mark", "org.test"), image);
+    EXPECT_EQ(found.imageNamed("mark", "org.other"), nullptr);
+    EXPECT_EQ(found.imageNamed("none", "org.test"), nullptr);
+    EXPECT_EQ(found.imageNamed("../org.test/mark", "org.test"), nullptr);
+}
+
+TEST_F(QtImageSourceTest, MissingFolder_HasNoImages) {
+    QtImageSource found("/nonexistent/images", nullptr);
+    EXPECT_EQ(found.imageNamed("mark", "org.test"), nullptr);
+}
+
+TEST_F(QtImageSourceTest, Appearance_IsFollowedWhileDrawing) {
+    put("mark.svg", square("#ff0000"));
+    put("mark~dark.svg", square("#00ff00"));
+    put("mark~contrast.svg", square("#0000ff"));
+    put("mark~dark~contrast.svg", square("#ffff00"));
+    const auto image = source().imageNamed("mark", "org.test");
+    EXPECT_EQ(colorOf(*image), QColor(Qt::red));
+    EXPECT_EQ(colorOf(*image, ColorScheme::Dark), QColor(Qt::green));
+    EXPECT_EQ(colorOf(*image, ColorScheme::Light, 1, Contrast::High), QColor(Qt::blue));
+    EXPECT_EQ(colorOf(*image, ColorScheme::Dark, 1, Contrast::High), QColor(Qt::yellow));
+}
+
+TEST_F(QtImageSourceTest, Scale_IsTheSmallestThatIsEnough) {
+    put("mark.svg", square("#ff0000"));
+    put("mark@1x.svg", square("#00ff00"));
+    put("mark@2x.svg", square("#0000ff"));
+    const auto image = source().imageNamed("mark", "org.test");
+    EXPECT_EQ(colorOf(*image, ColorScheme::Light, 1.0), QColor(Qt::green));
+    EXPECT_EQ(colorOf(*image, ColorScheme::Light, 1.5), QColor(Qt::blue));
+    EXPECT_EQ(colorOf(*image, ColorScheme::Light, 2.0), QColor(Qt::blue));
+    EXPECT_EQ(colorOf(*image, ColorScheme::Light, 3.0), QColor(Qt::red));
+}
+
+TEST_F(QtImageSourceTest, Idiom_HasItsOwnVariantsOrThoseForAny) {
+    put("mark.svg", square("#ff0000"));
+    put("mark~dark.svg", square("#00ff00"));
+    put("mark~display.svg", square("#0000ff"));
+    auto found = source();
+    EXPECT_EQ(colorOf(*found.imageNamed("mark", "org.test")), QColor(Qt::red));
+    linuxDevice_->setUserInterfaceIdiom(UserInterfaceIdiom::Display);
+    EXPECT_EQ(colorOf(*found.imageNamed("mark", "org.test")), QColor(Qt::blue));
+    EXPECT_EQ(colorOf(*found.imageNamed("mark", "org.test"), ColorScheme::Dark), QColor(Qt::blue));
+    linuxDevice_->setUserInterfaceIdiom(std::nullopt);
+    EXPECT_EQ(colorOf(*found.imageNamed("mark", "org.test")), QColor(Qt::red));
+}
+
+TEST_F(QtImageSourceTest, PixelImage_TakesItsSizeFromItsScale) {
+    QImage pixels(20, 30, QImage::Format_RGB32);
+    pixels.fill(Qt::red);
+    const auto data = encoded(pixels, "PNG");
+    put("mark@2x.png", std::string(data.begin(), data.end()));
+    EXPECT_EQ(source().imageNamed("mark", "org.test")->size(), (platform::Size{10, 15}));
+}
+
+TEST_F(QtImageSourceTest, FilesThatCannotBeUsed_AreLeftOutWithALine) {
+    put("mark~sepia.svg", square("#ff0000"));
+    put("mark@x.svg", square("#ff0000"));
+    put("broken.svg", "<svg");
+    put("broken.png", "no picture");
+    auto found = source();
+    EXPECT_EQ(found.imageNamed("mark", "org.test"), nullptr);
+    EXPECT_EQ(found.imageNamed("broken", "org.test"), nullptr);
+    EXPECT_TRUE(log->has(platform::LogLevel::Default, "The image broken.svg of org.test cannot be used"));
+    EXPECT_TRUE(log->has(platform::LogLevel::Default, "The image mark@x.svg of org.test cannot be used"));
+}
+
+TEST_F(QtImageSourceTest, ImagesOfTheProject_AreThereForEveryIdiom) {
+    QtImageSource found(std::string(KTR_SOURCE_DIR) + "/resources/images", linuxDevice_);
+    for (const auto idiom : {UserInterfaceIdiom::Phone, UserInterfaceIdiom::Tablet, UserInterfaceIdiom::Desktop,
+                             UserInterfaceIdiom::Display}) {
+        linuxDevice_->setUserInterfaceIdiom(idiom);
+        const auto icon = found.imageNamed("appIcon_dyn", "org.ktr.snippets");
+        ASSERT_NE(icon, nullptr);
+        EXPECT_EQ(icon->size(), (platform::Size{28, 28}));
+        const auto location = found.imageNamed("location", "org.ktr.snippets");
+        ASSERT_NE(location, nullptr);
+        EXPECT_EQ(location->size(), (platform::Size{16, 16}));
+    }
+    EXPECT_TRUE(log->lines().empty());
+}
+
+TEST_F(QtImageSourceTest, LocationIndicator_IsAmberInEveryAppearance) {
+    QtImageSource found(std::string(KTR_SOURCE_DIR) + "/resources/images", linuxDevice_);
+    const auto image = std::dynamic_pointer_cast<QtImage>(found.imageNamed("location", "org.ktr.snippets"));
+    for (const auto scheme : {ColorScheme::Light, ColorScheme::Dark}) {
+        for (const auto contrast : {Contrast::Normal, Contrast::High}) {
+            QImage canvas(64, 64, QImage::Format_ARGB32_Premultiplied);
+            canvas.fill(Qt::transparent);
+            QPainter painter(&canvas);
+            const Palette& palette = Palette::of(scheme, contrast);
+            image->draw(painter, QRectF(0, 0, 64, 64), palette);
+            EXPECT_EQ(canvas.pixelColor(32, 40), palette.amber);
+            EXPECT_EQ(canvas.pixelColor(32, 21).alpha(), 0);  // the hole
+        }
+    }
+}
+
+TEST_F(QtImageSourceTest, ImageFromData_HasThePicturesSize) {
+    QImage pixels(30, 20, QImage::Format_RGB32);
+    pixels.fill(Qt::red);
+    auto found = source();
+    for (const char* format : {"PNG", "JPG", "BMP"}) {
+        const auto image = found.imageFromData(encoded(pixels, format));
+        ASSERT_NE(image, nullptr) << format;
+        EXPECT_EQ(image->size(), (platform::Size{30, 20})) << format;
+    }
+}
+
+TEST_F(QtImageSourceTest, ImageFromData_OfNoPictureIsNone) {
+    auto found = source();
+    EXPECT_EQ(found.imageFromData({}), nullptr);
+    EXPECT_EQ(found.imageFromData({1, 2, 3}), nullptr);
+    const std::string svg = square("#ff0000");
+    EXPECT_EQ(found.imageFromData({svg.begin(), svg.end()}), nullptr);
+    QImage pixels(30, 20, QImage::Format_RGB32);
+    pixels.fill(Qt::red);
+    auto cut = encoded(pixels, "PNG");
+    cut.resize(cut.size() / 2);
+    EXPECT_EQ(found.imageFromData(cut), nullptr);
+}
+
+TEST_F(QtImageSourceTest, ImageFromData_BeyondTheCapIsNone) {
+    auto found = source();
+    const QImage wide(ImageDecoder::kMostSide + 1, 1, QImage::Format_Mono);
+    EXPECT_EQ(found.imageFromData(encoded(wide, "PNG")), nullptr);
+    const QImage most(ImageDecoder::kMostSide, 1, QImage::Format_Mono);
+    EXPECT_NE(found.imageFromData(encoded(most, "PNG")), nullptr);
+    EXPECT_EQ(found.imageFromData(platform::Bytes(ImageDecoder::kMostBytes + 1)), nullptr);
+}
+
+TEST_F(QtImageSourceTest, Decoder_ScalesLargePicturesWhileReading) {
+    QImage pixels(1000, 500, QImage::Format_RGB32);
+    pixels.fill(Qt::red);
+    const auto picture = ImageDecoder::decode(encoded(pixels, "JPG"), 100);
+    ASSERT_TRUE(picture);
+    EXPECT_EQ(picture->pixels.size(), QSize(100, 50));
+    EXPECT_EQ(picture->original, QSize(1000, 500));
+}
+
+}  // namespace ktr::linux_

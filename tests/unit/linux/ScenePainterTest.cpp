@@ -1,0 +1,121 @@
+#include "linux/ui/ScenePainter.h"
+
+#include <gtest/gtest.h>
+
+#include <QDir>
+#include <QFile>
+#include <QTemporaryDir>
+#include <limits>
+
+#include "linux/ui/AvatarImage.h"
+#include "linux/ui/QtTextEngine.h"
+
+namespace ktr::linux_ {
+
+using platform::AttributedString;
+using platform::Color;
+using platform::Font;
+
+namespace {
+
+class ScenePainterTest : public ::testing::Test {
+  protected:
+    std::string path(const char* name) const { return folder_.filePath(QString::fromLatin1(name)).toStdString(); }
+    QByteArray read(const char* name) const {
+        QFile file(folder_.filePath(QString::fromLatin1(name)));
+        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
+    }
+    static void paint(QtCanvas& canvas) {
+        QtTextEngine engine;
+        const auto text = engine.layOut(AttributedString("Ann ليلى 佐藤 👍", Font()), {});
+        canvas.draw(*text, {5, 5}, Color::ofRole(platform::ColorRole::StandardText));
+        canvas.fill({0, 40, 100, 0.5}, Color::rgb(1, 0, 0));
+        canvas.draw(*AvatarImage::blank(20), {5, 45, 20, 20});
+    }
+
+    QTemporaryDir folder_;
+    ScenePainter painter_{{200, 80}, 2.0, Palette::of(ColorScheme::Light)};
+};
+
+}  // namespace
+
+TEST_F(ScenePainterTest, Image_HasTheScalesPixelsOnTheWindowsColour) {
+    const QImage image = painter_.image(paint);
+    EXPECT_EQ(image.size(), QSize(400, 160));
+    EXPECT_EQ(image.pixelColor(399, 159), Palette::of(ColorScheme::Light).window);
+    EXPECT_EQ(image.pixelColor(10, 80), QColor(Qt::red));
+    EXPECT_NE(image.pixelColor(10, 81), QColor(Qt::red));
+    ScenePainter dark({10.2, 10}, 1.5, Palette::of(ColorScheme::Dark));
+    const QImage small = dark.image([](QtCanvas&) {});
+    EXPECT_EQ(small.size(), QSize(16, 15));
+    EXPECT_EQ(small.pixelColor(15, 14), Palette::of(ColorScheme::Dark).window);
+}
+
+TEST_F(ScenePainterTest, TransparentBackground_StaysTransparent) {
+    painter_.setBackground(Qt::transparent);
+    EXPECT_EQ(painter_.image(paint).pixelColor(399, 159).alpha(), 0);
+}
+
+TEST_F(ScenePainterTest, Files_AreTheSameEveryTime) {
+    for (const char* ending : {".png", ".svg"}) {
+        const std::string first = std::string("a") + ending;
+        const std::string second = std::string("b") + ending;
+        ASSERT_EQ(painter_.write(path(first.c_str()), paint), std::nullopt);
+        ASSERT_EQ(painter_.write(path(second.c_str()), paint), std::nullopt);
+        EXPECT_FALSE(read(first.c_str()).isEmpty());
+        EXPECT_EQ(read(first.c_str()), read(second.c_str())) << ending;
+    }
+    EXPECT_TRUE(read("a.png").startsWith("\x89PNG"));
+    EXPECT_TRUE(read("a.svg").contains("<svg"));
+    // Nothing else is left in the folder.
+    EXPECT_EQ(QDir(folder_.path()).entryList(QDir::Files | QDir::Hidden).size(), 4);
+}
+
+TEST_F(ScenePainterTest, PdfFile_HoldsNoDate) {
+    ASSERT_EQ(painter_.write(path("a.pdf"), paint), std::nullopt);
+    const QByteArray pdf = read("a.pdf");
+    EXPECT_TRUE(pdf.startsWith("%PDF"));
+    EXPECT_TRUE(pdf.contains("/CreationDate (D:00000000000000"));
+    EXPECT_TRUE(pdf.contains("/MediaBox [0 0 200.000000 80.000000]")) << pdf.mid(pdf.indexOf("/MediaBox"), 40).toStdString();
+}
+
+TEST_F(ScenePainterTest, PngFile_IsTheImage) {
+    ASSERT_EQ(painter_.write(path("a.png"), paint), std::nullopt);
+    const QImage read(QString::fromStdString(path("a.png")));
+    EXPECT_EQ(read.convertToFormat(QImage::Format_RGB32), painter_.image(paint).convertToFormat(QImage::Format_RGB32));
+}
+
+TEST_F(ScenePainterTest, PictureBeyondTheLimit_IsRefusedByName) {
+    const ScenePainter tall({100, 20000}, 2.0, Palette::of(ColorScheme::Light));
+    EXPECT_TRUE(tall.image(paint).isNull());
+    const auto error = tall.write(path("tall.png"), paint);
+    ASSERT_TRUE(error);
+    EXPECT_EQ(*error, path("tall.png") +
+                          ": the picture would be 200 x 40000 pixels; at most 32000 a side can be drawn. A smaller "
+                          "scale may help");
+    EXPECT_FALSE(QFile::exists(QString::fromStdString(path("tall.png"))));
+    EXPECT_EQ(ScenePainter({100, 16000}, 2.0, Palette::of(ColorScheme::Light)).refusal(), std::nullopt);
+}
+
+TEST_F(ScenePainterTest, SizesThatAreNone_AreRefused) {
+    for (const double size : {0.0, -1.0, std::numeric_limits<double>::quiet_NaN()}) {
+        EXPECT_TRUE(ScenePainter({100, size}, 2.0, Palette::of(ColorScheme::Light)).refusal());
+        EXPECT_TRUE(ScenePainter({100, 100}, size, Palette::of(ColorScheme::Light)).refusal());
+    }
+    EXPECT_TRUE(ScenePainter({1e300, 100}, 1e300, Palette::of(ColorScheme::Light)).refusal());
+}
+
+TEST_F(ScenePainterTest, UnknownEnding_IsAnError) {
+    EXPECT_EQ(painter_.write(path("a.gif"), paint), path("a.gif") + ": the name must end in .png, .svg or .pdf");
+    EXPECT_TRUE(painter_.write(path("png"), paint));
+}
+
+TEST_F(ScenePainterTest, PlaceThatCannotBeWritten_IsAnErrorWithNameAndReason) {
+    const std::string file = path("none/a.png");
+    const auto error = painter_.write(file, paint);
+    ASSERT_TRUE(error);
+    EXPECT_TRUE(error->starts_with(file + ": cannot be written: "));
+    EXPECT_GT(error->size(), (file + ": cannot be written: ").size());
+}
+
+}  // namespace ktr::linux_
