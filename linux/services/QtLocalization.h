@@ -26,6 +26,8 @@ class QtLocalization : public platform::Localization {
     /// BCP 47, such as "de-AT": looked for as it is, then with its last subtag dropped, and so on, then in English.
     explicit QtLocalization(std::string language);
     ~QtLocalization() override;
+    QtLocalization(const QtLocalization&) = delete;
+    QtLocalization& operator=(const QtLocalization&) = delete;
 
     /// Reads a bundle's texts from `folder`; false when not even its English file can be read. Adding a bundle again
     /// replaces it.

@@ -1,0 +1,105 @@
+#include "linux/services/IcuDistanceCalculator.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <limits>
+
+#include "linux/services/GeographicLibGeodesy.h"
+#include "tests/support/Doubles.h"
+
+namespace ktr::linux_ {
+
+namespace {
+
+class IcuDistanceCalculatorTest : public ::testing::Test {
+  protected:
+    IcuDistanceCalculator calculator(std::optional<std::string> language, const std::string& region,
+                                     std::optional<UnitSystem> override = std::nullopt) {
+        return {{"group", std::move(language), region, nullptr}, override, std::make_shared<GeographicLibGeodesy>()};
+    }
+    std::string text(std::optional<std::string> language, const std::string& region, double metres) {
+        return calculator(std::move(language), region).localizedDistance(metres).value_or("(none)");
+    }
+};
+
+}  // namespace
+
+TEST_F(IcuDistanceCalculatorTest, UnitsFollowTheRegionAndWordsTheLanguage) {
+    EXPECT_EQ(text("en-GB", "de-DE", 3.0), "3\u00a0m");
+    EXPECT_EQ(text("de", "de-DE", 950.0), "0,95\u00a0km");
+    EXPECT_EQ(text("de", "en-US", 950.0), "0,59\u00a0mi");
+    EXPECT_EQ(text("en-US", "en-US", 3.0), "10\u00a0ft");
+    EXPECT_EQ(text("en-US", "en-GB", 3.0), "3\u00a0yd");
+    EXPECT_EQ(text("ja", "ja-JP", 2400.0), "2.4\u00a0km");
+    EXPECT_EQ(text("en", "fr-FR", 540123.0), "540\u00a0km");
+}
+
+TEST_F(IcuDistanceCalculatorTest, Arabic_AbbreviatesTheUnitAndHasItsOwnDigits) {
+    EXPECT_EQ(text("ar", "ar-EG", 120.0), "١٢٠\u00a0م");
+    EXPECT_EQ(text("ar", "ar-EG", 2400.0), "٢٫٤\u00a0كم");
+}
+
+TEST_F(IcuDistanceCalculatorTest, WithoutALanguage_TheRegionsOwnIsUsed) {
+    EXPECT_EQ(text(std::nullopt, "de-AT", 950.0), "0,95\u00a0km");
+}
+
+TEST_F(IcuDistanceCalculatorTest, EveryBlankIsOneThatDoesNotBreak) {
+    for (const char* region : {"en-US", "en-GB", "de-DE", "fr-FR", "ar-EG", "ja-JP", "hi-IN"}) {
+        for (const double metres : {1.0, 75.0, 640.0, 1500.0, 1e6}) {
+            EXPECT_EQ(text(std::nullopt, region, metres).find(' '), std::string::npos) << region << " " << metres;
+        }
+    }
+}
+
+TEST_F(IcuDistanceCalculatorTest, MeasurementSystem_FollowsTheRegion) {
+    EXPECT_EQ(calculator("en", "de-DE").measurementSystem(), 0);
+    EXPECT_EQ(calculator("de", "en-US").measurementSystem(), 1);
+    EXPECT_EQ(calculator("de", "en-GB").measurementSystem(), 2);
+    EXPECT_EQ(calculator("de", "en").measurementSystem(), 1);
+    EXPECT_EQ(calculator("de", "").measurementSystem(), calculator("de", "und").measurementSystem());
+}
+
+TEST_F(IcuDistanceCalculatorTest, LocaleKeywords_ChooseTheUnits) {
+    EXPECT_EQ(text("en", "en-US-u-ms-metric", 3.0), "3\u00a0m");
+    EXPECT_EQ(calculator("en", "en-US-u-ms-metric").measurementSystem(), 0);
+    EXPECT_EQ(text("en", "de-DE-u-ms-uksystem", 3.0), "3\u00a0yd");
+    EXPECT_EQ(calculator("en", "de-DE-u-ms-uksystem").measurementSystem(), 2);
+    EXPECT_EQ(text("en", "de-DE-u-rg-uszzzz", 3.0), "10\u00a0ft");
+}
+
+TEST_F(IcuDistanceCalculatorTest, AnOverride_BeatsTheRegion) {
+    const auto metric = calculator("en-US", "en-US", UnitSystem::Metric);
+    EXPECT_EQ(metric.localizedDistance(3.0), "3\u00a0m");
+    EXPECT_EQ(metric.measurementSystem(), 0);
+    const auto british = calculator("de", "de-DE", UnitSystem::ImperialUK);
+    EXPECT_EQ(british.localizedDistance(3.0), "3\u00a0yd");
+    EXPECT_EQ(british.measurementSystem(), 2);
+}
+
+TEST_F(IcuDistanceCalculatorTest, TheHostsText_FramesTheDistance) {
+    auto texts = std::make_shared<test::FakeLocalization>();
+    texts->set(texts->hostBundle, "DISTANCE_TEXT", "about %@");
+    const IcuDistanceCalculator framed({"group", "en", "de-DE", texts}, std::nullopt,
+                                       std::make_shared<GeographicLibGeodesy>());
+    EXPECT_EQ(framed.localizedDistance(3.0), "about 3\u00a0m");
+    texts->texts.clear();
+    EXPECT_EQ(framed.localizedDistance(3.0), "3\u00a0m");
+}
+
+TEST_F(IcuDistanceCalculatorTest, NoDistance_GivesNone) {
+    const auto metric = calculator("en", "de-DE");
+    EXPECT_EQ(metric.localizedDistance(std::nan("")), std::nullopt);
+    EXPECT_EQ(metric.localizedDistance(std::numeric_limits<double>::infinity()), std::nullopt);
+    EXPECT_EQ(metric.localizedDistance(-1.0), std::nullopt);
+    EXPECT_EQ(metric.localizedDistance(0.0), "0\u00a0m");
+}
+
+TEST_F(IcuDistanceCalculatorTest, Positions_AreMeasuredOnTheEllipsoid) {
+    auto metric = calculator("en", "de-DE");
+    const platform::PlatformLocation from({{50.0, 7.0}, 0, 10, -1, -1, -1, std::nullopt});
+    const platform::PlatformLocation to({{50.0, 7.1}, 0, 10, -1, -1, -1, std::nullopt});
+    EXPECT_EQ(metric.localizedDistance(from, to), "7.2\u00a0km");
+}
+
+}  // namespace ktr::linux_

@@ -1,0 +1,92 @@
+#include "linux/services/MemoryContactStore.h"
+
+#include <gtest/gtest.h>
+
+namespace ktr::linux_ {
+
+namespace {
+
+class MemoryContactStoreTest : public ::testing::Test {
+  protected:
+    std::shared_ptr<platform::Contact> add(const std::string& name, const std::string& phone,
+                                           const std::string& identifier = "") {
+        auto contact = std::make_shared<platform::Contact>();
+        contact->storedFullName = name;
+        contact->identifier = identifier;
+        if (!phone.empty()) {
+            contact->phoneNumbers.push_back({"", phone});
+        }
+        contacts.push_back(contact);
+        return contact;
+    }
+    std::vector<std::string> byPhone(const std::string& number) {
+        MemoryContactStore store(contacts, phoneNumbers, "GB");
+        std::vector<std::string> names;
+        for (const auto& contact : store.unifiedContactsMatchingPhoneNumber(number, {}).result) {
+            names.push_back(contact->storedFullName);
+        }
+        return names;
+    }
+    platform::ContactStore::Contacts contacts;
+    std::shared_ptr<PhonenumberLibrary> phoneNumbers = std::make_shared<PhonenumberLibrary>();
+};
+
+using Names = std::vector<std::string>;
+
+}  // namespace
+
+TEST_F(MemoryContactStoreTest, Numbers_AreTheSameHoweverTheyAreWritten) {
+    add("Ann", "+44 (0)1632 960001");
+    add("Leila", "٠١٦٣٢ ٩٦٠٠٠٢");
+    add("Noam", "01632 960003 ext. 12");
+    add("Flower", "+1 800 356 9377");
+    EXPECT_EQ(byPhone("01632960001"), Names{"Ann"});
+    EXPECT_EQ(byPhone("+44 1632 960002"), Names{"Leila"});
+    EXPECT_EQ(byPhone("tel:+441632960003"), Names{"Noam"});
+    EXPECT_EQ(byPhone("1-800-FLOWERS"), Names{});
+    EXPECT_EQ(byPhone("+1-800-FLOWERS"), Names{"Flower"});
+}
+
+TEST_F(MemoryContactStoreTest, ATextThatIsNoNumber_IsComparedByItsDigits) {
+    add("Desk", "*7");
+    add("Other desk", "*77");
+    EXPECT_EQ(byPhone("7"), Names{"Desk"});
+    EXPECT_EQ(byPhone("77"), Names{"Other desk"});
+    EXPECT_EQ(byPhone(""), Names{});
+}
+
+TEST_F(MemoryContactStoreTest, TheSameNumberTwice_GivesTheContactOnce) {
+    add("Ann", "01632 960001")->phoneNumbers.push_back({"", "+441632960001"});
+    EXPECT_EQ(byPhone("01632 960001"), Names{"Ann"});
+}
+
+TEST_F(MemoryContactStoreTest, AContactWithoutIdentifier_GetsTheSameOneAtEveryStart) {
+    const auto first = add("Ann", "01632 960001");
+    const auto second = add("Ben", "01632 960001");
+    const MemoryContactStore store(contacts, phoneNumbers, "GB");
+    EXPECT_FALSE(first->identifier.empty());
+    EXPECT_NE(first->identifier, second->identifier);
+    const auto again = add("Ann", "01632 960001");
+    const MemoryContactStore other({again}, phoneNumbers, "GB");
+    EXPECT_EQ(again->identifier, first->identifier);
+}
+
+TEST_F(MemoryContactStoreTest, ASharedIdentifier_StaysWithTheFirstContact) {
+    const auto first = add("Ann", "", "1");
+    const auto second = add("Ben", "", "1");
+    MemoryContactStore store(contacts, phoneNumbers, "GB");
+    EXPECT_EQ(store.unifiedContactWithIdentifier("1", {}).result, first);
+    EXPECT_EQ(store.unifiedContactWithIdentifier("1#2", {}).result, second);
+}
+
+TEST_F(MemoryContactStoreTest, FiftyThousandContacts_AreIndexedWithoutReadingEveryNumber) {
+    for (int i = 0; i < 50000; ++i) {
+        add("Friend", "01632 " + std::to_string(100000 + i));
+    }
+    MemoryContactStore store(contacts, phoneNumbers, "GB");
+    EXPECT_EQ(phoneNumbers->kept(), 0u);
+    EXPECT_EQ(store.unifiedContactsMatchingPhoneNumber("+44 1632 123456", {}).result.size(), 1u);
+    EXPECT_LE(phoneNumbers->kept(), 3u);
+}
+
+}  // namespace ktr::linux_

@@ -1,0 +1,97 @@
+#include "linux/services/QtMainLoop.h"
+
+#include <gtest/gtest.h>
+
+#include <QCoreApplication>
+#include <QEventLoop>
+#include <atomic>
+#include <chrono>
+#include <latch>
+
+namespace ktr::linux_ {
+
+TEST(QtMainLoopTest, BackgroundWork_RunsOnAnotherThread) {
+    QtMainLoop loop;
+    std::latch done(1);
+    bool onMain = true;
+    loop.runInBackground([&] {
+        onMain = loop.isMainThread();
+        done.count_down();
+    });
+    done.wait();
+    EXPECT_FALSE(onMain);
+}
+
+TEST(QtMainLoopTest, TheEnd_WaitsForBackgroundWorkUnderWayAndDropsItsResult) {
+    auto loop = std::make_unique<QtMainLoop>();
+    std::latch started(1);
+    std::latch goOn(1);
+    std::atomic<bool> finished = false;
+    std::atomic<bool> delivered = false;
+    auto* raw = loop.get();
+    loop->runInBackground([&, raw] {
+        started.count_down();
+        goOn.wait();
+        raw->post([&] { delivered = true; });
+        finished = true;
+    });
+    started.wait();
+    goOn.count_down();
+    loop.reset();
+    EXPECT_TRUE(finished);
+    QCoreApplication::processEvents();
+    EXPECT_FALSE(delivered);
+}
+
+TEST(QtMainLoopTest, WorkThatPostsWhenItIsDropped_IsDroppedToo) {
+    struct PostsAtTheEnd {
+        QtMainLoop* loop;
+        bool* ran;
+        ~PostsAtTheEnd() {
+            loop->post([flag = ran] { *flag = true; });
+        }
+    };
+    bool ran = false;
+    auto loop = std::make_unique<QtMainLoop>();
+    auto guard = std::make_shared<PostsAtTheEnd>(loop.get(), &ran);
+    loop->post([guard = std::move(guard)] {});
+    loop.reset();
+    QCoreApplication::processEvents();
+    EXPECT_FALSE(ran);
+}
+
+TEST(QtMainLoopTest, ATimerNeverFiresEarly) {
+    QtMainLoop loop;
+    using Clock = std::chrono::steady_clock;
+    const auto start = Clock::now();
+    Clock::duration passed{};
+    bool fired = false;
+    loop.schedule(0.0105, false, [&] {
+        passed = Clock::now() - start;
+        fired = true;
+    });
+    while (!fired) {
+        QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents);
+    }
+    EXPECT_GE(passed, std::chrono::microseconds(10500));
+}
+
+TEST(QtMainLoopTest, AWaitBeyondTheTimersReach_IsKept) {
+    QtMainLoop loop;
+    bool fired = false;
+    const auto timer = loop.schedule(1e12, false, [&] { fired = true; });
+    QCoreApplication::processEvents();
+    EXPECT_FALSE(fired);
+    EXPECT_TRUE(timer->isValid());
+    EXPECT_EQ(timer->interval(), 1e12);
+}
+
+TEST(QtMainLoopTest, ATimerOutlivingTheLoop_IsInvalid) {
+    auto loop = std::make_unique<QtMainLoop>();
+    const auto timer = loop->schedule(10.0, true, [] {});
+    loop.reset();
+    EXPECT_FALSE(timer->isValid());
+    timer->invalidate();
+}
+
+}  // namespace ktr::linux_
