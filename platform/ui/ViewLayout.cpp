@@ -115,8 +115,11 @@ void View::layoutIfNeeded() {
             descendantNeedsLayout_ = false;
             // By index: a layout may change the tree.
             for (std::size_t i = 0; i < presentedSubviews().size(); ++i) {
-                const auto child = presentedSubviews()[i];
-                child->layoutIfNeeded();
+                const View& view = *presentedSubviews()[i];
+                if (view.needsLayout_ || view.descendantNeedsLayout_) {
+                    const auto child = presentedSubviews()[i];
+                    child->layoutIfNeeded();
+                }
             }
         }
     }
