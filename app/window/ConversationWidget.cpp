@@ -358,6 +358,11 @@ bool ConversationWidget::focusNextPrevChild(bool next) {
 
 void ConversationWidget::keyPressEvent(QKeyEvent* event) {
     const double page = height() - kArrowStep;
+    // Taken here and not as shortcuts: those need a window manager that says which window is active.
+    if (event->modifiers() == Qt::ControlModifier && (event->key() == Qt::Key_Q || event->key() == Qt::Key_W)) {
+        close();
+        return;
+    }
     switch (event->key()) {
         case Qt::Key_Return:
         case Qt::Key_Enter:

@@ -2,7 +2,6 @@
 
 #include <QApplication>
 #include <QDesktopServices>
-#include <QShortcut>
 #include <QUrl>
 #include <cstdio>
 
@@ -32,10 +31,6 @@ ExitCode ShowCommand::run() {
     widget.setWindowTitle(QStringLiteral("ktr"));
     const int width = static_cast<int>(host_.settings().width);
     widget.resize(width, width < 900 ? kTallWindow : kWideWindow);
-    for (const QKeySequence& keys : {QKeySequence(Qt::CTRL | Qt::Key_Q), QKeySequence(Qt::CTRL | Qt::Key_W)}) {
-        auto* shortcut = new QShortcut(keys, &widget);
-        QObject::connect(shortcut, &QShortcut::activated, &widget, &QWidget::close);
-    }
     widget.show();
     widget.scrollToNewest();
     return QApplication::exec() == 0 ? ExitCode::Ok : ExitCode::Failure;

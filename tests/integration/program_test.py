@@ -1,0 +1,231 @@
+#!/usr/bin/python3
+"""Runs `ktr render` and `ktr describe` as a user does, without a display: what they print, write and exit with."""
+
+import json
+import os
+import pathlib
+import struct
+import subprocess
+import tempfile
+import unittest
+
+PROGRAM = os.environ["KTR_PROGRAM"]
+SOURCE = pathlib.Path(os.environ["KTR_SOURCE"])
+SCENARIOS = SOURCE / "resources" / "scenarios"
+PLUGINS = os.environ["KTR_TEST_PLUGINS"]
+
+
+def run(*arguments, **more):
+    environment = {k: v for k, v in os.environ.items() if k not in ("DISPLAY", "WAYLAND_DISPLAY", "QT_QPA_PLATFORM")}
+    environment.update(more)
+    result = subprocess.run([PROGRAM, *map(str, arguments)], env=environment, capture_output=True, timeout=120,
+                            text=True, encoding="utf-8", errors="replace")
+    # Numbers and their units are held together by no-break spaces.
+    result.stdout = result.stdout.replace("\u00a0", " ")
+    return result
+
+
+def png_size(path):
+    data = path.read_bytes()
+    assert data[:8] == b"\x89PNG\r\n\x1a\n", path
+    return struct.unpack(">II", data[16:24])
+
+
+def person(name):
+    return {"object": {"fullName": name, "emails": [{"emailAddress": "somebody@harbour.example"}]}}
+
+
+class ProgramTest(unittest.TestCase):
+    def setUp(self):
+        folder = tempfile.TemporaryDirectory()
+        self.addCleanup(folder.cleanup)
+        self.folder = pathlib.Path(folder.name)
+
+    def scenario(self, locations, **more):
+        path = self.folder / "scenario.json"
+        snippet = {"kind": "VAKtrLocationSnippet", "proximity": "", "locations": locations}
+        path.write_text(json.dumps({"clock": "2026-05-16T17:42:00+01:00", "language": "en-IE", "snippet": snippet, **more}),
+                        encoding="utf-8")
+        return path
+
+    def assert_done(self, result):
+        self.assertEqual(result.stderr, "")
+        self.assertEqual(result.returncode, 0)
+
+    def assert_refused(self, result, code, *words):
+        self.assertEqual(result.returncode, code, result.stderr)
+        self.assertEqual(result.stdout, "")
+        self.assertEqual(result.stderr.count("\n"), 1, result.stderr[:500])
+        self.assertLess(len(result.stderr), 1000)
+        for word in words:
+            self.assertIn(word, result.stderr)
+
+    def test_every_demo_scenario_is_drawn_and_described(self):
+        scenarios = sorted(SCENARIOS.glob("*.json"))
+        self.assertGreaterEqual(len(scenarios), 8)
+        for scenario in scenarios:
+            with self.subTest(scenario.name):
+                picture = self.folder / (scenario.stem + ".png")
+                self.assert_done(run("render", scenario, "-o", picture))
+                width, height = png_size(picture)
+                self.assertEqual(width, 400)
+                self.assertGreater(height, 200)
+                described = run("describe", scenario)
+                self.assert_done(described)
+                self.assertGreater(described.stdout.count("\n"), 3)
+
+    def test_demo_scenarios_fit_their_schema(self):
+        try:
+            import jsonschema
+        except ImportError:
+            self.skipTest("python3-jsonschema is not installed")
+        schema = json.loads((SOURCE / "docs" / "scenario.schema.json").read_text(encoding="utf-8"))
+        jsonschema.Draft202012Validator.check_schema(schema)
+        validator = jsonschema.Draft202012Validator(schema)
+        for scenario in sorted(SCENARIOS.glob("*.json")):
+            with self.subTest(scenario.name):
+                errors = list(validator.iter_errors(json.loads(scenario.read_text(encoding="utf-8"))))
+                self.assertEqual(errors, [])
+        self.assertFalse(validator.is_valid({"snippet": {"kind": "VAKtrLocationSnippet", "locations": [{"latitude": "x"}]}}))
+        self.assertFalse(validator.is_valid({}))
+
+    def test_description_reads_in_order(self):
+        result = run("describe", SCENARIOS / "dinner.json")
+        lines = result.stdout.splitlines()
+        self.assertEqual(lines[:4], ["Today, 17:42", "Where are my friends near the harbour?",
+                                     "Here are the five nearest.", "Friends"])
+        self.assertIn("Ann Marsh", lines[4])
+        self.assertTrue(all(line.endswith(" (link)") for line in lines[4:]), lines)
+        self.assertEqual(len(lines), 10)
+
+    def test_description_follows_language_and_moment(self):
+        self.assertIn("Wo sind meine Freunde am Hafen?", run("describe", SCENARIOS / "dinner.json", "--language", "de").stdout)
+        now = run("describe", SCENARIOS / "dinner.json").stdout
+        later = run("describe", SCENARIOS / "dinner.json", "--at", "+600").stdout
+        self.assertIn("Located 4 minutes ago", now)
+        self.assertIn("Located 14 minutes ago", later)
+        self.assertEqual(later, run("describe", SCENARIOS / "dinner.json", "--at", "2026-05-16T17:52:00+01:00").stdout)
+
+    def test_distances_follow_the_walk(self):
+        place = {"latitude": 50.0, "longitude": -3.0, "ageSeconds": 1, "friend": person("Ann")}
+        walk = [{"latitude": 50.01, "longitude": -3.0}, {"at": 60, "latitude": 50.1, "longitude": -3.0}]
+        scenario = self.scenario([place], positions=walk, region="en-IE")
+        self.assertIn("1.1 km", run("describe", scenario).stdout)
+        self.assertIn("11 km", run("describe", scenario, "--at", "+61").stdout)
+        unknown = run("describe", self.scenario([place], region="en-IE"))
+        self.assert_done(unknown)
+        self.assertNotIn("km", unknown.stdout)
+
+    def test_pictures_are_the_same_every_time_in_every_format(self):
+        for end in ("png", "svg", "pdf"):
+            with self.subTest(end):
+                first, second = self.folder / f"1.{end}", self.folder / f"2.{end}"
+                for picture in (first, second):
+                    self.assert_done(run("render", SCENARIOS / "dinner.json", "-o", picture))
+                self.assertGreater(first.stat().st_size, 1000)
+                self.assertEqual(first.read_bytes(), second.read_bytes())
+
+    def test_options_change_the_picture(self):
+        def drawn(*options):
+            picture = self.folder / "a.png"
+            self.assert_done(run("render", SCENARIOS / "dinner.json", "-o", picture, *options))
+            return png_size(picture), picture.read_bytes()
+
+        plain, plain_bytes = drawn()
+        double = drawn("--scale", "2")[0]
+        self.assertEqual(double[0], 800)
+        # A separator is one pixel thick, so that rows are a little lower in points.
+        self.assertAlmostEqual(double[1] / 2, plain[1], delta=5)
+        self.assertEqual(drawn("--width", "1100")[0][0], 1100)
+        self.assertEqual(drawn("--idiom", "tablet")[0][0], 1100)
+        self.assertGreater(drawn("--text-size", "XXXL")[0][1], plain[1])
+        for option in ("--dark", "--high-contrast"):
+            size, data = drawn(option)
+            self.assertEqual(size, plain)
+            self.assertNotEqual(data, plain_bytes)
+        self.assertEqual(drawn("--light")[1], plain_bytes)
+        self.assertNotEqual(drawn("--language", "ar")[1], plain_bytes)
+
+    def test_pictures_beyond_the_limit_are_split_or_refused(self):
+        many = [{"latitude": 50.0, "longitude": -3.0, "friend":
+                 {"object": {"fullName": f"Friend {i}", "emails": [{"emailAddress": f"f{i}@harbour.example"}]}}}
+                for i in range(420)]
+        scenario = self.scenario(many)
+        picture = self.folder / "many.png"
+        self.assert_done(run("render", scenario, "-o", picture))
+        self.assertFalse(picture.exists())
+        first, second = png_size(self.folder / "many-1.png"), png_size(self.folder / "many-2.png")
+        self.assertEqual(first, (400, 32000))
+        self.assertLess(second[1], 32000)
+        self.assertFalse((self.folder / "many-3.png").exists())
+        self.assert_refused(run("render", scenario, "-o", self.folder / "many.pdf"), 4, "32000")
+        wide = run("render", SCENARIOS / "dinner.json", "-o", picture, "--width", "8000", "--scale", "8")
+        self.assert_refused(wide, 4, "32000")
+
+    def test_kinds_and_sizes_that_are_not_drawn_are_told(self):
+        unknown = self.folder / "fence.json"
+        unknown.write_text('{"snippet": {"kind": "VAWeatherSnippet"}}')
+        self.assert_refused(run("describe", unknown), 4, "VAWeatherSnippet")
+        alone = self.folder / "alone.json"
+        alone.write_text('{"snippet": {"kind": "VAKtrLocationSnippet"}}')
+        self.assert_refused(run("describe", alone), 4, "proximity")
+        self.assert_refused(run("describe", SCENARIOS / "dinner.json", "--text-size", "AX3"), 4, "AX1 to AX5")
+
+    def test_broken_scenarios_are_one_line(self):
+        bad = {
+            "empty": b"", "blank": b" \n", "list": b"[]", "brackets": b"[" * 1_000_000, "objects": b'{"a":' * 1_000_000,
+            "truncated": (SCENARIOS / "dinner.json").read_bytes()[:900], "bytes": b'{"snippet": "\xff\xfe"}',
+            "type": b'{"snippet": {"kind": "VAKtrLocationSnippet", "locations": [{"latitude": []}]}}', "nul": b"\0" * 100,
+            "binary": bytes(range(256)) * 40,
+        }
+        for name, data in bad.items():
+            with self.subTest(name):
+                path = self.folder / f"{name}.json"
+                path.write_bytes(data)
+                self.assert_refused(run("describe", path), 3, f"{name}.json:")
+        self.assert_refused(run("describe", self.folder / "absent.json"), 3, "there is no such file")
+        self.assert_refused(run("describe", self.folder), 3, "folder")
+
+    def test_huge_scenario_is_refused(self):
+        path = self.folder / "huge.json"
+        with path.open("wb") as file:
+            file.truncate((64 << 20) + 1)
+        self.assert_refused(run("describe", path), 3, "64 MiB")
+
+    def test_strange_texts_are_drawn(self):
+        names = {
+            "long": "x" * 100_000, "bidi": "Ann \u202e hsraM\u202c \u2066\u2067\u2069", "emoji": "👩‍👩‍👧‍👦" * 2000,
+            "marks": "e" + "\u0301" * 5000, "lines": "Ann\nMarsh\t\u2028x", "empty": "", "nul": "a\0b",
+        }
+        for name, text in names.items():
+            with self.subTest(name):
+                scenario = self.scenario([{"latitude": 50.0, "longitude": -3.0, "label": text, "city": text,
+                                           "friend": person(text)}], question=text, sentence=text[:1000])
+                picture = self.folder / "strange.png"
+                self.assert_done(run("render", scenario, "-o", picture) if name != "long" else
+                                 run("describe", scenario))
+
+    def test_plugins_that_cannot_be_used_are_told(self):
+        no_library = self.folder / "no.so"
+        no_library.write_text("text")
+        for plugin, word in ((self.folder / "absent.so", "there is no such plugin"), (no_library, "cannot be loaded"),
+                             (PLUGINS + "foreign.so", "no ktr_plugin_query"), (PLUGINS + "old.so", "ABI number")):
+            with self.subTest(str(plugin)):
+                self.assert_refused(run("describe", SCENARIOS / "dinner.json", "--plugin", plugin), 5, word)
+                self.assert_refused(run("describe", SCENARIOS / "dinner.json", KTR_PLUGIN=str(plugin)), 5, word)
+
+    def test_what_cannot_be_done_is_told(self):
+        self.assert_refused(run("render", SCENARIOS / "dinner.json", "-o", "/nowhere/at/all.png"), 1, "/nowhere/at/all.png")
+        self.assert_refused(run("describe", self.scenario([], contacts="nobody.vcf")), 1, "nobody.vcf")
+        self.assert_refused(run("show", SCENARIOS / "dinner.json"), 1, "display")
+        self.assert_refused(run("describe", SCENARIOS / "dinner.json", "--at", "2020-01-01T00:00Z"), 2, "--at")
+        self.assertEqual(run("frobnicate").returncode, 2)
+
+    def test_names_stay_out_of_the_log(self):
+        quiet = run("describe", SCENARIOS / "dinner.json", KTR_LOG="debug")
+        self.assertNotIn("harbour.example", quiet.stderr)
+        self.assertNotEqual(quiet.stderr, "")
+
+
+if __name__ == "__main__":
+    unittest.main()

@@ -1,0 +1,264 @@
+#include "app/window/ConversationWidget.h"
+
+#include <QAccessible>
+#include <QApplication>
+#include <QKeyEvent>
+#include <QMouseEvent>
+#include <QWheelEvent>
+#include <memory>
+
+#include "app/ScenarioReader.h"
+#include "platform/base/Platform.h"
+
+#include <gtest/gtest.h>
+
+namespace ktr::app {
+
+namespace {
+
+class GrowingController : public platform::HostSnippetViewController {
+  public:
+    double height = 1000.0;
+    double desiredHeightForWidth(double) override { return height; }
+};
+
+/// The demo scenario in a window, with the real plugin.
+class KTRConversationWidgetTest : public ::testing::Test {
+  public:
+    void open(const std::vector<std::string>& names, int width = 400, int height = 700) {
+        std::vector<Scenario> scenarios;
+        for (const std::string& name : names) {
+            auto read = ScenarioReader({0.0}).readFile(KTR_SOURCE_DIR "/resources/scenarios/" + name + ".json");
+            ASSERT_TRUE(std::holds_alternative<Scenario>(read)) << std::get<ScenarioError>(read).text();
+            scenarios.push_back(std::get<Scenario>(read));
+        }
+        Options options;
+        options.dark = false;
+        const auto settings = HostSettings::decide(options, scenarios, {});
+        ASSERT_TRUE(std::holds_alternative<HostSettings>(settings));
+        auto made = Host::make(std::get<HostSettings>(settings), Host::Time::Virtual, KTR_PLUGIN_FILE);
+        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<Host>>(made)) << std::get<Failure>(made).line;
+        host = std::move(std::get<std::unique_ptr<Host>>(made));
+        for (const Scenario& scenario : scenarios) {
+            ASSERT_FALSE(host->addTurn(scenario));
+        }
+        host->delegate().open = [this](const platform::Url& url) {
+            opened.push_back(url.text());
+            return true;
+        };
+        widget = std::make_unique<ConversationWidget>(*host);
+        widget->resize(width, height);
+        widget->show();
+        QApplication::processEvents();
+    }
+    void TearDown() override {
+        widget.reset();
+        host.reset();
+    }
+
+    void mouse(QEvent::Type type, QPointF at) {
+        const bool move = type == QEvent::MouseMove;
+        QMouseEvent event(type, at, widget->mapToGlobal(at), move ? Qt::NoButton : Qt::LeftButton,
+                          type == QEvent::MouseButtonRelease ? Qt::NoButton : Qt::LeftButton, Qt::NoModifier);
+        QApplication::sendEvent(widget.get(), &event);
+    }
+    void key(int code, Qt::KeyboardModifiers modifiers = Qt::NoModifier) {
+        QKeyEvent event(QEvent::KeyPress, code, modifiers);
+        QApplication::sendEvent(widget.get(), &event);
+    }
+    void wheel(int eighths, QPointF at = {200.0, 300.0}) {
+        QWheelEvent event(at, widget->mapToGlobal(at), {}, {0, eighths}, Qt::NoButton, Qt::NoModifier,
+                          Qt::NoScrollPhase, false);
+        QApplication::sendEvent(widget.get(), &event);
+    }
+    /// The middle of a row in the widget's coordinates.
+    QPointF row(const std::string& name) const {
+        QPointF found(-1.0, -1.0);
+        const auto visit = [&](const auto& self, const platform::AccessibilityNode& node) -> void {
+            for (const auto& child : node.children) {
+                if (child.text.find(name) != std::string::npos || node.text.find(name) != std::string::npos) {
+                    const auto& frame = child.frame;
+                    found = {frame.x + frame.width / 2.0, frame.y + frame.height / 2.0 - widget->scrolled()};
+                }
+                self(self, child);
+            }
+        };
+        visit(visit, platform::accessibilityTree(host->window(), host->rightToLeft()));
+        return found;
+    }
+
+    std::unique_ptr<Host> host;
+    std::unique_ptr<ConversationWidget> widget;
+    std::vector<std::string> opened;
+};
+
+TEST_F(KTRConversationWidgetTest, Click_OpensTheFriendUnderIt) {
+    open({"dinner"});
+    const QPointF ann = row("Ann Marsh");
+    ASSERT_GT(ann.y(), 0.0);
+    mouse(QEvent::MouseButtonPress, ann);
+    mouse(QEvent::MouseButtonRelease, ann);
+    EXPECT_EQ(opened, std::vector<std::string>{"wayloc://friend/ann@harbour.example"});
+}
+
+TEST_F(KTRConversationWidgetTest, PressThatMovesAway_OpensNothing) {
+    open({"dinner"});
+    const QPointF ann = row("Ann Marsh");
+    mouse(QEvent::MouseButtonPress, ann);
+    mouse(QEvent::MouseMove, ann + QPointF(0.0, 40.0));
+    mouse(QEvent::MouseButtonRelease, ann + QPointF(0.0, 40.0));
+    EXPECT_TRUE(opened.empty());
+}
+
+TEST_F(KTRConversationWidgetTest, Keyboard_WalksTheRowsAndOpensThem) {
+    open({"dinner"});
+    key(Qt::Key_Tab);
+    EXPECT_TRUE(widget->rows().hasFocus());
+    key(Qt::Key_Return);
+    key(Qt::Key_Tab);
+    key(Qt::Key_Return);
+    key(Qt::Key_Backtab, Qt::ShiftModifier);
+    key(Qt::Key_Enter);
+    EXPECT_EQ(opened,
+              (std::vector<std::string>{"wayloc://friend/ann@harbour.example", "wayloc://friend/l.haddad@mail.example",
+                                        "wayloc://friend/ann@harbour.example"}));
+    key(Qt::Key_Escape);
+    EXPECT_FALSE(widget->rows().hasFocus());
+}
+
+TEST_F(KTRConversationWidgetTest, Keyboard_ReachesShowAllLast) {
+    open({"show-all"});
+    key(Qt::Key_Tab);
+    key(Qt::Key_Tab);
+    key(Qt::Key_Return);
+    EXPECT_EQ(opened, std::vector<std::string>{"wayloc://friends/"});
+    key(Qt::Key_Tab);
+    EXPECT_FALSE(widget->rows().hasFocus()) << "beyond the last row the focus leaves";
+}
+
+TEST_F(KTRConversationWidgetTest, Focus_BringsItsRowIntoView) {
+    open({"forty-friends"});
+    for (int i = 0; i < 40; ++i) {
+        key(Qt::Key_Tab);
+        const auto rect = widget->rows().focusedRect();
+        ASSERT_TRUE(rect);
+        EXPECT_GE(rect->y, widget->scrolled());
+        EXPECT_LE(rect->maxY(), widget->scrolled() + widget->height());
+    }
+    EXPECT_GT(widget->scrolled(), 1000.0);
+}
+
+TEST_F(KTRConversationWidgetTest, Wheel_ScrollsAndStopsAtTheEnds) {
+    open({"forty-friends"});
+    wheel(-120);
+    EXPECT_EQ(widget->scrolled(), 60.0);
+    wheel(120 * 50);
+    EXPECT_EQ(widget->scrolled(), 0.0);
+    key(Qt::Key_End);
+    const double end = widget->scrolled();
+    EXPECT_NEAR(end, host->window()->frame().height - widget->height(), 1.0);
+    wheel(-120);
+    EXPECT_EQ(widget->scrolled(), end);
+    key(Qt::Key_Home);
+    EXPECT_EQ(widget->scrolled(), 0.0);
+}
+
+TEST_F(KTRConversationWidgetTest, Width_LaysOutAnew) {
+    open({"dinner"});
+    const double narrow = host->window()->frame().height;
+    widget->resize(1100, 700);
+    QApplication::processEvents();
+    EXPECT_EQ(host->window()->frame().width, 1100.0);
+    EXPECT_LT(host->window()->frame().height, narrow);
+    EXPECT_EQ(host->conversation()->turns()[0]->card()->frame().width, 680.0);
+}
+
+TEST_F(KTRConversationWidgetTest, Hover_PaintsTheRowAlone) {
+    open({"dinner"});
+    widget->repaint();
+    const QPointF ann = row("Ann Marsh");
+    mouse(QEvent::MouseMove, ann);
+    QApplication::processEvents();
+    const QRect painted = widget->lastPainted().boundingRect();
+    EXPECT_LT(painted.height(), 90);
+    EXPECT_TRUE(painted.contains(ann.toPoint()));
+}
+
+TEST_F(KTRConversationWidgetTest, HeightChange_KeepsTheCardsTopOrItsBottom) {
+    open({"dinner"});
+    auto turn = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
+    const auto controller = platform::create<GrowingController>(&GrowingController::init);
+    turn->card()->setController(controller);
+    host->conversation()->addTurn(turn);
+    widget->resize(400, 701);
+    QApplication::processEvents();
+    const auto top = [&] { return turn->card()->frameInRoot().y - widget->scrolled(); };
+    const auto bottom = [&] { return turn->card()->frameInRoot().maxY() - widget->scrolled(); };
+    widget->scrollTo(turn->card()->frameInRoot().y + 100.0);
+    const double topBefore = top();
+    controller->height += 300.0;
+    host->delegate().heightDidChange(*controller, true);
+    EXPECT_NEAR(top(), topBefore, 1.0);
+    const double bottomBefore = bottom();
+    controller->height += 300.0;
+    host->delegate().heightDidChange(*controller, false);
+    EXPECT_NEAR(bottom(), bottomBefore, 1.0);
+}
+
+TEST_F(KTRConversationWidgetTest, SeveralTurns_BeginWithTheNewestAtTheTop) {
+    open({"dinner", "locating"});
+    widget->scrollToNewest();
+    EXPECT_NEAR(widget->scrolled(), host->conversation()->turns()[1]->frame().y, 1.0);
+}
+
+TEST_F(KTRConversationWidgetTest, Accessibility_NamesRolesAndPress) {
+    open({"dinner"});
+    auto* root = QAccessible::queryAccessibleInterface(widget.get());
+    ASSERT_NE(root, nullptr);
+    std::vector<QAccessibleInterface*> links;
+    std::vector<QString> texts;
+    const auto visit = [&](const auto& self, QAccessibleInterface* node) -> void {
+        for (int i = 0; i < node->childCount(); ++i) {
+            QAccessibleInterface* child = node->child(i);
+            ASSERT_NE(child, nullptr);
+            EXPECT_EQ(child->parent(), node);
+            EXPECT_EQ(node->indexOfChild(child), i);
+            if (child->role() == QAccessible::Link) {
+                links.push_back(child);
+            } else if (child->role() == QAccessible::StaticText) {
+                texts.push_back(child->text(QAccessible::Name));
+            }
+            self(self, child);
+        }
+    };
+    visit(visit, root);
+    ASSERT_EQ(links.size(), 6u);
+    EXPECT_EQ(texts[1], QStringLiteral("Where are my friends near the harbour?"));
+    EXPECT_TRUE(links[0]->text(QAccessible::Name).contains(QStringLiteral("Ann Marsh")));
+    EXPECT_TRUE(links[0]->state().focusable);
+    const QRect rect = links[0]->rect();
+    EXPECT_TRUE(rect.contains(widget->mapToGlobal(row("Ann Marsh").toPoint())));
+    ASSERT_NE(links[0]->actionInterface(), nullptr);
+    links[0]->actionInterface()->doAction(QAccessibleActionInterface::pressAction());
+    EXPECT_EQ(opened, std::vector<std::string>{"wayloc://friend/ann@harbour.example"});
+}
+
+TEST_F(KTRConversationWidgetTest, Accessibility_KeepsNodesOverLayouts) {
+    open({"dinner"});
+    auto* root = QAccessible::queryAccessibleInterface(widget.get());
+    QAccessibleInterface* turn = root->child(0);
+    widget->resize(1100, 700);
+    QApplication::processEvents();
+    EXPECT_EQ(root->child(0), turn);
+    EXPECT_TRUE(turn->isValid());
+}
+
+TEST_F(KTRConversationWidgetTest, RightToLeft_Mirrors) {
+    open({"right-to-left"});
+    EXPECT_TRUE(host->rightToLeft());
+    EXPECT_EQ(widget->layoutDirection(), Qt::RightToLeft);
+}
+
+}  // namespace
+
+}  // namespace ktr::app
