@@ -49,6 +49,9 @@ Outline outlineOf(const QString& letters) {
         const auto glyphs = run.glyphIndexes();
         const auto positions = run.positions();
         for (qsizetype i = 0; i < glyphs.size(); ++i) {
+            if (glyphs[i] == 0) {
+                return {};  // no font has the letter
+            }
             outline.path.addPath(font.pathForGlyph(glyphs[i]).translated(positions[i]));
         }
     }
@@ -94,7 +97,7 @@ double AvatarImage::letterSizeFor(double diameter) {
 std::shared_ptr<AvatarImage> AvatarImage::letters(double diameter, const Initials& initials, const QColor& color,
                                                   double letterSize) {
     const Outline outline = outlineOf(initials.letters());
-    // Without an outline (a font that is missing, or made of pictures) there is nothing to show.
+    // Without an outline (a letter that no font has, or a font made of pictures) there is nothing to show.
     if (initials.letters().isEmpty() || outline.path.isEmpty() || outline.advance <= 0.0) {
         return blank(diameter);
     }

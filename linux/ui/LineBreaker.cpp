@@ -24,6 +24,21 @@ constexpr double kFit = 0.01;
 constexpr double kNarrowLetter = 0.2;
 constexpr qsizetype kShapedAhead = 64;
 
+/// Qt reads a word to its end for each line that it breaks it into: a word of a hundred thousand letters would take
+/// seconds. Words beyond this are nobody's; the text that has one breaks anywhere.
+bool hasEndlessWord(QStringView text) {
+    constexpr qsizetype kLongest = 1000;
+    constexpr char16_t kFirstIdeographic = 0x2E80;
+    qsizetype length = 0;
+    for (const QChar c : text) {
+        length = c.isSpace() || (c.unicode() >= kFirstIdeographic && !c.isSurrogate()) ? 0 : length + 1;
+        if (length > kLongest) {
+            return true;
+        }
+    }
+    return false;
+}
+
 double finite(double value) {
     return std::isfinite(value) ? value : 0.0;
 }
@@ -73,6 +88,7 @@ ShapeRecipe LineBreaker::recipe(qsizetype from, qsizetype to, const QString& tai
     ShapeRecipe made;
     made.text = text_.text.mid(from, to - from) + tail;
     made.wrap = wrap;
+    made.wrapAnywhere = wrap && hasEndlessWord(made.text);
     made.direction = text_.isRightToLeft(from, to, container_.rightToLeft) ? Qt::RightToLeft : Qt::LeftToRight;
     const auto& first = text_.runAt(from);
     made.font = FontChoice::spec(first.font, pixelSize(first.font), FontChoice::baseFamily());

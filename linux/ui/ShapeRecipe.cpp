@@ -7,7 +7,8 @@ namespace ktr::linux_ {
 std::unique_ptr<QTextLayout> ShapeRecipe::layout() const {
     auto made = std::make_unique<QTextLayout>(text, font.font());
     QTextOption option;
-    option.setWrapMode(wrap ? QTextOption::WrapAtWordBoundaryOrAnywhere : QTextOption::NoWrap);
+    const auto wrapped = wrapAnywhere ? QTextOption::WrapAnywhere : QTextOption::WrapAtWordBoundaryOrAnywhere;
+    option.setWrapMode(wrap ? wrapped : QTextOption::NoWrap);
     option.setTextDirection(direction);
     option.setAlignment(Qt::AlignLeft | Qt::AlignAbsolute);
     made->setTextOption(option);

@@ -30,6 +30,8 @@ struct ShapeRecipe {
     std::vector<Range> ranges;
     Qt::LayoutDirection direction = Qt::LeftToRight;
     bool wrap = false;
+    /// Lines may end between any two graphemes, for a text without places to break at.
+    bool wrapAnywhere = false;
 
     /// Ready for its lines.
     std::unique_ptr<QTextLayout> layout() const;

@@ -205,6 +205,19 @@ TEST_F(QtTextEngineTest, LongTextOfMarksWithoutWidth_IsDrawnAllTheSame) {
     EXPECT_DOUBLE_EQ(layout->usedSize().height, kBody.lineHeight());
 }
 
+TEST_F(QtTextEngineTest, EndlessWord_BreaksAnywhere) {
+    const auto layout = layOut(std::string(100000, 'm'), 300, 0);
+    ASSERT_GT(layout->lines().size(), 1000U);
+    for (const auto& line : layout->lines()) {
+        ASSERT_LE(line.box.width, 300.01);
+    }
+    EXPECT_FALSE(layout->isTruncated());
+    // Words of any sensible length are not torn.
+    const auto whole = layOut(std::string(16, 'm') + " " + std::string(8, 'm'), 280, 0);
+    ASSERT_EQ(whole->lines().size(), 2U);
+    EXPECT_NEAR(whole->lines()[0].box.width, 2 * whole->lines()[1].box.width, 0.1);
+}
+
 TEST_F(QtTextEngineTest, LimitOfLines_CutsTheLastOne) {
     const auto layout = layOut("Ann went to the fish market and then home along the harbour", 150, 2);
     ASSERT_EQ(layout->lines().size(), 2U);
