@@ -9,36 +9,6 @@
         <translation>اليوم، %@</translation>
     </message>
     <message>
-        <source>ASK</source>
-        <extracomment>In the empty field where the next question is written. English: “Ask about your friends”</extracomment>
-        <translation>اسأل عن أصدقائك</translation>
-    </message>
-    <message>
-        <source>ASK_SHORT</source>
-        <extracomment>The same with very large text. English: “Ask”</extracomment>
-        <translation>اسأل</translation>
-    </message>
-    <message>
-        <source>STATUS_LIVE</source>
-        <extracomment>Below the field: what is shown is kept up to date. English: “Live · updated just now”</extracomment>
-        <translation>مباشر · حُدّث للتو</translation>
-    </message>
-    <message>
-        <source>STATUS_PAUSED</source>
-        <extracomment>Below the field; %@ is a number of minutes. Abbreviate the unit. English: “Paused · updated %@ min ago”</extracomment>
-        <translation>متوقف مؤقتًا · حُدّث قبل %@ د</translation>
-    </message>
-    <message>
-        <source>STATUS_LOCATING</source>
-        <extracomment>Below the field: the user’s own position is being found. English: “Finding where you are…”</extracomment>
-        <translation>جارٍ تحديد موقعك…</translation>
-    </message>
-    <message>
-        <source>STATUS_HIDDEN</source>
-        <extracomment>Below the field: friends cannot see the user. English: “Your location is hidden”</extracomment>
-        <translation>موقعك مخفيّ</translation>
-    </message>
-    <message>
         <source>DISTANCE_TEXT</source>
         <extracomment>A frame around each distance (%@, with its unit), for a language that needs one; usually %@ alone. English: “%@”</extracomment>
         <translation>%@</translation>

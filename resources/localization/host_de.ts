@@ -9,36 +9,6 @@
         <translation>Heute, %@</translation>
     </message>
     <message>
-        <source>ASK</source>
-        <extracomment>In the empty field where the next question is written. English: “Ask about your friends”</extracomment>
-        <translation>Frag nach deinen Freunden</translation>
-    </message>
-    <message>
-        <source>ASK_SHORT</source>
-        <extracomment>The same with very large text. English: “Ask”</extracomment>
-        <translation>Fragen</translation>
-    </message>
-    <message>
-        <source>STATUS_LIVE</source>
-        <extracomment>Below the field: what is shown is kept up to date. English: “Live · updated just now”</extracomment>
-        <translation>Live · gerade aktualisiert</translation>
-    </message>
-    <message>
-        <source>STATUS_PAUSED</source>
-        <extracomment>Below the field; %@ is a number of minutes. Abbreviate the unit. English: “Paused · updated %@ min ago”</extracomment>
-        <translation>Pausiert · vor %@ Min. aktualisiert</translation>
-    </message>
-    <message>
-        <source>STATUS_LOCATING</source>
-        <extracomment>Below the field: the user’s own position is being found. English: “Finding where you are…”</extracomment>
-        <translation>Dein Standort wird gesucht …</translation>
-    </message>
-    <message>
-        <source>STATUS_HIDDEN</source>
-        <extracomment>Below the field: friends cannot see the user. English: “Your location is hidden”</extracomment>
-        <translation>Dein Standort ist verborgen</translation>
-    </message>
-    <message>
         <source>DISTANCE_TEXT</source>
         <extracomment>A frame around each distance (%@, with its unit), for a language that needs one; usually %@ alone. English: “%@”</extracomment>
         <translation>%@</translation>
