@@ -108,8 +108,10 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
     }
     platform.calendar = std::make_shared<linux_::LocalCalendar>();
     platform.assistant = std::make_shared<linux_::ConfiguredAssistant>(settings.language);
-    platform.region = std::make_shared<linux_::LocaleRegion>(settings.region);
-    platform.decimalNumbers = std::make_shared<linux_::IcuNumberFormatter>(settings.region);
+    const auto region = std::make_shared<linux_::LocaleRegion>(settings.region);
+    platform.region = region;
+    platform.decimalNumbers =
+        std::make_shared<linux_::IcuNumberFormatter>(region->localeWithLanguage(settings.language));
     platform.geodesy = std::make_shared<linux_::GeographicLibGeodesy>();
     platform.distanceCalculators = std::make_shared<linux_::IcuDistanceCalculatorFactory>(platform.geodesy);
     platform.locationManagers = std::make_shared<linux_::ScenarioLocationManagerFactory>(

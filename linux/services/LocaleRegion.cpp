@@ -5,6 +5,7 @@
 #include <initializer_list>
 #include <string_view>
 
+#include <unicode/localebuilder.h>
 #include <unicode/locid.h>
 
 namespace ktr::linux_ {
@@ -45,6 +46,21 @@ LocaleRegion::LocaleRegion(const std::string& locale) : identifier_(languageTag(
     if (U_SUCCESS(status) && isCountry(parsed.getCountry())) {
         country_ = parsed.getCountry();
     }
+}
+
+std::string LocaleRegion::localeWithLanguage(const std::string& language) const {
+    UErrorCode status = U_ZERO_ERROR;
+    const auto parsed = icu::Locale::forLanguageTag(language, status);
+    if (U_FAILURE(status) || parsed.isBogus() || std::string_view(parsed.getLanguage()).empty()) {
+        return identifier_;
+    }
+    if (!country_) {
+        return language;
+    }
+    icu::LocaleBuilder builder;
+    builder.setLanguage(parsed.getLanguage()).setScript(parsed.getScript()).setRegion(*country_);
+    const auto tag = builder.build(status).toLanguageTag<std::string>(status);
+    return U_SUCCESS(status) ? tag : language;
 }
 
 std::string LocaleRegion::sessionLocale() {

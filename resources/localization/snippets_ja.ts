@@ -106,7 +106,7 @@
     <message>
         <source>ACCESSIBILITY_AT_LABEL</source>
         <extracomment>Read aloud: %@ is a place, such as “Fish Market”, “Home” or “Brinmouth, HB”. English: “At %@”</extracomment>
-        <translation>%@にいます</translation>
+        <translation>場所：%@</translation>
     </message>
     <message>
         <source>IMMEDIATE_LABEL</source>

@@ -24,6 +24,15 @@ TEST(LocaleRegionTest, ALocaleWithoutACountry_HasNone) {
     EXPECT_EQ(LocaleRegion("!!").localeIdentifier(), "en");
 }
 
+TEST(LocaleRegionTest, LocaleWithLanguage_TakesTheLanguageAndScriptAndKeepsTheCountry) {
+    EXPECT_EQ(LocaleRegion("en-GB").localeWithLanguage("ar-EG"), "ar-GB");
+    EXPECT_EQ(LocaleRegion("ar-EG").localeWithLanguage("de"), "de-EG");
+    EXPECT_EQ(LocaleRegion("en-US-u-ms-metric").localeWithLanguage("zh-Hant"), "zh-Hant-US");
+    EXPECT_EQ(LocaleRegion("eo").localeWithLanguage("de-AT"), "de-AT");
+    EXPECT_EQ(LocaleRegion("de-CH").localeWithLanguage(""), "de-CH");
+    EXPECT_EQ(LocaleRegion("de-CH").localeWithLanguage("no tag at all"), "de-CH");
+}
+
 TEST(LocaleRegionTest, TheSessionsLocale_IsTheFirstThatIsSet) {
     const test::EnvironmentVariable all("LC_ALL", nullptr);
     const test::EnvironmentVariable measures("LC_MEASUREMENT", "de_AT.UTF-8");
