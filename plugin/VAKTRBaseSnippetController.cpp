@@ -46,6 +46,8 @@ void VAKTRBaseSnippetController::setDelegate(const std::shared_ptr<platform::Sni
     if (!delegate) {
         return;
     }
+    // A host may drop the controller while it is being asked.
+    const auto self = platform::strong(this);
     const auto bundle = delegate->effectiveBundleForLocation(*this);
     if (const auto maps = platform::shared<platform::MapLocationManager>()) {
         maps->setEffectiveBundle(bundle);
@@ -87,10 +89,10 @@ void VAKTRBaseSnippetController::startReloadTimer() {
         return;
     }
     // A timer that was held before goes on: only what is held when the view disappears is stopped. It does not keep
-    // the controller, and stops itself at the first firing after the controller is gone.
+    // the controller, and stops itself at the first firing after the controller, or the platform, is gone.
     const auto itself = std::make_shared<std::weak_ptr<platform::Timer>>();
     reloadTimer_ = installed->mainLoop->schedule(kReloadInterval, true, [target = platform::weak(this), itself] {
-        if (const auto self = target.lock()) {
+        if (const auto self = target.lock(); self && Platform::installed()) {
             self->reloadData();
         } else if (const auto timer = itself->lock()) {
             timer->invalidate();

@@ -37,9 +37,9 @@ void RefreshController::didUpdateLocations(platform::PlatformLocationManager& /*
     const auto previous = std::move(currentLocation_);
     currentLocation_ = locations.back();
     const double metres = previous ? currentLocation_->distanceFromLocation(*previous) : 0.0;
-    if (metres > kDistanceOfNote) {
-        platform::Platform::installed()->notificationCenter->post(
-            {kCurrentLocationUpdatedNotification, platform::strong(this)});
+    const auto installed = platform::Platform::installed();
+    if (metres > kDistanceOfNote && installed) {
+        installed->notificationCenter->post({kCurrentLocationUpdatedNotification, platform::strong(this)});
     }
 }
 

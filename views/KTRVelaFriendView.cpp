@@ -166,6 +166,10 @@ void KTRVelaFriendView::setSeparatorEnabled(bool enabled) {
 }
 
 void KTRVelaFriendView::updateView() {
+    // A position may still arrive when the host has already gone: nothing can be worded then, and what is shown stays.
+    if (!Platform::installed()) {
+        return;
+    }
     updateAvatar();
     updatePlace();
     setText(nameLabel_, location_ ? location_->friendName() : "");

@@ -1,5 +1,7 @@
 #include "platform/location/PlatformLocation.h"
 
+#include <limits>
+
 #include "platform/base/Json.h"
 #include "platform/base/Platform.h"
 #include "platform/location/Geodesy.h"
@@ -13,7 +15,11 @@ bool isValid(const Coordinate& c) {
 }
 
 double PlatformLocation::distanceFromLocation(const PlatformLocation& other) const {
-    return Platform::installed()->geodesy->distance(coordinate(), other.coordinate());
+    const auto platform = Platform::installed();
+    if (!platform || !platform->geodesy) {
+        return std::numeric_limits<double>::quiet_NaN();
+    }
+    return platform->geodesy->distance(coordinate(), other.coordinate());
 }
 
 std::string PlatformLocation::description() const {

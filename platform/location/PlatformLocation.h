@@ -35,7 +35,7 @@ class KTR_API PlatformLocation : public Object {
     ~PlatformLocation() override;
     const Fix& fix() const { return fix_; }
     const Coordinate& coordinate() const { return fix_.coordinate; }
-    /// Metres along the geodesic, by the installed geodesy. Main thread.
+    /// Metres along the geodesic, by the installed geodesy; NaN when it cannot be measured. Main thread.
     double distanceFromLocation(const PlatformLocation& other) const;
     std::string description() const override;
 

@@ -111,6 +111,9 @@ IntrinsicSize Label::intrinsicContentSize(double widthLimit) const {
         drawn_ = layoutForWidth(widthLimit);
         drawnWidth_ = widthLimit;
     }
+    if (!drawn_) {
+        return {natural->usedSize().width, natural->usedSize().height};
+    }
     return {drawn_->usedSize().width, drawn_->usedSize().height};
 }
 

@@ -1,5 +1,6 @@
 #include <functional>
 
+#include "model/ContactsUtilities.h"
 #include "plugin/KTRSnippetControllerFactory.h"
 #include "plugin/VAKTRMultipleLocationsSnippetController.h"
 #include "tests/support/FakeHost.h"
@@ -39,6 +40,11 @@ void fillRowWithDistance() {
     const auto controller = makeController();
     controller->setDelegate(host);
     controller->desiredHeightForWidth(320.0);
+}
+
+void askAtAccessibilitySize() {
+    std::dynamic_pointer_cast<test::FakeDevice>(Platform::installed()->device)->category = ContentSizeCategory::AX1;
+    KTRSnippetControllerFactory().viewControllerForSnippet(proximitySnippet({}));
 }
 
 struct LineCase {
@@ -92,7 +98,16 @@ INSTANTIATE_TEST_SUITE_P(
                  "Opening URL: wayloc://friend/ann@example.org for friend handle: ann@example.org",
                  [] { friendRow()->urlForTouch(); }},
         LineCase{"Distance", LogLevel::Debug, "Distance calculated: %@ for friend: %@ (Unit:%li)",
-                 "Distance calculated: 111 m for friend: Ann (Unit:0)", fillRowWithDistance}),
+                 "Distance calculated: 111 m for friend: Ann (Unit:0)", fillRowWithDistance},
+        LineCase{"PersonFound", LogLevel::Debug, "VAPerson found: %@", "VAPerson found: <VAPerson (null)>",
+                 [] { KTRVALocation::locationWithHandle("ann@example.org", nullptr, std::nullopt); }},
+        LineCase{"ContactNotFound", LogLevel::Error, "Could not find contact for assistant ID %@ : %@",
+                 "Could not find contact for assistant ID assistant:nobody : no contact with this identifier",
+                 [] { ContactsUtilities::contactForAssistantId("assistant:nobody"); }},
+        LineCase{"AccessibilitySize", LogLevel::Default,
+                 "There are no rows for accessibility text sizes yet; nothing is drawn for: %@",
+                 "There are no rows for accessibility text sizes yet; nothing is drawn for: <VAKtrLocationSnippet>",
+                 askAtAccessibilitySize}),
     [](const auto& tested) { return std::string(tested.param.name); });
 
 }  // namespace ktr

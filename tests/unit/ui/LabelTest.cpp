@@ -33,6 +33,16 @@ TEST_F(LabelTest, WrappedText_IsAsHighAsItsLinesAtTheWidth) {
     EXPECT_TRUE(label->intrinsicHeightDependsOnWidth());
 }
 
+TEST_F(LabelTest, PlatformGone_KeepsTheSizeItKnew) {
+    label->setNumberOfLines(0);
+    label->setLineBreakMode(LineBreakMode::WordWrapping);
+    label->setText("aaaa bbbb cccc");
+    const auto known = label->intrinsicContentSize(kInfinite);
+    Platform::install(nullptr);
+    EXPECT_EQ(label->intrinsicContentSize(50.0), known);
+    EXPECT_EQ(label->textLayout(), nullptr);
+}
+
 TEST_F(LabelTest, SameText_CostsNothing) {
     label->setText("abcd");
     label->intrinsicContentSize(kInfinite);
