@@ -17,6 +17,16 @@ namespace {
 constexpr const char* kFrameKey = "DISTANCE_TEXT";
 constexpr std::string_view kNoBreakSpace = "\u00a0";
 
+/// A friend who walks towards the user should be seen to come nearer: tens where road signs count in fifties.
+constexpr double kStep = 10.0;
+constexpr double kLeastInTens = 10.0;
+
+/// What short distances are told in.
+bool isShortUnit(const icu::MeasureUnit& unit) {
+    const std::string_view name = unit.getIdentifier();
+    return name == "meter" || name == "yard" || name == "foot";
+}
+
 icu::Locale localeOf(const std::string& tag) {
     UErrorCode status = U_ZERO_ERROR;
     auto locale = icu::Locale::forLanguageTag(tag, status);
@@ -98,6 +108,8 @@ icu::Locale withRegionOverride(icu::Locale language, const std::string& region) 
 
 struct IcuDistanceCalculator::Formatter {
     icu::number::LocalizedNumberFormatter road;
+    /// The same in whole tens, for the units in which roads are rounded to fifties.
+    icu::number::LocalizedNumberFormatter tens;
     bool usable = false;
 };
 
@@ -117,10 +129,11 @@ IcuDistanceCalculator::IcuDistanceCalculator(Settings settings, std::optional<Un
     // In Arabic the short form spells the unit out and inflects it; the narrow one is the abbreviation.
     const bool narrow = std::string_view(language.getLanguage()) == "ar";
     UErrorCode status = U_ZERO_ERROR;
-    formatter_->road =
-        icu::number::NumberFormatter::forSkeleton(
-            narrow ? u"unit/meter usage/road unit-width-narrow" : u"unit/meter usage/road unit-width-short", status)
-            .locale(withRegionOverride(language, region));
+    const auto road = icu::number::NumberFormatter::forSkeleton(
+        narrow ? u"unit/meter usage/road unit-width-narrow" : u"unit/meter usage/road unit-width-short", status);
+    const icu::Locale locale = withRegionOverride(language, region);
+    formatter_->road = road.locale(locale);
+    formatter_->tens = road.precision(icu::number::Precision::increment(kStep)).locale(locale);
     formatter_->usable = U_SUCCESS(status);
 }
 
@@ -136,8 +149,12 @@ std::optional<std::string> IcuDistanceCalculator::localizedDistance(double metre
         return std::nullopt;
     }
     UErrorCode status = U_ZERO_ERROR;
+    auto formatted = formatter_->road.formatDouble(metres, status);
+    if (metres >= kLeastInTens && isShortUnit(formatted.getOutputUnit(status))) {
+        formatted = formatter_->tens.formatDouble(metres, status);
+    }
     std::string text;
-    formatter_->road.formatDouble(metres, status).toString(status).toUTF8String(text);
+    formatted.toString(status).toUTF8String(text);
     if (U_FAILURE(status)) {
         return std::nullopt;
     }

@@ -25,6 +25,13 @@ class IcuDistanceCalculatorTest : public ::testing::Test {
 
 }  // namespace
 
+TEST_F(IcuDistanceCalculatorTest, ShortDistances_AreToldInTens) {
+    EXPECT_EQ(text("en-GB", "de-DE", 310.0), "310\u00a0m");
+    EXPECT_EQ(text("en-GB", "de-DE", 624.9), "620\u00a0m");
+    EXPECT_EQ(text("en-US", "en-US", 140.0), "460\u00a0ft");
+    EXPECT_EQ(text("en-GB", "de-DE", 1234.0), "1.2\u00a0km");
+}
+
 TEST_F(IcuDistanceCalculatorTest, UnitsFollowTheRegionAndWordsTheLanguage) {
     EXPECT_EQ(text("en-GB", "de-DE", 3.0), "3\u00a0m");
     EXPECT_EQ(text("de", "de-DE", 950.0), "0,95\u00a0km");
