@@ -73,7 +73,8 @@ ExitCode runHeadless(const Options& options, const HostSettings& settings, const
     return ExitCode::Ok;
 }
 
-ExitCode runShow(const Options& options, const HostSettings& settings, const std::vector<Scenario>& scenarios) {
+ExitCode runShow(const Options& options, HostSettings settings, const std::vector<Scenario>& scenarios) {
+    settings.scale = qApp->devicePixelRatio();
     auto made = makeHost(options, settings, scenarios, Host::Time::Running);
     if (const auto* failure = std::get_if<Failure>(&made)) {
         return fail(*failure);

@@ -3,6 +3,7 @@
 #include "app/window/AccessibleNode.h"
 #include "app/window/AccessibleWidget.h"
 #include "app/window/ConversationWidget.h"
+#include "platform/base/Platform.h"
 
 namespace ktr::app {
 
@@ -12,24 +13,29 @@ using platform::View;
 
 namespace {
 
-/// The conversations that somebody asked about; Qt's factory is a plain function, so they stand beside it. Emptied as
-/// the widgets go.
-std::unordered_map<const QObject*, std::unique_ptr<AccessibleConversation>>& conversations() {
-    static std::unordered_map<const QObject*, std::unique_ptr<AccessibleConversation>> all;
-    return all;
-}
+/// The conversations that somebody asked about: Qt's factory is a plain function, so they stand beside it, and go with
+/// the platform.
+struct Registry {
+    static std::shared_ptr<Registry> makeShared() { return std::make_shared<Registry>(); }
+    std::unordered_map<const QObject*, std::unique_ptr<AccessibleConversation>> all;
+};
 
 AccessibleConversation* known(const ConversationWidget& widget) {
-    const auto found = conversations().find(&widget);
-    return found == conversations().end() ? nullptr : found->second.get();
+    const auto registry = platform::shared<Registry>();
+    if (!registry) {
+        return nullptr;
+    }
+    const auto found = registry->all.find(&widget);
+    return found == registry->all.end() ? nullptr : found->second.get();
 }
 
 QAccessibleInterface* interfaceOf(const QString& /*className*/, QObject* object) {
     auto* widget = dynamic_cast<ConversationWidget*>(object);
-    if (widget == nullptr) {
+    const auto registry = platform::shared<Registry>();
+    if (widget == nullptr || !registry) {
         return nullptr;
     }
-    auto& conversation = conversations()[widget];
+    auto& conversation = registry->all[widget];
     if (!conversation) {
         conversation = std::make_unique<AccessibleConversation>(*widget);
     }
@@ -48,11 +54,8 @@ void collectTexts(const AccessibilityNode& node, std::string& name) {
 }  // namespace
 
 void AccessibleConversation::install() {
-    static const bool installed = [] {
-        QAccessible::installFactory(interfaceOf);
-        return true;
-    }();
-    static_cast<void>(installed);
+    QAccessible::removeFactory(interfaceOf);
+    QAccessible::installFactory(interfaceOf);
 }
 
 void AccessibleConversation::changed(ConversationWidget& widget) {
@@ -87,7 +90,9 @@ void AccessibleConversation::focused(ConversationWidget& widget) {
 }
 
 void AccessibleConversation::forget(ConversationWidget& widget) {
-    conversations().erase(&widget);
+    if (const auto registry = platform::shared<Registry>()) {
+        registry->all.erase(&widget);
+    }
 }
 
 AccessibleConversation::~AccessibleConversation() {
