@@ -274,7 +274,7 @@ bool ConversationWidget::touch(QTouchEvent& event) {
         return false;
     }
     // One finger scrolls and taps; further ones do nothing.
-    const QPointF at = event.points().first().position();
+    const QPointF at = mapFromGlobal(event.points().first().globalPosition());
     event.accept();
     switch (event.type()) {
         case QEvent::TouchBegin:

@@ -18,6 +18,7 @@ class RowFocus {
 
     /// A point in the root's coordinates; none: the pointer has left, or is a finger.
     void hover(const std::optional<platform::Point>& point);
+    bool isHovering() const { return !hovered_.expired(); }
     /// Moves the keyboard's focus by one row; false at either end, where the focus leaves.
     bool step(bool forward);
     /// Takes the focus away, as any use of the pointer does.

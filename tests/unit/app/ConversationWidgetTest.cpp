@@ -4,6 +4,8 @@
 #include <QApplication>
 #include <QKeyEvent>
 #include <QMouseEvent>
+#include <QPointingDevice>
+#include <QTouchEvent>
 #include <QWheelEvent>
 #include <memory>
 
@@ -62,6 +64,13 @@ class KTRConversationWidgetTest : public ::testing::Test {
                           type == QEvent::MouseButtonRelease ? Qt::NoButton : Qt::LeftButton, Qt::NoModifier);
         QApplication::sendEvent(widget.get(), &event);
     }
+    void touch(QEvent::Type type, QPointF at) {
+        const auto state = type == QEvent::TouchBegin    ? QEventPoint::Pressed
+                           : type == QEvent::TouchUpdate ? QEventPoint::Updated
+                                                         : QEventPoint::Released;
+        QTouchEvent event(type, &finger, Qt::NoModifier, {QEventPoint(1, state, at, widget->mapToGlobal(at))});
+        QApplication::sendEvent(widget.get(), &event);
+    }
     void key(int code, Qt::KeyboardModifiers modifiers = Qt::NoModifier) {
         QKeyEvent event(QEvent::KeyPress, code, modifiers);
         QApplication::sendEvent(widget.get(), &event);
@@ -87,6 +96,13 @@ class KTRConversationWidgetTest : public ::testing::Test {
         return found;
     }
 
+    QPointingDevice finger{QStringLiteral("finger"),
+                           1,
+                           QInputDevice::DeviceType::TouchScreen,
+                           QPointingDevice::PointerType::Finger,
+                           QInputDevice::Capability::Position,
+                           1,
+                           0};
     std::unique_ptr<Host> host;
     std::unique_ptr<ConversationWidget> widget;
     std::vector<std::string> opened;
@@ -161,6 +177,32 @@ TEST_F(KTRConversationWidgetTest, Wheel_ScrollsAndStopsAtTheEnds) {
     EXPECT_EQ(widget->scrolled(), end);
     key(Qt::Key_Home);
     EXPECT_EQ(widget->scrolled(), 0.0);
+}
+
+TEST_F(KTRConversationWidgetTest, Finger_TapsAndScrolls) {
+    open({"forty-friends"});
+    touch(QEvent::TouchBegin, {200.0, 300.0});
+    touch(QEvent::TouchEnd, {202.0, 303.0});
+    EXPECT_EQ(opened.size(), 1u);
+    touch(QEvent::TouchBegin, {200.0, 400.0});
+    touch(QEvent::TouchUpdate, {200.0, 360.0});
+    touch(QEvent::TouchUpdate, {200.0, 300.0});
+    EXPECT_EQ(widget->scrolled(), 100.0);
+    touch(QEvent::TouchCancel, {200.0, 300.0});
+    EXPECT_EQ(opened.size(), 1u) << "a finger that scrolled opens nothing";
+}
+
+TEST_F(KTRConversationWidgetTest, Finger_HighlightsNothing) {
+    open({"dinner"});
+    widget->repaint();
+    const QPointF ann = row("Ann Marsh");
+    mouse(QEvent::MouseMove, ann);
+    QApplication::processEvents();
+    touch(QEvent::TouchBegin, ann);
+    QApplication::processEvents();
+    EXPECT_FALSE(widget->rows().isHovering());
+    touch(QEvent::TouchCancel, ann);
+    EXPECT_TRUE(opened.empty());
 }
 
 TEST_F(KTRConversationWidgetTest, Width_LaysOutAnew) {
