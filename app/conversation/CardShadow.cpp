@@ -1,5 +1,6 @@
 #include "app/conversation/CardShadow.h"
 
+#include <QPaintEngine>
 #include <QPainter>
 #include <algorithm>
 #include <array>
@@ -14,6 +15,9 @@ namespace {
 struct Layer {
     double dy, blur, spread;
 };
+/// Pixels a point of a shadow in a vector picture: it is soft, more would only make the file larger.
+constexpr double kVectorScale = 2.0;
+
 constexpr std::array<Layer, 2> kLayers = {{{1.0, 2.0, 0.0}, {8.0, 24.0, -6.0}}};
 
 /// One pass of a moving average along a line of samples `stride` apart.
@@ -110,7 +114,29 @@ const CardShadow::Blurred& CardShadow::blurred(double sigma, double corner, doub
 }
 
 void CardShadow::paintOne(linux_::QtCanvas& canvas, const QRectF& shape, double corner, double sigma) {
-    const Blurred& b = blurred(sigma, corner, 1.0 / canvas.pixel(), canvas.palette().cardShadow);
+    QPainter& painter = canvas.painter();
+    const auto engine = painter.paintEngine()->type();
+    if (engine == QPaintEngine::Raster) {
+        stretch(painter, blurred(sigma, corner, 1.0 / canvas.pixel(), canvas.palette().cardShadow), shape);
+        return;
+    }
+    // Vector pictures get each shadow as one image: stretched pieces would show their seams, and some viewers take no
+    // part of an image.
+    const Blurred& b = blurred(sigma, corner, kVectorScale, canvas.palette().cardShadow);
+    const QRectF outer = shape.adjusted(-b.margin, -b.margin, b.margin, b.margin);
+    QImage whole(static_cast<int>(std::ceil(outer.width() * kVectorScale)),
+                 static_cast<int>(std::ceil(outer.height() * kVectorScale)), QImage::Format_ARGB32_Premultiplied);
+    whole.fill(Qt::transparent);
+    {
+        QPainter pixels(&whole);
+        pixels.scale(kVectorScale, kVectorScale);
+        pixels.translate(-outer.topLeft());
+        stretch(pixels, b, shape);
+    }
+    painter.drawImage(QRectF(outer.topLeft(), QSizeF(whole.size()) / kVectorScale), whole);
+}
+
+void CardShadow::stretch(QPainter& painter, const Blurred& b, const QRectF& shape) {
     const double pixels = b.edge * b.scale;
     const QRectF outer = shape.adjusted(-b.margin, -b.margin, b.margin, b.margin);
     // A card too small for the corners squeezes them.
@@ -124,7 +150,7 @@ void CardShadow::paintOne(linux_::QtCanvas& canvas, const QRectF& shape, double 
             const QRectF target(QPointF(xs[column], ys[row]), QPointF(xs[column + 1], ys[row + 1]));
             const QRectF source(QPointF(from[column], from[row]), QPointF(from[column + 1], from[row + 1]));
             if (target.width() > 0.0 && target.height() > 0.0) {
-                canvas.painter().drawImage(target, b.image, source);
+                painter.drawImage(target, b.image, source);
             }
         }
     }

@@ -30,6 +30,7 @@ class CardShadow {
     };
 
     void paintOne(linux_::QtCanvas& canvas, const QRectF& shape, double corner, double sigma);
+    static void stretch(QPainter& painter, const Blurred& blurred, const QRectF& shape);
     const Blurred& blurred(double sigma, double corner, double scale, const QColor& color);
 
     std::vector<Blurred> kept_;
