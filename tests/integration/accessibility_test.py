@@ -1,0 +1,97 @@
+#!/usr/bin/python3
+"""What assistive technology sees of the window, over the accessibility bus of a session of its own: names, roles, places
+and presses. Skipped without a virtual display, a session bus and pyatspi."""
+
+import os
+import pathlib
+import shutil
+import subprocess
+import sys
+import tempfile
+import time
+import unittest
+
+PROGRAM = os.environ["KTR_PROGRAM"]
+SCENARIOS = pathlib.Path(os.environ["KTR_SOURCE"]) / "resources" / "scenarios"
+# The bindings belong to the system's Python.
+SYSTEM_PYTHON = "/usr/bin/python3"
+
+
+def wait_for(what, condition, seconds=30.0):
+    deadline = time.monotonic() + seconds
+    while time.monotonic() < deadline:
+        result = condition()
+        if result:
+            return result
+        time.sleep(0.05)
+    raise AssertionError(f"{what} did not come")
+
+
+def nodes(root):
+    yield root
+    for i in range(root.childCount):
+        yield from nodes(root.getChildAtIndex(i))
+
+
+class AccessibilityTest(unittest.TestCase):
+    def test_rows_are_named_links_that_can_be_pressed(self):
+        import pyatspi
+
+        folder = tempfile.TemporaryDirectory()
+        self.addCleanup(folder.cleanup)
+        output = pathlib.Path(folder.name) / "output"
+        environment = {**os.environ, "QT_LINUX_ACCESSIBILITY_ALWAYS_ON": "1", "QT_QPA_PLATFORM": "xcb"}
+        with output.open("w") as stream:
+            program = subprocess.Popen([PROGRAM, "show", SCENARIOS / "dinner.json", "--print-urls"], env=environment,
+                                       stdout=stream)
+        self.addCleanup(program.wait)
+        self.addCleanup(program.kill)
+        desktop = pyatspi.Registry.getDesktop(0)
+
+        def application():
+            found = [desktop.getChildAtIndex(i) for i in range(desktop.childCount)]
+            return next((one for one in found if one and one.name == "ktr" and one.childCount), None)
+
+        tree = list(nodes(wait_for("the program on the bus", application)))
+        texts = [node.name for node in tree if node.getRoleName() == "label"]
+        self.assertEqual(texts[1:3], ["Where are my friends near the harbour?", "Here are the five nearest."])
+        links = [node for node in tree if node.getRoleName() == "link"]
+        self.assertEqual(len(links), 6)
+        self.assertIn("Ann Marsh", links[0].name)
+        self.assertEqual(links[-1].name, "Show all friends")
+        places = [link.queryComponent().getExtents(pyatspi.DESKTOP_COORDS) for link in links]
+        self.assertTrue(all(place.width == 376 for place in places))
+        self.assertEqual([place.y for place in places], sorted(place.y for place in places))
+        links[1].queryAction().doAction(0)
+        wait_for("the URL", lambda: output.read_text() == "wayloc://friend/l.haddad@mail.example\n")
+
+
+def outside():
+    """Starts a display and a session bus, and this file again inside them."""
+    for needed in ("Xvfb", "dbus-run-session", SYSTEM_PYTHON):
+        if not shutil.which(needed):
+            print(needed, "is not installed")
+            return 77
+    if subprocess.run([SYSTEM_PYTHON, "-c", "import pyatspi"], capture_output=True, check=False).returncode != 0:
+        print("python3-pyatspi is not installed")
+        return 77
+    with tempfile.TemporaryDirectory() as runtime:
+        read, write = os.pipe()
+        server = subprocess.Popen(["Xvfb", "-displayfd", str(write), "-screen", "0", "900x900x24", "-nolisten", "tcp"],
+                                  pass_fds=[write], stderr=subprocess.DEVNULL)
+        os.close(write)
+        with os.fdopen(read) as numbers:
+            display = ":" + numbers.readline().strip()
+        environment = {**os.environ, "DISPLAY": display, "XDG_RUNTIME_DIR": runtime, "KTR_INSIDE": "yes"}
+        try:
+            return subprocess.run(["dbus-run-session", "--", SYSTEM_PYTHON, __file__, *sys.argv[1:]], env=environment,
+                                  timeout=120, check=False).returncode
+        finally:
+            server.terminate()
+            server.wait()
+
+
+if __name__ == "__main__":
+    if "KTR_INSIDE" not in os.environ:
+        sys.exit(outside())
+    unittest.main()
