@@ -92,10 +92,14 @@ bool hasDisplay() {
     return false;
 }
 
-/// Qt's own remarks are none of the user's concern; what it finds critical is.
+/// Qt's own remarks are none of the user's concern; what it finds critical is. After a fatal one, such as a display
+/// that does not answer, Qt would end the process with a core dump: the line and the exit status say it better.
 void passOnQtMessage(QtMsgType type, const QMessageLogContext& /*context*/, const QString& text) {
     if (type == QtCriticalMsg || type == QtFatalMsg) {
-        std::fprintf(stderr, "ktr: %s\n", text.toUtf8().constData());
+        std::fprintf(stderr, "ktr: %s\n", text.section(u'\n', 0, 0).toUtf8().constData());
+    }
+    if (type == QtFatalMsg) {
+        std::_Exit(static_cast<int>(ExitCode::Failure));
     }
 }
 
