@@ -11,8 +11,11 @@ VAPerson::~VAPerson() = default;
 VAPersonAttribute::~VAPersonAttribute() = default;
 VALocation::~VALocation() = default;
 VAKtrLocation::~VAKtrLocation() = default;
+VAKtrGeoFence::~VAKtrGeoFence() = default;
 VASnippet::~VASnippet() = default;
 VAKtrLocationSnippet::~VAKtrLocationSnippet() = default;
+VAKtrGeoFenceSnippet::~VAKtrGeoFenceSnippet() = default;
+VAKtrVisibilityView::~VAKtrVisibilityView() = default;
 
 std::string VAPerson::description() const {
     return "<VAPerson " + fullName.value_or("(null)") + ">";
@@ -21,6 +24,11 @@ std::string VAPerson::description() const {
 std::string VAKtrLocation::description() const {
     const auto handle = friend_ ? friend_->data : std::nullopt;
     return "<VAKtrLocation " + handle.value_or("(null)") + ">";
+}
+
+std::string VAKtrGeoFence::description() const {
+    const auto handle = friend_ ? friend_->data : std::nullopt;
+    return "<VAKtrGeoFence " + handle.value_or("(null)") + ">";
 }
 
 }  // namespace ktr::platform

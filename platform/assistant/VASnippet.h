@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "platform/assistant/AssistantObject.h"
+#include "platform/assistant/VAKtrGeoFence.h"
 #include "platform/assistant/VALocation.h"
 #include "platform/base/Url.h"
 
@@ -29,6 +30,20 @@ class KTR_API VAKtrLocationSnippet : public VASnippet {
     std::shared_ptr<const LocationList> locations;
     /// Set when the question was about several friends near a place.
     std::optional<std::string> proximity;
+};
+
+/// A geofence that was set up or reported.
+class KTR_API VAKtrGeoFenceSnippet : public VASnippet {
+  public:
+    ~VAKtrGeoFenceSnippet() override;
+    std::shared_ptr<VAKtrGeoFence> cueKtrGeoFence;
+};
+
+/// Whether the user's own place is shared.
+class KTR_API VAKtrVisibilityView : public VASnippet {
+  public:
+    ~VAKtrVisibilityView() override;
+    bool visible = false;
 };
 
 }  // namespace ktr::platform

@@ -18,7 +18,7 @@ class KTR_API DistanceCalculator : public Object {
         std::string defaultsSuite;
         /// The language of the words; none: the region's own.
         std::optional<std::string> languageLocale;
-        /// The locale whose units are used, at the time of asking.
+        /// The locale whose units are used; fixed for as long as the calculator lives.
         std::string measurementSystemLocale;
         std::shared_ptr<Localization> localizationDelegate;
     };

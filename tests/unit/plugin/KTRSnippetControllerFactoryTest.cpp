@@ -76,6 +76,15 @@ TEST_F(KTRSnippetControllerFactoryTest, UnknownKindOrNone_IsNoneAndOneLine) {
               std::vector<std::string>{"Unrecognized snippet CueObject passed to KTRSnippetControllerFactory: (null)"});
 }
 
+TEST_F(KTRSnippetControllerFactoryTest, KindsWithoutAController_AreNoneAndOneLineEach) {
+    EXPECT_EQ(factory_->viewControllerForSnippet(std::make_shared<VAKtrGeoFenceSnippet>()), nullptr);
+    EXPECT_EQ(factory_->viewControllerForSnippet(std::make_shared<VAKtrVisibilityView>()), nullptr);
+    EXPECT_EQ(log->texts(),
+              (std::vector<std::string>{
+                  "Unrecognized snippet CueObject passed to KTRSnippetControllerFactory: <VAKtrGeoFenceSnippet>",
+                  "Unrecognized snippet CueObject passed to KTRSnippetControllerFactory: <VAKtrVisibilityView>"}));
+}
+
 TEST_F(KTRSnippetControllerFactoryTest, AccessibilityTextSize_IsRefusedWithOneLine) {
     device->category = ContentSizeCategory::AX1;
     EXPECT_EQ(factory_->viewControllerForSnippet(proximitySnippet({})), nullptr);
@@ -92,6 +101,8 @@ TEST_F(KTRSnippetControllerFactoryTest, LargestOrdinaryTextSize_IsDrawn) {
 TEST_F(KTRSnippetControllerFactoryTest, SpeakableNamespace_IsNoneForEverything) {
     EXPECT_EQ(factory_->speakableNamespaceProviderForCueObject(proximitySnippet({})), nullptr);
     EXPECT_EQ(factory_->speakableNamespaceProviderForCueObject(placedFriend("Ann", "a@example.org")), nullptr);
+    EXPECT_EQ(factory_->speakableNamespaceProviderForCueObject(std::make_shared<VAKtrGeoFenceSnippet>()), nullptr);
+    EXPECT_EQ(factory_->speakableNamespaceProviderForCueObject(std::make_shared<VAKtrVisibilityView>()), nullptr);
     EXPECT_EQ(factory_->speakableNamespaceProviderForCueObject(std::make_shared<UnknownObject>()), nullptr);
     EXPECT_EQ(factory_->speakableNamespaceProviderForCueObject(nullptr), nullptr);
 }

@@ -67,7 +67,7 @@ TEST_F(VAKTRBaseSnippetControllerTest, Creation_ReadsTheSnippet) {
 }
 
 TEST_F(VAKTRBaseSnippetControllerTest, Creation_SnippetOfAnotherKind_HasContextAlone) {
-    auto snippet = std::make_shared<VASnippet>();
+    auto snippet = std::make_shared<VAKtrGeoFenceSnippet>();
     snippet->searchContext = Url("ktrServerContext://serverContext?clientId=abc&");
     const auto controller = makeController(snippet);
     EXPECT_TRUE(controller->locations().empty());
