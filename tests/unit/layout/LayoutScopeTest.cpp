@@ -1,3 +1,4 @@
+// Longer than other tests: what one scope does with each kind of constraint and content stands here side by side.
 #include "platform/layout/LayoutScope.h"
 
 #include "platform/layout/LayoutConstraint.h"
