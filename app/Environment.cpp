@@ -113,7 +113,10 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
     platform.decimalNumbers =
         std::make_shared<linux_::IcuNumberFormatter>(region->localeWithLanguage(settings.language));
     platform.geodesy = std::make_shared<linux_::GeographicLibGeodesy>();
-    platform.distanceCalculators = std::make_shared<linux_::IcuDistanceCalculatorFactory>(platform.geodesy);
+    // A picture or a text must not depend on whose session it is made in.
+    using Distances = linux_::IcuDistanceCalculatorFactory;
+    platform.distanceCalculators = std::make_shared<Distances>(
+        platform.geodesy, isVirtual ? std::nullopt : std::optional(Distances::sessionPreferences()));
     platform.locationManagers = std::make_shared<linux_::ScenarioLocationManagerFactory>(
         walkOf(settings.positions), platform.mainLoop, platform.clock, platform.geodesy);
     const auto phoneNumbers = std::make_shared<linux_::PhonenumberLibrary>();

@@ -4,12 +4,18 @@
 #include <utility>
 
 #include <QSettings>
+#include <QStandardPaths>
 
 namespace ktr::linux_ {
 
 IcuDistanceCalculatorFactory::IcuDistanceCalculatorFactory(std::shared_ptr<platform::Geodesy> geodesy,
                                                            std::optional<std::filesystem::path> preferences)
     : geodesy_(std::move(geodesy)), preferences_(std::move(preferences)) {}
+
+std::filesystem::path IcuDistanceCalculatorFactory::sessionPreferences() {
+    const auto folder = QStandardPaths::writableLocation(QStandardPaths::GenericConfigLocation);
+    return std::filesystem::path(folder.toStdString()) / "ktr";
+}
 
 std::optional<UnitSystem> IcuDistanceCalculatorFactory::preferredUnits(const std::string& suite) const {
     if (!preferences_ || suite.empty() || suite.find('/') != std::string::npos) {

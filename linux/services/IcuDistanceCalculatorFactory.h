@@ -18,6 +18,9 @@ class IcuDistanceCalculatorFactory : public platform::DistanceCalculatorFactory 
     /// depend on whose session it is).
     explicit IcuDistanceCalculatorFactory(std::shared_ptr<platform::Geodesy> geodesy,
                                           std::optional<std::filesystem::path> preferences = std::nullopt);
+    /// The folder "ktr" of the session's configuration (XDG_CONFIG_HOME, else ~/.config).
+    static std::filesystem::path sessionPreferences();
+
     /// The file is read here, once for each calculator.
     std::shared_ptr<platform::DistanceCalculator> makeDistanceCalculator(
         const platform::DistanceCalculator::Settings& settings) override;

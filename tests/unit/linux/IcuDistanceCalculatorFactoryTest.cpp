@@ -6,6 +6,7 @@
 #include <QTemporaryDir>
 
 #include "linux/services/GeographicLibGeodesy.h"
+#include "tests/support/EnvironmentVariable.h"
 
 namespace ktr::linux_ {
 
@@ -38,6 +39,11 @@ TEST_F(IcuDistanceCalculatorFactoryTest, AnotherWordSuiteOrAnEmptyFile_Overrides
     EXPECT_EQ(systemWith("[units]\nsystem=us\n", "group.other"), 0);
     EXPECT_EQ(systemWith("[units]\nsystem=us\n", "../group.friends"), 0);
     EXPECT_EQ(systemWith("[units]\nsystem=us\n", ""), 0);
+}
+
+TEST_F(IcuDistanceCalculatorFactoryTest, TheSessionsPreferences_StandInItsConfiguration) {
+    const test::EnvironmentVariable home("XDG_CONFIG_HOME", "/somewhere/config");
+    EXPECT_EQ(IcuDistanceCalculatorFactory::sessionPreferences(), "/somewhere/config/ktr");
 }
 
 TEST_F(IcuDistanceCalculatorFactoryTest, WithoutAFolder_NothingOverridesTheUnits) {
