@@ -10,6 +10,8 @@ namespace ktr::linux_ {
 namespace {
 
 constexpr const char* kModuleFile = "libktr-phone.so";
+// libphonenumber takes no longer texts for numbers, but needs a minute to say so of a very long one.
+constexpr std::size_t kLongestText = 250;
 
 std::string upperCased(std::string code) {
     for (char& c : code) {
@@ -59,7 +61,8 @@ std::shared_ptr<PhonenumberLibrary::Number> PhonenumberLibrary::number(const std
         return found->second->number;
     }
     const PhoneModule* library = module();
-    auto made = std::make_shared<Number>(library ? library->parse(text, region) : std::nullopt);
+    const bool worthParsing = library && text.size() <= kLongestText;
+    auto made = std::make_shared<Number>(worthParsing ? library->parse(text, region) : std::nullopt);
     answers_.push_front({key, made});
     index_.emplace(std::move(key), answers_.begin());
     if (index_.size() > kKept) {
