@@ -192,7 +192,7 @@ FontSpec FontChoice::spec(const platform::Font& wanted, int pixelSize, const QSt
     return {family, pixelSize, weight};
 }
 
-QFont FontSpec::font() const {
+QFont FontSpec::make() const {
     QStringList families{family};
     if (family != FontChoice::baseFamily()) {
         families.append(FontChoice::baseFamily());
@@ -209,6 +209,25 @@ QFont FontSpec::font() const {
     font.setHintingPreference(QFont::PreferNoHinting);
     font.setStyleStrategy(static_cast<QFont::StyleStrategy>(QFont::PreferAntialias | QFont::NoSubpixelAntialias));
     return font;
+}
+
+const FontSpec::Made& FontSpec::made() const {
+    // A QFont finds its engine once and keeps it; making one for each text finds it again each time. By thread, as
+    // fonts belong to the thread that loaded them.
+    thread_local std::vector<std::pair<FontSpec, Made>> known;
+    for (const auto& [spec, made] : known) {
+        if (spec == *this) {
+            return made;
+        }
+    }
+    if (known.size() == kMostKept) {
+        known.clear();
+    }
+    Made made;
+    made.font = make();
+    made.format.setFont(made.font);
+    known.reserve(kMostKept);
+    return known.emplace_back(*this, std::move(made)).second;
 }
 
 }  // namespace ktr::linux_

@@ -3,6 +3,7 @@
 #include <QFont>
 #include <QString>
 #include <QStringList>
+#include <QTextFormat>
 #include <vector>
 
 #include "platform/ui/Font.h"
@@ -18,7 +19,18 @@ struct FontSpec {
     bool operator==(const FontSpec&) const = default;
     /// The family, the base family behind it, then the emoji font, then symbols. Qt keeps this list for all fonts that
     /// begin with the same family, so that it must not depend on anything else.
-    QFont font() const;
+    const QFont& font() const { return made().font; }
+    /// The same as a format for a part of a text. Both are valid until the next call, in this thread.
+    const QTextCharFormat& format() const { return made().format; }
+
+  private:
+    struct Made {
+        QFont font;
+        QTextCharFormat format;
+    };
+    static constexpr std::size_t kMostKept = 64;
+    const Made& made() const;
+    QFont make() const;
 };
 
 /// Which fonts a text is set in: Noto Sans, and for what has a script of its own the Noto font of that script. Any

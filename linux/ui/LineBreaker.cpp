@@ -155,7 +155,7 @@ std::shared_ptr<ShapedText> LineBreaker::share(Shaped shaped, qsizetype from, in
         placed.push_back({line.width(), line.position()});
     }
     return std::make_shared<ShapedText>(std::move(shaped.recipe), std::move(placed), scale_, std::move(colors),
-                                        std::move(shaped.layout));
+                                        *shaped.layout);
 }
 
 LineBreaker::Metrics LineBreaker::metricsOf(qsizetype from, qsizetype to) const {
@@ -426,10 +426,8 @@ LineBreaker::Shaped LineBreaker::cutLine(qsizetype from, qsizetype to, double ro
         best = std::move(cut);
         return true;
     };
-    if (!fits(0)) {
-        return {};
-    }
-    // Invariant: what is cut at `low` fits, what is cut at `high` does not (or is beyond the text).
+    // Invariant: what is cut at `low` fits, what is cut at `high` does not (or is beyond the text). That the ellipsis
+    // alone fits is not known before the end.
     std::size_t low = 0;
     std::size_t high = cuts.size();
     std::size_t probe = estimateCut(cuts, from, ahead, room);
@@ -444,6 +442,9 @@ LineBreaker::Shaped LineBreaker::cutLine(qsizetype from, qsizetype to, double ro
             probe -= std::min(probe, step);
         }
         step *= 2;
+    }
+    if (low == 0) {
+        fits(0);
     }
     return best;
 }

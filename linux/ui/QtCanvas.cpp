@@ -61,11 +61,40 @@ QRectF QtCanvas::snapped(const platform::Rect& rect) const {
 }
 
 void QtCanvas::save() {
-    painter_.save();
+    saved_.push_back({painter_.worldTransform(), false});
 }
 
 void QtCanvas::restore() {
-    painter_.restore();
+    if (saved_.empty()) {
+        return;
+    }
+    if (saved_.back().isPainters) {
+        painter_.restore();
+    } else {
+        painter_.setWorldTransform(saved_.back().transform);
+    }
+    saved_.pop_back();
+}
+
+/// Saves the painter itself where so far its transformation was noted alone: what follows may change more.
+void QtCanvas::savePainter() {
+    if (saved_.empty() || saved_.back().isPainters) {
+        return;
+    }
+    const QTransform present = painter_.worldTransform();
+    for (Saved& saved : saved_) {
+        if (!saved.isPainters) {
+            painter_.setWorldTransform(saved.transform);
+            painter_.save();
+            saved.isPainters = true;
+        }
+    }
+    painter_.setWorldTransform(present);
+}
+
+QPainter& QtCanvas::painter() {
+    savePainter();
+    return painter_;
 }
 
 void QtCanvas::translate(double dx, double dy) {
@@ -73,6 +102,7 @@ void QtCanvas::translate(double dx, double dy) {
 }
 
 void QtCanvas::clip(const platform::Rect& rect) {
+    savePainter();
     painter_.setClipRect(snapped(rect), Qt::IntersectClip);
 }
 

@@ -1,6 +1,8 @@
 #pragma once
 
 #include <QRectF>
+#include <QTransform>
+#include <vector>
 
 #include "linux/ui/Palette.h"
 #include "platform/ui/Canvas.h"
@@ -27,7 +29,7 @@ class QtCanvas final : public platform::Canvas {
     void draw(const platform::Image& image, const platform::Rect& rect) override;
 
     /// For what a host paints around the views.
-    QPainter& painter() { return painter_; }
+    QPainter& painter();
     const Palette& palette() const { return palette_; }
     /// The rectangle that `rect` becomes on the grid of device pixels, in points.
     QRectF snapped(const platform::Rect& rect) const;
@@ -42,10 +44,18 @@ class QtCanvas final : public platform::Canvas {
         double dy = 0.0;
     };
     Grid grid() const;
+    void savePainter();
+
+    /// Saving a painter costs as much as drawing a short text, and few views change more than the transformation.
+    struct Saved {
+        QTransform transform;
+        bool isPainters = false;
+    };
 
     QPainter& painter_;
     const Palette& palette_;
     double pixelsPerDeviceUnit_;
+    std::vector<Saved> saved_;
 };
 
 }  // namespace ktr::linux_

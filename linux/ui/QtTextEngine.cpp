@@ -61,7 +61,7 @@ double alignedX(const platform::AttributedString& text, const TextContainer& con
 
 }  // namespace
 
-std::size_t QtTextEngine::KeyHash::operator()(const Key& key) const {
+std::size_t QtTextEngine::hashOf(const Key& key) {
     std::size_t hash = 0;
     for (const auto& run : key.text.runs()) {
         mix(hash, std::hash<std::string>{}(run.text));
@@ -92,40 +92,58 @@ std::size_t QtTextEngine::shapedCount() const {
 
 std::shared_ptr<const platform::TextLayout> QtTextEngine::layOut(const platform::AttributedString& text,
                                                                  const TextContainer& container) {
-    return layOutOnce({text, container});
+    Key key{text, container};
+    if (std::isinf(container.width) && container.maximumLines == 1) {
+        // One line as it is measured, whatever its alignment: one layout for all.
+        key.container = natural(container);
+    }
+    return layOutOnce(key);
 }
 
-std::shared_ptr<const QtTextLayout> QtTextEngine::find(const Key& key) {
+QtTextEngine::Entries::iterator QtTextEngine::entry(std::size_t hash, const Key& key) {
+    const auto [begin, end] = index_.equal_range(hash);
+    const auto found = std::find_if(begin, end, [&key](const auto& known) { return known.second->key == key; });
+    return found == end ? entries_.end() : found->second;
+}
+
+std::shared_ptr<const QtTextLayout> QtTextEngine::find(std::size_t hash, const Key& key) {
     const std::lock_guard lock(mutex_);
-    const auto found = index_.find(key);
-    if (found == index_.end()) {
+    const auto found = entry(hash, key);
+    if (found == entries_.end()) {
         return nullptr;
     }
-    entries_.splice(entries_.begin(), entries_, found->second);
-    return found->second->layout;
+    entries_.splice(entries_.begin(), entries_, found);
+    return found->layout;
 }
 
-void QtTextEngine::keep(const Key& key, const std::shared_ptr<const QtTextLayout>& layout) {
+void QtTextEngine::keep(std::size_t hash, const Key& key, const std::shared_ptr<const QtTextLayout>& layout) {
     const std::lock_guard lock(mutex_);
-    if (index_.contains(key)) {
+    if (entry(hash, key) != entries_.end()) {
         return;  // another thread was quicker
     }
     const std::size_t cost = costOf(key.text);
     if (cost > kMostCost / 2) {
         return;
     }
-    entries_.push_front({key, layout, cost});
-    index_.emplace(key, entries_.begin());
+    entries_.push_front({hash, key, layout, cost});
+    index_.emplace(hash, entries_.begin());
     cost_ += cost;
     while (cost_ > kMostCost) {
-        cost_ -= entries_.back().cost;
-        index_.erase(entries_.back().key);
-        entries_.pop_back();
+        dropOldest();
     }
 }
 
+void QtTextEngine::dropOldest() {
+    const auto oldest = std::prev(entries_.end());
+    cost_ -= oldest->cost;
+    const auto [begin, end] = index_.equal_range(oldest->hash);
+    index_.erase(std::find_if(begin, end, [oldest](const auto& known) { return known.second == oldest; }));
+    entries_.pop_back();
+}
+
 std::shared_ptr<const QtTextLayout> QtTextEngine::layOutOnce(const Key& key) {
-    if (auto kept = find(key)) {
+    const std::size_t hash = hashOf(key);
+    if (auto kept = find(hash, key)) {
         return kept;
     }
     std::shared_ptr<const QtTextLayout> layout;
@@ -151,7 +169,7 @@ std::shared_ptr<const QtTextLayout> QtTextEngine::layOutOnce(const Key& key) {
     if (!layout) {
         layout = shape(key);
     }
-    keep(key, layout);
+    keep(hash, key, layout);
     return layout;
 }
 

@@ -37,26 +37,28 @@ class QtTextEngine final : public platform::TextEngine {
         platform::TextContainer container;
         bool operator==(const Key&) const = default;
     };
-    struct KeyHash {
-        std::size_t operator()(const Key& key) const;
-    };
     struct Entry {
+        std::size_t hash = 0;
         Key key;
         std::shared_ptr<const QtTextLayout> layout;
         std::size_t cost = 0;
     };
     using Entries = std::list<Entry>;
+    static std::size_t hashOf(const Key& key);
+    Entries::iterator entry(std::size_t hash, const Key& key);
+    void dropOldest();
 
     std::shared_ptr<const QtTextLayout> layOutOnce(const Key& key);
     std::shared_ptr<const QtTextLayout> shape(const Key& key);
-    std::shared_ptr<const QtTextLayout> find(const Key& key);
-    void keep(const Key& key, const std::shared_ptr<const QtTextLayout>& layout);
+    std::shared_ptr<const QtTextLayout> find(std::size_t hash, const Key& key);
+    void keep(std::size_t hash, const Key& key, const std::shared_ptr<const QtTextLayout>& layout);
 
     mutable std::mutex mutex_;
     FontChoice fonts_;
     /// Most recently used first.
     Entries entries_;
-    std::unordered_map<Key, Entries::iterator, KeyHash> index_;
+    /// By hash of the key.
+    std::unordered_multimap<std::size_t, Entries::iterator> index_;
     std::size_t cost_ = 0;
     std::size_t shaped_ = 0;
 };

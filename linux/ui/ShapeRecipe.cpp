@@ -17,7 +17,7 @@ std::unique_ptr<QTextLayout> ShapeRecipe::layout() const {
         QTextLayout::FormatRange format;
         format.start = static_cast<int>(range.start);
         format.length = static_cast<int>(range.length);
-        format.format.setFont(range.font.font());
+        format.format = range.font.format();
         formats.append(format);
     }
     if (!formats.isEmpty()) {

@@ -1,10 +1,11 @@
 #pragma once
 
 #include <QPointF>
+#include <QRawFont>
 #include <QTextLayout>
 #include <memory>
-#include <mutex>
 #include <optional>
+#include <utility>
 #include <vector>
 
 #include "linux/ui/Palette.h"
@@ -27,9 +28,9 @@ class ShapedText {
 
     /// Glyphs are shaped at whole sizes; `scale` takes the recipe's units to points. `colors` is empty for a text in
     /// one colour, else it covers the text. `layout` is what this thread has shaped of the recipe with these lines (it
-    /// may hold more lines behind them, which are not drawn).
+    /// may hold more lines behind them, which are not drawn); it is not kept.
     ShapedText(ShapeRecipe recipe, std::vector<ShapeRecipe::Line> lines, double scale, std::vector<ColorRange> colors,
-               std::unique_ptr<QTextLayout> layout);
+               const QTextLayout& layout);
     ~ShapedText();
     ShapedText(const ShapedText&) = delete;
     ShapedText& operator=(const ShapedText&) = delete;
@@ -40,14 +41,30 @@ class ShapedText {
     void draw(QPainter& painter, QPointF origin, const QColor& color, const Palette& palette) const;
 
   private:
+    /// Glyphs of one font and one colour.
+    struct GlyphRun {
+        QRawFont font;
+        int count = 0;
+        /// Of colors_; -1 for the colour that is drawn with.
+        int color = -1;
+    };
+    /// What the main thread has shaped: a tenth of a QTextLayout. In the recipe's units.
+    struct Glyphs {
+        std::vector<GlyphRun> runs;
+        std::vector<quint32> indexes;
+        std::vector<std::pair<float, float>> positions;
+    };
+
     void drawLines(QPainter& painter, const QTextLayout& layout, const QColor& color, const Palette& palette) const;
+    void drawGlyphs(QPainter& painter, const QColor& color, const Palette& palette) const;
+    std::shared_ptr<const Glyphs> glyphsOf(const QTextLayout& layout) const;
 
     ShapeRecipe recipe_;
     std::vector<ShapeRecipe::Line> lines_;
     double scale_;
     std::vector<ColorRange> colors_;
     /// The main thread's; none until it draws what another thread shaped.
-    mutable std::shared_ptr<QTextLayout> layout_;
+    mutable std::shared_ptr<const Glyphs> glyphs_;
 };
 
 }  // namespace ktr::linux_

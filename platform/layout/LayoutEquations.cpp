@@ -4,6 +4,7 @@
 #include <limits>
 
 #include "platform/layout/LayoutScope.h"
+#include "platform/layout/LayoutStructure.h"
 
 namespace ktr::platform {
 
@@ -23,23 +24,110 @@ bool followsDirection(LayoutAttribute attribute) {
 
 }  // namespace
 
-void LayoutEquations::build(View& owner, const std::vector<std::shared_ptr<LayoutConstraint>>& constraints,
-                            bool rightToLeft) {
+std::shared_ptr<LayoutStructure> LayoutEquations::build(
+    View& owner, const std::vector<std::shared_ptr<LayoutConstraint>>& constraints, bool rightToLeft) {
     *this = LayoutEquations();
     rightToLeft_ = rightToLeft;
     owner_.identity = &owner;
     owner_.view = weak(&owner);
     readContent(owner_, owner);
-    const auto plan = std::make_shared<Plan>();
-    plan->variables = 2;
-    plan->equations.reserve(constraints.size() + 32);
+    const Mentions mentions = collect(constraints);
+    auto structure = LayoutStructures::find(signature(mentions), [&] { return makePlan(mentions); });
+    plan_ = structure->plan();
+    constants_.reserve(plan_->equations.size());
+    for (const Equation& equation : plan_->equations) {
+        constants_.push_back(equation.constant);
+    }
+    writeInputs();
+    return structure;
+}
+
+LayoutEquations::Mentions LayoutEquations::collect(const std::vector<std::shared_ptr<LayoutConstraint>>& constraints) {
+    Mentions mentions;
+    mentions.reserve(constraints.size() + 8);
+    participants_.reserve(8);
     for (const auto& constraint : constraints) {
-        addConstraint(*constraint, *plan);
+        mention(*constraint, mentions);
     }
     for (int i = 0; i < static_cast<int>(participants_.size()); ++i) {
-        addOwnSizes(i, *plan);
+        mentionOwnSizes(i, mentions);
     }
-    addContent(-1, *plan);
+    participants_.shrink_to_fit();
+    return mentions;
+}
+
+void LayoutEquations::mention(const LayoutConstraint& constraint, Mentions& mentions) {
+    Mention mention{&constraint, kNobody, kNobody};
+    const auto first = constraint.first().view();
+    const auto second = constraint.second().view();
+    // Neither end takes part unless both can.
+    const bool areBelow = isBelowOwner(first) && isBelowOwner(second);
+    if (!areBelow) {
+        hasStrangers_ = true;
+        return;
+    }
+    if (constraint.first().attribute() != LayoutAttribute::None) {
+        mention.first = participantOf(first);
+    }
+    if (constraint.second().attribute() != LayoutAttribute::None) {
+        mention.second = participantOf(second);
+    }
+    mentions.push_back(mention);
+}
+
+/// What a view says of its own width and height, which its superview's scope solves.
+void LayoutEquations::mentionOwnSizes(int participant, Mentions& mentions) {
+    const auto view = participants_[participant].view.lock();
+    if (!view || participants_[participant].ownConstraints == 0) {
+        return;
+    }
+    for (const auto& constraint : LayoutScope::constraintsOf(*view)) {
+        const auto second = constraint->second().view();
+        if (constraint->first().view() == view && (!second || second == view)) {
+            mention(*constraint, mentions);
+        }
+    }
+}
+
+/// All that the plan depends on: equal for equal plans only.
+std::vector<double> LayoutEquations::signature(const Mentions& mentions) const {
+    std::vector<double> signature;
+    signature.reserve(2 + mentions.size() * 8 + participants_.size() * 8 + 8);
+    signature.push_back(rightToLeft_ ? 1.0 : 0.0);
+    signature.push_back(static_cast<double>(mentions.size()));
+    for (const auto& [constraint, first, second] : mentions) {
+        signature.push_back(first);
+        signature.push_back(static_cast<double>(constraint->first().attribute()));
+        signature.push_back(second);
+        signature.push_back(static_cast<double>(constraint->second().attribute()));
+        signature.push_back(static_cast<double>(constraint->relation()));
+        signature.push_back(constraint->multiplier());
+        signature.push_back(constraint->constant());
+        signature.push_back(constraint->priority());
+    }
+    const auto describe = [&signature](const Participant& p) {
+        signature.push_back(p.parent);
+        signature.push_back((p.isFixed ? 1.0 : 0.0) + (p.hasWidth ? 2.0 : 0.0) + (p.hasHeight ? 4.0 : 0.0));
+        signature.push_back(p.priorities.horizontalHugging);
+        signature.push_back(p.priorities.horizontalCompressionResistance);
+        signature.push_back(p.priorities.verticalHugging);
+        signature.push_back(p.priorities.verticalCompressionResistance);
+    };
+    describe(owner_);
+    for (const Participant& participant : participants_) {
+        describe(participant);
+    }
+    return signature;
+}
+
+std::shared_ptr<const LayoutEquations::Plan> LayoutEquations::makePlan(const Mentions& mentions) const {
+    auto plan = std::make_shared<Plan>();
+    plan->variables = static_cast<VariableId>(2 + 4 * participants_.size());
+    plan->equations.reserve(mentions.size() + 8 * participants_.size() + 8);
+    for (const Mention& mention : mentions) {
+        addConstraint(mention, *plan);
+    }
+    addContent(kOwner, *plan);
     for (int i = 0; i < static_cast<int>(participants_.size()); ++i) {
         if (participants_[i].isFixed) {
             addFrame(i, *plan);
@@ -47,12 +135,7 @@ void LayoutEquations::build(View& owner, const std::vector<std::shared_ptr<Layou
             addContent(i, *plan);
         }
     }
-    constants_.reserve(plan->equations.size());
-    for (const Equation& equation : plan->equations) {
-        constants_.push_back(equation.constant);
-    }
-    plan_ = plan;
-    writeInputs();
+    return plan;
 }
 
 bool LayoutEquations::isCurrent(View& owner, bool rightToLeft) const {
@@ -82,23 +165,24 @@ IntrinsicSize LayoutEquations::contentOf(View& view) const {
     return {fitting.width, fitting.height};
 }
 
-/// Whether the anchor's view is the owner or below it; true for none.
-bool LayoutEquations::isBelowOwner(const LayoutAnchor& anchor) const {
-    if (anchor.attribute() == LayoutAttribute::None) {
+/// Whether the view is the owner or below it; true for none.
+bool LayoutEquations::isBelowOwner(const std::shared_ptr<View>& view) const {
+    const auto isKnown = [&view](const Participant& p) { return p.identity == view.get(); };
+    if (!view || view.get() == owner_.identity || std::any_of(participants_.begin(), participants_.end(), isKnown)) {
         return true;
     }
-    for (auto view = anchor.view(); view; view = view->superview()) {
-        if (view.get() == owner_.identity) {
+    for (auto above = view->superview(); above; above = above->superview()) {
+        if (above.get() == owner_.identity) {
             return true;
         }
     }
     return false;
 }
 
-/// The participant of a view below the owner; -1 for the owner.
-int LayoutEquations::participantOf(const std::shared_ptr<View>& view, Plan& plan) {
+/// The participant of a view below the owner.
+int LayoutEquations::participantOf(const std::shared_ptr<View>& view) {
     if (view.get() == owner_.identity) {
-        return -1;
+        return kOwner;
     }
     for (int i = 0; i < static_cast<int>(participants_.size()); ++i) {
         if (participants_[i].identity == view.get()) {
@@ -106,16 +190,15 @@ int LayoutEquations::participantOf(const std::shared_ptr<View>& view, Plan& plan
         }
     }
     const auto superview = view->superview();
-    const int parent = participantOf(superview, plan);
+    const int parent = participantOf(superview);
     Participant participant;
     participant.view = view;
     participant.identity = view.get();
     participant.superview = superview.get();
     participant.parent = parent;
-    participant.width = plan.variables;
+    participant.width = static_cast<VariableId>(2 + 4 * participants_.size());
     participant.isFixed = view->translatesAutoresizingMaskIntoConstraints();
     participant.ownConstraints = LayoutScope::revisionOf(*view);
-    plan.variables += 4;
     readContent(participant, *view);
     participants_.push_back(std::move(participant));
     return static_cast<int>(participants_.size()) - 1;
@@ -132,12 +215,11 @@ std::vector<Term> LayoutEquations::position(int participant, bool isHorizontal) 
 
 /// One side of a constraint. What follows the direction is measured from the edge where reading begins: in a
 /// right-to-left interface that is the owner's width minus the coordinate.
-LayoutEquations::End LayoutEquations::end(const LayoutAnchor& anchor, bool isMirrored, Plan& plan) {
+LayoutEquations::End LayoutEquations::end(const LayoutAnchor& anchor, int p, bool isMirrored) const {
     End end;
-    if (anchor.attribute() == LayoutAttribute::None) {
+    if (p == kNobody) {
         return end;
     }
-    const int p = participantOf(anchor.view(), plan);
     const VariableId width = content(p).width;
     const VariableId height = content(p).height();
     const LayoutAttribute attribute = anchor.attribute();
@@ -183,15 +265,12 @@ LayoutEquations::End LayoutEquations::end(const LayoutAnchor& anchor, bool isMir
     return end;
 }
 
-void LayoutEquations::addConstraint(const LayoutConstraint& constraint, Plan& plan) {
-    if (!isBelowOwner(constraint.first()) || !isBelowOwner(constraint.second())) {
-        hasStrangers_ = true;
-        return;
-    }
+void LayoutEquations::addConstraint(const Mention& mention, Plan& plan) const {
+    const LayoutConstraint& constraint = *mention.constraint;
     const bool isMirrored = rightToLeft_ && (followsDirection(constraint.first().attribute()) ||
                                              followsDirection(constraint.second().attribute()));
-    End first = end(constraint.first(), isMirrored, plan);
-    const End second = end(constraint.second(), isMirrored, plan);
+    End first = end(constraint.first(), mention.first, isMirrored);
+    const End second = end(constraint.second(), mention.second, isMirrored);
     Equation equation;
     equation.terms = std::move(first.terms);
     for (const Term& term : second.terms) {
@@ -236,20 +315,6 @@ void LayoutEquations::addFrame(int participant, Plan& plan) const {
     }
 }
 
-/// What a view says of its own width and height, which its superview's scope solves.
-void LayoutEquations::addOwnSizes(int participant, Plan& plan) {
-    const auto view = participants_[participant].view.lock();
-    if (!view || participants_[participant].ownConstraints == 0) {
-        return;
-    }
-    for (const auto& constraint : view->constraints()) {
-        const auto second = constraint->second().view();
-        if (constraint->first().view() == view && (!second || second == view)) {
-            addConstraint(*constraint, plan);
-        }
-    }
-}
-
 void LayoutEquations::readContent(Participant& participant, View& view) const {
     participant.priorities = view.contentPriorities();
     if (participant.isFixed) {
@@ -279,12 +344,12 @@ bool LayoutEquations::readInputs() {
     return writeInputs();
 }
 
-bool LayoutEquations::readHeightsFor(const Solver& solver) {
+bool LayoutEquations::readHeightsFor(const std::vector<double>& values) {
     bool isWrapped = false;
     const auto read = [&](Participant& participant) {
         const auto view = participant.view.lock();
         if (view && participant.wraps) {
-            participant.lastWidth = std::max(0.0, solver.value(participant.width));
+            participant.lastWidth = std::max(0.0, values[participant.width]);
             readContent(participant, *view);
             isWrapped = true;
         }
@@ -347,37 +412,6 @@ std::string LayoutEquations::nameOf(VariableId variable) {
         return std::string("owner") + kParts[variable];
     }
     return "view" + std::to_string((variable - 2) / 4 + 1) + kParts[(variable - 2) % 4];
-}
-
-std::vector<double> LayoutEquations::signature() const {
-    std::vector<double> signature;
-    signature.reserve(plan_->equations.size() * 8);
-    signature.push_back(plan_->variables);
-    for (const Equation& equation : plan_->equations) {
-        signature.push_back(equation.level);
-        signature.push_back(static_cast<double>(equation.relation) + (equation.isInput ? 8.0 : 0.0));
-        signature.push_back(equation.constant);
-        signature.push_back(static_cast<double>(equation.terms.size()));
-        for (const Term& term : equation.terms) {
-            signature.push_back(term.variable);
-            signature.push_back(term.coefficient);
-        }
-    }
-    for (const Source& source : plan_->contents) {
-        signature.push_back(source.participant);
-        signature.push_back(static_cast<double>(source.equation));
-    }
-    for (const Source& source : plan_->frames) {
-        signature.push_back(source.participant);
-        signature.push_back(static_cast<double>(source.equation));
-    }
-    for (const Baseline& baseline : plan_->baselines) {
-        signature.push_back(baseline.participant);
-        signature.push_back(static_cast<double>(baseline.equation));
-        signature.push_back(baseline.isFirst ? 1.0 : 0.0);
-        signature.push_back(baseline.factor);
-    }
-    return signature;
 }
 
 }  // namespace ktr::platform

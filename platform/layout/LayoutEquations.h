@@ -11,6 +11,8 @@
 
 namespace ktr::platform {
 
+class LayoutStructure;
+
 /// A scope's constraints and content sizes as equations of a solver. What only depends on the kind of view (terms,
 /// relations, levels, the constants that constraints were written with) is the *structure*, equal for all rows of one
 /// class; the other constants are *inputs* that are read from the views each time.
@@ -80,28 +82,37 @@ class LayoutEquations {
         std::vector<Baseline> baselines;
     };
 
-    /// Builds everything anew. `owner` holds the constraints.
-    void build(View& owner, const std::vector<std::shared_ptr<LayoutConstraint>>& constraints, bool rightToLeft);
+    /// Reads everything anew and gives the structure that it shares with its likes. `owner` holds the constraints.
+    std::shared_ptr<LayoutStructure> build(View& owner,
+                                           const std::vector<std::shared_ptr<LayoutConstraint>>& constraints,
+                                           bool rightToLeft);
+    bool isRightToLeft() const { return rightToLeft_; }
     /// Whether the views are still those that the equations were built for; false asks for a new build.
     bool isCurrent(View& owner, bool rightToLeft) const;
     /// Reads the inputs from the views; true when some changed. The height of wrapped content is read for its last
     /// known width.
     bool readInputs();
     /// Tells the widths that were solved; true when a wrapped content's height follows with a change of inputs.
-    bool readHeightsFor(const Solver& solver);
+    bool readHeightsFor(const std::vector<double>& values);
 
-    const std::shared_ptr<const Plan>& plan() const { return plan_; }
-    /// Uses an equal plan of another scope instead of its own.
-    void sharePlan(std::shared_ptr<const Plan> plan) { plan_ = std::move(plan); }
     const std::vector<Participant>& participants() const { return participants_; }
     /// By equation: the constant on the right, inputs included.
     const std::vector<double>& constants() const { return constants_; }
     /// "owner.width", "view1.x" ...: views in the order in which constraints mention them.
     static std::string nameOf(VariableId variable);
-    /// Equal for equal plans only.
-    std::vector<double> signature() const;
 
   private:
+    /// A constraint and the participants at its ends.
+    struct Mention {
+        const LayoutConstraint* constraint;
+        int first;
+        int second;
+    };
+    static constexpr int kOwner = -1;
+    static constexpr int kNobody = -2;
+    /// All of them, in the order in which constraints mention views.
+    using Mentions = std::vector<Mention>;
+
     struct End {
         std::vector<Term> terms;
         bool hasBaseline = false;
@@ -109,14 +120,18 @@ class LayoutEquations {
         bool isFirst = false;
     };
 
-    bool isBelowOwner(const LayoutAnchor& anchor) const;
-    int participantOf(const std::shared_ptr<View>& view, Plan& plan);
-    void addConstraint(const LayoutConstraint& constraint, Plan& plan);
-    End end(const LayoutAnchor& anchor, bool isMirrored, Plan& plan);
+    Mentions collect(const std::vector<std::shared_ptr<LayoutConstraint>>& constraints);
+    void mention(const LayoutConstraint& constraint, Mentions& mentions);
+    void mentionOwnSizes(int participant, Mentions& mentions);
+    bool isBelowOwner(const std::shared_ptr<View>& view) const;
+    int participantOf(const std::shared_ptr<View>& view);
+    std::vector<double> signature(const Mentions& mentions) const;
+    std::shared_ptr<const Plan> makePlan(const Mentions& mentions) const;
+    void addConstraint(const Mention& mention, Plan& plan) const;
+    End end(const LayoutAnchor& anchor, int participant, bool isMirrored) const;
     std::vector<Term> position(int participant, bool isHorizontal) const;
     void addContent(int participant, Plan& plan) const;
     void addFrame(int participant, Plan& plan) const;
-    void addOwnSizes(int participant, Plan& plan);
     void readContent(Participant& participant, View& view) const;
     IntrinsicSize contentOf(View& view) const;
     bool writeInputs();

@@ -28,6 +28,7 @@ bool LayoutScope::add(const std::shared_ptr<LayoutConstraint>& constraint) {
         return false;
     }
     constraints_.push_back(constraint);
+    arrangesSubviews_ = arrangesSubviews_ || isAboutOthers(*constraint);
     constraintsChanged();
     return true;
 }
@@ -39,17 +40,21 @@ bool LayoutScope::remove(const LayoutConstraint& constraint) {
         return false;
     }
     constraints_.erase(found);
+    arrangesSubviews_ = std::any_of(constraints_.begin(), constraints_.end(),
+                                    [this](const auto& held) { return isAboutOthers(*held); });
     constraintsChanged();
     return true;
 }
 
+/// Whether a constraint mentions another view than the owner.
+bool LayoutScope::isAboutOthers(const LayoutConstraint& constraint) const {
+    const auto first = constraint.first().view();
+    const auto second = constraint.second().view();
+    return (first && first.get() != &owner_) || (second && second.get() != &owner_);
+}
+
 void LayoutScope::constraintsChanged() {
     ++revision_;
-    arrangesSubviews_ = std::any_of(constraints_.begin(), constraints_.end(), [this](const auto& constraint) {
-        const auto first = constraint->first().view();
-        const auto second = constraint->second().view();
-        return (first && first.get() != &owner_) || (second && second.get() != &owner_);
-    });
     structure_.reset();
     inputChanged(owner_);
 }
@@ -58,14 +63,16 @@ unsigned LayoutScope::revisionOf(const View& view) {
     return view.scope_ ? view.scope_->revision_ : 0;
 }
 
+std::span<const std::shared_ptr<LayoutConstraint>> LayoutScope::constraintsOf(const View& view) {
+    return view.scope_ ? std::span(view.scope_->constraints_) : std::span<const std::shared_ptr<LayoutConstraint>>();
+}
+
 bool LayoutScope::arrangesSubviews(const View& view) {
     return view.scope_ && view.scope_->arrangesSubviews_;
 }
 
 void LayoutScope::invalidate() {
-    isDirty_ = true;
     isFresh_ = false;
-    fittings_.clear();
 }
 
 void LayoutScope::inputChanged(View& view) {
@@ -73,43 +80,48 @@ void LayoutScope::inputChanged(View& view) {
         view.scope_->invalidate();
     }
     view.setNeedsLayout();
-    for (auto above = view.superview(); above; above = above->superview()) {
-        if (above->scope_) {
-            above->scope_->invalidate();
+    for (View* below = &view; below->superview_; below = below->superview_) {
+        View& above = *below->superview_;
+        if (above.scope_) {
+            above.scope_->invalidate();
         }
-        above->setNeedsLayout();
+        above.subviewInputChanged(*below);
+        above.setNeedsLayout();
     }
 }
 
-/// Brings equations and inputs up to date; true when something changed.
-bool LayoutScope::prepare() {
+/// Brings equations and inputs up to date. What answered for other inputs is forgotten.
+void LayoutScope::prepare() {
     const bool rightToLeft = interfaceIsRightToLeft();
-    if (structure_ && equations_.isCurrent(owner_, rightToLeft)) {
-        return equations_.readInputs();
+    if (isFresh_ && structure_ && equations_.isRightToLeft() == rightToLeft) {
+        return;
     }
-    std::erase_if(constraints_, [](const auto& constraint) { return constraint->isOrphaned(); });
-    equations_.build(owner_, constraints_, rightToLeft);
-    structure_ = LayoutStructures::find(equations_);
-    equations_.sharePlan(structure_->plan());
-    return true;
+    isFresh_ = true;
+    if (structure_ && equations_.isCurrent(owner_, rightToLeft)) {
+        if (!equations_.readInputs()) {
+            return;
+        }
+    } else {
+        std::erase_if(constraints_, [](const auto& constraint) { return constraint->isOrphaned(); });
+        structure_ = equations_.build(owner_, constraints_, rightToLeft);
+    }
+    isDirty_ = true;
+    fittings_.clear();
 }
 
-Solver& LayoutScope::solved(Size target, double horizontalLevel, double verticalLevel) {
+const std::vector<double>& LayoutScope::solved(Size target, double horizontalLevel, double verticalLevel) {
     ++solves_;
-    Solver* solver = &structure_->solved(equations_.constants(), target, horizontalLevel, verticalLevel);
-    for (int round = 1; round < kRounds && equations_.readHeightsFor(*solver); ++round) {
-        solver = &structure_->solved(equations_.constants(), target, horizontalLevel, verticalLevel);
+    const auto* values = &structure_->solved(equations_.constants(), target, horizontalLevel, verticalLevel);
+    for (int round = 1; round < kRounds && equations_.readHeightsFor(*values); ++round) {
+        values = &structure_->solved(equations_.constants(), target, horizontalLevel, verticalLevel);
     }
-    return *solver;
+    return *values;
 }
 
 void LayoutScope::layout() {
     const Size size = owner_.frame().size();
-    const bool isChanged = prepare();
-    if (isChanged) {
-        fittings_.clear();
-    }
-    if (!isChanged && !isDirty_ && size == laidOut_) {
+    prepare();
+    if (!isDirty_ && size == laidOut_) {
         return;
     }
     isDirty_ = false;
@@ -117,22 +129,18 @@ void LayoutScope::layout() {
     apply(solved(size, Solver::kInput, Solver::kInput));
 }
 
-void LayoutScope::apply(const Solver& solver) const {
+void LayoutScope::apply(const std::vector<double>& values) const {
     for (const LayoutEquations::Participant& participant : equations_.participants()) {
         const auto view = participant.view.lock();
         if (view && !participant.isFixed) {
-            view->setFrame({solver.value(participant.x()), solver.value(participant.y()),
-                            std::max(0.0, solver.value(participant.width)),
-                            std::max(0.0, solver.value(participant.height()))});
+            view->setFrame({values[participant.x()], values[participant.y()], std::max(0.0, values[participant.width]),
+                            std::max(0.0, values[participant.height()])});
         }
     }
 }
 
 Size LayoutScope::fittingSize(Size target, double horizontalPriority, double verticalPriority) {
-    if (!isFresh_ && prepare()) {
-        invalidate();
-    }
-    isFresh_ = true;
+    prepare();
     for (const Fitting& known : fittings_) {
         if (known.target == target && known.horizontalPriority == horizontalPriority &&
             known.verticalPriority == verticalPriority) {
@@ -141,9 +149,9 @@ Size LayoutScope::fittingSize(Size target, double horizontalPriority, double ver
     }
     const double horizontalLevel = std::clamp(horizontalPriority, 1.0, kRequiredPriority);
     const double verticalLevel = std::clamp(verticalPriority, 1.0, kRequiredPriority);
-    const Solver& solver = solved(target, horizontalLevel, verticalLevel);
-    const Size size = {std::max(0.0, solver.value(LayoutEquations::kOwnerWidth)),
-                       std::max(0.0, solver.value(LayoutEquations::kOwnerHeight))};
+    const std::vector<double>& values = solved(target, horizontalLevel, verticalLevel);
+    const Size size = {std::max(0.0, values[LayoutEquations::kOwnerWidth]),
+                       std::max(0.0, values[LayoutEquations::kOwnerHeight])};
     if (fittings_.size() == kRememberedFittings) {
         fittings_.erase(fittings_.begin());
     }
@@ -153,8 +161,8 @@ Size LayoutScope::fittingSize(Size target, double horizontalPriority, double ver
 
 std::string LayoutScope::dump() {
     prepare();
-    const Solver& solver = solved(owner_.frame().size(), Solver::kInput, Solver::kInput);
-    return solver.dump(LayoutEquations::nameOf);
+    solved(owner_.frame().size(), Solver::kInput, Solver::kInput);
+    return structure_->dump(equations_.constants(), owner_.frame().size());
 }
 
 }  // namespace ktr::platform

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <span>
 #include <string>
 #include <vector>
 
@@ -40,6 +41,7 @@ class KTR_API LayoutScope {
     static void inputChanged(View& view);
     /// Grows whenever the constraints that a view holds change; 0 for a view that never held one.
     static unsigned revisionOf(const View& view);
+    static std::span<const std::shared_ptr<LayoutConstraint>> constraintsOf(const View& view);
     /// Whether a view holds constraints about views below it.
     static bool arrangesSubviews(const View& view);
 
@@ -51,9 +53,10 @@ class KTR_API LayoutScope {
         Size size;
     };
     void constraintsChanged();
-    bool prepare();
-    Solver& solved(Size target, double horizontalLevel, double verticalLevel);
-    void apply(const Solver& solver) const;
+    bool isAboutOthers(const LayoutConstraint& constraint) const;
+    void prepare();
+    const std::vector<double>& solved(Size target, double horizontalLevel, double verticalLevel);
+    void apply(const std::vector<double>& values) const;
 
     View& owner_;
     std::vector<std::shared_ptr<LayoutConstraint>> constraints_;
@@ -64,7 +67,7 @@ class KTR_API LayoutScope {
     bool arrangesSubviews_ = false;
     Size laidOut_{-1.0, -1.0};
     bool isDirty_ = true;   // the views are not placed for the present inputs
-    bool isFresh_ = false;  // no input was reported to have changed since the inputs were read for a fitting
+    bool isFresh_ = false;  // no input was reported to have changed since the inputs were read
     int solves_ = 0;
 };
 

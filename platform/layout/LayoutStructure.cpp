@@ -1,15 +1,21 @@
 #include "platform/layout/LayoutStructure.h"
 
+#include <algorithm>
 #include <bit>
 
 #include "platform/base/Platform.h"
 
 namespace ktr::platform {
 
-Solver& LayoutStructure::solver(double horizontalLevel, double verticalLevel) {
-    for (const Configuration& configuration : configurations_) {
-        if (configuration.horizontalLevel == horizontalLevel && configuration.verticalLevel == verticalLevel) {
-            return *configuration.solver;
+namespace {
+// Rows of one class differ in which of their texts are cut: more kinds than these are solved each time.
+constexpr std::size_t kMostForms = 8;
+}  // namespace
+
+LayoutStructure::Configuration& LayoutStructure::configuration(double horizontalLevel, double verticalLevel) {
+    for (Configuration& known : configurations_) {
+        if (known.horizontalLevel == horizontalLevel && known.verticalLevel == verticalLevel) {
+            return known;
         }
     }
     auto solver = std::make_unique<Solver>();
@@ -25,30 +31,58 @@ Solver& LayoutStructure::solver(double horizontalLevel, double verticalLevel) {
     for (const LayoutEquations::Equation& equation : plan_->equations) {
         solver->add(equation.terms, equation.relation, equation.constant, equation.level, equation.isInput);
     }
-    configurations_.push_back({horizontalLevel, verticalLevel, std::move(solver)});
-    return *configurations_.back().solver;
+    configurations_.push_back({horizontalLevel, verticalLevel, std::move(solver), {}});
+    return configurations_.back();
 }
 
-Solver& LayoutStructure::solved(const std::vector<double>& constants, Size target, double horizontalLevel,
-                                double verticalLevel) {
-    Solver& solver = this->solver(horizontalLevel, verticalLevel);
-    solver.setConstant(0, target.width);
-    solver.setConstant(1, target.height);
-    for (std::size_t i = 0; i < constants.size(); ++i) {
-        if (plan_->equations[i].isInput) {
-            solver.setConstant(static_cast<ConstraintId>(i + 2), constants[i]);
+/// Gives the solver the inputs; its other constants are the plan's.
+void LayoutStructure::load(Solver& solver) const {
+    for (ConstraintId id = 0; id < constants_.size(); ++id) {
+        if (id < 2 || plan_->equations[id - 2].isInput) {
+            solver.setConstant(id, constants_[id]);
         }
     }
     solver.solve(LayoutEquations::nameOf);
-    return solver;
 }
 
-std::shared_ptr<LayoutStructure> LayoutStructures::find(const LayoutEquations& equations) {
+const std::vector<double>& LayoutStructure::solved(const std::vector<double>& constants, Size target,
+                                                   double horizontalLevel, double verticalLevel) {
+    Configuration& asked = configuration(horizontalLevel, verticalLevel);
+    constants_.assign({target.width, target.height});
+    constants_.insert(constants_.end(), constants.begin(), constants.end());
+    for (auto form = asked.forms.begin(); form != asked.forms.end(); ++form) {
+        if (form->evaluate(constants_, values_)) {
+            std::rotate(asked.forms.begin(), form, form + 1);
+            return values_;
+        }
+    }
+    load(*asked.solver);
+    values_.resize(plan_->variables);
+    for (VariableId variable = 0; variable < plan_->variables; ++variable) {
+        values_[variable] = asked.solver->value(variable);
+    }
+    if (auto form = asked.solver->form()) {
+        if (asked.forms.size() == kMostForms) {
+            asked.forms.pop_back();
+        }
+        asked.forms.insert(asked.forms.begin(), std::move(*form));
+    }
+    return values_;
+}
+
+std::string LayoutStructure::dump(const std::vector<double>& constants, Size size) {
+    constants_.assign({size.width, size.height});
+    constants_.insert(constants_.end(), constants.begin(), constants.end());
+    Solver& solver = *configuration(Solver::kInput, Solver::kInput).solver;
+    load(solver);
+    return solver.dump(LayoutEquations::nameOf);
+}
+
+std::shared_ptr<LayoutStructure> LayoutStructures::find(std::vector<double> signature, const MakePlan& makePlan) {
     const auto structures = shared<LayoutStructures>();
     if (!structures) {
-        return std::make_shared<LayoutStructure>(equations.plan());
+        return std::make_shared<LayoutStructure>(makePlan());
     }
-    std::vector<double> signature = equations.signature();
     std::uint64_t hash = signature.size();
     for (const double number : signature) {
         hash = (hash ^ std::bit_cast<std::uint64_t>(number)) * 0x9E3779B97F4A7C15ULL;
@@ -69,7 +103,7 @@ std::shared_ptr<LayoutStructure> LayoutStructures::find(const LayoutEquations& e
         std::erase_if(entries, [](const auto& entry) { return entry.second.structure.expired(); });
         structures->sweepAt_ = 64 + 2 * entries.size();
     }
-    auto structure = std::make_shared<LayoutStructure>(equations.plan());
+    auto structure = std::make_shared<LayoutStructure>(makePlan());
     entries.emplace(hash, Entry{std::move(signature), structure});
     return structure;
 }

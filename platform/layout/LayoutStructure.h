@@ -1,45 +1,58 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <memory>
+#include <string>
 #include <unordered_map>
 #include <vector>
 
 #include "platform/layout/LayoutEquations.h"
+#include "platform/layout/SolvedForm.h"
 #include "platform/layout/Solver.h"
 
 namespace ktr::platform {
 
 /// The solvers of all scopes with one plan. A scope loads its inputs, solves, and reads the answer at once: the
 /// elimination that the first one paid for serves them all, and no scope keeps a tableau. Since an answer depends on
-/// the constraints alone, it does not matter whose inputs were loaded before.
+/// the constraints alone, it does not matter whose inputs were loaded before. Answers are kept as sums of the inputs
+/// (SolvedForm): for inputs that one of them holds for, the solver is not asked at all.
 class LayoutStructure {
   public:
     explicit LayoutStructure(std::shared_ptr<const LayoutEquations::Plan> plan) : plan_(std::move(plan)) {}
 
     const std::shared_ptr<const LayoutEquations::Plan>& plan() const { return plan_; }
-    /// Solved for these constants, the owner's size being wished at these levels (Solver::kInput for a size that is
-    /// assigned). Valid until the next call.
-    Solver& solved(const std::vector<double>& constants, Size target, double horizontalLevel, double verticalLevel);
+    /// The values of the variables for these constants, the owner's size being wished at these levels (Solver::kInput
+    /// for a size that is assigned). Valid until the next call.
+    const std::vector<double>& solved(const std::vector<double>& constants, Size target, double horizontalLevel,
+                                      double verticalLevel);
+    /// The solver's dump for these constants and an assigned size.
+    std::string dump(const std::vector<double>& constants, Size size);
 
   private:
     struct Configuration {
         double horizontalLevel;
         double verticalLevel;
         std::unique_ptr<Solver> solver;
+        /// What the solver found: the last one that fitted comes first.
+        std::vector<SolvedForm> forms;
     };
-    Solver& solver(double horizontalLevel, double verticalLevel);
+    Configuration& configuration(double horizontalLevel, double verticalLevel);
+    void load(Solver& solver) const;
 
     std::shared_ptr<const LayoutEquations::Plan> plan_;
     std::vector<Configuration> configurations_;
+    std::vector<double> constants_;  // the target's two, then the equations'
+    std::vector<double> values_;
 };
 
 /// Finds the structure of a plan. One for each installed platform. Main thread.
 class LayoutStructures {
   public:
     static std::shared_ptr<LayoutStructures> makeShared() { return std::make_shared<LayoutStructures>(); }
-    /// Never none; without an installed platform a structure of its own.
-    static std::shared_ptr<LayoutStructure> find(const LayoutEquations& equations);
+    using MakePlan = std::function<std::shared_ptr<const LayoutEquations::Plan>()>;
+    /// Never none; without an installed platform a structure of its own. The plan is made when the signature is new.
+    static std::shared_ptr<LayoutStructure> find(std::vector<double> signature, const MakePlan& makePlan);
 
   private:
     struct Entry {

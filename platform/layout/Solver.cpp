@@ -395,6 +395,58 @@ bool Solver::isDropped(ConstraintId id) const {
     return state_.problem->entities[entity].level >= kRequired && state_.miss(entity) != 0.0;
 }
 
+std::optional<SolvedForm> Solver::form() const {
+    const Tableau& t = *state_.tableau;
+    // By entity: a constraint that carries its constant, and what the constant is multiplied with.
+    std::vector<SolvedForm::Part> sources(state_.problem->entities.size(), {0, 0.0});
+    for (ConstraintId id = 0; id < handles_.size(); ++id) {
+        if (const auto [e, isFlipped] = handles_[id]; e >= 0) {
+            sources[e] = {id, (isFlipped ? -1.0 : 1.0) / state_.problem->entities[e].scale};
+        }
+    }
+    for (int j = 0; j < t.columns(); ++j) {
+        if (state_.values[t.columnEntity(j)] != 0.0) {
+            return std::nullopt;  // a column that is not at zero: the answer is not a sum of constants
+        }
+    }
+    SolvedForm form;
+    const auto addColumn = [&](int j, double factor) {
+        if (const auto& source = sources[t.columnEntity(j)]; factor != 0.0 && source.factor != 0.0) {
+            form.parts_.push_back({source.constraint, factor * source.factor});
+        }
+    };
+    const auto addRow = [&](int e) {
+        for (int j = 0; j < t.columns(); ++j) {
+            addColumn(j, t.at(t.rowOf(e), j));
+        }
+    };
+    const auto end = [&form] { return static_cast<std::uint32_t>(form.parts_.size()); };
+    for (int r = 0; r < t.rows(); ++r) {
+        const int e = t.rowEntity(r);
+        const Side side = state_.sides[e];
+        if (side == Side::Dropped) {
+            return std::nullopt;
+        }
+        if (side == Side::Any) {
+            continue;
+        }
+        addRow(e);
+        if (sources[e].factor != 0.0) {
+            form.parts_.push_back({sources[e].constraint, -sources[e].factor});
+        }
+        form.conditions_.push_back({end(), side == Side::NonNegative, side == Side::NonPositive});
+    }
+    for (const int variable : state_.problem->variables) {
+        if (t.isRow(variable)) {
+            addRow(variable);
+        } else {
+            addColumn(t.columnOf(variable), 1.0);
+        }
+        form.variables_.push_back({end(), true, true});
+    }
+    return form;
+}
+
 int Solver::steps() const {
     return state_.tableau->exchanges();
 }

@@ -2,12 +2,14 @@
 
 #include <cstdint>
 #include <functional>
+#include <optional>
 #include <span>
 #include <string>
 #include <vector>
 
 #include "platform/base/Api.h"
 #include "platform/layout/LinearExpression.h"
+#include "platform/layout/SolvedForm.h"
 #include "platform/layout/SolverState.h"
 
 namespace ktr::platform {
@@ -64,6 +66,10 @@ class KTR_API Solver {
     double error(ConstraintId id) const;
     /// Whether the last solve dropped it (levels 1000 and above only).
     bool isDropped(ConstraintId id) const;
+
+    /// The last solve's answer as sums of the constants; none where it is more than that (a required constraint was
+    /// dropped, say). Holds until a constraint or a variable comes or goes.
+    std::optional<SolvedForm> form() const;
 
     /// Counts the tableau's exchange steps, now and then from 0 again: what a solve added is what it cost.
     int steps() const;

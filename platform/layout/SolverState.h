@@ -49,7 +49,8 @@ struct SolverState {
 
     /// What counts as zero for this entity's value. Points beyond a millionth are noise; a sum of huge numbers carries
     /// its own rounding, a few hundred units in the last place.
-    double tolerance(int entity) const { return 1e-9 + 1e-13 * magnitudes[entity]; }
+    double tolerance(int entity) const { return toleranceFor(magnitudes[entity]); }
+    static double toleranceFor(double magnitude) { return 1e-9 + 1e-13 * magnitude; }
 
     /// By how much the entity is missed, signed and scaled: 0 when it is met.
     double miss(int entity) const {

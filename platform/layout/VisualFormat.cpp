@@ -3,6 +3,7 @@
 #include <cmath>
 
 #include "platform/base/Log.h"
+#include "platform/base/Platform.h"
 #include "platform/layout/VisualFormatParser.h"
 #include "platform/ui/View.h"
 
@@ -225,6 +226,49 @@ class Builder {
     VisualFormatResult result_;
 };
 
+/// The formats of programs, taken apart once. One for each installed platform. Main thread.
+class KnownFormats {
+  public:
+    struct Format {
+        std::string text;  // the syntax points into it
+        std::optional<Syntax> syntax;
+        std::optional<VisualFormatError> error;
+    };
+
+    static std::shared_ptr<KnownFormats> makeShared() { return std::make_shared<KnownFormats>(); }
+
+    static std::shared_ptr<const Format> parsed(std::string_view text) {
+        const auto known = shared<KnownFormats>();
+        if (!known) {
+            return parse(text);
+        }
+        if (const auto found = known->formats_.find(text); found != known->formats_.end()) {
+            return found->second;
+        }
+        if (known->formats_.size() == kMost) {
+            known->formats_.clear();
+        }
+        auto format = parse(text);
+        known->formats_.emplace(format->text, format);
+        return format;
+    }
+
+  private:
+    // A program has a few dozen formats; a text that changes with each call must not fill the memory.
+    static constexpr std::size_t kMost = 256;
+
+    static std::shared_ptr<const Format> parse(std::string_view text) {
+        auto format = std::make_shared<Format>();
+        format->text = text;
+        VisualFormatParser parser(format->text);
+        format->syntax = parser.parse();
+        format->error = parser.error();
+        return format;
+    }
+
+    std::map<std::string, std::shared_ptr<const Format>, std::less<>> formats_;
+};
+
 }  // namespace
 
 std::string VisualFormatError::message() const {
@@ -233,12 +277,11 @@ std::string VisualFormatError::message() const {
 
 VisualFormatResult VisualFormat::parse(std::string_view format, VisualFormatOptions options,
                                        const VisualFormatMetrics& metrics, const VisualFormatViews& views) {
-    VisualFormatParser parser(format);
-    const auto syntax = parser.parse();
-    if (!syntax) {
-        return {{}, parser.error()};
+    const auto known = KnownFormats::parsed(format);
+    if (!known->syntax) {
+        return {{}, known->error};
     }
-    return Builder(format, *syntax, options, metrics, views).build();
+    return Builder(known->text, *known->syntax, options, metrics, views).build();
 }
 
 std::vector<std::shared_ptr<LayoutConstraint>> VisualFormat::constraintsWithVisualFormat(

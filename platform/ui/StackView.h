@@ -34,11 +34,30 @@ class KTR_API StackView : public View {
 
   protected:
     void subviewsChanged() override;
+    void subviewInputChanged(const View& subview) override;
+    std::pair<std::size_t, std::size_t> presentedWithin(const Rect& rect) const override;
 
   private:
+    void arrangementChanged();
+    void readHeights(double width);
+    double heightOf(std::size_t index, double width) const;
+
     Axis axis_ = Axis::Vertical;
     std::vector<std::shared_ptr<View>> arranged_;
     std::size_t knownSubviews_ = 0;
+    /// By arranged subview: what it needs at `width_`; kHidden for one that takes no room.
+    std::vector<double> heights_;
+    double width_ = 0.0;
+    double used_ = 0.0;
+    /// Whose heights have to be asked for again: these only, or all.
+    std::vector<const View*> changed_;
+    bool areAllChanged_ = true;
+    /// The first whose place is not known to be right for heights_.
+    std::size_t misplaced_ = 0;
+    /// The last that takes room, which has what room is left.
+    std::size_t last_ = 0;
+    Size placedFor_{-1.0, -1.0};
+    bool hasHidden_ = false;
 };
 
 }  // namespace ktr::platform

