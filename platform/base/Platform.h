@@ -33,6 +33,13 @@ class Device;
 class TextEngine;
 class ImageSource;
 class AssistantAppearance;
+class AccountStore;
+class DeviceInformation;
+class DeviceLock;
+class FriendLocationRestrictions;
+class GeographicSettings;
+class HttpTransport;
+class Preferences;
 
 /// What a host gives the plugin: one implementation of every interface, installed for as long as the plugin runs.
 /// Members that a host leaves empty are the host's error; tests fill what they use. Installing and uninstalling belong
@@ -67,6 +74,13 @@ class KTR_API Platform {
     std::shared_ptr<TextEngine> textEngine;
     std::shared_ptr<ImageSource> images;
     std::shared_ptr<AssistantAppearance> appearance;
+    std::shared_ptr<AccountStore> accounts;
+    std::shared_ptr<DeviceInformation> deviceInformation;
+    std::shared_ptr<DeviceLock> deviceLock;
+    std::shared_ptr<FriendLocationRestrictions> restrictions;
+    std::shared_ptr<GeographicSettings> geographicSettings;
+    std::shared_ptr<Preferences> preferences;
+    std::shared_ptr<HttpTransport> httpTransport;
 
     /// The installed platform, or none. Any thread.
     static std::shared_ptr<Platform> installed();

@@ -25,6 +25,13 @@ PlatformTest::PlatformTest() {
     platform->textEngine = textEngine;
     platform->images = images;
     platform->appearance = appearance;
+    platform->accounts = accounts;
+    platform->deviceInformation = deviceInformation;
+    platform->deviceLock = deviceLock;
+    platform->restrictions = restrictions;
+    platform->geographicSettings = geographicSettings;
+    platform->preferences = preferences;
+    platform->httpTransport = transport;
     platform::Platform::install(platform);
 }
 

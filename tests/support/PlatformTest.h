@@ -13,6 +13,7 @@
 #include "tests/support/Doubles.h"
 #include "tests/support/FixedTextEngine.h"
 #include "tests/support/RecordingLogSink.h"
+#include "tests/support/ServiceDoubles.h"
 
 namespace ktr::test {
 
@@ -53,6 +54,13 @@ class PlatformTest : public ::testing::Test {
     std::shared_ptr<FakeDistanceCalculators> distances = std::make_shared<FakeDistanceCalculators>();
     std::shared_ptr<FakeLocationManagers> locationManagers = std::make_shared<FakeLocationManagers>();
     std::shared_ptr<UtcCalendar> calendar = std::make_shared<UtcCalendar>();
+    std::shared_ptr<FakeAccounts> accounts = std::make_shared<FakeAccounts>();
+    std::shared_ptr<FakeDeviceInformation> deviceInformation = std::make_shared<FakeDeviceInformation>();
+    std::shared_ptr<FakeDeviceLock> deviceLock = std::make_shared<FakeDeviceLock>();
+    std::shared_ptr<FakeRestrictions> restrictions = std::make_shared<FakeRestrictions>();
+    std::shared_ptr<FakeGeographicSettings> geographicSettings = std::make_shared<FakeGeographicSettings>();
+    std::shared_ptr<FakePreferences> preferences = std::make_shared<FakePreferences>();
+    std::shared_ptr<FakeHttpTransport> transport = std::make_shared<FakeHttpTransport>();
 
   protected:
     void TearDown() override;

@@ -1,0 +1,7 @@
+#include "platform/client/HttpTransport.h"
+
+namespace ktr::platform {
+
+HttpTransport::~HttpTransport() = default;
+
+}  // namespace ktr::platform

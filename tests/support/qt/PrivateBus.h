@@ -1,0 +1,71 @@
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <QCoreApplication>
+#include <QDBusConnection>
+#include <QDBusMessage>
+#include <QDBusVirtualObject>
+#include <QDeadlineTimer>
+#include <QEventLoop>
+#include <QProcess>
+#include <QString>
+#include <functional>
+
+namespace ktr::test {
+
+/// Runs the event loop until the condition holds; false after ten seconds.
+inline bool eventually(const std::function<bool()>& condition) {
+    const QDeadlineTimer deadline(10000);
+    while (!condition()) {
+        if (deadline.hasExpired()) {
+            return false;
+        }
+        QCoreApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents, 20);
+    }
+    return true;
+}
+
+/// A message bus of the test's own.
+class PrivateBus {
+  public:
+    PrivateBus() {
+        daemon_.start(QStringLiteral("dbus-daemon"),
+                      {QStringLiteral("--session"), QStringLiteral("--nofork"), QStringLiteral("--print-address=1")});
+        if (daemon_.waitForStarted(10000) && daemon_.waitForReadyRead(10000)) {
+            address_ = QString::fromUtf8(daemon_.readLine()).trimmed();
+        }
+        EXPECT_FALSE(address_.isEmpty()) << "dbus-daemon does not start";
+    }
+    ~PrivateBus() {
+        daemon_.kill();
+        daemon_.waitForFinished();
+    }
+    PrivateBus(const PrivateBus&) = delete;
+    PrivateBus& operator=(const PrivateBus&) = delete;
+
+    /// A connection of its own; names are used once.
+    QDBusConnection connect(const QString& name) const { return QDBusConnection::connectToBus(address_, name); }
+    const QString& address() const { return address_; }
+    static void disconnect(const QString& name) { QDBusConnection::disconnectFromBus(name); }
+
+  private:
+    QProcess daemon_;
+    QString address_;
+};
+
+/// A service whose objects all answer through one function; what that leaves unanswered is an error to the caller.
+class FakeService : public QDBusVirtualObject {
+  public:
+    using Answer = std::function<bool(const QDBusMessage&, const QDBusConnection&)>;
+    explicit FakeService(Answer answer) : answer_(std::move(answer)) {}
+    QString introspect(const QString&) const override { return {}; }
+    bool handleMessage(const QDBusMessage& message, const QDBusConnection& connection) override {
+        return answer_(message, connection);
+    }
+
+  private:
+    Answer answer_;
+};
+
+}  // namespace ktr::test
