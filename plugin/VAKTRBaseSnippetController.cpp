@@ -23,6 +23,13 @@ constexpr double kMillisecondsASecond = 1000.0;
 
 }  // namespace
 
+VAKTRBaseSnippetController::~VAKTRBaseSnippetController() {
+    if (refreshController_) {
+        refreshController_->cancelTimer();
+        refreshController_->setDelegate({});
+    }
+}
+
 bool VAKTRBaseSnippetController::initWithCueObject(const std::shared_ptr<platform::VASnippet>& snippet) {
     if (!init()) {
         return false;
@@ -52,10 +59,15 @@ void VAKTRBaseSnippetController::setDelegate(const std::shared_ptr<platform::Sni
     if (const auto maps = platform::shared<platform::MapLocationManager>()) {
         maps->setEffectiveBundle(bundle);
     }
-    refreshController_ = platform::create<RefreshController>(&RefreshController::initWithBundle, bundle);
+    const auto refresher = platform::create<RefreshController>(&RefreshController::initWithBundle, bundle);
+    // The new one is in place when the old one goes: its teardown still tells this controller.
+    auto old = std::exchange(refreshController_, refresher);
+    refresher->setDelegate(platform::weak(this));
+    old.reset();
     if (contextDict_) {
         refreshInterval_ = ContextValues::number(*contextDict_, "minCallbackIntervalInMS") / kMillisecondsASecond;
         timeoutInterval_ = ContextValues::number(*contextDict_, "callbackTimeoutIntervalInMS") / kMillisecondsASecond;
+        refresher->beginTimerWithRefresh(refreshInterval_, timeoutInterval_);
     }
 }
 
@@ -80,6 +92,9 @@ void VAKTRBaseSnippetController::updateViewConstraints() {
 
 void VAKTRBaseSnippetController::viewWillAppear(bool animated) {
     HostSnippetViewController::viewWillAppear(animated);
+    if (const auto refresher = refreshController_) {
+        refresher->beginTimerWithRefresh(refreshInterval_, timeoutInterval_);
+    }
     startReloadTimer();
 }
 
@@ -103,6 +118,9 @@ void VAKTRBaseSnippetController::startReloadTimer() {
 
 void VAKTRBaseSnippetController::viewWillDisappear(bool animated) {
     HostSnippetViewController::viewWillDisappear(animated);
+    if (const auto refresher = refreshController_) {
+        refresher->cancelTimer();
+    }
     if (reloadTimer_) {
         reloadTimer_->invalidate();
         reloadTimer_ = nullptr;
@@ -129,8 +147,16 @@ std::shared_ptr<platform::HeaderItem> VAKTRBaseSnippetController::sashItem() {
 
 void VAKTRBaseSnippetController::reloadData() {}
 
-void VAKTRBaseSnippetController::locationsUpdated(const std::shared_ptr<const platform::LocationList>& locations) {
-    setLocations(locations);
+void VAKTRBaseSnippetController::locationsUpdated(const std::shared_ptr<const ServiceResult>& result) {
+    const auto objects = std::make_shared<platform::LocationList>();
+    if (result) {
+        objects->reserve(result->size());
+        for (const ResultItem& item : *result) {
+            const auto* location = std::get_if<std::shared_ptr<platform::VAKtrLocation>>(&item);
+            objects->push_back(location != nullptr ? *location : nullptr);
+        }
+    }
+    setLocations(objects);
     reloadData();
     viewNeedsResize();
 }

@@ -21,6 +21,7 @@ namespace ktr {
 /// the header, and the ways to the host. A subclass adds its rows in `loadView` and redraws them in `reloadData`. Main
 /// thread.
 class VAKTRBaseSnippetController : public platform::HostSnippetViewController,
+                                   public RefreshControllerDelegate,
                                    public ViewURLHandler,
                                    public FriendViewDelegate {
   public:
@@ -29,12 +30,16 @@ class VAKTRBaseSnippetController : public platform::HostSnippetViewController,
     /// Seconds between two redrawings of a snippet on screen: ages are shown in minutes, half a minute keeps them true.
     static constexpr double kReloadInterval = 30.0;
 
+    /// Ends refreshing, and is not told of it.
+    ~VAKTRBaseSnippetController() override;
+
     /// False when the base cannot be made.
     virtual bool initWithCueObject(const std::shared_ptr<platform::VASnippet>& snippet);
 
     // What the host calls
-    /// Makes a refresh controller for the delegate's location bundle and reads the intervals from the context. None
-    /// leaves what there is running.
+    /// Makes a refresh controller for the delegate's location bundle, and with a context starts it with the context's
+    /// intervals; `viewWillAppear` deliberately starts it once more. A refresh controller from before is let go without
+    /// being cancelled. None leaves what there is running.
     void setDelegate(const std::shared_ptr<platform::SnippetHostDelegate>& delegate) override;
     void loadView() override;
     /// Pins the view's edges to its superview's, with new constraints at every call; nothing without a superview.
@@ -47,10 +52,11 @@ class VAKTRBaseSnippetController : public platform::HostSnippetViewController,
 
     /// Redraws the rows; the base has none.
     virtual void reloadData();
-    /// Fresh locations from the service: redraws, and tells the host.
-    virtual void locationsUpdated(const std::shared_ptr<const platform::LocationList>& locations);
+    /// Fresh locations from the service: redraws, and tells the host. What is no friend's location becomes a record
+    /// without an assistant object.
+    void locationsUpdated(const std::shared_ptr<const ServiceResult>& result) override;
     /// Refreshing has ended. Remembered for the next `reloadData`; nothing is redrawn now.
-    virtual void refreshCancelled();
+    void refreshCancelled() override;
     void viewNeedsResize() override;
     void handleURL(const platform::Url& url) override;
     /// Has the host open the URL; a failure is an error line in the log and nothing else.
@@ -59,7 +65,7 @@ class VAKTRBaseSnippetController : public platform::HostSnippetViewController,
     bool refreshingCancelled() const { return refreshingCancelled_; }
     void setRefreshingCancelled(bool cancelled) { refreshingCancelled_ = cancelled; }
     /// The service's identifier of this conversation, from the context; may be none.
-    virtual std::optional<std::string> clientId() const { return clientId_; }
+    std::optional<std::string> clientId() const override { return clientId_; }
     void setClientId(std::optional<std::string> clientId) { clientId_ = std::move(clientId); }
     /// The friends' records in the assistant's or the service's order. Valid until the next `setLocations`.
     const Locations& locations() const { return locations_; }
@@ -67,11 +73,11 @@ class VAKTRBaseSnippetController : public platform::HostSnippetViewController,
     /// an empty list.
     void setLocations(const std::shared_ptr<const platform::LocationList>& locations);
     /// The persons whose locations are asked for: one a record, records without a person left out.
-    virtual std::vector<std::shared_ptr<platform::VAPerson>> friends() const;
+    std::vector<std::shared_ptr<platform::VAPerson>> friends() const override;
     /// The first location, whatever it holds, or none. What was stored is not read.
     std::shared_ptr<KTRVALocation> disambiguatedLocation() const;
     void setDisambiguatedLocation(std::shared_ptr<KTRVALocation> location) { storedLocation_ = std::move(location); }
-    virtual std::optional<std::string> proximity() const { return proximity_; }
+    std::optional<std::string> proximity() const override { return proximity_; }
     void setProximity(std::optional<std::string> proximity) { proximity_ = std::move(proximity); }
     std::shared_ptr<platform::StackView> containerView() const { return containerView_; }
     void setContainerView(std::shared_ptr<platform::StackView> container) { containerView_ = std::move(container); }

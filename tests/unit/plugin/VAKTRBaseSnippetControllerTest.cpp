@@ -7,6 +7,7 @@
 #include "tests/support/FakeHost.h"
 #include "tests/support/Friends.h"
 #include "tests/support/PlatformTest.h"
+#include "tests/support/Results.h"
 
 namespace ktr {
 
@@ -225,7 +226,7 @@ TEST_F(VAKTRBaseSnippetControllerTest, DisambiguatedLocation_StoredOneIsNeverRea
 TEST_F(VAKTRBaseSnippetControllerTest, LocationsUpdated_StoresRedrawsAndTellsTheHost) {
     const auto controller = makeController(proximitySnippet({}));
     controller->setDelegate(host_);
-    controller->locationsUpdated(listOf({placedFriend("Ann", "a@example.org")}));
+    controller->locationsUpdated(test::resultOf(listOf({placedFriend("Ann", "a@example.org")})));
     EXPECT_EQ(controller->locations().size(), 1u);
     EXPECT_EQ(controller->reloads, 1);
     EXPECT_EQ(host_->heightChanges, std::vector<bool>{true});

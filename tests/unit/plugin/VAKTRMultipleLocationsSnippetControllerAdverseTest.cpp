@@ -10,6 +10,7 @@
 #include "tests/support/FakeHost.h"
 #include "tests/support/Friends.h"
 #include "tests/support/PlatformTest.h"
+#include "tests/support/Results.h"
 
 namespace ktr {
 
@@ -210,7 +211,7 @@ TEST_F(VAKTRMultipleLocationsSnippetControllerAdverseTest, Host_DropsControllerW
     layOut(controller, 320.0);
     const std::weak_ptr<Controller> gone = controller;
     host_->whenHeightChanges = [&] { controller = nullptr; };
-    controller->locationsUpdated(listOf({bo()}));
+    controller->locationsUpdated(test::resultOf(listOf({bo()})));
     time->runUntilIdle(1.0);
     EXPECT_TRUE(gone.expired());
 }
@@ -222,7 +223,7 @@ TEST_F(VAKTRMultipleLocationsSnippetControllerAdverseTest, Host_LeavesWhileItsHe
         controller->setDelegate(nullptr);
         controller->viewNeedsResize();
     };
-    controller->locationsUpdated(listOf({bo()}));
+    controller->locationsUpdated(test::resultOf(listOf({bo()})));
     EXPECT_EQ(host_->heightChanges.size(), 1u);
     EXPECT_EQ(controller->friendViews().count("bo@example.org"), 1u);
 }
@@ -230,8 +231,10 @@ TEST_F(VAKTRMultipleLocationsSnippetControllerAdverseTest, Host_LeavesWhileItsHe
 TEST_F(VAKTRMultipleLocationsSnippetControllerAdverseTest, Host_UpdatesAgainWhileTheHeightChanges) {
     const auto controller = makeController({ann()});
     layOut(controller, 320.0);
-    host_->whenHeightChanges = [&] { controller->locationsUpdated(listOf({numbered(1), numbered(2)})); };
-    controller->locationsUpdated(listOf({bo()}));
+    host_->whenHeightChanges = [&] {
+        controller->locationsUpdated(test::resultOf(listOf({numbered(1), numbered(2)})));
+    };
+    controller->locationsUpdated(test::resultOf(listOf({bo()})));
     EXPECT_EQ(controller->friendViews().size(), 2u);
     EXPECT_EQ(controller->containerView()->subviews().size(), 2u);
 }
@@ -253,8 +256,8 @@ TEST_F(VAKTRMultipleLocationsSnippetControllerAdverseTest, Locations_ChangedWhil
     platform->localization = talking;
     const auto controller = makeController({ann(), bo()});
     layOut(controller, 320.0);
-    talking->whenAsked = [&] { controller->locationsUpdated(listOf({numbered(1)})); };
-    controller->locationsUpdated(listOf({friendByEmail("Cy", "cy@example.org"), ann(), numbered(2)}));
+    talking->whenAsked = [&] { controller->locationsUpdated(test::resultOf(listOf({numbered(1)}))); };
+    controller->locationsUpdated(test::resultOf(listOf({friendByEmail("Cy", "cy@example.org"), ann(), numbered(2)})));
     controller->reloadData();
     EXPECT_EQ(controller->friendViews().size(), 1u);
     EXPECT_EQ(controller->containerView()->subviews().size(), 1u);
@@ -331,13 +334,13 @@ TEST_F(VAKTRMultipleLocationsSnippetControllerAdverseTest, ThousandsOfRows_ComeG
     EXPECT_EQ(controller->containerView()->arrangedSubviews().back()->frame().maxY(), kCount * 78.5 + 48.0);
     const auto first = controller->friendViews().at("0@example.org");
 
-    controller->locationsUpdated(listOf({all.rbegin(), all.rend()}));
+    controller->locationsUpdated(test::resultOf(listOf({all.rbegin(), all.rend()})));
     EXPECT_EQ(controller->containerView()->arrangedSubviews()[kCount - 1], first);
-    controller->locationsUpdated(listOf(LocationList(kCount, all[0])));
+    controller->locationsUpdated(test::resultOf(listOf(LocationList(kCount, all[0]))));
     EXPECT_EQ(controller->containerView()->arrangedSubviews().front(), first);
     EXPECT_EQ(controller->containerView()->subviews().size(), 2u);
-    controller->locationsUpdated(listOf({}));
-    controller->locationsUpdated(listOf(numberedUpTo(2)));
+    controller->locationsUpdated(test::resultOf(listOf({})));
+    controller->locationsUpdated(test::resultOf(listOf(numberedUpTo(2))));
     EXPECT_EQ(controller->containerView()->subviews().size(), 3u);
 }
 
@@ -392,7 +395,7 @@ TEST_F(VAKTRMultipleLocationsSnippetControllerAdverseTest, AnySequenceOfUpdates_
                     handles.push_back(handle);
                 }
             }
-            controller->locationsUpdated(listOf(all));
+            controller->locationsUpdated(test::resultOf(listOf(all)));
             expected.update(handles);
             Strings shown;
             for (const auto& view : controller->containerView()->arrangedSubviews()) {
