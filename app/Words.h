@@ -1,13 +1,9 @@
 #pragma once
 
-#include <cstddef>
-#include <string>
-#include <string_view>
+#include "linux/json/Words.h"
 
 namespace ktr::app {
 
-/// A text from outside, fit for one line of a message: in quotes, control characters escaped, malformed UTF-8 replaced,
-/// shortened to about `longest` bytes.
-std::string inQuotes(std::string_view text, std::size_t longest = 60);
+using linux_::inQuotes;
 
 }  // namespace ktr::app

@@ -1,0 +1,45 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace ktr::linux_ {
+
+/// What the configuration file says (docs/configuration.md). A value; the app token is not part of it.
+struct Configuration {
+    struct Account {
+        std::string personId;  ///< never empty
+        std::optional<std::string> userName;
+        std::optional<std::string> host;  ///< with ":port" when the port is not 443
+        /// The domains that commands may be redirected to, besides the host's own; empty: the host's domain alone.
+        std::vector<std::string> domains;
+        /// The file that holds the app token, as an absolute path; none: the Secret Service, then the file "token"
+        /// beside the configuration file.
+        std::optional<std::string> tokenFile;
+        bool operator==(const Account&) const = default;
+    };
+
+    struct Positions {
+        enum class Source { None, GeoClue, Gpsd, Track };
+        Source source = Source::GeoClue;
+        /// Of a track: a GPX file or a scenario; an absolute path.
+        std::string file;
+        std::string gpsdHost = "localhost";
+        int gpsdPort = 2947;
+        bool operator==(const Positions&) const = default;
+    };
+
+    std::optional<Account> account;
+    /// Files with certificates (PEM) that are trusted besides the system's; absolute paths.
+    std::vector<std::string> certificates;
+    std::optional<std::string> language;  ///< the assistant's, BCP 47
+    /// The country of the geographic services: two letters in upper case.
+    std::optional<std::string> geographicCountry;
+    bool friendLocationRestricted = false;
+    bool friendLocationAllowed = true;
+    Positions positions;
+    bool operator==(const Configuration&) const = default;
+};
+
+}  // namespace ktr::linux_

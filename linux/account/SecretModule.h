@@ -1,0 +1,24 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+namespace ktr::linux_ {
+
+/// What libktr-secret.so offers: the user's Secret Service, behind an interface of our own in a module that is loaded
+/// on demand. Nothing thrown leaves it. Any thread but the main thread: a lookup may wait for the user to unlock a
+/// keyring.
+class SecretModule {
+  public:
+    virtual ~SecretModule() = default;
+    /// The secret stored with the attributes application=ktr, person and host. None when there is none; then `error`
+    /// says why, or is empty when the service simply holds no such item. Gives up after `seconds`.
+    virtual std::optional<std::string> lookUp(const std::string& person, const std::string& host, double seconds,
+                                              std::string& error) const = 0;
+};
+
+/// The module's only symbol, of type `SecretModuleEntry`: makes the module's object; null when it cannot be made.
+inline constexpr const char* kSecretModuleEntry = "ktrMakeSecretModule";
+using SecretModuleEntry = SecretModule* (*)();
+
+}  // namespace ktr::linux_

@@ -1,0 +1,94 @@
+#include "linux/account/ConfigurationReader.h"
+
+#include <gtest/gtest.h>
+
+#include "tests/support/TemporaryFolder.h"
+
+namespace ktr::test {
+
+using linux_::Configuration;
+using linux_::ConfigurationReader;
+
+class ConfigurationReaderTest : public ::testing::Test {
+  protected:
+    static Configuration good(const std::string& text) {
+        const auto read = ConfigurationReader::readText(text, "/etc/ktr/config.json");
+        const auto* error = std::get_if<ConfigurationReader::Error>(&read);
+        EXPECT_EQ(error, nullptr) << (error != nullptr ? error->text : "");
+        return error != nullptr ? Configuration() : std::get<Configuration>(read);
+    }
+    static std::string errorOf(const std::string& text) {
+        const auto read = ConfigurationReader::readText(text, "/etc/ktr/config.json");
+        const auto* error = std::get_if<ConfigurationReader::Error>(&read);
+        return error != nullptr ? error->text : "no error";
+    }
+};
+
+TEST_F(ConfigurationReaderTest, MissingFile_IsAnEmptyConfiguration) {
+    const TemporaryFolder folder;
+    const auto read = ConfigurationReader::readFile(folder.path() / "none.json");
+    ASSERT_TRUE(std::holds_alternative<Configuration>(read));
+    EXPECT_EQ(std::get<Configuration>(read), Configuration());
+    EXPECT_EQ(Configuration().positions.source, Configuration::Positions::Source::GeoClue);
+}
+
+TEST_F(ConfigurationReaderTest, EveryMember_IsRead) {
+    const Configuration read = good(R"({
+        "account": {"personId": "1000", "userName": "ann", "host": "localhost:8443", "domains": ["a.example", "b.example"],
+                    "tokenFile": "secret/token"},
+        "certificates": ["ca.pem", "/abs/ca.pem"], "language": "en-GB", "geographicCountry": "GB",
+        "restrictions": {"friendLocationRestricted": true, "friendLocationAllowed": false},
+        "positions": {"source": "track", "file": "walk.gpx", "host": "gps.example", "port": 2948}, "future": 1})");
+    ASSERT_TRUE(read.account.has_value());
+    EXPECT_EQ(read.account->personId, "1000");
+    EXPECT_EQ(read.account->userName, "ann");
+    EXPECT_EQ(read.account->host, "localhost:8443");
+    EXPECT_EQ(read.account->domains, (std::vector<std::string>{"a.example", "b.example"}));
+    EXPECT_EQ(read.account->tokenFile, "/etc/ktr/secret/token");
+    EXPECT_EQ(read.certificates, (std::vector<std::string>{"/etc/ktr/ca.pem", "/abs/ca.pem"}));
+    EXPECT_EQ(read.language, "en-GB");
+    EXPECT_EQ(read.geographicCountry, "GB");
+    EXPECT_TRUE(read.friendLocationRestricted);
+    EXPECT_FALSE(read.friendLocationAllowed);
+    EXPECT_EQ(read.positions.source, Configuration::Positions::Source::Track);
+    EXPECT_EQ(read.positions.file, "/etc/ktr/walk.gpx");
+    EXPECT_EQ(read.positions.gpsdHost, "gps.example");
+    EXPECT_EQ(read.positions.gpsdPort, 2948);
+}
+
+TEST_F(ConfigurationReaderTest, Errors_NameFileAndPlace) {
+    const std::string file = "/etc/ktr/config.json";
+    EXPECT_EQ(errorOf(R"({"account": {"personId": 7}})"),
+              file + ": $.account.personId: expected a text, found a number");
+    EXPECT_EQ(errorOf(R"({"account": {}})"),
+              file + ": $.account.personId: expected the person identifier that the service knows, found nothing");
+    EXPECT_EQ(errorOf(R"({"account": {"personId": "a:b"}})"),
+              file + ": $.account.personId: expected a text without \":\"");
+    EXPECT_EQ(errorOf(R"({"account": {"personId": "a", "domains": ["x", 3]}})"),
+              file + ": $.account.domains[1]: expected a text, found a number");
+    EXPECT_EQ(
+        errorOf(R"({"positions": {"source": "stars"}})"),
+        file + ": $.positions.source: expected one of \"geoclue\", \"gpsd\", \"track\", \"none\", found \"stars\"");
+    EXPECT_EQ(errorOf(R"({"positions": {"port": 70000}})"),
+              file + ": $.positions.port: expected a whole number from 1 to 65535");
+    EXPECT_EQ(errorOf(R"({"restrictions": {"friendLocationAllowed": "no"}})"),
+              file + ": $.restrictions.friendLocationAllowed: expected true or false, found a text");
+    EXPECT_EQ(errorOf("{\n  \"account\": }").rfind(file + ":2:", 0), 0U);
+    EXPECT_EQ(errorOf("[]"), file + ": $: expected an object, found a list");
+}
+
+TEST_F(ConfigurationReaderTest, Host_IsANameWithAPortAndNothingElse) {
+    for (const char* host : {"friends.example", "localhost:1", "127.0.0.1:65535", "[::1]:8443", "[::1]"}) {
+        EXPECT_EQ(good(R"({"account": {"personId": "a", "host": ")" + std::string(host) + "\"}}").account->host, host);
+    }
+    for (const char* host :
+         {"https://friends.example", "friends.example/path", "user@friends.example",
+          "friends.example:", "friends.example:0", "friends.example:65536", "friends.example:8x", ":80", "a b"}) {
+        EXPECT_NE(
+            errorOf(R"({"account": {"personId": "a", "host": ")" + std::string(host) + "\"}}").find("$.account.host"),
+            std::string::npos)
+            << host;
+    }
+}
+
+}  // namespace ktr::test

@@ -1,0 +1,95 @@
+#include "linux/account/ConfiguredAccountStore.h"
+
+#include "tests/support/PlatformTest.h"
+#include "tests/support/TemporaryFolder.h"
+
+namespace ktr::test {
+
+using linux_::ConfiguredAccountStore;
+
+class ConfiguredAccountStoreTest : public PlatformTest {
+  protected:
+    ConfiguredAccountStore store() {
+        return ConfiguredAccountStore(folder.path() / "config.json",
+                                      [this](const std::string& person, const std::string& host, std::string& problem) {
+                                          asked.push_back(person + " " + host);
+                                          problem = secretProblem;
+                                          return secret;
+                                      });
+    }
+    std::string onlyError() {
+        const auto errors = log->texts(platform::LogLevel::Error);
+        EXPECT_EQ(errors.size(), 1U);
+        for (const std::string& line : errors) {
+            expectErrorLine(line);
+        }
+        return errors.empty() ? "" : errors.front();
+    }
+
+    TemporaryFolder folder;
+    std::optional<std::string> secret;
+    std::string secretProblem;
+    std::vector<std::string> asked;
+};
+
+TEST_F(ConfiguredAccountStoreTest, NoFile_NobodyIsSignedIn) {
+    auto signedIn = store();
+    EXPECT_FALSE(signedIn.load());
+    EXPECT_EQ(signedIn.deviceOwnerAccount(), nullptr);
+    EXPECT_TRUE(asked.empty());
+}
+
+TEST_F(ConfiguredAccountStoreTest, SecretService_GoesBeforeTheFile) {
+    folder.write("config.json", R"({"account": {"personId": "7", "userName": "ann", "host": "f.example"}})");
+    folder.write("token", "from the file\n");
+    secret = "from the keyring";
+    auto signedIn = store();
+    EXPECT_TRUE(signedIn.load());
+    EXPECT_FALSE(signedIn.load()) << "nothing changed";
+    const auto account = signedIn.deviceOwnerAccount();
+    ASSERT_NE(account, nullptr);
+    EXPECT_EQ(account->personIdentifier(), "7");
+    EXPECT_EQ(account->userName(), "ann");
+    EXPECT_EQ(account->hostNameOfType(0), "f.example");
+    EXPECT_EQ(account->hostNameOfType(1), std::nullopt);
+    EXPECT_EQ(account->tokenOfType(0), "from the keyring");
+    EXPECT_EQ(account->tokenOfType(1), std::nullopt);
+    EXPECT_EQ(asked.front(), "7 f.example");
+    secret = std::nullopt;
+    EXPECT_TRUE(signedIn.load());
+    EXPECT_EQ(signedIn.deviceOwnerAccount()->tokenOfType(0), "from the file");
+    EXPECT_EQ(account->tokenOfType(0), "from the keyring") << "what was handed out does not change";
+}
+
+TEST_F(ConfiguredAccountStoreTest, NamedTokenFile_IsTheOnlySource) {
+    folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example", "tokenFile": "t"}})");
+    folder.write("t", "mine", 0644);
+    auto signedIn = store();
+    EXPECT_TRUE(signedIn.load());
+    EXPECT_TRUE(asked.empty());
+    EXPECT_EQ(signedIn.deviceOwnerAccount()->tokenOfType(0), std::nullopt);
+    EXPECT_NE(signedIn.problem().find("mode 0644"), std::string::npos);
+    EXPECT_EQ(onlyError(), "account: " + signedIn.problem());
+}
+
+TEST_F(ConfiguredAccountStoreTest, NoTokenAnywhere_SaysWhereItLooked) {
+    folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example"}})");
+    secretProblem = "no bus";
+    auto signedIn = store();
+    EXPECT_TRUE(signedIn.load());
+    EXPECT_NE(signedIn.deviceOwnerAccount(), nullptr);
+    EXPECT_NE(onlyError().find("the Secret Service has none (no bus), and "), std::string::npos);
+}
+
+TEST_F(ConfiguredAccountStoreTest, BrokenConfiguration_LeavesWhatWasRead) {
+    folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example"}})");
+    secret = "s";
+    auto signedIn = store();
+    EXPECT_TRUE(signedIn.load());
+    folder.write("config.json", R"({"account": )");
+    EXPECT_FALSE(signedIn.load());
+    EXPECT_EQ(signedIn.deviceOwnerAccount()->personIdentifier(), "7");
+    EXPECT_NE(onlyError().find("config.json:1:"), std::string::npos);
+}
+
+}  // namespace ktr::test

@@ -1,0 +1,81 @@
+#include "linux/account/LogindLock.h"
+
+#include <QDBusObjectPath>
+#include <QDBusVariant>
+#include <memory>
+
+#include "tests/support/qt/PrivateBus.h"
+
+namespace ktr::test {
+
+using linux_::LogindLock;
+
+class LogindLockTest : public ::testing::Test {
+  protected:
+    LogindLockTest() : service(bus.connect(QStringLiteral("logind"))), client(bus.connect(QStringLiteral("program"))) {}
+    ~LogindLockTest() override {
+        PrivateBus::disconnect(QStringLiteral("logind"));
+        PrivateBus::disconnect(QStringLiteral("program"));
+    }
+
+    void startLogind() {
+        fake = std::make_unique<FakeService>([this](const QDBusMessage& message, const QDBusConnection& connection) {
+            if (message.member() == QLatin1String("GetSessionByPID")) {
+                return connection.send(message.createReply(QVariant::fromValue(QDBusObjectPath(kSession))));
+            }
+            if (message.member() == QLatin1String("Get") && message.path() == kSession) {
+                ++reads;
+                return connection.send(message.createReply(QVariant::fromValue(QDBusVariant(locked))));
+            }
+            return false;
+        });
+        ASSERT_TRUE(service.registerVirtualObject(QStringLiteral("/org/freedesktop/login1"), fake.get(),
+                                                  QDBusConnection::SubPath));
+        ASSERT_TRUE(service.registerService(QStringLiteral("org.freedesktop.login1")));
+    }
+    void announce(bool now) {
+        locked = now;
+        QDBusMessage signal = QDBusMessage::createSignal(kSession, QStringLiteral("org.freedesktop.DBus.Properties"),
+                                                         QStringLiteral("PropertiesChanged"));
+        signal << QStringLiteral("org.freedesktop.login1.Session") << QVariantMap{{QStringLiteral("LockedHint"), now}}
+               << QStringList();
+        ASSERT_TRUE(service.send(signal));
+    }
+
+    const QString kSession = QStringLiteral("/org/freedesktop/login1/session/_31");
+    PrivateBus bus;
+    QDBusConnection service, client;
+    std::unique_ptr<FakeService> fake;
+    bool locked = false;
+    int reads = 0;
+};
+
+TEST_F(LogindLockTest, NoBus_CountsAsWithoutLock) {
+    EXPECT_EQ(LogindLock(QDBusConnection(QStringLiteral("none"))).lockState(), LogindLock::kWithoutLock);
+}
+
+TEST_F(LogindLockTest, Hint_IsReadAndFollowed) {
+    locked = true;
+    startLogind();
+    const LogindLock lock(client);
+    EXPECT_EQ(lock.lockState(), LogindLock::kWithoutLock) << "it does not wait for the bus";
+    EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kLocked; }));
+    announce(false);
+    EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kUnlocked; }));
+    announce(true);
+    EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kLocked; }));
+}
+
+TEST_F(LogindLockTest, LogindThatComesAndGoes_IsFollowed) {
+    const LogindLock lock(client);
+    locked = true;
+    startLogind();
+    EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kLocked; }));
+    ASSERT_TRUE(service.unregisterService(QStringLiteral("org.freedesktop.login1")));
+    EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kWithoutLock; }));
+    locked = false;
+    ASSERT_TRUE(service.registerService(QStringLiteral("org.freedesktop.login1")));
+    EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kUnlocked; }));
+}
+
+}  // namespace ktr::test
