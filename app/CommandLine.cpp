@@ -7,6 +7,7 @@
 
 #include "app/Scenario.h"
 #include "app/Words.h"
+#include "app/serve/ServeArguments.h"
 #include "linux/ui/LinuxDevice.h"
 
 #ifndef KTR_VERSION
@@ -80,6 +81,7 @@ struct Parser {
     CLI::App* show = nullptr;
     CLI::App* render = nullptr;
     CLI::App* describe = nullptr;
+    std::unique_ptr<ServeArguments> serve;
     Options options;
     Words words;
 
@@ -113,6 +115,7 @@ struct Parser {
         for (CLI::App* command : {show, render, describe}) {
             addCommon(*command);
         }
+        serve = std::make_unique<ServeArguments>(app);
         show->footer(kShowExamples);
         render->footer(kRenderExamples);
         describe->footer(kDescribeExamples);
@@ -204,6 +207,11 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
         return Ending{ExitCode::Ok, (asked.empty() ? parser.app.help() : asked.front()->help("ktr")) + "\n"};
     } catch (const CLI::ParseError& error) {
         return misuse(error.what());
+    }
+    if (parser.serve->parsed()) {
+        parser.options.command = Options::Command::Serve;
+        const std::string complaint = parser.serve->read(parser.options.serve);
+        return complaint.empty() ? std::variant<Options, Ending>(parser.options) : misuse(complaint);
     }
     parser.options.command = parser.show->parsed()     ? Options::Command::Show
                              : parser.render->parsed() ? Options::Command::Render

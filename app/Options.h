@@ -5,16 +5,17 @@
 #include <vector>
 
 #include "app/IsoTime.h"
+#include "app/serve/ServeOptions.h"
 #include "platform/ui/Device.h"
 
 namespace ktr::app {
 
 /// What the command line asks for. Members that are none leave the decision to the scenario, then to the session.
 struct Options {
-    enum class Command { Show, Render, Describe };
+    enum class Command { Show, Render, Describe, Serve };
 
     Command command = Command::Show;
-    std::vector<std::string> scenarios;  ///< never empty
+    std::vector<std::string> scenarios;  ///< never empty, but for serve
     std::string output;                  ///< of render: a file ending in .png, .svg or .pdf
     double width = 0.0;                  ///< points; 0: the idiom's own
     double scale = 1.0;                  ///< pixels a point
@@ -27,6 +28,7 @@ struct Options {
     std::optional<bool> dark;
     bool highContrast = false;
     std::string plugin;      ///< empty: looked for
+    ServeOptions serve;      ///< of serve
     bool printUrls = false;  ///< of show: URLs go to the standard output instead of the desktop
 };
 

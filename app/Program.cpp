@@ -12,6 +12,7 @@
 #include "app/Host.h"
 #include "app/RenderCommand.h"
 #include "app/ScenarioReader.h"
+#include "app/serve/ServeCommand.h"
 #include "app/window/ShowCommand.h"
 #include "linux/services/SystemClock.h"
 #include "linux/ui/FontSetup.h"
@@ -165,7 +166,8 @@ ExitCode runProgram(int argc, char** argv) {
         std::fputs(ending->text.c_str(), ending->code == ExitCode::Ok ? stdout : stderr);
         return ending->code;
     }
-    return run(std::get<Options>(parsed), argc, argv);
+    const auto& options = std::get<Options>(parsed);
+    return options.command == Options::Command::Serve ? ServeCommand::run(options.serve) : run(options, argc, argv);
 }
 
 }  // namespace ktr::app

@@ -1,0 +1,42 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "app/serve/Fault.h"
+#include "app/serve/ServedFriend.h"
+#include "platform/base/Value.h"
+
+namespace ktr::app {
+
+/// A moment as the development service sees it.
+struct ServiceMoment {
+    double seconds = 0.0;                ///< since the service's start: what the tracks count
+    double millisecondsSince1970 = 0.0;  ///< what the answers carry
+};
+
+/// What the development service answers, without any network: docs/service-protocol.md. Any thread.
+class LocationService {
+  public:
+    explicit LocationService(FriendsFile file) : file_(std::move(file)) {}
+
+    /// The answer to a get-locations request. None, with the reason in `complaint`, for a request that is not one.
+    std::optional<platform::Dictionary> getLocations(const platform::Dictionary& request, const ServiceMoment& moment,
+                                                     const Fault& fault, std::string& complaint) const;
+    const FriendsFile& file() const { return file_; }
+
+    /// Metres along the geodesic.
+    static double distance(double latitude, double longitude, const Waypoint& place);
+
+  private:
+    struct Asked {
+        std::string handle;  ///< as it was asked for
+        const ServedFriend* person;
+    };
+    std::vector<Asked> friendsAskedFor(const platform::Value::Array& handles) const;
+
+    FriendsFile file_;
+};
+
+}  // namespace ktr::app

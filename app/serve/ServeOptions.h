@@ -1,0 +1,27 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "app/serve/CertificateKind.h"
+#include "app/serve/Fault.h"
+
+namespace ktr::app {
+
+/// What the command line of `ktr serve` asks for.
+struct ServeOptions {
+    int port = 0;             ///< 0: a free one
+    std::string folder;       ///< of certificates and token; empty: "serve" in the state folder
+    std::string friends;      ///< a friends file or a scenario; empty: the demo people
+    std::string faultScript;  ///< a file; empty: none
+    std::vector<Fault> faults;
+    double intervalSeconds = -1.0;  ///< negative: as the friends file says
+    std::string personId = "1000";
+    std::string positions;  ///< for the printed configuration: the user's own track; empty: none
+    bool printConfig = false;
+    std::string writeConfig;  ///< a file; empty: none
+    bool untilStdinCloses = false;
+    CertificateKind certificate = CertificateKind::Good;
+};
+
+}  // namespace ktr::app

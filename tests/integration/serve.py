@@ -1,0 +1,47 @@
+"""Runs `ktr serve` for a test."""
+import os
+import pathlib
+import re
+import signal
+import subprocess
+import tempfile
+
+
+class Service:
+    """The development service, with a folder of its own; a context manager."""
+
+    def __init__(self, program, *options):
+        self.folder = pathlib.Path(tempfile.mkdtemp(prefix="ktr-serve-"))
+        own = [] if "--ca-dir" in options else ["--ca-dir", str(self.folder / "ca")]
+        self.process = subprocess.Popen(
+            [program, "serve", *own, "--until-stdin-closes", *options],
+            stdin=subprocess.PIPE, stdout=subprocess.PIPE, text=True)
+        self.ready = self.process.stdout.readline()
+        found = re.match(r"ready https://localhost:(\d+) (.*)$", self.ready)
+        assert found, f"not ready: {self.ready!r}"
+        self.port = int(found.group(1))
+        self.authority = found.group(2)
+
+    @property
+    def token(self):
+        return (self.folder / "ca" / "token").read_text().strip()
+
+    def end(self, how=signal.SIGTERM):
+        """Ends the service; gives its exit status and the lines that it wrote."""
+        if self.process.poll() is None:
+            if how is None:
+                self.process.stdin.close()
+            else:
+                self.process.send_signal(how)
+        lines = self.process.stdout.read().splitlines()
+        return self.process.wait(timeout=20), lines
+
+    def __enter__(self):
+        return self
+
+    def __exit__(self, *_):
+        self.end()
+        self.process.stdout.close()
+        if self.process.stdin:
+            self.process.stdin.close()
+        subprocess.run(["rm", "-rf", os.fspath(self.folder)], check=True)

@@ -1,0 +1,77 @@
+#include "app/serve/AssistantAnswers.h"
+
+#include <gtest/gtest.h>
+
+#include "app/ScenarioReader.h"
+#include "app/serve/FriendsReader.h"
+#include "platform/assistant/VASnippet.h"
+#include "platform/base/Json.h"
+
+namespace ktr::test {
+
+using app::AssistantAnswers;
+using app::LocationService;
+
+class AssistantAnswersTest : public ::testing::Test {
+  protected:
+    static LocationService demoPeople() {
+        auto read = app::FriendsReader::readFile(KTR_SOURCE_DIR "/resources/service/friends.json");
+        auto* file = std::get_if<app::FriendsFile>(&read);
+        EXPECT_NE(file, nullptr);
+        return LocationService(file != nullptr ? *file : app::FriendsFile());
+    }
+    platform::Dictionary answer(const std::string& question) const {
+        return AssistantAnswers(service).answer(question, {0.0, 1.7e12});
+    }
+    /// The whole names in the snippet; "-" without one.
+    std::string names(const std::string& question) const {
+        const platform::Dictionary turn = answer(question);
+        const platform::Value* snippet = turn.find("snippet");
+        if (snippet == nullptr) {
+            return "-";
+        }
+        std::string names;
+        for (const auto& location : *snippet->dictionary()->find("locations")->array()) {
+            const auto& person = *location.dictionary()->find("friend")->dictionary()->find("object")->dictionary();
+            names += (names.empty() ? "" : ", ") + *person.find("fullName")->string();
+        }
+        return names;
+    }
+    LocationService service = demoPeople();
+};
+
+TEST_F(AssistantAnswersTest, People_AreFoundByName) {
+    EXPECT_EQ(names("Where is Ann?"), "Ann Marsh");
+    EXPECT_EQ(names("where's ann marsh"), "Ann Marsh");
+    EXPECT_EQ(names("ZOFIA"), "Zofia Wrona");
+    EXPECT_EQ(names("find Ann and Otto, please"), "Ann Marsh, Otto Brandt");
+    EXPECT_EQ(names("where is otto@mail.example?"), "Otto Brandt");
+    EXPECT_EQ(names("where is \xE6\xA3\xAE \xE9\x99\xBD\xE6\x96\x97"), "\xE6\xA3\xAE \xE9\x99\xBD\xE6\x96\x97");
+}
+
+TEST_F(AssistantAnswersTest, Several_GetAProximity) {
+    EXPECT_EQ(answer("Where is Ann?").find("snippet")->dictionary()->find("proximity"), nullptr);
+    EXPECT_NE(answer("Where are Ann and Otto?").find("snippet")->dictionary()->find("proximity"), nullptr);
+    EXPECT_EQ(*answer("Who is near me?").find("snippet")->dictionary()->find("proximity")->string(), "nearby");
+    EXPECT_NE(names("Where are my friends?").find("Zofia Wrona"), std::string::npos);
+    EXPECT_EQ(names("Who is near me?").find("Zofia Wrona"), std::string::npos);
+}
+
+TEST_F(AssistantAnswersTest, WhatIsNotUnderstood_GetsASentenceThatHelps) {
+    for (const char* question : {"", "Tell me a joke", "Where is Nobody?", "Tell me when Ann gets home from work"}) {
+        EXPECT_EQ(names(question), "-") << question;
+        EXPECT_NE(answer(question).find("sentence")->string()->find("Where is Ann?"), std::string::npos);
+    }
+}
+
+TEST_F(AssistantAnswersTest, Answer_IsAScenario) {
+    for (const char* question : {"Where is Ann?", "Where are my friends?", "Where is Shirin?"}) {
+        const auto read =
+            app::ScenarioReader(platform::Date{0.0}).readText(platform::writeJson(answer(question)), "answer");
+        const auto* error = std::get_if<app::ScenarioError>(&read);
+        ASSERT_EQ(error, nullptr) << error->text();
+        EXPECT_EQ(std::get<app::Scenario>(read).kind, "VAKtrLocationSnippet");
+    }
+}
+
+}  // namespace ktr::test

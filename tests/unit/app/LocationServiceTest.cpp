@@ -1,0 +1,88 @@
+#include "app/serve/LocationService.h"
+
+#include <gtest/gtest.h>
+
+#include "app/JsonReader.h"
+#include "platform/base/Json.h"
+
+namespace ktr::test {
+
+using app::Fault;
+using app::FriendsFile;
+using app::LocationService;
+using app::ServedFriend;
+using platform::Dictionary;
+
+class LocationServiceTest : public ::testing::Test {
+  protected:
+    static FriendsFile people() {
+        FriendsFile file;
+        ServedFriend ann;
+        ann.emails = {"ann@b.example"};
+        ann.phones = {"+44 1632 960001"};
+        ann.track = {{0.0, 51.5, -2.5, 8.0, "Quay", "Bristol", "ENG", "Work"}};
+        ServedFriend bo;
+        bo.phones = {"+44 1632 960002"};
+        ServedFriend cy;
+        cy.emails = {"cy@b.example"};
+        cy.hidden = true;
+        file.friends = {ann, bo, cy};
+        return file;
+    }
+    std::string answer(const std::string& request, const Fault& fault = {}) const {
+        const auto read = app::JsonReader::read(request);
+        std::string complaint;
+        const auto given = service.getLocations(*std::get<platform::Value>(read).dictionary(), {0.0, 1700000000123.4},
+                                                fault, complaint);
+        return given ? platform::writeJson(*given) : complaint;
+    }
+    LocationService service{people()};
+};
+
+TEST_F(LocationServiceTest, Answer_IsOneEntryAFriendUnderTheMailAddressAskedFor) {
+    EXPECT_EQ(
+        answer(R"({"clientContext": {}, "handles": ["+441632960001", "Ann@b.example", "x@y.example", "+441632960002"],
+                         "serverContext": {"clientId": "c"}})"),
+        R"({"statusCode":200,"serverContext":{"minCallbackIntervalInMS":10000,"callbackTimeoutIntervalInMS":600000,)"
+        R"("clientId":"c"},"locations":{"Ann@b.example":{"status":200,"location":{"latitude":51.5,"longitude":-2.5,)"
+        R"("horizontalAccuracy":8,"timestamp":1700000000123,"streetAddress":"Quay","address":{"locality":"Bristol",)"
+        R"("stateCode":"ENG"},"labels":[{"label":"Work"}]}},"+441632960002":{"status":200,"location":null}},)"
+        R"("emails":["Ann@b.example","+441632960002"]})");
+}
+
+TEST_F(LocationServiceTest, ZeroPosition_CountsAsUnknown) {
+    const std::string known = answer(R"({"clientContext": {}, "handles": ["ann@b.example"],
+        "myLocation": {"latitude": 51.5, "longitude": -2.5}, "requestedLocation": {"latitude": 51.5, "longitude": -2.6}})");
+    EXPECT_NE(known.find(R"("distanceInMeters":"0","match":false)"), std::string::npos) << known;
+    const std::string unknown = answer(R"({"clientContext": {}, "handles": ["ann@b.example"],
+        "myLocation": {"latitude": 0, "longitude": 0}, "requestedLocation": {"latitude": 0, "longitude": 0}})");
+    EXPECT_EQ(unknown.find("distanceInMeters"), std::string::npos);
+    EXPECT_EQ(unknown.find("match"), std::string::npos);
+}
+
+TEST_F(LocationServiceTest, Faults_ChangeStatusIntervalAndEntries) {
+    const std::string request =
+        R"({"clientContext": {}, "handles": ["ann@b.example", "+441632960002", "cy@b.example"]})";
+    EXPECT_NE(answer(request).find(R"("cy@b.example":{"status":411,"location":null})"), std::string::npos);
+    Fault partial;
+    partial.statusCode = 416;
+    EXPECT_EQ(answer(request, partial).rfind(R"({"statusCode":416,)", 0), 0U);
+    EXPECT_NE(answer(request, partial).find(R"("emails":["ann@b.example","+441632960002"]})"), std::string::npos);
+    Fault dropped;
+    dropped.entryStatus = 411;
+    dropped.entry = "+44 1632 960002";
+    dropped.intervalSeconds = 0.0;
+    const std::string given = answer(request, dropped);
+    EXPECT_NE(given.find(R"("+441632960002":{"status":411)"), std::string::npos);
+    EXPECT_NE(given.find(R"("ann@b.example":{"status":200)"), std::string::npos);
+    EXPECT_NE(given.find(R"("minCallbackIntervalInMS":0,)"), std::string::npos);
+}
+
+TEST_F(LocationServiceTest, WrongRequest_IsRefusedWithThePlace) {
+    EXPECT_EQ(answer("{}"), "$.clientContext: expected an object, found nothing");
+    EXPECT_EQ(answer(R"({"clientContext": {}, "handles": [1]})"), "$.handles[0]: expected a string, found a number");
+    EXPECT_EQ(answer(R"({"clientContext": {}, "myLocation": {"latitude": 1}})"),
+              "$.myLocation: expected a latitude and a longitude in degrees");
+}
+
+}  // namespace ktr::test
