@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <vector>
 
 namespace ktr::platform {
@@ -13,7 +14,7 @@ class Tableau {
     int rows() const { return static_cast<int>(rowEntity_.size()); }
     int columns() const { return static_cast<int>(columnEntity_.size()); }
     double at(int row, int column) const { return cells_[row * stride_ + column]; }
-    const double* row(int row) const { return cells_.data() + row * stride_; }
+    const double* row(int row) const { return cells_.data() + static_cast<std::ptrdiff_t>(row) * stride_; }
     int rowEntity(int row) const { return rowEntity_[row]; }
     int columnEntity(int column) const { return columnEntity_[column]; }
     bool isRow(int entity) const { return place_[entity] >= 0; }
