@@ -40,6 +40,13 @@ PlatformTest::~PlatformTest() {
 }
 
 void PlatformTest::TearDown() {
+    // What is still under way ends while the test's own members are there to hear of it.
+    while (transport && !transport->waiting.empty()) {
+        transport->fail(platform::HttpFailure::Cancelled);
+    }
+    if (time) {
+        time->runPosted();
+    }
     for (const auto& text : log->texts(platform::LogLevel::Error)) {
         EXPECT_TRUE(expectedErrors_.contains(text)) << "unexpected error line: " << text;
     }
