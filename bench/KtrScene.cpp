@@ -1,7 +1,9 @@
 #include "bench/KtrScene.h"
 
+#include <QFile>
 #include <QPainter>
 
+#include "linux/ui/PngEncoder.h"
 #include "linux/ui/QtCanvas.h"
 #include "linux/ui/QtImage.h"
 #include "linux/ui/QtTextEngine.h"
@@ -84,7 +86,6 @@ KtrScene::KtrScene() : palette_(linux_::Palette::of(linux_::ColorScheme::Light))
 
 KtrScene::~KtrScene() {
     clear();
-    Platform::install(nullptr);
 }
 
 void KtrScene::installPlatform() {
@@ -174,10 +175,21 @@ void KtrScene::paint(QImage& image, double scale) {
     window_->paint(canvas, window_->bounds());
 }
 
+bool KtrScene::write(const QImage& image, const QString& path) {
+    QFile file(path);
+    const QByteArray data = linux_::encodedAsPng(image);
+    if (data.isEmpty()) {
+        return image.save(path, "PNG");
+    }
+    return file.open(QIODevice::WriteOnly) && file.write(data) == data.size();
+}
+
 void KtrScene::clear() {
     rows_.clear();
     stack_.reset();
     window_.reset();
+    Platform::install(nullptr);
+    platform_.reset();
 }
 
 }  // namespace ktr::bench

@@ -25,6 +25,7 @@ class KtrScene : public Scene {
     double height() const override;
     void paint(QImage& image, double scale) override;
     void clear() override;
+    bool write(const QImage& image, const QString& path) override;
 
   private:
     void installPlatform();

@@ -61,7 +61,7 @@ int writePicture(Scene& scene, const RowsFile& file, const char* path) {
     scene.build(file, file.friends.size(), file.width);
     QImage image = imageFor(scene, file);
     scene.paint(image, file.scale);
-    if (!image.save(QString::fromLocal8Bit(path), "PNG")) {
+    if (!scene.write(image, QString::fromLocal8Bit(path))) {
         std::fprintf(stderr, "%s: cannot be written\n", path);
         return 1;
     }

@@ -22,6 +22,8 @@ class Scene {
     /// Paints everything into an image of the scene's size times `scale`.
     virtual void paint(QImage& image, double scale) = 0;
     virtual void clear() = 0;
+    /// Writes a PNG; false when that fails.
+    virtual bool write(const QImage& image, const QString& path) { return image.save(path, "PNG"); }
 };
 
 /// The command line of a bench program: `--json FILE --png FILE` or `--json FILE --bench MS`.

@@ -149,7 +149,12 @@ void CardShadow::stretch(QPainter& painter, const Blurred& b, const QRectF& shap
         for (std::size_t column = 0; column < 3; ++column) {
             const QRectF target(QPointF(xs[column], ys[row]), QPointF(xs[column + 1], ys[row + 1]));
             const QRectF source(QPointF(from[column], from[row]), QPointF(from[column + 1], from[row + 1]));
-            if (target.width() > 0.0 && target.height() > 0.0) {
+            if (row == 1 && column == 1) {
+                // All of one colour, and as large as the card: stretching a pixel over it would cost more than all
+                // else.
+                const int centre = static_cast<int>(pixels);
+                painter.fillRect(target, b.image.pixelColor(centre, centre));
+            } else if (target.width() > 0.0 && target.height() > 0.0) {
                 painter.drawImage(target, b.image, source);
             }
         }

@@ -141,12 +141,29 @@ void CardView::setFocus(const std::optional<Rect>& rect) {
     }
 }
 
+namespace {
+
+/// The card without what lies far beyond the part that is painted: a shape costs by its height, and a long answer's is
+/// a hundred times the window's. The corners that it has instead are out of sight.
+QRectF visibleCard(linux_::QtCanvas& canvas, QRectF card) {
+    const QPainter& painter = canvas.painter();
+    if (painter.hasClipping()) {
+        constexpr double kBeyond = 2.0 * measures::kCardCorner + 2.0;
+        const QRectF visible = painter.clipBoundingRect();
+        card.setTop(std::max(card.top(), std::min(visible.top(), card.bottom()) - kBeyond));
+        card.setBottom(std::min(card.bottom(), std::max(visible.bottom(), card.top()) + kBeyond));
+    }
+    return card;
+}
+
+}  // namespace
+
 void CardView::draw(Canvas& canvas) const {
     auto* qt = qtCanvas(canvas);
     if (qt == nullptr) {
         return;
     }
-    const QPainterPath shape = roundedPath(toQt(bounds()), measures::kCardCorner);
+    const QPainterPath shape = roundedPath(visibleCard(*qt, toQt(bounds())), measures::kCardCorner);
     fillPath(*qt, shape, qt->palette().card);
     // Holds for everything in the card: the caller restores the canvas when it leaves the card.
     qt->painter().setClipPath(shape, Qt::IntersectClip);

@@ -198,10 +198,13 @@ QFont FontSpec::make() const {
         families.append(FontChoice::baseFamily());
     }
     // Before the text fonts the emoji font would take the digits; after the symbol fonts it would lose its colours.
-    families.append({FontChoice::emojiFamily(), QStringLiteral("Noto Sans Symbols"),
-                     QStringLiteral("Noto Sans Symbols2"), QStringLiteral("Noto Sans Math"),
-                     QStringLiteral("DejaVu Sans"), QStringLiteral("sans-serif")});
-    families.removeDuplicates();
+    families.append(FontChoice::emojiFamily());
+    if (family == FontChoice::baseFamily()) {
+        // Symbols are set in the base family; Qt looks each name up again for each stretch in another family.
+        families.append({QStringLiteral("Noto Sans Symbols"), QStringLiteral("Noto Sans Symbols2"),
+                         QStringLiteral("Noto Sans Math")});
+    }
+    families.append({QStringLiteral("DejaVu Sans"), QStringLiteral("sans-serif")});
     QFont font;
     font.setFamilies(families);
     font.setPixelSize(pixelSize);

@@ -10,6 +10,8 @@
 #include <QSvgGenerator>
 #include <cmath>
 
+#include "linux/ui/PngEncoder.h"
+
 namespace ktr::linux_ {
 
 namespace {
@@ -148,8 +150,9 @@ std::optional<std::string> ScenePainter::write(const std::string& path, const Pa
         if (picture.isNull()) {
             return path + ": there is not enough memory for the picture";
         }
-        QImageWriter writer(&file, "png");
-        if (!writer.write(picture)) {
+        if (const QByteArray data = encodedAsPng(picture); !data.isEmpty()) {
+            file.write(data);  // an error is seen at the commit
+        } else if (QImageWriter writer(&file, "png"); !writer.write(picture)) {
             return failure(path, file.error() != QFileDevice::NoError ? file.errorString() : writer.errorString());
         }
     } else if (format == u"svg") {

@@ -31,7 +31,8 @@ std::shared_ptr<T> strong(T* self) {
 template <class T>
 std::weak_ptr<T> weak(T* self) {
     auto locked = self->weak_from_this().lock();
-    return std::static_pointer_cast<T>(locked);
+    // Moved, not cast: views hand out many of these, and each count is an atomic operation.
+    return locked ? std::shared_ptr<T>(std::move(locked), self) : std::shared_ptr<T>();
 }
 
 /// Creates a T and runs its initialiser in one step; none when the initialiser says no. Initialisers are virtual

@@ -18,6 +18,8 @@ class KTR_API LayoutAnchor {
     LayoutAnchor(std::weak_ptr<View> view, LayoutAttribute attribute) : view_(std::move(view)), attribute_(attribute) {}
 
     std::shared_ptr<View> view() const { return view_.lock(); }
+    /// Whether there is no view, or no longer.
+    bool hasLostView() const { return view_.expired(); }
     LayoutAttribute attribute() const { return attribute_; }
     /// Whether both are about one view (or none).
     bool isSameView(const LayoutAnchor& other) const {

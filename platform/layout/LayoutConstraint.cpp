@@ -102,7 +102,7 @@ bool LayoutConstraint::isEqualTo(const LayoutConstraint& other) const {
 }
 
 bool LayoutConstraint::isOrphaned() const {
-    return !first_.view() || (second_.attribute() != LayoutAttribute::None && !second_.view());
+    return first_.hasLostView() || (second_.attribute() != LayoutAttribute::None && second_.hasLostView());
 }
 
 std::string LayoutConstraint::description() const {

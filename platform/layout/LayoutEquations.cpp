@@ -347,8 +347,8 @@ bool LayoutEquations::readInputs() {
 bool LayoutEquations::readHeightsFor(const std::vector<double>& values) {
     bool isWrapped = false;
     const auto read = [&](Participant& participant) {
-        const auto view = participant.view.lock();
-        if (view && participant.wraps) {
+        const auto view = participant.wraps ? participant.view.lock() : nullptr;
+        if (view) {
             participant.lastWidth = std::max(0.0, values[participant.width]);
             readContent(participant, *view);
             isWrapped = true;

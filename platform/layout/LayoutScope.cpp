@@ -103,6 +103,7 @@ void LayoutScope::prepare() {
         }
     } else {
         std::erase_if(constraints_, [](const auto& constraint) { return constraint->isOrphaned(); });
+        constraints_.shrink_to_fit();
         structure_ = equations_.build(owner_, constraints_, rightToLeft);
     }
     isDirty_ = true;

@@ -4,11 +4,13 @@
 #include <span>
 #include <vector>
 
+#include "platform/base/Api.h"
+
 namespace ktr::platform {
 
 /// One answer of a Solver as sums of its constraints' constants, together with when it is the answer. While the
 /// conditions hold, other constants are answered by a few additions, without the solver.
-class SolvedForm {
+class KTR_API SolvedForm {
   public:
     /// Fills `values`, by variable, from the constants, by ConstraintId; false, with anything in `values`, when this is
     /// not the answer for them.

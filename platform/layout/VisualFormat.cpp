@@ -121,7 +121,8 @@ class Builder {
         }
         if (!connection || connection->empty()) {
             const double standard = isToSuperview ? VisualFormat::kSpaceToSuperview : VisualFormat::kSpaceBetweenViews;
-            add(second, LayoutRelation::Equal, first, connection ? standard : 0.0, kRequiredPriority);
+            add(std::move(second), LayoutRelation::Equal, std::move(first), connection ? standard : 0.0,
+                kRequiredPriority);
             return true;
         }
         for (const Syntax::Predicate& predicate : *connection) {
@@ -208,10 +209,9 @@ class Builder {
                                                              fail(offset, "expected a priority from 1 to 1000"));
     }
 
-    void add(const LayoutAnchor& first, LayoutRelation relation, const LayoutAnchor& second, double constant,
-             double priority) {
+    void add(LayoutAnchor first, LayoutRelation relation, LayoutAnchor second, double constant, double priority) {
         result_.constraints.push_back(
-            std::make_shared<LayoutConstraint>(first, relation, second, 1.0, constant, priority));
+            std::make_shared<LayoutConstraint>(std::move(first), relation, std::move(second), 1.0, constant, priority));
     }
 
     std::string_view text_;

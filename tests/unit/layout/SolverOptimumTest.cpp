@@ -222,6 +222,53 @@ TEST_F(SolverOptimumTest, AfterEdits) {
     }
 }
 
+/// Where an answer that was kept as sums says that it holds for other constants, it is theirs.
+TEST_F(SolverOptimumTest, AnswerAsSums_IsTheBestWhereItHolds) {
+    int held = 0;
+    for (int i = 0; i < kSystems; ++i) {
+        makeSystem();
+        Numbers constants;
+        for (const Row& row : rows) {
+            add(solver, row, row.constant);
+            constants.push_back(row.constant);
+        }
+        solver.solve();
+        const auto form = solver.form();
+        for (int edits = 0; form && edits < 4; ++edits) {
+            const auto k = static_cast<std::size_t>(random.below(static_cast<int>(rows.size())));
+            rows[k].constant = constants[k] = random.below(21) - 10;
+            Numbers x;
+            if (!form->evaluate(constants, x)) {
+                continue;
+            }
+            ++held;
+            const Numbers mine = costOf(rows, x);
+            const Numbers best = costOf(rows, bestCorner(rows, variables));
+            ASSERT_FALSE(isBetter(best, mine) || isBetter(mine, best)) << "system " << i << "\n" << solver.dump();
+        }
+    }
+    EXPECT_GT(held, kSystems / 2);
+}
+
+TEST_F(SolverOptimumTest, AnswerAsSums_HoldsForItsOwnConstants) {
+    for (int i = 0; i < kSystems; ++i) {
+        makeSystem(6, 14);
+        Numbers constants;
+        for (const Row& row : rows) {
+            add(solver, row, row.constant);
+            constants.push_back(row.constant);
+        }
+        solver.solve();
+        Numbers x;
+        if (const auto form = solver.form()) {
+            ASSERT_TRUE(form->evaluate(constants, x)) << solver.dump();
+            for (std::size_t v = 0; v < variables; ++v) {
+                ASSERT_NEAR(x[v], solver.value(static_cast<VariableId>(v)), 1e-9) << solver.dump();
+            }
+        }
+    }
+}
+
 TEST_F(SolverOptimumTest, AfterAddsAndRemoves) {
     for (int i = 0; i < kSystems; ++i) {
         makeSystem();

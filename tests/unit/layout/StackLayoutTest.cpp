@@ -1,8 +1,12 @@
 // Where a stack puts its arranged subviews.
+#include <algorithm>
+#include <random>
+
 #include "platform/layout/LayoutConstraint.h"
 #include "platform/ui/Label.h"
 #include "platform/ui/StackView.h"
 #include "tests/support/PlatformTest.h"
+#include "tests/support/RecordingCanvas.h"
 #include "tests/unit/layout/PrintRect.h"
 
 namespace ktr::test {
@@ -152,6 +156,75 @@ TEST_F(StackLayoutTest, StackInAStack_IsAsHighAsItsContent) {
 TEST_F(StackLayoutTest, Empty_HasNoHeight) {
     stack->layoutIfNeeded();
     EXPECT_EQ(stack->systemLayoutSizeFitting({200, 70}, 1000, 1), (Size{200, 0}));
+}
+
+/// Only what changed is placed again; the outcome is that of a stack that was made so from the start.
+TEST_F(StackLayoutTest, AnyChanges_EndWhereAFreshStackBegins) {
+    std::mt19937 random(20260117);
+    const auto below = [&random](unsigned limit) { return static_cast<std::size_t>(random() % limit); };
+    std::vector<std::shared_ptr<Label>> labels;
+    for (int i = 0; i < 60; ++i) {
+        labels.push_back(label("text"));
+        stack->addArrangedSubview(labels.back());
+    }
+    for (int round = 0; round < 300; ++round) {
+        for (std::size_t changes = below(4); changes > 0; --changes) {
+            const auto& one = labels[below(60)];
+            switch (below(5)) {
+                case 0:
+                    one->setHidden(!one->hidden());
+                    break;
+                case 1:
+                    stack->insertArrangedSubview(one, below(60));
+                    break;
+                case 2:
+                    stack->removeArrangedSubview(one);
+                    break;
+                case 3:
+                    stack->setFrame({5, 5, below(2) == 0 ? 200.0 : 150.0, 10.0 * static_cast<double>(below(100))});
+                    break;
+                default:
+                    one->setText(std::string(1 + below(50), 'x'));
+                    break;
+            }
+        }
+        stack->layoutIfNeeded();
+        const Size fitting = stack->systemLayoutSizeFitting({stack->frame().width, 0}, 1000, 1);
+        double y = 0.0;
+        std::shared_ptr<View> last;
+        for (const auto& view : stack->arrangedSubviews()) {
+            if (view->hidden()) {
+                continue;
+            }
+            const double width = stack->frame().width;
+            const double height = view->systemLayoutSizeFitting({width, 0}, 1000, 1).height;
+            ASSERT_EQ(view->frame().origin(), (Point{0, y})) << "round " << round;
+            ASSERT_EQ(view->frame().width, width) << "round " << round;
+            ASSERT_GE(view->frame().height, height) << "round " << round;
+            y += height;
+            last = view;
+        }
+        ASSERT_EQ(fitting.height, y) << "round " << round;
+        if (last) {
+            ASSERT_DOUBLE_EQ(last->frame().maxY(), std::max(y, stack->frame().height)) << "round " << round;
+        }
+    }
+}
+
+TEST_F(StackLayoutTest, OnlyWhatMayTouchTheDirtyRectangle_IsPainted) {
+    std::vector<std::shared_ptr<Label>> labels;
+    for (int i = 0; i < 100; ++i) {
+        labels.push_back(label("text" + std::to_string(i)));
+        stack->addArrangedSubview(labels.back());
+    }
+    stack->layoutIfNeeded();
+    RecordingCanvas canvas;
+    stack->paint(canvas, {0, 14 * 40 + 1, 200, 14});
+    std::size_t texts = 0;
+    for (const auto& call : canvas.calls) {
+        texts += call.kind == RecordingCanvas::Call::Kind::Text ? 1 : 0;
+    }
+    EXPECT_EQ(texts, 2U);  // what is left of one and the beginning of the next
 }
 
 }  // namespace ktr::test

@@ -1,0 +1,93 @@
+#include "linux/ui/PngEncoder.h"
+
+#include <gtest/gtest.h>
+
+#include <QBuffer>
+#include <QImageWriter>
+#include <QPainter>
+#include <random>
+
+namespace ktr::test {
+
+namespace {
+
+using linux_::encodedAsPng;
+
+QImage painted(QColor background) {
+    QImage image(320, 200, QImage::Format_ARGB32_Premultiplied);
+    image.fill(background);
+    QPainter painter(&image);
+    painter.setRenderHint(QPainter::Antialiasing);
+    painter.setBrush(QColor(200, 30, 90, 128));
+    painter.drawEllipse(QRectF(20.5, 30.25, 140.0, 90.0));
+    painter.drawText(QPointF(30, 150), QStringLiteral("Fish Market"));
+    return image;
+}
+
+/// Soft hills with noise, as a photograph or a map has them.
+QImage photograph() {
+    std::mt19937 random(7);
+    QImage image(200, 150, QImage::Format_RGB32);
+    for (int y = 0; y < image.height(); ++y) {
+        for (int x = 0; x < image.width(); ++x) {
+            const auto noise = static_cast<int>(random() % 3);
+            image.setPixel(x, y, qRgb((x + noise) % 256, (y + x / 2 + noise) % 256, (2 * y + noise) % 256));
+        }
+    }
+    return image;
+}
+
+qsizetype sizeByQt(const QImage& image) {
+    QBuffer buffer;
+    buffer.open(QIODevice::WriteOnly);
+    QImageWriter(&buffer, "png").write(image);
+    return buffer.size();
+}
+
+QImage decoded(const QByteArray& file) {
+    return QImage::fromData(file, "PNG").convertToFormat(QImage::Format_ARGB32_Premultiplied);
+}
+
+}  // namespace
+
+TEST(PngEncoderTest, OpaquePicture_ComesBackAsItWas) {
+    const QImage image = painted(Qt::white);
+    const QByteArray file = encodedAsPng(image);
+    EXPECT_EQ(decoded(file), image);
+    EXPECT_FALSE(QImage::fromData(file, "PNG").hasAlphaChannel());
+}
+
+TEST(PngEncoderTest, TransparentPicture_ComesBackAsQtWouldWriteIt) {
+    const QImage image = painted(QColor(10, 20, 30, 0));
+    const QImage back = QImage::fromData(encodedAsPng(image), "PNG");
+    EXPECT_TRUE(back.hasAlphaChannel());
+    EXPECT_EQ(back.convertToFormat(QImage::Format_ARGB32), image.convertToFormat(QImage::Format_ARGB32));
+}
+
+TEST(PngEncoderTest, Photograph_ComesBackAsItWas_AndIsNotMuchLargerThanQtsFile) {
+    const QImage image = photograph();
+    const QByteArray file = encodedAsPng(image);
+    EXPECT_EQ(decoded(file), image.convertToFormat(QImage::Format_ARGB32_Premultiplied));
+    EXPECT_LE(static_cast<double>(file.size()), 1.5 * static_cast<double>(sizeByQt(image)));
+}
+
+TEST(PngEncoderTest, DrawnPicture_IsNotMuchLargerThanQtsFile) {
+    const QImage image = painted(Qt::white);
+    EXPECT_LE(static_cast<double>(encodedAsPng(image).size()), 1.5 * static_cast<double>(sizeByQt(image)));
+}
+
+TEST(PngEncoderTest, OnePixel_IsAPicture) {
+    QImage image(1, 1, QImage::Format_RGB32);
+    image.fill(Qt::red);
+    EXPECT_EQ(decoded(encodedAsPng(image)).pixelColor(0, 0), QColor(Qt::red));
+}
+
+TEST(PngEncoderTest, SamePicture_IsTheSameFile) {
+    EXPECT_EQ(encodedAsPng(photograph()), encodedAsPng(photograph()));
+}
+
+TEST(PngEncoderTest, NoPicture_IsNoFile) {
+    EXPECT_TRUE(encodedAsPng(QImage()).isEmpty());
+}
+
+}  // namespace ktr::test
