@@ -29,6 +29,7 @@ class Telephony;
 class Geodesy;
 class DistanceCalculatorFactory;
 class LocationManagerFactory;
+class MapPictureSource;
 class Device;
 class TextEngine;
 class ImageSource;
@@ -70,6 +71,7 @@ class KTR_API Platform {
     std::shared_ptr<Geodesy> geodesy;
     std::shared_ptr<DistanceCalculatorFactory> distanceCalculators;
     std::shared_ptr<LocationManagerFactory> locationManagers;
+    std::shared_ptr<MapPictureSource> maps;
     std::shared_ptr<Device> device;
     std::shared_ptr<TextEngine> textEngine;
     std::shared_ptr<ImageSource> images;
