@@ -1,0 +1,89 @@
+#include "linux/maps/MapDrawer.h"
+
+#include <algorithm>
+#include <cmath>
+#include <exception>
+
+#include "linux/maps/MapStyle.h"
+#include "platform/base/Log.h"
+
+namespace ktr::linux_ {
+
+namespace {
+
+/// The longest side of a picture, in points and in pixels: 64 MiB at most.
+constexpr double kLongestSide = 4096.0;
+constexpr double kHighestZoom = 24.0;
+constexpr double kLastLatitude = 85.05112877980659;
+
+double within(double value, double lowest, double highest, double otherwise) {
+    return std::isfinite(value) ? std::clamp(value, lowest, highest) : otherwise;
+}
+
+platform::MapPictureRequest checked(platform::MapPictureRequest request) {
+    auto& viewport = request.viewport;
+    viewport.size.width = within(viewport.size.width, 1.0, kLongestSide, 1.0);
+    viewport.size.height = within(viewport.size.height, 1.0, kLongestSide, 1.0);
+    viewport.zoom = within(viewport.zoom, 0.0, kHighestZoom, 0.0);
+    viewport.centre.latitude = within(viewport.centre.latitude, -kLastLatitude, kLastLatitude, 0.0);
+    viewport.centre.longitude = std::remainder(within(viewport.centre.longitude, -1e6, 1e6, 0.0), 360.0);
+    const double longest = std::max(viewport.size.width, viewport.size.height);
+    request.scale = std::min(within(request.scale, 0.25, 4.0, 1.0), kLongestSide / longest);
+    std::erase_if(request.clear, [](const platform::Rect& rect) {
+        return !std::isfinite(rect.x) || !std::isfinite(rect.y) || !std::isfinite(rect.width) ||
+               !std::isfinite(rect.height);
+    });
+    return request;
+}
+
+MapDrawn drawGround(MapGround& ground, const MapDrawing& drawing) {
+    drawing.painter.save();
+    MapDrawn drawn;
+    try {
+        drawn = ground.draw(drawing);
+    } catch (const std::exception& error) {
+        platform::platformLog().line("A map cannot be drawn: %@", std::string(error.what()));
+    }
+    drawing.painter.restore();
+    drawn.filled &= drawing.region;
+    return drawn;
+}
+
+}  // namespace
+
+std::optional<MapDrawer::Result> MapDrawer::draw(const platform::MapPictureRequest& asked,
+                                                 const std::vector<std::shared_ptr<MapGround>>& grounds,
+                                                 std::stop_token stop) {
+    const platform::MapPictureRequest request = checked(asked);
+    const auto side = [&](double points) { return std::max(1, static_cast<int>(std::lround(points * request.scale))); };
+    Result result;
+    result.pixels = QImage(side(request.viewport.size.width), side(request.viewport.size.height), QImage::Format_RGB32);
+    if (result.pixels.isNull()) {
+        // Out of memory: a picture of one pixel is still one.
+        result.pixels = QImage(1, 1, QImage::Format_RGB32);
+    }
+    const QSize pixels = result.pixels.size();
+    result.pixels.fill(MapStyle::of(request.isDark, request.isHighContrast).land);
+    QPainter painter(&result.pixels);
+    painter.setRenderHint(QPainter::Antialiasing);
+    painter.scale(pixels.width() / request.viewport.size.width, pixels.height() / request.viewport.size.height);
+    MapDrawing drawing{request, painter, pixels, QRegion(QRect(QPoint(), pixels)), stop};
+    for (const auto& ground : grounds) {
+        if (drawing.region.isEmpty() || stop.stop_requested()) {
+            break;
+        }
+        const MapDrawn drawn = drawGround(*ground, drawing);
+        drawing.region -= drawn.filled;
+        result.isComplete = result.isComplete && drawn.isComplete;
+        if (!drawn.filled.isEmpty() && !drawn.attribution.empty() &&
+            result.attribution.find(drawn.attribution) == std::string::npos) {
+            result.attribution += (result.attribution.empty() ? "" : " · ") + drawn.attribution;
+        }
+    }
+    if (stop.stop_requested()) {
+        return std::nullopt;
+    }
+    return result;
+}
+
+}  // namespace ktr::linux_

@@ -1,0 +1,33 @@
+#pragma once
+
+#include <memory>
+#include <vector>
+
+#include "linux/maps/MapGround.h"
+#include "platform/base/MainLoop.h"
+
+namespace ktr::linux_ {
+
+/// Draws maps on the main loop's background workers, one picture at a time in the order of asking, and keeps the latest
+/// ones. Equal requests share one drawing. Main thread, while a QGuiApplication exists.
+class ThreadedMapSource final : public platform::MapPictureSource {
+  public:
+    using Grounds = std::vector<std::shared_ptr<MapGround>>;
+
+    /// Each ground fills in what those before it left; what the last one leaves shows plain land.
+    ThreadedMapSource(std::shared_ptr<platform::MainLoop> mainLoop, Grounds grounds);
+    ~ThreadedMapSource() override;
+
+    int requestPicture(const platform::MapPictureRequest& request, Completion completion) override;
+    void cancel(int request) override;
+    std::shared_ptr<void> observeChanges(std::function<void()> changed) override;
+
+    /// Draws from these from now on, and tells the observers. Drawings under way are made anew.
+    void setGrounds(Grounds grounds);
+
+  private:
+    class Core;
+    std::shared_ptr<Core> core_;
+};
+
+}  // namespace ktr::linux_
