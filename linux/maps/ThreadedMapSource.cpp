@@ -3,13 +3,16 @@
 #include <algorithm>
 #include <cstddef>
 #include <deque>
+#include <exception>
 #include <list>
 #include <map>
 #include <optional>
 #include <utility>
 
 #include "linux/maps/MapDrawer.h"
+#include "linux/maps/MapStyle.h"
 #include "linux/ui/RasterImage.h"
+#include "platform/base/Log.h"
 
 namespace ktr::linux_ {
 
@@ -17,6 +20,20 @@ namespace {
 
 /// Pictures kept: some 20 of a window's cards at scale 2.
 constexpr std::size_t kMostBytes = std::size_t{32} << 20;
+
+/// Nothing thrown leaves a worker: without memory the map is one pixel.
+std::optional<MapDrawer::Result> drawSafely(const platform::MapPictureRequest& request,
+                                            const ThreadedMapSource::Grounds& grounds, const std::stop_token& token) {
+    try {
+        return MapDrawer::draw(request, grounds, token);
+    } catch (const std::exception& error) {
+        platform::platformLog().line("A map cannot be drawn: %@", std::string(error.what()));
+        MapDrawer::Result empty;
+        empty.pixels = QImage(1, 1, QImage::Format_RGB32);
+        empty.pixels.fill(MapStyle::of(request.isDark, request.isHighContrast).land);
+        return empty;
+    }
+}
 
 }  // namespace
 
@@ -222,7 +239,7 @@ void ThreadedMapSource::Core::startNext() {
     // The grounds live until the drawing is done; the result finds its way back if anybody is still there.
     mainLoop_->runInBackground([weak = weak_from_this(), loop = std::weak_ptr(mainLoop_), grounds = grounds_,
                                 request = running_->request, token = running_->stop.get_token()]() mutable {
-        auto result = std::make_shared<std::optional<MapDrawer::Result>>(MapDrawer::draw(request, grounds, token));
+        auto result = std::make_shared<std::optional<MapDrawer::Result>>(drawSafely(request, grounds, token));
         if (const auto mainLoop = loop.lock()) {
             // Grounds end on the main thread, where they began.
             mainLoop->post([weak, result, ended = std::move(grounds)] {
