@@ -21,6 +21,9 @@ if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
     # GCC 12 warns, when it optimises, of overlapping copies in "text" + std::string and of empty std::optionals being read
     # where there are none (GCC bugs 105651 and 80635).
     target_compile_options(ktr_warnings INTERFACE -Wno-restrict -Wno-maybe-uninitialized)
+else()
+    # Clang counts signs among the conversions, GCC does not.
+    target_compile_options(ktr_warnings INTERFACE -Wno-sign-conversion)
 endif()
 
 if(KTR_SANITIZE)
