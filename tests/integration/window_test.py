@@ -10,6 +10,8 @@ import tempfile
 import time
 import unittest
 
+from virtual_display import VirtualDisplay
+
 PROGRAM = os.environ["KTR_PROGRAM"]
 SCENARIOS = pathlib.Path(os.environ["KTR_SOURCE"]) / "resources" / "scenarios"
 
@@ -27,18 +29,9 @@ def wait_for(what, condition, seconds=30.0):
 class WindowTest(unittest.TestCase):
     @classmethod
     def setUpClass(cls):
-        read, write = os.pipe()
-        cls.server = subprocess.Popen(["Xvfb", "-displayfd", str(write), "-screen", "0", "1300x900x24", "-nolisten", "tcp"],
-                                      pass_fds=[write], stderr=subprocess.DEVNULL)
-        os.close(write)
-        with os.fdopen(read) as numbers:
-            cls.display = ":" + numbers.readline().strip()
-        cls.addClassCleanup(cls.stop_server)
-
-    @classmethod
-    def stop_server(cls):
-        cls.server.terminate()
-        cls.server.wait()
+        display = VirtualDisplay("1300x900")
+        cls.addClassCleanup(display.stop)
+        cls.display = display.name
 
     def setUp(self):
         folder = tempfile.TemporaryDirectory()
