@@ -1,0 +1,24 @@
+#pragma once
+
+#include <filesystem>
+#include <memory>
+
+#include "linux/account/Configuration.h"
+#include "linux/maps/ThreadedMapSource.h"
+
+namespace ktr::linux_ {
+
+/// The maps that the configuration names, and behind them the built-in world, which draws whatever they leave. Main
+/// thread.
+class ConfiguredMaps {
+  public:
+    /// `resourceFolder`: where "maps" with the built-in data stands.
+    static std::shared_ptr<ThreadedMapSource> make(const Configuration& configuration,
+                                                   const std::filesystem::path& resourceFolder,
+                                                   std::shared_ptr<platform::MainLoop> mainLoop);
+    /// The same as grounds, for `ThreadedMapSource::setGrounds` when the configuration has changed.
+    static ThreadedMapSource::Grounds grounds(const Configuration& configuration,
+                                              const std::filesystem::path& resourceFolder);
+};
+
+}  // namespace ktr::linux_

@@ -1,0 +1,126 @@
+#include "linux/maps/WorldGround.h"
+
+#include <QImage>
+#include <algorithm>
+#include <cmath>
+
+#include "linux/maps/MapDrawer.h"
+#include "linux/maps/MapStyle.h"
+#include "tests/support/PlatformTest.h"
+
+namespace ktr::linux_ {
+
+class WorldGroundTest : public test::PlatformTest {
+  protected:
+    static platform::MapPictureRequest request(double latitude, double longitude, double zoom) {
+        platform::MapPictureRequest made;
+        made.viewport = {{latitude, longitude}, zoom, {200.0, 120.0}};
+        return made;
+    }
+    MapDrawer::Result draw(const platform::MapPictureRequest& wanted) {
+        const auto drawn = MapDrawer::draw(wanted, {ground}, {});
+        EXPECT_TRUE(drawn.has_value());
+        return drawn.value_or(MapDrawer::Result());
+    }
+    /// The colour of the ground at the picture's middle: the labels keep away from it.
+    QColor middle(double latitude, double longitude, double zoom) {
+        auto wanted = request(latitude, longitude, zoom);
+        wanted.clear = {{90.0, 50.0, 20.0, 20.0}};
+        return draw(wanted).pixels.pixelColor(100, 60);
+    }
+    static bool hasColor(const QImage& pixels, const QRect& part, const QColor& color) {
+        for (int y = part.top(); y <= part.bottom(); ++y) {
+            for (int x = part.left(); x <= part.right(); ++x) {
+                if (pixels.pixelColor(x, y) == color) {
+                    return true;
+                }
+            }
+        }
+        return false;
+    }
+
+    const MapStyle& style = MapStyle::of(false, false);
+    std::shared_ptr<WorldGround> ground = std::make_shared<WorldGround>(KTR_RESOURCES "/maps/world.bin");
+};
+
+TEST_F(WorldGroundTest, LandAndWater_AreWhereTheyAreAtEveryZoom) {
+    for (const double zoom : {0.0, 1.5, 3.0, 4.6, 6.0, 8.2, 11.0, 15.0, 19.0, 24.0}) {
+        EXPECT_EQ(middle(47.0, 2.5, zoom), style.land) << "France at " << zoom;
+        EXPECT_EQ(middle(-23.5, 134.0, zoom), style.land) << "Australia at " << zoom;
+        EXPECT_EQ(middle(0.0, -150.0, zoom), style.water) << "the Pacific at " << zoom;
+        EXPECT_EQ(middle(42.0, 51.0, std::max(zoom, 3.0)), style.water) << "the Caspian Sea at " << zoom;
+    }
+}
+
+TEST_F(WorldGroundTest, AtTheDateLine_LandGoesOn) {
+    // Chukotka lies across it, on both sides and on the line.
+    for (const double longitude : {179.0, 180.0, -180.0, -179.0, 178.0}) {
+        EXPECT_EQ(middle(67.3, longitude, 7.0), style.land) << longitude;
+    }
+    for (const double longitude : {180.0, -180.0}) {
+        EXPECT_EQ(middle(30.0, longitude, 5.0), style.water) << longitude;
+    }
+}
+
+TEST_F(WorldGroundTest, AtThePoles_ThereIsIceAndSea) {
+    for (const double zoom : {0.0, 3.0, 9.0, 17.0}) {
+        EXPECT_EQ(middle(-90.0, 0.0, zoom), style.land) << zoom;
+        EXPECT_EQ(middle(-84.0, 20.0, zoom), style.land) << zoom;
+        // The ice shelf floats.
+        EXPECT_EQ(middle(-84.0, 180.0, zoom), style.water) << zoom;
+        EXPECT_EQ(middle(90.0, 0.0, zoom), style.water) << zoom;
+    }
+}
+
+TEST_F(WorldGroundTest, TheWholeWorldRepeatsItselfInAWidePicture) {
+    auto wanted = request(0.0, 0.0, 0.0);
+    wanted.viewport.size = {768.0, 256.0};
+    wanted.clear = {{0.0, 0.0, 768.0, 256.0}};
+    const QImage pixels = draw(wanted).pixels;
+    for (int y = 0; y < 256; y += 5) {
+        for (int x = 0; x < 256; x += 5) {
+            ASSERT_EQ(pixels.pixel(x, y), pixels.pixel(x + 256, y)) << x << " " << y;
+            ASSERT_EQ(pixels.pixel(x, y), pixels.pixel(x + 512, y)) << x << " " << y;
+        }
+    }
+}
+
+TEST_F(WorldGroundTest, Labels_KeepOutOfWhatIsToBeClear) {
+    auto wanted = request(52.52, 13.4, 6.0);
+    const QRect whole(0, 0, 200, 120);
+    EXPECT_TRUE(hasColor(draw(wanted).pixels, whole, style.label));
+    wanted.clear = {{0.0, 0.0, 200.0, 120.0}};
+    EXPECT_FALSE(hasColor(draw(wanted).pixels, whole, style.label));
+}
+
+TEST_F(WorldGroundTest, InsideTheRegionOnly) {
+    class Half final : public MapGround {
+      public:
+        MapDrawn draw(const MapDrawing& drawing) override {
+            drawing.painter.fillRect(QRectF(0.0, 0.0, 100.0, 120.0), Qt::red);
+            return {QRegion(0, 0, 100, 120), "Red", true};
+        }
+    };
+    const auto drawn = MapDrawer::draw(request(47.0, 2.5, 5.0), {std::make_shared<Half>(), ground}, {});
+    ASSERT_TRUE(drawn.has_value());
+    for (int y = 0; y < 120; ++y) {
+        ASSERT_EQ(drawn->pixels.pixelColor(99, y), QColor(Qt::red)) << y;
+    }
+    EXPECT_NE(drawn->pixels.pixelColor(101, 5), QColor(Qt::red));
+    EXPECT_EQ(drawn->attribution, std::string("Red · ") + WorldGround::kAttribution);
+}
+
+TEST_F(WorldGroundTest, WithoutItsFile_PlainLandAndALine) {
+    ground = std::make_shared<WorldGround>("/nowhere/world.bin");
+    EXPECT_EQ(middle(0.0, -150.0, 5.0), style.land);
+    EXPECT_EQ(middle(0.0, -150.0, 5.0), style.land);
+    EXPECT_FALSE(draw(request(0.0, 0.0, 0.0)).attribution.empty());
+}
+
+TEST_F(WorldGroundTest, InTheDark_ItIsDark) {
+    auto wanted = request(47.0, 2.5, 9.0);
+    wanted.isDark = true;
+    EXPECT_EQ(draw(wanted).pixels.pixelColor(100, 60), MapStyle::of(true, false).land);
+}
+
+}  // namespace ktr::linux_
