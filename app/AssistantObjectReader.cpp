@@ -1,7 +1,7 @@
 #include "app/AssistantObjectReader.h"
 
 #include "app/Scenario.h"
-#include "app/Words.h"
+#include "linux/json/Words.h"
 
 namespace ktr::app {
 
@@ -13,7 +13,7 @@ namespace {
 void expectKind(FieldReader& fields, const std::string& expected) {
     const auto kind = fields.string("kind");
     if (kind && *kind != expected) {
-        fields.complain("kind", "expected " + inQuotes(expected) + ", found " + inQuotes(*kind));
+        fields.complain("kind", "expected " + linux_::inQuotes(expected) + ", found " + linux_::inQuotes(*kind));
     }
 }
 

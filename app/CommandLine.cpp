@@ -6,8 +6,8 @@
 #include <cmath>
 
 #include "app/Scenario.h"
-#include "app/Words.h"
 #include "app/serve/ServeArguments.h"
+#include "linux/json/Words.h"
 #include "linux/ui/LinuxDevice.h"
 
 #ifndef KTR_VERSION
@@ -19,6 +19,7 @@ namespace ktr::app {
 namespace {
 
 constexpr double kLongestRun = 7.0 * 86400.0;
+constexpr double kLongestLive = 86400.0;
 
 const char* const kFooter = R"(Exit status:
   0  done
@@ -32,14 +33,18 @@ Environment:
   KTR_PLUGIN       the plugin's library, when --plugin is not given
   KTR_LOG          debug, info, default, error (as it comes) or off: which log lines are written
   KTR_FONTS        pinned: only the Noto fonts, from their packaged files, for pictures that are compared
+  KTR_CONFIG       the configuration file with account, service and positions, when not ~/.config/ktr/config.json
   KTR_RESOURCES    the folder of images and texts, when not ../share/ktr beside the program's folder
   KTR_LOG_PRIVATE  show: names, handles, positions and URLs stand in log lines as they are)";
 
 const char* const kShowExamples = R"(Examples:
+  ktr show
+  ktr show --ask "Where are my friends?"
   ktr show dinner.json
   ktr show dinner.json show-all.json --dark
   ktr show dinner.json --print-urls
 
+Without a scenario the window is live: it asks the configured assistant what is typed, and the friends in its answers move.
 In the window: Tab and Shift+Tab walk the rows, Enter opens one, the arrow keys, Page Up, Page Down, Home and End scroll,
 Ctrl+Q closes.)";
 
@@ -48,16 +53,19 @@ const char* const kRenderExamples = R"(Examples:
   ktr render dinner.json -o dinner.png --scale 2 --dark
   ktr render dinner.json -o wide.pdf --width 1100
   ktr render dinner.json -o later.svg --at +90 --language de
+  ktr render --live 10s --ask "Where are my friends?" -o friends.png
 
 A picture higher than 32,000 pixels is written in pieces: FILE-1.png, FILE-2.png, ...)";
 
 const char* const kDescribeExamples = R"(Examples:
   ktr describe dinner.json
-  ktr describe dinner.json --language ar)";
+  ktr describe dinner.json --language ar
+  ktr describe --live 10s --ask "Where is Ann?")";
 
 /// Texts as they were given; read into Options once the parser is content.
 struct Words {
-    std::string language, textSize, idiom, at;
+    std::string language, textSize, idiom, at, live;
+    bool isLive = false;
     bool dark = false;
     bool light = false;
 };
@@ -71,7 +79,7 @@ CLI::Validator range(double least, double most) {
         const char* end = text.data() + text.size();
         const auto [stop, error] = std::from_chars(text.data(), end, number);
         const bool fits = error == std::errc() && stop == end && number >= least && number <= most;
-        return fits ? std::string() : "expected " + expected + ", found " + inQuotes(text);
+        return fits ? std::string() : "expected " + expected + ", found " + linux_::inQuotes(text);
     };
     return CLI::Validator(check, "");
 }
@@ -92,15 +100,19 @@ struct Parser {
         show = app.add_subcommand("show", "Opens a window on the conversation that scenarios tell");
         render = app.add_subcommand("render", "Draws a scenario to a PNG, SVG or PDF file, without a display");
         describe = app.add_subcommand("describe", "Prints what a screen reader would say, in reading order");
-        show->add_option("scenarios", options.scenarios, "Scenario files; one turn of the conversation each")
-            ->required()
+        show->add_option("scenarios", options.scenarios,
+                         "Scenario files; one turn of the conversation each. Without one the window is live")
             ->type_name("SCENARIO");
+        show->add_flag("--live", words.isLive, "Scenarios too are live: with the account, its service and the present");
+        show->add_flag("--reduced-motion", options.reducedMotion, "Nothing slides or grows; answers fade in");
         show->add_flag("--print-urls", options.printUrls, "Print the URL of a tap instead of opening it");
         for (CLI::App* command : {render, describe}) {
-            command->add_option("scenario", options.scenarios, "Scenario file")
-                ->required()
-                ->expected(1)
-                ->type_name("SCENARIO");
+            command->add_option("scenario", options.scenarios, "Scenario file")->expected(0, 1)->type_name("SCENARIO");
+            command
+                ->add_option(
+                    "--live", words.live,
+                    "Ask the account's service for so long, in real time: 10s, 1.5s, 2m; then draw what is there")
+                ->type_name("DURATION");
             command
                 ->add_option("--at", words.at,
                              "Moment: 2026-05-16T17:42:00+02:00, or +90 for 90 seconds after the start")
@@ -113,6 +125,10 @@ struct Parser {
             ->type_name("NUMBER")
             ->check(range(0.25, 8.0));
         for (CLI::App* command : {show, render, describe}) {
+            command->add_option("--ask", options.questions, "A question for the assistant, of what is live")
+                ->expected(1)
+                ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll)
+                ->type_name("QUESTION");
             addCommon(*command);
         }
         serve = std::make_unique<ServeArguments>(app);
@@ -148,8 +164,20 @@ std::optional<double> secondsOf(const std::string& text) {
                                                                                        : std::nullopt;
 }
 
+/// "10s", "1.5s", "2m" or "250ms"; seconds alone may leave the unit out.
+std::optional<double> durationOf(const std::string& text) {
+    double number = 0.0;
+    const char* end = text.data() + text.size();
+    const auto [stop, error] = std::from_chars(text.data(), end, number, std::chars_format::fixed);
+    const std::string unit(stop, end);
+    const double factor = unit.empty() || unit == "s" ? 1.0 : unit == "ms" ? 0.001 : unit == "m" ? 60.0 : 0.0;
+    const double seconds = number * factor;
+    const bool fits = error == std::errc() && factor > 0.0 && seconds > 0.0 && seconds <= kLongestLive;
+    return fits ? std::optional(seconds) : std::nullopt;
+}
+
 std::string wrong(const std::string& option, const std::string& expected, const std::string& found) {
-    return option + ": expected " + expected + ", found " + inQuotes(found);
+    return option + ": expected " + expected + ", found " + linux_::inQuotes(found);
 }
 
 /// Fills in what the words say; the complaint about the first wrong one, or an empty text.
@@ -181,6 +209,30 @@ std::string readWords(const Words& words, Options& options) {
     }
     if (words.dark || words.light) {
         options.dark = words.dark;
+    }
+    return "";
+}
+
+/// What is live, and whether there is anything to draw.
+std::string readLive(const Words& words, Options& options) {
+    const bool isShow = options.command == Options::Command::Show;
+    options.live = words.isLive || !words.live.empty() || (isShow && options.scenarios.empty());
+    if (!words.live.empty()) {
+        const auto seconds = durationOf(words.live);
+        if (!seconds) {
+            return wrong("--live", "a duration up to a day, such as 10s or 2m", words.live);
+        }
+        options.liveSeconds = *seconds;
+    }
+    if (!options.live && !options.questions.empty()) {
+        return "--ask: nobody answers in a scenario; add --live";
+    }
+    if (options.live && !words.at.empty()) {
+        return "--at: what is live happens now";
+    }
+    if (!isShow && options.scenarios.empty() && options.questions.empty()) {
+        return options.live ? "expected a scenario, or a question: --ask \"Where is Ann?\""
+                            : "expected a scenario, or --live 10s --ask \"Where is Ann?\"";
     }
     return "";
 }
@@ -217,6 +269,9 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
                              : parser.render->parsed() ? Options::Command::Render
                                                        : Options::Command::Describe;
     if (const std::string complaint = readWords(parser.words, parser.options); !complaint.empty()) {
+        return misuse(complaint);
+    }
+    if (const std::string complaint = readLive(parser.words, parser.options); !complaint.empty()) {
         return misuse(complaint);
     }
     const std::string& output = parser.options.output;

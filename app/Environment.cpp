@@ -20,6 +20,7 @@
 #include "linux/services/ScriptContactFormatter.h"
 #include "linux/services/SettingsTelephony.h"
 #include "linux/services/StderrLogSink.h"
+#include "linux/services/SystemClock.h"
 #include "linux/services/VCardContactStore.h"
 #include "linux/ui/LinuxDevice.h"
 #include "linux/ui/QtAppearance.h"
@@ -98,13 +99,15 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
     platform.logSink = std::make_shared<linux_::FilteredLogSink>(
         std::make_shared<linux_::StderrLogSink>(linux_::StderrLogSink::environmentShowsPrivate()),
         linux_::FilteredLogSink::environmentLevel());
-    if (isVirtual) {
+    const bool isLive = settings.liveConfiguration.has_value();
+    if (isVirtual && !isLive) {
         environment.virtualTime = std::make_shared<platform::VirtualTime>(settings.start);
         platform.mainLoop = environment.virtualTime;
         platform.clock = environment.virtualTime;
     } else {
         platform.mainLoop = std::make_shared<linux_::QtMainLoop>();
-        platform.clock = std::make_shared<ScenarioClock>(settings.start);
+        platform.clock = isLive ? std::shared_ptr<platform::Clock>(std::make_shared<linux_::SystemClock>())
+                                : std::make_shared<ScenarioClock>(settings.start);
     }
     platform.calendar = std::make_shared<linux_::LocalCalendar>();
     platform.assistant = std::make_shared<linux_::ConfiguredAssistant>(settings.language);
@@ -133,6 +136,10 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
         return Failure{ExitCode::Failure, error};
     }
     addUserInterface(platform, settings);
+    if (isLive) {
+        environment.live = std::make_unique<LiveServices>(*settings.liveConfiguration);
+        environment.live->addTo(platform, settings.language, !settings.positions.empty());
+    }
     return environment;
 }
 

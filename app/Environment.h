@@ -5,6 +5,7 @@
 
 #include "app/Failure.h"
 #include "app/HostSettings.h"
+#include "app/live/LiveServices.h"
 #include "platform/base/Platform.h"
 #include "platform/base/VirtualTime.h"
 
@@ -17,7 +18,11 @@ struct Environment {
     /// The platform's clock and loop when time is virtual; else none.
     std::shared_ptr<platform::VirtualTime> virtualTime;
 
-    /// Not installed yet. A failure for contacts that cannot be read and for missing resources.
+    /// What a live conversation asks; else none.
+    std::unique_ptr<LiveServices> live;
+
+    /// Not installed yet. A failure for contacts that cannot be read and for missing resources. With a live
+    /// configuration time is the present; without one nothing outside the conversation is asked.
     static std::variant<Environment, Failure> make(const HostSettings& settings, bool virtualTime);
 };
 

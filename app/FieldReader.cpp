@@ -87,7 +87,7 @@ bool FieldReader::objects(const std::string& name, const std::function<void(Fiel
         complainAboutType(path_.member(name), "a list", *value);
         return true;
     }
-    const JsonPath list = path_.member(name);
+    const linux_::JsonPath list = path_.member(name);
     for (std::size_t i = 0; i < elements->size(); ++i) {
         const platform::Dictionary* fields = (*elements)[i].dictionary();
         if (fields == nullptr) {
@@ -129,13 +129,13 @@ void FieldReader::complain(const std::string& name, std::string message) {
     complainAt(name.empty() ? path_ : path_.member(name), std::move(message));
 }
 
-void FieldReader::complainAt(const JsonPath& path, std::string message) {
+void FieldReader::complainAt(const linux_::JsonPath& path, std::string message) {
     if (!complaints_) {
         complaints_ = Complaint{path, std::move(message)};
     }
 }
 
-void FieldReader::complainAboutType(const JsonPath& path, const std::string& expected, const Value& found) {
+void FieldReader::complainAboutType(const linux_::JsonPath& path, const std::string& expected, const Value& found) {
     complainAt(path, "expected " + expected + ", found " + nameOfKind(found));
 }
 

@@ -4,7 +4,7 @@
 #include <optional>
 #include <string>
 
-#include "app/JsonPath.h"
+#include "linux/json/JsonPath.h"
 #include "platform/base/Value.h"
 
 namespace ktr::app {
@@ -12,7 +12,7 @@ namespace ktr::app {
 /// The first complaint about a document. Reading goes on after it with nothing in the place of what was wrong, so that
 /// readers need no error paths of their own; whoever started the reading looks here at the end.
 struct Complaint {
-    JsonPath path;
+    linux_::JsonPath path;
     std::string message;
 };
 using Complaints = std::optional<Complaint>;
@@ -22,7 +22,7 @@ using Complaints = std::optional<Complaint>;
 class FieldReader {
   public:
     /// `dictionary` outlives the reader.
-    FieldReader(const platform::Dictionary& dictionary, JsonPath path, Complaints& complaints)
+    FieldReader(const platform::Dictionary& dictionary, linux_::JsonPath path, Complaints& complaints)
         : dictionary_(dictionary), path_(std::move(path)), complaints_(complaints) {}
 
     std::optional<std::string> string(const std::string& name);
@@ -39,15 +39,15 @@ class FieldReader {
 
     /// Complains about a member, or with an empty name about the object itself.
     void complain(const std::string& name, std::string message);
-    void complainAt(const JsonPath& path, std::string message);
+    void complainAt(const linux_::JsonPath& path, std::string message);
     const platform::Dictionary& dictionary() const { return dictionary_; }
-    const JsonPath& path() const { return path_; }
+    const linux_::JsonPath& path() const { return path_; }
 
   private:
-    void complainAboutType(const JsonPath& path, const std::string& expected, const platform::Value& found);
+    void complainAboutType(const linux_::JsonPath& path, const std::string& expected, const platform::Value& found);
 
     const platform::Dictionary& dictionary_;
-    JsonPath path_;
+    linux_::JsonPath path_;
     Complaints& complaints_;
 };
 

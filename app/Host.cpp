@@ -1,11 +1,13 @@
 #include "app/Host.h"
 
+#include <QDateTime>
+
 #include "app/ClockText.h"
 #include "app/Environment.h"
 #include "app/PluginFinder.h"
-#include "app/Words.h"
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/assistant/Localization.h"
+#include "platform/base/Clock.h"
 #include "platform/base/Format.h"
 
 namespace ktr::app {
@@ -23,12 +25,14 @@ std::variant<std::unique_ptr<Host>, Failure> Host::make(const HostSettings& sett
                                                         const std::string& pluginPath) {
     std::unique_ptr<Host> host(new Host);
     host->settings_ = settings;
-    const auto environment = Environment::make(settings, time == Time::Virtual);
-    if (const auto* failure = std::get_if<Failure>(&environment)) {
+    auto made = Environment::make(settings, time == Time::Virtual);
+    if (const auto* failure = std::get_if<Failure>(&made)) {
         return *failure;
     }
-    host->platform_ = std::get<Environment>(environment).platform;
-    host->virtualTime_ = std::get<Environment>(environment).virtualTime;
+    auto& environment = std::get<Environment>(made);
+    host->platform_ = environment.platform;
+    host->virtualTime_ = environment.virtualTime;
+    host->live_ = std::move(environment.live);
     Platform::install(host->platform_);
     auto plugin = Plugin::load(PluginFinder::find(pluginPath));
     if (const auto* reason = std::get_if<std::string>(&plugin)) {
@@ -56,6 +60,7 @@ Host::~Host() {
     window_.reset();
     delegate_.reset();
     plugin_.reset();
+    live_.reset();
     if (Platform::installed() == platform_) {
         Platform::install(nullptr);
     }
@@ -65,32 +70,70 @@ bool Host::rightToLeft() const {
     return platform_->assistant->languageIsRightToLeft();
 }
 
+std::string Host::text(const std::string& key) const {
+    const auto& localization = *platform_->localization;
+    return localization.text(key, localization.hostBundleIdentifier());
+}
+
+std::string Host::clockFace(platform::Date moment) const {
+    const int offset = live_ ? QDateTime::currentDateTime().offsetFromUtc() : settings_.offsetSeconds;
+    return clockText(moment, offset, settings_.language, settings_.region);
+}
+
+void Host::setTimes(TurnTexts& texts, const std::string& clockFace) const {
+    texts.shortTime = clockFace;
+    texts.longTime = platform::formatted(text("TODAY"), {platform::FormatArgument(clockFace)});
+}
+
 TurnTexts Host::textsOf(const Scenario& scenario) const {
     TurnTexts texts;
     const IsoTime asked = scenario.clock.value_or(IsoTime{settings_.start, settings_.offsetSeconds});
-    texts.shortTime = clockText(asked.date, asked.offsetSeconds, settings_.language, settings_.region);
-    const auto& localization = *platform_->localization;
-    texts.longTime =
-        platform::formatted(localization.text("TODAY", localization.hostBundleIdentifier(), std::nullopt, "%@"),
-                            {platform::FormatArgument(texts.shortTime)});
+    setTimes(texts, clockText(asked.date, asked.offsetSeconds, settings_.language, settings_.region));
     texts.question = scenario.question.text(settings_.language);
     texts.sentence = scenario.sentence.text(settings_.language);
     return texts;
 }
 
-std::optional<Failure> Host::addTurn(const Scenario& scenario) {
-    auto controller = plugin_->factory().viewControllerForSnippet(scenario.snippet);
+bool Host::addCard(TurnView& turn, const Scenario& scenario) {
+    const auto controller = plugin_->factory().viewControllerForSnippet(scenario.snippet);
     if (!controller) {
+        return false;
+    }
+    controller->setDelegate(delegate_);
+    turn.setController(controller);
+    return true;
+}
+
+std::optional<Failure> Host::addTurn(const Scenario& scenario) {
+    auto turn = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
+    turn->setTexts(textsOf(scenario));
+    conversation_->addTurn(turn);
+    if (scenario.snippet && !addCard(*turn, scenario)) {
+        conversation_->removeTurn(turn);
         return Failure{ExitCode::NotDrawn,
                        scenario.file + ": the plugin draws no such answer: a " + scenario.kind +
                            (scenario.kind == "VAKtrLocationSnippet" ? " without \"proximity\"" : "")};
     }
-    auto turn = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
-    turn->setTexts(textsOf(scenario));
-    conversation_->addTurn(turn);
-    controller->setDelegate(delegate_);
-    turn->card()->setController(controller);
     return std::nullopt;
+}
+
+std::shared_ptr<TurnView> Host::addQuestion(const std::string& question) {
+    auto turn = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
+    TurnTexts texts;
+    setTimes(texts, clockFace(platform_->clock->now()));
+    texts.question = question;
+    turn->setTexts(texts);
+    conversation_->addTurn(turn);
+    return turn;
+}
+
+void Host::answer(TurnView& turn, const Scenario& answer) {
+    std::string sentence = answer.sentence.text(settings_.language);
+    const bool drawn = answer.snippet && addCard(turn, answer);
+    if (!drawn && sentence.empty()) {
+        sentence = text("ANSWER_NOT_SHOWN");
+    }
+    turn.setSentence(sentence);
 }
 
 double Host::layOut(double width) {

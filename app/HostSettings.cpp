@@ -37,10 +37,12 @@ double usualWidth(platform::UserInterfaceIdiom idiom) {
 }  // namespace
 
 std::variant<HostSettings, Failure> HostSettings::decide(const Options& options, const std::vector<Scenario>& scenarios,
-                                                         const IsoTime& now) {
+                                                         const IsoTime& now,
+                                                         const linux_::Configuration& configuration) {
     HostSettings settings;
-    settings.language = either(options.language, firstOf(scenarios, &Scenario::language))
-                            .value_or(linux_::LocaleRegion::sessionLanguage());
+    settings.language =
+        either(either(options.language, firstOf(scenarios, &Scenario::language)), configuration.language)
+            .value_or(linux_::LocaleRegion::sessionLanguage());
     settings.region =
         firstOf(scenarios, &Scenario::region)
             .value_or(countryOf(settings.language) ? settings.language : linux_::LocaleRegion::sessionLocale());
@@ -79,6 +81,7 @@ std::variant<HostSettings, Failure> HostSettings::decide(const Options& options,
             settings.positions = scenario.positions;
         }
     }
+    settings.contacts.insert(settings.contacts.end(), configuration.contacts.begin(), configuration.contacts.end());
     return settings;
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <filesystem>
 #include <optional>
 #include <string>
 #include <variant>
@@ -8,6 +9,7 @@
 #include "app/Failure.h"
 #include "app/Options.h"
 #include "app/Scenario.h"
+#include "linux/account/Configuration.h"
 #include "platform/base/Date.h"
 
 namespace ktr::app {
@@ -29,11 +31,16 @@ struct HostSettings {
     double runSeconds = 0.0;  ///< from the start to the moment of the picture
     std::vector<std::string> contacts;
     std::vector<ScenarioPosition> positions;
+    /// The configuration file of a live conversation: one with an account, a service and the present moment. None: the
+    /// conversation stands for itself, and nothing outside it is asked.
+    std::optional<std::filesystem::path> liveConfiguration;
 
     /// `now` and its local offset serve where no scenario has a clock. A failure for what cannot be drawn: text sizes
-    /// for accessibility, and a moment too far from the start.
+    /// for accessibility, and a moment too far from the start. What `configuration` says counts after the scenarios; it
+    /// is the default one where nothing is live.
     static std::variant<HostSettings, Failure> decide(const Options& options, const std::vector<Scenario>& scenarios,
-                                                      const IsoTime& now);
+                                                      const IsoTime& now,
+                                                      const linux_::Configuration& configuration = {});
 };
 
 }  // namespace ktr::app

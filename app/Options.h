@@ -15,7 +15,11 @@ struct Options {
     enum class Command { Show, Render, Describe, Serve };
 
     Command command = Command::Show;
-    std::vector<std::string> scenarios;  ///< never empty, but for serve
+    std::vector<std::string> scenarios;  ///< never empty where nothing is live, but for serve
+    /// With the account, the service and the present moment: a window without scenarios, and what --live asks for.
+    bool live = false;
+    double liveSeconds = 0.0;            ///< of a live render and describe: how long it goes on
+    std::vector<std::string> questions;  ///< of what is live: asked at the start, in this order
     std::string output;                  ///< of render: a file ending in .png, .svg or .pdf
     double width = 0.0;                  ///< points; 0: the idiom's own
     double scale = 1.0;                  ///< pixels a point
@@ -27,9 +31,10 @@ struct Options {
     std::optional<double> atSeconds;
     std::optional<bool> dark;
     bool highContrast = false;
-    std::string plugin;      ///< empty: looked for
-    ServeOptions serve;      ///< of serve
-    bool printUrls = false;  ///< of show: URLs go to the standard output instead of the desktop
+    std::string plugin;          ///< empty: looked for
+    ServeOptions serve;          ///< of serve
+    bool reducedMotion = false;  ///< of show
+    bool printUrls = false;      ///< of show: URLs go to the standard output instead of the desktop
 };
 
 }  // namespace ktr::app

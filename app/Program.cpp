@@ -12,8 +12,11 @@
 #include "app/Host.h"
 #include "app/RenderCommand.h"
 #include "app/ScenarioReader.h"
+#include "app/live/LiveRun.h"
 #include "app/serve/ServeCommand.h"
 #include "app/window/ShowCommand.h"
+#include "linux/account/ConfigurationReader.h"
+#include "linux/account/XdgFolders.h"
 #include "linux/services/SystemClock.h"
 #include "linux/ui/FontSetup.h"
 
@@ -34,7 +37,8 @@ IsoTime sessionNow() {
 std::variant<std::vector<Scenario>, Failure> readScenarios(const Options& options, platform::Date now) {
     std::vector<Scenario> scenarios;
     for (const std::string& file : options.scenarios) {
-        auto read = ScenarioReader(now).readFile(file);
+        const auto clock = options.live ? ScenarioReader::Clock::Present : ScenarioReader::Clock::OfTheScenario;
+        auto read = ScenarioReader(now, clock).readFile(file);
         if (const auto* error = std::get_if<ScenarioError>(&read)) {
             return Failure{ExitCode::BadScenario, error->text()};
         }
@@ -43,10 +47,18 @@ std::variant<std::vector<Scenario>, Failure> readScenarios(const Options& option
     return scenarios;
 }
 
+/// What the file says, as far as it can be read: what is wrong with it is told once the account is read.
+linux_::Configuration configurationOf(const std::filesystem::path& file) {
+    auto read = linux_::ConfigurationReader::readFile(file);
+    auto* configuration = std::get_if<linux_::Configuration>(&read);
+    return configuration == nullptr ? linux_::Configuration() : std::move(*configuration);
+}
+
 std::variant<std::unique_ptr<Host>, Failure> makeHost(const Options& options, const HostSettings& settings,
                                                       const std::vector<Scenario>& scenarios, Host::Time time) {
     auto made = Host::make(settings, time, options.plugin);
-    if (auto* host = std::get_if<std::unique_ptr<Host>>(&made)) {
+    // What is live waits for the account first.
+    if (auto* host = std::get_if<std::unique_ptr<Host>>(&made); host != nullptr && !options.live) {
         for (const Scenario& scenario : scenarios) {
             if (auto failure = (*host)->addTurn(scenario)) {
                 return *failure;
@@ -62,16 +74,17 @@ ExitCode runHeadless(const Options& options, const HostSettings& settings, const
         return fail(*failure);
     }
     Host& host = *std::get<std::unique_ptr<Host>>(made);
+    const ExitCode code = options.live ? LiveRun(host, options).run(scenarios) : ExitCode::Ok;
     if (options.command == Options::Command::Render) {
         const auto failure = RenderCommand(host).write(options.output);
-        return failure ? fail(*failure) : ExitCode::Ok;
+        return failure ? fail(*failure) : code;
     }
     host.settle(settings.width);
     const std::string text = describe(platform::accessibilityTree(host.window(), host.rightToLeft()));
     if (std::fputs(text.c_str(), stdout) == EOF || std::fflush(stdout) != 0) {
         return fail({ExitCode::Failure, "the description cannot be written"});
     }
-    return ExitCode::Ok;
+    return code;
 }
 
 ExitCode runShow(const Options& options, HostSettings settings, const std::vector<Scenario>& scenarios) {
@@ -80,7 +93,7 @@ ExitCode runShow(const Options& options, HostSettings settings, const std::vecto
     if (const auto* failure = std::get_if<Failure>(&made)) {
         return fail(*failure);
     }
-    return ShowCommand(*std::get<std::unique_ptr<Host>>(made), options).run();
+    return ShowCommand(*std::get<std::unique_ptr<Host>>(made), options).run(scenarios);
 }
 
 /// The display that a window needs; Qt ends the process when it looks for one in vain.
@@ -132,11 +145,16 @@ ExitCode run(const Options& options, int argc, char** argv) {
         return fail(*failure);
     }
     const auto& scenarios = std::get<std::vector<Scenario>>(read);
-    auto decided = HostSettings::decide(options, scenarios, now);
+    const auto configuration = linux_::XdgFolders::configurationFile();
+    auto decided = HostSettings::decide(options, scenarios, now,
+                                        options.live ? configurationOf(configuration) : linux_::Configuration());
     if (const auto* failure = std::get_if<Failure>(&decided)) {
         return fail(*failure);
     }
-    const auto& settings = std::get<HostSettings>(decided);
+    auto& settings = std::get<HostSettings>(decided);
+    if (options.live) {
+        settings.liveConfiguration = configuration;
+    }
     const bool window = options.command == Options::Command::Show;
     if (window && !hasDisplay()) {
         return fail({ExitCode::Failure, "there is no display to open a window on; `ktr render` draws without one"});

@@ -49,7 +49,7 @@ class UnknownAssistantObject : public platform::AssistantObject {
 /// One turn of a conversation and the world around it, as a scenario file tells it (docs/scenario-format.md).
 struct Scenario {
     std::string file;  ///< as it was given
-    /// Kind and object of the answer; never none in a scenario that was read.
+    /// Kind and object of the answer; an answer that is a sentence alone has neither.
     std::string kind;
     std::shared_ptr<platform::AssistantObject> snippet;
     LocalizedText question;

@@ -3,7 +3,7 @@
 #include <optional>
 #include <string>
 
-#include "app/JsonReader.h"
+#include "linux/json/JsonReader.h"
 
 namespace ktr::app {
 
@@ -11,7 +11,7 @@ namespace ktr::app {
 struct ScenarioError {
     std::string file;
     /// None when the file itself could not be read.
-    std::optional<JsonPosition> position;
+    std::optional<linux_::JsonPosition> position;
     /// The path inside the document; empty with no position.
     std::string path;
     std::string message;

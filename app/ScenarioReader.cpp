@@ -7,7 +7,7 @@
 
 #include "app/AssistantObjectReader.h"
 #include "app/FieldReader.h"
-#include "app/Words.h"
+#include "linux/json/Words.h"
 #include "linux/ui/LinuxDevice.h"
 
 namespace ktr::app {
@@ -32,7 +32,7 @@ LocalizedText readLocalizedText(FieldReader& fields, const std::string& name) {
         return texts;
     }
     for (const auto& [language, text] : *languages) {
-        const JsonPath path = fields.path().member(name).member(language);
+        const linux_::JsonPath path = fields.path().member(name).member(language);
         if (!isLanguageTag(language)) {
             fields.complainAt(path, "expected a language such as \"en\" or \"pt-BR\"");
         } else if (text.string() == nullptr) {
@@ -54,7 +54,7 @@ auto readWord(FieldReader& fields, const std::string& name, const std::string& e
     }
     auto word = parse(*text);
     if (!word) {
-        fields.complain(name, "expected " + expected + ", found " + inQuotes(*text));
+        fields.complain(name, "expected " + expected + ", found " + linux_::inQuotes(*text));
     }
     return word;
 }
@@ -120,8 +120,9 @@ std::vector<std::string> resolved(std::vector<std::string> paths, const std::str
     return paths;
 }
 
-void readScenario(FieldReader& fields, platform::Date now, Scenario& scenario) {
-    scenario.clock = readWord(fields, "clock", "a date and time such as \"2026-05-16T17:42:00+02:00\"", parseIsoTime);
+void readScenario(FieldReader& fields, platform::Date now, bool withClock, Scenario& scenario) {
+    const auto clock = readWord(fields, "clock", "a date and time such as \"2026-05-16T17:42:00+02:00\"", parseIsoTime);
+    scenario.clock = withClock ? clock : std::nullopt;
     scenario.question = readLocalizedText(fields, "question");
     scenario.sentence = readLocalizedText(fields, "sentence");
     scenario.contacts = resolved(fields.stringOrStrings("contacts"), scenario.file);
@@ -137,8 +138,8 @@ void readScenario(FieldReader& fields, platform::Date now, Scenario& scenario) {
     const AssistantObjectReader objects(scenario.clock ? scenario.clock->date : now);
     const bool present = fields.object(
         "snippet", [&](FieldReader& snippet) { scenario.snippet = objects.readSnippet(snippet, scenario.kind); });
-    if (!present) {
-        fields.complain("", "expected a member \"snippet\", the assistant's answer");
+    if (!present && scenario.sentence.empty()) {
+        fields.complain("", "expected a member \"snippet\", the assistant's answer, or at least a \"sentence\"");
     }
 }
 
@@ -149,21 +150,22 @@ std::variant<Scenario, ScenarioError> ScenarioReader::readText(std::string_view 
     if (text.starts_with("\xEF\xBB\xBF")) {
         text.remove_prefix(3);
     }
-    auto read = JsonReader::read(text);
-    if (const auto* error = std::get_if<JsonError>(&read)) {
+    auto read = linux_::JsonReader::read(text);
+    if (const auto* error = std::get_if<linux_::JsonError>(&read)) {
         return ScenarioError{file, error->position, error->path.text(), error->message};
     }
     const Value& root = std::get<Value>(read);
     if (root.dictionary() == nullptr) {
-        return ScenarioError{file, JsonReader::locate(text, {}), "$", "expected an object, found " + nameOfKind(root)};
+        return ScenarioError{file, linux_::JsonReader::locate(text, {}), "$",
+                             "expected an object, found " + nameOfKind(root)};
     }
     Complaints complaints;
     FieldReader fields(*root.dictionary(), {}, complaints);
     Scenario scenario;
     scenario.file = file;
-    readScenario(fields, now_, scenario);
+    readScenario(fields, now_, clock_ == Clock::OfTheScenario, scenario);
     if (complaints) {
-        return ScenarioError{file, JsonReader::locate(text, complaints->path), complaints->path.text(),
+        return ScenarioError{file, linux_::JsonReader::locate(text, complaints->path), complaints->path.text(),
                              complaints->message};
     }
     return scenario;
@@ -185,14 +187,14 @@ std::variant<Scenario, ScenarioError> ScenarioReader::readFile(const std::string
     // One byte more than allowed tells too large from just fitting, also for a pipe whose size nobody knows.
     std::string text;
     std::string block(1u << 16, '\0');
-    while (text.size() <= kLargestJson &&
+    while (text.size() <= linux_::kLargestJson &&
            (stream.read(block.data(), static_cast<std::streamsize>(block.size())) || stream.gcount() > 0)) {
         text.append(block.data(), static_cast<std::size_t>(stream.gcount()));
     }
     if (stream.bad()) {
         return ScenarioError{file, std::nullopt, "", "the file cannot be read"};
     }
-    if (text.size() > kLargestJson) {
+    if (text.size() > linux_::kLargestJson) {
         return ScenarioError{file, std::nullopt, "", "the file is larger than 64 MiB"};
     }
     return readText(text, file);

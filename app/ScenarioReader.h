@@ -13,8 +13,11 @@ namespace ktr::app {
 /// Reads scenario files. Main thread.
 class ScenarioReader {
   public:
+    /// Whether a scenario's own clock counts, or the present alone: in a live conversation.
+    enum class Clock { OfTheScenario, Present };
+
     /// `now` stands for the scenario's own clock where the file has none; ages in seconds count back from it.
-    explicit ScenarioReader(platform::Date now) : now_(now) {}
+    explicit ScenarioReader(platform::Date now, Clock clock = Clock::OfTheScenario) : now_(now), clock_(clock) {}
 
     std::variant<Scenario, ScenarioError> readFile(const std::string& file) const;
     /// `file` names the text in messages, and its folder is what relative paths start from.
@@ -22,6 +25,7 @@ class ScenarioReader {
 
   private:
     platform::Date now_;
+    Clock clock_;
 };
 
 }  // namespace ktr::app

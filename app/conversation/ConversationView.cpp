@@ -9,7 +9,15 @@ namespace ktr::app {
 
 void ConversationView::addTurn(const std::shared_ptr<TurnView>& turn) {
     turns_.push_back(turn);
+    if (softColor_) {
+        turn->setSoftColor(*softColor_);
+    }
     addSubview(turn);
+}
+
+void ConversationView::removeTurn(const std::shared_ptr<TurnView>& turn) {
+    std::erase(turns_, turn);
+    turn->removeFromSuperview();
 }
 
 double ConversationView::layOut(double width) {
@@ -32,8 +40,9 @@ double ConversationView::layOut(double width) {
 
 void ConversationView::setPalette(const linux_::Palette& palette) {
     const QColor& soft = palette.inkSoft;
+    softColor_ = platform::Color::rgb(soft.redF(), soft.greenF(), soft.blueF());
     for (const auto& turn : turns_) {
-        turn->setSoftColor(platform::Color::rgb(soft.redF(), soft.greenF(), soft.blueF()));
+        turn->setSoftColor(*softColor_);
     }
     setNeedsDisplay();
 }
@@ -45,6 +54,9 @@ void ConversationView::draw(platform::Canvas& canvas) const {
     }
     const QRectF visible = qt->painter().clipBoundingRect();
     for (const auto& turn : turns_) {
+        if (turn->card()->hidden()) {
+            continue;
+        }
         const platform::Rect card = turn->card()->frame().offsetBy(turn->frame().x, turn->frame().y);
         const QRectF shape = toQt(card);
         constexpr double kReach = CardShadow::kReach;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <optional>
 #include <vector>
 
 #include "app/conversation/CardShadow.h"
@@ -16,6 +17,7 @@ class ConversationView : public platform::View {
   public:
     /// Adds a turn at the end.
     void addTurn(const std::shared_ptr<TurnView>& turn);
+    void removeTurn(const std::shared_ptr<TurnView>& turn);
     const std::vector<std::shared_ptr<TurnView>>& turns() const { return turns_; }
     /// Lays everything out for a width and takes the height that it needs, which is returned; points.
     double layOut(double width);
@@ -27,6 +29,7 @@ class ConversationView : public platform::View {
 
   private:
     std::vector<std::shared_ptr<TurnView>> turns_;
+    std::optional<platform::Color> softColor_;
     /// Painting keeps what it blurred.
     mutable CardShadow shadow_;
 };

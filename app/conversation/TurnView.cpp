@@ -4,6 +4,7 @@
 
 #include "app/conversation/Measures.h"
 #include "app/conversation/Shapes.h"
+#include "app/conversation/WideColumns.h"
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/base/Platform.h"
 
@@ -47,6 +48,7 @@ bool TurnView::initWithFrame(const Rect& frame) {
     sentence_->setNumberOfLines(0);
     sentence_->setLineBreakMode(LineBreakMode::WordWrapping);
     card_ = create<CardView>(&CardView::initWithFrame, Rect{});
+    card_->setHidden(true);
     speech_->addSubview(time_);
     speech_->addSubview(bubble_);
     speech_->addSubview(sentence_);
@@ -59,8 +61,18 @@ void TurnView::setTexts(const TurnTexts& texts) {
     texts_ = texts;
     bubble_->setText(texts.question);
     bubble_->setHidden(texts.question.empty());
-    sentence_->setText(texts.sentence);
-    sentence_->setHidden(texts.sentence.empty());
+    setSentence(texts.sentence);
+}
+
+void TurnView::setSentence(const std::string& sentence) {
+    texts_.sentence = sentence;
+    sentence_->setText(sentence);
+    sentence_->setHidden(sentence.empty());
+}
+
+void TurnView::setController(const std::shared_ptr<HostSnippetViewController>& controller) {
+    card_->setController(controller);
+    card_->setHidden(false);
 }
 
 double TurnView::sentenceHeight(double width) const {
@@ -74,6 +86,9 @@ double TurnView::layOut(double width, bool first) {
 double TurnView::layOutNarrow(double width, bool first) {
     const double cardTop = layOutNarrowSpeech(width, first);
     speech_->setFrame({0.0, 0.0, width, cardTop});
+    if (card_->hidden()) {
+        return cardTop;
+    }
     const double cardWidth = width - 2.0 * measures::kGutter;
     const double cardHeight = card_->heightForWidth(cardWidth);
     place(*card_, {measures::kGutter, cardTop, cardWidth, cardHeight}, width);
@@ -109,13 +124,14 @@ double TurnView::layOutNarrowSpeech(double width, bool first) {
 }
 
 double TurnView::layOutWide(double width) {
-    const double cardWidth =
-        std::min(measures::kWideCard, width - 2.0 * measures::kMargin - measures::kSpeechColumn - measures::kColumnGap);
-    const double start = (width - (measures::kSpeechColumn + measures::kColumnGap + cardWidth)) / 2.0;
+    const WideColumns columns = WideColumns::of(width);
     const double speechHeight = layOutWideSpeech();
-    place(*speech_, {start, 0.0, measures::kSpeechColumn, speechHeight}, width);
-    const double cardHeight = card_->heightForWidth(cardWidth);
-    place(*card_, {start + measures::kSpeechColumn + measures::kColumnGap, 0.0, cardWidth, cardHeight}, width);
+    place(*speech_, {columns.speechStart, 0.0, measures::kSpeechColumn, speechHeight}, width);
+    if (card_->hidden()) {
+        return speechHeight;
+    }
+    const double cardHeight = card_->heightForWidth(columns.cardWidth);
+    place(*card_, {columns.cardStart, 0.0, columns.cardWidth, cardHeight}, width);
     return std::max(speechHeight, cardHeight);
 }
 

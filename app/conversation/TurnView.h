@@ -24,6 +24,9 @@ class TurnView : public platform::View {
   public:
     bool initWithFrame(const platform::Rect& frame) override;
     void setTexts(const TurnTexts& texts);
+    void setSentence(const std::string& sentence);
+    /// Puts an answer into the card, which is not shown before.
+    void setController(const std::shared_ptr<platform::HostSnippetViewController>& controller);
     /// Of the time.
     void setSoftColor(const platform::Color& color) { time_->setTextColor(color); }
     const std::shared_ptr<CardView>& card() const { return card_; }

@@ -11,8 +11,8 @@
 #include <optional>
 #include <thread>
 
-#include "app/JsonReader.h"
 #include "app/serve/AssistantAnswers.h"
+#include "linux/json/JsonReader.h"
 #include "platform/base/Json.h"
 
 namespace ktr::app {
@@ -231,7 +231,7 @@ class DevelopmentServer::Server {
     }
 
     std::string answer(const httplib::Request& request, const Fault& fault, httplib::Response& response) const {
-        const auto document = JsonReader::read(request.body);
+        const auto document = linux_::JsonReader::read(request.body);
         const auto* value = std::get_if<Value>(&document);
         std::string complaint = "expected a JSON object as the body";
         if (value != nullptr && value->dictionary() != nullptr) {

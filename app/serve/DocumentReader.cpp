@@ -4,25 +4,26 @@
 #include <fstream>
 #include <iterator>
 
-#include "app/JsonReader.h"
+#include "linux/json/JsonReader.h"
 
 namespace ktr::app {
 
 std::optional<ScenarioError> DocumentReader::readText(std::string_view text, const std::string& file,
                                                       const Read& read) {
-    const auto document = JsonReader::read(text);
-    if (const auto* error = std::get_if<JsonError>(&document)) {
+    const auto document = linux_::JsonReader::read(text);
+    if (const auto* error = std::get_if<linux_::JsonError>(&document)) {
         return ScenarioError{file, error->position, error->path.text(), error->message};
     }
     const auto& root = std::get<platform::Value>(document);
     if (root.dictionary() == nullptr) {
-        return ScenarioError{file, JsonReader::locate(text, {}), "$", "expected an object, found " + nameOfKind(root)};
+        return ScenarioError{file, linux_::JsonReader::locate(text, {}), "$",
+                             "expected an object, found " + nameOfKind(root)};
     }
     Complaints complaints;
     FieldReader fields(*root.dictionary(), {}, complaints);
     read(fields);
     if (complaints) {
-        return ScenarioError{file, JsonReader::locate(text, complaints->path), complaints->path.text(),
+        return ScenarioError{file, linux_::JsonReader::locate(text, complaints->path), complaints->path.text(),
                              complaints->message};
     }
     return std::nullopt;

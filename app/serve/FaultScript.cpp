@@ -4,8 +4,8 @@
 #include <cmath>
 #include <utility>
 
-#include "app/Words.h"
 #include "app/serve/DocumentReader.h"
+#include "linux/json/Words.h"
 
 namespace ktr::app {
 
@@ -34,7 +34,7 @@ Word readWord(FieldReader& fields, const std::string& name, const std::pair<cons
         }
         expected += (expected.empty() ? "" : ", ") + std::string(word);
     }
-    fields.complain(name, "expected one of " + expected + ", found " + inQuotes(*text));
+    fields.complain(name, "expected one of " + expected + ", found " + linux_::inQuotes(*text));
     return otherwise;
 }
 
@@ -143,7 +143,7 @@ std::optional<Fault> FaultScript::readWords(const std::string& words, std::strin
     for (const std::string& pair : pairs) {
         const std::size_t equals = pair.find('=');
         if (equals == 0 || equals == std::string::npos) {
-            complaint = "expected words such as status=503,at=2, found " + inQuotes(pair);
+            complaint = "expected words such as status=503,at=2, found " + linux_::inQuotes(pair);
             return std::nullopt;
         }
         const std::string name = pair.substr(0, equals);

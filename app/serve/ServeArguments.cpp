@@ -2,8 +2,8 @@
 
 #include <CLI/CLI.hpp>
 
-#include "app/Words.h"
 #include "app/serve/FaultScript.h"
+#include "linux/json/Words.h"
 
 namespace ktr::app {
 
@@ -81,10 +81,10 @@ std::string ServeArguments::read(ServeOptions& options) const {
     } else if (kind == "foreign") {
         options.certificate = CertificateKind::Foreign;
     } else {
-        return "--certificate: expected one of good, expired, wrong-host, foreign, found " + inQuotes(kind);
+        return "--certificate: expected one of good, expired, wrong-host, foreign, found " + linux_::inQuotes(kind);
     }
     if (options.personId.empty() || options.personId.find(':') != std::string::npos) {
-        return "--person: expected a text without \":\", found " + inQuotes(options.personId);
+        return "--person: expected a text without \":\", found " + linux_::inQuotes(options.personId);
     }
     return "";
 }

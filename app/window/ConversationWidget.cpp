@@ -107,6 +107,9 @@ void ConversationWidget::choosePalette() {
                             .arg(kBarWidth)
                             .arg(handle.name(QColor::HexArgb)));
     update();
+    if (paletteChanged_) {
+        paletteChanged_();
+    }
 }
 
 void ConversationWidget::layOut() {
@@ -175,8 +178,26 @@ void ConversationWidget::scrollToNewest() {
     }
 }
 
+void ConversationWidget::turnCame(TurnView& /*turn*/) {
+    layOut();
+    scrollToNewest();
+}
+
+void ConversationWidget::answerCame(TurnView& /*turn*/) {
+    layOut();
+}
+
+void ConversationWidget::setReducedMotion(bool reduced) {
+    reducedMotion_ = reduced;
+    animateRings();
+}
+
+void ConversationWidget::scrollBy(const QKeyEvent& key) {
+    keyPressEvent(const_cast<QKeyEvent*>(&key));
+}
+
 void ConversationWidget::animateRings() {
-    const bool still = nothingMoves(*this);
+    const bool still = reducedMotion_ || nothingMoves(*this);
     bool any = false;
     for (const auto& turn : host_.conversation()->turns()) {
         const auto& ring = turn->card()->ring();
@@ -360,7 +381,7 @@ void ConversationWidget::keyPressEvent(QKeyEvent* event) {
     const double page = height() - kArrowStep;
     // Taken here and not as shortcuts: those need a window manager that says which window is active.
     if (event->modifiers() == Qt::ControlModifier && (event->key() == Qt::Key_Q || event->key() == Qt::Key_W)) {
-        close();
+        window()->close();
         return;
     }
     switch (event->key()) {

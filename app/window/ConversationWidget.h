@@ -32,6 +32,15 @@ class ConversationWidget : public QWidget {
     void scrollTo(double y);
     /// Puts the newest turn at the top.
     void scrollToNewest();
+    /// What the arrow keys and the page keys do.
+    void scrollBy(const QKeyEvent& key);
+    /// A turn was added, which is the newest then; a turn got its answer.
+    void turnCame(TurnView& turn);
+    void answerCame(TurnView& turn);
+    void setReducedMotion(bool reduced);
+    const linux_::Palette& colors() const { return *palette_; }
+    /// Called after the colours have become others.
+    void setPaletteChanged(std::function<void()> changed) { paletteChanged_ = std::move(changed); }
     const RowFocus& rows() const { return rows_; }
     /// How often something was painted: what a test asks to see that only what changed is.
     const QRegion& lastPainted() const { return lastPainted_; }
@@ -70,6 +79,8 @@ class ConversationWidget : public QWidget {
     std::shared_ptr<platform::TouchDispatcher> touches_;
     RowFocus rows_;
     const linux_::Palette* palette_;
+    std::function<void()> paletteChanged_;
+    bool reducedMotion_ = false;
     QScrollBar* bar_;
     QTimer ringTimer_;
     QTimer flingTimer_;

@@ -5,7 +5,7 @@
 #include <QUrl>
 #include <cstdio>
 
-#include "app/window/ConversationWidget.h"
+#include "app/window/ConversationWindow.h"
 
 namespace ktr::app {
 
@@ -24,15 +24,16 @@ bool openOnDesktop(const platform::Url& url) {
 
 }  // namespace
 
-ExitCode ShowCommand::run() {
+ExitCode ShowCommand::run(const std::vector<Scenario>& scenarios) {
     QGuiApplication::setApplicationName(QStringLiteral("ktr"));
     host_.delegate().open = options_.printUrls ? printUrl : openOnDesktop;
-    ConversationWidget widget(host_);
-    widget.setWindowTitle(QStringLiteral("ktr"));
+    ConversationWindow window(host_);
+    window.setReducedMotion(options_.reducedMotion);
+    window.setWindowTitle(QStringLiteral("ktr"));
     const int width = static_cast<int>(host_.settings().width);
-    widget.resize(width, width < 900 ? kTallWindow : kWideWindow);
-    widget.show();
-    widget.scrollToNewest();
+    window.resize(width, width < 900 ? kTallWindow : kWideWindow);
+    window.show();
+    window.start(scenarios, options_.questions);
     return QApplication::exec() == 0 ? ExitCode::Ok : ExitCode::Failure;
 }
 

@@ -10,7 +10,8 @@ namespace ktr::app {
 class ShowCommand {
   public:
     ShowCommand(Host& host, const Options& options) : host_(host), options_(options) {}
-    ExitCode run();
+    /// The scenarios are those that come once the account is read, where the window is live.
+    ExitCode run(const std::vector<Scenario>& scenarios);
 
   private:
     Host& host_;

@@ -33,6 +33,8 @@ struct Configuration {
     std::optional<Account> account;
     /// Files with certificates (PEM) that are trusted besides the system's; absolute paths.
     std::vector<std::string> certificates;
+    /// vCard files, or folders of them: the user's contacts; absolute paths.
+    std::vector<std::string> contacts;
     std::optional<std::string> language;  ///< the assistant's, BCP 47
     /// The country of the geographic services: two letters in upper case.
     std::optional<std::string> geographicCountry;

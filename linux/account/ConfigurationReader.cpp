@@ -222,6 +222,9 @@ void readAll(Members& members, const std::filesystem::path& file, Configuration&
     for (const std::string& certificate : members.texts("certificates")) {
         configuration.certificates.push_back(resolved(certificate, file));
     }
+    for (const std::string& contacts : members.texts("contacts")) {
+        configuration.contacts.push_back(resolved(contacts, file));
+    }
     configuration.language = members.text("language");
     configuration.geographicCountry = members.text("geographicCountry");
     if (configuration.geographicCountry) {

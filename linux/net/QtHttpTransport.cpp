@@ -2,13 +2,13 @@
 
 #include <QMetaObject>
 #include <QPointer>
-#include <QSslCertificate>
 #include <QSslConfiguration>
 
 #include <utility>
 #include <vector>
 
 #include "linux/net/CommandExchange.h"
+#include "linux/net/TlsTrust.h"
 #include "platform/base/Log.h"
 
 namespace ktr::linux_ {
@@ -17,21 +17,6 @@ using platform::HttpAnswer;
 using platform::HttpFailure;
 
 namespace {
-
-QSslConfiguration tlsFor(const QtHttpTransport::Settings& settings) {
-    QSslConfiguration tls = QSslConfiguration::defaultConfiguration();
-    tls.setProtocol(QSsl::TlsV1_2OrLater);
-    tls.setPeerVerifyMode(QSslSocket::VerifyPeer);
-    // The system's authorities are in it already, each read when it is asked for: setting them would read all.
-    for (const std::string& file : settings.certificateFiles) {
-        const auto certificates = QSslCertificate::fromPath(QString::fromStdString(file), QSsl::Pem);
-        if (certificates.isEmpty()) {
-            platform::platformLog().write(platform::LogLevel::Error, "No certificate can be read from %@", file);
-        }
-        tls.addCaCertificates(certificates);
-    }
-    return tls;
-}
 
 const char* wordsFor(HttpFailure failure) {
     switch (failure) {
@@ -93,7 +78,7 @@ class QtHttpTransport::Worker : public QObject {
         prepared_ = true;
         current_ = settings;
         policy_ = ServicePolicy(settings.serviceHost.value_or(""), settings.domains);
-        tls_ = tlsFor(settings);
+        tls_ = TlsTrust::configuration(settings.certificateFiles);
     }
 
     /// Those that are over are none.

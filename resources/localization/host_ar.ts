@@ -38,5 +38,95 @@
         <extracomment>A built-in name for a place. English: “Other”</extracomment>
         <translation>مكان آخر</translation>
     </message>
+    <message>
+        <source>ASK_FIELD</source>
+        <extracomment>What stands in the empty field, and its name for a screen reader. English: “Ask about your friends”</extracomment>
+        <translation>اسأل عن أصدقائك</translation>
+    </message>
+    <message>
+        <source>ASK_SEND</source>
+        <extracomment>The button that sends the question. English: “Send”</extracomment>
+        <translation>إرسال</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_NOW</source>
+        <extracomment>Status line: answers keep coming. English: “Live · updated just now”</extracomment>
+        <translation>مباشر · تم التحديث الآن</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_SECONDS</source>
+        <extracomment>The same; %@ is a number of seconds. English: “Live · updated %@ s ago”</extracomment>
+        <translation>مباشر · تم التحديث قبل %@ ث</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_MINUTES</source>
+        <extracomment>The same; %@ is a number of minutes. English: “Live · updated %@ min ago”</extracomment>
+        <translation>مباشر · تم التحديث قبل %@ د</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_HOURS</source>
+        <extracomment>The same; %@ is a number of hours. English: “Live · updated %@ h ago”</extracomment>
+        <translation>مباشر · تم التحديث قبل %@ س</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_NOW</source>
+        <extracomment>Status line: no more answers come by themselves. English: “Paused · updated just now”</extracomment>
+        <translation>متوقف مؤقتًا · تم التحديث الآن</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_SECONDS</source>
+        <extracomment>The same; %@ is a number of seconds. English: “Paused · updated %@ s ago”</extracomment>
+        <translation>متوقف مؤقتًا · تم التحديث قبل %@ ث</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_MINUTES</source>
+        <extracomment>The same; %@ is a number of minutes. English: “Paused · updated %@ min ago”</extracomment>
+        <translation>متوقف مؤقتًا · تم التحديث قبل %@ د</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_HOURS</source>
+        <extracomment>The same; %@ is a number of hours. English: “Paused · updated %@ h ago”</extracomment>
+        <translation>متوقف مؤقتًا · تم التحديث قبل %@ س</translation>
+    </message>
+    <message>
+        <source>STATUS_FINDING_YOU</source>
+        <extracomment>Status line: the user's own position is looked for. English: “Finding where you are…”</extracomment>
+        <translation>جارٍ تحديد موقعك…</translation>
+    </message>
+    <message>
+        <source>STATUS_ASKING</source>
+        <extracomment>Status line: a question waits for its answer. English: “Asking…”</extracomment>
+        <translation>جارٍ السؤال…</translation>
+    </message>
+    <message>
+        <source>STATUS_OFFLINE</source>
+        <extracomment>Status line: the service cannot be reached, and nothing is on screen. English: “Offline.”</extracomment>
+        <translation>لا يوجد اتصال.</translation>
+    </message>
+    <message>
+        <source>STATUS_OFFLINE_SINCE</source>
+        <extracomment>The same with an answer on screen; %@ is the time of day when it was known. English: “Offline. Showing what was known at %@.”</extracomment>
+        <translation>لا يوجد اتصال. المعروض هو آخر ما عُرف في %@.</translation>
+    </message>
+    <message>
+        <source>STATUS_SIGN_IN</source>
+        <extracomment>Status line: the service does not take the account's credentials, or there is no account. English: “Sign in again to see your friends.”</extracomment>
+        <translation>سجّل الدخول من جديد لرؤية أصدقائك.</translation>
+    </message>
+    <message>
+        <source>ANSWER_UNREACHABLE</source>
+        <extracomment>Below a question that nobody answered. English: “Your assistant is out of reach right now.”</extracomment>
+        <translation>يتعذّر الوصول إلى مساعدك حاليًا.</translation>
+    </message>
+    <message>
+        <source>ANSWER_SIGN_IN</source>
+        <extracomment>Below a question that was asked without an account. English: “Sign in to ask about your friends.”</extracomment>
+        <translation>سجّل الدخول للسؤال عن أصدقائك.</translation>
+    </message>
+    <message>
+        <source>ANSWER_NOT_SHOWN</source>
+        <extracomment>Below a question whose answer is of a kind that cannot be shown. English: “This answer cannot be shown here.”</extracomment>
+        <translation>لا يمكن عرض هذه الإجابة هنا.</translation>
+    </message>
 </context>
 </TS>

@@ -38,5 +38,95 @@
         <extracomment>A built-in name for a place. English: “Other”</extracomment>
         <translation>Anderer Ort</translation>
     </message>
+    <message>
+        <source>ASK_FIELD</source>
+        <extracomment>What stands in the empty field, and its name for a screen reader. English: “Ask about your friends”</extracomment>
+        <translation>Frag nach deinen Freunden</translation>
+    </message>
+    <message>
+        <source>ASK_SEND</source>
+        <extracomment>The button that sends the question. English: “Send”</extracomment>
+        <translation>Senden</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_NOW</source>
+        <extracomment>Status line: answers keep coming. English: “Live · updated just now”</extracomment>
+        <translation>Live · gerade aktualisiert</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_SECONDS</source>
+        <extracomment>The same; %@ is a number of seconds. English: “Live · updated %@ s ago”</extracomment>
+        <translation>Live · vor %@ Sek. aktualisiert</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_MINUTES</source>
+        <extracomment>The same; %@ is a number of minutes. English: “Live · updated %@ min ago”</extracomment>
+        <translation>Live · vor %@ Min. aktualisiert</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_HOURS</source>
+        <extracomment>The same; %@ is a number of hours. English: “Live · updated %@ h ago”</extracomment>
+        <translation>Live · vor %@ Std. aktualisiert</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_NOW</source>
+        <extracomment>Status line: no more answers come by themselves. English: “Paused · updated just now”</extracomment>
+        <translation>Pausiert · gerade aktualisiert</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_SECONDS</source>
+        <extracomment>The same; %@ is a number of seconds. English: “Paused · updated %@ s ago”</extracomment>
+        <translation>Pausiert · vor %@ Sek. aktualisiert</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_MINUTES</source>
+        <extracomment>The same; %@ is a number of minutes. English: “Paused · updated %@ min ago”</extracomment>
+        <translation>Pausiert · vor %@ Min. aktualisiert</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_HOURS</source>
+        <extracomment>The same; %@ is a number of hours. English: “Paused · updated %@ h ago”</extracomment>
+        <translation>Pausiert · vor %@ Std. aktualisiert</translation>
+    </message>
+    <message>
+        <source>STATUS_FINDING_YOU</source>
+        <extracomment>Status line: the user's own position is looked for. English: “Finding where you are…”</extracomment>
+        <translation>Dein Standort wird gesucht …</translation>
+    </message>
+    <message>
+        <source>STATUS_ASKING</source>
+        <extracomment>Status line: a question waits for its answer. English: “Asking…”</extracomment>
+        <translation>Frage läuft …</translation>
+    </message>
+    <message>
+        <source>STATUS_OFFLINE</source>
+        <extracomment>Status line: the service cannot be reached, and nothing is on screen. English: “Offline.”</extracomment>
+        <translation>Offline.</translation>
+    </message>
+    <message>
+        <source>STATUS_OFFLINE_SINCE</source>
+        <extracomment>The same with an answer on screen; %@ is the time of day when it was known. English: “Offline. Showing what was known at %@.”</extracomment>
+        <translation>Offline. Stand von %@.</translation>
+    </message>
+    <message>
+        <source>STATUS_SIGN_IN</source>
+        <extracomment>Status line: the service does not take the account's credentials, or there is no account. English: “Sign in again to see your friends.”</extracomment>
+        <translation>Melde dich wieder an, um deine Freunde zu sehen.</translation>
+    </message>
+    <message>
+        <source>ANSWER_UNREACHABLE</source>
+        <extracomment>Below a question that nobody answered. English: “Your assistant is out of reach right now.”</extracomment>
+        <translation>Dein Assistent ist gerade nicht erreichbar.</translation>
+    </message>
+    <message>
+        <source>ANSWER_SIGN_IN</source>
+        <extracomment>Below a question that was asked without an account. English: “Sign in to ask about your friends.”</extracomment>
+        <translation>Melde dich an, um nach deinen Freunden zu fragen.</translation>
+    </message>
+    <message>
+        <source>ANSWER_NOT_SHOWN</source>
+        <extracomment>Below a question whose answer is of a kind that cannot be shown. English: “This answer cannot be shown here.”</extracomment>
+        <translation>Diese Antwort kann hier nicht gezeigt werden.</translation>
+    </message>
 </context>
 </TS>

@@ -38,5 +38,95 @@
         <extracomment>A built-in name for a place</extracomment>
         <translation>Other</translation>
     </message>
+    <message>
+        <source>ASK_FIELD</source>
+        <extracomment>What stands in the empty field, and its name for a screen reader</extracomment>
+        <translation>Ask about your friends</translation>
+    </message>
+    <message>
+        <source>ASK_SEND</source>
+        <extracomment>The button that sends the question</extracomment>
+        <translation>Send</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_NOW</source>
+        <extracomment>Status line: answers keep coming</extracomment>
+        <translation>Live · updated just now</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_SECONDS</source>
+        <extracomment>The same; %@ is a number of seconds</extracomment>
+        <translation>Live · updated %@ s ago</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_MINUTES</source>
+        <extracomment>The same; %@ is a number of minutes</extracomment>
+        <translation>Live · updated %@ min ago</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_HOURS</source>
+        <extracomment>The same; %@ is a number of hours</extracomment>
+        <translation>Live · updated %@ h ago</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_NOW</source>
+        <extracomment>Status line: no more answers come by themselves</extracomment>
+        <translation>Paused · updated just now</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_SECONDS</source>
+        <extracomment>The same; %@ is a number of seconds</extracomment>
+        <translation>Paused · updated %@ s ago</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_MINUTES</source>
+        <extracomment>The same; %@ is a number of minutes</extracomment>
+        <translation>Paused · updated %@ min ago</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_HOURS</source>
+        <extracomment>The same; %@ is a number of hours</extracomment>
+        <translation>Paused · updated %@ h ago</translation>
+    </message>
+    <message>
+        <source>STATUS_FINDING_YOU</source>
+        <extracomment>Status line: the user's own position is looked for</extracomment>
+        <translation>Finding where you are…</translation>
+    </message>
+    <message>
+        <source>STATUS_ASKING</source>
+        <extracomment>Status line: a question waits for its answer</extracomment>
+        <translation>Asking…</translation>
+    </message>
+    <message>
+        <source>STATUS_OFFLINE</source>
+        <extracomment>Status line: the service cannot be reached, and nothing is on screen</extracomment>
+        <translation>Offline.</translation>
+    </message>
+    <message>
+        <source>STATUS_OFFLINE_SINCE</source>
+        <extracomment>The same with an answer on screen; %@ is the time of day when it was known</extracomment>
+        <translation>Offline. Showing what was known at %@.</translation>
+    </message>
+    <message>
+        <source>STATUS_SIGN_IN</source>
+        <extracomment>Status line: the service does not take the account's credentials, or there is no account</extracomment>
+        <translation>Sign in again to see your friends.</translation>
+    </message>
+    <message>
+        <source>ANSWER_UNREACHABLE</source>
+        <extracomment>Below a question that nobody answered</extracomment>
+        <translation>Your assistant is out of reach right now.</translation>
+    </message>
+    <message>
+        <source>ANSWER_SIGN_IN</source>
+        <extracomment>Below a question that was asked without an account</extracomment>
+        <translation>Sign in to ask about your friends.</translation>
+    </message>
+    <message>
+        <source>ANSWER_NOT_SHOWN</source>
+        <extracomment>Below a question whose answer is of a kind that cannot be shown</extracomment>
+        <translation>This answer cannot be shown here.</translation>
+    </message>
 </context>
 </TS>

@@ -78,11 +78,36 @@ TEST(KTRCommandLineTest, Version_IsPrinted) {
     EXPECT_EQ(version.text.rfind("ktr ", 0), 0u);
 }
 
+TEST(KTRCommandLineTest, Live_IsAWindowWithoutScenariosAndWhatSaysSo) {
+    EXPECT_TRUE(parsed({"show"}).live);
+    EXPECT_FALSE(parsed({"show", "a.json"}).live);
+    EXPECT_TRUE(parsed({"show", "a.json", "--live"}).live);
+    EXPECT_FALSE(parsed({"describe", "a.json"}).live);
+    EXPECT_TRUE(parsed({"describe", "a.json", "--live", "5s"}).live);
+    const auto asked = parsed({"render", "--live", "1.5s", "--ask", "one", "--ask", "two", "-o", "a.png"});
+    EXPECT_TRUE(asked.live);
+    EXPECT_EQ(asked.questions, (std::vector<std::string>{"one", "two"}));
+    EXPECT_EQ(asked.liveSeconds, 1.5);
+    EXPECT_EQ(parsed({"describe", "a.json", "--live", "250ms"}).liveSeconds, 0.25);
+    EXPECT_EQ(parsed({"describe", "a.json", "--live", "2m"}).liveSeconds, 120.0);
+    EXPECT_EQ(parsed({"describe", "a.json", "--live", "7"}).liveSeconds, 7.0);
+}
+
 TEST(KTRCommandLineTest, Misuse_IsToldWithStatusTwo) {
     const std::vector<std::vector<std::string>> cases = {
         {},
         {"paint"},
-        {"show"},
+        {"render", "-o", "a.png"},
+        {"describe"},
+        {"describe", "--live", "5s"},
+        {"describe", "--ask", "where is ann"},
+        {"describe", "a.json", "--ask", "where is ann"},
+        {"describe", "a.json", "--live", "0s"},
+        {"describe", "a.json", "--live", "soon"},
+        {"describe", "a.json", "--live", "5h"},
+        {"describe", "a.json", "--live", "2d"},
+        {"describe", "a.json", "--live", "5s", "--at", "+5"},
+        {"show", "a.json", "--ask", "where is ann"},
         {"render", "a.json"},
         {"render", "a.json", "-o", "a.gif"},
         {"render", "a.json", "-o", ".png"},

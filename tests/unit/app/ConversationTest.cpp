@@ -53,7 +53,7 @@ class KTRConversationTest : public test::PlatformTest {
         auto turn = create<TurnView>(&TurnView::initWithFrame, Rect{});
         turn->setTexts({"Today, 17:42", "17:42", question, sentence});
         controller = create<FixedController>(&FixedController::init);
-        turn->card()->setController(controller);
+        turn->setController(controller);
         conversation->addTurn(turn);
         return turn;
     }

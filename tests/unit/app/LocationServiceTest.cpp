@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "app/JsonReader.h"
+#include "linux/json/JsonReader.h"
 #include "platform/base/Json.h"
 
 namespace ktr::test {
@@ -30,7 +30,7 @@ class LocationServiceTest : public ::testing::Test {
         return file;
     }
     std::string answer(const std::string& request, const Fault& fault = {}) const {
-        const auto read = app::JsonReader::read(request);
+        const auto read = linux_::JsonReader::read(request);
         std::string complaint;
         const auto given = service.getLocations(*std::get<platform::Value>(read).dictionary(), {0.0, 1700000000123.4},
                                                 fault, complaint);

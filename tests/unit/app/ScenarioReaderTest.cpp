@@ -84,6 +84,23 @@ TEST_F(KTRScenarioReaderTest, AbsentAndNull_BothReadAsNone) {
     EXPECT_FALSE(snippet->searchContext);
 }
 
+TEST_F(KTRScenarioReaderTest, Sentence_MayBeTheWholeAnswer) {
+    const Scenario scenario = read(R"({"question": "Tell me a joke", "sentence": "I know none."})");
+    EXPECT_EQ(scenario.snippet, nullptr);
+    EXPECT_EQ(scenario.sentence.text("en"), "I know none.");
+}
+
+TEST_F(KTRScenarioReaderTest, Clock_OfTheScenarioDoesNotCountInALiveConversation) {
+    const auto live = ScenarioReader({kNow}, ScenarioReader::Clock::Present)
+                          .readText(R"({"clock": "2001-01-01T01:00:00Z",
+                              "snippet": {"kind": "VAKtrLocationSnippet", "locations": [{"ageSeconds": 60}]}})",
+                                    "live.json");
+    const auto& scenario = std::get<Scenario>(live);
+    EXPECT_FALSE(scenario.clock);
+    const auto& snippet = dynamic_cast<platform::VAKtrLocationSnippet&>(*scenario.snippet);
+    EXPECT_EQ(snippet.locations->front()->locationDate, kNow - 60.0);
+}
+
 TEST_F(KTRScenarioReaderTest, AgeSeconds_CountsBackFromTheScenariosClock) {
     const auto snippet = locations(R"([{"ageSeconds": 90}])");
     EXPECT_EQ(snippet->locations->front()->locationDate, kNow - 90.0);

@@ -1,10 +1,10 @@
-#include "app/JsonReader.h"
+#include "linux/json/JsonReader.h"
 
 #include <gtest/gtest.h>
 
 #include "platform/base/Json.h"
 
-namespace ktr::app {
+namespace ktr::linux_ {
 
 namespace {
 
@@ -108,4 +108,4 @@ TEST(KTRJsonReaderTest, Path_QuotesWhatIsNoIdentifierAndShortensLongNames) {
 
 }  // namespace
 
-}  // namespace ktr::app
+}  // namespace ktr::linux_

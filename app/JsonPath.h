@@ -1,9 +1,0 @@
-#pragma once
-
-#include "linux/json/JsonPath.h"
-
-namespace ktr::app {
-
-using linux_::JsonPath;
-
-}  // namespace ktr::app

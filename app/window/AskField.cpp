@@ -1,0 +1,118 @@
+#include "app/window/AskField.h"
+
+#include <QFocusEvent>
+#include <QPainter>
+
+#include "linux/ui/FontChoice.h"
+#include "platform/ui/Font.h"
+
+namespace ktr::app {
+
+namespace {
+
+constexpr int kStart = 14;
+constexpr int kEnd = 5;  ///< so that the button's circle and the field's end have one centre
+constexpr int kRingOutside = 4;
+
+QFont fieldFont() {
+    const auto font = platform::preferredFont(platform::TextStyle::Body);
+    return linux_::FontChoice::spec(font, static_cast<int>(font.size), linux_::FontChoice::baseFamily()).font();
+}
+
+void strokeRound(QPainter& painter, const QRectF& rect, const QColor& color, double width) {
+    const QRectF inner = rect.adjusted(width / 2.0, width / 2.0, -width / 2.0, -width / 2.0);
+    painter.setPen(QPen(color, width));
+    painter.setBrush(Qt::NoBrush);
+    painter.drawRoundedRect(inner, inner.height() / 2.0, inner.height() / 2.0);
+}
+
+}  // namespace
+
+AskField::AskField(const Texts& texts, QWidget* parent)
+    : QWidget(parent),
+      edit_(new QuestionEdit(this)),
+      button_(new SendButton(this)),
+      palette_(&linux_::Palette::of(linux_::ColorScheme::Light)) {
+    edit_->setFont(fieldFont());
+    edit_->setPlaceholderText(QString::fromStdString(texts.placeholder));
+    edit_->setAccessibleName(QString::fromStdString(texts.placeholder));
+    button_->setAccessibleName(QString::fromStdString(texts.send));
+    button_->setToolTip(QString::fromStdString(texts.send));
+    setCursor(Qt::IBeamCursor);
+    setTabOrder(edit_, button_);
+    edit_->installEventFilter(this);
+    button_->installEventFilter(this);
+    connect(edit_, &QLineEdit::textChanged, this,
+            [this](const QString& text) { button_->setReady(!text.trimmed().isEmpty(), animated_); });
+    connect(edit_, &QLineEdit::returnPressed, this, [this] { send(); });
+    connect(button_, &QAbstractButton::clicked, this, [this] { send(); });
+}
+
+void AskField::send() {
+    const QString text = edit_->text().trimmed();
+    if (text.isEmpty()) {
+        return;
+    }
+    edit_->clear();
+    edit_->setFocus();
+    if (asked_) {
+        asked_(text.toStdString());
+    }
+}
+
+void AskField::setColors(const linux_::Palette& palette) {
+    palette_ = &palette;
+    edit_->setColors(palette);
+    button_->setColors(palette);
+    update();
+}
+
+void AskField::markFocus(bool byKey) {
+    marksFocus_ = byKey;
+    button_->setMarksFocus(byKey);
+    update();
+}
+
+bool AskField::eventFilter(QObject* object, QEvent* event) {
+    if (event->type() == QEvent::FocusIn) {
+        const auto reason = static_cast<QFocusEvent*>(event)->reason();
+        markFocus(reason == Qt::TabFocusReason || reason == Qt::BacktabFocusReason ||
+                  reason == Qt::ShortcutFocusReason);
+    } else if (event->type() == QEvent::FocusOut || event->type() == QEvent::MouseButtonPress) {
+        markFocus(false);
+    }
+    return QWidget::eventFilter(object, event);
+}
+
+void AskField::mousePressEvent(QMouseEvent*) {
+    edit_->setFocus(Qt::MouseFocusReason);
+}
+
+void AskField::resizeEvent(QResizeEvent*) {
+    const int buttonSize = button_->sizeHint().width();
+    const int editWidth = width() - 2 * kAround - kStart - kEnd - SendButton::kDiameter - kStart / 2;
+    const int editHeight = kHeight - 8;
+    const bool mirrored = layoutDirection() == Qt::RightToLeft;
+    const int buttonX = kAround + kEnd - SendButton::kAround;
+    button_->setGeometry(mirrored ? buttonX : width() - buttonX - buttonSize, (height() - buttonSize) / 2, buttonSize,
+                         buttonSize);
+    const int editX = kAround + kStart;
+    edit_->setGeometry(mirrored ? width() - editX - editWidth : editX, (height() - editHeight) / 2, editWidth,
+                       editHeight);
+}
+
+void AskField::paintEvent(QPaintEvent*) {
+    QPainter painter(this);
+    painter.setRenderHint(QPainter::Antialiasing);
+    const QRectF shape = QRectF(rect()).adjusted(kAround, kAround, -kAround, -kAround);
+    painter.setPen(Qt::NoPen);
+    painter.setBrush(palette_->card);
+    painter.drawRoundedRect(shape, shape.height() / 2.0, shape.height() / 2.0);
+    strokeRound(painter, shape, palette_->fieldLine, 1.0);
+    if (marksFocus_ && edit_->hasFocus()) {
+        const double out = kRingOutside;
+        strokeRound(painter, shape.adjusted(-out, -out, out, out), palette_->pine, palette_->focusRing);
+    }
+}
+
+}  // namespace ktr::app

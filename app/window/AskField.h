@@ -1,0 +1,52 @@
+#pragma once
+
+#include <QWidget>
+#include <functional>
+#include <string>
+
+#include "app/window/QuestionEdit.h"
+#include "app/window/SendButton.h"
+
+namespace ktr::app {
+
+/// The field in which questions are typed. Its shape is inset by `kAround`, where the ring of the keyboard's focus
+/// stands. Main thread.
+class AskField : public QWidget {
+  public:
+    static constexpr int kHeight = 48;
+    static constexpr int kAround = 7;
+
+    struct Texts {
+        std::string placeholder;
+        std::string send;
+    };
+
+    explicit AskField(const Texts& texts, QWidget* parent = nullptr);
+
+    /// Called with what was typed, which is not blank; the field is empty then.
+    void setAsked(std::function<void(const std::string&)> asked) { asked_ = std::move(asked); }
+    void setColors(const linux_::Palette& palette);
+    void setAnimated(bool animated) { animated_ = animated; }
+    QLineEdit& edit() const { return *edit_; }
+    SendButton& button() const { return *button_; }
+
+  protected:
+    void paintEvent(QPaintEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
+    void mousePressEvent(QMouseEvent* event) override;
+    bool eventFilter(QObject* object, QEvent* event) override;
+
+  private:
+    void send();
+    /// The ring is shown only where a key brought the focus.
+    void markFocus(bool byKey);
+
+    QuestionEdit* edit_;
+    SendButton* button_;
+    std::function<void(const std::string&)> asked_;
+    const linux_::Palette* palette_;
+    bool animated_ = true;
+    bool marksFocus_ = false;
+};
+
+}  // namespace ktr::app

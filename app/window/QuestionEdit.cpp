@@ -1,0 +1,89 @@
+#include "app/window/QuestionEdit.h"
+
+#include <QGuiApplication>
+#include <QPainter>
+#include <QProxyStyle>
+#include <QStyleHints>
+
+namespace ktr::app {
+
+namespace {
+
+constexpr int kCaretWidth = 2;
+/// What Qt adds before the caret in the rectangle that it gives.
+constexpr int kCaretSlack = 5;
+
+}  // namespace
+
+/// Qt's own caret has the colour of the text.
+class QuestionEdit::CaretlessStyle : public QProxyStyle {
+  public:
+    int pixelMetric(PixelMetric metric, const QStyleOption* option, const QWidget* widget) const override {
+        return metric == PM_TextCursorWidth ? 0 : QProxyStyle::pixelMetric(metric, option, widget);
+    }
+};
+
+QuestionEdit::QuestionEdit(QWidget* parent) : QLineEdit(parent), style_(std::make_unique<CaretlessStyle>()) {
+    setStyle(style_.get());
+    setFrame(false);
+    setTextMargins(0, 0, 0, 0);
+    connect(&blink_, &QTimer::timeout, this, [this] {
+        caretShown_ = !caretShown_;
+        update(caret());
+    });
+    connect(this, &QLineEdit::cursorPositionChanged, this, [this] { showCaret(); });
+    connect(this, &QLineEdit::textChanged, this, [this] { showCaret(); });
+}
+
+QuestionEdit::~QuestionEdit() = default;
+
+void QuestionEdit::setColors(const linux_::Palette& palette) {
+    pine_ = palette.pine;
+    QPalette colors = this->palette();
+    colors.setColor(QPalette::Base, Qt::transparent);
+    colors.setColor(QPalette::Window, Qt::transparent);
+    colors.setColor(QPalette::Text, palette.ink);
+    colors.setColor(QPalette::PlaceholderText, palette.inkSoft);
+    colors.setColor(QPalette::Highlight, palette.pine);
+    colors.setColor(QPalette::HighlightedText, palette.onPine);
+    setPalette(colors);
+}
+
+QRect QuestionEdit::caret() const {
+    const QRect around = cursorRect();
+    return {std::min(around.x() + kCaretSlack, width() - kCaretWidth), around.y(), kCaretWidth, around.height()};
+}
+
+void QuestionEdit::showCaret() {
+    if (!hasFocus()) {
+        return;
+    }
+    caretShown_ = true;
+    const int time = QGuiApplication::styleHints()->cursorFlashTime();
+    if (time > 0) {
+        blink_.start(time / 2);
+    }
+    update();
+}
+
+void QuestionEdit::paintEvent(QPaintEvent* event) {
+    QLineEdit::paintEvent(event);
+    if (hasFocus() && caretShown_) {
+        QPainter painter(this);
+        painter.fillRect(caret(), pine_);
+    }
+}
+
+void QuestionEdit::focusInEvent(QFocusEvent* event) {
+    QLineEdit::focusInEvent(event);
+    showCaret();
+}
+
+void QuestionEdit::focusOutEvent(QFocusEvent* event) {
+    blink_.stop();
+    caretShown_ = false;
+    QLineEdit::focusOutEvent(event);
+    update();
+}
+
+}  // namespace ktr::app

@@ -1,0 +1,92 @@
+#include "app/window/StatusLine.h"
+
+#include <QPainter>
+#include <QPainterPath>
+#include <cmath>
+
+#include "linux/ui/FontChoice.h"
+#include "platform/ui/Font.h"
+
+namespace ktr::app {
+
+namespace {
+
+constexpr double kDot = 8.0;
+constexpr double kRingStroke = 1.5;
+constexpr double kWarning = 14.0;
+constexpr double kWarningStroke = 1.5;
+
+QPainterPath warningPath() {
+    QPainterPath path;
+    path.moveTo(7.0, 1.6);
+    path.lineTo(13.0, 12.2);
+    path.lineTo(1.0, 12.2);
+    path.closeSubpath();
+    path.moveTo(7.0, 5.4);
+    path.lineTo(7.0, 8.6);
+    path.moveTo(7.0, 10.5);
+    path.lineTo(7.0, 10.52);
+    return path;
+}
+
+}  // namespace
+
+StatusLine::StatusLine(QWidget* parent)
+    : QWidget(parent), words_(new QLabel(this)), palette_(&linux_::Palette::of(linux_::ColorScheme::Light)) {
+    const auto font = platform::preferredFont(platform::TextStyle::Footnote);
+    lineHeight_ = static_cast<int>(std::ceil(font.lineHeight()));
+    words_->setFont(
+        linux_::FontChoice::spec(font, static_cast<int>(font.size), linux_::FontChoice::baseFamily()).font());
+    words_->setTextFormat(Qt::PlainText);
+}
+
+void StatusLine::setStatus(const LiveStatus& status) {
+    const QString words = QString::fromStdString(status.words);
+    if (words_->text() != words) {
+        words_->setText(words);
+    }
+    if (mark_ != status.mark) {
+        mark_ = status.mark;
+        update();
+    }
+}
+
+void StatusLine::setColors(const linux_::Palette& palette) {
+    palette_ = &palette;
+    QPalette colors = words_->palette();
+    colors.setColor(QPalette::WindowText, palette.inkSoft);
+    words_->setPalette(colors);
+    update();
+}
+
+void StatusLine::resizeEvent(QResizeEvent*) {
+    const bool mirrored = layoutDirection() == Qt::RightToLeft;
+    words_->setGeometry(mirrored ? 0 : kWords, 0, std::max(width() - kWords, 0), height());
+}
+
+void StatusLine::paintEvent(QPaintEvent*) {
+    QPainter painter(this);
+    painter.setRenderHint(QPainter::Antialiasing);
+    const bool mirrored = layoutDirection() == Qt::RightToLeft;
+    const QPointF centre(mirrored ? width() - kMarkCentre : kMarkCentre, height() / 2.0 + 0.5);
+    switch (mark_) {
+        case LiveStatus::Mark::Live:
+            painter.setPen(Qt::NoPen);
+            painter.setBrush(palette_->pine);
+            painter.drawEllipse(centre, kDot / 2.0, kDot / 2.0);
+            break;
+        case LiveStatus::Mark::Waiting:
+            painter.setPen(QPen(palette_->inkSoft, kRingStroke));
+            painter.drawEllipse(centre, (kDot - kRingStroke) / 2.0, (kDot - kRingStroke) / 2.0);
+            break;
+        case LiveStatus::Mark::Warning:
+            painter.translate(centre - QPointF(kWarning / 2.0, kWarning / 2.0));
+            painter.setPen(QPen(palette_->warning, kWarningStroke, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
+            painter.drawPath(warningPath());
+            break;
+        case LiveStatus::Mark::None:
+            break;
+    }
+}
+
+}  // namespace ktr::app

@@ -1,0 +1,36 @@
+#pragma once
+
+#include <QLabel>
+#include <QWidget>
+
+#include "app/live/LiveStatus.h"
+#include "linux/ui/Palette.h"
+
+namespace ktr::app {
+
+/// One line: a mark and words. Main thread.
+class StatusLine : public QWidget {
+  public:
+    /// From the line's start edge: the mark's centre and the words.
+    static constexpr int kMarkCentre = 19;
+    static constexpr int kWords = 33;
+
+    explicit StatusLine(QWidget* parent = nullptr);
+
+    void setStatus(const LiveStatus& status);
+    void setColors(const linux_::Palette& palette);
+    QString words() const { return words_->text(); }
+    int lineHeight() const { return lineHeight_; }
+
+  protected:
+    void paintEvent(QPaintEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
+
+  private:
+    QLabel* words_;
+    const linux_::Palette* palette_;
+    LiveStatus::Mark mark_ = LiveStatus::Mark::None;
+    int lineHeight_ = 0;
+};
+
+}  // namespace ktr::app

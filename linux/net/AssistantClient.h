@@ -1,0 +1,59 @@
+#pragma once
+
+#include <QThread>
+#include <functional>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "platform/client/HttpTransport.h"
+
+namespace ktr::linux_ {
+
+/// Asks the assistant's server a question (docs/service-protocol.md), over HTTPS with the trust of TlsTrust, on a
+/// thread of its own. A question carries no credentials. Redirects are not followed.
+class AssistantClient {
+  public:
+    struct Settings {
+        /// A host, with ":port" when the port is not 443; none: nobody is asked.
+        std::optional<std::string> host;
+        /// Files of certificates (PEM) that are trusted besides the system's.
+        std::vector<std::string> certificateFiles;
+        std::string language;  ///< BCP 47: the answer's, if the assistant speaks it
+        bool operator==(const Settings&) const = default;
+    };
+
+    struct Answer {
+        platform::HttpFailure failure = platform::HttpFailure::None;
+        int status = 0;    ///< of HTTP; 0 without an answer
+        std::string body;  ///< of an answer of status 200 to 299
+        bool hasBody() const { return failure == platform::HttpFailure::None && status >= 200 && status < 300; }
+    };
+    using Completion = std::function<void(Answer)>;
+
+    /// Seconds for a question and its answer together.
+    static constexpr double kDeadline = 20.0;
+    /// Bytes of an answer; a longer one fails.
+    static constexpr std::size_t kMaximumBytes = std::size_t{4} * 1024 * 1024;
+
+    /// `settings` is asked on the main thread at each question.
+    explicit AssistantClient(std::function<Settings()> settings);
+    /// Questions under way end with `Cancelled`.
+    ~AssistantClient();
+    AssistantClient(const AssistantClient&) = delete;
+    AssistantClient& operator=(const AssistantClient&) = delete;
+
+    /// Never calls the completion inside the call, and calls it exactly once, on any thread. Main thread.
+    void ask(const std::string& question, Completion completion);
+
+  private:
+    class Worker;
+    class Exchange;
+
+    std::function<Settings()> settings_;
+    QThread thread_;
+    /// Lives on the thread and is deleted there.
+    Worker* worker_;
+};
+
+}  // namespace ktr::linux_
