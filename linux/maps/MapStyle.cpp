@@ -54,7 +54,9 @@ MapStyle dark() {
 /// Edges and casings that stand out, letters nearly black or white; the surfaces stay, so that pins and circles look as
 /// they do on every map.
 MapStyle stronger(MapStyle style) {
-    const auto further = [&](QColor color) { return style.isDark ? color.lighter(190) : color.darker(165); };
+    const auto further = [&](const QColor& color) {
+        return QColor((style.isDark ? color.lighter(190) : color.darker(165)).rgb());
+    };
     for (QColor* edge : {&style.shore, &style.parkEdge, &style.buildingEdge, &style.path, &style.rail}) {
         *edge = further(*edge);
     }
@@ -64,7 +66,7 @@ MapStyle stronger(MapStyle style) {
     }
     if (style.isDark) {
         for (QColor* street : {&style.major, &style.secondary, &style.minor}) {
-            *street = street->lighter(150);
+            *street = street->lighter(150).rgb();
         }
     }
     style.boundary = faded(further(style.boundary).rgb(), 1.0);

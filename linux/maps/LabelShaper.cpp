@@ -1,0 +1,124 @@
+#include "linux/maps/LabelShaper.h"
+
+#include <algorithm>
+
+#include <QGlyphRun>
+#include <QRawFont>
+#include <QTextLayout>
+
+#include "linux/ui/FontChoice.h"
+#include "platform/ui/Font.h"
+
+namespace ktr::linux_ {
+
+namespace {
+
+/// Names are shaped once at this size; outlines are scaled.
+constexpr int kShapedPixels = 64;
+constexpr std::size_t kMostKept = 1500;
+constexpr std::size_t kMostOutlines = 4000;
+
+/// Whether letters may be set one by one, each turned its own way.
+bool standAlone(const QString& text) {
+    return std::all_of(text.begin(), text.end(), [](QChar letter) {
+        switch (letter.script()) {
+            case QChar::Script_Latin:
+            case QChar::Script_Greek:
+            case QChar::Script_Cyrillic:
+            case QChar::Script_Armenian:
+            case QChar::Script_Georgian:
+            case QChar::Script_Hebrew:
+            case QChar::Script_Han:
+            case QChar::Script_Hiragana:
+            case QChar::Script_Katakana:
+            case QChar::Script_Hangul:
+            case QChar::Script_Bopomofo:
+            case QChar::Script_Common:
+            case QChar::Script_Inherited:
+                return true;
+            default:
+                return letter.isSurrogate();
+        }
+    });
+}
+
+QList<QTextLayout::FormatRange> formats(const QString& text, bool isBold, const std::string& language) {
+    const FontChoice choice(QString::fromStdString(language));
+    platform::Font font;
+    if (isBold) {
+        font.weight = platform::FontWeight::Bold;
+    }
+    QList<QTextLayout::FormatRange> ranges;
+    for (const auto& stretch : choice.stretches(text)) {
+        QTextLayout::FormatRange range;
+        range.start = static_cast<int>(stretch.start);
+        range.length = static_cast<int>(stretch.length);
+        range.format = FontChoice::spec(font, kShapedPixels, stretch.family).format();
+        ranges.append(range);
+    }
+    return ranges;
+}
+
+}  // namespace
+
+std::shared_ptr<const LabelGlyphs> LabelShaper::shape(const std::string& name, bool isBold,
+                                                      const std::string& language) {
+    const Key key(name, isBold, language);
+    if (const auto found = byKey_.find(key); found != byKey_.end()) {
+        kept_.splice(kept_.begin(), kept_, found->second);
+        return kept_.front().glyphs;
+    }
+    if (outlines_.size() > kMostOutlines) {
+        outlines_.clear();
+    }
+    const QString text = QString::fromStdString(name).simplified();
+    auto made = std::make_shared<LabelGlyphs>();
+    QTextLayout layout(text, FontChoice::spec(platform::Font(), kShapedPixels, FontChoice::baseFamily()).font());
+    layout.setFormats(formats(text, isBold, language));
+    layout.setCacheEnabled(false);
+    layout.beginLayout();
+    QTextLine line = layout.createLine();
+    if (line.isValid()) {
+        line.setLineWidth(1e6);
+    }
+    layout.endLayout();
+    const double unit = 1.0 / kShapedPixels;
+    const double left = line.isValid() ? line.naturalTextRect().left() : 0.0;
+    const double baseline = line.isValid() ? line.y() + line.ascent() : 0.0;
+    bool hasInk = false;
+    for (const QGlyphRun& run : layout.glyphRuns()) {
+        const QRawFont font = run.rawFont();
+        const auto indexes = run.glyphIndexes();
+        const auto positions = run.positions();
+        const auto advances = font.advancesForGlyphIndexes(indexes);
+        const QString fontName = font.familyName() + QLatin1Char('/') + font.styleName();
+        for (qsizetype index = 0; index < indexes.size(); ++index) {
+            auto& outline = outlines_[{fontName, indexes[index]}];
+            if (outline.isEmpty()) {
+                outline = QTransform::fromScale(unit, unit).map(font.pathForGlyph(indexes[index]));
+            }
+            LabelGlyphs::Glyph glyph;
+            glyph.outline = outline;
+            glyph.x = (positions[index].x() - left) * unit;
+            glyph.y = (positions[index].y() - baseline) * unit;
+            glyph.advance = index < advances.size() ? advances[index].x() * unit : 0.0;
+            const QRectF ink = outline.boundingRect();
+            hasInk = hasInk || !ink.isEmpty();
+            made->width = std::max({made->width, glyph.x + glyph.advance, glyph.x + ink.right()});
+            made->ascent = std::max(made->ascent, -(glyph.y + ink.top()));
+            made->descent = std::max(made->descent, glyph.y + ink.bottom());
+            made->glyphs.push_back(std::move(glyph));
+        }
+    }
+    std::stable_sort(made->glyphs.begin(), made->glyphs.end(), [](const auto& a, const auto& b) { return a.x < b.x; });
+    made->isJoined = !standAlone(text);
+    kept_.push_front({key, hasInk ? made : nullptr});
+    byKey_[key] = kept_.begin();
+    if (kept_.size() > kMostKept) {
+        byKey_.erase(kept_.back().key);
+        kept_.pop_back();
+    }
+    return kept_.front().glyphs;
+}
+
+}  // namespace ktr::linux_

@@ -1,0 +1,60 @@
+#pragma once
+
+#include <map>
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+#include <QPainterPath>
+#include <QPolygonF>
+
+#include "linux/maps/MapLabels.h"
+#include "linux/maps/MapScale.h"
+#include "linux/maps/MapStyle.h"
+#include "linux/maps/TileGeometry.h"
+
+namespace ktr::linux_ {
+
+/// Chooses which names of decoded tiles a picture shows, and where: places, then streets, waters and parks by
+/// importance; each name of a kind once, however many tiles and pieces it comes in. For one picture; any thread.
+class VectorLabels {
+  public:
+    VectorLabels(const MapDrawing& drawing, const std::vector<VisibleTile>& tiles, const MapScale& scale);
+
+    void place(MapLabels& labels);
+
+  private:
+    struct Street {
+        MapKind kind = MapKind::Service;  ///< the highest of its pieces
+        std::vector<QPolygonF> pieces;
+        double length = 0.0;  ///< of the longest way through it, once it is joined
+    };
+    struct Spot {
+        MapKind kind;
+        PlaceRank rank;
+        QPointF point;
+    };
+    using Name = std::string_view;  ///< of a tile
+
+    void collect(const VisibleTile& visible);
+    void collectFeature(const TileGeometry& geometry, const MapTile::Feature& feature, Name name);
+    void placePlaces(MapLabels& labels) const;
+    void placeStreets(MapLabels& labels, MapKind kind) const;
+    void placeAreas(MapLabels& labels, MapKind kind);
+    void placeSpots(MapLabels& labels, MapKind kind);
+    LabelLook lookOf(MapKind kind) const;
+    LabelLook lookOf(PlaceRank rank) const;
+
+    const MapDrawing& drawing_;
+    const std::vector<VisibleTile>& tiles_;
+    const MapScale& scale_;
+    const MapStyle& style_;
+    std::map<Name, Street> streets_;
+    std::map<std::pair<MapKind, Name>, QPainterPath> areas_;
+    std::map<std::pair<MapKind, Name>, Spot> spots_;
+    /// Parks and waters that have their name.
+    std::vector<std::pair<MapKind, Name>> named_;
+};
+
+}  // namespace ktr::linux_
