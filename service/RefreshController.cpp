@@ -1,21 +1,30 @@
 #include "service/RefreshController.h"
 
 #include "model/LogCategory.h"
+#include "model/NumberComparison.h"
 #include "platform/base/Assert.h"
 #include "platform/base/MainLoop.h"
 #include "platform/base/NotificationCenter.h"
 #include "platform/base/Platform.h"
 #include "service/GetLocationsCmd.h"
+#include "service/ShowHideLocationCmd.h"
 
 namespace ktr {
 
 namespace {
 /// Metres: the distance filter, and the shortest move that is told of.
 constexpr double kDistanceOfNote = 10.0;
+/// Degrees: a user who has moved no further rests.
+constexpr double kSamePlace = 1e-6;
 
 std::shared_ptr<platform::MainLoop> mainLoop() {
     const auto installed = platform::Platform::installed();
     return installed ? installed->mainLoop : nullptr;
+}
+
+/// What is not known lies at 0, 0, as in the commands.
+platform::Coordinate coordinateOf(const std::shared_ptr<platform::PlatformLocation>& location) {
+    return location ? location->coordinate() : platform::Coordinate();
 }
 
 }  // namespace
@@ -79,6 +88,10 @@ void RefreshController::scheduleTimerWithInterval(double interval) {
 }
 
 void RefreshController::timerFired(const std::shared_ptr<platform::Timer>& /*timer*/) {
+    if (isVisibilityRefresh_) {
+        refreshVisibility();
+        return;
+    }
     LogCategory_Unspecified()->line("Refreshing friend location.");
     refreshLocations();
 }
@@ -99,6 +112,29 @@ void RefreshController::refreshLocations() {
     if (asked) {
         command->setProximity(asked->proximity());
     }
+    sendCommand(command);
+}
+
+void RefreshController::refreshVisibility() {
+    KTR_ASSERT_MAIN_THREAD();
+    LogCategory_Unspecified()->line("Sending visibility refresh command");
+    if (lastRefreshLocation_) {
+        const auto now = coordinateOf(currentLocation_);
+        const auto last = lastRefreshLocation_->coordinate();
+        if (isCloseToNumber(now.latitude, last.latitude, kSamePlace) &&
+            isCloseToNumber(now.longitude, last.longitude, kSamePlace)) {
+            LogCategory_Unspecified()->line("Skipping visibility refresh, current location hasn't changed");
+            return;
+        }
+    }
+    const auto command = platform::create<ShowHideLocationCmd>(&ShowHideLocationCmd::init);
+    if (!command) {
+        return;
+    }
+    command->setCurrentLocation(currentLocation_);
+    command->setHideLocation(false);
+    // Before it is sent: what counts is what the service was last told, not whether it heard.
+    lastRefreshLocation_ = currentLocation_;
     sendCommand(command);
 }
 

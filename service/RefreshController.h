@@ -14,8 +14,10 @@
 namespace ktr {
 
 /// Keeps a snippet live while it is on screen: asks the service again and again, at the pace that the service sets,
-/// until an overall timeout; and tracks the user's own position, posting kCurrentLocationUpdatedNotification, itself
-/// the sender, when the user has moved more than 10 metres since the last position. Seconds throughout. Main thread.
+/// until an overall timeout; for the snippet about the user's own sharing it tells the service where the user is
+/// instead, as long as the user moves. It tracks the user's own position, posting kCurrentLocationUpdatedNotification,
+/// itself the sender, when the user has moved more than 10 metres since the last position. Seconds throughout. Main
+/// thread.
 class RefreshController : public platform::Object,
                           public CurrentLocationDelegate,
                           public platform::PlatformLocationManagerDelegate {
@@ -37,11 +39,19 @@ class RefreshController : public platform::Object,
     virtual void cancelTimer();
     /// Arms one timer; the one in `pollTimer` is replaced and deliberately goes on.
     virtual void scheduleTimerWithInterval(double interval);
+    /// `refreshVisibility` or `refreshLocations`, as `isVisibilityRefresh` says now.
     virtual void timerFired(const std::shared_ptr<platform::Timer>& timer);
     /// Sends one command. When it succeeds, the delegate gets its result and the next timer is armed with the service's
     /// interval; when it fails, nothing happens: polling ends until the next start.
     virtual void refreshLocations();
+    /// Sends one command that shows the user's location at the present position; its answer is handled in the same way.
+    /// Nothing is sent, and no timer armed, while the user is where the last command said, within a millionth of a
+    /// degree: polling deliberately ends at the first tick at which the user rests.
+    virtual void refreshVisibility();
 
+    /// The snippet is about the user's own sharing.
+    bool isVisibilityRefresh() const { return isVisibilityRefresh_; }
+    void setIsVisibilityRefresh(bool visibility) { isVisibilityRefresh_ = visibility; }
     bool refresherCancelled() const { return refresherCancelled_; }
     void setRefresherCancelled(bool cancelled) { refresherCancelled_ = cancelled; }
     std::shared_ptr<RefreshControllerDelegate> delegate() const { return delegate_.lock(); }
@@ -61,6 +71,12 @@ class RefreshController : public platform::Object,
     void setCurrentLocation(std::shared_ptr<platform::PlatformLocation> location) {
         currentLocation_ = std::move(location);
     }
+    /// The position that the last visibility command was given, whether or not it arrived; none before the first one,
+    /// and after one that knew no position.
+    const std::shared_ptr<platform::PlatformLocation>& lastRefreshLocation() const { return lastRefreshLocation_; }
+    void setLastRefreshLocation(std::shared_ptr<platform::PlatformLocation> location) {
+        lastRefreshLocation_ = std::move(location);
+    }
     const std::shared_ptr<platform::PlatformLocationManager>& locationManager() const { return locationManager_; }
     void setLocationManager(std::shared_ptr<platform::PlatformLocationManager> manager) {
         locationManager_ = std::move(manager);
@@ -75,11 +91,13 @@ class RefreshController : public platform::Object,
     void sendCommand(const std::shared_ptr<KTRBaseCmd>& command);
     void handleAnswer(KTRBaseCmd& command);
 
+    bool isVisibilityRefresh_ = false;
     bool refresherCancelled_ = false;
     std::weak_ptr<RefreshControllerDelegate> delegate_;
     std::shared_ptr<platform::Timer> pollTimer_;
     std::shared_ptr<platform::PlatformLocationManager> locationManager_;
     std::shared_ptr<platform::PlatformLocation> currentLocation_;
+    std::shared_ptr<platform::PlatformLocation> lastRefreshLocation_;
     double timeout_ = 0.0;
     std::shared_ptr<platform::KTServerInteractionController> serverInteractionController_;
 };

@@ -63,6 +63,20 @@ std::shared_ptr<VAKtrLocationSnippet> proximitySnippet(LocationList locations, s
     return snippet;
 }
 
+std::shared_ptr<VAKtrGeoFence> fenceOf(std::shared_ptr<VAPersonAttribute> person, std::optional<std::string> trigger,
+                                       std::optional<std::string> label, std::optional<std::string> street) {
+    auto fence = std::make_shared<VAKtrGeoFence>();
+    fence->friend_ = std::move(person);
+    fence->geoFenceTrigger = std::move(trigger);
+    fence->location = std::make_shared<VALocation>();
+    fence->location->latitude = 51.0;
+    fence->location->longitude = -1.0;
+    fence->location->accuracy = 100.0;
+    fence->location->label = std::move(label);
+    fence->location->street = std::move(street);
+    return fence;
+}
+
 std::shared_ptr<Contact> contactWith(const std::string& identifier, const std::string& email,
                                      const std::string& phone) {
     auto contact = std::make_shared<Contact>();

@@ -27,6 +27,12 @@ std::shared_ptr<const platform::LocationList> listOf(platform::LocationList loca
 std::shared_ptr<platform::VAKtrLocationSnippet> proximitySnippet(platform::LocationList locations,
                                                                  std::optional<std::string> context = std::nullopt);
 
+/// A fence around 51, -1 of a radius of 100 metres.
+std::shared_ptr<platform::VAKtrGeoFence> fenceOf(std::shared_ptr<platform::VAPersonAttribute> person,
+                                                 std::optional<std::string> trigger,
+                                                 std::optional<std::string> label = std::nullopt,
+                                                 std::optional<std::string> street = std::nullopt);
+
 std::shared_ptr<platform::Contact> contactWith(const std::string& identifier, const std::string& email,
                                                const std::string& phone);
 
