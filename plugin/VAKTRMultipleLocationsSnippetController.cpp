@@ -75,6 +75,10 @@ bool VAKTRMultipleLocationsSnippetController::showLocatingFriends() const {
     return true;
 }
 
+bool VAKTRMultipleLocationsSnippetController::isSearching() const {
+    return !refreshingCancelled() && showLocatingFriends();
+}
+
 VAKTRBaseSnippetController::Locations VAKTRMultipleLocationsSnippetController::proximityLocationsWithCoordinates()
     const {
     Locations known;

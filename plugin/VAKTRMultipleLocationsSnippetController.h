@@ -23,6 +23,9 @@ class VAKTRMultipleLocationsSnippetController : public VAKTRBaseSnippetControlle
     void reloadData() override;
     /// The sum of the rows' heights; 90 when that is 0, such as while friends are being located.
     double desiredHeightForWidth(double width) override;
+    /// As long as no location is known and refreshing goes on. It ends with the refreshing; the message follows at the
+    /// next reload.
+    bool isSearching() const override;
 
     /// Brings the rows in line with the locations. A row is found again by its friend's handle.
     virtual void createFriendViews();

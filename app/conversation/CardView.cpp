@@ -20,12 +20,6 @@ bool rightToLeft() {
     return Platform::installed()->assistant->languageIsRightToLeft();
 }
 
-/// Whether somebody or something can be opened in an answer: as long as a friend is looked for, nothing can.
-bool presentsLink(const AccessibilityNode& node) {
-    return node.role == AccessibilityRole::Link ||
-           std::any_of(node.children.begin(), node.children.end(), presentsLink);
-}
-
 }  // namespace
 
 /// What lies over the rows: the card's edge, and the focus ring.
@@ -94,7 +88,7 @@ double CardView::heightForWidth(double width) {
 }
 
 void CardView::updateRing() {
-    ring_->setHidden(presentsLink(accessibilityTree(content_, false)));
+    ring_->setHidden(!controller_ || !controller_->isSearching());
 }
 
 void CardView::layoutSubviews() {

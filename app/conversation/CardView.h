@@ -28,6 +28,9 @@ class CardView : public platform::View {
     /// The plugin's part of the card.
     const std::shared_ptr<platform::View>& content() const { return content_; }
     const std::shared_ptr<RingView>& ring() const { return ring_; }
+    /// Shows the ring as long as the controller searches. The controller does not tell when that ends: whoever turns
+    /// the ring asks here.
+    void updateRing();
 
     /// Rectangles in the card's coordinates; none: nothing is marked.
     void setHighlight(const std::optional<platform::Rect>& rect);
@@ -40,7 +43,6 @@ class CardView : public platform::View {
     class Overlay;
 
     void layOutHeader();
-    void updateRing();
     void redraw(const std::optional<platform::Rect>& rect) const;
 
     std::shared_ptr<platform::HostSnippetViewController> controller_;

@@ -8,13 +8,17 @@
 namespace ktr::app {
 
 void RingView::setTurn(double turn) {
-    turn_ = turn;
-    setNeedsDisplay();
+    if (turn != turn_) {
+        turn_ = turn;
+        setNeedsDisplay();
+    }
 }
 
 void RingView::setShare(double share) {
-    share_ = share;
-    setNeedsDisplay();
+    if (share != share_) {
+        share_ = share;
+        setNeedsDisplay();
+    }
 }
 
 void RingView::draw(platform::Canvas& canvas) const {

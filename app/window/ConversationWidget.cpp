@@ -200,6 +200,7 @@ void ConversationWidget::animateRings() {
     const bool still = reducedMotion_ || nothingMoves(*this);
     bool any = false;
     for (const auto& turn : host_.conversation()->turns()) {
+        turn->card()->updateRing();
         const auto& ring = turn->card()->ring();
         if (ring->hidden()) {
             continue;
@@ -208,9 +209,10 @@ void ConversationWidget::animateRings() {
         ring->setShare(still ? kStillRing : 0.25);
         ring->setTurn(still ? 0.0 : std::fmod(seconds() / kRingTurn, 1.0));
     }
-    if (any && !still && !ringTimer_.isActive()) {
+    // Also for rings that stand still: they go when the search is over.
+    if (any && !ringTimer_.isActive()) {
         ringTimer_.start();
-    } else if (!any || still) {
+    } else if (!any) {
         ringTimer_.stop();
     }
 }

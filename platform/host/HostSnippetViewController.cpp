@@ -35,6 +35,10 @@ void HostSnippetViewController::updateViewConstraints() {}
 double HostSnippetViewController::desiredHeightForWidth(double /*width*/) {
     return 0.0;
 }
+bool HostSnippetViewController::isSearching() const {
+    return false;
+}
+
 std::shared_ptr<HeaderItem> HostSnippetViewController::sashItem() {
     return nullptr;
 }

@@ -35,6 +35,10 @@ class KTR_API HostSnippetViewController : public Object {
     virtual double desiredHeightForWidth(double width);
     /// May be none.
     virtual std::shared_ptr<HeaderItem> sashItem();
+    /// Whether what the snippet is about is still being looked for; a host may show that something goes on. It can end
+    /// without the height or anything else changing, so a host that shows it asks again and again. Cheap. The base
+    /// looks for nothing.
+    virtual bool isSearching() const;
 
     void setDefaultViewInsets(const EdgeInsets& insets) { insets_ = insets; }
     const EdgeInsets& defaultViewInsets() const { return insets_; }

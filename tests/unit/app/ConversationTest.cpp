@@ -12,16 +12,13 @@ using platform::create;
 using platform::Rect;
 using platform::View;
 
-/// An answer of one row of a fixed height, with a link or without.
+/// An answer of one row of a fixed height.
 class FixedController : public platform::HostSnippetViewController {
   public:
     class Row : public View {
       public:
-        platform::AccessibilityRole accessibilityRole() const override {
-            return isLink ? platform::AccessibilityRole::Link : platform::AccessibilityRole::Text;
-        }
+        platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Link; }
         std::string accessibilityText() const override { return "row"; }
-        bool isLink = true;
     };
 
     void loadView() override {
@@ -40,7 +37,10 @@ class FixedController : public platform::HostSnippetViewController {
         ++appearances;
     }
 
+    bool isSearching() const override { return searching; }
+
     std::shared_ptr<Row> row;
+    bool searching = false;
     double height = 200.0;
     double askedWidth = 0.0;
     int appearances = 0;
@@ -173,14 +173,17 @@ TEST_F(KTRConversationTest, Question_NeverBreaksAWordForBalance) {
     EXPECT_EQ(width, 12.0 * kEm);
 }
 
-TEST_F(KTRConversationTest, Ring_ShowsWhileNobodyCanBeOpened) {
+TEST_F(KTRConversationTest, Ring_ShowsWhileTheControllerSearches) {
     const auto turn = addTurn();
     conversation->layOut(400.0);
     EXPECT_TRUE(turn->card()->ring()->hidden());
-    controller->row->isLink = false;
+    controller->searching = true;
     conversation->layOut(400.0);
     EXPECT_FALSE(turn->card()->ring()->hidden());
     EXPECT_EQ(turn->card()->ring()->frame(), (Rect{376.0 - 36.0, 15.0, 18.0, 18.0}));
+    controller->searching = false;
+    turn->card()->updateRing();
+    EXPECT_TRUE(turn->card()->ring()->hidden());
 }
 
 TEST_F(KTRConversationTest, ReadingOrder_IsQuestionSentenceThenCardAlsoSideBySide) {

@@ -2,6 +2,8 @@
 
 #include <QAccessible>
 #include <QApplication>
+#include <QDeadlineTimer>
+#include <QEventLoop>
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QPointingDevice>
@@ -22,6 +24,8 @@ class GrowingController : public platform::HostSnippetViewController {
   public:
     double height = 1000.0;
     double desiredHeightForWidth(double) override { return height; }
+    bool searching = false;
+    bool isSearching() const override { return searching; }
 };
 
 /// The demo scenario in a window, with the real plugin.
@@ -245,6 +249,24 @@ TEST_F(KTRConversationWidgetTest, HeightChange_KeepsTheCardsTopOrItsBottom) {
     controller->height += 300.0;
     host->delegate().heightDidChange(*controller, false);
     EXPECT_NEAR(bottom(), bottomBefore, 1.0);
+}
+
+TEST_F(KTRConversationWidgetTest, Ring_GoesWhenTheSearchEndsThoughNobodyTells) {
+    open({"dinner"});
+    auto turn = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
+    const auto controller = platform::create<GrowingController>(&GrowingController::init);
+    controller->searching = true;
+    turn->card()->setController(controller);
+    host->conversation()->addTurn(turn);
+    widget->resize(400, 701);
+    QApplication::processEvents();
+    EXPECT_FALSE(turn->card()->ring()->hidden());
+    controller->searching = false;
+    const QDeadlineTimer limit(10000);
+    while (!turn->card()->ring()->hidden() && !limit.hasExpired()) {
+        QApplication::processEvents(QEventLoop::WaitForMoreEvents);
+    }
+    EXPECT_TRUE(turn->card()->ring()->hidden());
 }
 
 TEST_F(KTRConversationWidgetTest, SeveralTurns_BeginWithTheNewestAtTheTop) {

@@ -92,14 +92,18 @@ TEST_F(LiveSnippetTest, LocatingBecomesNoneFound_AtTheReloadAfterTheEnd) {
     controller->desiredHeightForWidth(375.0);
     controller->viewWillAppear(false);
     EXPECT_EQ(message(), "Locating");
+    EXPECT_TRUE(controller->isSearching());
     time->advance(5.0);
     while (!transport->waiting.empty()) {
         transport->fail(platform::HttpFailure::Network);
     }
     time->advance(54.0);
     EXPECT_EQ(message(), "Locating");
+    EXPECT_TRUE(controller->isSearching());
+    time->advance(1.0);
+    EXPECT_FALSE(controller->isSearching()) << "ends with the refreshing, not with the next reload";
     // The end of the time and the second reload fall together; the next reload shows it at the latest.
-    time->advance(31.0);
+    time->advance(30.0);
     EXPECT_TRUE(controller->refreshingCancelled());
     EXPECT_EQ(message(), "None found");
 }
