@@ -113,9 +113,8 @@ void TileGeometry::addArea(const MapTile::Feature& feature, QPainterPath& path) 
     }
 }
 
-void TileGeometry::addEdges(const MapTile::Feature& feature, QPainterPath& path) const {
+void TileGeometry::eachEdge(const MapTile::Feature& feature, const LineReceiver& receive) const {
     const MapTile& tile = *visible_.tile;
-    const auto add = [&](const QPolygonF& piece, double /*from*/) { path.addPolygon(piece); };
     for (std::uint32_t part = feature.firstPart; part < feature.firstPart + feature.partCount; ++part) {
         const std::uint32_t begin = tile.partBegin(part);
         const std::uint32_t end = tile.partEnds[part];
@@ -124,7 +123,7 @@ void TileGeometry::addEdges(const MapTile::Feature& feature, QPainterPath& path)
             const MapTile::Spot& from = tile.spots[spot];
             const MapTile::Spot& to = tile.spots[spot + 1 == end ? begin : spot + 1];
             if (isCut(from, to)) {
-                cutLine(line, add);
+                cutLine(line, receive);
                 line.clear();
                 continue;
             }
@@ -133,12 +132,8 @@ void TileGeometry::addEdges(const MapTile::Feature& feature, QPainterPath& path)
             }
             line.append(point(to));
         }
-        cutLine(line, add);
+        cutLine(line, receive);
     }
-}
-
-void TileGeometry::addLines(const MapTile::Feature& feature, QPainterPath& path) const {
-    eachLine(feature, [&](const QPolygonF& piece, double /*from*/) { path.addPolygon(piece); });
 }
 
 void TileGeometry::eachLine(const MapTile::Feature& feature, const LineReceiver& receive) const {

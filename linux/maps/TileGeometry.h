@@ -30,11 +30,13 @@ class TileGeometry {
     explicit TileGeometry(const VisibleTile& visible);
 
     bool isVisible(const MapTile::Feature& feature) const;
+    /// Whether nothing of it is cut off.
+    bool isInside(const MapTile::Feature& feature) const;
     /// Rings, to be filled with Qt::WindingFill.
     void addArea(const MapTile::Feature& feature, QPainterPath& path) const;
-    /// The edges of an area as lines, without those that only cut it at the tile's edge.
-    void addEdges(const MapTile::Feature& feature, QPainterPath& path) const;
-    void addLines(const MapTile::Feature& feature, QPainterPath& path) const;
+    /// The edges of an area as lines, without those that only cut it at the tile's edge. Closed ones end where they
+    /// begin.
+    void eachEdge(const MapTile::Feature& feature, const LineReceiver& receive) const;
     void eachLine(const MapTile::Feature& feature, const LineReceiver& receive) const;
     /// The spots inside the window.
     std::vector<QPointF> spots(const MapTile::Feature& feature) const;
@@ -44,7 +46,6 @@ class TileGeometry {
         return {visible_.square.x() + static_cast<double>(spot.x) * unit_,
                 visible_.square.y() + static_cast<double>(spot.y) * unit_};
     }
-    bool isInside(const MapTile::Feature& feature) const;
     void cutLine(const QPolygonF& line, const LineReceiver& receive) const;
 
     const VisibleTile& visible_;

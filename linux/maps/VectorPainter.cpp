@@ -19,6 +19,10 @@ void eachOf(const MapTile& tile, MapKind kind, const Receiver& receive) {
     }
 }
 
+QPen roundPen(const QColor& color, double width) {
+    return {color, width, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin};
+}
+
 }  // namespace
 
 VectorPainter::VectorPainter(const MapDrawing& drawing, const std::vector<VisibleTile>& tiles, const MapScale& scale)
@@ -28,40 +32,62 @@ VectorPainter::VectorPainter(const MapDrawing& drawing, const std::vector<Visibl
       scale_(scale),
       style_(MapStyle::of(drawing.request.isDark, drawing.request.isHighContrast)) {}
 
-QPainterPath VectorPainter::collect(MapKind kind, Part part) const {
-    QPainterPath path;
-    path.setFillRule(Qt::WindingFill);
+void VectorPainter::each(MapKind kind, MapTile::Shape shape, const Receiver& receive) const {
     for (const auto& visible : tiles_) {
         const TileGeometry geometry(visible);
         eachOf(*visible.tile, kind, [&](const MapTile::Feature& feature) {
-            const auto shape = part == Part::Lines ? MapTile::Shape::Lines : MapTile::Shape::Areas;
-            if (feature.shape != shape || !geometry.isVisible(feature)) {
-                return;
-            }
-            switch (part) {
-                case Part::Areas:
-                    geometry.addArea(feature, path);
-                    break;
-                case Part::Edges:
-                    geometry.addEdges(feature, path);
-                    break;
-                case Part::Lines:
-                    geometry.addLines(feature, path);
-                    break;
+            if (feature.shape == shape && geometry.isVisible(feature)) {
+                receive(geometry, feature);
             }
         });
     }
-    return path;
 }
 
-void VectorPainter::stroke(const QPainterPath& path, const QColor& color, double width) {
-    if (!path.isEmpty() && width > 0.0) {
-        painter_.strokePath(path, QPen(color, width, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
+std::vector<QPolygonF> VectorPainter::lines(MapKind kind) const {
+    std::vector<QPolygonF> pieces;
+    each(kind, MapTile::Shape::Lines, [&](const TileGeometry& geometry, const MapTile::Feature& feature) {
+        geometry.eachLine(feature, [&](const QPolygonF& piece, double /*from*/) { pieces.push_back(piece); });
+    });
+    return pieces;
+}
+
+void VectorPainter::fill(MapKind kind, const QColor& color) {
+    // What is cut at a tile's edge is filled as one surface: no seam. The rest is filled piece by piece: the painter's
+    // time grows faster than the size of a surface.
+    QPainterPath cut;
+    cut.setFillRule(Qt::WindingFill);
+    each(kind, MapTile::Shape::Areas, [&](const TileGeometry& geometry, const MapTile::Feature& feature) {
+        if (!geometry.isInside(feature)) {
+            geometry.addArea(feature, cut);
+            return;
+        }
+        QPainterPath whole;
+        whole.setFillRule(Qt::WindingFill);
+        geometry.addArea(feature, whole);
+        painter_.fillPath(whole, color);
+    });
+    painter_.fillPath(cut, color);
+}
+
+void VectorPainter::strokeEdges(MapKind kind, const QColor& color, double width) {
+    painter_.setPen(roundPen(color, width));
+    each(kind, MapTile::Shape::Areas, [&](const TileGeometry& geometry, const MapTile::Feature& feature) {
+        geometry.eachEdge(feature, [&](const QPolygonF& piece, double /*from*/) { painter_.drawPolyline(piece); });
+    });
+}
+
+void VectorPainter::strokeLines(const std::vector<QPolygonF>& pieces, const QColor& color, double width) {
+    if (width > 0.0) {
+        painter_.setPen(roundPen(color, width));
+        for (const auto& piece : pieces) {
+            painter_.drawPolyline(piece);
+        }
     }
 }
 
 void VectorPainter::draw() {
     painter_.setRenderHint(QPainter::Antialiasing);
+    painter_.setBrush(Qt::NoBrush);
     for (const auto step : {&VectorPainter::drawSurfaces, &VectorPainter::drawBuildings, &VectorPainter::drawRoads,
                             &VectorPainter::drawRails}) {
         if (drawing_.stop.stop_requested()) {
@@ -74,49 +100,52 @@ void VectorPainter::draw() {
 }
 
 void VectorPainter::drawSurfaces() {
-    painter_.fillPath(collect(MapKind::BuiltUp, Part::Areas), style_.builtUp);
+    fill(MapKind::BuiltUp, style_.builtUp);
     // Edges first, twice as wide, then the surface: where areas touch, no line divides them.
-    stroke(collect(MapKind::Park, Part::Edges), style_.parkEdge, 2.0 * MapStyle::kParkEdgeWidth);
-    painter_.fillPath(collect(MapKind::Park, Part::Areas), style_.park);
+    strokeEdges(MapKind::Park, style_.parkEdge, 2.0 * MapStyle::kParkEdgeWidth);
+    fill(MapKind::Park, style_.park);
     drawWater();
-    painter_.fillPath(collect(MapKind::Square, Part::Areas), style_.square);
-    painter_.fillPath(collect(MapKind::Pier, Part::Areas), style_.pier);
-    const double pier = std::clamp(5.0 / scale_.metresPerPoint(), 0.8, 8.0);
-    painter_.strokePath(collect(MapKind::PierLine, Part::Lines),
-                        QPen(style_.pier, pier, Qt::SolidLine, Qt::FlatCap, Qt::RoundJoin));
+    fill(MapKind::Square, style_.square);
+    fill(MapKind::Pier, style_.pier);
+    painter_.setPen(QPen(style_.pier, std::clamp(5.0 / scale_.metresPerPoint(), 0.8, 8.0), Qt::SolidLine, Qt::FlatCap,
+                         Qt::RoundJoin));
+    for (const auto& piece : lines(MapKind::PierLine)) {
+        painter_.drawPolyline(piece);
+    }
 }
 
 void VectorPainter::drawWater() {
     const double shore = MapStyle::kShoreWidth * scale_.lineFactor();
-    std::array<QPainterPath, 256> lines;
-    for (const auto& visible : tiles_) {
-        const TileGeometry geometry(visible);
-        eachOf(*visible.tile, MapKind::WaterLine, [&](const MapTile::Feature& feature) {
-            if (feature.shape == MapTile::Shape::Lines && geometry.isVisible(feature)) {
-                geometry.addLines(feature, lines[feature.rank]);
-            }
-        });
-    }
-    const auto eachWidth = [&](const QColor& color, double more) {
-        for (std::size_t metres = 0; metres < lines.size(); ++metres) {
-            const double width = scale_.waterLine(static_cast<double>(metres));
-            if (width > 0.0) {
-                stroke(lines[metres], color, width + more);
-            }
+    struct River {
+        QPolygonF line;
+        double width;
+    };
+    std::vector<River> rivers;
+    each(MapKind::WaterLine, MapTile::Shape::Lines, [&](const TileGeometry& geometry, const MapTile::Feature& feature) {
+        const double width = scale_.waterLine(feature.rank);
+        if (width > 0.0) {
+            geometry.eachLine(feature, [&](const QPolygonF& piece, double /*from*/) {
+                rivers.push_back({piece, width});
+            });
+        }
+    });
+    const auto drawRivers = [&](const QColor& color, double more) {
+        for (const auto& river : rivers) {
+            painter_.setPen(roundPen(color, river.width + more));
+            painter_.drawPolyline(river.line);
         }
     };
-    stroke(collect(MapKind::Water, Part::Edges), style_.shore, 2.0 * shore);
-    eachWidth(style_.shore, shore);
-    painter_.fillPath(collect(MapKind::Water, Part::Areas), style_.water);
-    eachWidth(style_.water, 0.0);
+    strokeEdges(MapKind::Water, style_.shore, 2.0 * shore);
+    drawRivers(style_.shore, shore);
+    fill(MapKind::Water, style_.water);
+    drawRivers(style_.water, 0.0);
 }
 
 void VectorPainter::drawBuildings() {
-    if (!scale_.showsBuildings()) {
-        return;
+    if (scale_.showsBuildings()) {
+        fill(MapKind::Building, style_.building);
+        strokeEdges(MapKind::Building, style_.buildingEdge, MapStyle::kBuildingEdgeWidth);
     }
-    painter_.fillPath(collect(MapKind::Building, Part::Areas), style_.building);
-    stroke(collect(MapKind::Building, Part::Edges), style_.buildingEdge, MapStyle::kBuildingEdgeWidth);
 }
 
 void VectorPainter::drawRoads() {
@@ -124,20 +153,20 @@ void VectorPainter::drawRoads() {
     struct Class {
         MapKind kind;
         QColor fill, casing;
+        std::vector<QPolygonF> pieces;
     };
-    const std::array<Class, 4> classes = {{{MapKind::Service, style_.minor, style_.minorCasing},
-                                           {MapKind::Minor, style_.minor, style_.minorCasing},
-                                           {MapKind::Secondary, style_.secondary, style_.secondaryCasing},
-                                           {MapKind::Major, style_.major, style_.majorCasing}}};
-    std::array<QPainterPath, 4> paths;
-    for (std::size_t index = 0; index < classes.size(); ++index) {
-        if (scale_.road(classes[index].kind).fill > 0.0) {
-            paths[index] = collect(classes[index].kind, Part::Lines);
-            stroke(paths[index], classes[index].casing, scale_.road(classes[index].kind).casing);
+    std::array<Class, 4> classes = {{{MapKind::Service, style_.minor, style_.minorCasing, {}},
+                                     {MapKind::Minor, style_.minor, style_.minorCasing, {}},
+                                     {MapKind::Secondary, style_.secondary, style_.secondaryCasing, {}},
+                                     {MapKind::Major, style_.major, style_.majorCasing, {}}}};
+    for (auto& road : classes) {
+        if (scale_.road(road.kind).fill > 0.0) {
+            road.pieces = lines(road.kind);
+            strokeLines(road.pieces, road.casing, scale_.road(road.kind).casing);
         }
     }
-    for (std::size_t index = 0; index < classes.size(); ++index) {
-        stroke(paths[index], classes[index].fill, scale_.road(classes[index].kind).fill);
+    for (const auto& road : classes) {
+        strokeLines(road.pieces, road.fill, scale_.road(road.kind).fill);
     }
 }
 
@@ -153,26 +182,18 @@ void VectorPainter::drawDashed(MapKind kind, const QColor& color, double width, 
         period += dash;
     }
     pen.setDashPattern(pattern);
-    for (const auto& visible : tiles_) {
-        const TileGeometry geometry(visible);
-        eachOf(*visible.tile, kind, [&](const MapTile::Feature& feature) {
-            if (feature.shape != MapTile::Shape::Lines || !geometry.isVisible(feature)) {
-                return;
-            }
-            geometry.eachLine(feature, [&](const QPolygonF& piece, double from) {
-                pen.setDashOffset(std::fmod(from, period) / width);
-                painter_.setPen(pen);
-                painter_.drawPolyline(piece);
-            });
+    each(kind, MapTile::Shape::Lines, [&](const TileGeometry& geometry, const MapTile::Feature& feature) {
+        geometry.eachLine(feature, [&](const QPolygonF& piece, double from) {
+            pen.setDashOffset(std::fmod(from, period) / width);
+            painter_.setPen(pen);
+            painter_.drawPolyline(piece);
         });
-    }
+    });
 }
 
 void VectorPainter::drawRails() {
     const double factor = scale_.lineFactor();
-    const QPainterPath path = collect(MapKind::Rail, Part::Lines);
-    painter_.strokePath(path,
-                        QPen(style_.rail, MapStyle::kRailWidth * factor, Qt::SolidLine, Qt::FlatCap, Qt::RoundJoin));
+    strokeLines(lines(MapKind::Rail), style_.rail, MapStyle::kRailWidth * factor);
     if (factor >= 0.75) {
         drawDashed(MapKind::Rail, style_.railInner, MapStyle::kRailInnerWidth * factor, {6.0, 6.0});
     }

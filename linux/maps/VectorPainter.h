@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <vector>
 
 #include "linux/maps/MapGround.h"
@@ -19,10 +20,13 @@ class VectorPainter {
     void draw();
 
   private:
-    enum class Part { Areas, Edges, Lines };
+    using Receiver = std::function<void(const TileGeometry&, const MapTile::Feature&)>;
 
-    QPainterPath collect(MapKind kind, Part part) const;
-    void stroke(const QPainterPath& path, const QColor& color, double width);
+    void each(MapKind kind, MapTile::Shape shape, const Receiver& receive) const;
+    std::vector<QPolygonF> lines(MapKind kind) const;
+    void fill(MapKind kind, const QColor& color);
+    void strokeEdges(MapKind kind, const QColor& color, double width);
+    void strokeLines(const std::vector<QPolygonF>& pieces, const QColor& color, double width);
     void drawSurfaces();
     void drawWater();
     void drawBuildings();
