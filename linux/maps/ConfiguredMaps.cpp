@@ -1,5 +1,6 @@
 #include "linux/maps/ConfiguredMaps.h"
 
+#include "linux/maps/VectorGround.h"
 #include "linux/maps/WorldGround.h"
 
 namespace ktr::linux_ {
@@ -12,7 +13,9 @@ std::shared_ptr<ThreadedMapSource> ConfiguredMaps::make(const Configuration& con
 
 ThreadedMapSource::Grounds ConfiguredMaps::grounds(const Configuration& /*configuration*/,
                                                    const std::filesystem::path& resourceFolder) {
-    return {std::make_shared<WorldGround>(resourceFolder / "maps" / "world.bin")};
+    const auto folder = resourceFolder / "maps";
+    return {std::make_shared<VectorGround>((folder / "brinmouth.mbtiles").string()),
+            std::make_shared<WorldGround>(folder / "world.bin")};
 }
 
 }  // namespace ktr::linux_
