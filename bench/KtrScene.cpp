@@ -37,6 +37,9 @@ struct BenchAppearance : AssistantAppearance {
     Font thinFont(double size) const override { return {FontFace::Thin, FontWeight::Regular, size}; }
     Color standardTextColor() const override { return Color::ofRole(ColorRole::StandardText); }
     Color highlightColor() const override { return Color::ofRole(ColorRole::Highlight); }
+    bool isDark() const override { return false; }
+    bool isHighContrast() const override { return false; }
+    bool reducesMotion() const override { return false; }
 };
 
 struct SilentLog : LogSink {

@@ -4,6 +4,7 @@
 #include "platform/assistant/VASnippet.h"
 #include "platform/base/Platform.h"
 #include "platform/ui/Device.h"
+#include "plugin/VAKTRLocationSnippetController.h"
 #include "plugin/VAKTRMultipleLocationsSnippetController.h"
 
 namespace ktr {
@@ -13,8 +14,7 @@ using platform::FormatArgument;
 std::shared_ptr<platform::HostSnippetViewController> KTRSnippetControllerFactory::viewControllerForSnippet(
     const std::shared_ptr<platform::AssistantObject>& snippet) {
     const auto located = std::dynamic_pointer_cast<platform::VAKtrLocationSnippet>(snippet);
-    // The presence of a proximity counts, not its text.
-    if (!located || !located->proximity) {
+    if (!located) {
         LogCategory_Unspecified()->line("Unrecognized snippet CueObject passed to %@: %@",
                                         FormatArgument("KTRSnippetControllerFactory").shown(), snippet);
         return nullptr;
@@ -25,8 +25,13 @@ std::shared_ptr<platform::HostSnippetViewController> KTRSnippetControllerFactory
                                         snippet);
         return nullptr;
     }
-    return platform::create<VAKTRMultipleLocationsSnippetController>(
-        &VAKTRMultipleLocationsSnippetController::initWithCueObject, located);
+    // The presence of a proximity counts, not its text.
+    if (located->proximity) {
+        return platform::create<VAKTRMultipleLocationsSnippetController>(
+            &VAKTRMultipleLocationsSnippetController::initWithCueObject, located);
+    }
+    return platform::create<VAKTRLocationSnippetController>(&VAKTRLocationSnippetController::initWithCueObject,
+                                                            located);
 }
 
 std::shared_ptr<platform::Object> KTRSnippetControllerFactory::speakableNamespaceProviderForCueObject(

@@ -4,6 +4,8 @@
 
 #include "app/conversation/Measures.h"
 #include "app/conversation/Shapes.h"
+#include "linux/ui/QtAppearance.h"
+#include "platform/base/Platform.h"
 
 namespace ktr::app {
 
@@ -45,6 +47,12 @@ void ConversationView::setPalette(const linux_::Palette& palette) {
         turn->setSoftColor(*softColor_);
     }
     setNeedsDisplay();
+    // Maps ask for pictures that fit.
+    const auto installed = platform::Platform::installed();
+    if (const auto shown =
+            std::dynamic_pointer_cast<linux_::QtAppearance>(installed ? installed->appearance : nullptr)) {
+        shown->show(palette.scheme, palette.contrast);
+    }
 }
 
 void ConversationView::draw(platform::Canvas& canvas) const {

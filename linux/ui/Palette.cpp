@@ -10,8 +10,26 @@ QColor hex(unsigned rgb) {
     return QColor::fromRgb(static_cast<QRgb>(rgb) | 0xff000000U);
 }
 
+QColor hex(unsigned rgb, double alpha) {
+    QColor color = hex(rgb);
+    color.setAlphaF(static_cast<float>(alpha));
+    return color;
+}
+
+void setMapColors(Palette& p, bool isDark) {
+    p.mapLand = isDark ? hex(0x282520) : hex(0xF3EEE4);
+    p.mapNote = p.mapAttribution = isDark ? hex(0xD9CFC0) : hex(0x574C3F);
+    p.mapScale = isDark ? hex(0xEDE5D8) : hex(0x3A332A);
+    p.mapScaleHalo = isDark ? hex(0x1E1C18) : hex(0xFBF8F1);
+    p.mapAttributionPill = isDark ? hex(0x2E2A25, 0.88) : hex(0xFFFDF8, 0.88);
+    p.mapUserHalo = isDark ? hex(0x86CDB5, 0.18) : hex(0x1E6653, 0.18);
+    p.friendPinEdge = isDark ? hex(0x5A3100) : hex(0x8A4B00);
+    p.markerPinEdge = isDark ? hex(0xF8B4AC) : hex(0x7E1A13);
+}
+
 Palette light() {
     Palette p;
+    setMapColors(p, false);
     p.window = hex(0xF5F1E9);
     p.card = hex(0xFFFDF8);
     p.bubble = hex(0xDCE7DC);
@@ -33,6 +51,7 @@ Palette light() {
 Palette dark() {
     Palette p;
     p.scheme = ColorScheme::Dark;
+    setMapColors(p, true);
     p.window = hex(0x1B1916);
     p.card = hex(0x2E2A25);
     p.cardEdge = {hex(0x3B362F), 0.5};
@@ -59,6 +78,7 @@ Palette highContrast(ColorScheme scheme) {
     Palette p;
     p.scheme = scheme;
     p.contrast = Contrast::High;
+    setMapColors(p, isDark);
     p.ink = isDark ? hex(0xFFFFFF) : hex(0x000000);
     p.window = p.card = p.bubble = p.highlight = p.sendIdle = ground;
     p.cardEdge = p.bubbleEdge = p.sendIdleEdge = {p.ink, 1.0};
@@ -99,6 +119,26 @@ QColor Palette::resolve(const platform::Color& color) const {
             return ink;
         case platform::ColorRole::Highlight:
             return highlight;
+        case platform::ColorRole::MapLand:
+            return mapLand;
+        case platform::ColorRole::MapNote:
+            return mapNote;
+        case platform::ColorRole::MapScale:
+            return mapScale;
+        case platform::ColorRole::MapScaleHalo:
+            return mapScaleHalo;
+        case platform::ColorRole::MapAttribution:
+            return mapAttribution;
+        case platform::ColorRole::MapAttributionPill:
+            return mapAttributionPill;
+        case platform::ColorRole::MapUserHalo:
+            return mapUserHalo;
+        case platform::ColorRole::FriendPinEdge:
+            return friendPinEdge;
+        case platform::ColorRole::MarkerPinEdge:
+            return markerPinEdge;
+        case platform::ColorRole::PinShadow:
+            return pinShadow();
         case platform::ColorRole::Fixed:
             break;
     }

@@ -26,30 +26,40 @@ class Palette {
     ColorScheme scheme = ColorScheme::Light;
     Contrast contrast = Contrast::Normal;
 
-    QColor window;         ///< behind everything
-    QColor card;           ///< cards and the input field
-    Edge cardEdge;         ///< a card's inner edge
-    QColor bubble;         ///< the question
-    Edge bubbleEdge;       ///< the same of its edge
-    QColor highlight;      ///< a row under a mouse or pen: the selection colour
-    Edge highlightEdge;    ///< the same of its edge
-    QColor ink;            ///< all text in rows, question, sentence: the standard text colour
-    QColor inkSoft;        ///< the host's time, status, placeholder
-    QColor pine;           ///< focus, caret, chevron, live dot, send
-    QColor onPine;         ///< on `pine`
-    QColor fieldLine;      ///< edge of the input field, 1 point
-    QColor sendIdle;       ///< the send button with nothing to send
-    Edge sendIdleEdge;     ///< the same of its edge
-    QColor amber;          ///< the location indicator
-    QColor warning;        ///< the mark before a warning
-    QColor fence;          ///< the fence marker on a map
-    QColor fenceIcon;      ///< the fence icon outside a map
-    QColor cardShadow;     ///< of both shadows under a card; transparent where cards cast none
-    double focusRing = 2;  ///< points
+    QColor window;              ///< behind everything
+    QColor card;                ///< cards and the input field
+    Edge cardEdge;              ///< a card's inner edge
+    QColor bubble;              ///< the question
+    Edge bubbleEdge;            ///< the same of its edge
+    QColor highlight;           ///< a row under a mouse or pen: the selection colour
+    Edge highlightEdge;         ///< the same of its edge
+    QColor ink;                 ///< all text in rows, question, sentence: the standard text colour
+    QColor inkSoft;             ///< the host's time, status, placeholder
+    QColor pine;                ///< focus, caret, chevron, live dot, send
+    QColor onPine;              ///< on `pine`
+    QColor fieldLine;           ///< edge of the input field, 1 point
+    QColor sendIdle;            ///< the send button with nothing to send
+    Edge sendIdleEdge;          ///< the same of its edge
+    QColor amber;               ///< the location indicator
+    QColor warning;             ///< the mark before a warning
+    QColor fence;               ///< the fence marker on a map
+    QColor fenceIcon;           ///< the fence icon outside a map
+    QColor cardShadow;          ///< of both shadows under a card; transparent where cards cast none
+    QColor mapLand;             ///< the ground of a map without a picture
+    QColor mapNote;             ///< words on it
+    QColor mapScale;            ///< the scale bar
+    QColor mapScaleHalo;        ///< around it
+    QColor mapAttribution;      ///< whose data a map shows
+    QColor mapAttributionPill;  ///< behind it
+    QColor mapUserHalo;         ///< around the user
+    QColor friendPinEdge;       ///< around a friend's pin
+    QColor markerPinEdge;       ///< around a marker
+    double focusRing = 2;       ///< points
 
     /// The same in every appearance.
     static QColor separator() { return QColor(151, 158, 149); }
     static QColor friendOrange() { return QColor(239, 143, 20); }
+    static QColor pinShadow() { return QColor(43, 26, 5, 71); }  // alpha 0.28
     static QColor pressed() { return QColor(0, 0, 0, 51); }
 };
 

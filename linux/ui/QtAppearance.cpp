@@ -1,6 +1,19 @@
 #include "linux/ui/QtAppearance.h"
 
+#include "platform/base/NotificationCenter.h"
+#include "platform/base/Platform.h"
+
 namespace ktr::linux_ {
+
+namespace {
+
+void tellOfChange() {
+    if (const auto installed = platform::Platform::installed()) {
+        installed->notificationCenter->post({platform::kAppearanceChangedNotification, nullptr});
+    }
+}
+
+}  // namespace
 
 platform::Font QtAppearance::lightFont(double size) const {
     return {platform::FontFace::Light, platform::FontWeight::Regular, size};
@@ -16,6 +29,21 @@ platform::Color QtAppearance::standardTextColor() const {
 
 platform::Color QtAppearance::highlightColor() const {
     return platform::Color::ofRole(platform::ColorRole::Highlight);
+}
+
+void QtAppearance::show(ColorScheme scheme, Contrast contrast) {
+    if (scheme != scheme_ || contrast != contrast_) {
+        scheme_ = scheme;
+        contrast_ = contrast;
+        tellOfChange();
+    }
+}
+
+void QtAppearance::setReducesMotion(bool reduces) {
+    if (reduces != reducesMotion_) {
+        reducesMotion_ = reduces;
+        tellOfChange();
+    }
 }
 
 }  // namespace ktr::linux_

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "linux/ui/Palette.h"
 #include "platform/ui/Appearance.h"
 
 namespace ktr::linux_ {
@@ -13,6 +14,19 @@ class QtAppearance final : public platform::AssistantAppearance {
     platform::Font thinFont(double size) const override;
     platform::Color standardTextColor() const override;
     platform::Color highlightColor() const override;
+    bool isDark() const override { return scheme_ == ColorScheme::Dark; }
+    bool isHighContrast() const override { return contrast_ == Contrast::High; }
+    bool reducesMotion() const override { return reducesMotion_; }
+
+    /// What the host shows. Posts `kAppearanceChangedNotification` when something changes while a platform is
+    /// installed.
+    void show(ColorScheme scheme, Contrast contrast);
+    void setReducesMotion(bool reduces);
+
+  private:
+    ColorScheme scheme_ = ColorScheme::Light;
+    Contrast contrast_ = Contrast::Normal;
+    bool reducesMotion_ = false;
 };
 
 }  // namespace ktr::linux_

@@ -1,6 +1,8 @@
 #include "linux/ui/QtCanvas.h"
 
 #include <QPainter>
+#include <QPainterPath>
+#include <QPen>
 #include <QTransform>
 #include <algorithm>
 #include <cmath>
@@ -117,25 +119,92 @@ void QtCanvas::fill(const platform::Rect& rect, const platform::Color& color) {
     painter_.setRenderHint(QPainter::Antialiasing, smooth);
 }
 
+QPointF QtCanvas::onBaseline(const QtTextLayout& text, platform::Point origin) const {
+    const Grid g = grid();
+    if (g.scaleY <= 0.0) {
+        return {origin.x, origin.y};
+    }
+    const double baseline = text.lines().front().baseline;
+    const double onDevice = (origin.y + baseline) * g.scaleY + g.dy;
+    return {origin.x, (std::floor(onDevice + 0.5 + kSlack) - g.dy) / g.scaleY - baseline};
+}
+
 void QtCanvas::draw(const platform::TextLayout& text, platform::Point origin, const platform::Color& color) {
     const auto* layout = dynamic_cast<const QtTextLayout*>(&text);
-    if (layout == nullptr || layout->lines().empty()) {
+    if (layout != nullptr && !layout->lines().empty()) {
+        layout->draw(painter_, onBaseline(*layout, origin), palette_.resolve(color), palette_);
+    }
+}
+
+void QtCanvas::drawHalo(const platform::TextLayout& text, platform::Point origin, const platform::Color& color,
+                        double width) {
+    const auto* layout = dynamic_cast<const QtTextLayout*>(&text);
+    if (layout == nullptr || layout->lines().empty() || width <= 0.0) {
         return;
     }
-    const Grid g = grid();
-    const double baseline = layout->lines().front().baseline;
-    double y = origin.y;
-    if (g.scaleY > 0.0) {
-        const double onDevice = (origin.y + baseline) * g.scaleY + g.dy;
-        y = (std::floor(onDevice + 0.5 + kSlack) - g.dy) / g.scaleY - baseline;
-    }
-    layout->draw(painter_, {origin.x, y}, palette_.resolve(color), palette_);
+    const QPen pen(palette_.resolve(color), width, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin);
+    painter_.strokePath(layout->outline().translated(onBaseline(*layout, origin)), pen);
 }
 
 void QtCanvas::draw(const platform::Image& image, const platform::Rect& rect) {
     if (const auto* picture = dynamic_cast<const QtImage*>(&image); picture != nullptr && rect.width > 0.0) {
         picture->draw(painter_, snapped(rect), palette_);
     }
+}
+
+void QtCanvas::drawMoving(const platform::Image& image, const platform::Rect& rect) {
+    if (const auto* picture = dynamic_cast<const QtImage*>(&image); picture != nullptr && rect.width > 0.0) {
+        picture->draw(painter_, {rect.x, rect.y, rect.width, rect.height}, palette_);
+    }
+}
+
+namespace {
+
+QPainterPath toQt(const platform::Path& path) {
+    QPainterPath result;
+    result.setFillRule(Qt::WindingFill);
+    const auto point = [](platform::Point p) { return QPointF(p.x, p.y); };
+    for (const auto& element : path.elements()) {
+        switch (element.verb) {
+            case platform::Path::Verb::Move:
+                result.moveTo(point(element.end));
+                break;
+            case platform::Path::Verb::Line:
+                result.lineTo(point(element.end));
+                break;
+            case platform::Path::Verb::Quad:
+                result.quadTo(point(element.control1), point(element.end));
+                break;
+            case platform::Path::Verb::Cubic:
+                result.cubicTo(point(element.control1), point(element.control2), point(element.end));
+                break;
+            case platform::Path::Verb::Close:
+                result.closeSubpath();
+                break;
+        }
+    }
+    return result;
+}
+
+}  // namespace
+
+void QtCanvas::fill(const platform::Path& path, const platform::Color& color) {
+    if (!color.isClear() && !path.empty()) {
+        painter_.fillPath(toQt(path), palette_.resolve(color));
+    }
+}
+
+void QtCanvas::stroke(const platform::Path& path, const platform::Color& color, const platform::Stroke& stroke) {
+    if (!color.isClear() && !path.empty() && stroke.width > 0.0) {
+        const QPen pen(palette_.resolve(color), stroke.width, Qt::SolidLine,
+                       stroke.roundEnds ? Qt::RoundCap : Qt::FlatCap, Qt::RoundJoin);
+        painter_.strokePath(toQt(path), pen);
+    }
+}
+
+void QtCanvas::clip(const platform::Path& path) {
+    savePainter();
+    painter_.setClipPath(toQt(path), Qt::IntersectClip);
 }
 
 }  // namespace ktr::linux_

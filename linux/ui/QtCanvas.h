@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QPointF>
 #include <QRectF>
 #include <QTransform>
 #include <vector>
@@ -10,6 +11,8 @@
 class QPainter;
 
 namespace ktr::linux_ {
+
+class QtTextLayout;
 
 /// Paints views with a QPainter whose coordinates are points (its transformation, or its device's pixel ratio, makes
 /// pixels of them). Fills, clips and images are snapped to device pixels by their edges, so that neighbours meet; what
@@ -27,6 +30,12 @@ class QtCanvas final : public platform::Canvas {
     void fill(const platform::Rect& rect, const platform::Color& color) override;
     void draw(const platform::TextLayout& text, platform::Point origin, const platform::Color& color) override;
     void draw(const platform::Image& image, const platform::Rect& rect) override;
+    void drawMoving(const platform::Image& image, const platform::Rect& rect) override;
+    void fill(const platform::Path& path, const platform::Color& color) override;
+    void stroke(const platform::Path& path, const platform::Color& color, const platform::Stroke& stroke) override;
+    void clip(const platform::Path& path) override;
+    void drawHalo(const platform::TextLayout& text, platform::Point origin, const platform::Color& color,
+                  double width) override;
 
     /// For what a host paints around the views.
     QPainter& painter();
@@ -44,6 +53,8 @@ class QtCanvas final : public platform::Canvas {
         double dy = 0.0;
     };
     Grid grid() const;
+    /// A text's origin, moved so that its first baseline stands on a whole pixel.
+    QPointF onBaseline(const QtTextLayout& text, platform::Point origin) const;
     void savePainter();
 
     /// Saving a painter costs as much as drawing a short text, and few views change more than the transformation.

@@ -29,4 +29,13 @@ void QtTextLayout::draw(QPainter& painter, QPointF origin, const QColor& color, 
     }
 }
 
+QPainterPath QtTextLayout::outline() const {
+    QPainterPath path;
+    path.setFillRule(Qt::WindingFill);
+    for (const Piece& piece : pieces_) {
+        path.addPath(piece.shaped->outline().translated(piece.offset));
+    }
+    return path;
+}
+
 }  // namespace ktr::linux_

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QPainterPath>
 #include <QPointF>
 #include <memory>
 #include <vector>
@@ -29,6 +30,8 @@ class QtTextLayout final : public platform::TextLayout {
     const std::vector<Piece>& pieces() const { return pieces_; }
     /// The container's top left corner at `origin`, points; runs without a colour take `color`.
     void draw(QPainter& painter, QPointF origin, const QColor& color, const Palette& palette) const;
+    /// The letters' outlines in the container's coordinates; without glyphs that are pictures.
+    QPainterPath outline() const;
 
   private:
     std::vector<Piece> pieces_;

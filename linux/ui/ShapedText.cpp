@@ -5,6 +5,7 @@
 #include <QPaintEngine>
 #include <QPainter>
 #include <QThread>
+#include <QTransform>
 #include <QVarLengthArray>
 #include <algorithm>
 
@@ -133,6 +134,23 @@ void ShapedText::draw(QPainter& painter, QPointF origin, const QColor& color, co
     }
     painter.setTransform(before);
     painter.setPen(pen);
+}
+
+QPainterPath ShapedText::outline() const {
+    const auto layout = recipe_.layout(lines_);
+    QPainterPath path;
+    for (int i = 0; i < static_cast<int>(lines_.size()); ++i) {
+        for (const QGlyphRun& run : layout->lineAt(i).glyphRuns()) {
+            const QRawFont font = run.rawFont();
+            const auto indexes = run.glyphIndexes();
+            const auto positions = run.positions();
+            for (qsizetype k = 0; k < indexes.size(); ++k) {
+                path.addPath(font.pathForGlyph(indexes[k]).translated(positions[k]));
+            }
+        }
+    }
+    path.setFillRule(Qt::WindingFill);
+    return QTransform::fromScale(scale_, scale_).map(path);
 }
 
 }  // namespace ktr::linux_

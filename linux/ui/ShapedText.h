@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QPainterPath>
 #include <QPointF>
 #include <QRawFont>
 #include <QTextLayout>
@@ -39,6 +40,8 @@ class ShapedText {
     const std::vector<ShapeRecipe::Line>& lines() const { return lines_; }
     double scale() const { return scale_; }
     void draw(QPainter& painter, QPointF origin, const QColor& color, const Palette& palette) const;
+    /// The letters' outlines, from the origin; points. Glyphs that are pictures have none.
+    QPainterPath outline() const;
 
   private:
     /// Glyphs of one font and one colour.

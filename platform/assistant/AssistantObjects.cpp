@@ -17,6 +17,31 @@ VAKtrLocationSnippet::~VAKtrLocationSnippet() = default;
 VAKtrGeoFenceSnippet::~VAKtrGeoFenceSnippet() = default;
 VAKtrVisibilityView::~VAKtrVisibilityView() = default;
 
+void VALocation::copyTo(VALocation& other) const {
+    other.latitude = latitude;
+    other.longitude = longitude;
+    other.accuracy = accuracy;
+    other.label = label;
+    other.street = street;
+}
+
+std::shared_ptr<VALocation> VALocation::copy() const {
+    auto other = std::make_shared<VALocation>();
+    copyTo(*other);
+    return other;
+}
+
+std::shared_ptr<VALocation> VAKtrLocation::copy() const {
+    auto other = std::make_shared<VAKtrLocation>();
+    copyTo(*other);
+    other->friend_ = friend_;
+    other->distance = distance;
+    other->city = city;
+    other->stateCode = stateCode;
+    other->locationDate = locationDate;
+    return other;
+}
+
 std::string VAPerson::description() const {
     return "<VAPerson " + fullName.value_or("(null)") + ">";
 }

@@ -12,6 +12,8 @@ namespace ktr::platform {
 class KTR_API VALocation : public AssistantObject {
   public:
     ~VALocation() override;
+    /// An object of the same kind with the same values; what it refers to is shared.
+    virtual std::shared_ptr<VALocation> copy() const;
 
     std::optional<double> latitude;   ///< degrees
     std::optional<double> longitude;  ///< degrees
@@ -19,12 +21,16 @@ class KTR_API VALocation : public AssistantObject {
     /// A named place: a contact-address label such as "_$!<home>!$_", or the user's own word.
     std::optional<std::string> label;
     std::optional<std::string> street;
+
+  protected:
+    void copyTo(VALocation& other) const;
 };
 
 /// Where a friend is.
 class KTR_API VAKtrLocation : public VALocation {
   public:
     ~VAKtrLocation() override;
+    std::shared_ptr<VALocation> copy() const override;
     std::string description() const override;
 
     std::shared_ptr<VAPersonAttribute> friend_;

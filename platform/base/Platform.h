@@ -29,7 +29,9 @@ class Telephony;
 class Geodesy;
 class DistanceCalculatorFactory;
 class LocationManagerFactory;
+class LengthFormatter;
 class MapPictureSource;
+class MapsApplication;
 class Device;
 class TextEngine;
 class ImageSource;
@@ -59,6 +61,7 @@ class KTR_API Platform {
     std::shared_ptr<NotificationCenter> notificationCenter;  ///< made by the constructor
     std::shared_ptr<NumberFormatter> decimalNumbers;
     std::shared_ptr<RegionSettings> region;
+    std::shared_ptr<LengthFormatter> lengths;
     std::shared_ptr<AssistantSettings> assistant;
     std::shared_ptr<Localization> localization;
     std::shared_ptr<ContactStore> contactStore;  ///< may be none
@@ -71,7 +74,8 @@ class KTR_API Platform {
     std::shared_ptr<Geodesy> geodesy;
     std::shared_ptr<DistanceCalculatorFactory> distanceCalculators;
     std::shared_ptr<LocationManagerFactory> locationManagers;
-    std::shared_ptr<MapPictureSource> maps;
+    std::shared_ptr<MapPictureSource> maps;  ///< may be none: maps then show plain land
+    std::shared_ptr<MapsApplication> mapsApplication;
     std::shared_ptr<Device> device;
     std::shared_ptr<TextEngine> textEngine;
     std::shared_ptr<ImageSource> images;

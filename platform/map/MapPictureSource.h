@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "platform/base/Geometry.h"
+#include "platform/map/LocationShifter.h"
 #include "platform/map/MapViewport.h"
 #include "platform/ui/Image.h"
 
@@ -44,6 +45,8 @@ class KTR_API MapPictureSource {
     /// Called on the main thread whenever pictures drawn earlier would now look different (a tile has arrived, the
     /// configuration names another source). Several may listen; the connection ends when the returned token goes.
     virtual std::shared_ptr<void> observeChanges(std::function<void()> changed) = 0;
+    /// In which datum the data is; coordinates of requests are in it, too.
+    virtual MapDatum datum() const { return MapDatum::Wgs84; }
 };
 
 }  // namespace ktr::platform

@@ -6,7 +6,10 @@
 
 namespace ktr::platform {
 
-/// The assistant interface's own type faces and standard colours. Main thread.
+/// Posted when `isDark`, `isHighContrast` or `reducesMotion` have changed.
+inline constexpr const char* kAppearanceChangedNotification = "ktrAppearanceChanged";
+
+/// The assistant interface's own type faces and standard colours, and how it is shown at present. Main thread.
 class KTR_API AssistantAppearance {
   public:
     virtual ~AssistantAppearance();
@@ -15,6 +18,10 @@ class KTR_API AssistantAppearance {
     virtual Font thinFont(double size) const = 0;
     virtual Color standardTextColor() const = 0;
     virtual Color highlightColor() const = 0;
+    virtual bool isDark() const = 0;
+    virtual bool isHighContrast() const = 0;
+    /// The user wants things to be at their new places at once.
+    virtual bool reducesMotion() const = 0;
 };
 
 }  // namespace ktr::platform

@@ -7,6 +7,7 @@
 #include "platform/text/TextEngine.h"
 #include "platform/ui/Color.h"
 #include "platform/ui/Image.h"
+#include "platform/ui/Path.h"
 
 namespace ktr::platform {
 
@@ -26,6 +27,15 @@ class KTR_API Canvas {
     /// a colour of their own take `color`.
     virtual void draw(const TextLayout& text, Point origin, const Color& color) = 0;
     virtual void draw(const Image& image, const Rect& rect) = 0;
+    /// The same for a picture that moves: not snapped, so that it glides.
+    virtual void drawMoving(const Image& image, const Rect& rect) = 0;
+    /// Outlines are drawn where they are, with smooth edges: never snapped. Overlapping parts count once.
+    virtual void fill(const Path& path, const Color& color) = 0;
+    virtual void stroke(const Path& path, const Color& color, const Stroke& stroke) = 0;
+    virtual void clip(const Path& path) = 0;
+    /// Widens a text's letters by half of `width` to every side, to be drawn under them: what keeps words legible on a
+    /// picture. The same place as `draw` gives them.
+    virtual void drawHalo(const TextLayout& text, Point origin, const Color& color, double width) = 0;
 };
 
 }  // namespace ktr::platform

@@ -281,6 +281,38 @@ double SphereGeodesy::distance(const Coordinate& from, const Coordinate& to) con
     return 2.0 * kRadius * std::asin(std::min(1.0, std::sqrt(h)));
 }
 
+double SphereGeodesy::azimuth(const Coordinate& from, const Coordinate& to) const {
+    if (!isValid(from) || !isValid(to) || from == to) {
+        return std::nan("");
+    }
+    constexpr double kRadians = 3.14159265358979323846 / 180.0;
+    const double a = from.latitude * kRadians;
+    const double b = to.latitude * kRadians;
+    const double dLon = (to.longitude - from.longitude) * kRadians;
+    const double y = std::sin(dLon) * std::cos(b);
+    const double x = std::cos(a) * std::sin(b) - std::sin(a) * std::cos(b) * std::cos(dLon);
+    const double degrees = std::atan2(y, x) / kRadians;
+    const double positive = degrees < 0.0 ? degrees + 360.0 : degrees;
+    return positive < 360.0 ? positive : 0.0;
+}
+
+Coordinate SphereGeodesy::destination(const Coordinate& from, double azimuthDegrees, double metres) const {
+    if (!isValid(from) || !std::isfinite(azimuthDegrees) || !std::isfinite(metres)) {
+        return {std::nan(""), std::nan("")};
+    }
+    constexpr double kRadius = 6371008.8;
+    constexpr double kRadians = 3.14159265358979323846 / 180.0;
+    const double arc = metres / kRadius;
+    const double a = from.latitude * kRadians;
+    const double direction = azimuthDegrees * kRadians;
+    const double sine = std::sin(a) * std::cos(arc) + std::cos(a) * std::sin(arc) * std::cos(direction);
+    const double b = std::asin(std::max(-1.0, std::min(1.0, sine)));
+    const double y = std::sin(direction) * std::sin(arc) * std::cos(a);
+    const double x = std::cos(arc) - std::sin(a) * std::sin(b);
+    const double longitude = from.longitude + std::atan2(y, x) / kRadians;
+    return {b / kRadians, std::remainder(longitude, 360.0)};
+}
+
 std::shared_ptr<DistanceCalculator> FakeDistanceCalculators::makeDistanceCalculator(
     const DistanceCalculator::Settings& settings) {
     made.push_back(settings);

@@ -61,6 +61,13 @@ struct FakeAppearance : platform::AssistantAppearance {
         return platform::Color::ofRole(platform::ColorRole::StandardText);
     }
     platform::Color highlightColor() const override { return platform::Color::ofRole(platform::ColorRole::Highlight); }
+    bool isDark() const override { return dark; }
+    bool isHighContrast() const override { return highContrast; }
+    bool reducesMotion() const override { return reducedMotion; }
+
+    bool dark = false;
+    bool highContrast = false;
+    bool reducedMotion = false;
 };
 
 /// Texts by language, bundle, table and key; falls back as the interface says.
@@ -169,6 +176,9 @@ struct FakeTelephony : platform::Telephony {
 /// Great circles on a sphere of the WGS84 mean radius, 6,371,008.8 m: within 0.6 % of the ellipsoid.
 struct SphereGeodesy : platform::Geodesy {
     double distance(const platform::Coordinate& from, const platform::Coordinate& to) const override;
+    double azimuth(const platform::Coordinate& from, const platform::Coordinate& to) const override;
+    platform::Coordinate destination(const platform::Coordinate& from, double azimuthDegrees,
+                                     double metres) const override;
 };
 
 /// Whole metres below a kilometre, else kilometres with one digit.

@@ -1,0 +1,111 @@
+#include "platform/map/MapGround.h"
+
+#include <cmath>
+#include <utility>
+
+#include "platform/base/Platform.h"
+#include "platform/ui/Canvas.h"
+
+namespace ktr::platform {
+
+namespace {
+
+/// Where a picture of another viewport stands in this one: the same ground at the same places.
+Rect placeOf(const MapViewport& picture, const MapViewport& viewport) {
+    const Point middle = viewport.pointFor(picture.centre);
+    const double scale = std::exp2(viewport.zoom - picture.zoom);
+    const Size size{picture.size.width * scale, picture.size.height * scale};
+    return {middle.x - size.width / 2.0, middle.y - size.height / 2.0, size.width, size.height};
+}
+
+bool covers(const Rect& rect, const Size& size) {
+    constexpr double kSlack = 1e-6;
+    return rect.x <= kSlack && rect.y <= kSlack && rect.maxX() >= size.width - kSlack &&
+           rect.maxY() >= size.height - kSlack;
+}
+
+}  // namespace
+
+MapGround::MapGround(std::function<void()> changed)
+    : changed_(std::move(changed)), self_(std::make_shared<MapGround*>(this)) {
+    const auto installed = Platform::installed();
+    source_ = installed ? installed->maps : nullptr;
+    if (source_) {
+        sourceChanges_ = source_->observeChanges([weakSelf = std::weak_ptr(self_)] {
+            if (const auto self = weakSelf.lock()) {
+                (*self)->sourceChanged();
+            }
+        });
+    }
+}
+
+MapGround::~MapGround() {
+    if (source_ && pending_) {
+        source_->cancel(*pending_);
+    }
+}
+
+void MapGround::want(const MapPictureRequest& request) {
+    if (!source_ || wanted_ == request) {
+        return;
+    }
+    wanted_ = request;
+    this->request();
+}
+
+void MapGround::request() {
+    if (pending_) {
+        source_->cancel(*std::exchange(pending_, std::nullopt));
+    }
+    isOutdated_ = false;
+    pending_ = source_->requestPicture(*wanted_, [weakSelf = std::weak_ptr(self_)](const MapPicture& picture) {
+        if (const auto self = weakSelf.lock()) {
+            (*self)->arrived(picture);
+        }
+    });
+}
+
+void MapGround::sourceChanged() {
+    if (!wanted_) {
+        return;
+    }
+    // Tiles arrive by the dozen: the picture under way is shown first, then one with all that has come since.
+    if (pending_) {
+        isOutdated_ = true;
+    } else {
+        request();
+    }
+}
+
+void MapGround::arrived(const MapPicture& picture) {
+    pending_ = std::nullopt;
+    if (latest_ && latest_->viewport != picture.viewport) {
+        previous_ = std::move(latest_);
+    }
+    latest_ = picture;
+    attribution_ = picture.attribution;
+    if (isOutdated_) {
+        request();
+    }
+    changed_();
+}
+
+void MapGround::draw(Canvas& canvas, const MapViewport& viewport) const {
+    const Size& size = viewport.size;
+    canvas.fill(Rect{0.0, 0.0, size.width, size.height}, Color::ofRole(ColorRole::MapLand));
+    const Rect top = latest_ ? placeOf(latest_->viewport, viewport) : Rect{};
+    if (previous_ && previous_->image && !(latest_ && covers(top, size))) {
+        canvas.drawMoving(*previous_->image, placeOf(previous_->viewport, viewport));
+    }
+    if (!latest_ || !latest_->image) {
+        return;
+    }
+    // At rest every pixel of the picture is a pixel of the screen.
+    if (latest_->viewport == viewport) {
+        canvas.draw(*latest_->image, {0.0, 0.0, size.width, size.height});
+    } else {
+        canvas.drawMoving(*latest_->image, top);
+    }
+}
+
+}  // namespace ktr::platform

@@ -1,0 +1,55 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "platform/map/MapPictureSource.h"
+
+namespace ktr::platform {
+
+class Canvas;
+
+/// The ground of one map: asks the installed source for pictures, at most one at a time, and draws the ones it has
+/// where the map is at the moment. Main thread.
+class MapGround {
+  public:
+    /// `changed` is called when it has to be painted again; it may outlive nothing that it uses.
+    explicit MapGround(std::function<void()> changed);
+    ~MapGround();
+    MapGround(const MapGround&) = delete;
+    MapGround& operator=(const MapGround&) = delete;
+
+    /// Whether there is anybody who draws pictures.
+    bool hasSource() const { return source_ != nullptr; }
+    /// What is to be seen when the map has come to rest. Asks for nothing that was asked for last; what is under way
+    /// and no longer wanted is cancelled.
+    void want(const MapPictureRequest& request);
+    /// The pictures that there are, the latest on top; beside them the land's colour.
+    void draw(Canvas& canvas, const MapViewport& viewport) const;
+    /// Of the latest picture; empty without one.
+    const std::string& attribution() const { return attribution_; }
+
+  private:
+    struct State;
+    void request();
+    void arrived(const MapPicture& picture);
+    void sourceChanged();
+
+    std::function<void()> changed_;
+    std::shared_ptr<MapPictureSource> source_;
+    std::shared_ptr<void> sourceChanges_;
+    std::optional<MapPictureRequest> wanted_;
+    std::optional<int> pending_;
+    /// The source's pictures have changed while one was being drawn.
+    bool isOutdated_ = false;
+    /// The latest, and the one that was shown before it.
+    std::optional<MapPicture> latest_;
+    std::optional<MapPicture> previous_;
+    std::string attribution_;
+    /// For callbacks that come when the ground is gone.
+    std::shared_ptr<MapGround*> self_;
+};
+
+}  // namespace ktr::platform

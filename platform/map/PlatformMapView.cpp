@@ -1,0 +1,378 @@
+#include "platform/map/PlatformMapView.h"
+
+#include <algorithm>
+#include <cmath>
+
+#include "platform/assistant/AssistantSettings.h"
+#include "platform/base/MainLoop.h"
+#include "platform/base/Platform.h"
+#include "platform/map/LocationShifter.h"
+#include "platform/map/MapAnnotationLayer.h"
+#include "platform/map/MapChromeView.h"
+#include "platform/map/MapGround.h"
+#include "platform/map/MapLocationManager.h"
+#include "platform/map/Mercator.h"
+#include "platform/ui/Appearance.h"
+#include "platform/ui/Canvas.h"
+#include "platform/ui/Device.h"
+
+namespace ktr::platform {
+
+namespace {
+
+constexpr double kGlide = 0.5;  // seconds
+/// Before anything has been asked for: as much of the world as the view has room for, most of its people in it.
+constexpr MapRegion kWorld{{20.0, 0.0}, {170.0, 360.0}};
+/// Rectangles that labels keep clear of are taken this coarsely: a step of the user's does not change the picture.
+constexpr double kClearGrid = 12.0;
+
+Rect onGrid(const Rect& rect) {
+    const double left = std::floor(rect.x / kClearGrid) * kClearGrid;
+    const double top = std::floor(rect.y / kClearGrid) * kClearGrid;
+    return {left, top, std::ceil(rect.maxX() / kClearGrid) * kClearGrid - left,
+            std::ceil(rect.maxY() / kClearGrid) * kClearGrid - top};
+}
+
+/// On the way from one viewport to another: the scale changes evenly to the eye, and what is common to both stays put.
+MapViewport between(const MapViewport& from, const MapViewport& to, double progress) {
+    if (progress >= 1.0) {
+        return to;
+    }
+    const double zoom = from.zoom + (to.zoom - from.zoom) * progress;
+    const double first = 1.0 / mercatorWorld(from.zoom);
+    const double last = 1.0 / mercatorWorld(to.zoom);
+    const double now = 1.0 / mercatorWorld(zoom);
+    const double part = std::abs(last - first) > 1e-6 * first ? (now - first) / (last - first) : progress;
+    const Point a = mercatorPoint(from.centre);
+    const Point b = mercatorPoint(to.centre);
+    const double dx = b.x - a.x;
+    return {mercatorCoordinate({a.x + (dx - std::round(dx)) * part, a.y + (b.y - a.y) * part}), zoom, to.size};
+}
+
+}  // namespace
+
+PlatformMapViewDelegate::~PlatformMapViewDelegate() = default;
+
+/// Hears of the user's position for a map.
+class PlatformMapView::UserTracker : public PlatformLocationManagerDelegate,
+                                     public std::enable_shared_from_this<UserTracker> {
+  public:
+    explicit UserTracker(std::weak_ptr<PlatformMapView> map) : map_(std::move(map)) {}
+    ~UserTracker() override {
+        if (manager_) {
+            manager_->stopUpdatingLocation();
+        }
+    }
+    void start(const std::shared_ptr<PlatformLocationManager>& manager) {
+        manager_ = manager;
+        manager->setDelegate(weak_from_this());
+        manager->setDesiredAccuracy(kLocationAccuracyNearestTenMeters);
+        manager->setDistanceFilter(1.0);
+        manager->startUpdatingLocation();
+        tell(manager->location());
+    }
+    void didUpdateLocations(PlatformLocationManager&, const PlatformLocations& locations) override {
+        if (!locations.empty()) {
+            tell(locations.back());
+        }
+    }
+
+  private:
+    void tell(const std::shared_ptr<PlatformLocation>& location) {
+        // A negative accuracy marks a position that is none.
+        if (const auto map = map_.lock();
+            map && location && isValid(location->coordinate()) && location->fix().horizontalAccuracy >= 0.0) {
+            map->userMoved(location);
+        }
+    }
+
+    std::weak_ptr<PlatformMapView> map_;
+    std::shared_ptr<PlatformLocationManager> manager_;
+};
+
+PlatformMapView::PlatformMapView() : userLocation_(std::make_shared<UserLocation>()) {}
+
+PlatformMapView::~PlatformMapView() {
+    if (glide_) {
+        glide_->stop();
+    }
+}
+
+bool PlatformMapView::initWithFrame(const Rect& frame) {
+    if (!View::initWithFrame(frame)) {
+        return false;
+    }
+    setUserInteractionEnabled(false);
+    layer_ = std::make_unique<MapAnnotationLayer>(*this);
+    ground_ = std::make_unique<MapGround>([target = weak(this)] {
+        if (const auto self = target.lock()) {
+            self->setNeedsUpdate();
+            self->setNeedsDisplay();
+        }
+    });
+    chrome_ = create<MapChromeView>(&MapChromeView::initWithFrame, bounds());
+    addSubview(chrome_);
+    if (const auto installed = Platform::installed()) {
+        appearanceChanged_ = installed->notificationCenter->addObserver(kAppearanceChangedNotification,
+                                                                        [target = weak(this)](const Notification&) {
+                                                                            if (const auto self = target.lock()) {
+                                                                                self->setNeedsUpdate();
+                                                                            }
+                                                                        });
+    }
+    setNeedsUpdate();
+    return true;
+}
+
+void PlatformMapView::setDelegate(std::weak_ptr<PlatformMapViewDelegate> delegate) {
+    delegate_ = std::move(delegate);
+}
+
+void PlatformMapView::setNeedsUpdate() {
+    const auto installed = Platform::installed();
+    if (updateIsPosted_ || !installed || !installed->mainLoop) {
+        return;
+    }
+    updateIsPosted_ = true;
+    installed->mainLoop->post([target = weak(this)] {
+        if (const auto self = target.lock()) {
+            self->updateIsPosted_ = false;
+            self->updateNow();
+        }
+    });
+}
+
+void PlatformMapView::updateNow() {
+    if (!Platform::installed()) {
+        return;
+    }
+    std::vector<std::shared_ptr<MapAnnotation>> shown;
+    if (showsUserLocation_) {
+        shown.push_back(userLocation_);
+    }
+    shown.insert(shown.end(), annotations_.begin(), annotations_.end());
+    layer_->reconcile(shown);
+    arrangeViews(shown);
+    updateRenderers();
+    updateViewport();
+    requestGround();
+}
+
+/// The user behind the pins, these in their order, the corners in front.
+void PlatformMapView::arrangeViews(const std::vector<std::shared_ptr<MapAnnotation>>& annotations) {
+    std::vector<std::shared_ptr<View>> wanted;
+    for (const auto& annotation : annotations) {
+        wanted.push_back(layer_->viewFor(*annotation));
+    }
+    wanted.push_back(chrome_);
+    if (wanted != subviews()) {
+        for (const auto& view : wanted) {
+            bringSubviewToFront(view);
+        }
+    }
+}
+
+void PlatformMapView::updateRenderers() {
+    if (!overlaysChanged_) {
+        return;
+    }
+    overlaysChanged_ = false;
+    std::vector<std::shared_ptr<MapOverlayRenderer>> renderers;
+    const auto asked = delegate();
+    for (const auto& overlay : overlays_) {
+        const auto known = std::find_if(renderers_.begin(), renderers_.end(),
+                                        [&](const auto& renderer) { return renderer->overlay() == overlay; });
+        auto renderer = known != renderers_.end() ? *known
+                        : asked                   ? asked->rendererForOverlay(*this, overlay)
+                                                  : nullptr;
+        if (renderer) {
+            renderers.push_back(std::move(renderer));
+        }
+    }
+    renderers_ = std::move(renderers);
+    setNeedsDisplay();
+}
+
+// Region
+
+void PlatformMapView::setRegion(const MapRegion& region, bool animated) {
+    if (!isValid(region.center)) {
+        return;
+    }
+    glidesToRequested_ = animated && requested_.has_value();
+    requested_ = region;
+    updateViewport();
+    setNeedsUpdate();
+}
+
+MapViewport PlatformMapView::viewportAtRest() const {
+    return requested_.value_or(kWorld).viewport(bounds().size());
+}
+
+MapRegion PlatformMapView::region() const {
+    return MapRegion::of(viewportAtRest());
+}
+
+void PlatformMapView::updateViewport() {
+    const MapViewport target = viewportAtRest();
+    const bool glides = std::exchange(glidesToRequested_, false);
+    if (glide_ && glide_->isRunning() && glideTarget_ == target) {
+        return;
+    }
+    if (target == shown_) {
+        show(target);
+        return;
+    }
+    if (glide_) {
+        glide_->stop();
+        glide_ = nullptr;
+    }
+    const bool hasSize = shown_.size == target.size && target.size.width > 0.0 && target.size.height > 0.0;
+    if (glides && hasSize) {
+        glideTo(target);
+    } else {
+        show(target);
+    }
+}
+
+void PlatformMapView::glideTo(const MapViewport& target) {
+    glideTarget_ = target;
+    auto glide = Animation::start(kGlide, [self = weak(this), from = shown_, target](double progress) {
+        if (const auto map = self.lock()) {
+            map->show(between(from, target, progress));
+        }
+    });
+    if (glide->isRunning()) {
+        glide_ = std::move(glide);
+    }
+}
+
+void PlatformMapView::show(const MapViewport& viewport) {
+    shown_ = viewport;
+    layer_->place(viewport);
+    chrome_->setFrame(bounds());
+    chrome_->show(viewport, ground_->hasSource(), ground_->attribution());
+    setNeedsDisplay();
+}
+
+void PlatformMapView::requestGround() {
+    const MapViewport target = viewportAtRest();
+    const auto installed = Platform::installed();
+    if (!installed || !(target.size.width > 0.0) || !(target.size.height > 0.0)) {
+        return;
+    }
+    MapPictureRequest request;
+    request.viewport = target;
+    request.scale = installed->device ? std::clamp(installed->device->mainScreenScale(), 1.0, 3.0) : 1.0;
+    request.isDark = installed->appearance && installed->appearance->isDark();
+    request.isHighContrast = installed->appearance && installed->appearance->isHighContrast();
+    request.language = installed->assistant ? installed->assistant->languageCode().value_or("") : "";
+    for (const Rect& rect : layer_->coveredRects(target)) {
+        request.clear.push_back(onGrid(rect));
+    }
+    for (const Rect& rect : chrome_->clearRects(target.size)) {
+        request.clear.push_back(onGrid(rect));
+    }
+    ground_->want(request);
+}
+
+// Annotations and overlays
+
+void PlatformMapView::addAnnotation(const std::shared_ptr<MapAnnotation>& annotation) {
+    if (annotation && std::find(annotations_.begin(), annotations_.end(), annotation) == annotations_.end()) {
+        annotations_.push_back(annotation);
+        setNeedsUpdate();
+        setNeedsLayout();
+    }
+}
+
+void PlatformMapView::removeAnnotation(const std::shared_ptr<MapAnnotation>& annotation) {
+    if (std::erase(annotations_, annotation) > 0) {
+        setNeedsUpdate();
+        setNeedsLayout();
+    }
+}
+
+void PlatformMapView::removeAnnotations(const std::vector<std::shared_ptr<MapAnnotation>>& annotations) {
+    // The list may be this map's own.
+    const auto removed = annotations;
+    for (const auto& annotation : removed) {
+        removeAnnotation(annotation);
+    }
+}
+
+std::shared_ptr<AnnotationView> PlatformMapView::viewForAnnotation(const MapAnnotation& annotation) const {
+    return layer_->viewFor(annotation);
+}
+
+std::shared_ptr<AnnotationView> PlatformMapView::dequeueReusableAnnotationView(const std::string& reuseIdentifier) {
+    return layer_->dequeue(reuseIdentifier);
+}
+
+void PlatformMapView::addOverlay(const std::shared_ptr<MapOverlay>& overlay) {
+    if (overlay && std::find(overlays_.begin(), overlays_.end(), overlay) == overlays_.end()) {
+        overlays_.push_back(overlay);
+        overlaysChanged_ = true;
+        setNeedsUpdate();
+        setNeedsLayout();
+    }
+}
+
+void PlatformMapView::removeOverlay(const std::shared_ptr<MapOverlay>& overlay) {
+    if (std::erase(overlays_, overlay) > 0) {
+        overlaysChanged_ = true;
+        setNeedsUpdate();
+        setNeedsLayout();
+    }
+}
+
+void PlatformMapView::removeOverlays(const std::vector<std::shared_ptr<MapOverlay>>& overlays) {
+    const auto removed = overlays;
+    for (const auto& overlay : removed) {
+        removeOverlay(overlay);
+    }
+}
+
+// The user
+
+void PlatformMapView::setShowsUserLocation(bool shows) {
+    if (shows == showsUserLocation_) {
+        return;
+    }
+    showsUserLocation_ = shows;
+    tracker_ = nullptr;
+    const auto installed = Platform::installed();
+    if (!shows) {
+        userLocation_->setLocation(nullptr, {});
+    } else if (installed && installed->locationManagers) {
+        const auto permission = shared<MapLocationManager>();
+        tracker_ = std::make_shared<UserTracker>(weak(this));
+        tracker_->start(installed->locationManagers->makeManager(permission ? permission->effectiveBundle() : nullptr));
+    }
+    setNeedsUpdate();
+    setNeedsLayout();
+}
+
+void PlatformMapView::userMoved(const std::shared_ptr<PlatformLocation>& location) {
+    const auto onMap = LocationShifter::shiftedForInstalledMaps(location->coordinate());
+    Animation::animate(kGlide, [&] { userLocation_->setLocation(location, onMap); });
+    setNeedsUpdate();
+}
+
+// Drawing
+
+void PlatformMapView::layoutSubviews() {
+    chrome_->setFrame(bounds());
+    updateNow();
+}
+
+void PlatformMapView::draw(Canvas& canvas) const {
+    // Pins may reach over an edge, and pictures do while they move.
+    canvas.clip(bounds());
+    ground_->draw(canvas, shown_);
+    for (const auto& renderer : renderers_) {
+        renderer->draw(canvas, shown_);
+    }
+}
+
+}  // namespace ktr::platform
