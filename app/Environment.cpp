@@ -5,10 +5,13 @@
 
 #include "app/Resources.h"
 #include "app/ScenarioClock.h"
+#include "linux/maps/ConfiguredMaps.h"
 #include "linux/services/ConfiguredAssistant.h"
+#include "linux/services/DesktopMapsApplication.h"
 #include "linux/services/FilteredLogSink.h"
 #include "linux/services/GeographicLibGeodesy.h"
 #include "linux/services/IcuDistanceCalculatorFactory.h"
+#include "linux/services/IcuLengthFormatter.h"
 #include "linux/services/IcuNumberFormatter.h"
 #include "linux/services/LocalCalendar.h"
 #include "linux/services/LocaleRegion.h"
@@ -77,6 +80,27 @@ std::shared_ptr<linux_::QtLocalization> readTexts(const HostSettings& settings, 
     return texts;
 }
 
+/// Lengths on maps are told in the units of the distances beside them, whatever decides those.
+platform::LengthSystem lengthSystem(const Platform& platform) {
+    platform::DistanceCalculator::Settings settings;
+    settings.defaultsSuite = "group.org.ktr";
+    settings.measurementSystemLocale = platform.region->localeIdentifier();
+    switch (platform.distanceCalculators->makeDistanceCalculator(settings)->measurementSystem()) {
+        case 1:
+            return platform::LengthSystem::UnitedStates;
+        case 2:
+            return platform::LengthSystem::UnitedKingdom;
+        default:
+            return platform::LengthSystem::Metric;
+    }
+}
+
+void addMaps(Platform& platform, const HostSettings& settings, const linux_::Configuration& configuration) {
+    platform.lengths = std::make_shared<linux_::IcuLengthFormatter>(settings.language, lengthSystem(platform));
+    platform.mapsApplication = std::make_shared<linux_::DesktopMapsApplication>();
+    platform.maps = linux_::ConfiguredMaps::make(configuration, resourceFolder(), platform.mainLoop);
+}
+
 void addUserInterface(Platform& platform, const HostSettings& settings) {
     auto device = std::make_shared<linux_::LinuxDevice>();
     device->setUserInterfaceIdiom(settings.idiom);
@@ -140,6 +164,7 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
         environment.live = std::make_unique<LiveServices>(*settings.liveConfiguration);
         environment.live->addTo(platform, settings.language, !settings.positions.empty());
     }
+    addMaps(platform, settings, environment.live ? environment.live->configuration() : linux_::Configuration{});
     return environment;
 }
 

@@ -110,9 +110,7 @@ std::optional<Failure> Host::addTurn(const Scenario& scenario) {
     conversation_->addTurn(turn);
     if (scenario.snippet && !addCard(*turn, scenario)) {
         conversation_->removeTurn(turn);
-        return Failure{ExitCode::NotDrawn,
-                       scenario.file + ": the plugin draws no such answer: a " + scenario.kind +
-                           (scenario.kind == "VAKtrLocationSnippet" ? " without \"proximity\"" : "")};
+        return Failure{ExitCode::NotDrawn, scenario.file + ": the plugin draws no such answer: a " + scenario.kind};
     }
     return std::nullopt;
 }

@@ -8,8 +8,8 @@
 #include "platform/base/Platform.h"
 #include "platform/map/LocationShifter.h"
 #include "platform/map/MapAnnotationLayer.h"
+#include "platform/map/MapBackdrop.h"
 #include "platform/map/MapChromeView.h"
-#include "platform/map/MapGround.h"
 #include "platform/map/MapLocationManager.h"
 #include "platform/map/Mercator.h"
 #include "platform/ui/Appearance.h"
@@ -104,7 +104,7 @@ bool PlatformMapView::initWithFrame(const Rect& frame) {
     }
     setUserInteractionEnabled(false);
     layer_ = std::make_unique<MapAnnotationLayer>(*this);
-    ground_ = std::make_unique<MapGround>([target = weak(this)] {
+    backdrop_ = std::make_unique<MapBackdrop>([target = weak(this)] {
         if (const auto self = target.lock()) {
             self->setNeedsUpdate();
             self->setNeedsDisplay();
@@ -251,7 +251,7 @@ void PlatformMapView::show(const MapViewport& viewport) {
     shown_ = viewport;
     layer_->place(viewport);
     chrome_->setFrame(bounds());
-    chrome_->show(viewport, ground_->hasSource(), ground_->attribution());
+    chrome_->show(viewport, backdrop_->hasSource(), backdrop_->attribution());
     setNeedsDisplay();
 }
 
@@ -273,7 +273,7 @@ void PlatformMapView::requestGround() {
     for (const Rect& rect : chrome_->clearRects(target.size)) {
         request.clear.push_back(onGrid(rect));
     }
-    ground_->want(request);
+    backdrop_->want(request);
 }
 
 // Annotations and overlays
@@ -369,7 +369,7 @@ void PlatformMapView::layoutSubviews() {
 void PlatformMapView::draw(Canvas& canvas) const {
     // Pins may reach over an edge, and pictures do while they move.
     canvas.clip(bounds());
-    ground_->draw(canvas, shown_);
+    backdrop_->draw(canvas, shown_);
     for (const auto& renderer : renderers_) {
         renderer->draw(canvas, shown_);
     }

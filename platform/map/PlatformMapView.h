@@ -18,7 +18,7 @@ namespace ktr::platform {
 
 class MapAnnotationLayer;
 class MapChromeView;
-class MapGround;
+class MapBackdrop;
 class PlatformMapView;
 
 /// Chooses what a map draws. Main thread.
@@ -124,7 +124,7 @@ class KTR_API PlatformMapView : public View {
     std::vector<std::shared_ptr<MapOverlayRenderer>> renderers_;
     std::shared_ptr<UserLocation> userLocation_;
     std::shared_ptr<UserTracker> tracker_;
-    std::unique_ptr<MapGround> ground_;
+    std::unique_ptr<MapBackdrop> backdrop_;
     std::unique_ptr<MapAnnotationLayer> layer_;
     std::shared_ptr<MapChromeView> chrome_;
     NotificationCenter::Token appearanceChanged_;

@@ -128,5 +128,10 @@
         <extracomment>Below a question whose answer is of a kind that cannot be shown. English: “This answer cannot be shown here.”</extracomment>
         <translation>لا يمكن عرض هذه الإجابة هنا.</translation>
     </message>
+    <message>
+        <source>MAP_NOT_AVAILABLE</source>
+        <extracomment>In place of a map that nobody can draw. English: “Map not available”</extracomment>
+        <translation>الخريطة غير متوفرة</translation>
+    </message>
 </context>
 </TS>

@@ -128,5 +128,10 @@
         <extracomment>Below a question whose answer is of a kind that cannot be shown</extracomment>
         <translation>This answer cannot be shown here.</translation>
     </message>
+    <message>
+        <source>MAP_NOT_AVAILABLE</source>
+        <extracomment>In place of a map that nobody can draw. English: “Map not available”</extracomment>
+        <translation>Map not available</translation>
+    </message>
 </context>
 </TS>

@@ -166,9 +166,6 @@ class ProgramTest(unittest.TestCase):
         unknown = self.folder / "fence.json"
         unknown.write_text('{"snippet": {"kind": "VAWeatherSnippet"}}')
         self.assert_refused(run("describe", unknown), 4, "VAWeatherSnippet")
-        alone = self.folder / "alone.json"
-        alone.write_text('{"snippet": {"kind": "VAKtrLocationSnippet"}}')
-        self.assert_refused(run("describe", alone), 4, "proximity")
         self.assert_refused(run("describe", SCENARIOS / "dinner.json", "--text-size", "AX3"), 4, "AX1 to AX5")
 
     def test_broken_scenarios_are_one_line(self):

@@ -1,4 +1,4 @@
-#include "platform/map/MapGround.h"
+#include "platform/map/MapBackdrop.h"
 
 #include <cmath>
 #include <utility>
@@ -26,8 +26,8 @@ bool covers(const Rect& rect, const Size& size) {
 
 }  // namespace
 
-MapGround::MapGround(std::function<void()> changed)
-    : changed_(std::move(changed)), self_(std::make_shared<MapGround*>(this)) {
+MapBackdrop::MapBackdrop(std::function<void()> changed)
+    : changed_(std::move(changed)), self_(std::make_shared<MapBackdrop*>(this)) {
     const auto installed = Platform::installed();
     source_ = installed ? installed->maps : nullptr;
     if (source_) {
@@ -39,13 +39,13 @@ MapGround::MapGround(std::function<void()> changed)
     }
 }
 
-MapGround::~MapGround() {
+MapBackdrop::~MapBackdrop() {
     if (source_ && pending_) {
         source_->cancel(*pending_);
     }
 }
 
-void MapGround::want(const MapPictureRequest& request) {
+void MapBackdrop::want(const MapPictureRequest& request) {
     if (!source_ || wanted_ == request) {
         return;
     }
@@ -53,7 +53,7 @@ void MapGround::want(const MapPictureRequest& request) {
     this->request();
 }
 
-void MapGround::request() {
+void MapBackdrop::request() {
     if (pending_) {
         source_->cancel(*std::exchange(pending_, std::nullopt));
     }
@@ -65,7 +65,7 @@ void MapGround::request() {
     });
 }
 
-void MapGround::sourceChanged() {
+void MapBackdrop::sourceChanged() {
     if (!wanted_) {
         return;
     }
@@ -77,7 +77,7 @@ void MapGround::sourceChanged() {
     }
 }
 
-void MapGround::arrived(const MapPicture& picture) {
+void MapBackdrop::arrived(const MapPicture& picture) {
     pending_ = std::nullopt;
     if (latest_ && latest_->viewport != picture.viewport) {
         previous_ = std::move(latest_);
@@ -90,7 +90,7 @@ void MapGround::arrived(const MapPicture& picture) {
     changed_();
 }
 
-void MapGround::draw(Canvas& canvas, const MapViewport& viewport) const {
+void MapBackdrop::draw(Canvas& canvas, const MapViewport& viewport) const {
     const Size& size = viewport.size;
     canvas.fill(Rect{0.0, 0.0, size.width, size.height}, Color::ofRole(ColorRole::MapLand));
     const Rect top = latest_ ? placeOf(latest_->viewport, viewport) : Rect{};

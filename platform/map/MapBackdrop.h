@@ -13,13 +13,13 @@ class Canvas;
 
 /// The ground of one map: asks the installed source for pictures, at most one at a time, and draws the ones it has
 /// where the map is at the moment. Main thread.
-class MapGround {
+class MapBackdrop {
   public:
     /// `changed` is called when it has to be painted again; it may outlive nothing that it uses.
-    explicit MapGround(std::function<void()> changed);
-    ~MapGround();
-    MapGround(const MapGround&) = delete;
-    MapGround& operator=(const MapGround&) = delete;
+    explicit MapBackdrop(std::function<void()> changed);
+    ~MapBackdrop();
+    MapBackdrop(const MapBackdrop&) = delete;
+    MapBackdrop& operator=(const MapBackdrop&) = delete;
 
     /// Whether there is anybody who draws pictures.
     bool hasSource() const { return source_ != nullptr; }
@@ -49,7 +49,7 @@ class MapGround {
     std::optional<MapPicture> previous_;
     std::string attribution_;
     /// For callbacks that come when the ground is gone.
-    std::shared_ptr<MapGround*> self_;
+    std::shared_ptr<MapBackdrop*> self_;
 };
 
 }  // namespace ktr::platform
