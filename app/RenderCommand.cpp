@@ -41,14 +41,15 @@ std::optional<Failure> RenderCommand::write(const std::string& output) const {
     const bool splits = output.ends_with(".png") && height * settings.scale > kMostPixels;
     // Whole points keep the pieces' edges on pixels at every usual scale.
     const double most = splits ? std::floor(kMostPixels / settings.scale) : height;
-    int number = 0;
-    for (double top = 0.0; top < height; top += most) {
+    const int pieces = splits ? static_cast<int>(std::ceil(height / most)) : 1;
+    for (int number = 1; number <= pieces; ++number) {
+        const double top = (number - 1) * most;
         const double partHeight = std::min(most, height - top);
         const ScenePainter painter({settings.width, partHeight}, settings.scale, palette);
         if (const auto reason = painter.refusal()) {
             return Failure{ExitCode::NotDrawn, output + ": " + *reason};
         }
-        const std::string file = splits ? pieceName(output, ++number) : output;
+        const std::string file = splits ? pieceName(output, number) : output;
         if (const auto error = painter.write(file, part(host_.window(), top, partHeight))) {
             return Failure{ExitCode::Failure, *error};
         }

@@ -41,7 +41,7 @@ std::unique_ptr<QTextLayout> shaped(const QString& text, const QFont& font, doub
     layout->beginLayout();
     QTextLine line = layout->createLine();
     if (line.isValid()) {
-        line.setLineWidth(std::numeric_limits<int>::max() / 256);
+        line.setLineWidth(std::numeric_limits<int>::max() / 256.0);
         line.setPosition({0.0, 0.0});
         width = line.naturalTextWidth();
     }

@@ -267,7 +267,7 @@ class DevelopmentServer::Server {
             return;
         }
         if (fault.cut == Fault::Cut::None && fault.bytesPerSecond <= 0.0) {
-            response.set_content(std::move(body), kJson);
+            response.set_content(body, kJson);
             return;
         }
         const std::size_t end = fault.cut == Fault::Cut::AfterHeaders ? 0

@@ -1,5 +1,7 @@
 #include "app/window/AccessibleConversation.h"
 
+#include <utility>
+
 #include "app/window/AccessibleNode.h"
 #include "app/window/AccessibleWidget.h"
 #include "app/window/ConversationWidget.h"
@@ -137,7 +139,7 @@ void AccessibleConversation::update() {
     if (!built_) {
         return;
     }
-    const auto before = std::move(entries_);
+    const auto before = std::exchange(entries_, {});
     const auto topBefore = topLevel_;
     rebuild();
     bool reordered = topBefore != topLevel_;

@@ -37,10 +37,10 @@ class ConfiguredAccountStore::OwnerAccount : public platform::DeviceOwnerAccount
     std::optional<std::string> token_;
 };
 
-ConfiguredAccountStore::ConfiguredAccountStore(std::filesystem::path configurationFile)
-    : ConfiguredAccountStore(std::move(configurationFile), askSecretService) {}
+ConfiguredAccountStore::ConfiguredAccountStore(const std::filesystem::path& configurationFile)
+    : ConfiguredAccountStore(configurationFile, askSecretService) {}
 
-ConfiguredAccountStore::ConfiguredAccountStore(std::filesystem::path configurationFile, Secrets secrets)
+ConfiguredAccountStore::ConfiguredAccountStore(const std::filesystem::path& configurationFile, Secrets secrets)
     : file_(std::filesystem::absolute(configurationFile)), secrets_(std::move(secrets)) {}
 
 ConfiguredAccountStore::~ConfiguredAccountStore() = default;

@@ -21,8 +21,8 @@ class ConfiguredAccountStore : public platform::AccountStore {
         std::function<std::optional<std::string>(const std::string& person, const std::string& host, std::string&)>;
 
     /// With the user's Secret Service, whose library is loaded when it is first asked.
-    explicit ConfiguredAccountStore(std::filesystem::path configurationFile);
-    ConfiguredAccountStore(std::filesystem::path configurationFile, Secrets secrets);
+    explicit ConfiguredAccountStore(const std::filesystem::path& configurationFile);
+    ConfiguredAccountStore(const std::filesystem::path& configurationFile, Secrets secrets);
     ~ConfiguredAccountStore() override;
 
     /// Reads configuration and token; true when anything differs from before. A file with an error leaves everything as

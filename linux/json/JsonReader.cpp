@@ -99,7 +99,9 @@ class Pass {
         }
         document_ = &document;
         Value root;
-        if (readRoot(document, root)) {
+        const bool isRead = readRoot(document, root);
+        document_ = nullptr;
+        if (isRead) {
             return root;
         }
         return *error_;

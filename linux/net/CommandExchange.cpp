@@ -19,7 +19,7 @@ using platform::HttpFailure;
 namespace {
 
 /// Bytes read, and buffered by the network library, at a time.
-constexpr qint64 kStep = 64 * 1024;
+constexpr qint64 kStep = qint64{64} * 1024;
 constexpr double kMillisecondsASecond = 1000.0;
 
 int milliseconds(double seconds) {
@@ -48,12 +48,9 @@ bool isRedirect(int status) {
 
 }  // namespace
 
-CommandExchange::CommandExchange(QSslConfiguration tls, ServicePolicy policy, platform::HttpRequest request,
+CommandExchange::CommandExchange(const QSslConfiguration& tls, ServicePolicy policy, platform::HttpRequest request,
                                  platform::HttpTransport::Completion completion)
-    : tls_(std::move(tls)),
-      policy_(std::move(policy)),
-      request_(std::move(request)),
-      completion_(std::move(completion)) {
+    : tls_(tls), policy_(std::move(policy)), request_(std::move(request)), completion_(std::move(completion)) {
     manager_.setAutoDeleteReplies(false);
     manager_.setRedirectPolicy(QNetworkRequest::ManualRedirectPolicy);
     manager_.setProxy(QNetworkProxy(QNetworkProxy::NoProxy));

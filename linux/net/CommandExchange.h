@@ -21,7 +21,7 @@ class CommandExchange : public QObject {
     /// Hops that are followed.
     static constexpr int kMostRedirects = 5;
 
-    CommandExchange(QSslConfiguration tls, ServicePolicy policy, platform::HttpRequest request,
+    CommandExchange(const QSslConfiguration& tls, ServicePolicy policy, platform::HttpRequest request,
                     platform::HttpTransport::Completion completion);
     ~CommandExchange() override;
 

@@ -12,7 +12,7 @@ namespace ktr::linux_ {
 
 namespace {
 
-constexpr qint64 kLongestLine = 64 * 1024;
+constexpr qint64 kLongestLine = qint64{64} * 1024;
 /// What a receiver that estimates no error is trusted with, metres.
 constexpr double kUnknownAccuracy = 50.0;
 /// A report with latitude and longitude; 1 means no fix.

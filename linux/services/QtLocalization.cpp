@@ -38,7 +38,7 @@ bool QtLocalization::addBundle(const std::string& bundleIdentifier, const std::f
     Translators translators;
     bool english = false;
     for (const std::string& language : candidates(language_)) {
-        const auto file = folder / (prefix + "_" + language + ".qm");
+        const auto file = folder / std::string(prefix).append("_").append(language).append(".qm");
         auto translator = std::make_unique<QTranslator>();
         std::error_code ignored;
         if (std::filesystem::is_regular_file(file, ignored) &&
