@@ -16,7 +16,7 @@ namespace {
 /// Names are shaped once at this size; outlines are scaled.
 constexpr int kShapedPixels = 64;
 constexpr std::size_t kMostKept = 1500;
-constexpr std::size_t kMostOutlines = 4000;
+constexpr std::size_t kMostLetters = 3000;
 
 /// Whether letters may be set one by one, each turned its own way.
 bool standAlone(const QString& text) {
@@ -42,6 +42,18 @@ bool standAlone(const QString& text) {
     });
 }
 
+/// Stroked once for each letter, not in each picture: the strokes of letters are most of what a name costs.
+QPainterPath haloOf(const QPainterPath& letter, double width) {
+    QPainterPathStroker stroker;
+    stroker.setWidth(width);
+    stroker.setCapStyle(Qt::RoundCap);
+    stroker.setJoinStyle(Qt::RoundJoin);
+    QPainterPath halo = stroker.createStroke(letter);
+    halo.addPath(letter);
+    halo.setFillRule(Qt::WindingFill);
+    return halo;
+}
+
 QList<QTextLayout::FormatRange> formats(const QString& text, bool isBold, const std::string& language) {
     const FontChoice choice(QString::fromStdString(language));
     platform::Font font;
@@ -61,20 +73,19 @@ QList<QTextLayout::FormatRange> formats(const QString& text, bool isBold, const 
 
 }  // namespace
 
-std::shared_ptr<const LabelGlyphs> LabelShaper::shape(const std::string& name, bool isBold,
-                                                      const std::string& language) {
-    const Key key(name, isBold, language);
+std::shared_ptr<const LabelGlyphs> LabelShaper::shape(const std::string& name, const Style& style) {
+    const Key key(name, style);
     if (const auto found = byKey_.find(key); found != byKey_.end()) {
         kept_.splice(kept_.begin(), kept_, found->second);
         return kept_.front().glyphs;
     }
-    if (outlines_.size() > kMostOutlines) {
-        outlines_.clear();
+    if (letters_.size() > kMostLetters) {
+        letters_.clear();
     }
     const QString text = QString::fromStdString(name).simplified();
     auto made = std::make_shared<LabelGlyphs>();
     QTextLayout layout(text, FontChoice::spec(platform::Font(), kShapedPixels, FontChoice::baseFamily()).font());
-    layout.setFormats(formats(text, isBold, language));
+    layout.setFormats(formats(text, style.isBold, style.language));
     layout.setCacheEnabled(false);
     layout.beginLayout();
     QTextLine line = layout.createLine();
@@ -93,16 +104,19 @@ std::shared_ptr<const LabelGlyphs> LabelShaper::shape(const std::string& name, b
         const auto advances = font.advancesForGlyphIndexes(indexes);
         const QString fontName = font.familyName() + QLatin1Char('/') + font.styleName();
         for (qsizetype index = 0; index < indexes.size(); ++index) {
-            auto& outline = outlines_[{fontName, indexes[index]}];
-            if (outline.isEmpty()) {
-                outline = QTransform::fromScale(unit, unit).map(font.pathForGlyph(indexes[index]));
+            auto& letter = letters_[{fontName, indexes[index], style.haloWidth}];
+            if (letter.outline.isEmpty()) {
+                const QPainterPath drawn = font.pathForGlyph(indexes[index]);
+                letter.outline = QTransform::fromScale(unit, unit).map(drawn);
+                letter.halo = QTransform::fromScale(unit, unit).map(haloOf(drawn, style.haloWidth * kShapedPixels));
             }
             LabelGlyphs::Glyph glyph;
-            glyph.outline = outline;
+            glyph.outline = letter.outline;
+            glyph.halo = letter.halo;
             glyph.x = (positions[index].x() - left) * unit;
             glyph.y = (positions[index].y() - baseline) * unit;
             glyph.advance = index < advances.size() ? advances[index].x() * unit : 0.0;
-            const QRectF ink = outline.boundingRect();
+            const QRectF ink = letter.outline.boundingRect();
             hasInk = hasInk || !ink.isEmpty();
             made->width = std::max({made->width, glyph.x + glyph.advance, glyph.x + ink.right()});
             made->ascent = std::max(made->ascent, -(glyph.y + ink.top()));

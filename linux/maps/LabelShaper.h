@@ -1,10 +1,12 @@
 #pragma once
 
+#include <compare>
 #include <list>
 #include <map>
 #include <memory>
 #include <string>
 #include <tuple>
+#include <utility>
 #include <vector>
 
 #include <QPainterPath>
@@ -16,6 +18,7 @@ namespace ktr::linux_ {
 struct LabelGlyphs {
     struct Glyph {
         QPainterPath outline;  ///< from the glyph's own origin
+        QPainterPath halo;     ///< the outline made wider by half of the halo's width on each side
         double x = 0.0;        ///< of the origin
         double y = 0.0;
         double advance = 0.0;
@@ -31,11 +34,23 @@ struct LabelGlyphs {
 /// Shapes names, in any script. Keeps the latest ones. One thread at a time, while a QGuiApplication exists.
 class LabelShaper {
   public:
-    /// `language` (BCP 47) decides the forms of Han characters. Null for a name with nothing to see.
-    std::shared_ptr<const LabelGlyphs> shape(const std::string& name, bool isBold, const std::string& language);
+    /// How a name is shaped. `haloWidth` is in sizes of the letters; `language` (BCP 47) decides the forms of Han
+    /// characters.
+    struct Style {
+        bool isBold = false;
+        double haloWidth = 0.0;
+        std::string language;
+        auto operator<=>(const Style&) const = default;
+    };
+
+    /// Null for a name with nothing to see.
+    std::shared_ptr<const LabelGlyphs> shape(const std::string& name, const Style& style);
 
   private:
-    using Key = std::tuple<std::string, bool, std::string>;
+    using Key = std::pair<std::string, Style>;
+    struct Letter {
+        QPainterPath outline, halo;
+    };
     struct Kept {
         Key key;
         std::shared_ptr<const LabelGlyphs> glyphs;
@@ -43,8 +58,8 @@ class LabelShaper {
 
     std::list<Kept> kept_;  ///< latest used first
     std::map<Key, std::list<Kept>::iterator> byKey_;
-    /// Outlines by font and glyph, shared by names.
-    std::map<std::pair<QString, quint32>, QPainterPath> outlines_;
+    /// Letters by font, glyph and width of the halo, shared by names.
+    std::map<std::tuple<QString, quint32, double>, Letter> letters_;
 };
 
 }  // namespace ktr::linux_

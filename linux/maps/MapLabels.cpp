@@ -70,7 +70,7 @@ MapLabels::MapLabels(const MapDrawing& drawing, LabelShaper& shaper)
 MapLabels::Text MapLabels::text(const std::string& name, const LabelLook& look) {
     Text made;
     made.look = look;
-    made.glyphs = shaper_.shape(name, look.isBold, drawing_.request.language);
+    made.glyphs = shaper_.shape(name, {look.isBold, MapStyle::kHaloWidth / look.size, drawing_.request.language});
     if (!made.glyphs) {
         return made;
     }
@@ -136,36 +136,25 @@ std::vector<QRectF> MapLabels::boxes(const Text& text, const std::vector<Stand>&
         if (ink.isEmpty()) {
             continue;
         }
-        ink = QRectF(ink.x() * text.look.size, ink.y() * text.look.size, ink.width() * text.look.size,
-                     ink.height() * text.look.size)
-                  .adjusted(-halo, -halo, halo, halo);
-        QTransform transform;
-        transform.translate(stands[index].origin.x(), stands[index].origin.y());
-        transform.rotateRadians(stands[index].angle);
-        if (text.look.isSlanted) {
-            transform.shear(-kSlant, 0.0);
-        }
-        made.push_back(transform.mapRect(ink));
+        const double grown = halo / text.look.size;
+        made.push_back(transform(text, stands[index]).mapRect(ink.adjusted(-grown, -grown, grown, grown)));
     }
     return made;
 }
 
-void MapLabels::put(const Text& text, const std::vector<Stand>& stands, const std::vector<QRectF>& boxes) {
-    Placed placed;
-    placed.color = text.look.color;
-    placed.halo = text.look.halo;
-    placed.outline.setFillRule(Qt::WindingFill);
-    for (std::size_t index = 0; index < stands.size(); ++index) {
-        QTransform transform;
-        transform.translate(stands[index].origin.x(), stands[index].origin.y());
-        transform.rotateRadians(stands[index].angle);
-        if (text.look.isSlanted) {
-            transform.shear(-kSlant, 0.0);
-        }
-        transform.scale(text.look.size, text.look.size);
-        placed.outline.addPath(transform.map(text.glyphs->glyphs[index].outline));
+QTransform MapLabels::transform(const Text& text, const Stand& stand) {
+    QTransform made;
+    made.translate(stand.origin.x(), stand.origin.y());
+    made.rotateRadians(stand.angle);
+    if (text.look.isSlanted) {
+        made.shear(-kSlant, 0.0);
     }
-    placed_.push_back(std::move(placed));
+    made.scale(text.look.size, text.look.size);
+    return made;
+}
+
+void MapLabels::put(const Text& text, std::vector<Stand> stands, const std::vector<QRectF>& boxes) {
+    placed_.push_back({text, std::move(stands)});
     for (const auto& box : boxes) {
         taken_.push_back(box.adjusted(-kLabelMargin, -kLabelMargin, kLabelMargin, kLabelMargin));
     }
@@ -268,12 +257,14 @@ bool MapLabels::tryAlong(const Text& text, const QPolygonF& line, const std::vec
 }
 
 void MapLabels::draw(QPainter& painter) const {
-    for (const auto& label : placed_) {
-        painter.strokePath(label.outline,
-                           QPen(label.halo, MapStyle::kHaloWidth, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
-    }
-    for (const auto& label : placed_) {
-        painter.fillPath(label.outline, label.color);
+    for (const bool isHalo : {true, false}) {
+        for (const auto& [text, stands] : placed_) {
+            for (std::size_t index = 0; index < stands.size(); ++index) {
+                const auto& glyph = text.glyphs->glyphs[index];
+                painter.fillPath(transform(text, stands[index]).map(isHalo ? glyph.halo : glyph.outline),
+                                 isHalo ? text.look.halo : text.look.color);
+            }
+        }
     }
 }
 

@@ -43,10 +43,6 @@ class MapLabels {
     void draw(QPainter& painter) const;
 
   private:
-    struct Placed {
-        QPainterPath outline;
-        QColor color, halo;
-    };
     /// A letter's place: where its origin stands, and how it is turned (radians, clockwise).
     struct Stand {
         QPointF origin;
@@ -59,6 +55,10 @@ class MapLabels {
         double width = 0.0;
         double rise = 0.0;  ///< from the middle of the line of writing down to the baseline
     };
+    struct Placed {
+        Text text;
+        std::vector<Stand> stands;
+    };
 
     Text text(const std::string& name, const LabelLook& look);
     bool isFree(const QRectF& box) const;
@@ -67,7 +67,8 @@ class MapLabels {
                   double mostBend);
     std::vector<Stand> straight(const Text& text, const QPointF& middle, double angle) const;
     std::vector<QRectF> boxes(const Text& text, const std::vector<Stand>& stands) const;
-    void put(const Text& text, const std::vector<Stand>& stands, const std::vector<QRectF>& boxes);
+    void put(const Text& text, std::vector<Stand> stands, const std::vector<QRectF>& boxes);
+    static QTransform transform(const Text& text, const Stand& stand);
 
     const MapDrawing& drawing_;
     LabelShaper& shaper_;
