@@ -17,6 +17,24 @@ void expectKind(FieldReader& fields, const std::string& expected) {
     }
 }
 
+void readContext(FieldReader& fields, VASnippet& snippet) {
+    if (auto context = fields.string("searchContext")) {
+        snippet.searchContext = Url::fromText(*context);
+        if (!snippet.searchContext) {
+            fields.complain("searchContext", "expected a URL, without white space");
+        }
+    }
+}
+
+/// What every kind of place has.
+void readPlace(FieldReader& fields, VALocation& place) {
+    place.latitude = fields.number("latitude");
+    place.longitude = fields.number("longitude");
+    place.accuracy = fields.number("accuracy");
+    place.label = fields.string("label");
+    place.street = fields.string("street");
+}
+
 }  // namespace
 
 std::shared_ptr<AssistantObject> AssistantObjectReader::readSnippet(FieldReader& fields, std::string& kind) const {
@@ -29,17 +47,18 @@ std::shared_ptr<AssistantObject> AssistantObjectReader::readSnippet(FieldReader&
     if (kind == "VAKtrLocationSnippet") {
         return readLocationSnippet(fields);
     }
+    if (kind == "VAKtrGeoFenceSnippet") {
+        return readGeoFenceSnippet(fields);
+    }
+    if (kind == "VAKtrVisibilityView") {
+        return readVisibilityView(fields);
+    }
     return std::make_shared<UnknownAssistantObject>(kind);
 }
 
 std::shared_ptr<VAKtrLocationSnippet> AssistantObjectReader::readLocationSnippet(FieldReader& fields) const {
     auto snippet = std::make_shared<VAKtrLocationSnippet>();
-    if (auto context = fields.string("searchContext")) {
-        snippet->searchContext = Url::fromText(*context);
-        if (!snippet->searchContext) {
-            fields.complain("searchContext", "expected a URL, without white space");
-        }
-    }
+    readContext(fields, *snippet);
     snippet->proximity = fields.string("proximity");
     auto locations = std::make_shared<LocationList>();
     fields.objects("locations", [&](FieldReader& location) { locations->push_back(readLocation(location)); });
@@ -47,15 +66,38 @@ std::shared_ptr<VAKtrLocationSnippet> AssistantObjectReader::readLocationSnippet
     return snippet;
 }
 
+std::shared_ptr<VAKtrGeoFenceSnippet> AssistantObjectReader::readGeoFenceSnippet(FieldReader& fields) const {
+    auto snippet = std::make_shared<VAKtrGeoFenceSnippet>();
+    readContext(fields, *snippet);
+    fields.object("cueKtrGeoFence", [&](FieldReader& fence) { snippet->cueKtrGeoFence = readGeoFence(fence); });
+    return snippet;
+}
+
+std::shared_ptr<VAKtrVisibilityView> AssistantObjectReader::readVisibilityView(FieldReader& fields) const {
+    auto snippet = std::make_shared<VAKtrVisibilityView>();
+    readContext(fields, *snippet);
+    snippet->visible = fields.boolean("visible").value_or(false);
+    return snippet;
+}
+
+std::shared_ptr<VAKtrGeoFence> AssistantObjectReader::readGeoFence(FieldReader& fields) const {
+    expectKind(fields, "VAKtrGeoFence");
+    auto fence = std::make_shared<VAKtrGeoFence>();
+    fields.object("friend", [&](FieldReader& person) { fence->friend_ = readPersonAttribute(person); });
+    fence->geoFenceTrigger = fields.string("geoFenceTrigger");
+    fields.object("location", [&](FieldReader& place) {
+        expectKind(place, "VALocation");
+        fence->location = std::make_shared<VALocation>();
+        readPlace(place, *fence->location);
+    });
+    return fence;
+}
+
 std::shared_ptr<VAKtrLocation> AssistantObjectReader::readLocation(FieldReader& fields) const {
     expectKind(fields, "VAKtrLocation");
     auto location = std::make_shared<VAKtrLocation>();
     fields.object("friend", [&](FieldReader& person) { location->friend_ = readPersonAttribute(person); });
-    location->latitude = fields.number("latitude");
-    location->longitude = fields.number("longitude");
-    location->accuracy = fields.number("accuracy");
-    location->label = fields.string("label");
-    location->street = fields.string("street");
+    readPlace(fields, *location);
     location->distance = fields.number("distance");
     location->city = fields.string("city");
     location->stateCode = fields.string("stateCode");

@@ -19,6 +19,9 @@ class AssistantObjectReader {
 
   private:
     std::shared_ptr<platform::VAKtrLocationSnippet> readLocationSnippet(FieldReader& fields) const;
+    std::shared_ptr<platform::VAKtrGeoFenceSnippet> readGeoFenceSnippet(FieldReader& fields) const;
+    std::shared_ptr<platform::VAKtrVisibilityView> readVisibilityView(FieldReader& fields) const;
+    std::shared_ptr<platform::VAKtrGeoFence> readGeoFence(FieldReader& fields) const;
     std::shared_ptr<platform::VAKtrLocation> readLocation(FieldReader& fields) const;
     std::shared_ptr<platform::VAPersonAttribute> readPersonAttribute(FieldReader& fields) const;
     std::shared_ptr<platform::VAPerson> readPerson(FieldReader& fields) const;

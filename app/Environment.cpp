@@ -4,6 +4,7 @@
 #include <optional>
 
 #include "app/Resources.h"
+#include "app/ScenarioAccounts.h"
 #include "app/ScenarioClock.h"
 #include "linux/maps/ConfiguredMaps.h"
 #include "linux/services/ConfiguredAssistant.h"
@@ -160,6 +161,9 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
         return Failure{ExitCode::Failure, error};
     }
     addUserInterface(platform, settings);
+    if (settings.userName) {
+        platform.accounts = std::make_shared<ScenarioAccounts>(*settings.userName);
+    }
     if (isLive) {
         environment.live = std::make_unique<LiveServices>(*settings.liveConfiguration);
         environment.live->addTo(platform, settings.language, !settings.positions.empty());

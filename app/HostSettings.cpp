@@ -59,6 +59,7 @@ std::variant<HostSettings, Failure> HostSettings::decide(const Options& options,
     settings.scale = options.scale;
     settings.width = options.width > 0.0 ? options.width : usualWidth(settings.idiom);
     settings.dark = either(options.dark, firstOf(scenarios, &Scenario::dark));
+    settings.userName = firstOf(scenarios, &Scenario::userName);
     settings.highContrast = options.highContrast;
     const IsoTime start = firstOf(scenarios, &Scenario::clock).value_or(options.at.value_or(now));
     settings.start = start.date;

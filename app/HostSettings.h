@@ -31,6 +31,8 @@ struct HostSettings {
     double runSeconds = 0.0;  ///< from the start to the moment of the picture
     std::vector<std::string> contacts;
     std::vector<ScenarioPosition> positions;
+    /// Of the account that the scenarios tell; a live conversation has its own.
+    std::optional<std::string> userName;
     /// The configuration file of a live conversation: one with an account, a service and the present moment. None: the
     /// conversation stands for itself, and nothing outside it is asked.
     std::optional<std::filesystem::path> liveConfiguration;

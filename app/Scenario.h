@@ -64,6 +64,8 @@ struct Scenario {
     std::optional<IsoTime> clock;  ///< the moment at which the scenario starts
     std::vector<ScenarioPosition> positions;
     std::optional<bool> dark;
+    /// Of the user's own account: an e-mail address or a phone number; none: nobody is signed in.
+    std::optional<std::string> userName;
 };
 
 /// Whether a text has the form of a language tag (BCP 47): letters and digits in groups of up to eight, joined by "-".

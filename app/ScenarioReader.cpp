@@ -135,6 +135,7 @@ void readScenario(FieldReader& fields, platform::Date now, bool withClock, Scena
         readWord(fields, "idiom", "one of phone, tablet, desktop, display", linux_::LinuxDevice::idiomNamed);
     scenario.positions = readPositions(fields);
     scenario.dark = fields.boolean("dark");
+    fields.object("account", [&](FieldReader& account) { scenario.userName = account.string("userName"); });
     const AssistantObjectReader objects(scenario.clock ? scenario.clock->date : now);
     const bool present = fields.object(
         "snippet", [&](FieldReader& snippet) { scenario.snippet = objects.readSnippet(snippet, scenario.kind); });

@@ -132,6 +132,55 @@ TEST_F(KTRScenarioReaderTest, World_IsRead) {
     EXPECT_EQ(scenario.positions[1].accuracy, 5.0);
 }
 
+TEST_F(KTRScenarioReaderTest, GeoFence_IsRead) {
+    const Scenario scenario = read(R"({"snippet": {"kind": "VAKtrGeoFenceSnippet",
+        "searchContext": "ktrServerContext://serverContext?geoFenceZoomLevel=1&", "cueKtrGeoFence": {
+        "kind": "VAKtrGeoFence", "geoFenceTrigger": "OnDeparture", "friend": {"data": "ann@harbour.example"},
+        "location": {"kind": "VALocation", "latitude": 50.5, "longitude": -3, "accuracy": 150, "label": "Mum's",
+        "street": "Quay"}}}})");
+    EXPECT_EQ(scenario.kind, "VAKtrGeoFenceSnippet");
+    const auto& snippet = dynamic_cast<platform::VAKtrGeoFenceSnippet&>(*scenario.snippet);
+    EXPECT_EQ(snippet.searchContext->text(), "ktrServerContext://serverContext?geoFenceZoomLevel=1&");
+    const auto& fence = *snippet.cueKtrGeoFence;
+    EXPECT_EQ(fence.geoFenceTrigger, "OnDeparture");
+    EXPECT_EQ(fence.friend_->data, "ann@harbour.example");
+    EXPECT_EQ(fence.location->latitude, 50.5);
+    EXPECT_EQ(fence.location->longitude, -3.0);
+    EXPECT_EQ(fence.location->accuracy, 150.0);
+    EXPECT_EQ(fence.location->label, "Mum's");
+    EXPECT_EQ(fence.location->street, "Quay");
+}
+
+TEST_F(KTRScenarioReaderTest, GeoFence_PartsMayBeAbsent) {
+    const auto fenceOf = [](const std::string& members) {
+        const Scenario scenario = read(R"({"snippet": {"kind": "VAKtrGeoFenceSnippet")" + members + "}}");
+        return dynamic_cast<platform::VAKtrGeoFenceSnippet&>(*scenario.snippet).cueKtrGeoFence;
+    };
+    EXPECT_EQ(fenceOf(""), nullptr);
+    EXPECT_EQ(fenceOf(R"(, "cueKtrGeoFence": null)"), nullptr);
+    const auto fence = fenceOf(R"(, "cueKtrGeoFence": {})");
+    ASSERT_NE(fence, nullptr);
+    EXPECT_EQ(fence->friend_, nullptr);
+    EXPECT_EQ(fence->location, nullptr);
+    EXPECT_FALSE(fence->geoFenceTrigger);
+}
+
+TEST_F(KTRScenarioReaderTest, Visibility_IsRead) {
+    const auto visible = [](const std::string& members) {
+        const Scenario scenario = read(R"({"snippet": {"kind": "VAKtrVisibilityView")" + members + "}}");
+        return dynamic_cast<platform::VAKtrVisibilityView&>(*scenario.snippet).visible;
+    };
+    EXPECT_TRUE(visible(R"(, "visible": true)"));
+    EXPECT_FALSE(visible(R"(, "visible": false)"));
+    EXPECT_FALSE(visible(""));
+}
+
+TEST_F(KTRScenarioReaderTest, Account_IsAUserName) {
+    EXPECT_EQ(read(withSnippet(R"("account": {"userName": "+441632960006"})")).userName, "+441632960006");
+    EXPECT_FALSE(read(withSnippet(R"("account": {})")).userName);
+    EXPECT_FALSE(read(withSnippet(R"("dark": true)")).userName);
+}
+
 TEST_F(KTRScenarioReaderTest, ByteOrderMark_IsPassedOver) {
     EXPECT_EQ(read("\xEF\xBB\xBF{\"snippet\": {\"kind\": \"X\"}}").kind, "X");
 }
@@ -166,6 +215,8 @@ TEST_F(KTRScenarioReaderTest, WrongTypes_NameFilePlacePathAndExpectation) {
         {R"("textSize": "huge")", "$.textSize: expected one of XS"},
         {R"("idiom": "watch")", "$.idiom: expected one of phone"},
         {R"("contacts": 1)", "$.contacts: expected a string or a list of strings, found a number"},
+        {R"("account": "ann")", "$.account: expected an object, found a string"},
+        {R"("account": {"userName": 1})", "$.account.userName: expected a string, found a number"},
         {R"("contacts": ["a", 1])", "$.contacts[1]: expected a string, found a number"},
     };
     for (const auto& [members, expected] : cases) {
@@ -181,6 +232,12 @@ TEST_F(KTRScenarioReaderTest, WrongSnippets_AreTold) {
         {R"({"snippet": {}})", "dinner.json:1:13: $.snippet: expected a member \"kind\""},
         {R"({"snippet": {"kind": "VAKtrLocationSnippet", "searchContext": "a b"}})",
          "$.snippet.searchContext: expected a URL"},
+        {R"({"snippet": {"kind": "VAKtrVisibilityView", "visible": 1}})",
+         "$.snippet.visible: expected true or false, found a number"},
+        {R"({"snippet": {"kind": "VAKtrGeoFenceSnippet", "cueKtrGeoFence": {"location": {"kind": "VAKtrLocation"}}}})",
+         "$.snippet.cueKtrGeoFence.location.kind: expected \"VALocation\", found \"VAKtrLocation\""},
+        {R"({"snippet": {"kind": "VAKtrGeoFenceSnippet", "cueKtrGeoFence": {"kind": "VAFence"}}})",
+         "$.snippet.cueKtrGeoFence.kind: expected \"VAKtrGeoFence\", found \"VAFence\""},
         {R"({"snippet": {"kind": "VAKtrLocationSnippet", "locations": [{"kind": "VALocation"}]}})",
          "$.snippet.locations[0].kind: expected \"VAKtrLocation\", found \"VALocation\""},
         {R"({"snippet": {"kind": "VAKtrLocationSnippet", "locations": [{"ageSeconds": 1, "locationDate": 2}]}})",
