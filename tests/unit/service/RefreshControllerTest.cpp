@@ -9,7 +9,7 @@ namespace ktr::test {
 namespace {
 
 /// Says what a test tells it, so that the threshold can be met exactly.
-struct StatedGeodesy : platform::Geodesy {
+struct StatedGeodesy : SphereGeodesy {
     double metres = 0.0;
     double distance(const platform::Coordinate&, const platform::Coordinate&) const override { return metres; }
 };
