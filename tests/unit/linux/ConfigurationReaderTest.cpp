@@ -36,7 +36,7 @@ TEST_F(ConfigurationReaderTest, EveryMember_IsRead) {
     const Configuration read = good(R"({
         "account": {"personId": "1000", "userName": "ann", "host": "localhost:8443", "domains": ["a.example", "b.example"],
                     "tokenFile": "secret/token"},
-        "certificates": ["ca.pem", "/abs/ca.pem"], "contacts": "people", "language": "en-GB", "geographicCountry": "GB",
+        "certificates": ["ca.pem", "/abs/ca.pem"], "contacts": ["people"], "language": "en-GB", "geographicCountry": "GB",
         "restrictions": {"friendLocationRestricted": true, "friendLocationAllowed": false},
         "positions": {"source": "track", "file": "walk.gpx", "host": "gps.example", "port": 2948}, "future": 1})");
     ASSERT_TRUE(read.account.has_value());
