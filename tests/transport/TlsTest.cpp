@@ -55,6 +55,21 @@ TEST_F(TlsTest, OlderTlsIsNot) {
     EXPECT_EQ(server->received(), "");
 }
 
+TEST_F(TlsTest, Http2IsNotOffered) {
+    // A server that answers no greeting hears the client's alone, where the protocols would stand that it wants to
+    // speak (RFC 7301): each after its length.
+    serve(TestServer::Options{}, nullptr);
+    auto one = request();
+    one.inactivityLimit = 0.5;
+    EXPECT_NE(ask(one).failure, HttpFailure::None);
+    const std::string greeting = server->received();
+    ASSERT_GT(greeting.size(), 100U);
+    EXPECT_EQ(greeting[0], '\x16') << "a handshake";
+    EXPECT_NE(greeting.find("localhost"), std::string::npos) << "it is read as it stands";
+    EXPECT_EQ(greeting.find("\x02h2"), std::string::npos);
+    EXPECT_EQ(greeting.find("PRI * HTTP/2"), std::string::npos);
+}
+
 TEST_F(TlsTest, ServerWithoutTls_HearsNothing) {
     serve(TestServer::Options{}, gladly());
     auto one = request();

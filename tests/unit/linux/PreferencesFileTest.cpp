@@ -1,6 +1,8 @@
 #include "linux/account/PreferencesFile.h"
 
 #include <gtest/gtest.h>
+#include <sched.h>
+#include <sys/mount.h>
 #include <sys/ptrace.h>
 #include <sys/resource.h>
 #include <sys/stat.h>
@@ -124,6 +126,49 @@ TEST_F(PreferencesFileTest, NoRoomForTheNewFile_LeavesTheOldOne) {
     EXPECT_EQ(read(), (PreferencesFile::Texts{{"host", "old.example"}}));
     EXPECT_FALSE(std::filesystem::exists(file.string() + ".new"));
     EXPECT_TRUE(merge({{"host", "new.example"}}));
+}
+
+TEST_F(PreferencesFileTest, FullDisk_LeavesTheOldOneAndIsOverWithIt) {
+    enum Outcome { Good, NoDisk, Written, Lost, NotOver };
+    const auto disk = folder.path() / "disk";
+    std::filesystem::create_directory(disk);
+    const pid_t child = ::fork();
+    if (child == 0) {
+        // A disk of a few pages of its own; it goes with the process.
+        const bool own = ::unshare(CLONE_NEWNS) == 0 || ::unshare(CLONE_NEWUSER | CLONE_NEWNS) == 0;
+        if (!own || ::mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0 ||
+            ::mount("tmpfs", disk.c_str(), "tmpfs", 0, "size=64k") != 0) {
+            ::_exit(NoDisk);
+        }
+        file = disk / "preferences.json";
+        // Larger than the page that a file may share with what was there before.
+        const std::string large(8000, 'x');
+        if (!merge({{"host", "old.example"}, {"large", large}})) {
+            ::_exit(NoDisk);
+        }
+        {
+            std::ofstream filler(disk / "filler");
+            while (filler.write(large.data(), static_cast<std::streamsize>(large.size())) && filler.flush()) {
+            }
+        }
+        if (merge({{"host", "new.example"}})) {
+            ::_exit(Written);
+        }
+        const auto kept = PreferencesFile::read(file);
+        const auto* texts = std::get_if<PreferencesFile::Texts>(&kept);
+        if (texts == nullptr || *texts != PreferencesFile::Texts{{"host", "old.example"}, {"large", large}}) {
+            ::_exit(Lost);
+        }
+        std::filesystem::remove(disk / "filler");
+        ::_exit(merge({{"host", "new.example"}}) && read().at("host") == "new.example" ? Good : NotOver);
+    }
+    int status = 0;
+    ASSERT_EQ(::waitpid(child, &status, 0), child);
+    ASSERT_TRUE(WIFEXITED(status));
+    if (WEXITSTATUS(status) == NoDisk) {
+        GTEST_SKIP() << "no disk of its own may be made here; NoRoomForTheNewFile runs everywhere";
+    }
+    EXPECT_EQ(WEXITSTATUS(status), Good);
 }
 
 TEST_F(PreferencesFileTest, FileThatHoldsNoPreferences_IsPutAside) {
