@@ -1,0 +1,228 @@
+// One answer of the service in the whole program: what the network thread does with it, and what the main thread does,
+// part by part, from the command that asks to the screenful that shows it.
+#include <time.h>
+
+#include <QApplication>
+#include <QImage>
+#include <QPainter>
+#include <algorithm>
+#include <cmath>
+#include <cstdio>
+#include <functional>
+#include <map>
+#include <string>
+
+#include "app/Host.h"
+#include "app/Options.h"
+#include "app/ScenarioReader.h"
+#include "linux/json/JsonReader.h"
+#include "linux/ui/FontSetup.h"
+#include "linux/ui/QtCanvas.h"
+#include "platform/assistant/VALocation.h"
+#include "platform/assistant/VASnippet.h"
+#include "platform/base/Json.h"
+#include "platform/client/DeviceOwnerAccount.h"
+#include "platform/client/HttpTransport.h"
+
+namespace {
+
+using namespace ktr;
+using namespace ktr::platform;
+
+constexpr double kWidth = 400.0;   // points
+constexpr double kScreen = 800.0;  // points
+constexpr double kScale = 2.0;
+constexpr double kInterval = 10.0;  // seconds between two answers
+constexpr int kWarmUp = 3;
+constexpr int kRounds = 41;
+
+/// Milliseconds that this thread has computed; what else the machine does is no part of it.
+double computed() {
+    timespec now{};
+    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &now);
+    return 1e3 * static_cast<double>(now.tv_sec) + 1e-6 * static_cast<double>(now.tv_nsec);
+}
+
+double timed(const std::function<void()>& work) {
+    const double start = computed();
+    work();
+    return computed() - start;
+}
+
+struct BenchAccount : DeviceOwnerAccount {
+    std::optional<std::string> personIdentifier() const override { return "person"; }
+    std::optional<std::string> userName() const override { return "user"; }
+    std::optional<std::string> tokenOfType(int) const override { return "token"; }
+    std::optional<std::string> hostNameOfType(int) const override { return "localhost"; }
+};
+
+struct BenchAccounts : AccountStore {
+    std::shared_ptr<DeviceOwnerAccount> deviceOwnerAccount() const override { return account; }
+    std::shared_ptr<DeviceOwnerAccount> account = std::make_shared<BenchAccount>();
+};
+
+/// Keeps what is to be answered.
+struct BenchTransport : HttpTransport {
+    void send(const HttpRequest& request, Completion completion) override {
+        bytesSent = request.body.size();
+        waiting.push_back(std::move(completion));
+    }
+    std::vector<Completion> waiting;
+    std::size_t bytesSent = 0;
+};
+
+/// Everybody has walked on since the round before: no place, distance or age needs to be the same.
+std::string bodyOf(const LocationList& friends, int round, double milliseconds) {
+    Dictionary entries;
+    Value::Array handles;
+    double turn = 0.0;
+    for (const auto& one : friends) {
+        const std::string handle = one->friend_ && one->friend_->data ? *one->friend_->data : "";
+        turn += 1.0;
+        const double walked = 0.00037 * round * std::fmod(turn, 7.0);
+        entries.set(handle,
+                    Dictionary{{"status", 200},
+                               {"match", false},
+                               {"location",
+                                Dictionary{{"latitude", 50.2 + 0.0007 * turn + walked},
+                                           {"longitude", -3.1 - walked},
+                                           {"horizontalAccuracy", 20.0},
+                                           {"timestamp", milliseconds - 7000.0 * std::fmod(turn, 500.0)},
+                                           {"streetAddress", "1 Quay Street"},
+                                           {"address", Dictionary{{"locality", "Harbour"}, {"stateCode", "HB"}}}}}});
+        handles.push_back(handle);
+    }
+    return writeJson(Dictionary{{"statusCode", 200},
+                                {"serverContext", Dictionary{{"minCallbackIntervalInMS", kInterval * 1000.0}}},
+                                {"emails", std::move(handles)},
+                                {"locations", std::move(entries)}});
+}
+
+/// The parts of a round, in milliseconds, in the order in which they happen.
+class Parts {
+  public:
+    void add(const char* name, double milliseconds) {
+        if (!times_.contains(name)) {
+            names_.emplace_back(name);
+        }
+        times_[name].push_back(milliseconds);
+    }
+    double median(const std::string& name) {
+        auto& all = times_[name];
+        std::sort(all.begin(), all.end());
+        return all[all.size() / 2];
+    }
+    void print() {
+        for (const std::string& name : names_) {
+            const double middle = median(name);
+            std::printf("  %-34s %8.3f ms (median), %8.3f at most\n", name.c_str(), middle, times_[name].back());
+        }
+    }
+
+  private:
+    std::vector<std::string> names_;
+    std::map<std::string, std::vector<double>> times_;
+};
+
+void paint(app::Host& host, const linux_::Palette& palette, QImage& image) {
+    image.fill(palette.window);
+    QPainter painter(&image);
+    painter.setRenderHint(QPainter::Antialiasing);
+    painter.scale(kScale, kScale);
+    linux_::QtCanvas canvas(painter, palette);
+    host.window()->paint(canvas, {0.0, 0.0, kWidth, kScreen});
+}
+
+void measure(app::Host& host, const LocationList& friends, BenchTransport& transport) {
+    const auto time = std::dynamic_pointer_cast<VirtualTime>(Platform::installed()->mainLoop);
+    const linux_::Palette palette = linux_::Palette::of(linux_::ColorScheme::Light);
+    QImage image(static_cast<int>(kWidth * kScale), static_cast<int>(kScreen * kScale),
+                 QImage::Format_ARGB32_Premultiplied);
+    constexpr double kReferenceDate = 978307200.0;  // seconds after 1970
+    Parts parts;
+    std::size_t bytes = 0;
+    for (int round = 0; round < kWarmUp + kRounds; ++round) {
+        const double ask = timed([&] { time->advance(kInterval); });
+        if (transport.waiting.empty()) {
+            std::fprintf(stderr, "nothing was asked\n");
+            return;
+        }
+        const auto completion = std::move(transport.waiting.back());
+        transport.waiting.clear();
+        const double now = (time->now().secondsSinceReferenceDate + kReferenceDate) * 1000.0;
+        const std::string body = bodyOf(friends, round, now);
+        bytes = body.size();
+        HttpAnswer answer;
+        answer.status = 200;
+        const double decoded = timed([&] { answer.json = std::get<Value>(linux_::JsonReader::read(body)); });
+        completion(std::move(answer));
+        const double rebuilt = timed([&] { time->runPosted(); });
+        const double laidOut = timed([&] { host.layOut(kWidth); });
+        const double painted = timed([&] { paint(host, palette, image); });
+        if (round < kWarmUp) {
+            continue;
+        }
+        parts.add("asking (main thread)", ask);
+        parts.add("JSON (network thread)", decoded);
+        parts.add("records and rows (main thread)", rebuilt);
+        parts.add("layout (main thread)", laidOut);
+        parts.add("painting a screenful (main thread)", painted);
+        parts.add("main thread, answer to screen", rebuilt + laidOut + painted);
+    }
+    std::printf("%zu friends: %zu bytes asked, %zu answered\n", friends.size(), transport.bytesSent, bytes);
+    parts.print();
+}
+
+int run(const char* file) {
+    auto read = app::ScenarioReader(Date{}).readFile(file);
+    auto* scenario = std::get_if<app::Scenario>(&read);
+    if (scenario == nullptr) {
+        std::fprintf(stderr, "%s\n", std::get<app::ScenarioError>(read).text().c_str());
+        return 1;
+    }
+    const auto snippet = std::dynamic_pointer_cast<VAKtrLocationSnippet>(scenario->snippet);
+    if (!snippet || !snippet->locations || snippet->locations->empty()) {
+        std::fprintf(stderr, "%s: no friends\n", file);
+        return 1;
+    }
+    snippet->searchContext =
+        Url("ktrServerContext://serverContext?clientId=bench&minCallbackIntervalInMS=10000&"
+            "callbackTimeoutIntervalInMS=100000000&");
+    app::Options options;
+    options.scenarios = {file};
+    const auto decided = app::HostSettings::decide(options, {*scenario}, {});
+    if (const auto* failure = std::get_if<app::Failure>(&decided)) {
+        std::fprintf(stderr, "%s\n", failure->line.c_str());
+        return 1;
+    }
+    auto made = app::Host::make(std::get<app::HostSettings>(decided), app::Host::Time::Virtual, {});
+    if (const auto* failure = std::get_if<app::Failure>(&made)) {
+        std::fprintf(stderr, "%s\n", failure->line.c_str());
+        return 1;
+    }
+    app::Host& host = *std::get<std::unique_ptr<app::Host>>(made);
+    // The platform is used from the first turn on.
+    const auto transport = std::make_shared<BenchTransport>();
+    Platform::installed()->httpTransport = transport;
+    Platform::installed()->accounts = std::make_shared<BenchAccounts>();
+    if (const auto failure = host.addTurn(*scenario)) {
+        std::fprintf(stderr, "%s\n", failure->line.c_str());
+        return 1;
+    }
+    host.layOut(kWidth);
+    measure(host, *snippet->locations, *transport);
+    return 0;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    if (argc != 2) {
+        std::fprintf(stderr, "usage: %s SCENARIO      bench/make-scenario writes long ones\n", argv[0]);
+        return 2;
+    }
+    qputenv("QT_QPA_PLATFORM", "offscreen");
+    linux_::FontSetup::prepare(linux_::FontSetup::Mode::System);
+    const QApplication application(argc, argv);
+    return run(argv[1]);
+}
