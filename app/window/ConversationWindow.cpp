@@ -22,6 +22,9 @@ ConversationWindow::ConversationWindow(Host& host) : host_(host), conversation_(
     setMinimumSize(conversation_->minimumSize());
     if (host_.live() != nullptr) {
         addField();
+    } else {
+        setFocusProxy(conversation_);
+        conversation_->setFocus();
     }
     conversation_->setPaletteChanged([this] { choosePalette(); });
     choosePalette();

@@ -68,7 +68,7 @@ void QuestionEdit::showCaret() {
 
 void QuestionEdit::paintEvent(QPaintEvent* event) {
     QLineEdit::paintEvent(event);
-    if (hasFocus() && caretShown_) {
+    if (hasFocus() && caretShown_ && !hasSelectedText()) {
         QPainter painter(this);
         painter.fillRect(caret(), pine_);
     }
