@@ -34,6 +34,7 @@ class KTR_API KTAnnotation : public MapAnnotation {
 /// The client library's pin: an icon in a ring of the tint, with a tip on the place. Main thread.
 class KTR_API KTAnnotationView : public AnnotationView {
   public:
+    using AnnotationView::initWithAnnotation;
     virtual bool initWithAnnotation(const std::shared_ptr<MapAnnotation>& annotation,
                                     const std::string& reuseIdentifier, const Color& tintColor);
 
