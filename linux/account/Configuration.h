@@ -30,6 +30,24 @@ struct Configuration {
         bool operator==(const Positions&) const = default;
     };
 
+    struct Maps {
+        /// The datum of the sources' data.
+        enum class Datum { Wgs84, Gcj02 };
+        struct Source {
+            std::string file;  ///< MBTiles, an absolute path; empty for one with a `url`
+            std::string url;   ///< of a tile, with "{z}", "{x}" and "{y}"; https
+            /// Shown instead of what the data says; of a `url` never none.
+            std::optional<std::string> attribution;
+            int coarsest = 0;  ///< levels that a `url` has
+            int finest = 19;
+            bool operator==(const Source&) const = default;
+        };
+        std::vector<Source> sources;  ///< the first that has a place draws it
+        Datum datum = Datum::Wgs84;
+        int cacheMegabytes = 100;  ///< of tiles from URLs on disk
+        bool operator==(const Maps&) const = default;
+    };
+
     std::optional<Account> account;
     /// Files with certificates (PEM) that are trusted besides the system's; absolute paths.
     std::vector<std::string> certificates;
@@ -41,6 +59,7 @@ struct Configuration {
     bool friendLocationRestricted = false;
     bool friendLocationAllowed = true;
     Positions positions;
+    Maps maps;
     bool operator==(const Configuration&) const = default;
 };
 

@@ -4,6 +4,7 @@
 #include <QJsonArray>
 #include <QJsonDocument>
 #include <QJsonObject>
+#include <QUrl>
 #include <algorithm>
 #include <cerrno>
 #include <cmath>
@@ -108,6 +109,28 @@ class Members {
             }
         }
         return found;
+    }
+
+    /// Reads each object of a list.
+    void objects(const char* name, const std::function<void(Members&)>& read) {
+        const QJsonValue value = find(name);
+        if (value.isUndefined()) {
+            return;
+        }
+        if (!value.isArray()) {
+            expected(name, "a list of objects", value);
+            return;
+        }
+        const QJsonArray list = value.toArray();
+        for (qsizetype i = 0; i < list.size(); ++i) {
+            const std::string element = std::string(name) + "[" + std::to_string(i) + "]";
+            if (!list[i].isObject()) {
+                expected(element.c_str(), "an object", list[i]);
+                continue;
+            }
+            Members inner(list[i].toObject(), path_ + "." + element, complaint_);
+            read(inner);
+        }
     }
 
     bool object(const char* name, const std::function<void(Members&)>& read) {
@@ -217,6 +240,55 @@ void readPositions(Members& members, const std::filesystem::path& file, Configur
     positions.gpsdPort = members.whole("port", positions.gpsdPort, 1, 65535);
 }
 
+/// Where tiles come from: https, a host without a name or password, and a place for each of a tile's numbers.
+bool isTileUrl(const std::string& text) {
+    QString address = QString::fromStdString(text);
+    for (const char16_t* number : {u"{z}", u"{x}", u"{y}"}) {
+        const QString part = QString::fromUtf16(number);
+        if (address.count(part) != 1) {
+            return false;
+        }
+        address.replace(part, QStringLiteral("0"));
+    }
+    const QUrl url(address, QUrl::StrictMode);
+    // The host is not what the numbers may choose.
+    return url.isValid() && url.scheme() == QLatin1String("https") && !url.host().isEmpty() &&
+           url.userInfo().isEmpty() && !url.hasFragment() && text.find('{') > text.find('/', sizeof("https://"));
+}
+
+void readMapSource(Members& members, const std::filesystem::path& file, Configuration::Maps& maps) {
+    Configuration::Maps::Source source;
+    if (auto path = members.text("file")) {
+        source.file = resolved(*path, file);
+    }
+    source.url = members.text("url").value_or("");
+    if (source.file.empty() == source.url.empty()) {
+        members.complain("file", "expected either a file or a url");
+    }
+    if (!source.url.empty() && !isTileUrl(source.url)) {
+        members.complain("url",
+                         "expected an https address with {z}, {x} and {y} in its path, found \"" + source.url + "\"");
+    }
+    source.attribution = members.text("attribution");
+    if (!source.url.empty() && !source.attribution) {
+        members.complain("attribution", "expected what the owner of the tiles wants to be shown, found nothing");
+    }
+    source.coarsest = members.whole("coarsest", source.coarsest, 0, 24);
+    source.finest = members.whole("finest", source.finest, source.coarsest, 24);
+    maps.sources.push_back(std::move(source));
+}
+
+void readMaps(Members& members, const std::filesystem::path& file, Configuration::Maps& maps) {
+    members.objects("sources", [&](Members& source) { readMapSource(source, file, maps); });
+    const std::string datum = members.text("datum").value_or("wgs84");
+    if (datum == "gcj02") {
+        maps.datum = Configuration::Maps::Datum::Gcj02;
+    } else if (datum != "wgs84") {
+        members.complain("datum", "expected one of \"wgs84\", \"gcj02\", found \"" + datum + "\"");
+    }
+    maps.cacheMegabytes = members.whole("cacheMegabytes", maps.cacheMegabytes, 1, 100000);
+}
+
 void readAll(Members& members, const std::filesystem::path& file, Configuration& configuration) {
     members.object("account", [&](Members& account) { readAccount(account, file, configuration); });
     for (const std::string& certificate : members.texts("certificates")) {
@@ -239,6 +311,7 @@ void readAll(Members& members, const std::filesystem::path& file, Configuration&
         configuration.friendLocationAllowed = restrictions.boolean("friendLocationAllowed", true);
     });
     members.object("positions", [&](Members& positions) { readPositions(positions, file, configuration.positions); });
+    members.object("maps", [&](Members& maps) { readMaps(maps, file, configuration.maps); });
 }
 
 std::string placeOf(const std::string& text, int offset) {

@@ -34,6 +34,10 @@ std::filesystem::path XdgFolders::state() {
     return folder("XDG_STATE_HOME", ".local/state");
 }
 
+std::filesystem::path XdgFolders::cache() {
+    return folder("XDG_CACHE_HOME", ".cache");
+}
+
 std::filesystem::path XdgFolders::configurationFile() {
     const char* path = std::getenv("KTR_CONFIG");
     return path != nullptr && *path != '\0' ? std::filesystem::path(path) : config() / "config.json";

@@ -12,6 +12,8 @@ class XdgFolders {
     static std::filesystem::path config();
     /// $XDG_STATE_HOME/ktr, else ~/.local/state/ktr.
     static std::filesystem::path state();
+    /// $XDG_CACHE_HOME/ktr, else ~/.cache/ktr.
+    static std::filesystem::path cache();
     /// KTR_CONFIG when it is set, else config.json in the configuration folder.
     static std::filesystem::path configurationFile();
 };

@@ -1,9 +1,41 @@
 #include "linux/maps/ConfiguredMaps.h"
 
+#include "linux/account/XdgFolders.h"
+#include "linux/maps/AttributedGround.h"
+#include "linux/maps/HttpsPictures.h"
+#include "linux/maps/MbtilesPictures.h"
+#include "linux/maps/PictureGround.h"
 #include "linux/maps/VectorGround.h"
 #include "linux/maps/WorldGround.h"
 
 namespace ktr::linux_ {
+
+namespace {
+
+void addSource(ThreadedMapSource::Grounds& grounds, const Configuration::Maps::Source& source,
+               const Configuration& configuration) {
+    if (!source.url.empty()) {
+        HttpsPictures::Settings settings;
+        settings.url = source.url;
+        settings.attribution = source.attribution.value_or("");
+        settings.coarsest = source.coarsest;
+        settings.finest = source.finest;
+        settings.cacheFolder = XdgFolders::cache() / "tiles";
+        settings.cacheBytes = static_cast<std::uint64_t>(configuration.maps.cacheMegabytes) << 20;
+        settings.certificateFiles = configuration.certificates;
+        grounds.push_back(std::make_shared<PictureGround>(std::make_unique<HttpsPictures>(std::move(settings))));
+        return;
+    }
+    // Only the file itself says which of the two it is: the other one finds nothing in it.
+    ThreadedMapSource::Grounds both = {std::make_shared<VectorGround>(source.file),
+                                       std::make_shared<PictureGround>(std::make_unique<MbtilesPictures>(source.file))};
+    for (auto& ground : both) {
+        grounds.push_back(source.attribution ? std::make_shared<AttributedGround>(ground, *source.attribution)
+                                             : ground);
+    }
+}
+
+}  // namespace
 
 std::shared_ptr<ThreadedMapSource> ConfiguredMaps::make(const Configuration& configuration,
                                                         const std::filesystem::path& resourceFolder,
@@ -11,11 +43,15 @@ std::shared_ptr<ThreadedMapSource> ConfiguredMaps::make(const Configuration& con
     return std::make_shared<ThreadedMapSource>(std::move(mainLoop), grounds(configuration, resourceFolder));
 }
 
-ThreadedMapSource::Grounds ConfiguredMaps::grounds(const Configuration& /*configuration*/,
+ThreadedMapSource::Grounds ConfiguredMaps::grounds(const Configuration& configuration,
                                                    const std::filesystem::path& resourceFolder) {
     const auto folder = resourceFolder / "maps";
-    return {std::make_shared<VectorGround>((folder / "brinmouth.mbtiles").string()),
-            std::make_shared<WorldGround>(folder / "world.bin")};
+    ThreadedMapSource::Grounds grounds = {std::make_shared<VectorGround>((folder / "brinmouth.mbtiles").string())};
+    for (const Configuration::Maps::Source& source : configuration.maps.sources) {
+        addSource(grounds, source, configuration);
+    }
+    grounds.push_back(std::make_shared<WorldGround>(folder / "world.bin"));
+    return grounds;
 }
 
 }  // namespace ktr::linux_

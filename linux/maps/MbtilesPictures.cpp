@@ -1,0 +1,66 @@
+#include "linux/maps/MbtilesPictures.h"
+
+#include <system_error>
+
+#include "platform/base/Log.h"
+
+namespace ktr::linux_ {
+
+namespace {
+
+/// A file that cannot be read is tried again after this.
+constexpr auto kRetry = std::chrono::seconds(5);
+
+}  // namespace
+
+bool MbtilesPictures::open() {
+    std::error_code failed;
+    const auto written = std::filesystem::last_write_time(path_, failed);
+    const auto now = std::chrono::steady_clock::now();
+    if (looked_ && !failed && written == written_ && (file_ || now - *looked_ < kRetry)) {
+        return file_ != nullptr;
+    }
+    looked_ = now;
+    written_ = written;
+    ++version_;
+    std::string error;
+    if (!read(error)) {
+        file_.reset();
+    }
+    if (!error.empty() && error != reported_) {
+        platform::platformLog().line("The map %@ cannot be read: %@", path_, error);
+    }
+    reported_ = error;
+    return file_ != nullptr;
+}
+
+bool MbtilesPictures::read(std::string& error) {
+    file_ = MbtilesFile::open(path_, error);
+    if (!file_) {
+        return false;
+    }
+    facts_ = TilesetFacts::of(file_->metadata());
+    if (facts_.format.empty() || facts_.format == "pbf" || facts_.format == "mvt") {
+        return false;  // vector tiles: another ground's
+    }
+    const auto coarsest = facts_.coarsest ? facts_.coarsest : file_->coarsestLevel();
+    const auto finest = facts_.finest ? facts_.finest : file_->finestLevel();
+    if (!coarsest || !finest || *coarsest > *finest) {
+        error = "no tiles";
+        return false;
+    }
+    coarsest_ = *coarsest;
+    finest_ = *finest;
+    return true;
+}
+
+TilePictures::Answer MbtilesPictures::tile(const TileKey& key, bool /*isWanted*/) {
+    Answer answer;
+    answer.version = version_;
+    if (file_) {
+        answer.data = file_->tile(key);
+    }
+    return answer;
+}
+
+}  // namespace ktr::linux_

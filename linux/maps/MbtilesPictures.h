@@ -1,0 +1,39 @@
+#pragma once
+
+#include <chrono>
+#include <filesystem>
+#include <memory>
+
+#include "linux/maps/MbtilesFile.h"
+#include "linux/maps/TilePictures.h"
+
+namespace ktr::linux_ {
+
+/// Pictures from an MBTiles file. It is opened by the first drawing, and again when it has changed; one that cannot be
+/// read, or holds vector tiles, has nothing.
+class MbtilesPictures final : public TilePictures {
+  public:
+    explicit MbtilesPictures(std::string path) : path_(std::move(path)) {}
+
+    bool open() override;
+    int coarsest() const override { return coarsest_; }
+    int finest() const override { return finest_; }
+    std::optional<TilesetFacts::Bounds> bounds() const override { return facts_.bounds; }
+    std::string attribution() const override { return facts_.attribution; }
+    Answer tile(const TileKey& key, bool isWanted) override;
+
+  private:
+    bool read(std::string& error);
+
+    std::string path_;
+    std::shared_ptr<MbtilesFile> file_;
+    std::optional<std::chrono::steady_clock::time_point> looked_;
+    std::filesystem::file_time_type written_;
+    std::string reported_;
+    unsigned version_ = 0;
+    TilesetFacts facts_;
+    int coarsest_ = 0;
+    int finest_ = 0;
+};
+
+}  // namespace ktr::linux_
