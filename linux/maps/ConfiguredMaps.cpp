@@ -40,7 +40,9 @@ void addSource(ThreadedMapSource::Grounds& grounds, const Configuration::Maps::S
 std::shared_ptr<ThreadedMapSource> ConfiguredMaps::make(const Configuration& configuration,
                                                         const std::filesystem::path& resourceFolder,
                                                         std::shared_ptr<platform::MainLoop> mainLoop) {
-    return std::make_shared<ThreadedMapSource>(std::move(mainLoop), grounds(configuration, resourceFolder));
+    const auto datum = configuration.maps.datum == Configuration::Maps::Datum::Gcj02 ? platform::MapDatum::Gcj02
+                                                                                     : platform::MapDatum::Wgs84;
+    return std::make_shared<ThreadedMapSource>(std::move(mainLoop), grounds(configuration, resourceFolder), datum);
 }
 
 ThreadedMapSource::Grounds ConfiguredMaps::grounds(const Configuration& configuration,

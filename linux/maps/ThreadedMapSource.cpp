@@ -278,8 +278,9 @@ void ThreadedMapSource::Core::deliver(const Job& job, const MapDrawer::Result& r
     }
 }
 
-ThreadedMapSource::ThreadedMapSource(std::shared_ptr<platform::MainLoop> mainLoop, Grounds grounds)
-    : core_(std::make_shared<Core>(std::move(mainLoop), std::move(grounds))) {
+ThreadedMapSource::ThreadedMapSource(std::shared_ptr<platform::MainLoop> mainLoop, Grounds grounds,
+                                     platform::MapDatum datum)
+    : core_(std::make_shared<Core>(std::move(mainLoop), std::move(grounds))), datum_(datum) {
     core_->listen();
 }
 

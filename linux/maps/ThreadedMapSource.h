@@ -15,12 +15,14 @@ class ThreadedMapSource final : public platform::MapPictureSource {
     using Grounds = std::vector<std::shared_ptr<MapGround>>;
 
     /// Each ground fills in what those before it left; what the last one leaves shows plain land.
-    ThreadedMapSource(std::shared_ptr<platform::MainLoop> mainLoop, Grounds grounds);
+    ThreadedMapSource(std::shared_ptr<platform::MainLoop> mainLoop, Grounds grounds,
+                      platform::MapDatum datum = platform::MapDatum::Wgs84);
     ~ThreadedMapSource() override;
 
     int requestPicture(const platform::MapPictureRequest& request, Completion completion) override;
     void cancel(int request) override;
     std::shared_ptr<void> observeChanges(std::function<void()> changed) override;
+    platform::MapDatum datum() const override { return datum_; }
 
     /// Draws from these from now on, and tells the observers. Drawings under way are made anew.
     void setGrounds(Grounds grounds);
@@ -28,6 +30,7 @@ class ThreadedMapSource final : public platform::MapPictureSource {
   private:
     class Core;
     std::shared_ptr<Core> core_;
+    platform::MapDatum datum_;
 };
 
 }  // namespace ktr::linux_
