@@ -1,0 +1,112 @@
+// A map of 400 x 219 points at scale 2 from a file of tiles: the first picture, the same again, a glide, and what of it
+// the main thread does.
+//   ktr-map-bench FILE LATITUDE LONGITUDE [ZOOM]
+#include <QGuiApplication>
+#include <QImage>
+#include <QPainter>
+#include <algorithm>
+#include <cstdio>
+#include <cstdlib>
+#include <ctime>
+#include <functional>
+#include <memory>
+#include <vector>
+
+#include "linux/maps/MapDrawer.h"
+#include "linux/maps/ThreadedMapSource.h"
+#include "linux/maps/VectorGround.h"
+#include "linux/ui/FontSetup.h"
+#include "linux/ui/QtImage.h"
+#include "platform/base/VirtualTime.h"
+
+namespace {
+
+using namespace ktr;
+using namespace ktr::linux_;
+
+constexpr int kRounds = 41;
+
+/// Computing time of the thread: what other programs do does not count. Milliseconds.
+double now() {
+    timespec time{};
+    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &time);
+    return static_cast<double>(time.tv_sec) * 1e3 + static_cast<double>(time.tv_nsec) / 1e6;
+}
+
+double median(int rounds, const std::function<void(int)>& work) {
+    std::vector<double> times;
+    for (int round = 0; round < rounds; ++round) {
+        const double begin = now();
+        work(round);
+        times.push_back(now() - begin);
+    }
+    std::sort(times.begin(), times.end());
+    return times[times.size() / 2];
+}
+
+platform::MapPictureRequest request(const platform::Coordinate& centre, double zoom) {
+    platform::MapPictureRequest made;
+    made.viewport = {centre, zoom, {400.0, 219.0}};
+    made.scale = 2.0;
+    return made;
+}
+
+/// Two points to the east with each step.
+platform::MapPictureRequest glide(platform::MapPictureRequest from, int step) {
+    from.viewport.centre = from.viewport.coordinateAt({200.0 + 2.0 * step, 109.5});
+    return from;
+}
+
+void benchMainThread(const platform::MapPictureRequest& wanted, const std::shared_ptr<MapGround>& ground) {
+    // The worker's turn is the main thread's here, and is taken off again.
+    const auto time = std::make_shared<platform::VirtualTime>(platform::Date{0.0});
+    ThreadedMapSource source(time, {ground});
+    QImage screen(800, 438, QImage::Format_RGB32);
+    const auto show = [&](const platform::MapPicture& picture) {
+        QPainter painter(&screen);
+        painter.scale(2.0, 2.0);
+        dynamic_cast<const QtImage&>(*picture.image)
+            .draw(painter, QRectF(0.0, 0.0, 400.0, 219.0), Palette::of(ColorScheme::Light));
+    };
+    source.requestPicture(wanted, show);
+    time->runPosted();
+    const double kept = median(kRounds, [&](int) {
+        source.requestPicture(wanted, show);
+        time->runPosted();
+    });
+    std::printf("main thread: a kept picture asked for, answered and painted: %.2f ms\n", kept);
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    if (argc < 4) {
+        std::fprintf(stderr, "usage: ktr-map-bench FILE LATITUDE LONGITUDE [ZOOM]\n");
+        return 2;
+    }
+    setenv("QT_QPA_PLATFORM", "offscreen", 0);
+    FontSetup::prepare(FontSetup::Mode::Pinned);
+    const QGuiApplication application(argc, argv);
+    FontSetup::load(FontSetup::Mode::Pinned);
+    const auto wanted = request({std::atof(argv[2]), std::atof(argv[3])}, argc > 4 ? std::atof(argv[4]) : 15.5);
+    const auto draw = [](const platform::MapPictureRequest& asked, const std::shared_ptr<MapGround>& ground) {
+        return MapDrawer::draw(asked, {ground}, {});
+    };
+    const auto ground = std::make_shared<VectorGround>(argv[1]);
+    const double begin = now();
+    const auto first = draw(wanted, ground);
+    const double cold = now() - begin;
+    if (!first || first->attribution.empty()) {
+        std::fprintf(stderr, "%s shows nothing there\n", argv[1]);
+        return 1;
+    }
+    std::printf("%.2f metres a point, %s\n", wanted.viewport.metresPerPoint(), first->attribution.c_str());
+    std::printf("first picture (file, fonts, tiles, names): %.1f ms\n", cold);
+    std::printf("first picture of a new file: %.1f ms\n",
+                median(kRounds, [&](int) { draw(wanted, std::make_shared<VectorGround>(argv[1])); }));
+    std::printf("tiles and names known: %.1f ms\n", median(kRounds, [&](int) { draw(wanted, ground); }));
+    std::printf("gliding, two points a picture: %.1f ms\n",
+                median(kRounds, [&](int round) { draw(glide(wanted, round), ground); }));
+    benchMainThread(wanted, ground);
+    return 0;
+}
