@@ -223,7 +223,7 @@ bool Common::isHandleEmail(const std::optional<std::string>& handle) const {
 }
 
 std::string Common::completeNumberForPhoneNumber(const std::optional<std::string>& phoneNumber) const {
-    const std::string cut = cutNumber(phoneNumber.value_or(""));
+    std::string cut = cutNumber(phoneNumber.value_or(""));
     if (cut.empty()) {
         return cut;
     }

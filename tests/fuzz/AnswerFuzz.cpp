@@ -20,7 +20,6 @@ namespace {
 
 using namespace ktr;
 using ktr::fuzz::require;
-using platform::Dictionary;
 using platform::Value;
 
 /// A platform of doubles outside any test.

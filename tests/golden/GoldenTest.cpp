@@ -22,8 +22,6 @@ namespace ktr::test {
 
 namespace {
 
-using linux_::FontSetup;
-
 /// No case looks at the clock: every scenario has its own, and this stands in for nothing else.
 constexpr platform::Date kNow = {790171200.0};
 

@@ -11,7 +11,6 @@ using app::Fault;
 using app::FriendsFile;
 using app::LocationService;
 using app::ServedFriend;
-using platform::Dictionary;
 
 class LocationServiceTest : public ::testing::Test {
   protected:

@@ -9,7 +9,6 @@ namespace ktr::test {
 namespace {
 
 using platform::Dictionary;
-using platform::Value;
 
 std::vector<std::string> keysOf(const Dictionary& dictionary) {
     std::vector<std::string> keys;

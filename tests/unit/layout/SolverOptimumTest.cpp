@@ -164,7 +164,7 @@ class SolverOptimumTest : public PlatformTest {
 
     void SetUp() override { variables = 0; }
     void makeSystem(int mostVariables = 3, int mostRows = 8) {
-        variables = static_cast<std::size_t>(1 + random.below(mostVariables));
+        variables = 1 + static_cast<std::size_t>(random.below(mostVariables));
         rows.clear();
         for (int i = random.below(mostRows); i >= 0; --i) {
             rows.push_back(random.row(variables));

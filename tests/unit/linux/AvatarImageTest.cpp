@@ -12,7 +12,6 @@
 namespace ktr::linux_ {
 
 using platform::Contact;
-using platform::Font;
 using platform::FontFace;
 using platform::FontWeight;
 

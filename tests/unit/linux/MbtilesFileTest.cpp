@@ -161,8 +161,8 @@ TEST_F(MbtilesFileTest, TilesInAView_AreRead) {
 
 TEST_F(MbtilesFileTest, HostileViews_AreRefused) {
     const char* views[] = {
-        "WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n) SELECT i AS zoom_level, i AS tile_column, i AS"
-        " tile_row, i AS tile_data FROM n",
+        ("WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n)"
+         " SELECT i AS zoom_level, i AS tile_column, i AS tile_row, i AS tile_data FROM n"),
         "SELECT 1 AS zoom_level, 0 AS tile_column, 0 AS tile_row, zeroblob(1000000000) AS tile_data",
         "SELECT 1 AS zoom_level, 0 AS tile_column, 0 AS tile_row, load_extension('/tmp/evil') AS tile_data",
         "SELECT 1 AS zoom_level, 0 AS tile_column, 0 AS tile_row, name AS tile_data FROM pragma_table_list"};

@@ -8,7 +8,6 @@
 namespace ktr::linux_ {
 
 using platform::Color;
-using platform::Rect;
 
 namespace {
 

@@ -47,6 +47,7 @@ TEST(QtMainLoopTest, WorkThatPostsWhenItIsDropped_IsDroppedToo) {
     struct PostsAtTheEnd {
         QtMainLoop* loop;
         bool* ran;
+        PostsAtTheEnd(QtMainLoop* on, bool* flag) : loop(on), ran(flag) {}
         ~PostsAtTheEnd() {
             loop->post([flag = ran] { *flag = true; });
         }

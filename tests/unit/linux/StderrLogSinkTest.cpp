@@ -21,7 +21,7 @@ using platform::LogLevel;
 class StderrLogSinkTest : public ::testing::Test {
   protected:
     struct Close {
-        void operator()(std::FILE* file) const { std::fclose(file); }
+        void operator()(std::FILE* open) const { std::fclose(open); }
     };
     std::unique_ptr<std::FILE, Close> file{std::tmpfile()};
 

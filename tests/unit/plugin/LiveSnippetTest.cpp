@@ -237,7 +237,7 @@ TEST_F(LiveSnippetTest, Month_OfPollingEveryTenSecondsGrowsNothing) {
     EXPECT_EQ(answered, 259200U);
     EXPECT_LE(time->pendingTimers(), timers + 1);
     EXPECT_EQ(platform->notificationCenter->observerCount(), observers);
-    EXPECT_LE(residentBytes(), memory + 8u * 1024 * 1024);
+    EXPECT_LE(residentBytes(), memory + std::size_t{8} * 1024 * 1024);
 }
 
 }  // namespace

@@ -159,8 +159,7 @@ TEST_F(VAKTRMultipleLocationsSnippetControllerAdverseTest, Texts_EmptyHugeOrNoUt
                          std::string(100'000, 'x'),
                          "\xFF\xFE\x80",
                          std::string("a\0b", 3),
-                         "\xE2\x80\xAE"
-                         "gpj.exe",
+                         std::string("\xE2\x80\xAE") + "gpj.exe",
                          "\xF0\x9F\x91\xA9\xE2\x80\x8D\xF0\x9F\x91\xA9\xE2\x80\x8D\xF0\x9F\x91\xA7",
                          "%@%1$@%s%n"};
     LocationList all;
