@@ -223,6 +223,8 @@ void KTRDynVelaMapView::runMapRegionAfterDelay() {
     }
     MapRegion region;
     if (isVisibilityMap_) {
+        // Who tells of the move has heard of it before the map.
+        mapView_->updateUserLocation();
         region = {mapView_->userLocation()->coordinate(), {kVisibilitySpan, kVisibilitySpan}};
     } else if (location_) {
         region = friendRegion();

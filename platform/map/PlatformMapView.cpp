@@ -69,8 +69,9 @@ class PlatformMapView::UserTracker : public PlatformLocationManagerDelegate,
         manager->setDesiredAccuracy(kLocationAccuracyNearestTenMeters);
         manager->setDistanceFilter(1.0);
         manager->startUpdatingLocation();
-        tell(manager->location());
+        catchUp();
     }
+    void catchUp() { tell(manager_ ? manager_->location() : nullptr); }
     void didUpdateLocations(PlatformLocationManager&, const PlatformLocations& locations) override {
         if (!locations.empty()) {
             tell(locations.back());
@@ -80,14 +81,16 @@ class PlatformMapView::UserTracker : public PlatformLocationManagerDelegate,
   private:
     void tell(const std::shared_ptr<PlatformLocation>& location) {
         // A negative accuracy marks a position that is none.
-        if (const auto map = map_.lock();
-            map && location && isValid(location->coordinate()) && location->fix().horizontalAccuracy >= 0.0) {
+        if (const auto map = map_.lock(); map && location && location != told_ && isValid(location->coordinate()) &&
+                                          location->fix().horizontalAccuracy >= 0.0) {
+            told_ = location;
             map->userMoved(location);
         }
     }
 
     std::weak_ptr<PlatformMapView> map_;
     std::shared_ptr<PlatformLocationManager> manager_;
+    std::shared_ptr<PlatformLocation> told_;
 };
 
 PlatformMapView::PlatformMapView() : userLocation_(std::make_shared<UserLocation>()) {}
@@ -351,6 +354,12 @@ void PlatformMapView::setShowsUserLocation(bool shows) {
     }
     setNeedsUpdate();
     setNeedsLayout();
+}
+
+void PlatformMapView::updateUserLocation() {
+    if (tracker_) {
+        tracker_->catchUp();
+    }
 }
 
 void PlatformMapView::userMoved(const std::shared_ptr<PlatformLocation>& location) {

@@ -83,6 +83,8 @@ class KTR_API PlatformMapView : public View {
     void setShowsUserLocation(bool shows);
     /// Never none; without a position while that is unknown or not asked for.
     const std::shared_ptr<UserLocation>& userLocation() const { return userLocation_; }
+    /// Takes up the newest position that is known now, though it may be told to the map later than to others.
+    void updateUserLocation();
 
     // What a host's gestures may do with the map
     bool scrollEnabled() const { return scrollEnabled_; }

@@ -1,7 +1,9 @@
 #include "plugin/KTRSnippetControllerFactory.h"
 
+#include "plugin/VAKTRGeoFenceSnippetController.h"
 #include "plugin/VAKTRLocationSnippetController.h"
 #include "plugin/VAKTRMultipleLocationsSnippetController.h"
+#include "plugin/VAKTRVisibilityController.h"
 #include "tests/support/Friends.h"
 #include "tests/support/PlatformTest.h"
 
@@ -78,13 +80,15 @@ TEST_F(KTRSnippetControllerFactoryTest, UnknownKindOrNone_IsNoneAndOneLine) {
               std::vector<std::string>{"Unrecognized snippet CueObject passed to KTRSnippetControllerFactory: (null)"});
 }
 
-TEST_F(KTRSnippetControllerFactoryTest, KindsWithoutAController_AreNoneAndOneLineEach) {
-    EXPECT_EQ(factory_->viewControllerForSnippet(std::make_shared<VAKtrGeoFenceSnippet>()), nullptr);
-    EXPECT_EQ(factory_->viewControllerForSnippet(std::make_shared<VAKtrVisibilityView>()), nullptr);
-    EXPECT_EQ(log->texts(),
-              (std::vector<std::string>{
-                  "Unrecognized snippet CueObject passed to KTRSnippetControllerFactory: <VAKtrGeoFenceSnippet>",
-                  "Unrecognized snippet CueObject passed to KTRSnippetControllerFactory: <VAKtrVisibilityView>"}));
+TEST_F(KTRSnippetControllerFactoryTest, GeofenceAndVisibility_HaveControllersOfTheirOwn) {
+    const auto fence = factory_->viewControllerForSnippet(std::make_shared<VAKtrGeoFenceSnippet>());
+    EXPECT_NE(std::dynamic_pointer_cast<VAKTRGeoFenceSnippetController>(fence), nullptr);
+    EXPECT_EQ(fence.use_count(), 1);
+    const auto visibility = factory_->viewControllerForSnippet(std::make_shared<VAKtrVisibilityView>());
+    EXPECT_NE(std::dynamic_pointer_cast<VAKTRVisibilityController>(visibility), nullptr);
+    EXPECT_EQ(visibility.use_count(), 1);
+    struct DerivedFence : VAKtrGeoFenceSnippet {};
+    EXPECT_NE(factory_->viewControllerForSnippet(std::make_shared<DerivedFence>()), nullptr);
 }
 
 TEST_F(KTRSnippetControllerFactoryTest, AccessibilityTextSize_IsRefusedWithOneLine) {
@@ -93,6 +97,9 @@ TEST_F(KTRSnippetControllerFactoryTest, AccessibilityTextSize_IsRefusedWithOneLi
     ASSERT_EQ(log->lines().size(), 1u);
     EXPECT_EQ(log->lines()[0].level, LogLevel::Default);
     EXPECT_EQ(log->lines()[0].format, "There are no rows for accessibility text sizes yet; nothing is drawn for: %@");
+    EXPECT_EQ(factory_->viewControllerForSnippet(std::make_shared<VAKtrGeoFenceSnippet>()), nullptr);
+    EXPECT_EQ(factory_->viewControllerForSnippet(std::make_shared<VAKtrVisibilityView>()), nullptr);
+    EXPECT_EQ(log->lines().size(), 3u);
 }
 
 TEST_F(KTRSnippetControllerFactoryTest, LargestOrdinaryTextSize_IsDrawn) {

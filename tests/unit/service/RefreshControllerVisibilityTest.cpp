@@ -37,6 +37,13 @@ class RefreshControllerVisibilityTest : public PlatformTest {
         time->runPosted();
     }
     std::size_t sent() const { return transport->requests.size(); }
+    /// A command lives until its completion has run: dropping the request would keep it for ever.
+    void cancelWaiting() {
+        while (!transport->waiting.empty()) {
+            transport->fail(platform::HttpFailure::Cancelled);
+        }
+        time->runPosted();
+    }
 
     std::shared_ptr<Delegate> delegate = std::make_shared<Delegate>();
     std::shared_ptr<RefreshController> controller =
@@ -92,8 +99,8 @@ TEST_F(RefreshControllerVisibilityTest, AMillionthOfADegree_IsNoMove) {
     for (const auto& [latitude, longitude, commands] :
          {std::tuple{51.5 + 9e-7, -2.5 - 9e-7, 1U}, std::tuple{51.5 + 2e-6, -2.5, 2U},
           std::tuple{51.5, -2.5 + 2e-6, 2U}}) {
+        cancelWaiting();
         transport->requests.clear();
-        transport->waiting.clear();
         controller->setLastRefreshLocation(nullptr);
         controller->setCurrentLocation(position(51.5, -2.5));
         controller->refreshVisibility();
