@@ -1,10 +1,8 @@
 #include "app/serve/AssistantAnswers.h"
 
-#include <QString>
-#include <QStringList>
 #include <algorithm>
+#include <array>
 #include <cmath>
-#include <initializer_list>
 
 #include "platform/base/Date.h"
 
@@ -15,37 +13,10 @@ using platform::Value;
 
 namespace {
 
-/// The words of a text, without regard to case and punctuation; what stands in an e-mail address or a number stays.
-QStringList wordsOf(const std::string& text) {
-    QStringList words(QString{});
-    for (const char32_t c : QString::fromStdString(text).toCaseFolded().toStdU32String()) {
-        if (c == U'\'' || c == U'\u2019') {
-            continue;  // "where's" is one word
-        }
-        if (QChar::isLetterOrNumber(c) || QChar::isMark(c) || c == U'@' || c == U'.' || c == U'+' || c == U'-') {
-            words.back() += QString::fromUcs4(&c, 1);
-        } else if (!words.back().isEmpty()) {
-            words.append(QString());
-        }
-    }
-    for (QString& word : words) {
-        while (word.endsWith(QLatin1Char('.'))) {
-            word.chop(1);
-        }
-    }
-    words.removeAll(QString());
-    return words;
-}
-
-bool hasAny(const QStringList& words, std::initializer_list<const char*> wanted) {
-    return std::any_of(wanted.begin(), wanted.end(),
-                       [&](const char* word) { return words.contains(QLatin1String(word)); });
-}
-
-/// Whether all words of `part` follow each other in `words`.
-bool holds(const QStringList& words, const QStringList& part) {
-    return !part.isEmpty() && std::search(words.begin(), words.end(), part.begin(), part.end()) != words.end();
-}
+/// Metres around the place of a fence.
+constexpr double kFenceRadius = 100.0;
+/// So that a fence of that radius is seen whole: about 2.5 times as much, in degrees of latitude.
+constexpr const char* kFenceZoom = "0.00225";
 
 std::string nameOf(const ServedFriend& person) {
     if (!person.fullName.empty()) {
@@ -82,12 +53,11 @@ Value personOf(const ServedFriend& person) {
 
 }  // namespace
 
-std::vector<const ServedFriend*> AssistantAnswers::friendsNamed(const std::string& question) const {
-    const QStringList words = wordsOf(question);
+std::vector<const ServedFriend*> AssistantAnswers::friendsNamed(const QuestionWords& question) const {
     std::vector<const ServedFriend*> whole;
     std::vector<const ServedFriend*> part;
     for (const ServedFriend& person : service_.file().friends) {
-        const auto named = [&](const std::string& name) { return holds(words, wordsOf(name)); };
+        const auto named = [&](const std::string& name) { return question.holds(QuestionWords(name)); };
         if (named(person.fullName) || std::any_of(person.emails.begin(), person.emails.end(), named)) {
             whole.push_back(&person);
         } else if (named(person.firstName) || named(person.lastName)) {
@@ -96,6 +66,13 @@ std::vector<const ServedFriend*> AssistantAnswers::friendsNamed(const std::strin
     }
     // "Ann Marsh" means her alone, "Ann" every Ann.
     return whole.empty() ? part : whole;
+}
+
+std::string AssistantAnswers::context() const {
+    const auto milliseconds = [](double seconds) { return Value(std::round(seconds * 1000.0)).description(); };
+    return "ktrServerContext://serverContext?clientId=ktr-serve&minCallbackIntervalInMS=" +
+           milliseconds(service_.file().intervalSeconds) +
+           "&callbackTimeoutIntervalInMS=" + milliseconds(service_.file().timeoutSeconds) + "&";
 }
 
 Value AssistantAnswers::snippet(const std::vector<const ServedFriend*>& friends, const char* proximity,
@@ -116,11 +93,7 @@ Value AssistantAnswers::snippet(const std::vector<const ServedFriend*>& friends,
         }
         locations.emplace_back(location);
     }
-    const auto milliseconds = [](double seconds) { return Value(std::round(seconds * 1000.0)).description(); };
-    const std::string context = "ktrServerContext://serverContext?clientId=ktr-serve&minCallbackIntervalInMS=" +
-                                milliseconds(service_.file().intervalSeconds) +
-                                "&callbackTimeoutIntervalInMS=" + milliseconds(service_.file().timeoutSeconds) + "&";
-    Dictionary snippet{{"kind", "VAKtrLocationSnippet"}, {"searchContext", context}};
+    Dictionary snippet{{"kind", "VAKtrLocationSnippet"}, {"searchContext", context()}};
     if (proximity != nullptr) {
         snippet.set("proximity", proximity);
     }
@@ -156,20 +129,115 @@ std::string AssistantAnswers::help() const {
         }
     }
     return "I can tell where your friends are. Ask \"Where is " + name +
-           "?\", \"Where are my friends?\" or \"Who is near me?\"";
+           "?\", \"Where are my friends?\" or \"Who is near me?\", say \"Tell me when " + name +
+           " leaves work\" or \"Hide my location\".";
 }
 
-Dictionary AssistantAnswers::answer(const std::string& question, const ServiceMoment& moment) const {
-    const QStringList words = wordsOf(question);
-    std::vector<const ServedFriend*> friends = friendsNamed(question);
+Dictionary AssistantAnswers::sharingAnswer(SharingQuestion::Wish wish) const {
+    SharingState& sharing = service_.sharing();
+    if (wish != SharingQuestion::Wish::Know) {
+        sharing.setHidden(wish == SharingQuestion::Wish::Hide);
+    }
+    const bool hidden = sharing.now().hidden;
+    const std::string state = hidden ? "Friends can\u2019t see where you are." : "Friends can see where you are.";
+    std::string searchContext = context();
+    if (const auto& emails = service_.file().user.emails; !emails.empty()) {
+        searchContext += "preferredEmail=" + emails.front() + "&";
+    }
+    return Dictionary{
+        {"sentence", wish == SharingQuestion::Wish::Know ? state : "Done. " + state},
+        {"snippet",
+         Dictionary{{"kind", "VAKtrVisibilityView"}, {"searchContext", searchContext}, {"visible", !hidden}}}};
+}
+
+std::optional<Waypoint> AssistantAnswers::placeNamed(const QString& words, const ServedFriend& person,
+                                                     const ServiceMoment& moment) const {
+    if (words.isEmpty()) {
+        return person.placeAt(moment.seconds);
+    }
+    if (words == QLatin1String("here")) {
+        const auto position = service_.sharing().now().position;
+        return position ? std::optional(service_.placeAt(position->latitude, position->longitude)) : std::nullopt;
+    }
+    // What the friend calls so comes first: everybody has a home.
+    std::vector<const ServedFriend*> people = {&person};
+    const bool everybodysOwn = QuestionWords::isAny(words, {"home", "work", "school", "gym"});
+    for (const ServedFriend& other : service_.file().friends) {
+        if (!everybodysOwn && &other != &person) {
+            people.push_back(&other);
+        }
+    }
+    const auto isMeant = [&](const std::optional<std::string>& name) {
+        return name && QuestionWords(*name).words().join(QLatin1Char(' ')) == words;
+    };
+    for (const ServedFriend* one : people) {
+        for (Waypoint waypoint : one->track) {
+            if (isMeant(waypoint.label)) {
+                if (everybodysOwn) {
+                    waypoint.label = "_$!<" + words.toStdString() + ">!$_";
+                }
+                return waypoint;
+            }
+            if (isMeant(waypoint.street)) {
+                waypoint.label = std::nullopt;
+                return waypoint;
+            }
+        }
+    }
+    return std::nullopt;
+}
+
+Dictionary AssistantAnswers::fenceAnswer(const FenceQuestion& question, const ServedFriend& person,
+                                         const Waypoint& place) const {
+    using Trigger = FenceQuestion::Trigger;
+    const bool leaves = question.trigger == Trigger::Departure;
+    Dictionary location{{"latitude", place.latitude}, {"longitude", place.longitude}, {"accuracy", kFenceRadius}};
+    if (!question.place.isEmpty()) {
+        setWhenPresent(location, "label", place.label.value_or(""));
+        setWhenPresent(location, "street", place.street.value_or(""));
+    }
+    const char* trigger = question.trigger == Trigger::Immediate ? "Immediate" : leaves ? "OnDeparture" : "OnArrival";
+    const std::string sentence = question.trigger == Trigger::Immediate
+                                     ? "I will tell you where " + nameOf(person) + " is."
+                                     : "I will tell you when " + nameOf(person) + (leaves ? " leaves." : " arrives.");
+    const Dictionary fence{{"friend", personOf(person)}, {"geoFenceTrigger", trigger}, {"location", location}};
+    return Dictionary{{"sentence", sentence},
+                      {"snippet", Dictionary{{"kind", "VAKtrGeoFenceSnippet"},
+                                             {"searchContext", context() + "geoFenceZoomLevel=" + kFenceZoom + "&"},
+                                             {"cueKtrGeoFence", fence}}}};
+}
+
+std::optional<Dictionary> AssistantAnswers::fenceAnswer(const QuestionWords& question,
+                                                        const std::vector<const ServedFriend*>& friends,
+                                                        const ServiceMoment& moment) const {
+    const auto fence = FenceQuestion::read(question);
+    if (!fence || friends.empty()) {
+        return std::nullopt;
+    }
+    if (friends.size() > 1) {
+        return Dictionary{{"sentence", "I can watch one friend at a time."}};
+    }
+    const ServedFriend& person = *friends.front();
+    if (const auto place = placeNamed(fence->place, person, moment)) {
+        return fenceAnswer(*fence, person, *place);
+    }
+    if (fence->needsPlace) {
+        return std::nullopt;
+    }
+    return Dictionary{{"sentence", fence->place.isEmpty() ? "Looking for " + nameOf(person) + "."
+                                                          : "I know no such place of " + nameOf(person) + "."}};
+}
+
+Dictionary AssistantAnswers::locationsAnswer(const QuestionWords& question, std::vector<const ServedFriend*> friends,
+                                             const ServiceMoment& moment) const {
     const char* proximity = nullptr;
-    const bool asks = hasAny(words, {"where", "wheres", "find", "locate", "show"});
-    bool understood = !friends.empty() && (asks || words.size() <= 3);
+    const bool asks = question.hasAny({"where", "wheres", "find", "locate", "show"});
+    bool understood = !friends.empty() && (asks || question.words().size() <= 3);
     if (understood) {
         proximity = friends.size() > 1 ? "friends" : nullptr;
     } else if (friends.empty()) {
-        const bool near = hasAny(words, {"near", "nearby", "around", "close"});
-        understood = near || (asks && hasAny(words, {"friends", "everybody", "everyone", "all"}));
+        const bool near = question.hasAny({"near", "nearby", "around", "close"});
+        understood = near || (asks && question.hasAny({"friends", "everybody", "everyone", "all"}));
         proximity = near ? "nearby" : "friends";
         for (const ServedFriend& person : service_.file().friends) {
             if (understood && (!near || person.placeAt(moment.seconds))) {
@@ -177,9 +245,26 @@ Dictionary AssistantAnswers::answer(const std::string& question, const ServiceMo
             }
         }
     }
-    Dictionary turn{{"question", question}, {"sentence", understood ? sentence(friends, moment) : help()}};
-    if (understood) {
-        turn.set("snippet", snippet(friends, proximity, moment));
+    if (!understood) {
+        return Dictionary{{"sentence", help()}};
+    }
+    return Dictionary{{"sentence", sentence(friends, moment)}, {"snippet", snippet(friends, proximity, moment)}};
+}
+
+Dictionary AssistantAnswers::answer(const std::string& question, const ServiceMoment& moment) const {
+    const QuestionWords words(question);
+    const auto friends = friendsNamed(words);
+    Dictionary answer;
+    if (const auto wish = SharingQuestion::wishOf(words)) {
+        answer = sharingAnswer(*wish);
+    } else if (auto fence = fenceAnswer(words, friends, moment)) {
+        answer = *fence;
+    } else {
+        answer = locationsAnswer(words, friends, moment);
+    }
+    Dictionary turn{{"question", question}};
+    for (const auto& [name, value] : answer) {
+        turn.set(name, value);
     }
     return turn;
 }

@@ -24,9 +24,17 @@ namespace {
 
 constexpr const char* kAddress = "127.0.0.1";
 constexpr const char* kJson = "application/json";
-constexpr const char* kGetLocations = "/qloxservice/friends/va/getlocations";
+constexpr const char* kCommands = "/qloxservice/friends/va/";
 constexpr std::size_t kLargestRequest = std::size_t{1} << 20;
 constexpr std::size_t kDeepBrackets = 1000000;
+
+/// One of the service's commands: the last part of its path, and who answers it.
+struct Command {
+    const char* name;
+    std::optional<Dictionary> (LocationService::*answer)(const Dictionary&, const ServiceMoment&, const Fault&,
+                                                         std::string&) const;
+    std::string path() const { return std::string(kCommands) + name; }
+};
 
 std::string errorBody(int status, const std::string& message) {
     return platform::writeJson(Dictionary{{"statusCode", status}, {"message", message}});
@@ -128,9 +136,12 @@ class DevelopmentServer::Server {
         http_.set_pre_routing_handler([this](const httplib::Request& request, httplib::Response& response) {
             return refuseOtherHosts(request, response);
         });
-        http_.Post(kGetLocations, [this](const httplib::Request& request, httplib::Response& response) {
-            getLocations(request, response);
-        });
+        for (const Command& command : {Command{"getlocations", &LocationService::getLocations},
+                                       Command{"showHideLocation", &LocationService::showHideLocation}}) {
+            http_.Post(command.path(), [this, command](const httplib::Request& request, httplib::Response& response) {
+                run(command, request, response);
+            });
+        }
         http_.Get("/assistant",
                   [this](const httplib::Request& request, httplib::Response& response) { ask(request, response); });
         http_.set_error_handler([](const httplib::Request&, httplib::Response& response) {
@@ -199,21 +210,22 @@ class DevelopmentServer::Server {
         return std::nullopt;
     }
 
-    void getLocations(const httplib::Request& request, httplib::Response& response) {
+    void run(const Command& command, const httplib::Request& request, httplib::Response& response) {
         const int number = ++requests_;
+        const std::string name = command.name;
         const Fault fault = setup_.faults.faultFor(number);
         if (fault.delaySeconds > 0.0 && !wait(fault.delaySeconds)) {
             return;
         }
         if (fault.cut == Fault::Cut::BeforeAnswer) {
-            report(number, "getlocations, reset");
+            report(number, name + ", reset");
             reset(request);
             return;
         }
         if (!fault.redirect.empty()) {
             response.status = fault.redirectStatus;
-            response.set_header("Location", locationOf(fault.redirect));
-            report(number, "getlocations, " + std::to_string(response.status) + ", redirected");
+            response.set_header("Location", locationOf(fault.redirect, command));
+            report(number, name + ", " + std::to_string(response.status) + ", redirected");
             return;
         }
         if (const auto refused = refusal(request)) {
@@ -222,22 +234,23 @@ class DevelopmentServer::Server {
                 response.set_header("WWW-Authenticate", "Basic realm=\"ktr serve\"");
             }
             response.set_content(errorBody(refused->first, refused->second), kJson);
-            report(number, "getlocations, " + std::to_string(response.status));
+            report(number, name + ", " + std::to_string(response.status));
             return;
         }
-        std::string body = answer(request, fault, response);
-        report(number, "getlocations, " + std::to_string(response.status));
+        std::string body = answer(command, request, fault, response);
+        report(number, name + ", " + std::to_string(response.status));
         send(fault, bodyOf(fault, std::move(body)), response);
     }
 
-    std::string answer(const httplib::Request& request, const Fault& fault, httplib::Response& response) const {
+    std::string answer(const Command& command, const httplib::Request& request, const Fault& fault,
+                       httplib::Response& response) const {
         const auto document = linux_::JsonReader::read(request.body);
         const auto* value = std::get_if<Value>(&document);
         std::string complaint = "expected a JSON object as the body";
         if (value != nullptr && value->dictionary() != nullptr) {
-            if (auto locations = service_.getLocations(*value->dictionary(), now(), fault, complaint)) {
+            if (auto given = (service_.*command.answer)(*value->dictionary(), now(), fault, complaint)) {
                 response.status = fault.status == 0 ? 200 : fault.status;
-                return response.status < 300 ? platform::writeJson(*locations)
+                return response.status < 300 ? platform::writeJson(*given)
                                              : errorBody(response.status, "a fault that was asked for");
             }
         }
@@ -245,10 +258,10 @@ class DevelopmentServer::Server {
         return errorBody(400, complaint);
     }
 
-    std::string locationOf(const std::string& redirect) const {
+    std::string locationOf(const std::string& redirect, const Command& command) const {
         std::string location = replaced(redirect, "{origin}", "https://localhost:" + std::to_string(port_));
         location = replaced(std::move(location), "{port}", std::to_string(port_));
-        return replaced(std::move(location), "{path}", kGetLocations);
+        return replaced(std::move(location), "{path}", command.path());
     }
 
     static void reset(const httplib::Request& request) {

@@ -48,7 +48,7 @@ void readNames(FieldReader& fields, ServedFriend& person) {
     person.identifier = fields.string("identifier").value_or("");
 }
 
-ServedFriend readFriend(FieldReader& fields) {
+ServedFriend readPerson(FieldReader& fields) {
     ServedFriend person;
     readNames(fields, person);
     person.emails = fields.stringOrStrings("emails");
@@ -56,6 +56,11 @@ ServedFriend readFriend(FieldReader& fields) {
     if (person.emails.empty() && person.phones.empty()) {
         fields.complain("", "expected at least one of \"emails\" and \"phones\"");
     }
+    return person;
+}
+
+ServedFriend readFriend(FieldReader& fields) {
+    ServedFriend person = readPerson(fields);
     person.repeats = fields.boolean("repeats").value_or(true);
     person.hidden = fields.boolean("hidden").value_or(false);
     person.locatedAfter = readNumber(fields, "locatedAfter", 0.0, kLongestTime, 0.0);
@@ -100,6 +105,14 @@ ServedFriend readLocation(FieldReader& fields) {
 void readAll(FieldReader& fields, FriendsFile& file) {
     file.intervalSeconds = readNumber(fields, "intervalSeconds", 0.0, kLongestTime, file.intervalSeconds);
     file.timeoutSeconds = readNumber(fields, "timeoutSeconds", 0.0, kLongestTime, file.timeoutSeconds);
+    fields.object("user", [&](FieldReader& user) { file.user = readPerson(user); });
+    // What a scenario says of the account.
+    fields.object("account", [&](FieldReader& account) {
+        if (const auto name = account.string("userName")) {
+            file.user = ServedFriend();
+            (name->find('@') != std::string::npos ? file.user.emails : file.user.phones) = {*name};
+        }
+    });
     const bool friends =
         fields.objects("friends", [&](FieldReader& person) { file.friends.push_back(readFriend(person)); });
     const bool snippet = fields.object("snippet", [&](FieldReader& object) {

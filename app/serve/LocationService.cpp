@@ -18,10 +18,11 @@ constexpr int kNotReported = 411;
 /// How near to a requested place counts as being there, metres.
 constexpr double kAtPlace = 150.0;
 
-struct Position {
-    double latitude = 0.0;
-    double longitude = 0.0;
-};
+/// How near to a street's waypoint an address has that street, and to a town's that town, metres.
+constexpr double kInStreet = 75.0;
+constexpr double kInTown = 10000.0;
+
+using Position = SharingState::Position;
 
 /// None without a position; 0/0 is what a client sends that knows none.
 std::optional<Position> readPosition(FieldReader& request, const std::string& name) {
@@ -33,6 +34,7 @@ std::optional<Position> readPosition(FieldReader& request, const std::string& na
             fields.complain("", "expected a latitude and a longitude in degrees");
         } else if (*latitude != 0.0 || *longitude != 0.0) {
             position = Position{*latitude, *longitude};
+            position->accuracy = fields.number("horizontalAccuracy").value_or(position->accuracy);
         }
     });
     return position;
@@ -133,12 +135,79 @@ std::optional<Dictionary> LocationService::getLocations(const Dictionary& reques
         locations.set(handle, entry);
         order.emplace_back(handle);
     }
-    Dictionary context{
-        {"minCallbackIntervalInMS", std::round(fault.intervalSeconds.value_or(file_.intervalSeconds) * 1000.0)},
-        {"callbackTimeoutIntervalInMS", std::round(file_.timeoutSeconds * 1000.0)}};
+    Dictionary context = serverContext(fault);
     setWhenPresent(context, "clientId", clientId);
     return Dictionary{
         {"statusCode", statusCode}, {"serverContext", context}, {"locations", locations}, {"emails", order}};
+}
+
+Dictionary LocationService::serverContext(const Fault& fault) const {
+    return {{"minCallbackIntervalInMS", std::round(fault.intervalSeconds.value_or(file_.intervalSeconds) * 1000.0)},
+            {"callbackTimeoutIntervalInMS", std::round(file_.timeoutSeconds * 1000.0)}};
+}
+
+Waypoint LocationService::placeAt(double latitude, double longitude) const {
+    Waypoint place;
+    place.latitude = latitude;
+    place.longitude = longitude;
+    const Waypoint* nearest = nullptr;
+    double least = kInTown;
+    for (const ServedFriend& person : file_.friends) {
+        for (const Waypoint& waypoint : person.track) {
+            const double metres = distance(latitude, longitude, waypoint);
+            if (metres <= least) {
+                least = metres;
+                nearest = &waypoint;
+            }
+        }
+    }
+    if (nearest != nullptr) {
+        place.city = nearest->city;
+        place.stateCode = nearest->stateCode;
+        if (least <= kInStreet) {
+            place.street = nearest->street;
+        }
+    }
+    return place;
+}
+
+std::optional<Dictionary> LocationService::showHideLocation(const Dictionary& request, const ServiceMoment& moment,
+                                                            const Fault& fault, std::string& complaint) const {
+    Complaints complaints;
+    FieldReader fields(request, {}, complaints);
+    std::optional<Position> position;
+    const bool hasContext =
+        fields.object("clientContext", [&](FieldReader& context) { position = readPosition(context, "location"); });
+    if (!hasContext) {
+        fields.complain("clientContext", "expected an object, found nothing");
+    }
+    std::optional<std::string> hide;
+    fields.object("prefs", [&](FieldReader& preferences) { hide = preferences.string("hideLocation"); });
+    if (!complaints && hide != "Yes" && hide != "No") {
+        fields.complain("prefs", R"(expected "hideLocation" to be "Yes" or "No")");
+    }
+    if (complaints) {
+        complaint = complaints->path.text() + ": " + complaints->message;
+        return std::nullopt;
+    }
+    if (fault.status < 300) {
+        sharing_->set(hide == "Yes", position);
+    }
+    const auto known = sharing_->now();
+    Dictionary myInfo;
+    if (!file_.user.emails.empty()) {
+        myInfo.set("preferredEmail", file_.user.emails.front());
+    }
+    myInfo.set("hidden", known.hidden);
+    Value location;
+    if (!known.hidden && known.position) {
+        Waypoint place = placeAt(known.position->latitude, known.position->longitude);
+        place.accuracy = known.position->accuracy;
+        location = locationOf(place, moment.millisecondsSince1970);
+    }
+    myInfo.set("location", location);
+    return Dictionary{
+        {"statusCode", fault.statusCode.value_or(200)}, {"serverContext", serverContext(fault)}, {"myInfo", myInfo}};
 }
 
 }  // namespace ktr::app

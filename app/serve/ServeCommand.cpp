@@ -38,9 +38,10 @@ fs::path resource(const char* name) {
     return (program.parent_path() / "../share/ktr/service" / name).lexically_normal();
 }
 
-std::string configuration(const ServeOptions& options, const DevelopmentCertificates& certificates, int port) {
+std::string configuration(const ServeOptions& options, const DevelopmentCertificates& certificates,
+                          const std::string& userName, int port) {
     const Dictionary account{{"personId", options.personId},
-                             {"userName", "ktr serve"},
+                             {"userName", userName},
                              {"host", "localhost:" + std::to_string(port)},
                              {"tokenFile", certificates.tokenFile().string()}};
     const std::string track = !options.positions.empty() ? fs::absolute(options.positions).lexically_normal().string()
@@ -134,6 +135,7 @@ ExitCode ServeCommand::run(const ServeOptions& options) {
     }
     const int signals = endingSignals();
     auto& setup = std::get<DevelopmentServer::Setup>(read);
+    const std::string userName = setup.friends.user.handle();
     setup.token = certificates.token();
     setup.certificate = *certificate;
     setup.report = [](const std::string& line) { std::cout << line << std::endl; };
@@ -142,7 +144,7 @@ ExitCode ServeCommand::run(const ServeOptions& options) {
         ::close(signals);
         return complain("port " + std::to_string(options.port) + " of 127.0.0.1 cannot be used");
     }
-    const std::string config = configuration(options, certificates, server.port());
+    const std::string config = configuration(options, certificates, userName, server.port());
     std::string failure;
     if (!options.writeConfig.empty()) {
         failure = linux_::AtomicFile::write(options.writeConfig, config + "\n");

@@ -42,6 +42,19 @@ std::optional<Waypoint> ServedFriend::placeAt(double seconds) const {
     return place;
 }
 
+std::string ServedFriend::handle() const {
+    return !emails.empty() ? emails.front() : !phones.empty() ? phones.front() : "";
+}
+
+ServedFriend FriendsFile::defaultUser() {
+    ServedFriend user;
+    user.fullName = "Mara Lind";
+    user.firstName = "Mara";
+    user.lastName = "Lind";
+    user.emails = {"mara.lind@harbour.example"};
+    return user;
+}
+
 bool ServedFriend::answersTo(const std::string& handle) const {
     const std::string wanted = comparable(handle);
     const auto same = [&](const std::string& own) { return comparable(own) == wanted; };

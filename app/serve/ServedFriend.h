@@ -35,13 +35,19 @@ struct ServedFriend {
     std::optional<Waypoint> placeAt(double seconds) const;
     /// E-mail addresses regardless of case, phone numbers by their digits and "+".
     bool answersTo(const std::string& handle) const;
+    /// The first e-mail address, else the first phone number; empty without either.
+    std::string handle() const;
 };
 
 /// What a friends file says.
 struct FriendsFile {
     double intervalSeconds = 10.0;  ///< between two answers
     double timeoutSeconds = 600.0;  ///< after which a snippet stops asking
+    /// The account's owner, without a track: the service learns from commands where that is.
+    ServedFriend user = defaultUser();
     std::vector<ServedFriend> friends;
+
+    static ServedFriend defaultUser();
 };
 
 }  // namespace ktr::app

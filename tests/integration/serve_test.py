@@ -4,6 +4,7 @@
   serve_test.py PROGRAM [unittest options]
 """
 import base64
+import concurrent.futures
 import http.client
 import json
 import os
@@ -14,6 +15,7 @@ import ssl
 import sys
 import time
 import unittest
+import urllib.parse
 
 from serve import Service
 
@@ -178,6 +180,56 @@ class RequestTest(unittest.TestCase):
         self.assertEqual(bound, [f"0100007F:{self.service.port:04X}"])
 
 
+class SharingTest(unittest.TestCase):
+    """The user's own sharing: commands and questions see and change one state."""
+
+    def command(self, service, hide, **location):
+        body = {"clientContext": {"location": location} if location else {}, "prefs": {"hideLocation": hide}}
+        connection = connect(service)
+        connection.request("POST", "/qloxservice/friends/va/showHideLocation", json.dumps(body), headers(service))
+        return json.loads(connection.getresponse().read())["myInfo"]
+
+    def visible(self, service, question):
+        connection = connect(service)
+        connection.request("GET", "/assistant?q=" + urllib.parse.quote(question))
+        return json.loads(connection.getresponse().read())["snippet"]["visible"]
+
+    def test_state_is_kept_while_it_runs(self):
+        with Service(PROGRAM) as service:
+            self.assertTrue(self.visible(service, "Can my friends see me?"))
+            self.assertEqual(self.command(service, "No", latitude=50.2104, longitude=-3.12)["location"]["latitude"],
+                             50.2104)
+            self.assertFalse(self.visible(service, "Hide my location"))
+            self.assertFalse(self.visible(service, "Can my friends see me?"))
+            self.assertIsNone(self.command(service, "Yes")["location"])
+            self.assertEqual(self.command(service, "No")["location"]["latitude"], 50.2104)
+            self.assertTrue(self.visible(service, "Can my friends see me?"))
+            _, lines = service.end()
+            self.assertEqual(lines, [f"request {n}: showHideLocation, 200" for n in (1, 2, 3)])
+
+    def test_state_ends_with_it(self):
+        with Service(PROGRAM) as service:
+            self.command(service, "Yes")
+        with Service(PROGRAM) as service:
+            self.assertTrue(self.visible(service, "Can my friends see me?"))
+
+    def test_many_at_once(self):
+        with Service(PROGRAM) as service:
+            with concurrent.futures.ThreadPoolExecutor(8) as pool:
+                answers = list(pool.map(lambda n: self.command(service, "Yes" if n % 2 else "No", latitude=50.2,
+                                                               longitude=-3.1), range(64)))
+            for answer in answers:
+                self.assertEqual(answer["hidden"], answer["location"] is None)
+
+    def test_faults_meet_it_too(self):
+        with Service(PROGRAM, "--fault", "status=503,count=1") as service:
+            connection = connect(service)
+            body = json.dumps({"clientContext": {}, "prefs": {"hideLocation": "Yes"}})
+            connection.request("POST", "/qloxservice/friends/va/showHideLocation", body, headers(service))
+            self.assertEqual(connection.getresponse().status, 503)
+            self.assertTrue(self.visible(service, "Can my friends see me?"), "a command that failed changed nothing")
+
+
 class CertificateTest(unittest.TestCase):
     def test_good_for_all_names_of_this_machine(self):
         with Service(PROGRAM) as service:
@@ -224,6 +276,7 @@ class EndTest(unittest.TestCase):
                 printed = json.loads(service.process.stdout.readline())
                 self.assertEqual(printed, json.loads(file.read_text()))
                 self.assertEqual(os.stat(file).st_mode & 0o777, 0o600)
+                self.assertEqual(printed["account"]["userName"], "mara.lind@harbour.example")
                 self.assertEqual(printed["account"]["host"], f"localhost:{service.port}")
                 self.assertEqual(printed["certificates"], [service.authority])
                 self.assertNotIn(service.token, file.read_text())

@@ -70,6 +70,17 @@ TEST_F(FriendsReaderTest, Scenario_GivesPeopleWhoStay) {
     EXPECT_EQ(friends[1].placeAt(0.0), std::nullopt);
 }
 
+TEST_F(FriendsReaderTest, User_IsNamedOrSomebodyOfTheService) {
+    EXPECT_EQ(good(R"({"friends": []})").user.handle(), "mara.lind@harbour.example");
+    const auto named = good(R"({"friends": [], "user": {"fullName": "Me", "phones": "+44 1"}})").user;
+    EXPECT_EQ(named.fullName, "Me");
+    EXPECT_EQ(named.handle(), "+44 1");
+    EXPECT_EQ(good(R"({"snippet": {}, "account": {"userName": "me@b.example"}})").user.handle(), "me@b.example");
+    EXPECT_EQ(good(R"({"snippet": {}, "account": {"userName": "+44 2"}})").user.phones.front(), "+44 2");
+    EXPECT_EQ(complaintOf(R"({"friends": [], "user": {}})"),
+              "$.user: expected at least one of \"emails\" and \"phones\"");
+}
+
 TEST_F(FriendsReaderTest, Errors_NameThePlace) {
     EXPECT_EQ(complaintOf("{}"), "$: expected a member \"friends\", or a scenario's \"snippet\"");
     EXPECT_EQ(complaintOf(R"({"friends": [{}]})"), "$.friends[0]: expected at least one of \"emails\" and \"phones\"");

@@ -35,6 +35,13 @@ class LocationServiceTest : public ::testing::Test {
                                                 fault, complaint);
         return given ? platform::writeJson(*given) : complaint;
     }
+    std::string command(const std::string& request, const Fault& fault = {}) const {
+        const auto read = linux_::JsonReader::read(request);
+        std::string complaint;
+        const auto given = service.showHideLocation(*std::get<platform::Value>(read).dictionary(),
+                                                    {0.0, 1700000000123.4}, fault, complaint);
+        return given ? platform::writeJson(*given) : complaint;
+    }
     LocationService service{people()};
 };
 
@@ -82,6 +89,74 @@ TEST_F(LocationServiceTest, WrongRequest_IsRefusedWithThePlace) {
     EXPECT_EQ(answer(R"({"clientContext": {}, "handles": [1]})"), "$.handles[0]: expected a string, found a number");
     EXPECT_EQ(answer(R"({"clientContext": {}, "myLocation": {"latitude": 1}})"),
               "$.myLocation: expected a latitude and a longitude in degrees");
+}
+
+TEST_F(LocationServiceTest, ShowingTheUser_AnswersWithTheUsersPlace) {
+    EXPECT_EQ(
+        command(
+            R"({"clientContext": {"location": {"latitude": 51.5003, "longitude": -2.5, "horizontalAccuracy": 8}}, "prefs": {"hideLocation": "No"}})"),
+        R"({"statusCode":200,"serverContext":{"minCallbackIntervalInMS":10000,"callbackTimeoutIntervalInMS":600000},)"
+        R"("myInfo":{"preferredEmail":"mara.lind@harbour.example","hidden":false,"location":{"latitude":51.5003,)"
+        R"("longitude":-2.5,"horizontalAccuracy":8,"timestamp":1700000000123,"streetAddress":"Quay",)"
+        R"("address":{"locality":"Bristol","stateCode":"ENG"},"labels":null}}})");
+}
+
+TEST_F(LocationServiceTest, PlaceFarFromEveryStreet_HasItsTownAlone) {
+    EXPECT_EQ(service.placeAt(51.51, -2.5).street, std::nullopt);
+    EXPECT_EQ(service.placeAt(51.51, -2.5).city, "Bristol");
+    EXPECT_EQ(service.placeAt(52.5, -2.5).city, std::nullopt);
+}
+
+TEST_F(LocationServiceTest, Hiding_IsKeptAndGivesNoPlaceAway) {
+    EXPECT_FALSE(service.sharing().now().hidden);
+    const std::string hidden = command(
+        R"({"clientContext": {"location": {"latitude": 51.5, "longitude": -2.5}}, "prefs": {"hideLocation": "Yes"}})");
+    EXPECT_NE(hidden.find(R"("hidden":true,"location":null)"), std::string::npos) << hidden;
+    EXPECT_TRUE(service.sharing().now().hidden);
+    // What was known before is shown again, also when the client knows no place now.
+    const std::string shown = command(
+        R"({"clientContext": {"location": {"latitude": 0, "longitude": 0, "source": "assistant"}}, "prefs": {"hideLocation": "No"}})");
+    EXPECT_NE(shown.find(R"("hidden":false,"location":{"latitude":51.5,)"), std::string::npos) << shown;
+    EXPECT_FALSE(service.sharing().now().hidden);
+}
+
+TEST_F(LocationServiceTest, ShowingWithoutAPlace_IsNoPlace) {
+    const std::string shown = command(R"({"clientContext": {}, "prefs": {"hideLocation": "No"}})");
+    EXPECT_NE(shown.find(R"("location":null)"), std::string::npos) << shown;
+}
+
+TEST_F(LocationServiceTest, UserKnownByPhone_HasNoPreferredAddress) {
+    FriendsFile file;
+    file.user = ServedFriend();
+    file.user.phones = {"+44 1632 960018"};
+    EXPECT_EQ(file.user.handle(), "+44 1632 960018");
+    LocationService other(file);
+    std::string complaint;
+    const auto answer = other.showHideLocation(
+        {{"clientContext", platform::Dictionary{}}, {"prefs", platform::Dictionary{{"hideLocation", "No"}}}}, {}, {},
+        complaint);
+    ASSERT_TRUE(answer.has_value()) << complaint;
+    EXPECT_EQ(answer->find("myInfo")->dictionary()->find("preferredEmail"), nullptr);
+}
+
+TEST_F(LocationServiceTest, FailingSharingCommand_ChangesNothing) {
+    Fault fault;
+    fault.status = 503;
+    command(R"({"clientContext": {}, "prefs": {"hideLocation": "Yes"}})", fault);
+    EXPECT_FALSE(service.sharing().now().hidden);
+}
+
+TEST_F(LocationServiceTest, WrongSharingCommand_IsRefusedWithThePlace) {
+    EXPECT_EQ(command(R"({"prefs": {"hideLocation": "No"}})"), "$.clientContext: expected an object, found nothing");
+    for (const char* request : {R"({"clientContext": {}})", R"({"clientContext": {}, "prefs": {}})",
+                                R"({"clientContext": {}, "prefs": {"hideLocation": "Maybe"}})"}) {
+        EXPECT_EQ(command(request), R"($.prefs: expected "hideLocation" to be "Yes" or "No")") << request;
+    }
+    EXPECT_EQ(command(R"({"clientContext": {}, "prefs": {"hideLocation": true}})"),
+              "$.prefs.hideLocation: expected a string, found a boolean");
+    EXPECT_EQ(command(R"({"clientContext": {"location": {"latitude": 1}}, "prefs": {"hideLocation": "No"}})"),
+              "$.clientContext.location: expected a latitude and a longitude in degrees");
+    EXPECT_FALSE(service.sharing().now().hidden);
 }
 
 }  // namespace ktr::test
