@@ -1,5 +1,6 @@
 #include "linux/maps/HttpsPictures.h"
 
+#include <QImageReader>
 #include <QMetaObject>
 #include <QNetworkAccessManager>
 #include <QNetworkReply>
@@ -39,15 +40,30 @@ constexpr int kOk = 200;
 constexpr int kNotModified = 304;
 constexpr int kNotFound = 404;
 constexpr int kGone = 410;
+constexpr int kTooMany = 429;
+constexpr int kUnavailable = 503;
 
 std::int64_t secondsNow() {
     return std::chrono::duration_cast<seconds>(std::chrono::system_clock::now().time_since_epoch()).count();
 }
 
-/// PNG, JPEG or WebP.
+/// WebP needs a plugin of Qt's that may not be there.
+bool readsWebp() {
+    static const bool reads = QImageReader::supportedImageFormats().contains("webp");
+    return reads;
+}
+
 bool isPicture(const QByteArray& data) {
     return data.startsWith("\x89PNG\r\n\x1a\n") || data.startsWith("\xff\xd8\xff") ||
-           (data.startsWith("RIFF") && data.mid(8, 4) == "WEBP");
+           (readsWebp() && data.startsWith("RIFF") && data.mid(8, 4) == "WEBP");
+}
+
+/// How long a server wants to be left alone (RFC 9110, section 10.2.3); it need not say, and is not asked to say it
+/// well.
+seconds retryAfter(const QByteArray& field) {
+    bool isNumber = false;
+    const int wanted = field.trimmed().toInt(&isNumber);
+    return isNumber ? std::clamp(seconds(wanted), kLeastPause, kPauseWhenGone) : kLeastPause;
 }
 
 QUrl addressOf(const std::string& pattern, const TileKey& key) {
@@ -110,7 +126,7 @@ class HttpsPictures::Fetcher : public QObject {
         request.setAttribute(QNetworkRequest::CookieSaveControlAttribute, QNetworkRequest::Manual);
         request.setAttribute(QNetworkRequest::AuthenticationReuseAttribute, QNetworkRequest::Manual);
         request.setRawHeader("User-Agent", "ktr/" KTR_VERSION);
-        request.setRawHeader("Accept", "image/png, image/jpeg, image/webp");
+        request.setRawHeader("Accept", readsWebp() ? "image/png, image/jpeg, image/webp" : "image/png, image/jpeg");
         request.setRawHeader("Accept-Encoding", "identity");
         // Qt would name the system's language.
         request.setRawHeader("Accept-Language", "*");
@@ -124,6 +140,11 @@ class HttpsPictures::Fetcher : public QObject {
     }
 
     void start(Wanted wanted) {
+        const auto now = std::chrono::steady_clock::now();
+        if (now < notBefore_) {
+            ended(wanted.key, std::chrono::ceil<seconds>(notBefore_ - now));
+            return;
+        }
         const QNetworkRequest request = requestFor(wanted);
         if (request.url().scheme() != QLatin1String("https")) {
             ended(wanted.key, kPauseWhenGone);
@@ -166,6 +187,9 @@ class HttpsPictures::Fetcher : public QObject {
             ended(wanted.key, kPauseWhenGone, true);
             gather();
             return;
+        }
+        if (status == kTooMany || status == kUnavailable) {
+            notBefore_ = std::chrono::steady_clock::now() + retryAfter(reply.rawHeader("Retry-After"));
         }
         const QByteArray data = reply.error() == QNetworkReply::NoError ? reply.readAll() : QByteArray();
         if (status != kOk || !isPicture(data)) {
@@ -239,6 +263,8 @@ class HttpsPictures::Fetcher : public QObject {
     std::deque<Wanted> waiting_;  ///< the latest first
     std::set<QNetworkReply*> underWay_;
     std::string reported_;
+    /// The server has asked to be left alone until then.
+    std::chrono::steady_clock::time_point notBefore_;
     bool isGathering_ = false;
     bool isStopped_ = false;
 };

@@ -5,6 +5,7 @@
 #include <cmath>
 #include <numbers>
 
+#include "linux/maps/MapStyle.h"
 #include "linux/ui/ImageDecoder.h"
 
 namespace ktr::linux_ {
@@ -23,6 +24,18 @@ constexpr std::array<double, 3> kBrightness = {0.2126, 0.7152, 0.0722};
 
 int toneOf(double value, double tone) {
     return static_cast<int>(std::lround(std::clamp(value, 0.0, 255.0) * tone));
+}
+
+/// What shows through a picture is land.
+QImage onLand(const QImage& picture) {
+    QImage whole(picture.size(), QImage::Format_RGB32);
+    if (whole.isNull()) {
+        return {};
+    }
+    whole.fill(MapStyle::of(false, false).land);
+    QPainter painter(&whole);
+    painter.drawImage(QRect(QPoint(), picture.size()), picture);
+    return whole;
 }
 
 }  // namespace
@@ -67,6 +80,9 @@ QImage PictureGround::read(const TileKey& key, bool isDark, bool isWanted, bool&
     QImage pixels;
     if (auto picture = ImageDecoder::decode(*answer.data, kLargestSide)) {
         pixels = std::move(picture->pixels);
+        if (pixels.hasAlphaChannel()) {
+            pixels = onLand(pixels);
+        }
         if (isDark) {
             darken(pixels);
         } else {
@@ -85,7 +101,8 @@ QImage PictureGround::read(const TileKey& key, bool isDark, bool isWanted, bool&
 std::optional<PictureGround::Found> PictureGround::find(const TileKey& key, bool isDark, bool& isComing) {
     for (int level = key.z; level >= pictures_->coarsest(); --level) {
         const TileKey parent = key.parent(level);
-        const QImage pixels = read(parent, isDark, level == key.z, isComing);
+        // A coarser tile is fetched only where there is no finer one.
+        const QImage pixels = read(parent, isDark, !isComing, isComing);
         if (!pixels.isNull()) {
             const double parts = std::exp2(key.z - level);
             const double width = pixels.width() / parts;

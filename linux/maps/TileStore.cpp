@@ -84,10 +84,14 @@ std::optional<TileStore::Entry> TileStore::load(const TileKey& key) {
     if (!stream.is_open()) {
         return std::nullopt;
     }
-    std::string text(kLargestTile + kLongestHead, '\0');
+    std::error_code ignored;
+    const auto size = fs::file_size(file, ignored);
+    if (ignored || size > kLargestTile + kLongestHead) {
+        return std::nullopt;
+    }
+    std::string text(static_cast<std::size_t>(size), '\0');
     stream.read(text.data(), static_cast<std::streamsize>(text.size()));
     text.resize(static_cast<std::size_t>(stream.gcount()));
-    std::error_code ignored;
     const auto now = fs::file_time_type::clock::now();
     if (now - fs::last_write_time(file, ignored) > kTouch) {
         fs::last_write_time(file, now, ignored);

@@ -430,6 +430,8 @@ VectorTileDecoder::VectorTileDecoder(std::string_view language) {
         tag.resize(dash == std::string::npos ? 0 : dash);
     }
     nameKeys_.emplace_back("name");
+    // Makers of tiles who settled on one language keep it, and the place's own, beside an empty name.
+    nameKeys_.emplace_back("name:latin");
     nameKeys_.emplace_back("name_int");
 }
 

@@ -160,6 +160,35 @@ TEST_F(TilesTest, MissingTiles_AreNotAskedForAgain) {
     EXPECT_EQ(server->requests().size(), 1U);
 }
 
+TEST_F(TilesTest, AServerThatIsBusy_IsLeftAlone) {
+    std::atomic<int> answers = 0;
+    serve([&](QSslSocket& socket, const TestServer::Request&) {
+        answerWith(socket, 429, "Retry-After: 120\r\n", "");
+        ++answers;
+    });
+    open();
+    EXPECT_TRUE(pictures->tile(kTile, true).isComing);
+    const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(30);
+    while (log->texts().empty() && std::chrono::steady_clock::now() < deadline) {
+        std::this_thread::yield();
+    }
+    ASSERT_EQ(log->texts().size(), 1U);
+    EXPECT_NE(log->texts()[0].find("the server answered 429"), std::string::npos);
+    // Other tiles wait as well; another ground's request shows that the server has heard nothing since.
+    for (int y = 0; y < 8; ++y) {
+        pictures->tile({6, 1, y}, true);
+    }
+    auto others = tileSettings();
+    others.cacheFolder = folder.path() / "others";
+    HttpsPictures second(others);
+    second.tile(kTile, true);
+    while (answers < 2 && std::chrono::steady_clock::now() < deadline) {
+        std::this_thread::yield();
+    }
+    pictures.reset();
+    EXPECT_EQ(server->requests().size(), 2U);
+}
+
 TEST_F(TilesTest, Redirects_AreNotFollowed) {
     TestServer other(tls(), gladly());
     serve(answering(302, "Location: " + other.url("/5/10/11.png") + "\r\n", ""));

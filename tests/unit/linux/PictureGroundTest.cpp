@@ -4,9 +4,11 @@
 #include <QFile>
 #include <QTemporaryDir>
 #include <cmath>
+#include <map>
 
 #include "linux/maps/AttributedGround.h"
 #include "linux/maps/MapDrawer.h"
+#include "linux/maps/MapStyle.h"
 #include "linux/maps/MbtilesPictures.h"
 #include "tests/support/PlatformTest.h"
 #include "tests/unit/linux/maps/MbtilesWriter.h"
@@ -28,7 +30,7 @@ std::string png(const QImage& image) {
 }
 
 std::string plain(const QColor& color, int side = 256) {
-    QImage image(side, side, QImage::Format_RGB32);
+    QImage image(side, side, color.alpha() == 255 ? QImage::Format_RGB32 : QImage::Format_ARGB32);
     image.fill(color);
     return png(image);
 }
@@ -109,6 +111,48 @@ TEST_F(PictureGroundTest, AMissingTile_IsFilledFromItsParent) {
     auto east = kMiddle;
     ++east.x;
     EXPECT_EQ(draw(request(east)).pixels.pixelColor(128, 128), QColor(Qt::blue));
+}
+
+/// Pictures that are at hand, and which were wanted.
+class ListedPictures final : public TilePictures {
+  public:
+    std::map<TileKey, Answer> answers;
+    std::vector<TileKey> wanted;
+
+    bool open() override { return true; }
+    int coarsest() const override { return 0; }
+    int finest() const override { return 19; }
+    std::string attribution() const override { return "Listed"; }
+    Answer tile(const TileKey& key, bool isWanted) override {
+        if (isWanted) {
+            wanted.push_back(key);
+        }
+        const auto found = answers.find(key);
+        return found == answers.end() ? Answer{} : found->second;
+    }
+};
+
+TEST_F(PictureGroundTest, ACoarserTile_IsFetchedOnlyWhereThereIsNoFinerOne) {
+    auto owned = std::make_unique<ListedPictures>();
+    ListedPictures& pictures = *owned;
+    ground = std::make_shared<PictureGround>(std::move(owned));
+    pictures.answers[kMiddle] = {std::nullopt, true, 0};
+    EXPECT_FALSE(draw().isComplete);
+    EXPECT_EQ(pictures.wanted, std::vector({kMiddle}));
+    // The server has none: the coarser one is worth fetching, and those above it are not while it comes.
+    pictures.wanted.clear();
+    pictures.answers[kMiddle] = {};
+    pictures.answers[kMiddle.parent(9)] = {std::nullopt, true, 0};
+    EXPECT_FALSE(draw().isComplete);
+    EXPECT_EQ(pictures.wanted, std::vector({kMiddle, kMiddle.parent(9)}));
+}
+
+TEST_F(PictureGroundTest, WhatShowsThrough_IsLand) {
+    write({{kMiddle, plain(Qt::transparent)}});
+    EXPECT_EQ(draw().pixels.pixelColor(128, 128), QColor(MapStyle::of(false, false).land));
+    auto dark = request();
+    dark.isDark = true;
+    EXPECT_LT(draw(dark).pixels.pixelColor(128, 128).lightness(), 40);
 }
 
 TEST_F(PictureGroundTest, WhereThereIsNothing_TheNextGroundDraws) {

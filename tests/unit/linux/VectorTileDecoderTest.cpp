@@ -183,6 +183,20 @@ TEST(VectorTileDecoderTest, Name_IsInTheLanguageAskedFor) {
     EXPECT_EQ(named("ar"), "Wien");
 }
 
+TEST(VectorTileDecoderTest, TilesMadeForOneLanguage_HaveNamesToo) {
+    const auto named = [](const LayerWriter::Tags& names, const std::string& language) {
+        LayerWriter::Tags tags = {{"class", "city"}};
+        tags.insert(tags.end(), names.begin(), names.end());
+        return nameOf(*decode({LayerWriter("place").point({{1, 1}}, tags), LayerWriter("transportation")}, language),
+                      MapKind::Place);
+    };
+    EXPECT_EQ(named({{"name:latin", "Wien"}}, "en"), "Wien");
+    EXPECT_EQ(named({{"name:latin", "Vienna"}, {"name_int", "Wien"}}, "en"), "Vienna");
+    EXPECT_EQ(named({{"name_int", "Wien"}}, "en"), "Wien");
+    EXPECT_EQ(named({{"name:latin", "Wien"}, {"name:hu", "Bécs"}}, "hu"), "Bécs");
+    EXPECT_EQ(named({{"name", "Київ"}, {"name:latin", "Kyiv"}}, "uk"), "Київ");
+}
+
 TEST(VectorTileDecoderTest, NameBeyondItsCap_OrNoUtf8_IsNone) {
     const auto named = [](const std::string& name) {
         return nameOf(*decode({LayerWriter("streets").line(kLine, {{"kind", "residential"}, {"name", name}})}),
