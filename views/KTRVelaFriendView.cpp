@@ -133,22 +133,24 @@ void KTRVelaFriendView::setupLabels() {
 void KTRVelaFriendView::setupConstraints() {
     const auto installed = Platform::installed();
     const double scale = installed && installed->device ? installed->device->mainScreenScale() : 1.0;
-    const platform::VisualFormatMetrics metrics = {{"margin", 15.0}, {"vmargin", 10.0},       {"hs", 13.0},
-                                                   {"vs", 0.0},      {"pd", kAvatarDiameter}, {"ld", 16.0},
-                                                   {"lm", 82.0},     {"st", 1.0 / scale}};
+    // The same for all rows but for the scale.
+    static platform::VisualFormatMetrics metrics = {
+        {"margin", 15.0},        {"vmargin", 10.0}, {"hs", 13.0}, {"vs", 0.0},
+        {"pd", kAvatarDiameter}, {"ld", 16.0},      {"lm", 82.0}, {"st", 1.0}};
+    metrics["st"] = 1.0 / scale;
     const platform::VisualFormatViews views = {{"nameLabel", nameLabel_},           {"locationLabel", locationLabel_},
                                                {"timeLabel", timeLabel_},           {"distanceLabel", distanceLabel_},
                                                {"friendIconView", friendIconView_}, {"separatorView", separatorView_}};
-    const auto add = [&](const char* format, const platform::VisualFormatOptions& options = {}) {
-        addConstraints(platform::VisualFormat::constraintsWithVisualFormat(format, options, metrics, views));
+    const platform::VisualFormat::Picture pictures[] = {
+        {"H:|-margin-[friendIconView(pd)]", {}},
+        {"H:|-lm-[locationLabel]-margin-|", {}},
+        {"H:|-lm-[nameLabel]-hs-[distanceLabel]-margin-|", {platform::VisualFormatAlignment::LastBaseline}},
+        {"H:|-lm-[timeLabel]-margin-|", {}},
+        {"H:|-0-[separatorView]-0-|", {}},
+        {"V:|-vmargin-[friendIconView(pd)]-(>=vmargin)-|", {}},
+        {"V:|-vmargin-[locationLabel]-vs-[nameLabel]-vs-[timeLabel]-(>=vmargin)-[separatorView(st)]-0-|", {}},
     };
-    add("H:|-margin-[friendIconView(pd)]");
-    add("H:|-lm-[locationLabel]-margin-|");
-    add("H:|-lm-[nameLabel]-hs-[distanceLabel]-margin-|", {platform::VisualFormatAlignment::LastBaseline});
-    add("H:|-lm-[timeLabel]-margin-|");
-    add("H:|-0-[separatorView]-0-|");
-    add("V:|-vmargin-[friendIconView(pd)]-(>=vmargin)-|");
-    add("V:|-vmargin-[locationLabel]-vs-[nameLabel]-vs-[timeLabel]-(>=vmargin)-[separatorView(st)]-0-|");
+    platform::VisualFormat::addConstraints(*this, pictures, metrics, views);
 }
 
 void KTRVelaFriendView::setLocation(std::shared_ptr<KTRVALocation> location) {

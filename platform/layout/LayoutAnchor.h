@@ -4,27 +4,24 @@
 
 #include "platform/base/Api.h"
 #include "platform/layout/LayoutTypes.h"
+#include "platform/ui/ViewReference.h"
 
 namespace ktr::platform {
 
 class LayoutConstraint;
 class View;
 
-/// An edge, extent, centre or baseline of a view, to make constraints from. A value; holds its view weakly. Main
+/// An edge, extent, centre or baseline of a view, to make constraints from. A value; does not own its view. Main
 /// thread.
 class KTR_API LayoutAnchor {
   public:
     LayoutAnchor() = default;
-    LayoutAnchor(std::weak_ptr<View> view, LayoutAttribute attribute) : view_(std::move(view)), attribute_(attribute) {}
+    LayoutAnchor(ViewReference view, LayoutAttribute attribute) : view_(std::move(view)), attribute_(attribute) {}
 
-    std::shared_ptr<View> view() const { return view_.lock(); }
-    /// Whether there is no view, or no longer.
-    bool hasLostView() const { return view_.expired(); }
+    /// None when there is no view, or no longer.
+    std::shared_ptr<View> view() const;
+    const ViewReference& reference() const { return view_; }
     LayoutAttribute attribute() const { return attribute_; }
-    /// Whether both are about one view (or none).
-    bool isSameView(const LayoutAnchor& other) const {
-        return !view_.owner_before(other.view_) && !other.view_.owner_before(view_);
-    }
 
     /// Constraints of priority 1000, not yet active. Constants in points.
     std::shared_ptr<LayoutConstraint> constraintEqualTo(const LayoutAnchor& other, double constant = 0.0) const;
@@ -35,7 +32,7 @@ class KTR_API LayoutAnchor {
     std::shared_ptr<LayoutConstraint> constraintEqualToConstant(double constant) const;
 
   private:
-    std::weak_ptr<View> view_;
+    ViewReference view_;
     LayoutAttribute attribute_ = LayoutAttribute::None;
 };
 

@@ -9,22 +9,6 @@ namespace ktr::platform {
 
 namespace {
 
-bool isSameView(const LayoutAnchor& a, const LayoutAnchor& b) {
-    return a.attribute() == b.attribute() && a.isSameView(b);
-}
-
-std::shared_ptr<View> commonAncestor(const std::shared_ptr<View>& first, const std::shared_ptr<View>& second) {
-    if (!second) {
-        return first;
-    }
-    for (auto view = first; view; view = view->superview()) {
-        if (second->isDescendantOf(*view)) {
-            return view;
-        }
-    }
-    return nullptr;
-}
-
 const char* nameOf(LayoutAttribute attribute) {
     switch (attribute) {
         case LayoutAttribute::None:
@@ -65,57 +49,56 @@ std::string number(double value) {
 
 }  // namespace
 
-LayoutConstraint::LayoutConstraint(LayoutAnchor first, LayoutRelation relation, LayoutAnchor second, double multiplier,
-                                   double constant, double priority)
-    : first_(std::move(first)),
-      second_(std::move(second)),
-      relation_(relation),
-      multiplier_(multiplier),
-      constant_(constant),
-      priority_(priority) {}
+LayoutConstraint::LayoutConstraint(const LayoutAnchor& first, LayoutRelation relation, const LayoutAnchor& second,
+                                   double multiplier, double constant, double priority)
+    : LayoutConstraint(
+          ConstraintRule{first.reference(),
+                         second.reference(),
+                         {first.attribute(), second.attribute(), relation, multiplier, constant, priority}}) {}
+
+LayoutConstraint::LayoutConstraint(ConstraintRule rule) : rule_(std::move(rule)) {}
+
+LayoutConstraint::~LayoutConstraint() {
+    if (View* const owner = owner_.get()) {
+        owner->forget(*this);
+    }
+}
 
 void LayoutConstraint::setActive(bool active) {
-    const auto self = strong(this);
-    if (const auto owner = owner_.lock()) {
+    if (isActive()) {
         if (!active) {
-            owner->removeConstraint(self);
+            owner_.get()->removeConstraint(strong(this));
         }
         return;
     }
     if (!active) {
         return;
     }
-    const auto holder = commonAncestor(first_.view(), second_.view());
-    const bool hasLostView = second_.attribute() != LayoutAttribute::None && !second_.view();
-    if (!holder || hasLostView) {
+    View* const holder = rule_.holder();
+    if (!holder) {
         platformLog().write(LogLevel::Debug, "A constraint whose views have no common ancestor is not activated: %@",
                             FormatArgument(description()).shown());
         return;
     }
-    holder->addConstraint(self);
+    holder->addConstraint(strong(this));
 }
 
-bool LayoutConstraint::isEqualTo(const LayoutConstraint& other) const {
-    return this == &other ||
-           (constant_ == other.constant_ && relation_ == other.relation_ && multiplier_ == other.multiplier_ &&
-            priority_ == other.priority_ && isSameView(first_, other.first_) && isSameView(second_, other.second_));
-}
-
-bool LayoutConstraint::isOrphaned() const {
-    return first_.hasLostView() || (second_.attribute() != LayoutAttribute::None && second_.hasLostView());
+bool LayoutConstraint::isActive() const {
+    const View* const owner = owner_.get();
+    return owner && owner->holds(rule_);
 }
 
 std::string LayoutConstraint::description() const {
-    std::string text = std::string("first.") + nameOf(first_.attribute());
-    text += relation_ == LayoutRelation::Equal ? " = " : relation_ == LayoutRelation::LessOrEqual ? " <= " : " >= ";
-    if (second_.attribute() != LayoutAttribute::None) {
-        text += multiplier_ == 1.0 ? "" : number(multiplier_) + "*";
-        text += std::string("second.") + nameOf(second_.attribute());
-        text += constant_ < 0.0 ? " - " + number(-constant_) : " + " + number(constant_);
+    std::string text = std::string("first.") + nameOf(rule_.terms.first);
+    text += relation() == LayoutRelation::Equal ? " = " : relation() == LayoutRelation::LessOrEqual ? " <= " : " >= ";
+    if (rule_.terms.second != LayoutAttribute::None) {
+        text += multiplier() == 1.0 ? "" : number(multiplier()) + "*";
+        text += std::string("second.") + nameOf(rule_.terms.second);
+        text += constant() < 0.0 ? " - " + number(-constant()) : " + " + number(constant());
     } else {
-        text += number(constant_);
+        text += number(constant());
     }
-    return text + " @" + number(priority_);
+    return text + " @" + number(priority());
 }
 
 }  // namespace ktr::platform

@@ -4,6 +4,7 @@
 
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/base/Platform.h"
+#include "platform/layout/LayoutConstraint.h"
 #include "platform/layout/LayoutStructure.h"
 
 namespace ktr::platform {
@@ -21,50 +22,87 @@ bool interfaceIsRightToLeft() {
 
 }  // namespace
 
-bool LayoutScope::add(const std::shared_ptr<LayoutConstraint>& constraint) {
-    const bool isHeld = std::any_of(constraints_.begin(), constraints_.end(),
-                                    [&](const auto& held) { return held->isEqualTo(*constraint); });
-    if (isHeld) {
-        return false;
-    }
-    constraints_.push_back(constraint);
-    arrangesSubviews_ = arrangesSubviews_ || isAboutOthers(*constraint);
-    constraintsChanged();
-    return true;
+std::vector<ConstraintRule> LayoutScope::rules() const {
+    return rules_.empty() && equations_.holdsRules() ? equations_.rules(owner_) : rules_;
 }
 
-bool LayoutScope::remove(const LayoutConstraint& constraint) {
-    const auto found = std::find_if(constraints_.begin(), constraints_.end(),
-                                    [&](const auto& held) { return held->isEqualTo(constraint); });
-    if (found == constraints_.end()) {
-        return false;
-    }
-    constraints_.erase(found);
-    arrangesSubviews_ = std::any_of(constraints_.begin(), constraints_.end(),
-                                    [this](const auto& held) { return isAboutOthers(*held); });
-    constraintsChanged();
-    return true;
-}
-
-/// Whether a constraint mentions another view than the owner.
-bool LayoutScope::isAboutOthers(const LayoutConstraint& constraint) const {
-    const auto first = constraint.first().view();
-    const auto second = constraint.second().view();
-    return (first && first.get() != &owner_) || (second && second.get() != &owner_);
-}
-
-void LayoutScope::constraintsChanged() {
-    ++revision_;
+void LayoutScope::setRules(std::vector<ConstraintRule> rules) {
+    rules_ = std::move(rules);
     structure_.reset();
+    equations_ = LayoutEquations();
+    ++revision_;
     inputChanged(owner_);
+}
+
+void LayoutScope::add(std::span<const ConstraintRule> rules) {
+    std::vector<ConstraintRule> held = this->rules();
+    const std::size_t before = held.size();
+    held.reserve(before + rules.size());
+    for (const ConstraintRule& rule : rules) {
+        if (std::find(held.begin(), held.end(), rule) == held.end()) {
+            held.push_back(rule);
+            arrangesSubviews_ = arrangesSubviews_ || isAboutOthers(rule);
+        }
+    }
+    if (held.size() > before) {
+        setRules(std::move(held));
+    }
+}
+
+void LayoutScope::remove(const ConstraintRule& rule) {
+    std::vector<ConstraintRule> held = rules();
+    const auto found = std::find(held.begin(), held.end(), rule);
+    if (found == held.end()) {
+        return;
+    }
+    held.erase(found);
+    std::erase_if(remembered_, [&rule](LayoutConstraint* constraint) {
+        const bool isRemoved = constraint->rule() == rule;
+        if (isRemoved) {
+            constraint->owner_ = ViewReference();
+        }
+        return isRemoved;
+    });
+    arrangesSubviews_ =
+        std::any_of(held.begin(), held.end(), [this](const auto& other) { return isAboutOthers(other); });
+    setRules(std::move(held));
+}
+
+bool LayoutScope::holds(const ConstraintRule& rule) const {
+    const auto held = rules();
+    return std::find(held.begin(), held.end(), rule) != held.end();
+}
+
+void LayoutScope::remember(LayoutConstraint& constraint) {
+    remembered_.push_back(&constraint);
+}
+
+void LayoutScope::forget(const LayoutConstraint& constraint) {
+    std::erase(remembered_, &constraint);
+    if (remembered_.empty()) {
+        remembered_.shrink_to_fit();
+    }
+}
+
+LayoutConstraint* LayoutScope::remembered(const ConstraintRule& rule) const {
+    const auto found = std::find_if(remembered_.begin(), remembered_.end(),
+                                    [&rule](const LayoutConstraint* known) { return known->rule() == rule; });
+    return found == remembered_.end() ? nullptr : *found;
+}
+
+/// Whether a rule mentions another view than the owner.
+bool LayoutScope::isAboutOthers(const ConstraintRule& rule) const {
+    const View* const first = rule.first.get();
+    const View* const second = rule.second.get();
+    return (first && first != &owner_) || (second && second != &owner_);
 }
 
 unsigned LayoutScope::revisionOf(const View& view) {
     return view.scope_ ? view.scope_->revision_ : 0;
 }
 
-std::span<const std::shared_ptr<LayoutConstraint>> LayoutScope::constraintsOf(const View& view) {
-    return view.scope_ ? std::span(view.scope_->constraints_) : std::span<const std::shared_ptr<LayoutConstraint>>();
+std::vector<ConstraintRule> LayoutScope::rulesOf(const View& view) {
+    return view.scope_ ? view.scope_->rules() : std::vector<ConstraintRule>();
 }
 
 bool LayoutScope::arrangesSubviews(const View& view) {
@@ -98,13 +136,17 @@ void LayoutScope::prepare() {
     }
     isFresh_ = true;
     if (structure_ && equations_.isCurrent(owner_, rightToLeft)) {
-        if (!equations_.readInputs()) {
+        if (!equations_.readInputs(owner_)) {
             return;
         }
     } else {
-        std::erase_if(constraints_, [](const auto& constraint) { return constraint->isOrphaned(); });
-        constraints_.shrink_to_fit();
-        structure_ = equations_.build(owner_, constraints_, rightToLeft);
+        rules_ = rules();
+        std::erase_if(rules_, [](const ConstraintRule& rule) { return rule.isOrphaned(); });
+        structure_ = equations_.build(owner_, rules_, rightToLeft);
+        if (equations_.holdsRules()) {
+            rules_ = {};
+        }
+        rules_.shrink_to_fit();
     }
     isDirty_ = true;
     fittings_.clear();
@@ -112,9 +154,9 @@ void LayoutScope::prepare() {
 
 const std::vector<double>& LayoutScope::solved(Size target, double horizontalLevel, double verticalLevel) {
     ++solves_;
-    const auto* values = &structure_->solved(equations_.constants(), target, horizontalLevel, verticalLevel);
-    for (int round = 1; round < kRounds && equations_.readHeightsFor(*values); ++round) {
-        values = &structure_->solved(equations_.constants(), target, horizontalLevel, verticalLevel);
+    const auto* values = &structure_->solved(equations_.inputs(), target, horizontalLevel, verticalLevel);
+    for (int round = 1; round < kRounds && equations_.readHeightsFor(owner_, *values); ++round) {
+        values = &structure_->solved(equations_.inputs(), target, horizontalLevel, verticalLevel);
     }
     return *values;
 }
@@ -131,11 +173,13 @@ void LayoutScope::layout() {
 }
 
 void LayoutScope::apply(const std::vector<double>& values) const {
-    for (const LayoutEquations::Participant& participant : equations_.participants()) {
-        const auto view = participant.view.lock();
-        if (view && !participant.isFixed) {
-            view->setFrame({values[participant.x()], values[participant.y()], std::max(0.0, values[participant.width]),
-                            std::max(0.0, values[participant.height()])});
+    const auto& participants = equations_.participants();
+    for (std::size_t i = 0; i < participants.size(); ++i) {
+        View* const view = participants[i].view.get();
+        if (view && !equations_.isFixed(i)) {
+            const VariableId first = LayoutPlan::variableOf(static_cast<int>(i));
+            view->setFrame(
+                {values[first + 2], values[first + 3], std::max(0.0, values[first]), std::max(0.0, values[first + 1])});
         }
     }
 }
@@ -151,8 +195,7 @@ Size LayoutScope::fittingSize(Size target, double horizontalPriority, double ver
     const double horizontalLevel = std::clamp(horizontalPriority, 1.0, kRequiredPriority);
     const double verticalLevel = std::clamp(verticalPriority, 1.0, kRequiredPriority);
     const std::vector<double>& values = solved(target, horizontalLevel, verticalLevel);
-    const Size size = {std::max(0.0, values[LayoutEquations::kOwnerWidth]),
-                       std::max(0.0, values[LayoutEquations::kOwnerHeight])};
+    const Size size = {std::max(0.0, values[LayoutPlan::kOwnerWidth]), std::max(0.0, values[LayoutPlan::kOwnerHeight])};
     if (fittings_.size() == kRememberedFittings) {
         fittings_.erase(fittings_.begin());
     }
@@ -163,7 +206,7 @@ Size LayoutScope::fittingSize(Size target, double horizontalPriority, double ver
 std::string LayoutScope::dump() {
     prepare();
     solved(owner_.frame().size(), Solver::kInput, Solver::kInput);
-    return structure_->dump(equations_.constants(), owner_.frame().size());
+    return structure_->dump(equations_.inputs(), owner_.frame().size());
 }
 
 }  // namespace ktr::platform

@@ -18,11 +18,17 @@ class KTR_API LayoutScope {
   public:
     explicit LayoutScope(View& owner) : owner_(owner) {}
 
-    /// False when an equal constraint is held already.
-    bool add(const std::shared_ptr<LayoutConstraint>& constraint);
-    /// Removes the constraint, or one that equals it; false when there is none.
-    bool remove(const LayoutConstraint& constraint);
-    const std::vector<std::shared_ptr<LayoutConstraint>>& constraints() const { return constraints_; }
+    /// Adds those that are not held already.
+    void add(std::span<const ConstraintRule> rules);
+    /// Removes the rule that equals this one, if there is one.
+    void remove(const ConstraintRule& rule);
+    bool holds(const ConstraintRule& rule) const;
+    /// In order of adding.
+    std::vector<ConstraintRule> rules() const;
+    /// Constraints that said what is held here, as long as somebody has them: the same rule is the same object.
+    void remember(LayoutConstraint& constraint);
+    void forget(const LayoutConstraint& constraint);
+    LayoutConstraint* remembered(const ConstraintRule& rule) const;
 
     /// Places the views that constraints mention, for the owner's present size.
     void layout();
@@ -41,7 +47,7 @@ class KTR_API LayoutScope {
     static void inputChanged(View& view);
     /// Grows whenever the constraints that a view holds change; 0 for a view that never held one.
     static unsigned revisionOf(const View& view);
-    static std::span<const std::shared_ptr<LayoutConstraint>> constraintsOf(const View& view);
+    static std::vector<ConstraintRule> rulesOf(const View& view);
     /// Whether a view holds constraints about views below it.
     static bool arrangesSubviews(const View& view);
 
@@ -52,14 +58,16 @@ class KTR_API LayoutScope {
         double verticalPriority = 0.0;
         Size size;
     };
-    void constraintsChanged();
-    bool isAboutOthers(const LayoutConstraint& constraint) const;
+    bool isAboutOthers(const ConstraintRule& rule) const;
+    void setRules(std::vector<ConstraintRule> rules);
     void prepare();
     const std::vector<double>& solved(Size target, double horizontalLevel, double verticalLevel);
     void apply(const std::vector<double>& values) const;
 
     View& owner_;
-    std::vector<std::shared_ptr<LayoutConstraint>> constraints_;
+    /// Empty while the equations hold them: rows of one class share what their rules say.
+    std::vector<ConstraintRule> rules_;
+    std::vector<LayoutConstraint*> remembered_;
     LayoutEquations equations_;
     std::shared_ptr<LayoutStructure> structure_;  // none: to be built
     std::vector<Fitting> fittings_;               // what was asked since an input changed

@@ -1,13 +1,13 @@
 #pragma once
 
 #include <cstdint>
-#include <functional>
 #include <memory>
 #include <string>
 #include <unordered_map>
 #include <vector>
 
-#include "platform/layout/LayoutEquations.h"
+#include "platform/base/Geometry.h"
+#include "platform/layout/LayoutPlan.h"
 #include "platform/layout/SolvedForm.h"
 #include "platform/layout/Solver.h"
 
@@ -19,15 +19,15 @@ namespace ktr::platform {
 /// (SolvedForm): for inputs that one of them holds for, the solver is not asked at all.
 class LayoutStructure {
   public:
-    explicit LayoutStructure(std::shared_ptr<const LayoutEquations::Plan> plan) : plan_(std::move(plan)) {}
+    explicit LayoutStructure(LayoutShape shape);
 
-    const std::shared_ptr<const LayoutEquations::Plan>& plan() const { return plan_; }
-    /// The values of the variables for these constants, the owner's size being wished at these levels (Solver::kInput
+    const std::shared_ptr<const LayoutPlan>& plan() const { return plan_; }
+    /// The values of the variables for these inputs, the owner's size being wished at these levels (Solver::kInput
     /// for a size that is assigned). Valid until the next call.
-    const std::vector<double>& solved(const std::vector<double>& constants, Size target, double horizontalLevel,
+    const std::vector<double>& solved(const std::vector<double>& inputs, Size target, double horizontalLevel,
                                       double verticalLevel);
-    /// The solver's dump for these constants and an assigned size.
-    std::string dump(const std::vector<double>& constants, Size size);
+    /// The solver's dump for these inputs and an assigned size.
+    std::string dump(const std::vector<double>& inputs, Size size);
 
   private:
     struct Configuration {
@@ -38,28 +38,25 @@ class LayoutStructure {
         std::vector<SolvedForm> forms;
     };
     Configuration& configuration(double horizontalLevel, double verticalLevel);
+    void take(const std::vector<double>& inputs, Size target);
     void load(Solver& solver) const;
 
-    std::shared_ptr<const LayoutEquations::Plan> plan_;
+    std::shared_ptr<const LayoutPlan> plan_;
     std::vector<Configuration> configurations_;
     std::vector<double> constants_;  // the target's two, then the equations'
     std::vector<double> values_;
 };
 
-/// Finds the structure of a plan. One for each installed platform. Main thread.
+/// Finds the structure of a shape. One for each installed platform. Main thread.
 class LayoutStructures {
   public:
     static std::shared_ptr<LayoutStructures> makeShared() { return std::make_shared<LayoutStructures>(); }
-    using MakePlan = std::function<std::shared_ptr<const LayoutEquations::Plan>()>;
-    /// Never none; without an installed platform a structure of its own. The plan is made when the signature is new.
-    static std::shared_ptr<LayoutStructure> find(std::vector<double> signature, const MakePlan& makePlan);
+    /// Never none; without an installed platform a structure of its own.
+    static std::shared_ptr<LayoutStructure> find(LayoutShape shape);
 
   private:
-    struct Entry {
-        std::vector<double> signature;
-        std::weak_ptr<LayoutStructure> structure;
-    };
-    std::unordered_multimap<std::uint64_t, Entry> entries_;
+    /// By the shape's hash.
+    std::unordered_multimap<std::uint64_t, std::weak_ptr<LayoutStructure>> entries_;
     std::size_t sweepAt_ = 64;
 };
 

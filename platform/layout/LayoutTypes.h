@@ -4,7 +4,7 @@
 
 namespace ktr::platform {
 
-enum class LayoutAttribute {
+enum class LayoutAttribute : unsigned char {
     None,
     Left,
     Right,
@@ -20,7 +20,7 @@ enum class LayoutAttribute {
     LastBaseline
 };
 
-enum class LayoutRelation { LessOrEqual, Equal, GreaterOrEqual };
+enum class LayoutRelation : unsigned char { LessOrEqual, Equal, GreaterOrEqual };
 
 enum class LayoutAxis { Horizontal, Vertical };
 

@@ -1,6 +1,7 @@
 #include "platform/layout/VisualFormat.h"
 
 #include <cmath>
+#include <iterator>
 
 #include "platform/base/Log.h"
 #include "platform/base/Platform.h"
@@ -41,18 +42,20 @@ class Builder {
         setEdges();
     }
 
-    VisualFormatResult build() {
+    /// None when there is an error.
+    std::vector<ConstraintRule> build() {
         if (!findViews() || !addItems() || !addAlignments()) {
-            result_.constraints.clear();
+            rules_.clear();
         }
-        return std::move(result_);
+        return std::move(rules_);
     }
+    const std::optional<VisualFormatError>& error() const { return error_; }
 
   private:
     bool isHorizontal() const { return syntax_.axis == LayoutAxis::Horizontal; }
 
     bool fail(std::size_t offset, std::string expected) {
-        result_.error = VisualFormatParser::errorAt(text_, offset, std::move(expected));
+        error_ = VisualFormatParser::errorAt(text_, offset, std::move(expected));
         return false;
     }
 
@@ -121,8 +124,7 @@ class Builder {
         }
         if (!connection || connection->empty()) {
             const double standard = isToSuperview ? VisualFormat::kSpaceToSuperview : VisualFormat::kSpaceBetweenViews;
-            add(std::move(second), LayoutRelation::Equal, std::move(first), connection ? standard : 0.0,
-                kRequiredPriority);
+            add(second, LayoutRelation::Equal, first, connection ? standard : 0.0, kRequiredPriority);
             return true;
         }
         for (const Syntax::Predicate& predicate : *connection) {
@@ -137,7 +139,7 @@ class Builder {
     }
 
     static LayoutAnchor turned(const LayoutAnchor& anchor) {
-        return {anchor.view(),
+        return {anchor.reference(),
                 anchor.attribute() == LayoutAttribute::Left ? LayoutAttribute::Right : LayoutAttribute::Left};
     }
 
@@ -161,8 +163,8 @@ class Builder {
             if (!readNumber(predicate.object, size)) {
                 return false;
             }
-            result_.constraints.push_back(std::make_shared<LayoutConstraint>(view.anchor(extent), predicate.relation,
-                                                                             LayoutAnchor(), 0.0, size, priority));
+            rules_.push_back(
+                {ViewReference(view), {}, {extent, LayoutAttribute::None, predicate.relation, 0.0, size, priority}});
         }
         return true;
     }
@@ -209,9 +211,11 @@ class Builder {
                                                              fail(offset, "expected a priority from 1 to 1000"));
     }
 
-    void add(LayoutAnchor first, LayoutRelation relation, LayoutAnchor second, double constant, double priority) {
-        result_.constraints.push_back(
-            std::make_shared<LayoutConstraint>(std::move(first), relation, std::move(second), 1.0, constant, priority));
+    void add(const LayoutAnchor& first, LayoutRelation relation, const LayoutAnchor& second, double constant,
+             double priority) {
+        rules_.push_back({first.reference(),
+                          second.reference(),
+                          {first.attribute(), second.attribute(), relation, 1.0, constant, priority}});
     }
 
     std::string_view text_;
@@ -223,7 +227,8 @@ class Builder {
     LayoutAttribute far_ = LayoutAttribute::Trailing;
     bool isBackwards_ = false;
     std::vector<std::shared_ptr<View>> items_;
-    VisualFormatResult result_;
+    std::vector<ConstraintRule> rules_;
+    std::optional<VisualFormatError> error_;
 };
 
 /// The formats of programs, taken apart once. One for each installed platform. Main thread.
@@ -275,13 +280,36 @@ std::string VisualFormatError::message() const {
     return "column " + std::to_string(column) + ": " + expected;
 }
 
-VisualFormatResult VisualFormat::parse(std::string_view format, VisualFormatOptions options,
-                                       const VisualFormatMetrics& metrics, const VisualFormatViews& views) {
+namespace {
+
+std::vector<ConstraintRule> rulesOf(std::string_view format, VisualFormatOptions options,
+                                    const VisualFormatMetrics& metrics, const VisualFormatViews& views,
+                                    std::optional<VisualFormatError>& error) {
     const auto known = KnownFormats::parsed(format);
     if (!known->syntax) {
-        return {{}, known->error};
+        error = known->error;
+        return {};
     }
-    return Builder(known->text, *known->syntax, options, metrics, views).build();
+    Builder builder(known->text, *known->syntax, options, metrics, views);
+    auto rules = builder.build();
+    error = builder.error();
+    return rules;
+}
+
+void logError(std::string_view format, const VisualFormatError& error) {
+    platformLog().write(LogLevel::Error, "The visual format %@ is wrong at %@",
+                        FormatArgument(std::string(format)).shown(), FormatArgument(error.message()).shown());
+}
+
+}  // namespace
+
+VisualFormatResult VisualFormat::parse(std::string_view format, VisualFormatOptions options,
+                                       const VisualFormatMetrics& metrics, const VisualFormatViews& views) {
+    VisualFormatResult result;
+    for (ConstraintRule& rule : rulesOf(format, options, metrics, views, result.error)) {
+        result.constraints.push_back(std::make_shared<LayoutConstraint>(std::move(rule)));
+    }
+    return result;
 }
 
 std::vector<std::shared_ptr<LayoutConstraint>> VisualFormat::constraintsWithVisualFormat(
@@ -289,11 +317,23 @@ std::vector<std::shared_ptr<LayoutConstraint>> VisualFormat::constraintsWithVisu
     const VisualFormatViews& views) {
     VisualFormatResult result = parse(format, options, metrics, views);
     if (result.error) {
-        platformLog().write(LogLevel::Error, "The visual format %@ is wrong at %@",
-                            FormatArgument(std::string(format)).shown(),
-                            FormatArgument(result.error->message()).shown());
+        logError(format, *result.error);
     }
     return std::move(result.constraints);
+}
+
+void VisualFormat::addConstraints(View& view, std::span<const Picture> pictures, const VisualFormatMetrics& metrics,
+                                  const VisualFormatViews& views) {
+    std::vector<ConstraintRule> all;
+    for (const Picture& picture : pictures) {
+        std::optional<VisualFormatError> error;
+        auto rules = rulesOf(picture.format, picture.options, metrics, views, error);
+        if (error) {
+            logError(picture.format, *error);
+        }
+        std::move(rules.begin(), rules.end(), std::back_inserter(all));
+    }
+    view.addRules(all);
 }
 
 }  // namespace ktr::platform

@@ -5,6 +5,7 @@
 #include <map>
 #include <memory>
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -82,6 +83,14 @@ class KTR_API VisualFormat {
     static std::vector<std::shared_ptr<LayoutConstraint>> constraintsWithVisualFormat(
         std::string_view format, VisualFormatOptions options, const VisualFormatMetrics& metrics,
         const VisualFormatViews& views);
+
+    struct Picture {
+        std::string_view format;
+        VisualFormatOptions options;
+    };
+    /// The same for several formats whose constraints `view` is to hold, in this order: at once, and at less cost.
+    static void addConstraints(View& view, std::span<const Picture> pictures, const VisualFormatMetrics& metrics,
+                               const VisualFormatViews& views);
 };
 
 }  // namespace ktr::platform

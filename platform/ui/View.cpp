@@ -11,12 +11,47 @@
 
 namespace ktr::platform {
 
-View::View() = default;
+View::View() : contentPriorities_(&sharedPriorities({})) {}
 
 View::~View() {
-    for (const auto& view : subviews_) {
+    if (self_.link_) {
+        self_.link_->view = nullptr;
+    }
+    for (const auto& view : subviews()) {
         view->superview_ = nullptr;
     }
+}
+
+ViewReference::ViewReference(const View& view) {
+    if (!view.self_.link_) {
+        view.self_.link_ = new Link{const_cast<View*>(&view), 1};
+    }
+    link_ = view.self_.link_;
+    hold();
+}
+
+const std::vector<std::shared_ptr<View>>& View::subviews() const {
+    static const std::vector<std::shared_ptr<View>> kNone;
+    return children_ ? children_->subviews : kNone;
+}
+
+const View::Extras& View::noExtras() {
+    static const Extras kNone;
+    return kNone;
+}
+
+View::Extras& View::madeExtras() {
+    if (!extras_) {
+        extras_ = std::make_unique<Extras>();
+    }
+    return *extras_;
+}
+
+View::Children& View::madeChildren() {
+    if (!children_) {
+        children_ = std::make_unique<Children>();
+    }
+    return *children_;
 }
 
 std::shared_ptr<View> View::superview() const {
@@ -79,7 +114,7 @@ void View::addSubview(const std::shared_ptr<View>& view) {
     }
     view->removeFromSuperview();
     view->superview_ = this;
-    subviews_.push_back(view);
+    madeChildren().subviews.push_back(view);
     subviewsChanged();
     LayoutScope::inputChanged(*this);
     if (view->isMarked()) {
@@ -95,7 +130,7 @@ void View::removeFromSuperview() {
     }
     setNeedsDisplay();
     const auto self = strong(this);
-    std::erase(parent->subviews_, self);
+    std::erase(parent->children_->subviews, self);
     leaveSuperview();
     parent->subviewsChanged();
     LayoutScope::inputChanged(*parent);
@@ -111,7 +146,7 @@ void View::removeSubviews(const std::vector<std::shared_ptr<View>>& views) {
         }
     }
     if (removed) {
-        std::erase_if(subviews_, [this](const auto& view) { return view->superview_ != this; });
+        std::erase_if(children_->subviews, [this](const auto& view) { return view->superview_ != this; });
         subviewsChanged();
         LayoutScope::inputChanged(*this);
     }
@@ -125,9 +160,10 @@ void View::leaveSuperview() {
 }
 
 void View::bringSubviewToFront(const std::shared_ptr<View>& view) {
-    const auto found = std::find(subviews_.begin(), subviews_.end(), view);
-    if (found != subviews_.end()) {
-        std::rotate(found, found + 1, subviews_.end());
+    auto& views = madeChildren().subviews;
+    const auto found = std::find(views.begin(), views.end(), view);
+    if (found != views.end()) {
+        std::rotate(found, found + 1, views.end());
         view->setNeedsDisplay();
     }
 }
@@ -146,15 +182,15 @@ void View::setHidden(bool hidden) {
 }
 
 void View::setBackgroundColor(const Color& color) {
-    if (!(color == backgroundColor_)) {
-        backgroundColor_ = color;
+    if (!(color == backgroundColor())) {
+        madeExtras().backgroundColor = color;
         setNeedsDisplay();
     }
 }
 
 void View::setLayerBackgroundColor(const Color& color) {
-    if (!(color == layerBackgroundColor_)) {
-        layerBackgroundColor_ = color;
+    if (!(color == layerBackgroundColor())) {
+        madeExtras().layerBackgroundColor = color;
         setNeedsDisplay();
     }
 }
@@ -176,8 +212,8 @@ void View::setNeedsDisplay(const Rect& rect) {
 }
 
 void View::paint(Canvas& canvas, const Rect& dirty) const {
-    canvas.fill(bounds(), layerBackgroundColor_);
-    canvas.fill(bounds(), backgroundColor_);
+    canvas.fill(bounds(), layerBackgroundColor());
+    canvas.fill(bounds(), backgroundColor());
     draw(canvas);
     const auto& children = presentedSubviews();
     const auto [begin, end] = presentedWithin(dirty);
@@ -201,7 +237,7 @@ void View::draw(Canvas& /*canvas*/) const {}
 
 void View::addGestureRecognizer(std::shared_ptr<TapGestureRecognizer> recognizer) {
     if (recognizer) {
-        recognizers_.push_back(std::move(recognizer));
+        madeExtras().recognizers.push_back(std::move(recognizer));
     }
 }
 
@@ -238,11 +274,13 @@ void View::touchesCancelled(const Touches& touches, const TouchEvent& event) {
 }
 
 void View::setAccessibilityLabel(std::optional<std::string> label) {
-    accessibilityLabel_ = std::move(label);
+    if (label || extras_) {
+        madeExtras().accessibilityLabel = std::move(label);
+    }
 }
 
 std::string View::accessibilityText() const {
-    return accessibilityLabel_.value_or("");
+    return accessibilityLabel().value_or("");
 }
 
 }  // namespace ktr::platform

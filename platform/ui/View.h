@@ -2,6 +2,7 @@
 
 #include <memory>
 #include <optional>
+#include <span>
 #include <string>
 #include <utility>
 #include <vector>
@@ -14,9 +15,11 @@
 #include "platform/ui/Color.h"
 #include "platform/ui/TapGestureRecognizer.h"
 #include "platform/ui/Touch.h"
+#include "platform/ui/ViewReference.h"
 
 namespace ktr::platform {
 
+struct ConstraintRule;
 class Canvas;
 class LayoutConstraint;
 class LayoutScope;
@@ -40,7 +43,7 @@ class KTR_API View : public Object {
 
     // Tree
     std::shared_ptr<View> superview() const;
-    const std::vector<std::shared_ptr<View>>& subviews() const { return subviews_; }
+    const std::vector<std::shared_ptr<View>>& subviews() const;
     /// Appends; a view that has another superview leaves it first. Adding an ancestor or the view itself does nothing.
     void addSubview(const std::shared_ptr<View>& view);
     void removeFromSuperview();
@@ -52,15 +55,15 @@ class KTR_API View : public Object {
     /// The window at the root of the tree, or none.
     std::shared_ptr<Window> window() const;
     /// The subviews that are laid out, painted, hit and spoken; all of them unless a subclass arranges some.
-    virtual const std::vector<std::shared_ptr<View>>& presentedSubviews() const { return subviews_; }
+    virtual const std::vector<std::shared_ptr<View>>& presentedSubviews() const { return subviews(); }
 
     // Look
     bool hidden() const { return hidden_; }
     void setHidden(bool hidden);
-    const Color& backgroundColor() const { return backgroundColor_; }
+    const Color& backgroundColor() const { return extras().backgroundColor; }
     void setBackgroundColor(const Color& color);
     /// Painted under the background colour, as the view's layer has it.
-    const Color& layerBackgroundColor() const { return layerBackgroundColor_; }
+    const Color& layerBackgroundColor() const { return extras().layerBackgroundColor; }
     void setLayerBackgroundColor(const Color& color);
     /// Paints the view and what it presents; `dirty` in the view's own coordinates. Views outside `dirty` are skipped.
     void paint(Canvas& canvas, const Rect& dirty) const;
@@ -73,6 +76,8 @@ class KTR_API View : public Object {
     void setTranslatesAutoresizingMaskIntoConstraints(bool translates);
     void addConstraint(const std::shared_ptr<LayoutConstraint>& constraint);
     void addConstraints(const std::vector<std::shared_ptr<LayoutConstraint>>& constraints);
+    /// The same for what constraints say, in one step.
+    void addRules(std::span<const ConstraintRule> rules);
     void removeConstraint(const std::shared_ptr<LayoutConstraint>& constraint);
     /// The constraints that this view holds, in order of adding.
     std::vector<std::shared_ptr<LayoutConstraint>> constraints() const;
@@ -90,7 +95,7 @@ class KTR_API View : public Object {
     LayoutAnchor firstBaselineAnchor() { return anchor(LayoutAttribute::FirstBaseline); }
     LayoutAnchor lastBaselineAnchor() { return anchor(LayoutAttribute::LastBaseline); }
     /// Defaults: hugging 250, compression resistance 750.
-    const ContentPriorities& contentPriorities() const { return contentPriorities_; }
+    const ContentPriorities& contentPriorities() const { return *contentPriorities_; }
     double contentHuggingPriority(LayoutAxis axis) const;
     void setContentHuggingPriority(double priority, LayoutAxis axis);
     double contentCompressionResistancePriority(LayoutAxis axis) const;
@@ -118,7 +123,9 @@ class KTR_API View : public Object {
     bool userInteractionEnabled() const { return userInteractionEnabled_; }
     void setUserInteractionEnabled(bool enabled) { userInteractionEnabled_ = enabled; }
     void addGestureRecognizer(std::shared_ptr<TapGestureRecognizer> recognizer);
-    const std::vector<std::shared_ptr<TapGestureRecognizer>>& gestureRecognizers() const { return recognizers_; }
+    const std::vector<std::shared_ptr<TapGestureRecognizer>>& gestureRecognizers() const {
+        return extras().recognizers;
+    }
     /// The deepest view that takes touches at a point in this view's coordinates, or none.
     virtual std::shared_ptr<View> hitTest(Point point);
     /// The base passes touches on to the superview.
@@ -128,7 +135,7 @@ class KTR_API View : public Object {
 
     // Accessibility
     /// What a screen reader says instead of the shown text; none: the shown text.
-    const std::optional<std::string>& accessibilityLabel() const { return accessibilityLabel_; }
+    const std::optional<std::string>& accessibilityLabel() const { return extras().accessibilityLabel; }
     void setAccessibilityLabel(std::optional<std::string> label);
     virtual AccessibilityRole accessibilityRole() const { return AccessibilityRole::None; }
     /// What a screen reader says of the view itself; empty for nothing.
@@ -147,25 +154,52 @@ class KTR_API View : public Object {
     virtual std::pair<std::size_t, std::size_t> presentedWithin(const Rect& rect) const;
     /// Whether a subview of this view is presented. Subviews are, until this says otherwise.
     void setPresents(View& subview, bool isPresented) const;
-    friend class LayoutScope;
 
   private:
+    friend class LayoutConstraint;
+    friend class LayoutEquations;
+    friend class LayoutScope;
+    friend class ViewReference;
+    friend struct ConstraintRule;
+
+    /// What few views have: made when it is first needed.
+    struct Extras {
+        std::vector<std::shared_ptr<TapGestureRecognizer>> recognizers;
+        Color backgroundColor = Color::clear();
+        Color layerBackgroundColor = Color::clear();
+        std::optional<std::string> accessibilityLabel;
+    };
+    struct Children {
+        std::vector<std::shared_ptr<View>> subviews;
+        /// Those that have to be laid out, or hold views that have. May name some that have left.
+        std::vector<ViewReference> marked;
+    };
+    const Extras& extras() const { return extras_ ? *extras_ : noExtras(); }
+    static const Extras& noExtras();
+    Extras& madeExtras();
+    Children& madeChildren();
+    LayoutScope& madeScope();
+    static const ContentPriorities& sharedPriorities(const ContentPriorities& priorities);
+    void setContentPriorities(const ContentPriorities& priorities);
+    /// Whether this view's layout counts the rule.
+    bool holds(const ConstraintRule& rule) const;
+    /// A constraint that said one of this view's rules is no more; the rule stays.
+    void forget(const LayoutConstraint& constraint);
     void setNeedsDisplay(const Rect& rect);
     void markInSuperview();
-    bool isMarked() const { return needsLayout_ || !marked_.empty(); }
+    bool isMarked() const { return needsLayout_ || (children_ && !children_->marked.empty()); }
     void leaveSuperview();
     void layOutMarked();
 
     Rect frame_;
     /// The one that owns this view; it says goodbye in its destructor.
     View* superview_ = nullptr;
-    std::vector<std::shared_ptr<View>> subviews_;
-    std::vector<std::shared_ptr<TapGestureRecognizer>> recognizers_;
-    Color backgroundColor_ = Color::clear();
-    Color layerBackgroundColor_ = Color::clear();
-    std::optional<std::string> accessibilityLabel_;
-    ContentPriorities contentPriorities_;
+    std::unique_ptr<Children> children_;
+    std::unique_ptr<Extras> extras_;
     std::unique_ptr<LayoutScope> scope_;
+    /// One of a few that all views share.
+    const ContentPriorities* contentPriorities_;
+    mutable ViewReference self_;
     bool hidden_ = false;
     bool translatesAutoresizingMask_ = true;
     bool userInteractionEnabled_ = true;
@@ -173,8 +207,6 @@ class KTR_API View : public Object {
     bool needsLayout_ = true;
     bool isMarkedInSuperview_ = false;
     bool isPresented_ = true;
-    /// The subviews that have to be laid out, or hold views that have. May name some that have left.
-    std::vector<std::weak_ptr<View>> marked_;
 };
 
 }  // namespace ktr::platform

@@ -1,5 +1,6 @@
 // The layout half of View: constraints, content sizes, and when what is placed again.
 #include <algorithm>
+#include <deque>
 
 #include "platform/base/Assert.h"
 #include "platform/layout/LayoutConstraint.h"
@@ -22,19 +23,28 @@ void View::setTranslatesAutoresizingMaskIntoConstraints(bool translates) {
     }
 }
 
+LayoutScope& View::madeScope() {
+    if (!scope_) {
+        scope_ = std::make_unique<LayoutScope>(*this);
+    }
+    return *scope_;
+}
+
 void View::addConstraint(const std::shared_ptr<LayoutConstraint>& constraint) {
     KTR_ASSERT_MAIN_THREAD();
     if (!constraint) {
         return;
     }
-    if (const auto owner = constraint->owner_.lock(); owner && owner.get() != this) {
+    View* const owner = constraint->owner_.get();
+    if (owner == this && holds(constraint->rule())) {
+        return;
+    }
+    if (owner && owner != this) {
         owner->removeConstraint(constraint);
     }
-    if (!scope_) {
-        scope_ = std::make_unique<LayoutScope>(*this);
-    }
-    scope_->add(constraint);
-    constraint->owner_ = weak(this);
+    madeScope().add({&constraint->rule(), 1});
+    scope_->remember(*constraint);
+    constraint->owner_ = ViewReference(*this);
 }
 
 void View::addConstraints(const std::vector<std::shared_ptr<LayoutConstraint>>& constraints) {
@@ -43,46 +53,84 @@ void View::addConstraints(const std::vector<std::shared_ptr<LayoutConstraint>>& 
     }
 }
 
+void View::addRules(std::span<const ConstraintRule> rules) {
+    KTR_ASSERT_MAIN_THREAD();
+    madeScope().add(rules);
+}
+
 void View::removeConstraint(const std::shared_ptr<LayoutConstraint>& constraint) {
     KTR_ASSERT_MAIN_THREAD();
-    if (constraint && scope_ && scope_->remove(*constraint)) {
-        constraint->owner_.reset();
+    if (constraint && scope_) {
+        scope_->remove(constraint->rule());
     }
 }
 
 std::vector<std::shared_ptr<LayoutConstraint>> View::constraints() const {
-    return scope_ ? scope_->constraints() : std::vector<std::shared_ptr<LayoutConstraint>>();
+    std::vector<std::shared_ptr<LayoutConstraint>> constraints;
+    if (!scope_) {
+        return constraints;
+    }
+    for (ConstraintRule& rule : scope_->rules()) {
+        LayoutConstraint* const known = scope_->remembered(rule);
+        auto constraint = known ? std::static_pointer_cast<LayoutConstraint>(known->weak_from_this().lock()) : nullptr;
+        if (!constraint) {
+            constraint = std::make_shared<LayoutConstraint>(std::move(rule));
+            constraint->owner_ = ViewReference(*this);
+            scope_->remember(*constraint);
+        }
+        constraints.push_back(std::move(constraint));
+    }
+    return constraints;
+}
+
+bool View::holds(const ConstraintRule& rule) const {
+    return scope_ && scope_->holds(rule);
+}
+
+void View::forget(const LayoutConstraint& constraint) {
+    if (scope_) {
+        scope_->forget(constraint);
+    }
 }
 
 LayoutAnchor View::anchor(LayoutAttribute attribute) {
-    return {weak(this), attribute};
+    return {ViewReference(*this), attribute};
+}
+
+const ContentPriorities& View::sharedPriorities(const ContentPriorities& priorities) {
+    // A program has a handful of them.
+    static std::deque<ContentPriorities> known;
+    const auto found = std::find(known.begin(), known.end(), priorities);
+    return found != known.end() ? *found : known.emplace_back(priorities);
+}
+
+void View::setContentPriorities(const ContentPriorities& priorities) {
+    if (!(priorities == *contentPriorities_)) {
+        contentPriorities_ = &sharedPriorities(priorities);
+        LayoutScope::inputChanged(*this);
+    }
 }
 
 double View::contentHuggingPriority(LayoutAxis axis) const {
-    return axis == LayoutAxis::Horizontal ? contentPriorities_.horizontalHugging : contentPriorities_.verticalHugging;
+    return axis == LayoutAxis::Horizontal ? contentPriorities_->horizontalHugging : contentPriorities_->verticalHugging;
 }
 
 void View::setContentHuggingPriority(double priority, LayoutAxis axis) {
-    double& own =
-        axis == LayoutAxis::Horizontal ? contentPriorities_.horizontalHugging : contentPriorities_.verticalHugging;
-    if (own != priority) {
-        own = priority;
-        LayoutScope::inputChanged(*this);
-    }
+    ContentPriorities changed = *contentPriorities_;
+    (axis == LayoutAxis::Horizontal ? changed.horizontalHugging : changed.verticalHugging) = priority;
+    setContentPriorities(changed);
 }
 
 double View::contentCompressionResistancePriority(LayoutAxis axis) const {
-    return axis == LayoutAxis::Horizontal ? contentPriorities_.horizontalCompressionResistance
-                                          : contentPriorities_.verticalCompressionResistance;
+    return axis == LayoutAxis::Horizontal ? contentPriorities_->horizontalCompressionResistance
+                                          : contentPriorities_->verticalCompressionResistance;
 }
 
 void View::setContentCompressionResistancePriority(double priority, LayoutAxis axis) {
-    double& own = axis == LayoutAxis::Horizontal ? contentPriorities_.horizontalCompressionResistance
-                                                 : contentPriorities_.verticalCompressionResistance;
-    if (own != priority) {
-        own = priority;
-        LayoutScope::inputChanged(*this);
-    }
+    ContentPriorities changed = *contentPriorities_;
+    (axis == LayoutAxis::Horizontal ? changed.horizontalCompressionResistance : changed.verticalCompressionResistance) =
+        priority;
+    setContentPriorities(changed);
 }
 
 IntrinsicSize View::intrinsicContentSize(double /*widthLimit*/) const {
@@ -106,7 +154,7 @@ void View::setNeedsLayout() {
 void View::markInSuperview() {
     for (View* view = this; view->superview_ && !view->isMarkedInSuperview_; view = view->superview_) {
         view->isMarkedInSuperview_ = true;
-        view->superview_->marked_.push_back(weak(view));
+        view->superview_->madeChildren().marked.emplace_back(*view);
     }
 }
 
@@ -128,12 +176,15 @@ void View::layoutIfNeeded() {
 }
 
 void View::layOutMarked() {
-    const auto marked = std::exchange(marked_, {});
-    for (const auto& reference : marked) {
-        const auto view = reference.lock();
-        if (!view || view->superview_ != this) {
+    if (!children_) {
+        return;
+    }
+    const auto marked = std::exchange(children_->marked, {});
+    for (const ViewReference& reference : marked) {
+        if (!reference.get() || reference.get()->superview_ != this) {
             continue;
         }
+        const auto view = strong(reference.get());
         view->isMarkedInSuperview_ = false;
         // One that is not presented keeps what it needs until it is.
         if (view->isPresented_) {
@@ -149,10 +200,7 @@ void View::layoutSubviews() {
 }
 
 Size View::systemLayoutSizeFitting(const Size& target, double horizontalPriority, double verticalPriority) {
-    if (!scope_) {
-        scope_ = std::make_unique<LayoutScope>(*this);
-    }
-    return scope_->fittingSize(target, horizontalPriority, verticalPriority);
+    return madeScope().fittingSize(target, horizontalPriority, verticalPriority);
 }
 
 }  // namespace ktr::platform
