@@ -59,7 +59,7 @@ int LineBreaker::pixelSize(const platform::Font& font) const {
     return static_cast<int>(std::clamp(std::round(finite(font.size) / scale_), 1.0, 1000.0));
 }
 
-std::shared_ptr<const QtTextLayout> LineBreaker::run() {
+BrokenText LineBreaker::run() {
     return container_.maximumLines == 1 ? runOneLine() : runLines();
 }
 
@@ -131,9 +131,9 @@ void LineBreaker::appendKeycaps(ShapeRecipe& recipe) {
     }
 }
 
-std::shared_ptr<ShapedText> LineBreaker::share(Shaped shaped, qsizetype from, int lines) const {
+BrokenText::Piece LineBreaker::piece(Shaped shaped, qsizetype from, int lines) const {
     const qsizetype to = from + shaped.recipe.text.size();
-    std::vector<ShapedText::ColorRange> colors;
+    std::vector<BrokenText::ColorRange> colors;
     bool colored = false;
     for (const auto& run : text_.runs) {
         const qsizetype begin = std::max(run.start, from);
@@ -149,13 +149,7 @@ std::shared_ptr<ShapedText> LineBreaker::share(Shaped shaped, qsizetype from, in
         // An ellipsis takes the colour of what it stands for.
         colors.back().length = static_cast<int>(to - from) - colors.back().start;
     }
-    std::vector<ShapeRecipe::Line> placed;
-    for (int i = 0; i < lines; ++i) {
-        const QTextLine line = shaped.layout->lineAt(i);
-        placed.push_back({line.width(), line.position()});
-    }
-    return std::make_shared<ShapedText>(std::move(shaped.recipe), std::move(placed), scale_, std::move(colors),
-                                        *shaped.layout);
+    return {std::move(shaped.recipe), std::move(shaped.layout), lines, std::move(colors)};
 }
 
 LineBreaker::Metrics LineBreaker::metricsOf(qsizetype from, qsizetype to) const {
@@ -290,7 +284,7 @@ LineBreaker::Broken LineBreaker::breakLines(qsizetype shaped, bool grow) const {
     return broken;
 }
 
-std::shared_ptr<const QtTextLayout> LineBreaker::runLines() {
+BrokenText LineBreaker::runLines() {
     const qsizetype whole = text_.text.size();
     qsizetype shaped = whole;
     if (container_.maximumLines > 0) {
@@ -309,7 +303,7 @@ std::shared_ptr<const QtTextLayout> LineBreaker::runLines() {
     }
 }
 
-std::shared_ptr<const QtTextLayout> LineBreaker::finish(Broken broken) {
+BrokenText LineBreaker::finish(Broken broken) {
     Placed& last = broken.lines.back();
     Shaped tail;
     if (broken.overflows) {
@@ -320,28 +314,29 @@ std::shared_ptr<const QtTextLayout> LineBreaker::finish(Broken broken) {
     for (const Placed& line : broken.lines) {
         end = std::max(end, line.span.x + line.width);
     }
-    std::vector<platform::TextLayout::Line> lines;
+    BrokenText done;
+    done.scale = scale_;
+    done.isTruncated = broken.overflows;
+    auto& lines = done.lines;
     for (std::size_t i = 0; i < broken.lines.size(); ++i) {
         const Placed& line = broken.lines[i];
         lines.push_back({{alignedX(line, end), line.y, line.width, line.metrics.height}, line.y + line.metrics.ascent});
         QTextLine shaped = broken.shaped.layout->lineAt(static_cast<int>(i));
         shaped.setPosition(QPointF(lines.back().box.x / scale_, shaped.y()));
     }
-    std::vector<QtTextLayout::Piece> pieces;
     const int kept = static_cast<int>(broken.lines.size()) - (broken.overflows ? 1 : 0);
     if (kept > 0) {
-        pieces.push_back({share(std::move(broken.shaped), 0, kept), QPointF()});
+        done.pieces.push_back(piece(std::move(broken.shaped), 0, kept));
     }
     if (tail.layout) {
         QTextLine line = tail.layout->lineAt(0);
         line.setPosition(QPointF(lines.back().box.x / scale_, lines.back().baseline / scale_ - line.ascent()));
-        pieces.push_back({share(std::move(tail), last.start, 1), QPointF()});
+        done.pieces.push_back(piece(std::move(tail), last.start, 1));
     }
-    return std::make_shared<QtTextLayout>(std::move(pieces), std::move(lines), container_.lineFragmentPadding,
-                                          broken.overflows);
+    return done;
 }
 
-std::shared_ptr<const QtTextLayout> LineBreaker::runOneLine() {
+BrokenText LineBreaker::runOneLine() {
     const qsizetype whole = text_.text.size();
     const qsizetype end = lineEndFrom(0);
     double y = 0.0;
@@ -364,15 +359,16 @@ std::shared_ptr<const QtTextLayout> LineBreaker::runOneLine() {
     const double width = shaped.width;
     const Placed placed = {span, width, y, metrics, 0, end};
     const double x = alignedX(placed, span.x + width);
-    std::vector<QtTextLayout::Piece> pieces;
+    BrokenText done;
+    done.scale = scale_;
+    done.isTruncated = overflows;
     if (shaped.layout) {
         QTextLine line = shaped.layout->lineAt(0);
         line.setPosition(QPointF(x / scale_, (y + metrics.ascent) / scale_ - line.ascent()));
-        pieces.push_back({share(std::move(shaped), 0, 1), QPointF()});
+        done.pieces.push_back(piece(std::move(shaped), 0, 1));
     }
-    std::vector<platform::TextLayout::Line> lines = {{{x, y, width, metrics.height}, y + metrics.ascent}};
-    return std::make_shared<QtTextLayout>(std::move(pieces), std::move(lines), container_.lineFragmentPadding,
-                                          overflows);
+    done.lines = {{{x, y, width, metrics.height}, y + metrics.ascent}};
+    return done;
 }
 
 LineBreaker::Shaped LineBreaker::shapeLine(qsizetype from, qsizetype to, const QString& tail) const {

@@ -5,9 +5,9 @@
 #include <optional>
 #include <vector>
 
+#include "linux/ui/BrokenText.h"
 #include "linux/ui/FontChoice.h"
 #include "linux/ui/PreparedText.h"
-#include "linux/ui/QtTextLayout.h"
 #include "linux/ui/ShapeRecipe.h"
 #include "platform/text/TextEngine.h"
 
@@ -20,7 +20,7 @@ class LineBreaker {
     /// Text and container must outlive the breaker. The text must not be empty.
     LineBreaker(const PreparedText& text, const platform::TextContainer& container, const FontChoice& fonts);
 
-    std::shared_ptr<const QtTextLayout> run();
+    BrokenText run();
 
   private:
     /// A stretch of a line that is free of exclusions. Points.
@@ -59,18 +59,18 @@ class LineBreaker {
         bool tall = false;
     };
 
-    std::shared_ptr<const QtTextLayout> runOneLine();
-    std::shared_ptr<const QtTextLayout> runLines();
+    BrokenText runOneLine();
+    BrokenText runLines();
     Broken breakLines(qsizetype shaped, bool grow) const;
     void placeLine(QTextLine& line, double& y, bool grow, Placed& placed) const;
-    std::shared_ptr<const QtTextLayout> finish(Broken broken);
+    BrokenText finish(Broken broken);
 
     /// How [from, to) with `tail` after it is shaped.
     ShapeRecipe recipe(qsizetype from, qsizetype to, const QString& tail, bool wrap) const;
     static void appendKeycaps(ShapeRecipe& recipe);
     Shaped shapeLine(qsizetype from, qsizetype to, const QString& tail) const;
     /// Keeps the first lines for drawing; the text begins at `from`.
-    std::shared_ptr<ShapedText> share(Shaped shaped, qsizetype from, int lines) const;
+    BrokenText::Piece piece(Shaped shaped, qsizetype from, int lines) const;
     /// The line from `from` cut so that it ends in an ellipsis and fits `room` points; none when not even that fits.
     Shaped cutLine(qsizetype from, qsizetype to, double room) const;
     /// The cut that is likely to fit, from one shaping of the uncut text.

@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <functional>
 
 #include "linux/ui/LineBreaker.h"
 #include "linux/ui/PreparedText.h"
@@ -21,13 +20,6 @@ constexpr std::size_t kEntryCost = 100;
 /// Texts beyond this are not tried on one line first.
 constexpr std::size_t kShortText = 400;
 constexpr double kFit = 0.01;
-
-void mix(std::size_t& hash, std::size_t value) {
-    hash ^= value + 0x9e3779b97f4a7c15ULL + (hash << 6U) + (hash >> 2U);
-}
-void mix(std::size_t& hash, double value) {
-    mix(hash, std::hash<double>{}(value));
-}
 
 std::size_t costOf(const platform::AttributedString& text) {
     std::size_t cost = kEntryCost;
@@ -61,20 +53,6 @@ double alignedX(const platform::AttributedString& text, const TextContainer& con
 
 }  // namespace
 
-std::size_t QtTextEngine::hashOf(const Key& key) {
-    std::size_t hash = 0;
-    for (const auto& run : key.text.runs()) {
-        mix(hash, std::hash<std::string>{}(run.text));
-        mix(hash, run.font.size);
-        mix(hash, static_cast<std::size_t>(run.font.weight));
-    }
-    mix(hash, key.container.width);
-    mix(hash, static_cast<std::size_t>(key.container.maximumLines));
-    mix(hash, static_cast<std::size_t>(key.container.alignment));
-    mix(hash, key.container.exclusionPaths.size());
-    return hash;
-}
-
 QtTextEngine::QtTextEngine(const QString& language) : fonts_(language) {}
 
 void QtTextEngine::setLanguage(const QString& language) {
@@ -92,21 +70,20 @@ std::size_t QtTextEngine::shapedCount() const {
 
 std::shared_ptr<const platform::TextLayout> QtTextEngine::layOut(const platform::AttributedString& text,
                                                                  const TextContainer& container) {
-    Key key{text, container};
     if (std::isinf(container.width) && container.maximumLines == 1) {
         // One line as it is measured, whatever its alignment: one layout for all.
-        key.container = natural(container);
+        return layOutOnce(text, natural(container));
     }
-    return layOutOnce(key);
+    return layOutOnce(text, container);
 }
 
-QtTextEngine::Entries::iterator QtTextEngine::entry(std::size_t hash, const Key& key) {
+QtTextEngine::Entries::iterator QtTextEngine::entry(std::size_t hash, const TextKey& key) {
     const auto [begin, end] = index_.equal_range(hash);
     const auto found = std::find_if(begin, end, [&key](const auto& known) { return known.second->key == key; });
     return found == end ? entries_.end() : found->second;
 }
 
-std::shared_ptr<const QtTextLayout> QtTextEngine::find(std::size_t hash, const Key& key) {
+std::shared_ptr<const QtTextLayout> QtTextEngine::find(std::size_t hash, const TextKey& key) {
     const std::lock_guard lock(mutex_);
     const auto found = entry(hash, key);
     if (found == entries_.end()) {
@@ -116,18 +93,15 @@ std::shared_ptr<const QtTextLayout> QtTextEngine::find(std::size_t hash, const K
     return found->layout;
 }
 
-void QtTextEngine::keep(std::size_t hash, const Key& key, const std::shared_ptr<const QtTextLayout>& layout) {
+void QtTextEngine::keep(Entry made) {
     const std::lock_guard lock(mutex_);
-    if (entry(hash, key) != entries_.end()) {
-        return;  // another thread was quicker
+    if (made.cost > kMostCost / 2 || entry(made.hash, made.key) != entries_.end()) {
+        return;  // too long, or another thread was quicker
     }
-    const std::size_t cost = costOf(key.text);
-    if (cost > kMostCost / 2) {
-        return;
-    }
-    entries_.push_front({hash, key, layout, cost});
+    const std::size_t hash = made.hash;
+    cost_ += made.cost;
+    entries_.push_front(std::move(made));
     index_.emplace(hash, entries_.begin());
-    cost_ += cost;
     while (cost_ > kMostCost) {
         dropOldest();
     }
@@ -141,51 +115,56 @@ void QtTextEngine::dropOldest() {
     entries_.pop_back();
 }
 
-std::shared_ptr<const QtTextLayout> QtTextEngine::layOutOnce(const Key& key) {
-    const std::size_t hash = hashOf(key);
+std::shared_ptr<const QtTextLayout> QtTextEngine::layOutOnce(const platform::AttributedString& text,
+                                                             const TextContainer& container) {
+    const TextKey key(text, container);
+    const std::size_t hash = key.hash();
     if (auto kept = find(hash, key)) {
         return kept;
     }
-    std::shared_ptr<const QtTextLayout> layout;
-    // A text that fits on one line is shaped once for all widths that hold it.
-    const TextContainer one = natural(key.container);
-    if (!(one == key.container) && key.container.exclusionPaths.empty() && costOf(key.text) < kShortText &&
-        !key.text.empty()) {
-        const auto measured = layOutOnce({key.text, one});
-        const double used = measured->usedSize().width;
-        if (!measured->isTruncated() && used <= key.container.width + kFit && !measured->lines().empty()) {
-            const double shift = alignedX(key.text, key.container, used) + key.container.lineFragmentPadding -
-                                 measured->lines().front().box.x;
-            auto pieces = measured->pieces();
-            for (auto& piece : pieces) {
-                piece.offset += QPointF(shift, 0.0);
-            }
-            auto lines = measured->lines();
-            lines.front().box.x += shift;
-            layout = std::make_shared<QtTextLayout>(std::move(pieces), std::move(lines),
-                                                    key.container.lineFragmentPadding, false);
-        }
-    }
+    auto layout = aligned(text, container);
     if (!layout) {
-        layout = shape(key);
+        layout = shape(key, text, container);
     }
-    keep(hash, key, layout);
+    keep({key, hash, layout, costOf(text)});
     return layout;
 }
 
-std::shared_ptr<const QtTextLayout> QtTextEngine::shape(const Key& key) {
+/// A text that fits on one line is shaped once for all widths that hold it; none when this one does not.
+std::shared_ptr<const QtTextLayout> QtTextEngine::aligned(const platform::AttributedString& text,
+                                                          const TextContainer& container) {
+    const TextContainer one = natural(container);
+    if (one == container || !container.exclusionPaths.empty() || costOf(text) >= kShortText || text.empty()) {
+        return nullptr;
+    }
+    const auto measured = layOutOnce(text, one);
+    const double used = measured->usedSize().width;
+    if (measured->isTruncated() || used > container.width + kFit || measured->lines().empty()) {
+        return nullptr;
+    }
+    auto lines = measured->lines();
+    const double shift = alignedX(text, container, used) + container.lineFragmentPadding - lines.front().box.x;
+    lines.front().box.x += shift;
+    return std::make_shared<QtTextLayout>(measured->shaped(), shift, std::move(lines), container.lineFragmentPadding,
+                                          false);
+}
+
+std::shared_ptr<const QtTextLayout> QtTextEngine::shape(const TextKey& key, const platform::AttributedString& text,
+                                                        const TextContainer& container) {
     FontChoice fonts;
     {
         const std::lock_guard lock(mutex_);
         ++shaped_;
         fonts = fonts_;
     }
-    const PreparedText prepared(key.text);
+    const PreparedText prepared(text);
     if (prepared.runs.empty()) {
-        return std::make_shared<QtTextLayout>(std::vector<QtTextLayout::Piece>(),
-                                              std::vector<platform::TextLayout::Line>(), 0.0, false);
+        return std::make_shared<QtTextLayout>(nullptr, 0.0, std::vector<platform::TextLayout::Line>(), 0.0, false);
     }
-    return LineBreaker(prepared, key.container, fonts).run();
+    BrokenText broken = LineBreaker(prepared, container, fonts).run();
+    auto shaped = std::make_shared<ShapedText>(key, std::move(fonts), broken);
+    return std::make_shared<QtTextLayout>(std::move(shaped), 0.0, std::move(broken.lines),
+                                          container.lineFragmentPadding, broken.isTruncated);
 }
 
 }  // namespace ktr::linux_

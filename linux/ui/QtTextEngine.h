@@ -8,6 +8,7 @@
 
 #include "linux/ui/FontChoice.h"
 #include "linux/ui/QtTextLayout.h"
+#include "linux/ui/TextKey.h"
 #include "platform/text/TextEngine.h"
 
 namespace ktr::linux_ {
@@ -32,26 +33,24 @@ class QtTextEngine final : public platform::TextEngine {
     std::size_t shapedCount() const;
 
   private:
-    struct Key {
-        platform::AttributedString text;
-        platform::TextContainer container;
-        bool operator==(const Key&) const = default;
-    };
     struct Entry {
+        TextKey key;
         std::size_t hash = 0;
-        Key key;
         std::shared_ptr<const QtTextLayout> layout;
         std::size_t cost = 0;
     };
     using Entries = std::list<Entry>;
-    static std::size_t hashOf(const Key& key);
-    Entries::iterator entry(std::size_t hash, const Key& key);
+    Entries::iterator entry(std::size_t hash, const TextKey& key);
     void dropOldest();
 
-    std::shared_ptr<const QtTextLayout> layOutOnce(const Key& key);
-    std::shared_ptr<const QtTextLayout> shape(const Key& key);
-    std::shared_ptr<const QtTextLayout> find(std::size_t hash, const Key& key);
-    void keep(std::size_t hash, const Key& key, const std::shared_ptr<const QtTextLayout>& layout);
+    std::shared_ptr<const QtTextLayout> layOutOnce(const platform::AttributedString& text,
+                                                   const platform::TextContainer& container);
+    std::shared_ptr<const QtTextLayout> aligned(const platform::AttributedString& text,
+                                                const platform::TextContainer& container);
+    std::shared_ptr<const QtTextLayout> shape(const TextKey& key, const platform::AttributedString& text,
+                                              const platform::TextContainer& container);
+    std::shared_ptr<const QtTextLayout> find(std::size_t hash, const TextKey& key);
+    void keep(Entry entry);
 
     mutable std::mutex mutex_;
     FontChoice fonts_;

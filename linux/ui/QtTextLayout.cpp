@@ -5,8 +5,10 @@
 
 namespace ktr::linux_ {
 
-QtTextLayout::QtTextLayout(std::vector<Piece> pieces, std::vector<Line> lines, double padding, bool truncated)
-    : pieces_(std::move(pieces)), lines_(std::move(lines)), truncated_(truncated) {
+QtTextLayout::QtTextLayout(std::shared_ptr<const ShapedText> shaped, double offset, std::vector<Line> lines,
+                           double padding, bool truncated)
+    : shaped_(std::move(shaped)), offset_(offset), lines_(std::move(lines)), truncated_(truncated) {
+    lines_.shrink_to_fit();
     if (lines_.empty()) {
         return;
     }
@@ -24,18 +26,13 @@ QtTextLayout::QtTextLayout(std::vector<Piece> pieces, std::vector<Line> lines, d
 }
 
 void QtTextLayout::draw(QPainter& painter, QPointF origin, const QColor& color, const Palette& palette) const {
-    for (const Piece& piece : pieces_) {
-        piece.shaped->draw(painter, origin + piece.offset, color, palette);
+    if (shaped_) {
+        shaped_->draw(painter, origin + QPointF(offset_, 0.0), color, palette);
     }
 }
 
 QPainterPath QtTextLayout::outline() const {
-    QPainterPath path;
-    path.setFillRule(Qt::WindingFill);
-    for (const Piece& piece : pieces_) {
-        path.addPath(piece.shaped->outline().translated(piece.offset));
-    }
-    return path;
+    return shaped_ ? shaped_->outline().translated(offset_, 0.0) : QPainterPath();
 }
 
 }  // namespace ktr::linux_

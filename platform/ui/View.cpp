@@ -30,6 +30,10 @@ ViewReference::ViewReference(const View& view) {
     hold();
 }
 
+void ViewReference::discard(const Link* link) {
+    delete link;
+}
+
 const std::vector<std::shared_ptr<View>>& View::subviews() const {
     static const std::vector<std::shared_ptr<View>> kNone;
     return children_ ? children_->subviews : kNone;

@@ -40,9 +40,11 @@ class KTR_API ViewReference {
     }
     void release() {
         if (link_ && --link_->references == 0) {
-            delete link_;
+            discard(link_);
         }
     }
+
+    static void discard(const Link* link);
 
     Link* link_ = nullptr;
 };

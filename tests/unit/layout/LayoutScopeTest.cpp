@@ -400,7 +400,7 @@ TEST_F(LayoutScopeTest, IsSolvedAgain_OnlyWhenAnInputChanged) {
     const auto label = subview<Label>(root);
     label->setText("text");
     const auto scope = std::make_unique<LayoutScope>(*root);
-    scope->add(label->leftAnchor().constraintEqualTo(root->leftAnchor(), 5));
+    scope->add({&label->leftAnchor().constraintEqualTo(root->leftAnchor(), 5)->rule(), 1});
     scope->layout();
     EXPECT_EQ(scope->solves(), 1);
     scope->layout();
@@ -468,6 +468,42 @@ TEST_F(LayoutScopeTest, Active_IsHeldByTheNearestCommonAncestor) {
     EXPECT_TRUE(middle->constraints().empty());
 }
 
+TEST_F(LayoutScopeTest, ConstraintsThatNobodyKeeps_StayHeldAndCanBeTakenAway) {
+    const auto view = subview(root);
+    root->addConstraint(view->leftAnchor().constraintEqualTo(root->leftAnchor(), 5));
+    root->addConstraint(view->topAnchor().constraintEqualTo(root->topAnchor(), 7));
+    root->layoutIfNeeded();
+    EXPECT_EQ(view->frame().x, 5.0);
+    const auto held = root->constraints();
+    ASSERT_EQ(held.size(), 2U);
+    EXPECT_TRUE(held[0]->isActive());
+    EXPECT_EQ(held[0]->constant(), 5.0);
+    EXPECT_EQ(held[0]->first().view(), view);
+    EXPECT_EQ(root->constraints(), held);
+    held[0]->setActive(false);
+    EXPECT_FALSE(held[0]->isActive());
+    EXPECT_TRUE(held[1]->isActive());
+    root->layoutIfNeeded();
+    EXPECT_EQ(view->frame().x, 0.0);
+    EXPECT_EQ(view->frame().y, 7.0);
+}
+
+TEST_F(LayoutScopeTest, ConstraintOutlivesItsViews) {
+    auto view = subview(root);
+    const auto inner = view->widthAnchor().constraintEqualToConstant(5);
+    const auto outer = view->leftAnchor().constraintEqualTo(root->leftAnchor());
+    activate({inner, outer});
+    root->layoutIfNeeded();
+    view->removeFromSuperview();
+    view.reset();
+    EXPECT_FALSE(inner->isActive());
+    EXPECT_EQ(inner->first().view(), nullptr);
+    root.reset();
+    EXPECT_FALSE(outer->isActive());
+    outer->setActive(true);
+    EXPECT_FALSE(outer->isActive());
+}
+
 TEST_F(LayoutScopeTest, Activation_WithoutCommonAncestor_IsADebugLine) {
     const auto stranger = create<View>(&View::initWithFrame, Rect{});
     const auto view = subview(root);
@@ -508,7 +544,7 @@ TEST_F(LayoutScopeTest, ConstraintOnAViewThatDied_IsForgotten) {
 TEST_F(LayoutScopeTest, Dump_NamesOwnerAndViews) {
     const auto view = subview(root);
     LayoutScope scope(*root);
-    scope.add(view->leftAnchor().constraintEqualTo(root->leftAnchor(), 5));
+    scope.add({&view->leftAnchor().constraintEqualTo(root->leftAnchor(), 5)->rule(), 1});
     EXPECT_EQ(scope.dump(),
               "level input\n"
               "  owner.width = 300                                holds\n"

@@ -28,10 +28,11 @@ class QtTextEngineTest : public ::testing::Test {
         container.rightToLeft = rightToLeft;
         return std::dynamic_pointer_cast<const QtTextLayout>(engine_.layOut(AttributedString(text, kBody), container));
     }
-    static QString drawnText(const QtTextLayout& layout) { return layout.pieces().back().shaped->recipe().text; }
+    static QString drawnText(const QtTextLayout& layout) {
+        return layout.shaped()->shapedAgain().pieces.back().recipe.text;
+    }
     static std::unique_ptr<QTextLayout> shapedAgain(const QtTextLayout& layout) {
-        const ShapedText& shaped = *layout.pieces().back().shaped;
-        return shaped.recipe().layout(shaped.lines());
+        return std::move(layout.shaped()->shapedAgain().pieces.back().layout);
     }
     static QImage drawn(const QtTextLayout& layout, const QColor& color = Qt::black,
                         ColorScheme scheme = ColorScheme::Light) {
