@@ -107,17 +107,13 @@ void Optimizer::advance(int column, int direction, double distance) {
 /// How far a row may go before its guard stops it, when it changes by `slope` for each unit.
 double Optimizer::stopOf(int row, double slope) const {
     const int e = state_.tableau->rowEntity(row);
-    switch (guards_[e]) {
-        case Guard::None:
-            return kInfinite;
-        case Guard::Fixed:
-            return 0.0;
-        case Guard::AtLeastZero:
-            return slope < 0.0 ? std::max(0.0, state_.values[e] / -slope) : kInfinite;
-        case Guard::AtMostZero:
-            return slope > 0.0 ? std::max(0.0, -state_.values[e] / slope) : kInfinite;
+    const Guard guard = guards_[e];
+    if (guard == Guard::Fixed) {
+        return 0.0;
     }
-    return kInfinite;
+    const bool isApproached =
+        (guard == Guard::AtLeastZero && slope < 0.0) || (guard == Guard::AtMostZero && slope > 0.0);
+    return isApproached ? std::max(0.0, -state_.values[e] / slope) : kInfinite;
 }
 
 Optimizer::Break Optimizer::firstStop(int column, int direction, int exceptRow) const {
@@ -163,7 +159,11 @@ void Optimizer::require(int e) {
 /// Moves `e` as near to being met as locks and guards allow.
 void Optimizer::approach(int e) {
     idle_ = 0;
-    for (double miss = state_.miss(e); miss != 0.0; miss = state_.miss(e)) {
+    for (;;) {
+        const double miss = state_.miss(e);
+        if (miss == 0.0) {
+            return;
+        }
         const int sign = miss > 0.0 ? -1 : 1;
         const bool isRow = state_.tableau->isRow(e);
         const int row = isRow ? state_.tableau->rowOf(e) : -1;

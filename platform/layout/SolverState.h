@@ -49,13 +49,14 @@ struct SolverState {
 
     /// What counts as zero for this entity's value. Points beyond a millionth are noise; a sum of huge numbers carries
     /// its own rounding, a few hundred units in the last place.
-    double tolerance(int entity) const { return toleranceFor(magnitudes[entity]); }
+    double tolerance(int entity) const { return toleranceFor(magnitudes[static_cast<std::size_t>(entity)]); }
     static double toleranceFor(double magnitude) { return 1e-9 + 1e-13 * magnitude; }
 
     /// By how much the entity is missed, signed and scaled: 0 when it is met.
     double miss(int entity) const {
-        const SolverProblem::Entity& e = problem->entities[entity];
-        const double value = values[entity];
+        const auto place = static_cast<std::size_t>(entity);
+        const SolverProblem::Entity& e = problem->entities[place];
+        const double value = values[place];
         const double tolerance = this->tolerance(entity);
         if ((value > tolerance && e.isPenalisedAbove()) || (value < -tolerance && e.isPenalisedBelow())) {
             return value;

@@ -23,7 +23,7 @@ void Tableau::addColumn(int entity) {
         const int wider = std::max(16, stride_ * 2);
         std::vector<double> cells(static_cast<std::size_t>(rows()) * wider, 0.0);
         for (int r = 0; r < rows(); ++r) {
-            std::copy_n(cells_.data() + r * stride_, column, cells.data() + r * wider);
+            std::copy_n(row(r), column, cells.data() + static_cast<std::ptrdiff_t>(r) * wider);
         }
         cells_ = std::move(cells);
         stride_ = wider;
@@ -41,7 +41,7 @@ int Tableau::addRow(int entity) {
 }
 
 void Tableau::addMultiple(int row, int entity, double factor) {
-    double* cells = cells_.data() + row * stride_;
+    double* cells = cellsOf(row);
     if (!isRow(entity)) {
         cells[columnOf(entity)] += factor;
         return;
@@ -57,7 +57,7 @@ void Tableau::addMultiple(int row, int entity, double factor) {
 void Tableau::removeRow(int row) {
     const int last = rows() - 1;
     if (row != last) {
-        std::copy_n(cells_.data() + last * stride_, stride_, cells_.data() + row * stride_);
+        std::copy_n(cellsOf(last), stride_, cellsOf(row));
         rowEntity_[row] = rowEntity_[last];
         place_[rowEntity_[row]] = row;
     }
@@ -66,7 +66,7 @@ void Tableau::removeRow(int row) {
 }
 
 void Tableau::exchange(int row, int column) {
-    double* pivotRow = cells_.data() + row * stride_;
+    double* pivotRow = cellsOf(row);
     const double inverse = 1.0 / pivotRow[column];
     // The pivot's row solved for the column's entity: only its few non-zero cells touch the other rows.
     used_.clear();
@@ -78,7 +78,7 @@ void Tableau::exchange(int row, int column) {
     }
     pivotRow[column] = inverse;
     for (int r = 0; r < rows(); ++r) {
-        double* cells = cells_.data() + r * stride_;
+        double* cells = cellsOf(r);
         const double factor = cells[column];
         if (r == row || factor == 0.0) {
             continue;

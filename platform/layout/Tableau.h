@@ -13,13 +13,13 @@ class Tableau {
   public:
     int rows() const { return static_cast<int>(rowEntity_.size()); }
     int columns() const { return static_cast<int>(columnEntity_.size()); }
-    double at(int row, int column) const { return cells_[row * stride_ + column]; }
-    const double* row(int row) const { return cells_.data() + static_cast<std::ptrdiff_t>(row) * stride_; }
-    int rowEntity(int row) const { return rowEntity_[row]; }
-    int columnEntity(int column) const { return columnEntity_[column]; }
-    bool isRow(int entity) const { return place_[entity] >= 0; }
-    int rowOf(int entity) const { return place_[entity]; }
-    int columnOf(int entity) const { return -1 - place_[entity]; }
+    double at(int row, int column) const { return this->row(row)[column]; }
+    const double* row(int row) const { return cells_.data() + offset(row); }
+    int rowEntity(int row) const { return rowEntity_[index(row)]; }
+    int columnEntity(int column) const { return columnEntity_[index(column)]; }
+    bool isRow(int entity) const { return place_[index(entity)] >= 0; }
+    int rowOf(int entity) const { return place_[index(entity)]; }
+    int columnOf(int entity) const { return -1 - place_[index(entity)]; }
 
     /// A new independent entity.
     void addColumn(int entity);
@@ -37,6 +37,9 @@ class Tableau {
     void forgetExchanges() { exchanges_ = 0; }
 
   private:
+    static std::size_t index(int number) { return static_cast<std::size_t>(number); }
+    std::ptrdiff_t offset(int row) const { return static_cast<std::ptrdiff_t>(row) * stride_; }
+    double* cellsOf(int row) { return cells_.data() + offset(row); }
     void place(int entity, int where);
 
     int stride_ = 0;

@@ -1,6 +1,7 @@
 #include "platform/layout/VisualFormatParser.h"
 
 #include <charconv>
+#include <utility>
 
 namespace ktr::platform {
 
@@ -52,7 +53,7 @@ std::optional<VisualFormatSyntax> VisualFormatParser::parse() {
     }
     for (;;) {
         Syntax::Item item;
-        item.before = std::move(connection);
+        item.before = std::exchange(connection, {});
         if (!readView(item)) {
             return std::nullopt;
         }
@@ -64,7 +65,6 @@ std::optional<VisualFormatSyntax> VisualFormatParser::parse() {
             fail("'-', '[', '|' or the end");
             return std::nullopt;
         }
-        connection.reset();
         if (!readConnection(connection)) {
             return std::nullopt;
         }
