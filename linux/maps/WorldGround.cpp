@@ -24,6 +24,8 @@ constexpr double kLabelGap = 4.0;
 /// A country's name goes when the country is this many zooms larger than its name.
 constexpr double kCountryZooms = 4.5;
 constexpr double kZoomsBeforeRounding = 1.5;
+/// Borders are dashed from this zoom on.
+constexpr double kDashedFrom = 4.0;
 
 /// Where the world stands in the picture.
 struct Frame {
@@ -207,8 +209,11 @@ class Drawer {
                 }
             }
         });
-        QPen pen(style_.boundary, MapStyle::kBoundaryWidth, Qt::SolidLine, Qt::FlatCap, Qt::RoundJoin);
-        if (drawing_.request.viewport.zoom >= 4.0) {
+        const double zoom = drawing_.request.viewport.zoom;
+        // The whole world's borders are close together: there they are finer, or they would be all that is seen.
+        const double width = MapStyle::kBoundaryWidth * std::clamp(0.5 + zoom / kDashedFrom * 0.5, 0.5, 1.0);
+        QPen pen(style_.boundary, width, Qt::SolidLine, Qt::FlatCap, Qt::RoundJoin);
+        if (zoom >= kDashedFrom) {
             // Dashes are in widths. Further out they would be longer than many a border.
             pen.setDashPattern({7.0 / MapStyle::kBoundaryWidth, 3.0 / MapStyle::kBoundaryWidth,
                                 1.5 / MapStyle::kBoundaryWidth, 3.0 / MapStyle::kBoundaryWidth});
