@@ -1,5 +1,6 @@
 #include "app/Host.h"
 
+#include <QCoreApplication>
 #include <QDateTime>
 
 #include "app/ClockText.h"
@@ -59,8 +60,14 @@ Host::~Host() {
     conversation_.reset();
     window_.reset();
     delegate_.reset();
+    if (live_) {
+        // Commands under way end now, and what they leave behind runs while everything that it uses is still there:
+        // work that waits in a loop and owns that loop would keep both for ever.
+        live_.reset();
+        platform_->httpTransport.reset();
+        QCoreApplication::sendPostedEvents();
+    }
     plugin_.reset();
-    live_.reset();
     if (Platform::installed() == platform_) {
         Platform::install(nullptr);
     }

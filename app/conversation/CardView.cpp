@@ -157,6 +157,9 @@ void CardView::draw(Canvas& canvas) const {
     if (qt == nullptr) {
         return;
     }
+    if (opacity_ < 1.0) {
+        qt->painter().setOpacity(qt->painter().opacity() * opacity_);
+    }
     const QPainterPath shape = roundedPath(visibleCard(*qt, toQt(bounds())), measures::kCardCorner);
     fillPath(*qt, shape, qt->palette().card);
     // Holds for everything in the card: the caller restores the canvas when it leaves the card.

@@ -35,6 +35,8 @@ class CardView : public platform::View {
     /// Rectangles in the card's coordinates; none: nothing is marked.
     void setHighlight(const std::optional<platform::Rect>& rect);
     void setFocus(const std::optional<platform::Rect>& rect);
+    /// How much of the card is seen, from 0 to 1.
+    void setOpacity(double opacity) { opacity_ = opacity; }
 
   protected:
     void draw(platform::Canvas& canvas) const override;
@@ -53,6 +55,7 @@ class CardView : public platform::View {
     std::shared_ptr<Overlay> overlay_;
     std::optional<platform::Rect> highlight_;
     double contentHeight_ = 0.0;
+    double opacity_ = 1.0;
 };
 
 }  // namespace ktr::app

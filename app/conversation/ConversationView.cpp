@@ -11,6 +11,7 @@ namespace ktr::app {
 
 void ConversationView::addTurn(const std::shared_ptr<TurnView>& turn) {
     turns_.push_back(turn);
+    turn->setMotionStyle(style_);
     if (softColor_) {
         turn->setSoftColor(*softColor_);
     }
@@ -23,21 +24,50 @@ void ConversationView::removeTurn(const std::shared_ptr<TurnView>& turn) {
 }
 
 double ConversationView::layOut(double width) {
+    for (const auto& turn : turns_) {
+        turn->layOut(width, turn == turns_.front());
+    }
+    stack(width);
+    return frame().height;
+}
+
+void ConversationView::stack(double width) {
     const bool wide = width >= measures::kWideFrom;
     double y = wide ? measures::kWideTop : 0.0;
     for (const auto& turn : turns_) {
-        const bool first = turn == turns_.front();
-        if (wide && !first) {
+        if (wide && turn != turns_.front()) {
             y += measures::kCardToQuestion;
         }
-        const double height = turn->layOut(width, first);
-        turn->setFrame({0.0, y, width, height});
-        y += height;
+        turn->setFrame({0.0, y + turn->rise(), width, turn->height()});
+        y += turn->height();
     }
     y += wide ? measures::kWideBottom : measures::kPhoneBottom;
     setFrame({0.0, 0.0, width, y});
     layoutIfNeeded();
-    return y;
+}
+
+double ConversationView::topOf(const TurnView& turn) const {
+    return turn.superview().get() == this ? turn.frame().y - turn.rise() : 0.0;
+}
+
+void ConversationView::setMotionStyle(MotionStyle style) {
+    style_ = style;
+    for (const auto& turn : turns_) {
+        turn->setMotionStyle(style);
+    }
+}
+
+bool ConversationView::advance(double now) {
+    const bool moved = moves_;
+    moves_ = false;
+    for (const auto& turn : turns_) {
+        moves_ = turn->advance(now) || moves_;
+    }
+    if (moved || moves_) {
+        stack(frame().width);
+        setNeedsDisplay();
+    }
+    return moves_;
 }
 
 void ConversationView::setPalette(const linux_::Palette& palette) {
@@ -69,7 +99,10 @@ void ConversationView::draw(platform::Canvas& canvas) const {
         const QRectF shape = toQt(card);
         constexpr double kReach = CardShadow::kReach;
         if (visible.isNull() || visible.intersects(shape.adjusted(-kReach, -kReach, kReach, kReach))) {
+            const double whole = qt->painter().opacity();
+            qt->painter().setOpacity(whole * turn->cardOpacity());
             shadow_.paint(*qt, shape, measures::kCardCorner);
+            qt->painter().setOpacity(whole);
         }
     }
 }

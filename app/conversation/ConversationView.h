@@ -21,6 +21,15 @@ class ConversationView : public platform::View {
     const std::vector<std::shared_ptr<TurnView>>& turns() const { return turns_; }
     /// Lays everything out for a width and takes the height that it needs, which is returned; points.
     double layOut(double width);
+
+    /// What may move from now on; nothing, until this is called.
+    void setMotionStyle(MotionStyle style);
+    MotionStyle motionStyle() const { return style_; }
+    /// Brings everything to where it is at this moment, seconds; whether something goes on moving.
+    bool advance(double now);
+    /// Where a turn's top is once it has arrived, points; 0 for a turn that is none of these.
+    double topOf(const TurnView& turn) const;
+
     /// What the host's own texts take their colours from.
     void setPalette(const linux_::Palette& palette);
 
@@ -28,6 +37,11 @@ class ConversationView : public platform::View {
     void draw(platform::Canvas& canvas) const override;
 
   private:
+    /// Puts the turns one under the other, and takes the height that this needs.
+    void stack(double width);
+
+    MotionStyle style_ = MotionStyle::None;
+    bool moves_ = false;
     std::vector<std::shared_ptr<TurnView>> turns_;
     std::optional<platform::Color> softColor_;
     /// Painting keeps what it blurred.

@@ -1,5 +1,6 @@
 #include "app/conversation/TurnView.h"
 
+#include <QPainter>
 #include <algorithm>
 
 #include "app/conversation/Measures.h"
@@ -80,19 +81,103 @@ double TurnView::sentenceHeight(double width) const {
 }
 
 double TurnView::layOut(double width, bool first) {
-    return width >= measures::kWideFrom ? layOutWide(width) : layOutNarrow(width, first);
+    places_.width = width;
+    if (width >= measures::kWideFrom) {
+        layOutWide(width);
+    } else {
+        layOutNarrow(width, first);
+    }
+    if (!card_->hidden()) {
+        setCardHeight(card_->heightForWidth(places_.card.width), places_.card.width);
+    }
+    placeAnswer();
+    return height_;
 }
 
-double TurnView::layOutNarrow(double width, bool first) {
+void TurnView::layOutNarrow(double width, bool first) {
     const double cardTop = layOutNarrowSpeech(width, first);
     speech_->setFrame({0.0, 0.0, width, cardTop});
-    if (card_->hidden()) {
-        return cardTop;
+    places_.least = cardTop;
+    places_.card = {measures::kGutter, cardTop, width - 2.0 * measures::kGutter, 0.0};
+}
+
+void TurnView::setCardHeight(double height, double width) {
+    const bool moves = style_ == MotionStyle::Full && laidOutCard_ == width;
+    laidOutCard_ = width;
+    if (!moves) {
+        growth_ = Motion(height);
+    } else if (height != growth_.target()) {
+        growth_ = Motion(growth_.at(now_), height, now_, motions::kGrowth);
     }
-    const double cardWidth = width - 2.0 * measures::kGutter;
-    const double cardHeight = card_->heightForWidth(cardWidth);
-    place(*card_, {measures::kGutter, cardTop, cardWidth, cardHeight}, width);
-    return cardTop + cardHeight;
+}
+
+void TurnView::placeAnswer() {
+    const double rise = riseOf(answerArrival_);
+    if (sentenceFade_) {
+        place(*sentenceFade_, places_.sentence.offsetBy(0.0, rise), places_.sentenceParent);
+        sentence_->setFrame(sentenceFade_->bounds());
+    } else {
+        place(*sentence_, places_.sentence, places_.sentenceParent);
+    }
+    height_ = places_.least;
+    if (!card_->hidden()) {
+        Rect card = places_.card.offsetBy(0.0, rise);
+        card.height = growth_.at(now_);
+        place(*card_, card, places_.width);
+        height_ = std::max(height_, places_.card.y + card.height);
+    }
+}
+
+double TurnView::riseOf(const Motion& arrival) const {
+    return style_ == MotionStyle::Full ? motions::kRise * (1.0 - arrival.at(now_)) : 0.0;
+}
+
+double TurnView::cardOpacity() const {
+    return arrival_.at(now_) * answerArrival_.at(now_);
+}
+
+void TurnView::arrive(double now) {
+    if (style_ != MotionStyle::None) {
+        arrival_ = Motion(0.0, 1.0, now, style_ == MotionStyle::Full ? motions::kArrival : motions::kFade);
+    }
+}
+
+void TurnView::answerArrives(double now) {
+    if (style_ != MotionStyle::None) {
+        if (!sentenceFade_) {
+            sentenceFade_ = create<FadeView>(&FadeView::initWithFrame, Rect{});
+            speech_->addSubview(sentenceFade_);
+            sentenceFade_->addSubview(sentence_);
+        }
+        answerArrival_ = Motion(0.0, 1.0, now, style_ == MotionStyle::Full ? motions::kArrival : motions::kFade);
+    }
+}
+
+bool TurnView::advance(double now) {
+    const auto isOver = [&](double moment) {
+        return arrival_.isOver(moment) && answerArrival_.isOver(moment) && growth_.isOver(moment);
+    };
+    const bool moved = !isOver(now_);
+    now_ = now;
+    const bool moves = !isOver(now);
+    if (moved || moves) {
+        if (sentenceFade_) {
+            sentenceFade_->setOpacity(answerArrival_.at(now));
+        }
+        card_->setOpacity(answerArrival_.at(now));
+        placeAnswer();
+        setNeedsDisplay();
+    }
+    return moves;
+}
+
+void TurnView::draw(Canvas& canvas) const {
+    auto* qt = qtCanvas(canvas);
+    const double opacity = arrival_.at(now_);
+    if (qt != nullptr && opacity < 1.0) {
+        // Holds for everything in the turn: the caller restores the canvas when it leaves it.
+        qt->painter().setOpacity(qt->painter().opacity() * opacity);
+    }
 }
 
 double TurnView::layOutNarrowSpeech(double width, bool first) {
@@ -117,22 +202,19 @@ double TurnView::layOutNarrowSpeech(double width, bool first) {
         const double room = width - 2.0 * measures::kSentenceStart;
         const double height = sentenceHeight(room);
         sentence_->setTextAlignment(TextAlignment::Natural);
-        place(*sentence_, {measures::kSentenceStart, y, room, height}, width);
+        places_.sentence = {measures::kSentenceStart, y, room, height};
+        places_.sentenceParent = width;
         y += height + measures::kSentenceToCard;
     }
     return y;
 }
 
-double TurnView::layOutWide(double width) {
+void TurnView::layOutWide(double width) {
     const WideColumns columns = WideColumns::of(width);
     const double speechHeight = layOutWideSpeech();
     place(*speech_, {columns.speechStart, 0.0, measures::kSpeechColumn, speechHeight}, width);
-    if (card_->hidden()) {
-        return speechHeight;
-    }
-    const double cardHeight = card_->heightForWidth(columns.cardWidth);
-    place(*card_, {columns.cardStart, 0.0, columns.cardWidth, cardHeight}, width);
-    return std::max(speechHeight, cardHeight);
+    places_.least = speechHeight;
+    places_.card = {columns.cardStart, 0.0, columns.cardWidth, 0.0};
 }
 
 double TurnView::layOutWideSpeech() {
@@ -147,7 +229,8 @@ double TurnView::layOutWideSpeech() {
     if (!sentence_->hidden()) {
         const double height = sentenceHeight(kTextWidth);
         sentence_->setTextAlignment(endAlignment());
-        place(*sentence_, {0.0, y, kTextWidth, height}, kColumn);
+        places_.sentence = {0.0, y, kTextWidth, height};
+        places_.sentenceParent = kColumn;
         y += height + measures::kSentenceToTime;
     }
     time_->setHidden(texts_.shortTime.empty());

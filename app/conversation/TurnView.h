@@ -5,6 +5,8 @@
 
 #include "app/conversation/BubbleView.h"
 #include "app/conversation/CardView.h"
+#include "app/conversation/FadeView.h"
+#include "app/conversation/Motion.h"
 #include "platform/ui/Color.h"
 #include "platform/ui/Label.h"
 #include "platform/ui/View.h"
@@ -33,21 +35,62 @@ class TurnView : public platform::View {
     platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Group; }
 
     /// Lays the turn out in a conversation of this width; its height, points. Only the first turn of a narrow
-    /// conversation shows its time, above.
+    /// conversation shows its time, above. A card that was laid out before grows or shrinks to its new height where
+    /// everything may move; the height is the one of the moment.
     double layOut(double width, bool first);
 
+    void setMotionStyle(MotionStyle style) { style_ = style; }
+    /// The turn comes now, or its answer does. Seconds.
+    void arrive(double now);
+    void answerArrives(double now);
+    /// Brings everything to where it is at this moment; whether something goes on moving.
+    bool advance(double now);
+    /// Of the moment, points.
+    double height() const { return height_; }
+    /// How far the turn still is below its place, points.
+    double rise() const { return riseOf(arrival_); }
+    /// How much of the card's shadow is seen, from 0 to 1.
+    double cardOpacity() const;
+
+  protected:
+    void draw(platform::Canvas& canvas) const override;
+
   private:
-    double layOutNarrow(double width, bool first);
-    double layOutWide(double width);
+    void layOutNarrow(double width, bool first);
+    void layOutWide(double width);
+    double riseOf(const Motion& arrival) const;
+    void setCardHeight(double height, double width);
+    /// Puts sentence and card where they are at this moment, and finds the turn's height.
+    void placeAnswer();
     /// The heights of what is said: the time, the question and the sentence.
     double layOutNarrowSpeech(double width, bool first);
     double layOutWideSpeech();
     double sentenceHeight(double width) const;
 
+    /// Where things stand once nothing moves, not mirrored.
+    struct Places {
+        double width = 0.0;
+        platform::Rect sentence;  ///< in the speech
+        double sentenceParent = 0.0;
+        platform::Rect card;  ///< without its height
+        double least = 0.0;   ///< of the turn's height
+    };
+
     TurnTexts texts_;
+    Places places_;
+    double height_ = 0.0;
+    MotionStyle style_ = MotionStyle::None;
+    double now_ = 0.0;
+    Motion arrival_{1.0};
+    Motion answerArrival_{1.0};
+    Motion growth_;
+    /// The width at which the card was laid out last; 0: never.
+    double laidOutCard_ = 0.0;
     std::shared_ptr<platform::View> speech_;
     std::shared_ptr<platform::Label> time_;
     std::shared_ptr<BubbleView> bubble_;
+    /// Around the sentence once it has come on its own; else none.
+    std::shared_ptr<FadeView> sentenceFade_;
     std::shared_ptr<platform::Label> sentence_;
     std::shared_ptr<CardView> card_;
 };

@@ -47,6 +47,10 @@ ServeArguments::ServeArguments(CLI::App& program)
     command
         .add_option("--positions", options.positions, "The user's own track, for the configuration: GPX or scenario")
         ->type_name("FILE");
+    command
+        .add_option("--contacts", options.contacts,
+                    "The user's contacts, for the configuration: a vCard file or a folder of them (the friends)")
+        ->type_name("PATH");
     command.add_flag("--print-config", options.printConfig, "Print a configuration that uses this service");
     command.add_option("--write-config", options.writeConfig, "Write that configuration to a file")->type_name("FILE");
     command.add_flag("--until-stdin-closes", options.untilStdinCloses, "End when the standard input ends");

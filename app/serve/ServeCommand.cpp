@@ -13,6 +13,7 @@
 
 #include "app/serve/DevelopmentServer.h"
 #include "app/serve/FriendsReader.h"
+#include "app/serve/ServedContacts.h"
 #include "linux/account/AtomicFile.h"
 #include "linux/account/XdgFolders.h"
 #include "platform/base/Json.h"
@@ -39,7 +40,7 @@ fs::path resource(const char* name) {
 }
 
 std::string configuration(const ServeOptions& options, const DevelopmentCertificates& certificates,
-                          const std::string& userName, int port) {
+                          const std::string& userName, const std::string& contacts, int port) {
     const Dictionary account{{"personId", options.personId},
                              {"userName", userName},
                              {"host", "localhost:" + std::to_string(port)},
@@ -51,7 +52,22 @@ std::string configuration(const ServeOptions& options, const DevelopmentCertific
         track.empty() ? Dictionary{{"source", "none"}} : Dictionary{{"source", "track"}, {"file", track}};
     return platform::writeJson(Dictionary{{"account", account},
                                           {"certificates", Value::Array{certificates.authorityFile().string()}},
+                                          {"contacts", Value::Array{contacts}},
                                           {"positions", positions}});
+}
+
+/// The contacts that the configuration names; writes them where none are given. Empty, and the reason in `failure`,
+/// when that fails.
+std::string contactsFor(const ServeOptions& options, const fs::path& folder, const FriendsFile& friends,
+                        std::string& failure) {
+    if (!options.contacts.empty()) {
+        return fs::absolute(options.contacts).lexically_normal().string();
+    }
+    const fs::path file = fs::absolute(folder / "contacts.vcf").lexically_normal();
+    std::vector<ServedFriend> people = friends.friends;
+    people.push_back(friends.user);
+    failure = linux_::AtomicFile::write(file, ServedContacts::vCards(people));
+    return file.string();
 }
 
 /// Reads away what comes; false at the end of the standard input.
@@ -136,6 +152,8 @@ ExitCode ServeCommand::run(const ServeOptions& options) {
     const int signals = endingSignals();
     auto& setup = std::get<DevelopmentServer::Setup>(read);
     const std::string userName = setup.friends.user.handle();
+    std::string failure;
+    const std::string contacts = contactsFor(options, folder, setup.friends, failure);
     setup.token = certificates.token();
     setup.certificate = *certificate;
     setup.report = [](const std::string& line) { std::cout << line << std::endl; };
@@ -144,9 +162,8 @@ ExitCode ServeCommand::run(const ServeOptions& options) {
         ::close(signals);
         return complain("port " + std::to_string(options.port) + " of 127.0.0.1 cannot be used");
     }
-    const std::string config = configuration(options, certificates, userName, server.port());
-    std::string failure;
-    if (!options.writeConfig.empty()) {
+    const std::string config = configuration(options, certificates, userName, contacts, server.port());
+    if (failure.empty() && !options.writeConfig.empty()) {
         failure = linux_::AtomicFile::write(options.writeConfig, config + "\n");
     }
     if (failure.empty()) {

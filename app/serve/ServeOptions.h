@@ -18,6 +18,7 @@ struct ServeOptions {
     double intervalSeconds = -1.0;  ///< negative: as the friends file says
     std::string personId = "1000";
     std::string positions;  ///< for the printed configuration: the user's own track; empty: none
+    std::string contacts;   ///< for the configuration: vCards; empty: made of the friends
     bool printConfig = false;
     std::string writeConfig;  ///< a file; empty: none
     bool untilStdinCloses = false;

@@ -74,11 +74,14 @@ ConversationWidget::ConversationWidget(Host& host, QWidget* parent)
     connect(&ringTimer_, &QTimer::timeout, this, [this] { animateRings(); });
     flingTimer_.setInterval(kFrame);
     connect(&flingTimer_, &QTimer::timeout, this, [this] { fling(); });
+    motionTimer_.setInterval(kFrame);
+    connect(&motionTimer_, &QTimer::timeout, this, [this] { move(); });
     host_.window()->setClient(client_);
     host_.delegate().resize = [this](platform::HostSnippetViewController& controller, bool pinTop) {
         resizeCard(controller, pinTop);
     };
     choosePalette();
+    chooseMotion();
     AccessibleConversation::install();
 }
 
@@ -115,13 +118,72 @@ void ConversationWidget::choosePalette() {
 void ConversationWidget::layOut() {
     layoutRequested_ = false;
     layingOut_ = true;
+    const auto turn = anchor();
+    const double before = turn ? host_.conversation()->topOf(*turn) : 0.0;
+    host_.conversation()->advance(seconds());
     contentHeight_ = host_.layOut(width());
     layingOut_ = false;
     updateBar();
+    keepInPlace(turn, before);
+    startMoving();
     rows_.refresh();
     animateRings();
     update();
     AccessibleConversation::changed(*this);
+}
+
+void ConversationWidget::chooseMotion() {
+    const bool reduced = reducedMotion_ || nothingMoves(*this);
+    host_.conversation()->setMotionStyle(reduced ? MotionStyle::Reduced : MotionStyle::Full);
+}
+
+void ConversationWidget::startMoving() {
+    if (!motionTimer_.isActive() && (scrollFrom_ || host_.conversation()->advance(seconds()))) {
+        motionTimer_.start();
+    }
+}
+
+std::shared_ptr<TurnView> ConversationWidget::anchor() const {
+    const auto& turns = host_.conversation()->turns();
+    const auto seen =
+        std::find_if(turns.begin(), turns.end(), [&](const auto& turn) { return turn->frame().maxY() > scrolled(); });
+    return seen == turns.end() ? nullptr : *seen;
+}
+
+void ConversationWidget::keepInPlace(const std::shared_ptr<TurnView>& turn, double before) {
+    const double moved = turn ? host_.conversation()->topOf(*turn) - before : 0.0;
+    if (moved != 0.0) {
+        scrollTo(scrolled() + moved);
+        if (scrollFrom_) {
+            *scrollFrom_ += moved;
+        }
+    }
+}
+
+void ConversationWidget::move() {
+    const auto& conversation = host_.conversation();
+    const auto turn = anchor();
+    const double before = turn ? conversation->topOf(*turn) : 0.0;
+    layingOut_ = true;
+    const bool moves = conversation->advance(seconds());
+    layingOut_ = false;
+    contentHeight_ = conversation->frame().height;
+    host_.window()->setFrame(conversation->frame());
+    updateBar();
+    keepInPlace(turn, before);
+    rows_.refresh();
+    if (scrollFrom_ && !conversation->turns().empty()) {
+        const double to = conversation->topOf(*conversation->turns().back());
+        scrollTo(*scrollFrom_ + (to - *scrollFrom_) * scroll_.at(seconds()));
+        if (scroll_.isOver(seconds())) {
+            stopScrolling();
+        }
+    }
+    update();
+    if (!moves && !scrollFrom_) {
+        motionTimer_.stop();
+        AccessibleConversation::changed(*this);
+    }
 }
 
 void ConversationWidget::requestLayout() {
@@ -142,7 +204,7 @@ void ConversationWidget::requestLayout() {
 void ConversationWidget::updateBar() {
     // Below the newest turn there is always room enough to bring it to the top.
     const auto& turns = host_.conversation()->turns();
-    const double newest = turns.size() > 1 ? turns.back()->frame().y : 0.0;
+    const double newest = turns.size() > 1 ? host_.conversation()->topOf(*turns.back()) : 0.0;
     const double extent = std::max(contentHeight_, newest + height());
     const int most = std::max(static_cast<int>(std::ceil(extent)) - height(), 0);
     bar_->setPageStep(height());
@@ -158,37 +220,50 @@ void ConversationWidget::resizeCard(platform::HostSnippetViewController& control
     if (turn == turns.end()) {
         return;
     }
-    const auto edge = [&] {
-        const platform::Rect card = (*turn)->card()->frameInRoot();
-        return pinTop ? card.y : card.maxY();
-    };
-    const double before = edge();
+    if (pinTop) {
+        layOut();
+        return;
+    }
+    // At once: a bottom that stays while its card grows would push everything else about.
+    host_.conversation()->setMotionStyle(MotionStyle::None);
+    const double before = (*turn)->card()->frameInRoot().maxY() - scrolled();
     layOut();
-    scrollTo(scrolled() + edge() - before);
+    scrollTo((*turn)->card()->frameInRoot().maxY() - before);
+    chooseMotion();
 }
 
 void ConversationWidget::scrollTo(double y) {
     bar_->setValue(static_cast<int>(std::lround(y)));
 }
 
-void ConversationWidget::scrollToNewest() {
+void ConversationWidget::scrollToNewest(bool moves) {
     const auto& turns = host_.conversation()->turns();
-    if (turns.size() > 1) {
-        scrollTo(turns.back()->frame().y);
+    if (turns.size() < 2) {
+        return;
+    }
+    if (moves && host_.conversation()->motionStyle() == MotionStyle::Full) {
+        scrollFrom_ = scrolled();
+        scroll_ = Motion(0.0, 1.0, seconds(), motions::kArrival);
+        startMoving();
+    } else {
+        scrollTo(host_.conversation()->topOf(*turns.back()));
     }
 }
 
-void ConversationWidget::turnCame(TurnView& /*turn*/) {
+void ConversationWidget::turnCame(TurnView& turn) {
+    turn.arrive(seconds());
     layOut();
-    scrollToNewest();
+    scrollToNewest(true);
 }
 
-void ConversationWidget::answerCame(TurnView& /*turn*/) {
+void ConversationWidget::answerCame(TurnView& turn) {
+    turn.answerArrives(seconds());
     layOut();
 }
 
 void ConversationWidget::setReducedMotion(bool reduced) {
     reducedMotion_ = reduced;
+    chooseMotion();
     animateRings();
 }
 
@@ -246,6 +321,7 @@ void ConversationWidget::changeEvent(QEvent* event) {
 // Pointers
 
 void ConversationWidget::wheelEvent(QWheelEvent* event) {
+    stopScrolling();
     kinetic_.stop();
     const double pixels = event->pixelDelta().isNull() ? event->angleDelta().y() / kNotch * kNotchStep
                                                        : static_cast<double>(event->pixelDelta().y());
@@ -301,6 +377,7 @@ bool ConversationWidget::touch(QTouchEvent& event) {
     event.accept();
     switch (event.type()) {
         case QEvent::TouchBegin:
+            stopScrolling();
             rows_.clear();
             rows_.hover(std::nullopt);
             // A finger that stops a fling taps nothing.
@@ -360,6 +437,7 @@ void ConversationWidget::fling() {
 // Keyboard
 
 void ConversationWidget::showFocus() {
+    stopScrolling();
     constexpr double kAround = 12.0;
     if (const auto rect = rows_.focusedRect()) {
         if (rect->y - kAround < scrolled()) {
@@ -380,6 +458,7 @@ bool ConversationWidget::focusNextPrevChild(bool next) {
 }
 
 void ConversationWidget::keyPressEvent(QKeyEvent* event) {
+    stopScrolling();
     const double page = height() - kArrowStep;
     // Taken here and not as shortcuts: those need a window manager that says which window is active.
     if (event->modifiers() == Qt::ControlModifier && (event->key() == Qt::Key_Q || event->key() == Qt::Key_W)) {

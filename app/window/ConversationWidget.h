@@ -31,7 +31,7 @@ class ConversationWidget : public QWidget {
     double scrolled() const { return bar_->value(); }
     void scrollTo(double y);
     /// Puts the newest turn at the top.
-    void scrollToNewest();
+    void scrollToNewest(bool moves = false);
     /// What the arrow keys and the page keys do.
     void scrollBy(const QKeyEvent& key);
     /// A turn was added, which is the newest then; a turn got its answer.
@@ -63,6 +63,14 @@ class ConversationWidget : public QWidget {
 
     void layOut();
     void requestLayout();
+    /// The next picture of what moves.
+    void move();
+    void startMoving();
+    void chooseMotion();
+    void stopScrolling() { scrollFrom_.reset(); }
+    /// Where the turn stands on screen that the reader's eye is on: the first that is seen.
+    std::shared_ptr<TurnView> anchor() const;
+    void keepInPlace(const std::shared_ptr<TurnView>& turn, double before);
     /// Lays out again after a card's height changed; its top, or else its bottom, stays where it is on screen.
     void resizeCard(platform::HostSnippetViewController& controller, bool pinTop);
     void updateBar();
@@ -84,6 +92,10 @@ class ConversationWidget : public QWidget {
     QScrollBar* bar_;
     QTimer ringTimer_;
     QTimer flingTimer_;
+    QTimer motionTimer_;
+    /// Where the way to the newest turn began; none: nothing scrolls by itself.
+    std::optional<double> scrollFrom_;
+    Motion scroll_;
     QElapsedTimer clock_;
     KineticScroll kinetic_;
     /// Where the finger went down, while it has not moved far enough to scroll.

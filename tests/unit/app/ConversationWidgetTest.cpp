@@ -234,7 +234,7 @@ TEST_F(KTRConversationWidgetTest, HeightChange_KeepsTheCardsTopOrItsBottom) {
     open({"dinner"});
     auto turn = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
     const auto controller = platform::create<GrowingController>(&GrowingController::init);
-    turn->card()->setController(controller);
+    turn->setController(controller);
     host->conversation()->addTurn(turn);
     widget->resize(400, 701);
     QApplication::processEvents();

@@ -1,0 +1,212 @@
+#!/usr/bin/python3
+"""The real program against the real `ktr serve`, without a display: what is live moves, and every fault of the service leaves
+the last words where they are."""
+
+import concurrent.futures
+import json
+import os
+import pathlib
+import re
+import subprocess
+import sys
+import tempfile
+import time
+import unittest
+
+from serve import Service
+
+PROGRAM = os.environ["KTR_PROGRAM"]
+SOURCE = pathlib.Path(os.environ["KTR_SOURCE"])
+
+
+def place(at, label, latitude=51.45):
+    return {"at": at, "latitude": latitude, "longitude": -2.6, "label": label, "city": "Bristol"}
+
+
+def person(first, last, track, **more):
+    return {"fullName": f"{first} {last}", "firstName": first, "lastName": last, "track": track, "repeats": False,
+            "emails": [f"{first.lower()}@harbour.example"], **more}
+
+
+# Whoever asks at the start sees Ann at Home, and soon afterwards elsewhere.
+MOVING = [person("Ann", "Marsh", [place(0, "Home"), place(2, "Fish Market", 51.46)]),
+          person("Otto", "Brandt", [place(0, "Work")])]
+
+
+class LiveTest(unittest.TestCase):
+    def setUp(self):
+        folder = tempfile.TemporaryDirectory()
+        self.addCleanup(folder.cleanup)
+        self.folder = pathlib.Path(folder.name)
+
+    def serve(self, friends, *options, timeout=600):
+        """A service with these friends; gives the environment of a program that uses it."""
+        folder = pathlib.Path(tempfile.mkdtemp(dir=self.folder))
+        (folder / "friends.json").write_text(json.dumps({"timeoutSeconds": timeout, "friends": friends}))
+        service = Service(PROGRAM, "--friends", folder / "friends.json", "--write-config", folder / "config.json",
+                          *map(str, options))
+        self.addCleanup(service.__exit__)
+        environment = {k: v for k, v in os.environ.items() if k not in ("DISPLAY", "WAYLAND_DISPLAY", "QT_QPA_PLATFORM")}
+        return {**environment, "KTR_CONFIG": str(folder / "config.json"), "XDG_STATE_HOME": str(folder / "state")}
+
+    def run_live(self, environment, command, seconds, *arguments, question="Where are my friends?"):
+        ask = [] if question is None else ["--ask", question]
+        begin = time.monotonic()
+        result = subprocess.run([PROGRAM, command, "--live", f"{seconds}s", *ask, "--language", "en-GB", *map(str, arguments)],
+                                env=environment, capture_output=True, timeout=seconds + 30, text=True, encoding="utf-8")
+        result.seconds = time.monotonic() - begin
+        return result
+
+    def describe(self, friends, seconds, *options, question="Where are my friends?", timeout=600):
+        return self.run_live(self.serve(friends, *options, timeout=timeout), "describe", seconds, question=question)
+
+    def test_friends_move(self):
+        result = self.describe(MOVING, 3, "--interval", "0.4")
+        self.assertEqual(result.returncode, 0, result.stderr)
+        self.assertIn("At Fish Market, Ann Marsh", result.stdout)
+        self.assertIn("At Work, Otto Brandt", result.stdout)
+        self.assertIn("Here is where they are.", result.stdout)
+        self.assertIn("Live · updated just now", result.stderr)
+        self.assertRegex(result.stderr, r"the service was asked: [2-9]\d* answers, 0 failures")
+
+    def test_picture_shows_where_they_have_moved_to(self):
+        environment = self.serve(MOVING, "--interval", "0.4")
+        before, after = self.folder / "before.png", self.folder / "after.png"
+        self.assertEqual(self.run_live(environment, "render", 0.1, "-o", before).returncode, 0)
+        self.assertEqual(self.run_live(environment, "render", 3, "-o", after).returncode, 0)
+        self.assertNotEqual(before.read_bytes(), after.read_bytes())
+
+    def test_scenario_is_asked_about_at_the_service(self):
+        scenario = self.folder / "ann.json"
+        context = "ktrServerContext://serverContext?minCallbackIntervalInMS=300&callbackTimeoutIntervalInMS=60000&"
+        scenario.write_text(json.dumps({"clock": "2001-05-16T17:42:00+01:00", "sentence": "Here is Ann.", "snippet": {
+            "kind": "VAKtrLocationSnippet", "proximity": "here", "searchContext": context, "locations": [
+                {"friend": {"object": {"fullName": "Ann Marsh", "emails": [{"emailAddress": "ann@harbour.example"}]}}}]}}))
+        result = self.run_live(self.serve(MOVING), "describe", 2, scenario, question=None)
+        self.assertEqual(result.returncode, 0, result.stderr)
+        self.assertRegex(result.stdout, r"At (Home|Fish Market), Ann Marsh, .*Located now")
+
+    def test_question_that_is_not_understood_gets_its_sentence(self):
+        result = self.describe(MOVING, 0.2, question="Tell me a joke")
+        self.assertEqual(result.returncode, 0, result.stderr)
+        self.assertIn('Ask "Where is Ann?"', result.stdout)
+        self.assertNotIn("Friends", result.stdout)
+
+    def test_looking_for_friends_becomes_none_found(self):
+        nobody = [person("Zofia", "Wrona", []), person("Kwame", "Asare", [])]
+        self.assertIn("Finding your friends…", self.describe(nobody, 0.3, "--interval", "60").stdout)
+        # The answer comes after the asking has ended, and is the last.
+        result = self.describe(nobody, 2, "--interval", "0.3", "--fault", "delay=0.6", timeout=0.5)
+        self.assertIn("No friends found there.", result.stdout)
+
+    def test_friend_appears_once_found(self):
+        late = [person("Kwame", "Asare", [place(0, "Home")], locatedAfter=1.5), person("Zofia", "Wrona", [])]
+        result = self.describe(late, 3, "--interval", "0.3")
+        self.assertIn("At Home, Kwame Asare", result.stdout)
+
+    # Faults: words of the fault, what the status line says at the end, what is on screen at the end.
+    WAS, IS = "At Home, Ann Marsh", "At Fish Market, Ann Marsh"
+    OFFLINE = r"Offline\. Showing what was known at \d?\d:\d\d"
+    LIVE = "Live · updated just now"
+    FAULTS = {
+        "slow answers": ("delay=0.5", LIVE, IS),
+        "cut before the answer": ("cut=before", OFFLINE, WAS),
+        "cut after the headers": ("cut=headers", OFFLINE, WAS),
+        "cut in the body": ("cut=body", OFFLINE, WAS),
+        "credentials refused": ("status=401", "Sign in again to see your friends", WAS),
+        "forbidden": ("status=403", OFFLINE, WAS),
+        "server error": ("status=500", OFFLINE, WAS),
+        "unavailable later": ("status=503,at=3", OFFLINE, None),
+        "redirect to itself": ("redirect={origin}{path},count=1", LIVE, IS),
+        "redirect for ever": ("redirect={origin}{path}", OFFLINE, WAS),
+        "redirect elsewhere": ("redirect=https://127.0.0.1:{port}{path}", OFFLINE, WAS),
+        "redirect without encryption": ("redirect=http://localhost:{port}{path}", OFFLINE, WAS),
+        "redirect that makes a GET": ("redirect={origin}{path},redirectStatus=302", OFFLINE, WAS),
+        "no JSON": ("body=not-json", OFFLINE, WAS),
+        "a list": ("body=array", OFFLINE, WAS),
+        "a million brackets": ("body=deep", OFFLINE, WAS),
+        "an endless body": ("body=endless", None, WAS),
+        "an empty body": ("body=empty", OFFLINE, WAS),
+        "a truncated body": ("body=truncated", OFFLINE, WAS),
+        "a slow body": ("bytesPerSecond=20", LIVE, WAS),
+        "an object of nothing": ("text={}", None, "Finding your friends…"),
+        "half of the friends": ("statusCode=416", LIVE, IS),
+        "nobody is reported": ("entryStatus=411", LIVE, "Finding your friends…"),
+        "one is not reported": ("entryStatus=411,entry=ann@harbour.example", LIVE, "At Work, Otto Brandt"),
+        "asking ends": ("interval=0", "Paused · updated just now", None),
+        "asking goes on in an hour": ("interval=3600", LIVE, None),
+    }
+
+    def check_fault(self, name):
+        words, status, shown = self.FAULTS[name]
+        result = self.describe(MOVING, 3.5, "--interval", "0.4", "--fault", words)
+        told = f"{name}\n{result.stdout}\n{result.stderr}"
+        assert result.returncode == 0, told
+        assert result.seconds < 12.0, told
+        assert "Where are my friends?" in result.stdout, told
+        assert shown is None or shown in result.stdout, told
+        last = result.stderr.rstrip().rsplit("ktr: ", 1)[-1]
+        assert status is None or re.search(status, result.stderr), told
+        assert status is None or re.match(status, last) or last.startswith("the service was asked"), told
+
+    def test_every_fault_leaves_the_last_words(self):
+        with concurrent.futures.ThreadPoolExecutor(9) as pool:
+            for name, check in [(name, pool.submit(self.check_fault, name)) for name in self.FAULTS]:
+                with self.subTest(name):
+                    check.result()
+
+    def test_service_that_ends_leaves_the_last_words(self):
+        friends = self.folder / "friends.json"
+        friends.write_text(json.dumps({"friends": MOVING}))
+        config = self.folder / "config.json"
+        service = Service(PROGRAM, "--friends", friends, "--write-config", config, "--interval", "0.3")
+        self.addCleanup(service.__exit__)
+        environment = {**os.environ, "KTR_CONFIG": str(config), "XDG_STATE_HOME": str(self.folder / "state")}
+        program = subprocess.Popen([PROGRAM, "describe", "--live", "3s", "--ask", "Where are my friends?"], env=environment,
+                                   stdout=subprocess.PIPE, stderr=subprocess.PIPE, text=True, encoding="utf-8")
+        first = program.stderr.readline()
+        self.assertIn("Live", first)
+        service.end()
+        told, rest = program.communicate(timeout=30)
+        self.assertEqual(program.returncode, 0)
+        self.assertIn("Ann Marsh", told)
+        self.assertIn("Offline. Showing what was known at", rest)
+
+    def test_without_an_account_nobody_is_asked(self):
+        environment = {**os.environ, "KTR_CONFIG": str(self.folder / "none.json"), "XDG_STATE_HOME": str(self.folder)}
+        result = self.run_live(environment, "describe", 0.3)
+        self.assertEqual(result.returncode, 1)
+        self.assertIn("Sign in to ask about your friends.", result.stdout)
+        self.assertIn("Sign in again to see your friends.", result.stderr)
+
+    def test_assistant_of_another_certificate_is_not_believed(self):
+        result = self.describe(MOVING, 0.3, "--certificate", "foreign")
+        self.assertEqual(result.returncode, 1)
+        self.assertIn("Your assistant is out of reach right now.", result.stdout)
+        self.assertIn("its host could not prove who it is", result.stderr)
+
+    def test_broken_configuration_is_told(self):
+        config = self.folder / "config.json"
+        config.write_text('{"account": {"personId": 5}}')
+        environment = {**os.environ, "KTR_CONFIG": str(config), "XDG_STATE_HOME": str(self.folder)}
+        result = self.run_live(environment, "describe", 0.3)
+        self.assertEqual(result.returncode, 1)
+        self.assertIn("$.account.personId", result.stderr)
+
+    def test_run_without_a_display_draws_and_ends_the_service(self):
+        environment = {k: v for k, v in os.environ.items() if k not in ("DISPLAY", "WAYLAND_DISPLAY")}
+        environment.update(KTR_RUN_SECONDS="1", XDG_STATE_HOME=str(self.folder / "state"),
+                           KTR_RUN_LOG=str(self.folder / "service.log"))
+        result = subprocess.run([SOURCE / "scripts" / "show", PROGRAM], cwd=self.folder, env=environment, timeout=120,
+                                capture_output=True, text=True, encoding="utf-8")
+        self.assertEqual(result.returncode, 0, result.stderr)
+        self.assertTrue((self.folder / "out" / "live.png").exists())
+        self.assertTrue((self.folder / "out" / "dinner.png").exists())
+        self.assertIn("Ann Marsh", result.stdout)
+        port = re.search(r"localhost:(\d+)", result.stdout).group(1)
+        listening = pathlib.Path("/proc/net/tcp").read_text()
+        self.assertNotRegex(listening, rf"0100007F:{int(port):04X} 00000000:0000 0A")
+
+
+if __name__ == "__main__":
+    sys.exit(unittest.main())
