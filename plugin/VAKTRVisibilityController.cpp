@@ -3,6 +3,7 @@
 #include <utility>
 
 #include "model/LogCategory.h"
+#include "model/PluginBundle.h"
 #include "service/ContextValues.h"
 
 namespace ktr {
@@ -64,6 +65,8 @@ void VAKTRVisibilityController::loadView() {
         friendView_->setSeparatorEnabled(false);
         return;
     }
+    // Seen, the map says that the place is shared; a hidden user's row says so itself.
+    friendView_->setAccessibilityLabel(AssistantLocalizedString("ACCESSIBILITY_SHARED_LOCATION"));
     const Rect mapFrame{0.0, 0.0, currentWidth(), KTRDynVelaMapView::mapHeight()};
     mapView_ = create<KTRDynVelaMapView>(&KTRDynVelaMapView::initWithFrame, mapFrame);
     mapView_->setIsVisibilityMap(true);

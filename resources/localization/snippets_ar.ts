@@ -44,6 +44,11 @@
         <translation>مخفيّ عن الأصدقاء</translation>
     </message>
     <message>
+        <source>ACCESSIBILITY_SHARED_LOCATION</source>
+        <extracomment>Read aloud before the user’s own row while friends can see where the user is. English: “Friends can see where you are”</extracomment>
+        <translation>يمكن للأصدقاء رؤية مكانك</translation>
+    </message>
+    <message>
         <source>LOCATED_NOW</source>
         <extracomment>How old a position is: up to 30 seconds. English: “Now”</extracomment>
         <translation>الآن</translation>

@@ -44,6 +44,11 @@
         <translation>Hidden from friends</translation>
     </message>
     <message>
+        <source>ACCESSIBILITY_SHARED_LOCATION</source>
+        <extracomment>Read aloud before the user’s own row while friends can see where the user is</extracomment>
+        <translation>Friends can see where you are</translation>
+    </message>
+    <message>
         <source>LOCATED_NOW</source>
         <extracomment>How old a position is: up to 30 seconds</extracomment>
         <translation>Now</translation>

@@ -44,6 +44,11 @@
         <translation>友だちに非公開</translation>
     </message>
     <message>
+        <source>ACCESSIBILITY_SHARED_LOCATION</source>
+        <extracomment>Read aloud before the user’s own row while friends can see where the user is. English: “Friends can see where you are”</extracomment>
+        <translation>友だちにあなたの居場所が見えます</translation>
+    </message>
+    <message>
         <source>LOCATED_NOW</source>
         <extracomment>How old a position is: up to 30 seconds. English: “Now”</extracomment>
         <translation>たった今</translation>

@@ -70,7 +70,10 @@ class DemoMapTest(unittest.TestCase):
         seen = 0
         for path in sorted((ROOT / "resources/scenarios").glob("*.json")):
             scenario = json.loads(path.read_text(encoding="utf-8"))
-            places = scenario.get("positions", []) + (scenario["snippet"].get("locations") or [])
+            snippet = scenario["snippet"]
+            places = scenario.get("positions", []) + (snippet.get("locations") or [])
+            if "cueKtrGeoFence" in snippet:
+                places.append(snippet["cueKtrGeoFence"]["location"])
             for place in places:
                 if "latitude" in place:
                     self.check_place(place["latitude"], place["longitude"], f"{path.name}: {place.get('label', 'somebody')}")

@@ -1,5 +1,6 @@
 #include "plugin/VAKTRVisibilityController.h"
 
+#include "platform/ui/Accessibility.h"
 #include "platform/ui/Window.h"
 #include "tests/support/FakeHost.h"
 #include "tests/support/Friends.h"
@@ -161,6 +162,23 @@ TEST_F(VAKTRVisibilityControllerTest, RowStartsWithoutHeight) {
 TEST_F(VAKTRVisibilityControllerTest, RowHasNoViewDelegate_IsKept) {
     EXPECT_EQ(shown(true)->friendView()->viewDelegate(), nullptr);
     EXPECT_EQ(shown(false)->friendView()->viewDelegate(), nullptr);
+}
+
+TEST_F(VAKTRVisibilityControllerTest, SharingIsSaidWithoutSeeing) {
+    localization->set("org.ktr.snippets", "ACCESSIBILITY_SHARED_LOCATION", "Friends see you");
+    const auto spoken = [](Controller& controller) {
+        const auto tree = accessibilityTree(controller.view(), false);
+        return tree.children.empty() ? "nothing" : tree.children.front().text;
+    };
+    const auto visible = shown(true);
+    visible->view()->setFrame({0.0, 0.0, kWidth, 300.0});
+    visible->view()->layoutIfNeeded();
+    EXPECT_EQ(spoken(*visible), "Friends see you");
+    const auto hidden = shown(false);
+    hidden->view()->setFrame({0.0, 0.0, kWidth, 80.0});
+    hidden->view()->layoutIfNeeded();
+    EXPECT_EQ(spoken(*hidden), "") << "the place text says it";
+    EXPECT_EQ(hidden->friendView()->locationLabel()->accessibilityText(), "Hidden");
 }
 
 TEST_F(VAKTRVisibilityControllerTest, MapShowsTheUser) {
