@@ -40,7 +40,7 @@ class LabelShaper {
         bool isBold = false;
         double haloWidth = 0.0;
         std::string language;
-        auto operator<=>(const Style&) const = default;
+        auto operator<=>(const Style&) const = default;  // NOLINT(modernize-use-nullptr): it has none
     };
 
     /// Null for a name with nothing to see.

@@ -69,7 +69,7 @@ struct MapTile {
         std::size_t total = sizeof *this + features.size() * sizeof(Feature) + partEnds.size() * sizeof(std::uint32_t) +
                             spots.size() * sizeof(Spot);
         for (const auto& name : names) {
-            total += sizeof name + name.size();
+            total += sizeof(std::string) + name.size();
         }
         return total;
     }

@@ -20,7 +20,7 @@ class TilePictures {
         unsigned version = 0;
     };
 
-    virtual ~TilePictures() = default;
+    virtual ~TilePictures();
     /// Whether it can be asked now: asked before each drawing.
     virtual bool open() = 0;
     virtual int coarsest() const = 0;
@@ -31,7 +31,7 @@ class TilePictures {
     /// `isWanted`: fetch it where that takes a while; else only what is at hand is of use.
     virtual Answer tile(const TileKey& key, bool isWanted) = 0;
     /// As MapGround's.
-    virtual void setChangeHandler(std::function<void()> /*changed*/) {}
+    virtual void setChangeHandler(std::function<void()> changed);
 };
 
 }  // namespace ktr::linux_

@@ -88,7 +88,7 @@ Coordinate LocationShifter::shiftedForInstalledMaps(const Coordinate& coordinate
     return shifted(coordinate, installed && installed->maps ? installed->maps->datum() : MapDatum::Wgs84);
 }
 
-void LocationShifter::shiftLocation(const std::shared_ptr<PlatformLocation>& location, Completion completion) {
+void LocationShifter::shiftLocation(const std::shared_ptr<PlatformLocation>& location, const Completion& completion) {
     completion(shiftedForInstalledMaps(location ? location->coordinate() : Coordinate{}));
 }
 

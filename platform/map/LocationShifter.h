@@ -20,7 +20,7 @@ class KTR_API LocationShifter : public Object {
 
     /// Calls back once, at once or on a later turn of the main loop. The coordinate stays as it is while the installed
     /// platform's map data is in WGS84, outside the area of the other datum, and when it is invalid.
-    virtual void shiftLocation(const std::shared_ptr<PlatformLocation>& location, Completion completion);
+    virtual void shiftLocation(const std::shared_ptr<PlatformLocation>& location, const Completion& completion);
 
     /// Any thread. The formulas of GCJ-02 as they have been published (offsets in polynomials and sines, on the
     /// Krasovsky 1940 ellipsoid); within mainland China, whose outline is taken coarsely.

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <set>
 
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/base/MainLoop.h"
@@ -164,6 +165,7 @@ void PlatformMapView::updateNow() {
 /// The user behind the pins, these in their order, the corners in front.
 void PlatformMapView::arrangeViews(const std::vector<std::shared_ptr<MapAnnotation>>& annotations) {
     std::vector<std::shared_ptr<View>> wanted;
+    wanted.reserve(annotations.size() + 1);
     for (const auto& annotation : annotations) {
         wanted.push_back(layer_->viewFor(*annotation));
     }
@@ -297,10 +299,11 @@ void PlatformMapView::removeAnnotation(const std::shared_ptr<MapAnnotation>& ann
 }
 
 void PlatformMapView::removeAnnotations(const std::vector<std::shared_ptr<MapAnnotation>>& annotations) {
-    // The list may be this map's own.
-    const auto removed = annotations;
-    for (const auto& annotation : removed) {
-        removeAnnotation(annotation);
+    // A set, as the list may be this map's own.
+    const std::set<std::shared_ptr<MapAnnotation>> removed(annotations.begin(), annotations.end());
+    if (std::erase_if(annotations_, [&](const auto& one) { return removed.count(one) > 0; }) > 0) {
+        setNeedsUpdate();
+        setNeedsLayout();
     }
 }
 
@@ -330,9 +333,11 @@ void PlatformMapView::removeOverlay(const std::shared_ptr<MapOverlay>& overlay) 
 }
 
 void PlatformMapView::removeOverlays(const std::vector<std::shared_ptr<MapOverlay>>& overlays) {
-    const auto removed = overlays;
-    for (const auto& overlay : removed) {
-        removeOverlay(overlay);
+    const std::set<std::shared_ptr<MapOverlay>> removed(overlays.begin(), overlays.end());
+    if (std::erase_if(overlays_, [&](const auto& one) { return removed.count(one) > 0; }) > 0) {
+        overlaysChanged_ = true;
+        setNeedsUpdate();
+        setNeedsLayout();
     }
 }
 
