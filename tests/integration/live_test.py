@@ -76,13 +76,17 @@ class LiveTest(unittest.TestCase):
         self.assertEqual(self.run_live(environment, "render", 3, "-o", after).returncode, 0)
         self.assertNotEqual(before.read_bytes(), after.read_bytes())
 
-    def test_scenario_is_asked_about_at_the_service(self):
+    def snippet_of_ann(self):
+        """An answer that asks the service twice after 0.3 seconds, and then as the service says."""
         scenario = self.folder / "ann.json"
         context = "ktrServerContext://serverContext?minCallbackIntervalInMS=300&callbackTimeoutIntervalInMS=60000&"
         scenario.write_text(json.dumps({"clock": "2001-05-16T17:42:00+01:00", "sentence": "Here is Ann.", "snippet": {
             "kind": "VAKtrLocationSnippet", "proximity": "here", "searchContext": context, "locations": [
                 {"friend": {"object": {"fullName": "Ann Marsh", "emails": [{"emailAddress": "ann@harbour.example"}]}}}]}}))
-        result = self.run_live(self.serve(MOVING), "describe", 2, scenario, question=None)
+        return scenario
+
+    def test_scenario_is_asked_about_at_the_service(self):
+        result = self.run_live(self.serve(MOVING), "describe", 2, self.snippet_of_ann(), question=None)
         self.assertEqual(result.returncode, 0, result.stderr)
         self.assertRegex(result.stdout, r"At (Home|Fish Market), Ann Marsh, .*Located now")
 
@@ -171,6 +175,90 @@ class LiveTest(unittest.TestCase):
         self.assertEqual(program.returncode, 0)
         self.assertIn("Ann Marsh", told)
         self.assertIn("Offline. Showing what was known at", rest)
+
+    def shard(self, *options):
+        """Another host of the same service, at a port of its own."""
+        shard = Service(PROGRAM, "--ca-dir", str(self.folder / "ca"), "--friends", self.folder / "shard.json", *options)
+        self.addCleanup(shard.__exit__)
+        return shard
+
+    def serve_with_shard(self, shard, *options):
+        """The account's own service, which may lead commands to the shard; gives it and the environment of a program."""
+        config = self.folder / "config.json"
+        service = Service(PROGRAM, "--ca-dir", str(self.folder / "ca"), "--friends", self.folder / "shard.json",
+                          "--write-config", config, "--interval", "60", *options)
+        self.addCleanup(service.__exit__)
+        written = json.loads(config.read_text())
+        written["account"]["domains"] = [f"localhost:{shard.port}"]
+        config.write_text(json.dumps(written))
+        return service, {**os.environ, "KTR_CONFIG": str(config), "XDG_STATE_HOME": str(self.folder / "state")}
+
+    def remembered(self):
+        file = self.folder / "state" / "ktr" / "preferences" / "org.ktr.snippets.json"
+        return json.loads(file.read_text()).get("RedirectedHostKey") if file.exists() else None
+
+    def told(self, environment):
+        """The last words of the status line once a snippet has asked twice."""
+        return self.run_live(environment, "describe", 1.5, self.snippet_of_ann(), question=None).stderr
+
+    def commands(self, service):
+        return [line for line in service.end()[1] if "getlocations" in line]
+
+    def test_redirect_is_remembered_by_the_next_program_until_it_answers_401(self):
+        (self.folder / "shard.json").write_text(json.dumps({"friends": MOVING}))
+        shard = self.shard("--fault", "status=401,at=5")
+        redirect = f"redirect=https://localhost:{shard.port}{{path}},count=2"
+        service, environment = self.serve_with_shard(shard, "--fault", redirect)
+        self.assertIn("Live", self.told(environment))
+        self.assertEqual(self.remembered(), f"localhost:{shard.port}")
+        self.assertIn("Live", self.told(environment))
+        self.assertEqual(self.remembered(), f"localhost:{shard.port}")
+        self.assertIn("Sign in again", self.told(environment))
+        self.assertIsNone(self.remembered())
+        self.assertIn("Live", self.told(environment))
+        self.assertIsNone(self.remembered())
+        self.assertEqual(len(self.commands(shard)), 6)
+        self.assertEqual(len(self.commands(service)), 4)
+
+    def test_remembered_host_that_cannot_prove_itself_is_forgotten(self):
+        (self.folder / "shard.json").write_text(json.dumps({"friends": MOVING}))
+        for kind in ("expired", "wrong-host", "foreign"):
+            with self.subTest(kind):
+                shard = self.shard("--certificate", kind)
+                service, environment = self.serve_with_shard(shard)
+                file = self.folder / "state" / "ktr" / "preferences" / "org.ktr.snippets.json"
+                file.parent.mkdir(parents=True, exist_ok=True)
+                file.write_text(json.dumps({"RedirectedHostKey": f"localhost:{shard.port}"}))
+                self.assertIn("Offline", self.told(environment))
+                self.assertIsNone(self.remembered())
+                self.assertIn("Live", self.told(environment))
+                self.assertEqual(self.commands(shard), [])
+                self.assertEqual(len(self.commands(service)), 2)
+
+    @unittest.skipUnless(os.environ.get("KTR_LONG_TESTS"), "a minute of asking: KTR_LONG_TESTS=1 runs it")
+    def test_asking_thousands_of_times_grows_nothing(self):
+        told = self.folder / "told"
+        with told.open("w") as output:
+            program = subprocess.Popen([PROGRAM, "describe", "--live", "60s", "--ask", "Where are my friends?"],
+                                       env=self.serve(MOVING, "--interval", "0.02"), stdout=output, stderr=output)
+        begin = time.monotonic()
+
+        def grown(at):
+            """The most memory, KiB, and files that it had at three moments from there on."""
+            seen = []
+            for _ in range(3):
+                time.sleep(max(begin + at - time.monotonic(), 1.0))
+                status = pathlib.Path(f"/proc/{program.pid}/status").read_text()
+                seen.append((int(re.search(r"VmRSS:\s+(\d+)", status).group(1)),
+                             len(os.listdir(f"/proc/{program.pid}/fd"))))
+            return max(memory for memory, _ in seen), max(files for _, files in seen)
+
+        early, late = grown(20), grown(50)
+        self.assertEqual(program.wait(timeout=60), 0)
+        answers = re.findall(r"was asked: (\d+) answers, 0 failures", told.read_text(encoding="utf-8"))
+        self.assertGreater(int(answers[-1]), 500)
+        self.assertLess(late[0], early[0] + 4096)
+        self.assertLess(late[1], early[1] + 8)
 
     def test_without_an_account_nobody_is_asked(self):
         environment = {**os.environ, "KTR_CONFIG": str(self.folder / "none.json"), "XDG_STATE_HOME": str(self.folder)}

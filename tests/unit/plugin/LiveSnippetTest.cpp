@@ -5,7 +5,9 @@
 #include "tests/support/PlatformTest.h"
 
 #include <cstdlib>
+#include <filesystem>
 #include <fstream>
+#include <iterator>
 
 namespace ktr::test {
 namespace {
@@ -193,6 +195,11 @@ std::size_t residentBytes() {
     return resident * 4096;
 }
 
+/// Files, sockets and the like that the process has open.
+std::ptrdiff_t openDescriptors() {
+    return std::distance(std::filesystem::directory_iterator("/proc/self/fd"), std::filesystem::directory_iterator());
+}
+
 TEST_F(LiveSnippetTest, Month_OfPollingEveryTenSecondsGrowsNothing) {
     if (std::getenv("KTR_LONG_TESTS") == nullptr) {
         GTEST_SKIP() << "a month takes a minute: KTR_LONG_TESTS=1 runs it";
@@ -214,6 +221,7 @@ TEST_F(LiveSnippetTest, Month_OfPollingEveryTenSecondsGrowsNothing) {
 
     std::size_t answered = 0;
     std::size_t memory = 0;
+    std::ptrdiff_t descriptors = 0;
     std::size_t timers = 0;
     std::size_t observers = 0;
     for (int day = 0; day < kDays; ++day) {
@@ -230,6 +238,7 @@ TEST_F(LiveSnippetTest, Month_OfPollingEveryTenSecondsGrowsNothing) {
         localization->asked.clear();
         if (day == 1) {
             memory = residentBytes();
+            descriptors = openDescriptors();
             timers = time->pendingTimers();
             observers = platform->notificationCenter->observerCount();
         }
@@ -237,6 +246,7 @@ TEST_F(LiveSnippetTest, Month_OfPollingEveryTenSecondsGrowsNothing) {
     EXPECT_EQ(answered, 259200U);
     EXPECT_LE(time->pendingTimers(), timers + 1);
     EXPECT_EQ(platform->notificationCenter->observerCount(), observers);
+    EXPECT_EQ(openDescriptors(), descriptors);
     EXPECT_LE(residentBytes(), memory + std::size_t{8} * 1024 * 1024);
 }
 
