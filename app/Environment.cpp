@@ -97,7 +97,8 @@ platform::LengthSystem lengthSystem(const Platform& platform) {
 }
 
 void addMaps(Platform& platform, const HostSettings& settings, const linux_::Configuration& configuration) {
-    platform.lengths = std::make_shared<linux_::IcuLengthFormatter>(settings.language, lengthSystem(platform));
+    platform.lengths = std::make_shared<linux_::IcuLengthFormatter>(
+        linux_::LocaleRegion(settings.region).localeWithLanguage(settings.language), lengthSystem(platform));
     platform.mapsApplication = std::make_shared<linux_::DesktopMapsApplication>();
     platform.maps = linux_::ConfiguredMaps::make(configuration, resourceFolder(), platform.mainLoop);
 }

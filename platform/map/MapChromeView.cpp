@@ -17,6 +17,7 @@ namespace {
 
 constexpr double kScaleIn = 14.0;  // from the start
 constexpr double kScaleUp = 13.0;  // from the lower edge
+constexpr double kScaleFromTop = 27.0;
 constexpr double kTick = 4.0;
 constexpr double kScaleLine = 1.5;
 constexpr double kScaleHalo = 2.8;
@@ -73,28 +74,47 @@ Rect MapChromeView::placed(const Rect& rect, double width) const {
     return isRightToLeft() ? Rect{width - rect.maxX(), rect.y, rect.width, rect.height} : rect;
 }
 
+/// Room for any scale bar and its words.
+Rect MapChromeView::scaleRoom(const Size& size, bool isAbove) const {
+    constexpr double kAround = 6.0;
+    constexpr double kHeight = 36.0;
+    const double y = isAbove ? 0.0 : size.height - kHeight;
+    return placed({kScaleIn - kAround, y, kMostScale + 2.0 * kAround, kHeight}, size.width);
+}
+
+/// Room for the attribution, and for a usual one before it is known.
+Rect MapChromeView::pillRoom(const Size& size, bool isAbove) const {
+    const Size text = attributionLayout_ ? attributionLayout_->usedSize() : Size{};
+    const double width = std::max(text.width + 2.0 * kPillPadding, std::min(kUsualPill, size.width - 2.0 * kPillIn));
+    const double height = std::max(kPillHeight, text.height + kPillHeight - kFont.lineHeight());
+    const double y = isAbove ? kPillUp : size.height - kPillUp - height;
+    return placed({size.width - kPillIn - width, y, width, height}, size.width);
+}
+
 Rect MapChromeView::pillRect(const Size& size) const {
     if (!attributionLayout_) {
         return {};
     }
-    const Size text = attributionLayout_->usedSize();
-    const double width = text.width + 2.0 * kPillPadding;
-    const double height = std::max(kPillHeight, text.height + kPillHeight - kFont.lineHeight());
-    return placed({size.width - kPillIn - width, size.height - kPillUp - height, width, height}, size.width);
+    const double width = attributionLayout_->usedSize().width + 2.0 * kPillPadding;
+    const Rect room = pillRoom(size, isPillAbove_);
+    return placed({size.width - kPillIn - width, room.y, width, room.height}, size.width);
+}
+
+void MapChromeView::avoid(const std::vector<Rect>& rects, const Size& size) {
+    const auto isTaken = [&](const Rect& room) {
+        return std::any_of(rects.begin(), rects.end(), [&](const Rect& rect) { return rect.intersects(room); });
+    };
+    const bool isScaleAbove = isTaken(scaleRoom(size, false)) && !isTaken(scaleRoom(size, true));
+    const bool isPillAbove = isTaken(pillRoom(size, false)) && !isTaken(pillRoom(size, true));
+    if (isScaleAbove != isScaleAbove_ || isPillAbove != isPillAbove_) {
+        isScaleAbove_ = isScaleAbove;
+        isPillAbove_ = isPillAbove;
+        setNeedsDisplay();
+    }
 }
 
 std::vector<Rect> MapChromeView::clearRects(const Size& size) const {
-    constexpr double kAround = 6.0;
-    constexpr double kScaleHeight = 36.0;
-    const Rect scale{kScaleIn - kAround, size.height - kScaleHeight, kMostScale + 2.0 * kAround, kScaleHeight};
-    const double usual = std::min(kUsualPill, size.width - 2.0 * kPillIn);
-    Rect pill =
-        placed({size.width - kPillIn - usual, size.height - kPillUp - kPillHeight, usual, kPillHeight}, size.width);
-    const Rect actual = pillRect(size);
-    if (actual.width > pill.width || actual.height > pill.height) {
-        pill = actual;
-    }
-    return {placed(scale, size.width), pill};
+    return {scaleRoom(size, isScaleAbove_), pillRoom(size, isPillAbove_)};
 }
 
 void MapChromeView::draw(Canvas& canvas) const {
@@ -126,6 +146,11 @@ void MapChromeView::drawScale(Canvas& canvas) const {
     if (!installed || !installed->lengths) {
         return;
     }
+    // Of half the world no one scale is true.
+    constexpr double kCoarsest = 20000.0;
+    if (viewport_.metresPerPoint() > kCoarsest) {
+        return;
+    }
     const ScaleBar bar = ScaleBar::at(viewport_.metresPerPoint(), installed->lengths->system());
     const auto words = layOut(installed->lengths->text(bar.amount, bar.unit, LengthWidth::Short), kFont,
                               std::numeric_limits<double>::infinity());
@@ -133,11 +158,13 @@ void MapChromeView::drawScale(Canvas& canvas) const {
         return;
     }
     const Size size = bounds().size();
-    // An attribution that reaches into the other corner takes the lower edge for itself.
+    const Rect room = placed({kScaleIn, 0.0, bar.points, size.height}, size.width);
     const Rect pill = pillRect(size);
-    const Rect room = placed({kScaleIn, size.height - kScaleUp - kTick, bar.points, kScaleUp + kTick}, size.width);
-    const double lift = pill.width > 0.0 && pill.intersects(room) ? size.height - pill.y : 0.0;
-    const double y = size.height - kScaleUp - lift;
+    // An attribution that reaches into the other corner takes the edge for itself.
+    const bool isShared =
+        pill.width > 0.0 && isPillAbove_ == isScaleAbove_ && pill.x < room.maxX() && room.x < pill.maxX();
+    const double lift = isShared ? pill.height + kPillUp : 0.0;
+    const double y = isScaleAbove_ ? kScaleFromTop + lift : size.height - kScaleUp - lift;
     Path line;
     line.moveTo({room.x, y - kTick});
     line.lineTo({room.x, y});
@@ -146,7 +173,7 @@ void MapChromeView::drawScale(Canvas& canvas) const {
     const Color halo = Color::ofRole(ColorRole::MapScaleHalo);
     const Color ink = Color::ofRole(ColorRole::MapScale);
     const double middle = room.x + room.width / 2.0;
-    const Point at{middle - words->usedSize().width / 2.0, y - kTick - 1.0 - kFont.ascent()};
+    const Point at{middle - words->usedSize().width / 2.0, y - kTick - 2.0 - kFont.ascent()};
     canvas.stroke(line, halo, {kScaleLine + kScaleHalo, true});
     canvas.drawHalo(*words, at, halo, kScaleHalo);
     canvas.stroke(line, ink, {kScaleLine, true});

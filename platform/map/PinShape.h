@@ -9,7 +9,7 @@ class Canvas;
 
 /// The outline of a pin whose tip stands at 0, 0: a circle of radius `radius` whose lower end runs into the tip.
 /// Points.
-struct PinShape {
+struct KTR_API PinShape {
     double radius = 0.0;
     /// From the circle's lower end down to the tip.
     double tip = 0.0;

@@ -272,7 +272,9 @@ void PlatformMapView::requestGround() {
     request.isDark = installed->appearance && installed->appearance->isDark();
     request.isHighContrast = installed->appearance && installed->appearance->isHighContrast();
     request.language = installed->assistant ? installed->assistant->languageCode().value_or("") : "";
-    for (const Rect& rect : layer_->coveredRects(target)) {
+    const auto covered = layer_->coveredRects(target);
+    chrome_->avoid(covered, target.size);
+    for (const Rect& rect : covered) {
         request.clear.push_back(onGrid(rect));
     }
     for (const Rect& rect : chrome_->clearRects(target.size)) {

@@ -3,6 +3,7 @@
 #include <charconv>
 #include <cmath>
 
+#include "platform/base/Json.h"
 #include "platform/base/Utf8.h"
 
 namespace ktr::test {
@@ -279,6 +280,14 @@ double SphereGeodesy::distance(const Coordinate& from, const Coordinate& to) con
                                                                std::cos(to.latitude * kRadians) *
                                                                std::pow(std::sin(dLon / 2.0), 2.0);
     return 2.0 * kRadius * std::asin(std::min(1.0, std::sqrt(h)));
+}
+
+std::string FakeLengths::text(double amount, platform::LengthUnit unit, platform::LengthWidth width) const {
+    static const char* const kShort[] = {"m", "km", "ft", "yd", "mi"};
+    static const char* const kSpoken[] = {"metres", "kilometres", "feet", "yards", "miles"};
+    const auto index = static_cast<std::size_t>(unit);
+    return platform::writeJsonNumber(amount) + " " +
+           (width == platform::LengthWidth::Short ? kShort[index] : kSpoken[index]);
 }
 
 double SphereGeodesy::azimuth(const Coordinate& from, const Coordinate& to) const {

@@ -9,6 +9,7 @@
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/assistant/Localization.h"
 #include "platform/base/Clock.h"
+#include "platform/base/LengthFormatter.h"
 #include "platform/base/Region.h"
 #include "platform/client/DistanceCalculator.h"
 #include "platform/contacts/ContactStore.h"
@@ -16,6 +17,7 @@
 #include "platform/contacts/PhoneNumberLibrary.h"
 #include "platform/location/Geodesy.h"
 #include "platform/location/PlatformLocationManager.h"
+#include "platform/map/MapsApplication.h"
 #include "platform/ui/Appearance.h"
 #include "platform/ui/Device.h"
 #include "platform/ui/Image.h"
@@ -156,6 +158,22 @@ struct FakeAssistantContacts : platform::AssistantContacts {
     std::optional<std::string> contactIdentifierForAssistantIdentifier(const std::string& identifier) const override;
     std::optional<std::string> assistantIdentifierForContact(const platform::Contact& contact) const override;
     platform::ContactKeys requiredKeys() const override { return {"conversionKey"}; }
+};
+
+/// "25 m" or "25 metres", and so on.
+struct FakeLengths : platform::LengthFormatter {
+    platform::LengthSystem units = platform::LengthSystem::Metric;
+    platform::LengthSystem system() const override { return units; }
+    std::string text(double amount, platform::LengthUnit unit, platform::LengthWidth width) const override;
+};
+
+/// Remembers what it was asked to open.
+struct FakeMapsApplication : platform::MapsApplication {
+    std::vector<platform::MapItem> opened;
+    bool open(const platform::MapItem& item) override {
+        opened.push_back(item);
+        return true;
+    }
 };
 
 /// Knows the countries us and gb; a number needs at least seven digits.

@@ -19,6 +19,8 @@ PlatformTest::PlatformTest() {
     platform->phoneNumbers = phoneNumbers;
     platform->telephony = telephony;
     platform->geodesy = geodesy;
+    platform->lengths = lengths;
+    platform->mapsApplication = mapsApplication;
     platform->distanceCalculators = distances;
     platform->locationManagers = locationManagers;
     platform->device = device;

@@ -51,6 +51,8 @@ class PlatformTest : public ::testing::Test {
     std::shared_ptr<FakePhoneNumbers> phoneNumbers = std::make_shared<FakePhoneNumbers>();
     std::shared_ptr<FakeTelephony> telephony = std::make_shared<FakeTelephony>();
     std::shared_ptr<SphereGeodesy> geodesy = std::make_shared<SphereGeodesy>();
+    std::shared_ptr<FakeLengths> lengths = std::make_shared<FakeLengths>();
+    std::shared_ptr<FakeMapsApplication> mapsApplication = std::make_shared<FakeMapsApplication>();
     std::shared_ptr<FakeDistanceCalculators> distances = std::make_shared<FakeDistanceCalculators>();
     std::shared_ptr<FakeLocationManagers> locationManagers = std::make_shared<FakeLocationManagers>();
     std::shared_ptr<UtcCalendar> calendar = std::make_shared<UtcCalendar>();

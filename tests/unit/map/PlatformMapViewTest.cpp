@@ -1,0 +1,489 @@
+#include "platform/map/PlatformMapView.h"
+
+#include <algorithm>
+
+#include "platform/map/KTAnnotationView.h"
+#include "platform/map/MapLocationManager.h"
+#include "tests/support/PatientMaps.h"
+#include "tests/support/PlatformTest.h"
+#include "tests/support/RecordingCanvas.h"
+
+namespace ktr::test {
+
+using namespace platform;
+
+namespace {
+
+struct Pin : MapAnnotation {
+    Coordinate place{50.21, -3.12};
+    Coordinate coordinate() const override { return place; }
+    void move(const Coordinate& to) {
+        place = to;
+        coordinateChanged();
+    }
+};
+
+/// Counts what it is asked, and gives pins views that can be used again.
+struct CountingDelegate : PlatformMapViewDelegate {
+    int views = 0;
+    int renderers = 0;
+    std::shared_ptr<AnnotationView> viewForAnnotation(PlatformMapView& map,
+                                                      const std::shared_ptr<MapAnnotation>& annotation) override {
+        if (!std::dynamic_pointer_cast<Pin>(annotation)) {
+            return nullptr;
+        }
+        ++views;
+        if (auto free = map.dequeueReusableAnnotationView("pin")) {
+            free->setAnnotation(annotation);
+            return free;
+        }
+        return create<MarkerAnnotationView>(&MarkerAnnotationView::initWithAnnotation, annotation, "pin");
+    }
+    std::shared_ptr<MapOverlayRenderer> rendererForOverlay(PlatformMapView&,
+                                                           const std::shared_ptr<MapOverlay>& overlay) override {
+        ++renderers;
+        auto renderer = std::make_shared<CircleOverlayRenderer>(std::dynamic_pointer_cast<CircleOverlay>(overlay));
+        renderer->setFillColor(Color::rgb(1.0, 0.5, 0.0));
+        return renderer;
+    }
+};
+
+const MapRegion kTown{{50.21, -3.12}, {0.01, 0.01}};
+
+}  // namespace
+
+class PlatformMapViewTest : public PlatformTest {
+  protected:
+    PlatformMapViewTest() {
+        platform->maps = maps_;
+        map_ = create<PlatformMapView>(&PlatformMapView::initWithFrame, Rect{0.0, 0.0, 376.0, 219.0});
+        map_->setDelegate(delegate_);
+    }
+
+    /// Where a pin's tip is shown.
+    Point tipOf(const MapAnnotation& annotation) {
+        const auto view = map_->viewForAnnotation(annotation);
+        return {view->frame().x + view->anchorPoint().x, view->frame().y + view->anchorPoint().y};
+    }
+    RecordingCanvas painted() {
+        map_->layoutIfNeeded();
+        RecordingCanvas canvas;
+        map_->paint(canvas, map_->bounds());
+        return canvas;
+    }
+    static std::size_t count(const RecordingCanvas& canvas, RecordingCanvas::Call::Kind kind) {
+        return static_cast<std::size_t>(
+            std::count_if(canvas.calls.begin(), canvas.calls.end(), [&](const auto& c) { return c.kind == kind; }));
+    }
+
+    std::shared_ptr<PatientMaps> maps_ = std::make_shared<PatientMaps>();
+    std::shared_ptr<CountingDelegate> delegate_ = std::make_shared<CountingDelegate>();
+    std::shared_ptr<PlatformMapView> map_;
+};
+
+TEST_F(PlatformMapViewTest, WithoutARegion_ShowsTheWorld) {
+    EXPECT_FALSE(map_->requestedRegion());
+    time->runPosted();
+    ASSERT_EQ(maps_->requests.size(), 1u);
+    EXPECT_NEAR(maps_->requests[0].viewport.zoom, std::log2(376.0 / 256.0), 1e-9);
+}
+
+TEST_F(PlatformMapViewTest, FirstRegion_IsThereAtOnce) {
+    map_->setRegion(kTown, true);
+    EXPECT_EQ(map_->viewport(), kTown.viewport({376.0, 219.0}));
+    EXPECT_EQ(map_->requestedRegion(), kTown);
+    EXPECT_GE(map_->region().span.latitudeDelta, 0.01 - 1e-9);
+}
+
+TEST_F(PlatformMapViewTest, InvalidCentre_IsIgnored) {
+    map_->setRegion({{91.0, 0.0}, {1.0, 1.0}}, false);
+    EXPECT_FALSE(map_->requestedRegion());
+}
+
+TEST_F(PlatformMapViewTest, LaterAnimatedRegion_IsGlidedTo) {
+    map_->setRegion(kTown, false);
+    time->runUntilIdle(1.0);
+    const MapViewport before = map_->viewport();
+    map_->setRegion({{50.22, -3.12}, {0.02, 0.02}}, true);
+    EXPECT_EQ(map_->viewport(), before);
+    time->advance(0.2);
+    EXPECT_GT(map_->viewport().centre.latitude, 50.21);
+    EXPECT_LT(map_->viewport().centre.latitude, 50.22);
+    EXPECT_LT(map_->viewport().zoom, before.zoom);
+    time->advance(0.4);
+    EXPECT_EQ(map_->viewport(), map_->viewportAtRest());
+}
+
+TEST_F(PlatformMapViewTest, ReducedMotion_IsThereAtOnce) {
+    map_->setRegion(kTown, false);
+    appearance->reducedMotion = true;
+    map_->setRegion({{50.22, -3.12}, {0.02, 0.02}}, true);
+    EXPECT_EQ(map_->viewport(), map_->viewportAtRest());
+}
+
+TEST_F(PlatformMapViewTest, TheSameRegionAgain_ChangesNothing) {
+    map_->setRegion(kTown, false);
+    time->runUntilIdle(1.0);
+    const auto asked = maps_->requests.size();
+    map_->setRegion(kTown, true);
+    map_->setNeedsLayout();
+    map_->layoutIfNeeded();
+    time->runUntilIdle(1.0);
+    EXPECT_EQ(maps_->requests.size(), asked);
+    EXPECT_EQ(time->pendingTimers(), 0u);
+}
+
+TEST_F(PlatformMapViewTest, AcrossTheAntimeridian_GlidesTheShortWay) {
+    map_->setRegion({{0.0, 179.9}, {0.5, 0.5}}, false);
+    map_->setRegion({{0.0, -179.9}, {0.5, 0.5}}, true);
+    for (int i = 0; i < 10; ++i) {
+        time->advance(0.04);
+        EXPECT_GT(std::abs(map_->viewport().centre.longitude), 179.8);
+    }
+}
+
+// Pictures of the ground
+
+TEST_F(PlatformMapViewTest, Gliding_AsksForTheTargetOnlyAndDrawsWhatThereIs) {
+    map_->setRegion(kTown, false);
+    time->runPosted();
+    const auto first = maps_->answer();
+    time->runPosted();
+    map_->setRegion({{50.211, -3.12}, {0.01, 0.01}}, true);
+    time->runPosted();
+    const auto asked = maps_->requests.size();
+    EXPECT_EQ(maps_->requests.back().viewport, map_->viewportAtRest());
+    time->advance(0.2);
+    const auto canvas = painted();
+    EXPECT_EQ(maps_->requests.size(), asked);
+    const auto picture = std::find_if(canvas.calls.begin(), canvas.calls.end(),
+                                      [&](const auto& call) { return call.object == first.get(); });
+    ASSERT_NE(picture, canvas.calls.end());
+    // The ground moves down while the map goes north.
+    EXPECT_GT(picture->rect.y, 0.5);
+    EXPECT_NEAR(picture->rect.height, 219.0, 0.1);
+}
+
+TEST_F(PlatformMapViewTest, AtRest_TheLatestPictureAloneFillsTheMap) {
+    map_->setRegion(kTown, false);
+    time->runPosted();
+    maps_->answer();
+    map_->setRegion({{50.211, -3.12}, {0.01, 0.01}}, true);
+    time->runUntilIdle(1.0);
+    const auto last = maps_->answer();
+    time->runUntilIdle(1.0);
+    const auto canvas = painted();
+    EXPECT_EQ(count(canvas, RecordingCanvas::Call::Kind::Image), 1u);
+    const auto picture = std::find_if(canvas.calls.begin(), canvas.calls.end(),
+                                      [&](const auto& call) { return call.object == last.get(); });
+    ASSERT_NE(picture, canvas.calls.end());
+    EXPECT_EQ(picture->rect, (Rect{0.0, 0.0, 376.0, 219.0}));
+}
+
+TEST_F(PlatformMapViewTest, StaleRequests_AreCancelled) {
+    map_->setRegion(kTown, false);
+    time->runPosted();
+    map_->setRegion({{50.3, -3.12}, {0.01, 0.01}}, false);
+    time->runPosted();
+    EXPECT_EQ(maps_->waiting.size(), 1u);
+    EXPECT_EQ(maps_->cancelled.size(), maps_->requests.size() - 1);
+    map_ = nullptr;
+    EXPECT_TRUE(maps_->waiting.empty());
+}
+
+TEST_F(PlatformMapViewTest, TheSourcesChanges_AreAskedForOnceTheAnswerIsThere) {
+    map_->setRegion(kTown, false);
+    time->runPosted();
+    const auto asked = maps_->requests.size();
+    maps_->change();
+    maps_->change();
+    EXPECT_EQ(maps_->requests.size(), asked);
+    maps_->answer();
+    EXPECT_EQ(maps_->requests.size(), asked + 1);
+    maps_->answer();
+    maps_->change();
+    EXPECT_EQ(maps_->requests.size(), asked + 2);
+}
+
+TEST_F(PlatformMapViewTest, AppearanceChange_AsksForAnotherPicture) {
+    map_->setRegion(kTown, false);
+    time->runPosted();
+    EXPECT_FALSE(maps_->requests.back().isDark);
+    EXPECT_EQ(maps_->requests.back().scale, 2.0);
+    EXPECT_EQ(maps_->requests.back().language, "en-GB");
+    appearance->dark = true;
+    appearance->highContrast = true;
+    platform->notificationCenter->post({kAppearanceChangedNotification, nullptr});
+    time->runPosted();
+    EXPECT_TRUE(maps_->requests.back().isDark);
+    EXPECT_TRUE(maps_->requests.back().isHighContrast);
+}
+
+TEST_F(PlatformMapViewTest, Labels_KeepClearOfPinsAndCorners) {
+    const auto pin = std::make_shared<Pin>();
+    map_->addAnnotation(pin);
+    map_->setRegion(kTown, false);
+    time->runPosted();
+    const auto& clear = maps_->requests.back().clear;
+    ASSERT_EQ(clear.size(), 3u);
+    EXPECT_TRUE(clear[0].contains({188.0, 108.0}));
+    EXPECT_TRUE(clear[0].contains({188.0, 70.0}));
+    EXPECT_TRUE(clear[1].contains({20.0, 205.0}));
+    EXPECT_TRUE(clear[2].contains({360.0, 205.0}));
+}
+
+TEST_F(PlatformMapViewTest, WhereThePinIs_TheCornerGivesWay) {
+    const auto pin = std::make_shared<Pin>();
+    map_->setRegion(kTown, false);
+    pin->place = map_->viewport().coordinateAt({50.0, 205.0});
+    map_->addAnnotation(pin);
+    time->runPosted();
+    const auto& clear = maps_->requests.back().clear;
+    ASSERT_EQ(clear.size(), 3u);
+    EXPECT_TRUE(clear[1].contains({20.0, 20.0}));
+    EXPECT_TRUE(clear[2].contains({360.0, 205.0}));
+}
+
+TEST_F(PlatformMapViewTest, RightToLeft_CornersChangeSides) {
+    assistant->rightToLeft = true;
+    map_->setRegion(kTown, false);
+    time->runPosted();
+    const auto& clear = maps_->requests.back().clear;
+    ASSERT_EQ(clear.size(), 2u);
+    EXPECT_TRUE(clear[0].contains({356.0, 205.0}));
+    EXPECT_TRUE(clear[1].contains({20.0, 205.0}));
+}
+
+TEST_F(PlatformMapViewTest, WithoutASource_PlainLandAndWords) {
+    platform->maps = nullptr;
+    localization->set("org.ktr.host", "MAP_NOT_AVAILABLE", "Map not available");
+    const auto bare = create<PlatformMapView>(&PlatformMapView::initWithFrame, Rect{0.0, 0.0, 376.0, 219.0});
+    bare->layoutIfNeeded();
+    RecordingCanvas canvas;
+    bare->paint(canvas, bare->bounds());
+    ASSERT_EQ(canvas.calls.size(), 2u);
+    EXPECT_EQ(canvas.calls[0].color, Color::ofRole(ColorRole::MapLand));
+    EXPECT_EQ(canvas.calls[1].kind, RecordingCanvas::Call::Kind::Text);
+    EXPECT_NEAR(canvas.calls[1].rect.x + canvas.calls[1].rect.width / 2.0, 188.0, 0.01);
+}
+
+TEST_F(PlatformMapViewTest, Attribution_StandsInItsPill) {
+    map_->setRegion(kTown, false);
+    time->runPosted();
+    maps_->answer();
+    time->runPosted();
+    const auto canvas = painted();
+    const auto pill = std::find_if(canvas.calls.begin(), canvas.calls.end(), [](const auto& call) {
+        return call.color == Color::ofRole(ColorRole::MapAttributionPill);
+    });
+    ASSERT_NE(pill, canvas.calls.end());
+    EXPECT_NEAR(pill->rect.maxX(), 376.0 - 8.0, 1e-6);
+    EXPECT_NEAR(pill->rect.maxY(), 219.0 - 6.0, 1e-6);
+    EXPECT_NEAR(pill->rect.height, 18.0, 1e-6);
+    EXPECT_NEAR(pill->rect.width, 8.0 * 11.0 + 16.0, 1e-6);
+}
+
+TEST_F(PlatformMapViewTest, LongAttribution_IsWholeAndLiftsTheScale) {
+    maps_->attribution = "A very long list of those who have drawn this map, all of them";
+    map_->setRegion(kTown, false);
+    time->runPosted();
+    maps_->answer();
+    time->runPosted();
+    const auto canvas = painted();
+    const auto find = [&](ColorRole role) {
+        return std::find_if(canvas.calls.begin(), canvas.calls.end(),
+                            [&](const auto& call) { return call.color == Color::ofRole(role); });
+    };
+    const auto pill = find(ColorRole::MapAttributionPill);
+    const auto words = find(ColorRole::MapAttribution);
+    const auto scale = find(ColorRole::MapScale);
+    ASSERT_NE(pill, canvas.calls.end());
+    ASSERT_NE(words, canvas.calls.end());
+    ASSERT_NE(scale, canvas.calls.end());
+    EXPECT_GE(pill->rect.x, 0.0);
+    EXPECT_GT(pill->rect.height, 18.0);
+    EXPECT_LE(words->rect.maxX(), pill->rect.maxX());
+    EXPECT_LE(scale->rect.maxY(), pill->rect.y);
+}
+
+// Annotations
+
+TEST_F(PlatformMapViewTest, Tip_StandsOnThePlace) {
+    const auto pin = std::make_shared<Pin>();
+    map_->addAnnotation(pin);
+    map_->setRegion(kTown, false);
+    map_->layoutIfNeeded();
+    EXPECT_NEAR(tipOf(*pin).x, 188.0, 1e-6);
+    EXPECT_NEAR(tipOf(*pin).y, 109.5, 1e-6);
+}
+
+TEST_F(PlatformMapViewTest, ASetCoordinate_MovesTheViewAtOnce) {
+    const auto pin = std::make_shared<Pin>();
+    map_->addAnnotation(pin);
+    map_->setRegion(kTown, false);
+    map_->layoutIfNeeded();
+    pin->move(map_->viewport().coordinateAt({100.0, 50.0}));
+    EXPECT_NEAR(tipOf(*pin).x, 100.0, 1e-6);
+}
+
+TEST_F(PlatformMapViewTest, SetWithinAnAnimation_TheViewGlides) {
+    const auto pin = std::make_shared<Pin>();
+    map_->addAnnotation(pin);
+    map_->setRegion(kTown, false);
+    map_->layoutIfNeeded();
+    const Coordinate target = map_->viewport().coordinateAt({288.0, 109.5});
+    Animation::animate(0.5, [&] { pin->move(target); });
+    EXPECT_EQ(pin->coordinate(), target);
+    EXPECT_NEAR(tipOf(*pin).x, 188.0, 1e-6);
+    time->advance(0.2);
+    EXPECT_GT(tipOf(*pin).x, 190.0);
+    EXPECT_LT(tipOf(*pin).x, 287.0);
+    time->advance(0.4);
+    EXPECT_NEAR(tipOf(*pin).x, 288.0, 1e-6);
+}
+
+TEST_F(PlatformMapViewTest, RemovedAndAddedInOneTurn_GlidesOn) {
+    const auto pin = std::make_shared<Pin>();
+    map_->addAnnotation(pin);
+    map_->setRegion(kTown, false);
+    time->runPosted();
+    const auto view = map_->viewForAnnotation(*pin);
+    Animation::animate(0.5, [&] { pin->move(map_->viewport().coordinateAt({288.0, 109.5})); });
+    map_->removeAnnotation(pin);
+    map_->addAnnotation(pin);
+    time->runPosted();
+    EXPECT_EQ(map_->viewForAnnotation(*pin), view);
+    EXPECT_EQ(delegate_->views, 1);
+    time->advance(0.2);
+    EXPECT_GT(tipOf(*pin).x, 190.0);
+    EXPECT_LT(tipOf(*pin).x, 287.0);
+}
+
+TEST_F(PlatformMapViewTest, FromNowhere_NobodyGlides) {
+    const auto pin = std::make_shared<Pin>();
+    pin->place = {};
+    map_->addAnnotation(pin);
+    map_->setRegion(kTown, false);
+    map_->layoutIfNeeded();
+    Animation::animate(0.5, [&] { pin->move({50.21, -3.12}); });
+    EXPECT_NEAR(tipOf(*pin).x, 188.0, 1e-6);
+}
+
+TEST_F(PlatformMapViewTest, FreeViews_AreUsedAgain) {
+    const auto first = std::make_shared<Pin>();
+    map_->addAnnotation(first);
+    time->runPosted();
+    const auto view = map_->viewForAnnotation(*first);
+    const auto second = std::make_shared<Pin>();
+    map_->removeAnnotation(first);
+    map_->addAnnotation(second);
+    time->runPosted();
+    EXPECT_EQ(map_->viewForAnnotation(*first), nullptr);
+    EXPECT_EQ(map_->viewForAnnotation(*second), view);
+    EXPECT_EQ(view->annotation(), second);
+    EXPECT_EQ(map_->dequeueReusableAnnotationView("pin"), nullptr);
+    EXPECT_EQ(map_->dequeueReusableAnnotationView("other"), nullptr);
+}
+
+TEST_F(PlatformMapViewTest, AddedTwice_IsThereOnce) {
+    const auto pin = std::make_shared<Pin>();
+    map_->addAnnotation(pin);
+    map_->addAnnotation(pin);
+    map_->addAnnotation(nullptr);
+    EXPECT_EQ(map_->annotations().size(), 1u);
+    map_->removeAnnotations(map_->annotations());
+    EXPECT_TRUE(map_->annotations().empty());
+}
+
+// Overlays
+
+TEST_F(PlatformMapViewTest, Overlay_IsDrawnOverTheGroundOnItsPlace) {
+    map_->setRegion(kTown, false);
+    map_->addOverlay(std::make_shared<CircleOverlay>(Coordinate{50.21, -3.12}, 100.0));
+    const auto canvas = painted();
+    ASSERT_GE(canvas.calls.size(), 2u);
+    EXPECT_EQ(canvas.calls[0].color, Color::ofRole(ColorRole::MapLand));
+    EXPECT_EQ(canvas.calls[1].kind, RecordingCanvas::Call::Kind::Path);
+    EXPECT_NEAR(canvas.calls[1].rect.x + canvas.calls[1].rect.width / 2.0, 188.0, 0.01);
+}
+
+TEST_F(PlatformMapViewTest, Renderers_AreAskedForOnce) {
+    const auto circle = std::make_shared<CircleOverlay>(Coordinate{50.21, -3.12}, 100.0);
+    map_->addOverlay(circle);
+    map_->addOverlay(circle);
+    time->runPosted();
+    map_->addOverlay(std::make_shared<CircleOverlay>(Coordinate{50.21, -3.12}, 50.0));
+    time->runPosted();
+    EXPECT_EQ(delegate_->renderers, 2);
+    map_->removeOverlays(map_->overlays());
+    EXPECT_TRUE(map_->overlays().empty());
+}
+
+// The user
+
+TEST_F(PlatformMapViewTest, User_IsUnknownUntilAsked) {
+    EXPECT_EQ(map_->userLocation()->location(), nullptr);
+    EXPECT_EQ(map_->userLocation()->coordinate(), Coordinate{});
+    EXPECT_TRUE(locationManagers->made.empty());
+}
+
+TEST_F(PlatformMapViewTest, User_IsFollowedInTheBundlesName) {
+    const auto bundle = std::make_shared<Bundle>("org.ktr.host");
+    shared<MapLocationManager>()->setEffectiveBundle(bundle);
+    locationManagers->cached = position(50.2, -3.1);
+    map_->setShowsUserLocation(true);
+    ASSERT_EQ(locationManagers->made.size(), 1u);
+    const auto manager = locationManagers->made[0];
+    EXPECT_EQ(manager->bundle, bundle);
+    EXPECT_TRUE(manager->updating);
+    EXPECT_EQ(map_->userLocation()->coordinate(), (Coordinate{50.2, -3.1}));
+    manager->deliver(position(50.3, -3.1));
+    EXPECT_EQ(map_->userLocation()->coordinate(), (Coordinate{50.3, -3.1}));
+    manager->deliver(position(50.4, -3.1, -1.0));
+    EXPECT_EQ(map_->userLocation()->coordinate(), (Coordinate{50.3, -3.1}));
+    map_->setShowsUserLocation(false);
+    EXPECT_FALSE(manager->updating);
+    EXPECT_EQ(map_->userLocation()->location(), nullptr);
+}
+
+TEST_F(PlatformMapViewTest, MapGone_NobodyFollows) {
+    map_->setShowsUserLocation(true);
+    map_ = nullptr;
+    EXPECT_FALSE(locationManagers->made[0]->updating);
+}
+
+TEST_F(PlatformMapViewTest, User_HasTheMapsOwnViewBehindThePins) {
+    locationManagers->cached = position(50.21, -3.12);
+    const auto pin = std::make_shared<Pin>();
+    map_->addAnnotation(pin);
+    time->runPosted();
+    map_->setShowsUserLocation(true);
+    time->runPosted();
+    const auto user = map_->viewForAnnotation(*map_->userLocation());
+    EXPECT_NE(std::dynamic_pointer_cast<UserLocationView>(user), nullptr);
+    const auto& views = map_->subviews();
+    ASSERT_EQ(views.size(), 3u);
+    EXPECT_EQ(views[0], user);
+    EXPECT_EQ(views[1], map_->viewForAnnotation(*pin));
+}
+
+TEST_F(PlatformMapViewTest, Halo_IsAsLargeAsThePositionIsSure) {
+    locationManagers->cached = position(50.21, -3.12, 1.0);
+    map_->setShowsUserLocation(true);
+    map_->setRegion(kTown, false);
+    time->runPosted();
+    const auto view = map_->viewForAnnotation(*map_->userLocation());
+    EXPECT_EQ(view->frame().width, 40.0);
+    locationManagers->made[0]->deliver(position(50.2101, -3.12, 300.0));
+    time->runUntilIdle(1.0);
+    EXPECT_NEAR(view->frame().width, 600.0 / map_->viewport().metresPerPoint(), 0.1);
+    EXPECT_LE(view->opaqueRect().width, 40.0);
+}
+
+TEST_F(PlatformMapViewTest, Taps_GoToWhatHoldsTheMap) {
+    const auto holder = create<View>(&View::initWithFrame, Rect{0.0, 0.0, 376.0, 219.0});
+    holder->addSubview(map_);
+    EXPECT_EQ(holder->hitTest({100.0, 100.0}), holder);
+}
+
+}  // namespace ktr::test
