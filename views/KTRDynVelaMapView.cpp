@@ -13,6 +13,7 @@
 #include "platform/map/MapsApplication.h"
 #include "service/KTRVAUtils.h"
 #include "views/KTRVAMapDelegate.h"
+#include "views/MapSentences.h"
 
 namespace ktr {
 
@@ -279,6 +280,23 @@ std::optional<platform::Url> KTRDynVelaMapView::urlForTouch() {
     const platform::Url url(platform::formatted("%@%@", {"wayloc://friend/", handle}));
     LogCategory_Unspecified()->line("Opening URL: %@ for friend handle: %@", url, handle);
     return url;
+}
+
+std::string KTRDynVelaMapView::accessibilityText() const {
+    if (accessibilityLabel() || !Platform::installed()) {
+        return View::accessibilityText();
+    }
+    const auto tracker = currentLocationDelegate();
+    const auto user = tracker ? tracker->currentLocation() : nullptr;
+    // Without a delegate of its own (a fence has none) the map still knows where it shows the user.
+    const auto shown = user ? user : mapView_->userLocation()->location();
+    if (isVisibilityMap_) {
+        return MapSentences::ofUser(shown);
+    }
+    if (location_) {
+        return MapSentences::ofFriend(*location_, user);
+    }
+    return geoFence_ ? MapSentences::ofFence(*geoFence_, shown) : "";
 }
 
 void KTRDynVelaMapView::openInMaps() {

@@ -69,6 +69,8 @@ class KTRDynVelaMapView : public KTRVelaBaseView {
     }
 
     platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Link; }
+    /// What the map shows, in words.
+    std::string accessibilityText() const override;
 
   private:
     void setupMap();

@@ -163,5 +163,95 @@
         <extracomment>A built-in name for a place. English: “Other”</extracomment>
         <translation>Anderer Ort</translation>
     </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FRIEND_AT</source>
+        <extracomment>A map read aloud: %1$@ is a friend, %2$@ their place, such as “Fish Market” or “Home”. English: “Map: %1$@, at %2$@”</extracomment>
+        <translation>Karte: %1$@, %2$@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FRIEND</source>
+        <extracomment>A map read aloud: %@ is a friend whose place has no name. English: “Map: %@”</extracomment>
+        <translation>Karte: %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_UNKNOWN</source>
+        <extracomment>A map read aloud: %@ is a friend whose place is not known. English: “Map: no place known for %@”</extracomment>
+        <translation>Karte: kein Ort für %@ bekannt</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_ACCURACY</source>
+        <extracomment>A map read aloud: how sure a place is; %@ is a length such as “25 metres”. English: “Accurate to %@”</extracomment>
+        <translation>Auf %@ genau</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_NORTH</source>
+        <extracomment>A map read aloud: the direction from the user; %@ is a distance such as “310 m”. English: “%@ north of you”</extracomment>
+        <translation>%@ nördlich von dir</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_NORTHEAST</source>
+        <extracomment>The same. English: “%@ north-east of you”</extracomment>
+        <translation>%@ nordöstlich von dir</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_EAST</source>
+        <extracomment>The same. English: “%@ east of you”</extracomment>
+        <translation>%@ östlich von dir</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SOUTHEAST</source>
+        <extracomment>The same. English: “%@ south-east of you”</extracomment>
+        <translation>%@ südöstlich von dir</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SOUTH</source>
+        <extracomment>The same. English: “%@ south of you”</extracomment>
+        <translation>%@ südlich von dir</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SOUTHWEST</source>
+        <extracomment>The same. English: “%@ south-west of you”</extracomment>
+        <translation>%@ südwestlich von dir</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_WEST</source>
+        <extracomment>The same. English: “%@ west of you”</extracomment>
+        <translation>%@ westlich von dir</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_NORTHWEST</source>
+        <extracomment>The same. English: “%@ north-west of you”</extracomment>
+        <translation>%@ nordwestlich von dir</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FENCE_AT</source>
+        <extracomment>A map read aloud: a place that a friend leaves or arrives at; %@ is its name. English: “Map: the area around %@”</extracomment>
+        <translation>Karte: das Gebiet um %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FENCE</source>
+        <extracomment>The same without a name. English: “Map: the area of this notice”</extracomment>
+        <translation>Karte: das Gebiet dieser Benachrichtigung</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_RADIUS</source>
+        <extracomment>A map read aloud: how large the area is; %@ is a length such as “200 metres”. English: “Radius: %@”</extracomment>
+        <translation>Radius: %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_YOU</source>
+        <extracomment>A map read aloud: it shows the user. English: “Map: you are here”</extracomment>
+        <translation>Karte: Du bist hier</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_YOU_UNKNOWN</source>
+        <extracomment>The same while the user’s position is not known. English: “Map: where you are is not known yet”</extracomment>
+        <translation>Karte: Dein Ort ist noch nicht bekannt</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SENTENCES</source>
+        <extracomment>Two sentences of a map read aloud, without the last one’s full stop. English: “%1$@. %2$@”</extracomment>
+        <translation>%1$@. %2$@</translation>
+    </message>
 </context>
 </TS>

@@ -163,5 +163,95 @@
         <extracomment>A built-in name for a place</extracomment>
         <translation>Other</translation>
     </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FRIEND_AT</source>
+        <extracomment>A map read aloud: %1$@ is a friend, %2$@ their place, such as “Fish Market” or “Home”</extracomment>
+        <translation>Map: %1$@, at %2$@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FRIEND</source>
+        <extracomment>A map read aloud: %@ is a friend whose place has no name</extracomment>
+        <translation>Map: %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_UNKNOWN</source>
+        <extracomment>A map read aloud: %@ is a friend whose place is not known</extracomment>
+        <translation>Map: no place known for %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_ACCURACY</source>
+        <extracomment>A map read aloud: how sure a place is; %@ is a length such as “25 metres”</extracomment>
+        <translation>Accurate to %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_NORTH</source>
+        <extracomment>A map read aloud: the direction from the user; %@ is a distance such as “310 m”</extracomment>
+        <translation>%@ north of you</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_NORTHEAST</source>
+        <extracomment>The same</extracomment>
+        <translation>%@ north-east of you</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_EAST</source>
+        <extracomment>The same</extracomment>
+        <translation>%@ east of you</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SOUTHEAST</source>
+        <extracomment>The same</extracomment>
+        <translation>%@ south-east of you</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SOUTH</source>
+        <extracomment>The same</extracomment>
+        <translation>%@ south of you</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SOUTHWEST</source>
+        <extracomment>The same</extracomment>
+        <translation>%@ south-west of you</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_WEST</source>
+        <extracomment>The same</extracomment>
+        <translation>%@ west of you</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_NORTHWEST</source>
+        <extracomment>The same</extracomment>
+        <translation>%@ north-west of you</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FENCE_AT</source>
+        <extracomment>A map read aloud: a place that a friend leaves or arrives at; %@ is its name</extracomment>
+        <translation>Map: the area around %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FENCE</source>
+        <extracomment>The same without a name</extracomment>
+        <translation>Map: the area of this notice</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_RADIUS</source>
+        <extracomment>A map read aloud: how large the area is; %@ is a length such as “200 metres”</extracomment>
+        <translation>Radius: %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_YOU</source>
+        <extracomment>A map read aloud: it shows the user</extracomment>
+        <translation>Map: you are here</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_YOU_UNKNOWN</source>
+        <extracomment>The same while the user’s position is not known</extracomment>
+        <translation>Map: where you are is not known yet</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SENTENCES</source>
+        <extracomment>Two sentences of a map read aloud, without the last one’s full stop</extracomment>
+        <translation>%1$@. %2$@</translation>
+    </message>
 </context>
 </TS>

@@ -163,5 +163,95 @@
         <extracomment>A built-in name for a place. English: “Other”</extracomment>
         <translation>その他</translation>
     </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FRIEND_AT</source>
+        <extracomment>A map read aloud: %1$@ is a friend, %2$@ their place, such as “Fish Market” or “Home”. English: “Map: %1$@, at %2$@”</extracomment>
+        <translation>地図：%1$@、%2$@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FRIEND</source>
+        <extracomment>A map read aloud: %@ is a friend whose place has no name. English: “Map: %@”</extracomment>
+        <translation>地図：%@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_UNKNOWN</source>
+        <extracomment>A map read aloud: %@ is a friend whose place is not known. English: “Map: no place known for %@”</extracomment>
+        <translation>地図：%@の場所は不明です</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_ACCURACY</source>
+        <extracomment>A map read aloud: how sure a place is; %@ is a length such as “25 metres”. English: “Accurate to %@”</extracomment>
+        <translation>誤差 %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_NORTH</source>
+        <extracomment>A map read aloud: the direction from the user; %@ is a distance such as “310 m”. English: “%@ north of you”</extracomment>
+        <translation>北へ %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_NORTHEAST</source>
+        <extracomment>The same. English: “%@ north-east of you”</extracomment>
+        <translation>北東へ %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_EAST</source>
+        <extracomment>The same. English: “%@ east of you”</extracomment>
+        <translation>東へ %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SOUTHEAST</source>
+        <extracomment>The same. English: “%@ south-east of you”</extracomment>
+        <translation>南東へ %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SOUTH</source>
+        <extracomment>The same. English: “%@ south of you”</extracomment>
+        <translation>南へ %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SOUTHWEST</source>
+        <extracomment>The same. English: “%@ south-west of you”</extracomment>
+        <translation>南西へ %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_WEST</source>
+        <extracomment>The same. English: “%@ west of you”</extracomment>
+        <translation>西へ %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_NORTHWEST</source>
+        <extracomment>The same. English: “%@ north-west of you”</extracomment>
+        <translation>北西へ %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FENCE_AT</source>
+        <extracomment>A map read aloud: a place that a friend leaves or arrives at; %@ is its name. English: “Map: the area around %@”</extracomment>
+        <translation>地図：%@の周辺</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FENCE</source>
+        <extracomment>The same without a name. English: “Map: the area of this notice”</extracomment>
+        <translation>地図：この通知の範囲</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_RADIUS</source>
+        <extracomment>A map read aloud: how large the area is; %@ is a length such as “200 metres”. English: “Radius: %@”</extracomment>
+        <translation>半径 %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_YOU</source>
+        <extracomment>A map read aloud: it shows the user. English: “Map: you are here”</extracomment>
+        <translation>地図：現在地</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_YOU_UNKNOWN</source>
+        <extracomment>The same while the user’s position is not known. English: “Map: where you are is not known yet”</extracomment>
+        <translation>地図：現在地はまだわかりません</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SENTENCES</source>
+        <extracomment>Two sentences of a map read aloud, without the last one’s full stop. English: “%1$@. %2$@”</extracomment>
+        <translation>%1$@。%2$@</translation>
+    </message>
 </context>
 </TS>
