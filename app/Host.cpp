@@ -8,6 +8,7 @@
 #include "app/PluginFinder.h"
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/assistant/Localization.h"
+#include "platform/assistant/VASnippet.h"
 #include "platform/base/Clock.h"
 #include "platform/base/Format.h"
 
@@ -106,9 +107,21 @@ bool Host::addCard(TurnView& turn, const Scenario& scenario) {
     if (!controller) {
         return false;
     }
+    const auto sharing = std::dynamic_pointer_cast<platform::VAKtrVisibilityView>(scenario.snippet);
+    if (sharing) {
+        endEarlierSharing(controller);
+    }
+    saysHidden_ = sharing && !sharing->visible;
     controller->setDelegate(delegate_);
     turn.setController(controller);
     return true;
+}
+
+void Host::endEarlierSharing(const std::shared_ptr<platform::HostSnippetViewController>& controller) {
+    if (const auto earlier = sharing_.lock()) {
+        earlier->viewWillDisappear(false);
+    }
+    sharing_ = controller;
 }
 
 std::optional<Failure> Host::addTurn(const Scenario& scenario) {

@@ -54,6 +54,8 @@ class Host {
     /// The clock face of a moment, as the conversation shows it.
     std::string clockFace(platform::Date moment) const;
     const HostSettings& settings() const { return settings_; }
+    /// The newest card says that friends cannot see the user.
+    bool saysHidden() const { return saysHidden_; }
     bool rightToLeft() const;
 
     /// Lays the conversation out and makes the window as large as it; the height, points.
@@ -65,6 +67,9 @@ class Host {
     void setTimes(TurnTexts& texts, const std::string& clockFace) const;
     /// False when the plugin draws no such answer.
     bool addCard(TurnView& turn, const Scenario& scenario);
+    /// Of the answers about the user's own sharing only the newest is live: an earlier one would go on showing a user
+    /// who has hidden since.
+    void endEarlierSharing(const std::shared_ptr<platform::HostSnippetViewController>& controller);
 
     HostSettings settings_;
     std::shared_ptr<platform::Platform> platform_;
@@ -74,6 +79,8 @@ class Host {
     std::shared_ptr<HostDelegate> delegate_;
     std::shared_ptr<platform::Window> window_;
     std::shared_ptr<ConversationView> conversation_;
+    std::weak_ptr<platform::HostSnippetViewController> sharing_;
+    bool saysHidden_ = false;
 };
 
 }  // namespace ktr::app

@@ -202,6 +202,7 @@ LiveStatus LiveConversation::status() const {
     facts.findingPosition =
         findingPosition_ && shownAt_ &&
         facts.now.secondsSinceReferenceDate - shownAt_->secondsSinceReferenceDate < kFindingPosition;
+    facts.hidden = host_.saysHidden();
     facts.service = host_.live()->service().notes();
     return LiveStatus::of(facts, {[this](const std::string& key) { return host_.text(key); },
                                   [this](platform::Date moment) { return host_.clockFace(moment); }});

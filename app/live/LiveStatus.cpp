@@ -62,6 +62,9 @@ LiveStatus LiveStatus::of(const Facts& facts, const Words& words) {
     if (!known) {
         return {};
     }
+    if (facts.hidden) {
+        return {Mark::Hidden, words.text("STATUS_HIDDEN")};
+    }
     const double age = since(*known, facts.now);
     const bool hasAnswer = service.answered && *known == *service.answered;
     if (facts.findingPosition && !hasAnswer) {

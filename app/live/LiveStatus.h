@@ -13,7 +13,7 @@ namespace ktr::app {
 /// What the status line says of a live conversation. A value.
 struct LiveStatus {
     /// What stands before the words; the words carry the meaning alone.
-    enum class Mark { None, Live, Waiting, Warning };
+    enum class Mark { None, Live, Waiting, Warning, Hidden };
 
     /// What there is to know.
     struct Facts {
@@ -27,6 +27,8 @@ struct LiveStatus {
         std::optional<platform::Date> shown;
         /// The user's position is still looked for.
         bool findingPosition = false;
+        /// What is on screen last says that friends cannot see the user.
+        bool hidden = false;
         ServiceWatch::Notes service;
         platform::Date now;
     };

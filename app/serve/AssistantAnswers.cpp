@@ -136,7 +136,7 @@ std::string AssistantAnswers::help() const {
 Dictionary AssistantAnswers::sharingAnswer(SharingQuestion::Wish wish) const {
     SharingState& sharing = service_.sharing();
     if (wish != SharingQuestion::Wish::Know) {
-        sharing.setHidden(wish == SharingQuestion::Wish::Hide);
+        sharing.wish(wish == SharingQuestion::Wish::Hide);
     }
     const bool hidden = sharing.now().hidden;
     const std::string state = hidden ? "Friends can\u2019t see where you are." : "Friends can see where you are.";

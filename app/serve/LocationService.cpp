@@ -191,7 +191,7 @@ std::optional<Dictionary> LocationService::showHideLocation(const Dictionary& re
         return std::nullopt;
     }
     if (fault.status < 300) {
-        sharing_->set(hide == "Yes", position);
+        sharing_->command(hide == "Yes", position);
     }
     const auto known = sharing_->now();
     Dictionary myInfo;

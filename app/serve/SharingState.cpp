@@ -7,13 +7,15 @@ SharingState::Sharing SharingState::now() const {
     return sharing_;
 }
 
-void SharingState::setHidden(bool hidden) {
-    set(hidden, std::nullopt);
+void SharingState::wish(bool hidden) {
+    const std::lock_guard<std::mutex> lock(mutex_);
+    wishesToHide_ = hidden;
+    sharing_.hidden = hidden;
 }
 
-void SharingState::set(bool hidden, const std::optional<Position>& position) {
+void SharingState::command(bool hidden, const std::optional<Position>& position) {
     const std::lock_guard<std::mutex> lock(mutex_);
-    sharing_.hidden = hidden;
+    sharing_.hidden = hidden || wishesToHide_;
     if (position) {
         sharing_.position = position;
     }

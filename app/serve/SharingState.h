@@ -20,13 +20,16 @@ class SharingState {
     };
 
     Sharing now() const;
-    void setHidden(bool hidden);
-    /// What a command says: without a position the one before stays known.
-    void set(bool hidden, const std::optional<Position>& position);
+    /// What the user asked for.
+    void wish(bool hidden);
+    /// What a command says. One that shows may be an older answer that repeats itself, and does not undo a wish to be
+    /// hidden. Without a position the one before stays known.
+    void command(bool hidden, const std::optional<Position>& position);
 
   private:
     mutable std::mutex mutex_;
     Sharing sharing_;
+    bool wishesToHide_ = false;
 };
 
 }  // namespace ktr::app

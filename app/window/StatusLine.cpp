@@ -15,6 +15,8 @@ constexpr double kDot = 8.0;
 constexpr double kRingStroke = 1.5;
 constexpr double kWarning = 14.0;
 constexpr double kWarningStroke = 1.5;
+constexpr double kHidden = 16.0;
+constexpr double kHiddenStroke = 1.5;
 
 QPainterPath warningPath() {
     QPainterPath path;
@@ -26,6 +28,21 @@ QPainterPath warningPath() {
     path.lineTo(7.0, 8.6);
     path.moveTo(7.0, 10.5);
     path.lineTo(7.0, 10.52);
+    return path;
+}
+
+/// A place that is crossed out, in a box of 16.
+QPainterPath hiddenPath() {
+    QPainterPath path;
+    // The head of the drop, an arc of radius 4.7 from (4.3, 3.9) to (12.7, 6.4).
+    path.moveTo(4.3, 3.9);
+    path.arcTo(3.315, 2.079, 9.4, 9.4, 142.2, -137.6);
+    path.cubicTo(12.7, 7.4, 12.3, 8.5, 11.6, 9.7);
+    path.moveTo(10.0, 11.9);
+    path.lineTo(8.0, 14.2);
+    path.cubicTo(5.5, 11.6, 3.3, 8.7, 3.3, 6.4);
+    path.moveTo(2.0, 2.0);
+    path.lineTo(14.0, 14.0);
     return path;
 }
 
@@ -83,6 +100,11 @@ void StatusLine::paintEvent(QPaintEvent*) {
             painter.translate(centre - QPointF(kWarning / 2.0, kWarning / 2.0));
             painter.setPen(QPen(palette_->warning, kWarningStroke, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
             painter.drawPath(warningPath());
+            break;
+        case LiveStatus::Mark::Hidden:
+            painter.translate(centre - QPointF(kHidden / 2.0, kHidden / 2.0));
+            painter.setPen(QPen(palette_->inkSoft, kHiddenStroke, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
+            painter.drawPath(hiddenPath());
             break;
         case LiveStatus::Mark::None:
             break;

@@ -94,6 +94,11 @@
         <translation>جارٍ تحديد موقعك…</translation>
     </message>
     <message>
+        <source>STATUS_HIDDEN</source>
+        <extracomment>The status line while friends cannot see where the user is. English: “Your location is hidden”</extracomment>
+        <translation>موقعك مخفي</translation>
+    </message>
+    <message>
         <source>STATUS_ASKING</source>
         <extracomment>Status line: a question waits for its answer. English: “Asking…”</extracomment>
         <translation>جارٍ السؤال…</translation>

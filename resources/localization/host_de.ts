@@ -94,6 +94,11 @@
         <translation>Dein Standort wird gesucht …</translation>
     </message>
     <message>
+        <source>STATUS_HIDDEN</source>
+        <extracomment>The status line while friends cannot see where the user is. English: “Your location is hidden”</extracomment>
+        <translation>Dein Standort ist verborgen</translation>
+    </message>
+    <message>
         <source>STATUS_ASKING</source>
         <extracomment>Status line: a question waits for its answer. English: “Asking…”</extracomment>
         <translation>Frage läuft …</translation>

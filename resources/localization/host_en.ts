@@ -94,6 +94,11 @@
         <translation>Finding where you are…</translation>
     </message>
     <message>
+        <source>STATUS_HIDDEN</source>
+        <extracomment>The status line while friends cannot see where the user is</extracomment>
+        <translation>Your location is hidden</translation>
+    </message>
+    <message>
         <source>STATUS_ASKING</source>
         <extracomment>Status line: a question waits for its answer</extracomment>
         <translation>Asking…</translation>

@@ -94,6 +94,11 @@
         <translation>現在地を探しています…</translation>
     </message>
     <message>
+        <source>STATUS_HIDDEN</source>
+        <extracomment>The status line while friends cannot see where the user is. English: “Your location is hidden”</extracomment>
+        <translation>位置情報は非公開です</translation>
+    </message>
+    <message>
         <source>STATUS_ASKING</source>
         <extracomment>Status line: a question waits for its answer. English: “Asking…”</extracomment>
         <translation>問い合わせ中…</translation>

@@ -201,11 +201,15 @@ class SharingTest(unittest.TestCase):
                              50.2104)
             self.assertFalse(self.visible(service, "Hide my location"))
             self.assertFalse(self.visible(service, "Can my friends see me?"))
+            self.assertTrue(self.command(service, "No")["hidden"], "an older answer repeats itself")
+            self.assertFalse(self.visible(service, "Can my friends see me?"))
+            self.assertTrue(self.visible(service, "Share my location"))
             self.assertIsNone(self.command(service, "Yes")["location"])
+            self.assertFalse(self.visible(service, "Can my friends see me?"))
             self.assertEqual(self.command(service, "No")["location"]["latitude"], 50.2104)
             self.assertTrue(self.visible(service, "Can my friends see me?"))
             _, lines = service.end()
-            self.assertEqual(lines, [f"request {n}: showHideLocation, 200" for n in (1, 2, 3)])
+            self.assertEqual(lines, [f"request {n}: showHideLocation, 200" for n in (1, 2, 3, 4)])
 
     def test_state_ends_with_it(self):
         with Service(PROGRAM) as service:

@@ -120,6 +120,16 @@ TEST_F(LocationServiceTest, Hiding_IsKeptAndGivesNoPlaceAway) {
     EXPECT_FALSE(service.sharing().now().hidden);
 }
 
+TEST_F(LocationServiceTest, WishToBeHidden_IsNotUndoneByACommand) {
+    service.sharing().wish(true);
+    const std::string answer = command(
+        R"({"clientContext": {"location": {"latitude": 51.5, "longitude": -2.5}}, "prefs": {"hideLocation": "No"}})");
+    EXPECT_NE(answer.find(R"("hidden":true,"location":null)"), std::string::npos) << answer;
+    service.sharing().wish(false);
+    EXPECT_NE(command(R"({"clientContext": {}, "prefs": {"hideLocation": "No"}})").find(R"("latitude":51.5)"),
+              std::string::npos);
+}
+
 TEST_F(LocationServiceTest, ShowingWithoutAPlace_IsNoPlace) {
     const std::string shown = command(R"({"clientContext": {}, "prefs": {"hideLocation": "No"}})");
     EXPECT_NE(shown.find(R"("location":null)"), std::string::npos) << shown;

@@ -82,6 +82,17 @@ TEST_F(LiveVisibilityTest, MovingUser_IsToldOfEachPlaceUntilTheEnd) {
     EXPECT_FALSE(locationManagers->made.front()->updating);
 }
 
+TEST_F(LiveVisibilityTest, RequestBody_ByteForByte) {
+    show(true);
+    time->advance(5.0);
+    ASSERT_EQ(sent(), 1U);
+    EXPECT_EQ(transport->requests[0].body,
+              R"({"clientContext":{"deviceUDID":"device-1","productType":"Model 7","osVersion":"12.5",)"
+              R"("buildVersion":"6.1.0-18","locale":"en-GB","countryCode":"CH","regionCode":"GB",)"
+              R"("location":{"latitude":51.5,"longitude":-2.5,"source":"assistant","horizontalAccuracy":10,)"
+              R"("timestamp":1768478400000}},"prefs":{"hideLocation":"No"}})");
+}
+
 TEST_F(LiveVisibilityTest, MapFollowsTheUser) {
     show(true);
     walkTo(51.6);

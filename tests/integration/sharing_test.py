@@ -1,0 +1,142 @@
+#!/usr/bin/python3
+"""The user's own sharing and fences: the real program against the real `ktr serve`, without a display."""
+
+import concurrent.futures
+import http.client
+import json
+import os
+import pathlib
+import re
+import ssl
+import subprocess
+import sys
+import tempfile
+import time
+import unittest
+import urllib.parse
+
+from serve import Service
+
+PROGRAM = os.environ["KTR_PROGRAM"]
+
+ANN = {"fullName": "Ann Marsh", "firstName": "Ann", "emails": ["ann@harbour.example"], "repeats": False, "track": [
+    {"at": 0, "latitude": 50.2104, "longitude": -3.12, "street": "Quay Road", "city": "Brinmouth", "stateCode": "HB"},
+    {"at": 1000, "latitude": 50.2204, "longitude": -3.12, "street": "Top Road", "city": "Brinmouth", "stateCode": "HB",
+     "label": "Work"}]}
+
+
+def track(steps, seconds):
+    """A walk to the north, of about 55 metres a step."""
+    points = "".join(f'<trkpt lat="{50.2104 + 0.0005 * step:.6f}" lon="-3.12"><time>2026-05-16T16:00:'
+                     f'{int(step * seconds):02}.{int(step * seconds * 1000) % 1000:03}Z</time></trkpt>' for step in range(steps))
+    return f'<gpx version="1.1" xmlns="http://www.topografix.com/GPX/1/1"><trk><trkseg>{points}</trkseg></trk></gpx>'
+
+
+class SharingTest(unittest.TestCase):
+    def setUp(self):
+        folder = tempfile.TemporaryDirectory()
+        self.addCleanup(folder.cleanup)
+        self.folder = pathlib.Path(folder.name)
+
+    def serve(self, positions, *options):
+        (self.folder / "friends.json").write_text(json.dumps({"friends": [ANN], "user": {
+            "fullName": "Mara Lind", "firstName": "Mara", "lastName": "Lind", "emails": ["mara.lind@harbour.example"]}}))
+        (self.folder / "walk.gpx").write_text(positions)
+        self.service = Service(PROGRAM, "--friends", self.folder / "friends.json", "--positions", self.folder / "walk.gpx",
+                               "--write-config", self.folder / "config.json", "--interval", "0.4", *options)
+        self.addCleanup(self.service.__exit__)
+
+    def live(self, seconds, *questions, command="describe", more=()):
+        environment = {k: v for k, v in os.environ.items() if k not in ("DISPLAY", "WAYLAND_DISPLAY", "QT_QPA_PLATFORM")}
+        environment.update(KTR_CONFIG=str(self.folder / "config.json"), XDG_STATE_HOME=str(self.folder / "state"))
+        asked = [word for question in questions for word in ("--ask", question)]
+        result = subprocess.run([PROGRAM, command, "--live", f"{seconds}s", *asked, "--language", "en-GB", *more],
+                                env=environment, capture_output=True, timeout=seconds + 30, text=True, encoding="utf-8")
+        self.assertEqual(result.returncode, 0, result.stderr)
+        return result
+
+    def is_visible(self, question="Can my friends see me?"):
+        context = ssl.create_default_context(cafile=self.service.authority)
+        connection = http.client.HTTPSConnection("localhost", self.service.port, context=context, timeout=20)
+        connection.request("GET", "/assistant?q=" + urllib.parse.quote(question))
+        return json.loads(connection.getresponse().read())["snippet"]["visible"]
+
+    def commands(self):
+        """What was sent to the service, in order; ends it."""
+        _, lines = self.service.end()
+        return [re.fullmatch(r"request \d+: (\w+), (\d+).*", line).groups() for line in lines]
+
+    def test_resting_user_one_command_then_quiet(self):
+        self.serve(track(1, 1))
+        result = self.live(3, "Share my location")
+        self.assertIn("Friends can see where you are, At Brinmouth, HB, Mara Lind", result.stdout)
+        self.assertNotIn("Locating", result.stdout)
+        self.assertEqual(self.commands(), [("showHideLocation", "200")])
+
+    def test_moving_user_is_told_of_until_at_rest(self):
+        self.serve(track(8, 0.25))
+        result = self.live(5, "Share my location")
+        sent = self.commands()
+        # The walk is over after two seconds; a command a move at most, and none afterwards.
+        self.assertEqual(set(sent), {("showHideLocation", "200")})
+        self.assertGreaterEqual(len(sent), 3)
+        self.assertLessEqual(len(sent), 7)
+        self.assertIn("the service was asked: %d answers, 0 failures" % len(sent), result.stderr)
+
+    def test_hidden_user_tells_no_place(self):
+        self.serve(track(8, 0.25))
+        result = self.live(2, "Hide my location")
+        self.assertIn("Hidden from friends, Mara Lind", result.stdout)
+        self.assertIn("Done. Friends can’t see where you are.", result.stdout)
+        self.assertIn("Your location is hidden", result.stderr)
+        self.assertFalse(self.is_visible())
+        self.assertEqual({name for name, _ in self.commands()}, {"getlocations"})
+
+    def test_answer_that_goes_on_does_not_undo_hiding(self):
+        self.serve(track(60, 0.25))
+        with concurrent.futures.ThreadPoolExecutor(1) as pool:
+            run = pool.submit(self.live, 4, "Share my location")
+            time.sleep(2)
+            self.assertFalse(self.is_visible("Hide my location"))
+            self.assertIn("Mara Lind", run.result().stdout)
+        self.assertFalse(self.is_visible())
+        self.assertGreater(len(self.commands()), 3)
+
+    def test_sharing_after_hiding(self):
+        self.serve(track(1, 1))
+        self.live(0.5, "Hide my location")
+        self.assertFalse(self.is_visible())
+        result = self.live(2, "Share my location")
+        self.assertIn("At Brinmouth, HB, Mara Lind", result.stdout)
+        self.assertTrue(self.is_visible())
+
+    def test_answers_that_say_little(self):
+        for fault in ("body=empty", "text={}", 'text={"myInfo":{}}', 'text={"myInfo":null}', "text=[]", "status=503"):
+            with self.subTest(fault):
+                self.serve(track(1, 1), "--fault", fault)
+                result = self.live(1.5, "Share my location")
+                self.assertIn("Friends can see where you are", result.stdout)
+                self.assertIn("Mara Lind", result.stdout)
+                self.assertEqual(len(self.commands()), 1)
+
+    def test_fence(self):
+        self.serve(track(1, 1))
+        result = self.live(1, "Tell me when Ann leaves work")
+        self.assertIn("I will tell you when Ann Marsh leaves.", result.stdout)
+        self.assertIn("Ann Marsh, You’ll hear when they leave Work (link)", result.stdout)
+        result = self.live(1, "Tell me when Ann arrives")
+        self.assertIn("Ann Marsh, You’ll hear when they arrive (link)", result.stdout)
+        # The service is asked, and for nobody.
+        self.assertEqual({name for name, _ in self.commands()}, {"getlocations"})
+
+    def test_pictures(self):
+        self.serve(track(1, 1))
+        for question in ("Tell me when Ann leaves work", "Share my location", "Hide my location"):
+            for mode in ("--light", "--dark"):
+                picture = self.folder / "picture.png"
+                self.live(1, question, command="render", more=("-o", str(picture), mode))
+                self.assertGreater(picture.stat().st_size, 5000)
+
+
+if __name__ == "__main__":
+    sys.exit(unittest.main(warnings="ignore"))
