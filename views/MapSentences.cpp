@@ -81,9 +81,13 @@ std::string MapSentences::ofFriend(const KTRVALocation& record, const std::share
 
 std::string MapSentences::ofFence(const platform::VAKtrGeoFence& fence, const std::shared_ptr<PlatformLocation>& user) {
     const auto place = KTRVAUtils::geoLocationForVALocation(fence.location);
+    // The names that the row has for it.
     const auto label = fence.location ? fence.location->label : std::nullopt;
-    std::string text = label && !label->empty() ? sentence("ACCESSIBILITY_MAP_FENCE_AT", {shownLabel(*label)})
-                                                : sentence("ACCESSIBILITY_MAP_FENCE", {});
+    const std::string name = label && !label->empty() ? shownLabel(*label)
+                             : fence.location         ? fence.location->street.value_or("")
+                                                      : "";
+    std::string text =
+        name.empty() ? sentence("ACCESSIBILITY_MAP_FENCE", {}) : sentence("ACCESSIBILITY_MAP_FENCE_AT", {name});
     appendLength(text, "ACCESSIBILITY_MAP_RADIUS", fence.location ? fence.location->accuracy : std::nullopt);
     if (user && place) {
         appendWay(text, user, place, KTRVALocation::distanceCalculator()->localizedDistance(*user, *place));
