@@ -9,6 +9,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include "app/conversation/Measures.h"
 #include "app/window/AccessibleConversation.h"
 #include "linux/ui/QtCanvas.h"
 
@@ -172,9 +173,8 @@ void ConversationWidget::move() {
     updateBar();
     keepInPlace(turn, before);
     rows_.refresh();
-    if (scrollFrom_ && !conversation->turns().empty()) {
-        const double to = conversation->topOf(*conversation->turns().back());
-        scrollTo(*scrollFrom_ + (to - *scrollFrom_) * scroll_.at(seconds()));
+    if (scrollFrom_) {
+        scrollTo(*scrollFrom_ + (newestTop() - *scrollFrom_) * scroll_.at(seconds()));
         if (scroll_.isOver(seconds())) {
             stopScrolling();
         }
@@ -203,9 +203,7 @@ void ConversationWidget::requestLayout() {
 
 void ConversationWidget::updateBar() {
     // Below the newest turn there is always room enough to bring it to the top.
-    const auto& turns = host_.conversation()->turns();
-    const double newest = turns.size() > 1 ? host_.conversation()->topOf(*turns.back()) : 0.0;
-    const double extent = std::max(contentHeight_, newest + height());
+    const double extent = std::max(contentHeight_, newestTop() + height());
     const int most = std::max(static_cast<int>(std::ceil(extent)) - height(), 0);
     bar_->setPageStep(height());
     bar_->setRange(0, most);
@@ -236,9 +234,18 @@ void ConversationWidget::scrollTo(double y) {
     bar_->setValue(static_cast<int>(std::lround(y)));
 }
 
-void ConversationWidget::scrollToNewest(bool moves) {
+double ConversationWidget::newestTop() const {
     const auto& turns = host_.conversation()->turns();
     if (turns.size() < 2) {
+        return 0.0;
+    }
+    // Side by side, question and card begin at their turn's very top: the space above them is nobody's.
+    const double above = width() >= measures::kWideFrom ? measures::kCardToQuestion : 0.0;
+    return host_.conversation()->topOf(*turns.back()) - above;
+}
+
+void ConversationWidget::scrollToNewest(bool moves) {
+    if (host_.conversation()->turns().size() < 2) {
         return;
     }
     if (moves && host_.conversation()->motionStyle() == MotionStyle::Full) {
@@ -246,7 +253,7 @@ void ConversationWidget::scrollToNewest(bool moves) {
         scroll_ = Motion(0.0, 1.0, seconds(), motions::kArrival);
         startMoving();
     } else {
-        scrollTo(host_.conversation()->topOf(*turns.back()));
+        scrollTo(newestTop());
     }
 }
 

@@ -74,6 +74,8 @@ class ConversationWidget : public QWidget {
     /// Lays out again after a card's height changed; its top, or else its bottom, stays where it is on screen.
     void resizeCard(platform::HostSnippetViewController& controller, bool pinTop);
     void updateBar();
+    /// How far is scrolled when the newest turn is at the top, points.
+    double newestTop() const;
     void choosePalette();
     void animateRings();
     bool touch(QTouchEvent& event);

@@ -1,5 +1,6 @@
 #include "app/window/QuestionEdit.h"
 
+#include <QEvent>
 #include <QGuiApplication>
 #include <QPainter>
 #include <QProxyStyle>
@@ -27,6 +28,7 @@ QuestionEdit::QuestionEdit(QWidget* parent) : QLineEdit(parent), style_(std::mak
     setStyle(style_.get());
     setFrame(false);
     setTextMargins(0, 0, 0, 0);
+    alignToStart();
     connect(&blink_, &QTimer::timeout, this, [this] {
         caretShown_ = !caretShown_;
         update(caret());
@@ -47,6 +49,20 @@ void QuestionEdit::setColors(const linux_::Palette& palette) {
     colors.setColor(QPalette::Highlight, palette.pine);
     colors.setColor(QPalette::HighlightedText, palette.onPine);
     setPalette(colors);
+}
+
+void QuestionEdit::alignToStart() {
+    // By itself, an empty line begins where the keyboard's language does, away from the words that stand in for a
+    // question.
+    setAlignment(layoutDirection() == Qt::RightToLeft ? Qt::AlignRight | Qt::AlignAbsolute | Qt::AlignVCenter
+                                                      : Qt::AlignLeading | Qt::AlignVCenter);
+}
+
+void QuestionEdit::changeEvent(QEvent* event) {
+    QLineEdit::changeEvent(event);
+    if (event->type() == QEvent::LayoutDirectionChange) {
+        alignToStart();
+    }
 }
 
 QRect QuestionEdit::caret() const {

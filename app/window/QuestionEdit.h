@@ -19,11 +19,13 @@ class QuestionEdit : public QLineEdit {
     void paintEvent(QPaintEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
     void focusOutEvent(QFocusEvent* event) override;
+    void changeEvent(QEvent* event) override;
 
   private:
     class CaretlessStyle;
 
     void showCaret();
+    void alignToStart();
     QRect caret() const;
 
     std::unique_ptr<CaretlessStyle> style_;

@@ -12,6 +12,7 @@
 #include <memory>
 
 #include "app/ScenarioReader.h"
+#include "app/conversation/Measures.h"
 #include "platform/base/Platform.h"
 
 #include <gtest/gtest.h>
@@ -273,6 +274,12 @@ TEST_F(KTRConversationWidgetTest, SeveralTurns_BeginWithTheNewestAtTheTop) {
     open({"dinner", "locating"});
     widget->scrollToNewest();
     EXPECT_NEAR(widget->scrolled(), host->conversation()->turns()[1]->frame().y, 1.0);
+}
+
+TEST_F(KTRConversationWidgetTest, NewestOfAWideConversation_KeepsItsSpaceAbove) {
+    open({"dinner", "locating"}, 1100, 700);
+    widget->scrollToNewest();
+    EXPECT_NEAR(widget->scrolled(), host->conversation()->turns()[1]->frame().y - measures::kCardToQuestion, 1.0);
 }
 
 TEST_F(KTRConversationWidgetTest, Accessibility_NamesRolesAndPress) {
