@@ -68,7 +68,8 @@ class ProgramTest(unittest.TestCase):
                 picture = self.folder / (scenario.stem + ".png")
                 self.assert_done(run("render", scenario, "-o", picture))
                 width, height = png_size(picture)
-                self.assertEqual(width, 400)
+                on_tablet = json.loads(scenario.read_text(encoding="utf-8")).get("idiom") == "tablet"
+                self.assertEqual(width, 1100 if on_tablet else 400)
                 self.assertGreater(height, 200)
                 described = run("describe", scenario)
                 self.assert_done(described)
