@@ -6,6 +6,7 @@
 #include "platform/base/Platform.h"
 #include "platform/ui/Device.h"
 #include "service/ContextValues.h"
+#include "service/KTRVAUtils.h"
 
 namespace ktr {
 
@@ -101,6 +102,12 @@ double VAKTRLocationSnippetController::desiredHeightForWidth(double width) {
     const double map = KTRDynVelaMapView::mapHeight();
     const double height = (friendView_ ? friendView_->estimagedHeightForView() : 0.0) + map;
     return height == 0.0 ? map + kHeightOfNoRow : height;
+}
+
+bool VAKTRLocationSnippetController::isSearching() const {
+    const auto record = disambiguatedLocation();
+    return record && friendView_ && friendView_->isRefreshingLocation() &&
+           !KTRVAUtils::geoLocationForVALocation(record->velaLocation());
 }
 
 bool VAKTRLocationSnippetController::allEmptyLocations() const {

@@ -19,6 +19,9 @@ class VAKTRLocationSnippetController : public VAKTRBaseSnippetController {
     /// The row and the map; loads the view if there is none.
     double desiredHeightForWidth(double width) override;
 
+    /// While the row says that the friend is being located.
+    bool isSearching() const override;
+
     /// No record has a coordinate; so it is with no records.
     bool allEmptyLocations() const;
     /// The snippet asked about several friends, and no place is known. This controller's drawing does not ask.
