@@ -116,6 +116,12 @@ std::vector<std::shared_ptr<platform::VAPerson>> VAKTRVisibilityController::frie
     return {object->friend_->object};
 }
 
+bool VAKTRVisibilityController::isSearching() const {
+    const auto refresher = refreshController();
+    const bool known = myLocation_ && myLocation_->hasCoordinate();
+    return isVisible_ && !known && refresher && !refresher->refresherCancelled();
+}
+
 double VAKTRVisibilityController::desiredHeightForWidth(double width) {
     setCurrentWidth(width);
     if (!containerView()) {

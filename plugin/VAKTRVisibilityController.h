@@ -33,6 +33,10 @@ class VAKTRVisibilityController : public VAKTRBaseSnippetController {
     /// The row and, when there is one, the map; loads the view if there is none.
     double desiredHeightForWidth(double width) override;
 
+    /// As long as a shared place is not known and refreshing goes on; ends with the refreshing, though the row says on
+    /// that it is being located.
+    bool isSearching() const override;
+
     /// The user's place is shared, as the snippet said.
     bool isVisible() const { return isVisible_; }
     void setIsVisible(bool visible) { isVisible_ = visible; }

@@ -134,6 +134,22 @@ TEST_F(LiveVisibilityTest, AnswerWithoutABody_LeavesARowOfNobody) {
     EXPECT_EQ(sent(), 1U);
 }
 
+TEST_F(LiveVisibilityTest, Searching_UntilThePlaceIsKnownOrRefreshingEnds) {
+    show(true);
+    EXPECT_TRUE(controller->isSearching());
+    time->advance(5.0);
+    answer({});
+    EXPECT_TRUE(controller->isSearching()) << "no place yet";
+    time->advance(55.0);
+    EXPECT_FALSE(controller->isSearching());
+    show(true);
+    time->advance(5.0);
+    answer({{"myInfo", myInfo(51.5)}});
+    EXPECT_FALSE(controller->isSearching());
+    show(false);
+    EXPECT_FALSE(controller->isSearching());
+}
+
 TEST_F(LiveVisibilityTest, LogLines) {
     show(true);
     time->advance(5.0);
