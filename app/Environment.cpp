@@ -96,11 +96,16 @@ platform::LengthSystem lengthSystem(const Platform& platform) {
     }
 }
 
-void addMaps(Platform& platform, const HostSettings& settings, const linux_::Configuration& configuration) {
+void addMaps(Platform& platform, const HostSettings& settings, LiveServices* live) {
     platform.lengths = std::make_shared<linux_::IcuLengthFormatter>(
         linux_::LocaleRegion(settings.region).localeWithLanguage(settings.language), lengthSystem(platform));
     platform.mapsApplication = std::make_shared<linux_::DesktopMapsApplication>();
-    platform.maps = linux_::ConfiguredMaps::make(configuration, resourceFolder(), platform.mainLoop);
+    const auto maps = linux_::ConfiguredMaps::make(live ? live->configuration() : linux_::Configuration{},
+                                                   resourceFolder(), platform.mainLoop);
+    platform.maps = maps;
+    if (live) {
+        live->drawConfiguredMaps(maps);
+    }
 }
 
 void addUserInterface(Platform& platform, const HostSettings& settings) {
@@ -169,7 +174,7 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
         environment.live = std::make_unique<LiveServices>(*settings.liveConfiguration);
         environment.live->addTo(platform, settings.language, !settings.positions.empty());
     }
-    addMaps(platform, settings, environment.live ? environment.live->configuration() : linux_::Configuration{});
+    addMaps(platform, settings, environment.live.get());
     return environment;
 }
 

@@ -3,6 +3,7 @@
 #include <utility>
 #include <variant>
 
+#include "app/Resources.h"
 #include "linux/account/ConfigurationReader.h"
 #include "linux/account/ConfiguredGeography.h"
 #include "linux/account/ConfiguredRestrictions.h"
@@ -10,6 +11,7 @@
 #include "linux/account/LogindLock.h"
 #include "linux/account/SystemDeviceInformation.h"
 #include "linux/account/XdgFolders.h"
+#include "linux/maps/ConfiguredMaps.h"
 #include "linux/net/QtHttpTransport.h"
 #include "linux/net/RememberedHostTransport.h"
 #include "linux/positions/ConfiguredPositions.h"
@@ -87,22 +89,35 @@ void LiveServices::addTo(platform::Platform& platform, const std::string& langua
 
 void LiveServices::start(std::function<void()> ready) {
     platform::MainLoop* const mainLoop = mainLoop_.get();
-    mainLoop->runInBackground(
-        [this, mainLoop, accounts = accounts_, alive = std::weak_ptr<bool>(alive_), ready = std::move(ready)] {
-            accounts->load();
-            mainLoop->post([this, accounts, alive, ready] {
-                const auto still = alive.lock();
-                if (!still || !*still) {
-                    return;
-                }
-                watcher_ = std::make_unique<linux_::ConfigurationWatcher>(accounts, mainLoop_, [this] {
-                    if (changed_) {
-                        changed_();
-                    }
-                });
-                ready();
-            });
+    mainLoop->runInBackground([this, mainLoop, accounts = accounts_, alive = std::weak_ptr<bool>(alive_),
+                               ready = std::move(ready)] {
+        accounts->load();
+        mainLoop->post([this, accounts, alive, ready] {
+            const auto still = alive.lock();
+            if (!still || !*still) {
+                return;
+            }
+            watcher_ =
+                std::make_unique<linux_::ConfigurationWatcher>(accounts, mainLoop_, [this] { configurationChanged(); });
+            ready();
         });
+    });
+}
+
+void LiveServices::drawConfiguredMaps(std::shared_ptr<linux_::ThreadedMapSource> maps) {
+    maps_ = std::move(maps);
+}
+
+void LiveServices::configurationChanged() {
+    const auto now = accounts_->configuration();
+    if (maps_ && (now.maps != configuration_.maps || now.certificates != configuration_.certificates)) {
+        configuration_.maps = now.maps;
+        configuration_.certificates = now.certificates;
+        maps_->setGrounds(linux_::ConfiguredMaps::grounds(now, resourceFolder()));
+    }
+    if (changed_) {
+        changed_();
+    }
 }
 
 bool LiveServices::isSignedIn() const {

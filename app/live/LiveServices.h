@@ -10,6 +10,7 @@
 #include "linux/account/Configuration.h"
 #include "linux/account/ConfigurationWatcher.h"
 #include "linux/account/ConfiguredAccountStore.h"
+#include "linux/maps/ThreadedMapSource.h"
 #include "linux/net/AssistantClient.h"
 #include "platform/base/Platform.h"
 
@@ -38,6 +39,9 @@ class LiveServices {
     /// reading has ended, well or not.
     void start(std::function<void()> ready);
 
+    /// Has this source draw what the configuration names whenever that changes; the datum stays as it was made.
+    void drawConfiguredMaps(std::shared_ptr<linux_::ThreadedMapSource> maps);
+
     /// Whether there is an account with a host and a token.
     bool isSignedIn() const;
     /// Whether somebody tells where the user is.
@@ -48,6 +52,8 @@ class LiveServices {
     void setChanged(std::function<void()> changed);
 
   private:
+    void configurationChanged();
+
     const std::filesystem::path file_;
     linux_::Configuration configuration_;
     std::shared_ptr<linux_::ConfiguredAccountStore> accounts_;
@@ -55,6 +61,7 @@ class LiveServices {
     std::shared_ptr<ServiceWatch> service_;
     std::unique_ptr<linux_::AssistantClient> assistant_;
     std::unique_ptr<linux_::ConfigurationWatcher> watcher_;
+    std::shared_ptr<linux_::ThreadedMapSource> maps_;
     std::function<void()> changed_;
     bool looksForPosition_ = false;
     /// Tells work in the background whether this still stands.

@@ -1,5 +1,8 @@
 #include "linux/maps/MbtilesFile.h"
 
+#include <filesystem>
+#include <system_error>
+
 #include "linux/maps/MbtilesModule.h"
 #include "linux/services/LoadableModule.h"
 
@@ -18,6 +21,12 @@ std::shared_ptr<MbtilesFile> MbtilesFile::open(const std::string& path, std::str
     }();
     if (!loaded.open) {
         error = loaded.error;
+        return nullptr;
+    }
+    // A pipe would be waited for.
+    std::error_code failed;
+    if (!std::filesystem::is_regular_file(path, failed)) {
+        error = failed ? failed.message() : "not a file";
         return nullptr;
     }
     std::shared_ptr<MbtilesFile> file;
