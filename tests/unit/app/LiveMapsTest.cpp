@@ -14,6 +14,7 @@ class LiveMapsTest : public test::PlatformTest {
   protected:
     void SetUp() override {
         PlatformTest::SetUp();
+        stateBefore = qgetenv("XDG_STATE_HOME");
         qputenv("XDG_STATE_HOME", folder.filePath(QStringLiteral("state")).toUtf8());
         configure("{}");
         HostSettings settings;
@@ -29,7 +30,7 @@ class LiveMapsTest : public test::PlatformTest {
     void TearDown() override {
         platform::Platform::install(nullptr);
         environment = nullptr;
-        qunsetenv("XDG_STATE_HOME");
+        stateBefore.isEmpty() ? qunsetenv("XDG_STATE_HOME") : qputenv("XDG_STATE_HOME", stateBefore);
         PlatformTest::TearDown();
     }
     std::string path() const { return folder.filePath(QStringLiteral("config.json")).toStdString(); }
@@ -50,6 +51,7 @@ class LiveMapsTest : public test::PlatformTest {
     }
 
     QTemporaryDir folder;
+    QByteArray stateBefore;
     std::unique_ptr<Environment> environment;
 };
 
