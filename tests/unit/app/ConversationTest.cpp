@@ -203,6 +203,95 @@ TEST_F(KTRConversationTest, ReadingOrder_IsQuestionSentenceThenCardAlsoSideBySid
     }
 }
 
+TEST_F(KTRConversationTest, Motion_NothingMovesUnlessAsked) {
+    const auto turn = addTurn();
+    turn->arrive(0.0);
+    turn->answerArrives(0.0);
+    conversation->layOut(400.0);
+    controller->height = 300.0;
+    conversation->layOut(400.0);
+    EXPECT_FALSE(conversation->advance(0.01));
+    EXPECT_EQ(turn->cardOpacity(), 1.0);
+    EXPECT_EQ(turn->rise(), 0.0);
+    EXPECT_EQ(turn->card()->frameInRoot(), (Rect{12.0, 134.0, 376.0, 348.0}));
+}
+
+TEST_F(KTRConversationTest, Motion_TurnRisesAndFadesIn) {
+    conversation->setMotionStyle(MotionStyle::Full);
+    addTurn();
+    const auto turn = addTurn();
+    conversation->layOut(400.0);
+    const double place = turn->frame().y;
+    turn->arrive(5.0);
+    EXPECT_TRUE(conversation->advance(5.0));
+    EXPECT_EQ(turn->frame().y, place + motions::kRise);
+    EXPECT_EQ(conversation->topOf(*turn), place) << "scrolling goes where the turn will be";
+    EXPECT_EQ(turn->cardOpacity(), 0.0);
+    double before = turn->frame().y;
+    for (double now = 5.0; now < 5.0 + motions::kArrival; now += 0.016) {
+        conversation->advance(now);
+        EXPECT_LE(turn->frame().y, before) << "it never turns round";
+        before = turn->frame().y;
+    }
+    EXPECT_FALSE(conversation->advance(5.0 + motions::kArrival));
+    EXPECT_EQ(turn->frame().y, place);
+    EXPECT_EQ(turn->cardOpacity(), 1.0);
+    EXPECT_FALSE(conversation->advance(6.0));
+}
+
+TEST_F(KTRConversationTest, Motion_LittleMotionOnlyFades) {
+    conversation->setMotionStyle(MotionStyle::Reduced);
+    const auto turn = addTurn();
+    conversation->layOut(400.0);
+    turn->arrive(5.0);
+    EXPECT_TRUE(conversation->advance(5.01));
+    EXPECT_EQ(turn->rise(), 0.0);
+    EXPECT_GT(turn->cardOpacity(), 0.0);
+    EXPECT_LT(turn->cardOpacity(), 1.0);
+    controller->height = 300.0;
+    conversation->layOut(400.0);
+    EXPECT_EQ(turn->card()->frameInRoot().height, 348.0) << "its height is there at once";
+    EXPECT_FALSE(conversation->advance(5.0 + motions::kFade));
+}
+
+TEST_F(KTRConversationTest, Motion_CardGrowsToItsHeightAndPushesWhatIsBelow) {
+    conversation->setMotionStyle(MotionStyle::Full);
+    const auto first = addTurn();
+    const auto growing = controller;
+    const auto second = addTurn();
+    conversation->layOut(400.0);
+    const Rect card = first->card()->frameInRoot();
+    const double below = second->frame().y;
+    conversation->advance(9.0);
+    growing->height = 300.0;
+    conversation->layOut(400.0);
+    EXPECT_EQ(first->card()->frameInRoot(), card) << "it grows from where it was";
+    EXPECT_EQ(second->frame().y, below);
+    EXPECT_TRUE(conversation->advance(9.0 + motions::kGrowth / 2.0));
+    const double half = first->card()->frameInRoot().height;
+    EXPECT_GT(half, card.height);
+    EXPECT_LT(half, card.height + 100.0);
+    EXPECT_EQ(first->card()->frameInRoot().y, card.y) << "its top stays";
+    EXPECT_DOUBLE_EQ(second->frame().y, below + half - card.height);
+    // Another height meanwhile: it goes on from where it is.
+    growing->height = 200.0;
+    conversation->layOut(400.0);
+    EXPECT_DOUBLE_EQ(first->card()->frameInRoot().height, half);
+    EXPECT_FALSE(conversation->advance(20.0));
+    EXPECT_EQ(first->card()->frameInRoot(), card);
+    EXPECT_EQ(second->frame().y, below);
+}
+
+TEST_F(KTRConversationTest, Motion_AnotherWidthIsNoGrowth) {
+    conversation->setMotionStyle(MotionStyle::Full);
+    const auto turn = addTurn();
+    conversation->layOut(400.0);
+    controller->height = 300.0;
+    conversation->layOut(500.0);
+    EXPECT_EQ(turn->card()->frameInRoot().height, 348.0);
+    EXPECT_FALSE(conversation->advance(0.01));
+}
+
 }  // namespace
 
 }  // namespace ktr::app
