@@ -147,6 +147,22 @@ TEST_F(PictureGroundTest, ACoarserTile_IsFetchedOnlyWhereThereIsNoFinerOne) {
     EXPECT_EQ(pictures.wanted, std::vector({kMiddle, kMiddle.parent(9)}));
 }
 
+TEST_F(PictureGroundTest, FinerPixels_TakeFinerTiles) {
+    auto owned = std::make_unique<ListedPictures>();
+    ListedPictures& pictures = *owned;
+    ground = std::make_shared<PictureGround>(std::move(owned));
+    // A tile of 256 pixels is never drawn much larger than that, nor so small that its writing cannot be read.
+    for (const auto& [scale, level] :
+         {std::pair(1.0, 10), std::pair(1.5, 10), std::pair(2.0, 11), std::pair(3.0, 11)}) {
+        pictures.wanted.clear();
+        auto asked = request();
+        asked.scale = scale;
+        draw(asked);
+        ASSERT_FALSE(pictures.wanted.empty());
+        EXPECT_EQ(pictures.wanted.front().z, level) << scale;
+    }
+}
+
 TEST_F(PictureGroundTest, WhatShowsThrough_IsLand) {
     write({{kMiddle, plain(Qt::transparent)}});
     EXPECT_EQ(draw().pixels.pixelColor(128, 128), QColor(MapStyle::of(false, false).land));
