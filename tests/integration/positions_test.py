@@ -1,0 +1,120 @@
+#!/usr/bin/python3
+"""Where the user is, in the real program: from gpsd and from a GPX track, and without either, which is no failure."""
+
+import json
+import os
+import pathlib
+import re
+import socket
+import subprocess
+import sys
+import tempfile
+import threading
+import unittest
+
+from serve import Service
+
+PROGRAM = os.environ["KTR_PROGRAM"]
+# Two kilometres south of the friend.
+HERE = (51.432, -2.6)
+DISTANCE = "1.2\N{NO-BREAK SPACE}mi"
+
+
+class Gpsd:
+    """Says once where it is, and hangs up when it is told to; then nobody listens there any more."""
+
+    def __init__(self):
+        self.asked = []
+        self.released = threading.Event()
+        self.listening = socket.create_server(("127.0.0.1", 0))
+        self.port = self.listening.getsockname()[1]
+        self.thread = threading.Thread(target=self.serve, daemon=True)
+        self.thread.start()
+
+    def serve(self):
+        connection, _ = self.listening.accept()
+        self.listening.close()
+        self.asked.append(connection.recv(1000))
+        report = {"class": "TPV", "mode": 3, "lat": HERE[0], "lon": HERE[1], "eph": 6.5}
+        connection.sendall(json.dumps(report).encode() + b"\n")
+        self.released.wait(30)
+        connection.close()
+
+    def stop(self):
+        self.released.set()
+        self.thread.join(timeout=30)
+
+
+class PositionsTest(unittest.TestCase):
+    def setUp(self):
+        folder = tempfile.TemporaryDirectory()
+        self.addCleanup(folder.cleanup)
+        self.folder = pathlib.Path(folder.name)
+        friends = self.folder / "friends.json"
+        friends.write_text(json.dumps({"friends": [
+            {"fullName": "Ann Marsh", "firstName": "Ann", "emails": ["ann@harbour.example"],
+             "track": [{"at": 0, "latitude": 51.45, "longitude": -2.6, "label": "Home"}]}]}))
+        self.config = self.folder / "config.json"
+        service = Service(PROGRAM, "--friends", friends, "--write-config", self.config, "--interval", "0.3")
+        self.addCleanup(service.__exit__)
+
+    def start(self, positions, seconds=2, **environment):
+        config = json.loads(self.config.read_text())
+        del config["positions"]
+        if positions is not None:
+            config["positions"] = positions
+        self.config.write_text(json.dumps(config))
+        return subprocess.Popen(
+            [PROGRAM, "describe", "--live", f"{seconds}s", "--ask", "Where are my friends?", "--language", "en-GB"],
+            env={**os.environ, "KTR_CONFIG": str(self.config), "XDG_STATE_HOME": str(self.folder / "state"), **environment},
+            stdout=subprocess.PIPE, stderr=subprocess.PIPE, text=True, encoding="utf-8")
+
+    def told(self, program):
+        told, rest = program.communicate(timeout=60)
+        self.assertEqual(program.returncode, 0, rest)
+        self.assertRegex(rest, r"was asked: \d+ answers, 0 failures\n$")
+        return told
+
+    def test_gpsd_is_heard_and_its_end_is_borne(self):
+        gpsd = Gpsd()
+        program = self.start({"source": "gpsd", "host": "127.0.0.1", "port": gpsd.port}, seconds=4)
+        # It goes when the service has been asked twice: the last position stays.
+        while not re.search(r"[2-9] answers", line := program.stderr.readline()):
+            self.assertNotEqual(line, "")
+        gpsd.stop()
+        self.assertIn(f"At Home, Ann Marsh, {DISTANCE} away", self.told(program))
+        self.assertEqual(gpsd.asked, [b'?WATCH={"enable":true,"json":true};\n'])
+
+    def test_gpsd_that_is_not_there(self):
+        with socket.create_server(("127.0.0.1", 0)) as free:
+            port = free.getsockname()[1]
+        told = self.told(self.start({"source": "gpsd", "host": "127.0.0.1", "port": port}))
+        self.assertIn("At Home, Ann Marsh, Located now", told)
+
+    def test_gpsd_that_says_nothing(self):
+        with socket.create_server(("127.0.0.1", 0)) as silent:
+            told = self.told(self.start({"source": "gpsd", "host": "127.0.0.1", "port": silent.getsockname()[1]}))
+        self.assertIn("At Home, Ann Marsh, Located now", told)
+
+    def test_gpx_track(self):
+        track = self.folder / "walk.gpx"
+        track.write_text('<gpx xmlns="http://www.topografix.com/GPX/1/1"><trk><trkseg>'
+                         f'<trkpt lat="{HERE[0]}" lon="{HERE[1]}"><time>2026-05-16T16:00:00Z</time></trkpt>'
+                         "</trkseg></trk></gpx>")
+        told = self.told(self.start({"source": "track", "file": str(track)}))
+        self.assertIn(f"At Home, Ann Marsh, {DISTANCE} away", told)
+
+    def test_no_track_there(self):
+        told = self.told(self.start({"source": "track", "file": "nowhere.gpx"}))
+        self.assertIn("At Home, Ann Marsh, Located now", told)
+
+    def test_geoclue_without_a_bus(self):
+        told = self.told(self.start(None, DBUS_SYSTEM_BUS_ADDRESS="unix:path=/nonexistent"))
+        self.assertIn("At Home, Ann Marsh, Located now", told)
+
+    def test_none(self):
+        self.assertIn("At Home, Ann Marsh, Located now", self.told(self.start({"source": "none"})))
+
+
+if __name__ == "__main__":
+    sys.exit(unittest.main())
