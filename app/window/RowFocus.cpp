@@ -36,12 +36,15 @@ std::vector<AccessibilityNode> RowFocus::rows() const {
     return rows;
 }
 
+/// Whether a view that the pointer can be over is something to open. Only what is below it is looked at: a pointer
+/// moves many times a second, and there may be thousands of rows.
+bool RowFocus::isRow(const std::shared_ptr<View>& view) const {
+    return view->accessibilityRole() == platform::AccessibilityRole::Link &&
+           (!view->accessibilityText().empty() || !platform::accessibilityTree(view, rightToLeft_).children.empty());
+}
+
 void RowFocus::hover(const std::optional<platform::Point>& point) {
     auto view = point ? root_->hitTest(*point) : nullptr;
-    const auto all = view ? rows() : std::vector<AccessibilityNode>();
-    const auto isRow = [&](const std::shared_ptr<View>& candidate) {
-        return std::any_of(all.begin(), all.end(), [&](const auto& row) { return row.view.lock() == candidate; });
-    };
     while (view && !isRow(view)) {
         view = view->superview();
     }

@@ -36,6 +36,7 @@ class RowFocus {
   private:
     /// What can be opened, in reading order.
     std::vector<platform::AccessibilityNode> rows() const;
+    bool isRow(const std::shared_ptr<platform::View>& view) const;
     void markFocus();
     void markHover();
 

@@ -250,9 +250,11 @@ std::shared_ptr<View> View::hitTest(Point point) {
         return nullptr;
     }
     const auto& children = presentedSubviews();
-    for (auto child = children.rbegin(); child != children.rend(); ++child) {
-        const Point inside = {point.x - (*child)->frame_.x, point.y - (*child)->frame_.y};
-        if (auto hit = (*child)->hitTest(inside)) {
+    // More than the point: what rounds to beside it is asked too.
+    const auto [begin, end] = presentedWithin({point.x - 1.0, point.y - 1.0, 2.0, 2.0});
+    for (std::size_t i = end; i > begin; --i) {
+        View& child = *children[i - 1];
+        if (auto hit = child.hitTest({point.x - child.frame_.x, point.y - child.frame_.y})) {
             return hit;
         }
     }
