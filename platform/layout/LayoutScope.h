@@ -39,8 +39,10 @@ class KTR_API LayoutScope {
     /// The constraints and what became of them at the owner's present size; see docs/layout.md.
     std::string dump();
 
-    /// How often a scope of this platform was solved: for tests and benches.
+    /// How often this scope was solved: for tests and benches.
     int solves() const { return solves_; }
+    /// What it shares with scopes of its kind; none before the first layout: for tests and benches.
+    const std::shared_ptr<LayoutStructure>& structure() const { return structure_; }
 
     /// The layout input of `view` changed (its content, a priority, a constraint): it and all above it are laid out
     /// again, and what they remember of sizes is forgotten.

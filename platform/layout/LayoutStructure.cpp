@@ -71,6 +71,7 @@ const std::vector<double>& LayoutStructure::solved(const std::vector<double>& in
             return values_;
         }
     }
+    ++runs_;
     load(*asked.solver);
     values_.resize(plan_->variables());
     for (VariableId variable = 0; variable < plan_->variables(); ++variable) {

@@ -6,6 +6,7 @@
 #include <unordered_map>
 #include <vector>
 
+#include "platform/base/Api.h"
 #include "platform/base/Geometry.h"
 #include "platform/layout/LayoutPlan.h"
 #include "platform/layout/SolvedForm.h"
@@ -17,7 +18,7 @@ namespace ktr::platform {
 /// elimination that the first one paid for serves them all, and no scope keeps a tableau. Since an answer depends on
 /// the constraints alone, it does not matter whose inputs were loaded before. Answers are kept as sums of the inputs
 /// (SolvedForm): for inputs that one of them holds for, the solver is not asked at all.
-class LayoutStructure {
+class KTR_API LayoutStructure {
   public:
     explicit LayoutStructure(LayoutShape shape);
 
@@ -28,6 +29,8 @@ class LayoutStructure {
                                       double verticalLevel);
     /// The solver's dump for these inputs and an assigned size.
     std::string dump(const std::vector<double>& inputs, Size size);
+    /// How often no kept answer held and the solver was asked: for tests and benches.
+    int runs() const { return runs_; }
 
   private:
     struct Configuration {
@@ -45,6 +48,7 @@ class LayoutStructure {
     std::vector<Configuration> configurations_;
     std::vector<double> constants_;  // the target's two, then the equations'
     std::vector<double> values_;
+    int runs_ = 0;
 };
 
 /// Finds the structure of a shape. One for each installed platform. Main thread.
