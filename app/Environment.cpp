@@ -108,7 +108,7 @@ void addMaps(Platform& platform, const HostSettings& settings, LiveServices* liv
     }
 }
 
-void addUserInterface(Platform& platform, const HostSettings& settings) {
+void addUserInterface(Platform& platform, const HostSettings& settings, bool isWithoutWindow) {
     auto device = std::make_shared<linux_::LinuxDevice>();
     device->setUserInterfaceIdiom(settings.idiom);
     device->setMainScreenScale(settings.scale);
@@ -116,7 +116,10 @@ void addUserInterface(Platform& platform, const HostSettings& settings) {
     platform.device = device;
     platform.textEngine = std::make_shared<linux_::QtTextEngine>(QString::fromStdString(settings.language));
     platform.images = std::make_shared<linux_::QtImageSource>((resourceFolder() / "images").string(), device);
-    platform.appearance = std::make_shared<linux_::QtAppearance>();
+    auto appearance = std::make_shared<linux_::QtAppearance>();
+    // In real time without a window nobody watches: at any moment maps are where they would come to rest.
+    appearance->setReducesMotion(isWithoutWindow && settings.liveConfiguration.has_value());
+    platform.appearance = appearance;
     platform.avatarImages = std::make_shared<linux_::QtAvatarImages>();
     platform.monogramMakers = std::make_shared<linux_::QtMonogramMakerFactory>();
 }
@@ -166,7 +169,7 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
     if (!error.empty()) {
         return Failure{ExitCode::Failure, error};
     }
-    addUserInterface(platform, settings);
+    addUserInterface(platform, settings, isVirtual);
     if (settings.userName) {
         platform.accounts = std::make_shared<ScenarioAccounts>(*settings.userName);
     }

@@ -9,6 +9,15 @@
 
 namespace ktr::app {
 
+namespace {
+
+std::shared_ptr<linux_::QtAppearance> shownAppearance() {
+    const auto installed = platform::Platform::installed();
+    return std::dynamic_pointer_cast<linux_::QtAppearance>(installed ? installed->appearance : nullptr);
+}
+
+}  // namespace
+
 void ConversationView::addTurn(const std::shared_ptr<TurnView>& turn) {
     turns_.push_back(turn);
     turn->setMotionStyle(style_);
@@ -55,6 +64,10 @@ void ConversationView::setMotionStyle(MotionStyle style) {
     for (const auto& turn : turns_) {
         turn->setMotionStyle(style);
     }
+    // None is for a moment; what glides meanwhile goes on.
+    if (const auto shown = shownAppearance(); shown && style != MotionStyle::None) {
+        shown->setReducesMotion(style == MotionStyle::Reduced);
+    }
 }
 
 bool ConversationView::advance(double now) {
@@ -78,9 +91,7 @@ void ConversationView::setPalette(const linux_::Palette& palette) {
     }
     setNeedsDisplay();
     // Maps ask for pictures that fit.
-    const auto installed = platform::Platform::installed();
-    if (const auto shown =
-            std::dynamic_pointer_cast<linux_::QtAppearance>(installed ? installed->appearance : nullptr)) {
+    if (const auto shown = shownAppearance()) {
         shown->show(palette.scheme, palette.contrast);
     }
 }

@@ -22,7 +22,7 @@ class ConversationView : public platform::View {
     /// Lays everything out for a width and takes the height that it needs, which is returned; points.
     double layOut(double width);
 
-    /// What may move from now on; nothing, until this is called.
+    /// What may move from now on; no turn does, until this is called. Pins and maps do not glide in reduced motion.
     void setMotionStyle(MotionStyle style);
     MotionStyle motionStyle() const { return style_; }
     /// Brings everything to where it is at this moment, seconds; whether something goes on moving.

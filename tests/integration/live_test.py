@@ -85,6 +85,14 @@ class LiveTest(unittest.TestCase):
                 {"friend": {"object": {"fullName": "Ann Marsh", "emails": [{"emailAddress": "ann@harbour.example"}]}}}]}}))
         return scenario
 
+    def test_one_friend_is_on_a_map_that_follows(self):
+        walk = [person("Ann", "Marsh", [{"at": at, "latitude": latitude, "longitude": -3.1162, "label": label, "accuracy": 30}
+                                        for at, latitude, label in ((0, 50.2117, "Home"), (2, 50.2133, "Fish Market"))])]
+        result = self.describe(walk, 3, "--interval", "0.4", "--positions", SOURCE / "resources/scenarios/single.json",
+                               question="where is ann")
+        self.assertEqual(result.returncode, 0, result.stderr)
+        self.assertRegex(result.stdout, r"\nMap: Ann Marsh, at Fish Market\. Accurate to (30 metres|33 yards)\. .+ of you \(link\)")
+
     def test_scenario_is_asked_about_at_the_service(self):
         result = self.run_live(self.serve(MOVING), "describe", 2, self.snippet_of_ann(), question=None)
         self.assertEqual(result.returncode, 0, result.stderr)

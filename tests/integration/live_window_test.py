@@ -28,6 +28,11 @@ FIRST_ROW = (200, 220)
 # Where a row says its place, as left, top, right and bottom: nothing else that changes stands there.
 FIRST_PLACE = (90, 192, 300, 212)
 
+# One friend's map: beside the pin, the monogram in the pin, and streets and buildings.
+ON_MAP = (320, 400)
+PIN = (185, 312, 215, 340)
+GROUND = (60, 340, 130, 420)
+
 
 def wait_for(what, condition, seconds=20.0):
     deadline = time.monotonic() + seconds
@@ -65,8 +70,9 @@ class LiveWindowTest(unittest.TestCase):
         os.chmod(folder.name, 0o700)
         self.output = self.folder / "output"
 
-    def serve(self, *options):
-        track = [{"at": at, "latitude": 51.45, "longitude": -2.6, "label": label}
+    def serve(self, *options, step=0.0):
+        """Ann goes so many degrees to the north from label to label, in the demo town."""
+        track = [{"at": at, "latitude": 50.2114 + step * at, "longitude": -3.115, "label": label}
                  for at, label in ((0, "Home"), (4, "Fish Market"), (5, "Work"), (6, "Ferry Pier"), (7, "Harbour Steps"))]
         ann = {"fullName": "Ann Marsh", "firstName": "Ann", "emails": ["ann@harbour.example"], "track": track}
         otto = {"fullName": "Otto Brandt", "firstName": "Otto", "emails": ["otto@mail.example"], "track": track[:1]}
@@ -131,6 +137,21 @@ class LiveWindowTest(unittest.TestCase):
         self.xdotool("key", "Return")
         self.assertEqual(self.url_of(FIRST_ROW), "wayloc://friend/ann@harbour.example")
         self.wait_for_change("another place of Ann's", FIRST_PLACE)
+        self.click(FIELD)
+        self.xdotool("key", "ctrl+q")
+        self.assertEqual(program.wait(timeout=20), 0)
+        self.assertEqual(program.stderr.read(), "")
+
+    def test_one_friend_stands_on_a_map_that_moves(self):
+        self.serve(step=0.0003)
+        program = self.open()
+        self.xdotool("type", "--delay", 5, "where is ann")
+        self.xdotool("key", "Return")
+        self.assertEqual(self.url_of(ON_MAP), "wayloc://friend/ann@harbour.example")
+        pin = wait_for("the pin", lambda: self.picture(PIN))
+        self.wait_for_change("another part of the town", GROUND)
+        # She stays in the middle.
+        wait_for("the pin at rest", lambda: self.picture(PIN) == pin)
         self.click(FIELD)
         self.xdotool("key", "ctrl+q")
         self.assertEqual(program.wait(timeout=20), 0)

@@ -14,6 +14,7 @@
 #include "app/ScenarioReader.h"
 #include "app/conversation/Measures.h"
 #include "platform/base/Platform.h"
+#include "platform/ui/Appearance.h"
 
 #include <gtest/gtest.h>
 
@@ -322,6 +323,15 @@ TEST_F(KTRConversationWidgetTest, Accessibility_KeepsNodesOverLayouts) {
     QApplication::processEvents();
     EXPECT_EQ(root->child(0), turn);
     EXPECT_TRUE(turn->isValid());
+}
+
+TEST_F(KTRConversationWidgetTest, ReducedMotion_HoldsForMapsToo) {
+    open({"single"});
+    widget->setReducedMotion(true);
+    EXPECT_TRUE(platform::Platform::installed()->appearance->reducesMotion());
+    widget->setReducedMotion(false);
+    const bool still = host->conversation()->motionStyle() == MotionStyle::Reduced;
+    EXPECT_EQ(platform::Platform::installed()->appearance->reducesMotion(), still);
 }
 
 TEST_F(KTRConversationWidgetTest, RightToLeft_Mirrors) {
