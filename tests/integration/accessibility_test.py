@@ -36,7 +36,8 @@ def nodes(root):
 
 
 class AccessibilityTest(unittest.TestCase):
-    def test_rows_are_named_links_that_can_be_pressed(self):
+    def open(self, count, *scenarios):
+        """A window on scenarios: its tree once it has that many links, and where it prints URLs."""
         import pyatspi
         from gi.repository import GLib
 
@@ -45,26 +46,32 @@ class AccessibilityTest(unittest.TestCase):
         output = pathlib.Path(folder.name) / "output"
         environment = {**os.environ, "QT_LINUX_ACCESSIBILITY_ALWAYS_ON": "1", "QT_QPA_PLATFORM": "xcb"}
         with output.open("w") as stream:
-            program = subprocess.Popen([PROGRAM, "show", SCENARIOS / "dinner.json", "--print-urls"], env=environment,
-                                       stdout=stream)
+            program = subprocess.Popen([PROGRAM, "show", *(SCENARIOS / name for name in scenarios), "--print-urls"],
+                                       env=environment, stdout=stream)
         self.addCleanup(program.wait)
         self.addCleanup(program.kill)
         desktop = pyatspi.Registry.getDesktop(0)
 
         def application():
             found = [desktop.getChildAtIndex(i) for i in range(desktop.childCount)]
-            return next((one for one in found if one and one.name == "ktr" and one.childCount), None)
+            return next((one for one in found if one and one.name == "ktr" and one.childCount
+                         and one.get_process_id() == program.pid), None)
 
         def whole_tree():
             """None while the window is still being filled: a node may go between two questions about it."""
             try:
                 tree = list(nodes(application()))
                 links = [node for node in tree if node.getRoleName() == "link"]
-                return tree if len(links) == 6 and all(link.name for link in links) else None
+                return tree if len(links) == count and all(link.name for link in links) else None
             except (AttributeError, RuntimeError, LookupError, GLib.Error):
                 return None
 
-        tree = wait_for("the window's six links on the bus", whole_tree)
+        return wait_for(f"the window's {count} links on the bus", whole_tree), output
+
+    def test_rows_are_named_links_that_can_be_pressed(self):
+        import pyatspi
+
+        tree, output = self.open(6, "dinner.json")
         texts = [node.name for node in tree if node.getRoleName() == "label"]
         self.assertEqual(texts[1:3], ["Where are my friends near the harbour?", "Here are the five nearest."])
         links = [node for node in tree if node.getRoleName() == "link"]
@@ -76,6 +83,19 @@ class AccessibilityTest(unittest.TestCase):
         self.assertEqual([place.y for place in places], sorted(place.y for place in places))
         links[1].queryAction().doAction(0)
         wait_for("the URL", lambda: output.read_text() == "wayloc://friend/l.haddad@mail.example\n")
+
+    def test_fences_and_sharing_make_sense_without_seeing(self):
+        tree, output = self.open(5, "fence-leaving.json", "sharing-visible.json", "sharing-hidden.json")
+        links = [node for node in tree if node.getRoleName() == "link"]
+        names = [link.name.replace("\u00a0", " ") for link in links]
+        self.assertEqual(names[0], "נועם ברק, You’ll hear when they leave Work")
+        self.assertIn("Map: the area around Work", names[1])
+        self.assertIn("Friends can see where you are", names[2])
+        self.assertIn("Mara Lind", names[2])
+        self.assertIn("Map: you are here", names[3])
+        self.assertEqual(names[4], "Hidden from friends, Mara Lind")
+        links[0].queryAction().doAction(0)
+        wait_for("the URL", lambda: output.read_text() == "wayloc://friend/n.barak@harbour.example\n")
 
 
 def outside():

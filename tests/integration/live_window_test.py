@@ -2,12 +2,14 @@
 """Opens the live window on a virtual display with `ktr serve` behind it: types a question, sees the answer and sees it move;
 closing the window ends the service. Skipped without Xvfb, xdotool and xwd."""
 
+import http.client
 import json
 import os
 import pathlib
 import re
 import shutil
 import signal
+import ssl
 import struct
 import subprocess
 import sys
@@ -173,6 +175,27 @@ class LiveWindowTest(unittest.TestCase):
         paper = self.picture((100, 701, 101, 702))
         wait_for("the second answer at the top",
                  lambda: self.picture((0, 0, 380, 700)) != answered and self.picture(below) == paper * (380 * 300))
+        self.xdotool("key", "ctrl+w")
+
+    def test_typed_wishes_are_honoured(self):
+        service = self.serve()
+        self.open("--reduced-motion")
+        context = ssl.create_default_context(cafile=service.authority)
+
+        def is_visible():
+            connection = http.client.HTTPSConnection("localhost", service.port, context=context, timeout=20)
+            connection.request("GET", "/assistant?q=can%20my%20friends%20see%20me")
+            return json.loads(connection.getresponse().read())["snippet"]["visible"]
+
+        self.xdotool("type", "--delay", 5, "tell me when ann leaves work")
+        self.xdotool("key", "Return")
+        self.assertEqual(self.url_of(FIRST_ROW), "wayloc://friend/ann@harbour.example")
+        self.assertTrue(is_visible())
+        for question, visible in (("hide my location", False), ("share my location", True)):
+            self.click(FIELD)
+            self.xdotool("type", "--delay", 5, question)
+            self.xdotool("key", "Return")
+            wait_for(question, lambda wanted=visible: is_visible() == wanted)
         self.xdotool("key", "ctrl+w")
 
     def test_faults_do_not_hold_the_window_up(self):
