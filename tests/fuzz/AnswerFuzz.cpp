@@ -5,8 +5,10 @@
 #include "linux/json/JsonReader.h"
 #include "platform/base/Utf8.h"
 #include "plugin/VAKTRMultipleLocationsSnippetController.h"
+#include "plugin/VAKTRVisibilityController.h"
 #include "service/GetLocationsCmd.h"
 #include "service/KTRVAUtils.h"
+#include "service/ShowHideLocationCmd.h"
 #include "tests/fuzz/DictionaryMaker.h"
 #include "tests/fuzz/Require.h"
 #include "tests/support/FakeHost.h"
@@ -97,6 +99,41 @@ void checkSnippet(World& world, const platform::HttpAnswer& answer) {
     controller->viewWillDisappear(false);
 }
 
+/// The answer to a command about the user's own sharing, by itself and on screen.
+void checkSharing(World& world, const platform::HttpAnswer& answer) {
+    const auto command = platform::create<ShowHideLocationCmd>(&ShowHideLocationCmd::init);
+    command->setCurrentLocation(world.position(51.0, -1.0));
+    platform::KTServerInteractionController().sendCommand(command, nullptr);
+    world.transport->answer(answer);
+    world.time->runPosted();
+    const bool isObject = answer.json && answer.json->dictionary() != nullptr;
+    const auto result = command->result();
+    require(result.has_value() && result->size() == (isObject ? 2U : 0U), "an answer and a record, or nothing");
+    if (const auto& url = command->contextIdentifierURL()) {
+        require(!KTRVAUtils::contextDictionaryForURL(*url).contains("authToken"), "no secret goes into the context");
+    }
+
+    using Controller = VAKTRVisibilityController;
+    constexpr double kPollInterval = 5.0;
+    const auto snippet = std::make_shared<platform::VAKtrVisibilityView>();
+    snippet->visible = true;
+    snippet->searchContext = platform::Url(
+        "ktrServerContext://serverContext?minCallbackIntervalInMS=5000&callbackTimeoutIntervalInMS=60000&");
+    const auto controller = platform::create<Controller>(&Controller::initWithCueObject, snippet);
+    const auto host = std::make_shared<test::FakeHost>();
+    controller->setDelegate(host);
+    controller->desiredHeightForWidth(375.0);
+    world.time->advance(kPollInterval);
+    require(world.transport->waiting.size() == 1, "the user's place is told");
+    world.transport->answer(answer);
+    world.time->runPosted();
+    require((controller->myLocation() != nullptr) == (isObject || host->heightChanges.empty()), "the newest record");
+    require(controller->friends().size() <= 1, "the user alone");
+    const double height = controller->desiredHeightForWidth(375.0);
+    require(height > 0.0 && height < 1e6, "a height is a height");
+    controller->viewWillDisappear(false);
+}
+
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
@@ -104,5 +141,6 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     World world;
     checkCommand(world, answer);
     checkSnippet(world, answer);
+    checkSharing(world, answer);
     return 0;
 }

@@ -149,6 +149,13 @@ Dictionary DictionaryMaker::answer() {
                      return handles;
                  }));
     }
+    if (choice(2) == 1) {
+        made.set("myInfo", mostly([&] {
+                     Dictionary mine = entry();
+                     mine.set("preferredEmail", mostly([&] { return handle(); }));
+                     return mine;
+                 }));
+    }
     return made;
 }
 
