@@ -1,6 +1,7 @@
 #include "linux/services/IcuDistanceCalculator.h"
 
 #include <cmath>
+#include <functional>
 #include <string_view>
 #include <utility>
 
@@ -20,6 +21,11 @@ constexpr std::string_view kNoBreakSpace = "\u00a0";
 /// A friend who walks towards the user should be seen to come nearer: tens where road signs count in fifties.
 constexpr double kStep = 10.0;
 constexpr double kLeastInTens = 10.0;
+
+/// Of all friends of a long list, some 100 bytes each.
+constexpr std::size_t kMostKnown = 16384;
+/// An odd number without a pattern (2^64 divided by the golden ratio).
+constexpr std::size_t kHashFactor = 0x9E3779B97F4A7C15U;
 
 /// What short distances are told in.
 bool isShortUnit(const icu::MeasureUnit& unit) {
@@ -139,14 +145,39 @@ IcuDistanceCalculator::IcuDistanceCalculator(Settings settings, std::optional<Un
 
 IcuDistanceCalculator::~IcuDistanceCalculator() = default;
 
+std::size_t IcuDistanceCalculator::EndsHash::operator()(const Ends& ends) const {
+    std::size_t hash = 0;
+    for (const double part : {ends.from.latitude, ends.from.longitude, ends.to.latitude, ends.to.longitude}) {
+        hash = hash * kHashFactor + std::hash<double>()(part);
+    }
+    return hash ^ (hash >> 32U);
+}
+
 std::optional<std::string> IcuDistanceCalculator::localizedDistance(const platform::PlatformLocation& from,
                                                                     const platform::PlatformLocation& to) {
-    return localizedDistance(geodesy_->distance(from.coordinate(), to.coordinate()));
+    const Ends ends{from.coordinate(), to.coordinate()};
+    if (const auto found = known_.find(ends); found != known_.end()) {
+        return framed(found->second);
+    }
+    const std::string text = worded(geodesy_->distance(ends.from, ends.to));
+    if (text.empty()) {
+        return std::nullopt;
+    }
+    if (known_.size() == kMostKnown) {
+        known_.clear();
+    }
+    known_.emplace(ends, text);
+    return framed(text);
 }
 
 std::optional<std::string> IcuDistanceCalculator::localizedDistance(double metres) const {
+    const std::string text = worded(metres);
+    return text.empty() ? std::nullopt : std::optional(framed(text));
+}
+
+std::string IcuDistanceCalculator::worded(double metres) const {
     if (!formatter_->usable || !std::isfinite(metres) || metres < 0.0) {
-        return std::nullopt;
+        return {};
     }
     UErrorCode status = U_ZERO_ERROR;
     auto formatted = formatter_->road.formatDouble(metres, status);
@@ -156,15 +187,19 @@ std::optional<std::string> IcuDistanceCalculator::localizedDistance(double metre
     std::string text;
     formatted.toString(status).toUTF8String(text);
     if (U_FAILURE(status)) {
-        return std::nullopt;
+        return {};
     }
     for (auto at = text.find(' '); at != std::string::npos; at = text.find(' ', at)) {
         text.replace(at, 1, kNoBreakSpace);
     }
-    if (const auto& texts = settings_.localizationDelegate) {
-        text = platform::formatted(texts->text(kFrameKey, texts->hostBundleIdentifier(), std::nullopt, "%@"), {text});
-    }
     return text;
+}
+
+std::string IcuDistanceCalculator::framed(const std::string& text) const {
+    const auto& texts = settings_.localizationDelegate;
+    return texts
+               ? platform::formatted(texts->text(kFrameKey, texts->hostBundleIdentifier(), std::nullopt, "%@"), {text})
+               : text;
 }
 
 long IcuDistanceCalculator::measurementSystem() const {

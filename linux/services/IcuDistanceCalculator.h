@@ -3,6 +3,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <unordered_map>
 
 #include "platform/client/DistanceCalculator.h"
 #include "platform/location/Geodesy.h"
@@ -32,11 +33,25 @@ class IcuDistanceCalculator : public platform::DistanceCalculator {
 
   private:
     struct Formatter;
+    struct Ends {
+        platform::Coordinate from;
+        platform::Coordinate to;
+        bool operator==(const Ends&) const = default;
+    };
+    struct EndsHash {
+        std::size_t operator()(const Ends& ends) const;
+    };
+
+    /// Without the host's frame; empty for a distance that is negative or not finite.
+    std::string worded(double metres) const;
+    std::string framed(const std::string& text) const;
 
     Settings settings_;
     UnitSystem system_;
     std::shared_ptr<platform::Geodesy> geodesy_;
     std::unique_ptr<Formatter> formatter_;
+    /// What was worded lately: at each refresh most friends are where they were.
+    std::unordered_map<Ends, std::string, EndsHash> known_;
 };
 
 }  // namespace ktr::linux_

@@ -51,6 +51,38 @@ TEST_F(IcuDistanceCalculatorTest, WithoutALanguage_TheRegionsOwnIsUsed) {
     EXPECT_EQ(text(std::nullopt, "de-AT", 950.0), "0,95\u00a0km");
 }
 
+TEST_F(IcuDistanceCalculatorTest, SamePlacesAgain_AreNotMeasuredAgain) {
+    struct CountingGeodesy : GeographicLibGeodesy {
+        double distance(const platform::Coordinate& from, const platform::Coordinate& to) const override {
+            ++asked;
+            return GeographicLibGeodesy::distance(from, to);
+        }
+        mutable int asked = 0;
+    };
+    const auto geodesy = std::make_shared<CountingGeodesy>();
+    IcuDistanceCalculator calculator({"group", "en-GB", "de-DE", nullptr}, std::nullopt, geodesy);
+    const auto at = [](double latitude, double longitude) {
+        platform::PlatformLocation::Fix fix;
+        fix.coordinate = {latitude, longitude};
+        return platform::PlatformLocation(fix);
+    };
+    const auto user = at(50.0, 8.0);
+    EXPECT_EQ(calculator.localizedDistance(user, at(51.0, 8.0)), "111\u00a0km");
+    EXPECT_EQ(calculator.localizedDistance(user, at(51.0, 8.0)), "111\u00a0km");
+    EXPECT_EQ(geodesy->asked, 1);
+    EXPECT_EQ(calculator.localizedDistance(user, at(52.0, 8.0)), "222\u00a0km");
+    EXPECT_EQ(calculator.localizedDistance(at(51.0, 8.0), user), "111\u00a0km");
+    EXPECT_EQ(calculator.localizedDistance(at(8.0, 51.0), user), calculator.localizedDistance(user, at(8.0, 51.0)));
+    EXPECT_EQ(geodesy->asked, 5);
+    EXPECT_EQ(calculator.localizedDistance(user, at(NAN, 8.0)), std::nullopt);
+    // More than are kept: each is still its own.
+    for (int i = 0; i < 20000; ++i) {
+        calculator.localizedDistance(user, at(50.0 + 0.0001 * i, 8.0));
+    }
+    EXPECT_EQ(calculator.localizedDistance(user, at(51.0, 8.0)), "111\u00a0km");
+    EXPECT_EQ(calculator.localizedDistance(user, at(52.0, 8.0)), "222\u00a0km");
+}
+
 TEST_F(IcuDistanceCalculatorTest, EveryBlankIsOneThatDoesNotBreak) {
     for (const char* region : {"en-US", "en-GB", "de-DE", "fr-FR", "ar-EG", "ja-JP", "hi-IN"}) {
         for (const double metres : {1.0, 75.0, 640.0, 1500.0, 1e6}) {
