@@ -28,9 +28,13 @@ def person(first, last, track, **more):
             "emails": [f"{first.lower()}@harbour.example"], **more}
 
 
-# Whoever asks at the start sees Ann at Home, and soon afterwards elsewhere.
-MOVING = [person("Ann", "Marsh", [place(0, "Home"), place(2, "Fish Market", 51.46)]),
-          person("Otto", "Brandt", [place(0, "Work")])]
+def moving(at):
+    """Whoever asks before that second of the service sees Ann at Home, and afterwards elsewhere."""
+    return [person("Ann", "Marsh", [place(0, "Home"), place(at, "Fish Market", 51.46)]),
+            person("Otto", "Brandt", [place(0, "Work")])]
+
+
+MOVING = moving(2)
 
 
 class LiveTest(unittest.TestCase):
@@ -53,7 +57,7 @@ class LiveTest(unittest.TestCase):
         ask = [] if question is None else ["--ask", question]
         begin = time.monotonic()
         result = subprocess.run([PROGRAM, command, "--live", f"{seconds}s", *ask, "--language", "en-GB", *map(str, arguments)],
-                                env=environment, capture_output=True, timeout=seconds + 30, text=True, encoding="utf-8")
+                                env=environment, capture_output=True, timeout=seconds + 60, text=True, encoding="utf-8")
         result.seconds = time.monotonic() - begin
         return result
 
@@ -70,10 +74,10 @@ class LiveTest(unittest.TestCase):
         self.assertRegex(result.stderr, r"the service was asked: [2-9]\d* answers, 0 failures")
 
     def test_picture_shows_where_they_have_moved_to(self):
-        environment = self.serve(MOVING, "--interval", "0.4")
+        environment = self.serve(moving(6), "--interval", "0.4")
         before, after = self.folder / "before.png", self.folder / "after.png"
         self.assertEqual(self.run_live(environment, "render", 0.1, "-o", before).returncode, 0)
-        self.assertEqual(self.run_live(environment, "render", 3, "-o", after).returncode, 0)
+        self.assertEqual(self.run_live(environment, "render", 8, "-o", after).returncode, 0)
         self.assertNotEqual(before.read_bytes(), after.read_bytes())
 
     def snippet_of_ann(self):
@@ -151,10 +155,11 @@ class LiveTest(unittest.TestCase):
 
     def check_fault(self, name):
         words, status, shown = self.FAULTS[name]
-        result = self.describe(MOVING, 3.5, "--interval", "0.4", "--fault", words)
+        # Nobody may be so slow as to ask only after Ann has moved: nine ask at once, perhaps under a sanitizer.
+        result = self.describe(moving(7), 9, "--interval", "0.4", "--fault", words)
         told = f"{name}\n{result.stdout}\n{result.stderr}"
         assert result.returncode == 0, told
-        assert result.seconds < 12.0, told
+        assert result.seconds < 25.0, told
         assert "Where are my friends?" in result.stdout, told
         assert shown is None or shown in result.stdout, told
         last = result.stderr.rstrip().rsplit("ktr: ", 1)[-1]
