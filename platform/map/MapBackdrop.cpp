@@ -10,6 +10,8 @@ namespace ktr::platform {
 
 namespace {
 
+constexpr std::size_t kMostEarlier = 3;
+
 /// Where a picture of another viewport stands in this one: the same ground at the same places.
 Rect placeOf(const MapViewport& picture, const MapViewport& viewport) {
     const Point middle = viewport.pointFor(picture.centre);
@@ -49,6 +51,9 @@ void MapBackdrop::want(const MapPictureRequest& request) {
     if (!source_ || wanted_ == request) {
         return;
     }
+    if (wanted_ && (wanted_->isDark != request.isDark || wanted_->isHighContrast != request.isHighContrast)) {
+        earlier_.clear();
+    }
     wanted_ = request;
     this->request();
 }
@@ -80,7 +85,10 @@ void MapBackdrop::sourceChanged() {
 void MapBackdrop::arrived(const MapPicture& picture) {
     pending_ = std::nullopt;
     if (latest_ && latest_->viewport != picture.viewport) {
-        previous_ = std::move(latest_);
+        earlier_.push_back(std::move(*latest_));
+        if (earlier_.size() > kMostEarlier) {
+            earlier_.erase(earlier_.begin());
+        }
     }
     latest_ = picture;
     attribution_ = picture.attribution;
@@ -93,12 +101,19 @@ void MapBackdrop::arrived(const MapPicture& picture) {
 void MapBackdrop::draw(Canvas& canvas, const MapViewport& viewport) const {
     const Size& size = viewport.size;
     canvas.fill(Rect{0.0, 0.0, size.width, size.height}, Color::ofRole(ColorRole::MapLand));
-    const Rect top = latest_ ? placeOf(latest_->viewport, viewport) : Rect{};
-    if (previous_ && previous_->image && !(latest_ && covers(top, size))) {
-        canvas.drawMoving(*previous_->image, placeOf(previous_->viewport, viewport));
-    }
     if (!latest_ || !latest_->image) {
         return;
+    }
+    const Rect top = placeOf(latest_->viewport, viewport);
+    // From the newest that fills the map, or else the oldest.
+    auto first = earlier_.end();
+    for (Rect place = top; first != earlier_.begin() && !covers(place, size);) {
+        place = placeOf((--first)->viewport, viewport);
+    }
+    for (; first != earlier_.end(); ++first) {
+        if (first->image) {
+            canvas.drawMoving(*first->image, placeOf(first->viewport, viewport));
+        }
     }
     // At rest every pixel of the picture is a pixel of the screen.
     if (latest_->viewport == viewport) {

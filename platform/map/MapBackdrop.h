@@ -4,6 +4,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "platform/map/MapPictureSource.h"
 
@@ -26,7 +27,7 @@ class MapBackdrop {
     /// What is to be seen when the map has come to rest. Asks for nothing that was asked for last; what is under way
     /// and no longer wanted is cancelled.
     void want(const MapPictureRequest& request);
-    /// The pictures that there are, the latest on top; beside them the land's colour.
+    /// The pictures that there are, the latest on top, as many as fill the map; beside them the land's colour.
     void draw(Canvas& canvas, const MapViewport& viewport) const;
     /// Of the latest picture; empty without one.
     const std::string& attribution() const { return attribution_; }
@@ -44,9 +45,9 @@ class MapBackdrop {
     std::optional<int> pending_;
     /// The source's pictures have changed while one was being drawn.
     bool isOutdated_ = false;
-    /// The latest, and the one that was shown before it.
     std::optional<MapPicture> latest_;
-    std::optional<MapPicture> previous_;
+    /// What was shown before it, the oldest first: several when a map changes its way while it glides.
+    std::vector<MapPicture> earlier_;
     std::string attribution_;
     /// For callbacks that come when the ground is gone.
     std::shared_ptr<MapBackdrop*> self_;

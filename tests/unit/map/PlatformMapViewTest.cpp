@@ -148,7 +148,6 @@ TEST_F(PlatformMapViewTest, Gliding_AsksForTheTargetOnlyAndDrawsWhatThereIs) {
     map_->setRegion(kTown, false);
     time->runPosted();
     const auto first = maps_->answer();
-    time->runPosted();
     map_->setRegion({{50.211, -3.12}, {0.01, 0.01}}, true);
     time->runPosted();
     const auto asked = maps_->requests.size();
@@ -159,9 +158,21 @@ TEST_F(PlatformMapViewTest, Gliding_AsksForTheTargetOnlyAndDrawsWhatThereIs) {
     const auto picture = std::find_if(canvas.calls.begin(), canvas.calls.end(),
                                       [&](const auto& call) { return call.object == first.get(); });
     ASSERT_NE(picture, canvas.calls.end());
-    // The ground moves down while the map goes north.
-    EXPECT_GT(picture->rect.y, 0.5);
+    EXPECT_GT(picture->rect.y, 0.5) << "the ground moves down while the map goes north";
     EXPECT_NEAR(picture->rect.height, 219.0, 0.1);
+}
+
+TEST_F(PlatformMapViewTest, AnotherWayWhileGliding_NoEdgeIsLeftBare) {
+    for (const double latitude : {50.21, 50.211, 50.212}) {
+        map_->setRegion({{latitude, -3.12}, {0.01, 0.01}}, true);
+        time->runPosted();
+        maps_->answer();
+        time->advance(0.02);
+    }
+    const auto canvas = painted();
+    EXPECT_EQ(count(canvas, RecordingCanvas::Call::Kind::Image), 3U);
+    EXPECT_TRUE(std::any_of(canvas.calls.begin(), canvas.calls.end(),
+                            [](const auto& call) { return call.object && call.rect.maxY() >= 219.0 - 1e-6; }));
 }
 
 TEST_F(PlatformMapViewTest, AtRest_TheLatestPictureAloneFillsTheMap) {
