@@ -18,6 +18,10 @@ constexpr double kWaterSize = 12.0;
 constexpr double kSpacedLetters = 0.4;
 /// More surfaces than this are not named in one picture.
 constexpr std::size_t kMostAreas = 60;
+/// Labels that are tried in one picture, and pieces of streets that they may stand along: several times what the
+/// densest town has, and no more of what a file makes up to keep a worker busy.
+constexpr int kMostTries = 1000;
+constexpr std::size_t kMostStreetPieces = 10'000;
 /// Where a label is tried in a surface: so many columns and rows of its visible part.
 constexpr int kColumns = 9;
 constexpr int kRows = 9;
@@ -150,11 +154,18 @@ void VectorLabels::collect(const VisibleTile& visible) {
 
 void VectorLabels::collectFeature(const TileGeometry& geometry, const MapTile::Feature& feature, Name name) {
     if (feature.shape == MapTile::Shape::Lines) {
+        if (streetPieces_ >= kMostStreetPieces) {
+            return;
+        }
         if (isRoad(feature.kind) || feature.kind == MapKind::WaterLine || feature.kind == MapKind::WaterName) {
             auto& street = streets_[name];
             street.kind = street.pieces.empty() ? feature.kind : std::max(street.kind, feature.kind);
-            geometry.eachLine(feature,
-                              [&](const QPolygonF& piece, double /*from*/) { street.pieces.push_back(piece); });
+            geometry.eachLine(feature, [&](const QPolygonF& piece, double /*from*/) {
+                if (streetPieces_ < kMostStreetPieces) {
+                    street.pieces.push_back(piece);
+                    ++streetPieces_;
+                }
+            });
         }
     } else if (feature.shape == MapTile::Shape::Areas) {
         if (areas_.size() < kMostAreas &&
@@ -177,6 +188,9 @@ void VectorLabels::place(MapLabels& labels) {
         collect(visible);
     }
     for (auto& [name, street] : streets_) {
+        if (drawing_.stop.stop_requested()) {
+            return;
+        }
         street.pieces = joinLines(std::move(street.pieces));
         street.length = street.pieces.empty() ? 0.0 : lengthOf(street.pieces.front());
     }
@@ -195,7 +209,11 @@ void VectorLabels::place(MapLabels& labels) {
     placeStreets(labels, MapKind::Service);
 }
 
-void VectorLabels::placePlaces(MapLabels& labels) const {
+bool VectorLabels::mayTry() {
+    return ++tries_ <= kMostTries && !drawing_.stop.stop_requested();
+}
+
+void VectorLabels::placePlaces(MapLabels& labels) {
     std::vector<std::pair<Name, const Spot*>> places;
     for (const auto& [key, spot] : spots_) {
         if (spot.kind == MapKind::Place && scale_.showsPlace(spot.rank)) {
@@ -207,14 +225,14 @@ void VectorLabels::placePlaces(MapLabels& labels) const {
     for (const auto& [name, spot] : places) {
         const LabelLook look = lookOf(spot->rank);
         for (const double shift : {0.0, -1.2, 1.2}) {
-            if (labels.placeAt(std::string(name), look, spot->point + QPointF(0.0, shift * look.size))) {
+            if (!mayTry() || labels.placeAt(std::string(name), look, spot->point + QPointF(0.0, shift * look.size))) {
                 break;
             }
         }
     }
 }
 
-void VectorLabels::placeStreets(MapLabels& labels, MapKind kind) const {
+void VectorLabels::placeStreets(MapLabels& labels, MapKind kind) {
     std::vector<std::pair<Name, const Street*>> streets;
     for (const auto& [name, street] : streets_) {
         if (street.kind == kind) {
@@ -225,11 +243,8 @@ void VectorLabels::placeStreets(MapLabels& labels, MapKind kind) const {
                      [](const auto& a, const auto& b) { return a.second->length > b.second->length; });
     const LabelLook look = lookOf(kind);
     for (const auto& [name, street] : streets) {
-        if (drawing_.stop.stop_requested()) {
-            return;
-        }
         for (const auto& line : street->pieces) {
-            if (labels.placeAlong(std::string(name), look, line)) {
+            if (!mayTry() || labels.placeAlong(std::string(name), look, line)) {
                 break;
             }
         }
@@ -249,6 +264,9 @@ void VectorLabels::placeAreas(MapLabels& labels, MapKind kind) {
     }
     std::stable_sort(areas.begin(), areas.end(), [](const auto& a, const auto& b) { return a.first > b.first; });
     for (const auto& [size, name] : areas) {
+        if (!mayTry()) {
+            return;
+        }
         const QPainterPath& path = areas_[{kind, name}];
         const QRectF bounds = path.boundingRect() & labels.room();
         const QSizeF label = labels.sizeOf(std::string(name), look);
@@ -273,6 +291,9 @@ void VectorLabels::placeSpots(MapLabels& labels, MapKind kind) {
             continue;
         }
         for (const double shift : {0.0, -1.3, 1.3}) {
+            if (!mayTry()) {
+                return;
+            }
             if (labels.placeAt(std::string(key.second), look, spot.point + QPointF(0.0, shift * look.size))) {
                 named_.emplace_back(key);
                 break;

@@ -39,10 +39,12 @@ class VectorLabels {
 
     void collect(const VisibleTile& visible);
     void collectFeature(const TileGeometry& geometry, const MapTile::Feature& feature, Name name);
-    void placePlaces(MapLabels& labels) const;
-    void placeStreets(MapLabels& labels, MapKind kind) const;
+    void placePlaces(MapLabels& labels);
+    void placeStreets(MapLabels& labels, MapKind kind);
     void placeAreas(MapLabels& labels, MapKind kind);
     void placeSpots(MapLabels& labels, MapKind kind);
+    /// Whether one more label may be tried.
+    bool mayTry();
     LabelLook lookOf(MapKind kind) const;
     LabelLook lookOf(PlaceRank rank) const;
 
@@ -55,6 +57,8 @@ class VectorLabels {
     std::map<std::pair<MapKind, Name>, Spot> spots_;
     /// Parks and waters that have their name.
     std::vector<std::pair<MapKind, Name>> named_;
+    std::size_t streetPieces_ = 0;
+    int tries_ = 0;
 };
 
 }  // namespace ktr::linux_

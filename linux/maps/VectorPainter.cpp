@@ -8,6 +8,9 @@ namespace ktr::linux_ {
 
 namespace {
 
+/// A surface of more points is filled part by part.
+constexpr int kMostElements = 20'000;
+
 /// The features of one kind: they stand together.
 template <class Receiver>
 void eachOf(const MapTile& tile, MapKind kind, const Receiver& receive) {
@@ -30,6 +33,7 @@ VectorPainter::VectorPainter(const MapDrawing& drawing, const std::vector<Visibl
       painter_(drawing.painter),
       tiles_(tiles),
       scale_(scale),
+      budget_(drawing),
       style_(MapStyle::of(drawing.request.isDark, drawing.request.isHighContrast)) {}
 
 void VectorPainter::each(MapKind kind, MapTile::Shape shape, const Receiver& receive) const {
@@ -56,23 +60,32 @@ void VectorPainter::fill(MapKind kind, const QColor& color) {
     // time grows faster than the size of a surface.
     QPainterPath cut;
     cut.setFillRule(Qt::WindingFill);
+    const auto fillPath = [&](const QPainterPath& path) {
+        if (budget_.takeArea(path)) {
+            painter_.fillPath(path, color);
+        }
+    };
     each(kind, MapTile::Shape::Areas, [&](const TileGeometry& geometry, const MapTile::Feature& feature) {
         if (!geometry.isInside(feature)) {
             geometry.addArea(feature, cut);
+            if (cut.elementCount() > kMostElements) {
+                fillPath(cut);
+                cut.clear();
+            }
             return;
         }
         QPainterPath whole;
         whole.setFillRule(Qt::WindingFill);
         geometry.addArea(feature, whole);
-        painter_.fillPath(whole, color);
+        fillPath(whole);
     });
-    painter_.fillPath(cut, color);
+    fillPath(cut);
 }
 
 void VectorPainter::strokeEdges(MapKind kind, const QColor& color, double width) {
     painter_.setPen(roundPen(color, width));
     each(kind, MapTile::Shape::Areas, [&](const TileGeometry& geometry, const MapTile::Feature& feature) {
-        geometry.eachEdge(feature, [&](const QPolygonF& piece, double /*from*/) { painter_.drawPolyline(piece); });
+        geometry.eachEdge(feature, [&](const QPolygonF& piece, double /*from*/) { strokeLine(piece, width); });
     });
 }
 
@@ -80,8 +93,14 @@ void VectorPainter::strokeLines(const std::vector<QPolygonF>& pieces, const QCol
     if (width > 0.0) {
         painter_.setPen(roundPen(color, width));
         for (const auto& piece : pieces) {
-            painter_.drawPolyline(piece);
+            strokeLine(piece, width);
         }
+    }
+}
+
+void VectorPainter::strokeLine(const QPolygonF& piece, double width) {
+    if (budget_.takeLine(piece, width)) {
+        painter_.drawPolyline(piece);
     }
 }
 
@@ -107,10 +126,10 @@ void VectorPainter::drawSurfaces() {
     drawWater();
     fill(MapKind::Square, style_.square);
     fill(MapKind::Pier, style_.pier);
-    painter_.setPen(QPen(style_.pier, std::clamp(5.0 / scale_.metresPerPoint(), 0.8, 8.0), Qt::SolidLine, Qt::FlatCap,
-                         Qt::RoundJoin));
+    const double pier = std::clamp(5.0 / scale_.metresPerPoint(), 0.8, 8.0);
+    painter_.setPen(QPen(style_.pier, pier, Qt::SolidLine, Qt::FlatCap, Qt::RoundJoin));
     for (const auto& piece : lines(MapKind::PierLine)) {
-        painter_.drawPolyline(piece);
+        strokeLine(piece, pier);
     }
 }
 
@@ -132,7 +151,7 @@ void VectorPainter::drawWater() {
     const auto drawRivers = [&](const QColor& color, double more) {
         for (const auto& river : rivers) {
             painter_.setPen(roundPen(color, river.width + more));
-            painter_.drawPolyline(river.line);
+            strokeLine(river.line, river.width + more);
         }
     };
     strokeEdges(MapKind::Water, style_.shore, 2.0 * shore);
@@ -186,7 +205,7 @@ void VectorPainter::drawDashed(MapKind kind, const QColor& color, double width, 
         geometry.eachLine(feature, [&](const QPolygonF& piece, double from) {
             pen.setDashOffset(std::fmod(from, period) / width);
             painter_.setPen(pen);
-            painter_.drawPolyline(piece);
+            strokeLine(piece, width);
         });
     });
 }

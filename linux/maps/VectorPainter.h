@@ -6,6 +6,7 @@
 #include "linux/maps/MapGround.h"
 #include "linux/maps/MapScale.h"
 #include "linux/maps/MapStyle.h"
+#include "linux/maps/PaintBudget.h"
 #include "linux/maps/TileGeometry.h"
 
 namespace ktr::linux_ {
@@ -26,6 +27,7 @@ class VectorPainter {
     std::vector<QPolygonF> lines(MapKind kind) const;
     void fill(MapKind kind, const QColor& color);
     void strokeEdges(MapKind kind, const QColor& color, double width);
+    void strokeLine(const QPolygonF& piece, double width);
     void strokeLines(const std::vector<QPolygonF>& pieces, const QColor& color, double width);
     void drawSurfaces();
     void drawWater();
@@ -38,6 +40,7 @@ class VectorPainter {
     QPainter& painter_;
     const std::vector<VisibleTile>& tiles_;
     const MapScale& scale_;
+    PaintBudget budget_;
     const MapStyle& style_;
 };
 

@@ -1,9 +1,13 @@
+#include <QBuffer>
+#include <QImage>
 #include <atomic>
 #include <chrono>
 #include <condition_variable>
 #include <mutex>
 
 #include "linux/maps/HttpsPictures.h"
+#include "linux/maps/MapDrawer.h"
+#include "linux/maps/PictureGround.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/transport/TransportTest.h"
 
@@ -272,6 +276,42 @@ TEST_F(TilesTest, TwoAtATime) {
     pictures.reset();
     EXPECT_LE(most, 2);
     server.reset();
+}
+
+TEST_F(TilesTest, AMap_IsWholeOnceItsTilesHaveArrived) {
+    QImage tile(256, 256, QImage::Format_RGB32);
+    tile.fill(Qt::red);
+    QByteArray png;
+    QBuffer buffer(&png);
+    buffer.open(QIODevice::WriteOnly);
+    ASSERT_TRUE(tile.save(&buffer, "PNG"));
+    serve(answering(200, "Cache-Control: max-age=600\r\n", png.toStdString()));
+    open();
+    const auto ground = std::make_shared<linux_::PictureGround>(std::move(pictures));
+    int drawn = 0;
+    ground->setChangeHandler([this] {
+        const std::lock_guard lock(mutex);
+        ++changes;
+        arrived.notify_all();
+    });
+    platform::MapPictureRequest request;
+    request.viewport = {{50.0, 10.0}, 5.0, {400.0, 219.0}};
+    const auto draw = [&] {
+        ++drawn;
+        return linux_::MapDrawer::draw(request, {ground}, {});
+    };
+    auto picture = draw();
+    EXPECT_FALSE(picture->isComplete);
+    EXPECT_NE(picture->pixels.pixelColor(200, 110), QColor(Qt::red));
+    while (!picture->isComplete && drawn < 50) {
+        ASSERT_TRUE(waitForChange(drawn));
+        picture = draw();
+    }
+    EXPECT_TRUE(picture->isComplete);
+    EXPECT_EQ(picture->attribution, "© Somebody");
+    for (const QPoint corner : {QPoint(0, 0), QPoint(399, 218), QPoint(200, 110)}) {
+        EXPECT_EQ(picture->pixels.pixelColor(corner), QColor(Qt::red));
+    }
 }
 
 TEST_F(TilesTest, EndingWhileTilesAreComing_IsQuick) {

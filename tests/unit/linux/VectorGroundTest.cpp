@@ -174,6 +174,26 @@ TEST_F(VectorGroundTest, DamagedTile_IsFilledFromACoarserLevel) {
     }
 }
 
+TEST_F(VectorGroundTest, TangledLinesAndNamesWithoutEnd_AreDrawnInTime) {
+    // Each of these would take minutes if it were drawn whole.
+    std::vector<std::uint32_t> tangle = {9, 0, 0, 200'000U << 3 | 2U};
+    for (int i = 0; i < 200'000; ++i) {
+        tangle.push_back(i % 2 == 0 ? 6000U : 5999U);
+        tangle.push_back(i % 2 == 0 ? 8000U : 7999U);
+    }
+    LayerWriter names("streets");
+    for (int i = 0; i < 3000; ++i) {
+        names.line({{0, i}, {2000, 4000 - i}, {4096, i}},
+                   {{"kind", "primary"}, {"name", std::to_string(i) + " Street"}});
+    }
+    makeFile({{"format", "pbf"}},
+             {{kMiddle, tileOf({LayerWriter("streets").raw(2, tangle, {{"kind", "footway"}}), names})}});
+    auto near = request(kMiddle, 2.0);
+    near.viewport.zoom = 15.5;
+    EXPECT_EQ(draw(near).pixels.size(), QSize(512, 512));
+    EXPECT_EQ(draw(request()).pixels.size(), QSize(256, 256));
+}
+
 TEST_F(VectorGroundTest, OutsideItsBounds_OthersDraw) {
     // The tile's eastern half, in degrees.
     const auto viewport = request().viewport;
