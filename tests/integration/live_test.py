@@ -155,11 +155,11 @@ class LiveTest(unittest.TestCase):
 
     def check_fault(self, name):
         words, status, shown = self.FAULTS[name]
-        # Nobody may be so slow as to ask only after Ann has moved: nine ask at once, perhaps under a sanitizer.
+        # Nobody may be so slow as to ask only after Ann has moved: four ask at once, perhaps under a sanitizer.
         result = self.describe(moving(7), 9, "--interval", "0.4", "--fault", words)
         told = f"{name}\n{result.stdout}\n{result.stderr}"
         assert result.returncode == 0, told
-        assert result.seconds < 25.0, told
+        assert result.seconds < 40.0, told
         assert "Where are my friends?" in result.stdout, told
         assert shown is None or shown in result.stdout, told
         last = result.stderr.rstrip().rsplit("ktr: ", 1)[-1]
@@ -167,7 +167,7 @@ class LiveTest(unittest.TestCase):
         assert status is None or re.match(status, last) or last.startswith("the service was asked"), told
 
     def test_every_fault_leaves_the_last_words(self):
-        with concurrent.futures.ThreadPoolExecutor(9) as pool:
+        with concurrent.futures.ThreadPoolExecutor(4) as pool:
             for name, check in [(name, pool.submit(self.check_fault, name)) for name in self.FAULTS]:
                 with self.subTest(name):
                     check.result()
@@ -298,7 +298,7 @@ class LiveTest(unittest.TestCase):
         environment = {k: v for k, v in os.environ.items() if k not in ("DISPLAY", "WAYLAND_DISPLAY")}
         environment.update(KTR_RUN_SECONDS="1", XDG_STATE_HOME=str(self.folder / "state"),
                            KTR_RUN_LOG=str(self.folder / "service.log"))
-        result = subprocess.run([SOURCE / "scripts" / "show", PROGRAM], cwd=self.folder, env=environment, timeout=120,
+        result = subprocess.run([SOURCE / "scripts" / "show", PROGRAM], cwd=self.folder, env=environment, timeout=300,
                                 capture_output=True, text=True, encoding="utf-8")
         self.assertEqual(result.returncode, 0, result.stderr)
         self.assertTrue((self.folder / "out" / "live.png").exists())
