@@ -121,22 +121,22 @@
     <message>
         <source>LEAVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place. English: “You’ll hear when they leave %@”</extracomment>
-        <translation>Du bekommst Bescheid, sobald „%@“ verlassen wird</translation>
+        <translation>Nachricht beim Verlassen: %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place. English: “You’ll hear when they arrive at %@”</extracomment>
-        <translation>Du bekommst Bescheid, sobald „%@“ erreicht ist</translation>
+        <translation>Nachricht bei Ankunft: %@</translation>
     </message>
     <message>
         <source>LEAVING_LABEL_ABSOLUTE</source>
         <extracomment>The same without a place. English: “You’ll hear when they leave”</extracomment>
-        <translation>Du bekommst Bescheid beim Aufbruch</translation>
+        <translation>Nachricht beim Aufbruch</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL_ABSOLUTE</source>
         <extracomment>The same without a place. English: “You’ll hear when they arrive”</extracomment>
-        <translation>Du bekommst Bescheid bei der Ankunft</translation>
+        <translation>Nachricht bei Ankunft</translation>
     </message>
     <message>
         <source>_$!&lt;home&gt;!$_</source>
