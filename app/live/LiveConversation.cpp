@@ -98,9 +98,7 @@ void LiveConversation::accountRead() {
             handlers_.asked(*host_.conversation()->turns().back());
         }
     }
-    for (const auto& [turn, question] : std::exchange(waiting_, {})) {
-        send(turn, question);
-    }
+    sendNext();
     tellChanged();
 }
 
@@ -115,28 +113,31 @@ void LiveConversation::ask(const std::string& text) {
     }
     ++asking_;
     askedAt_ = now();
-    if (ready_) {
-        send(turn, question);
-    } else {
-        waiting_.emplace_back(turn, question);
-    }
+    waiting_.emplace_back(turn, question);
+    sendNext();
     tellChanged();
 }
 
-void LiveConversation::send(const std::shared_ptr<TurnView>& turn, const std::string& question) {
+void LiveConversation::sendNext() {
+    if (!ready_ || underWay_ || waiting_.empty()) {
+        return;
+    }
+    const auto [turn, question] = std::move(waiting_.front());
+    waiting_.pop_front();
+    underWay_ = true;
     // The assistant's client ends before the loop does, and what it posts after this has gone does nothing.
     platform::MainLoop* const mainLoop = host_.platform()->mainLoop.get();
-    host_.live()->assistant().ask(
-        question, [weak = weak_from_this(), mainLoop, turn = std::weak_ptr<TurnView>(turn)](auto answer) {
-            mainLoop->post([weak, turn, answer = std::move(answer)] {
-                if (const auto self = weak.lock()) {
-                    self->receive(turn, answer);
-                }
-            });
+    host_.live()->assistant().ask(question, [weak = weak_from_this(), mainLoop, asked = turn](auto answer) {
+        mainLoop->post([weak, asked, answer = std::move(answer)] {
+            if (const auto self = weak.lock()) {
+                self->receive(asked, answer);
+            }
         });
+    });
 }
 
 void LiveConversation::receive(const std::weak_ptr<TurnView>& weakTurn, const linux_::AssistantClient::Answer& answer) {
+    underWay_ = false;
     if (--asking_ == 0) {
         askedAt_.reset();
     }
@@ -149,6 +150,7 @@ void LiveConversation::receive(const std::weak_ptr<TurnView>& weakTurn, const li
             handlers_.answered(*turn);
         }
     }
+    sendNext();
     tellChanged();
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <deque>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -46,7 +47,8 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
   private:
     explicit LiveConversation(Host& host) : host_(host) {}
     void accountRead();
-    void send(const std::shared_ptr<TurnView>& turn, const std::string& question);
+    /// Sends the question that waits longest, unless one is under way.
+    void sendNext();
     void receive(const std::weak_ptr<TurnView>& turn, const linux_::AssistantClient::Answer& answer);
     /// What to show for an answer; sets `failure_`.
     Scenario read(const linux_::AssistantClient::Answer& answer);
@@ -57,9 +59,12 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
     Host& host_;
     Handlers handlers_;
     bool ready_ = false;
-    std::vector<std::pair<std::shared_ptr<TurnView>, std::string>> waiting_;
+    /// In the order they were asked. One at a time is sent: a question may be a wish, such as to hide, and the last one
+    /// has to be honoured last.
+    std::deque<std::pair<std::weak_ptr<TurnView>, std::string>> waiting_;
+    bool underWay_ = false;
     std::vector<Scenario> scenarios_;
-    int asking_ = 0;
+    int asking_ = 0;  ///< under way, or waiting
     std::optional<platform::Date> askedAt_;
     bool assistantIsAway_ = false;
     std::optional<platform::Date> shownAt_;

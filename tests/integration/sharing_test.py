@@ -3,6 +3,7 @@
 
 import concurrent.futures
 import http.client
+import http.server
 import json
 import os
 import pathlib
@@ -11,6 +12,7 @@ import ssl
 import subprocess
 import sys
 import tempfile
+import threading
 import time
 import unittest
 import urllib.parse
@@ -101,6 +103,58 @@ class SharingTest(unittest.TestCase):
             self.assertIn("Mara Lind", run.result().stdout)
         self.assertFalse(self.is_visible())
         self.assertGreater(len(self.commands()), 3)
+
+    def assistant(self, handler):
+        """An assistant in the place of the service's own."""
+        certificate = self.folder / "assistant.pem"
+        subprocess.run(["openssl", "req", "-x509", "-newkey", "ec", "-pkeyopt", "ec_paramgen_curve:prime256v1", "-nodes",
+                        "-subj", "/CN=localhost", "-addext", "subjectAltName=DNS:localhost", "-days", "2",
+                        "-keyout", self.folder / "assistant.key", "-out", certificate], check=True, capture_output=True)
+        server = http.server.ThreadingHTTPServer(("127.0.0.1", 0), handler)
+        context = ssl.SSLContext(ssl.PROTOCOL_TLS_SERVER)
+        context.load_cert_chain(certificate, self.folder / "assistant.key")
+        server.socket = context.wrap_socket(server.socket, server_side=True)
+        thread = threading.Thread(target=server.serve_forever)
+        thread.start()
+        self.addCleanup(lambda: (server.shutdown(), thread.join(), server.server_close()))
+        config = json.loads((self.folder / "config.json").read_text())
+        config["account"]["host"] = f"localhost:{server.server_port}"
+        config["certificates"].append(str(certificate))
+        (self.folder / "config.json").write_text(json.dumps(config))
+
+    def test_wishes_are_asked_for_in_their_order(self):
+        seen = []
+
+        class Slow(http.server.BaseHTTPRequestHandler):
+            """The sooner it is asked, the later it answers."""
+
+            def do_GET(self):
+                question = urllib.parse.parse_qs(urllib.parse.urlsplit(self.path).query)["q"][0]
+                seen.append("asked: " + question)
+                time.sleep(max(0.8 - 0.2 * len(seen), 0.1))
+                seen.append("answered: " + question)
+                body = json.dumps({"sentence": "This is about: " + question}).encode()
+                self.send_response(200)
+                self.send_header("Content-Type", "application/json")
+                self.send_header("Content-Length", str(len(body)))
+                self.end_headers()
+                self.wfile.write(body)
+
+            def log_message(self, *_):
+                pass
+
+        self.serve(track(1, 1))
+        self.assistant(Slow)
+        wishes = ["Share my location", "Hide my location", "Share it with me"]
+        result = self.live(0.2, *wishes)
+        self.assertEqual(seen, [event + wish for wish in wishes for event in ("asked: ", "answered: ")])
+        places = [result.stdout.index("This is about: " + wish) for wish in wishes]
+        self.assertEqual(places, sorted(places))
+
+    def test_last_of_many_wishes_is_honoured(self):
+        self.serve(track(1, 1))
+        self.live(0.2, *["Share my location", "Hide my location"] * 4)
+        self.assertFalse(self.is_visible())
 
     def test_sharing_after_hiding(self):
         self.serve(track(1, 1))
