@@ -55,10 +55,15 @@ std::variant<std::string, PreferencesFile::Error> bytesOf(const fs::path& file, 
     if (!exists) {
         return std::string();
     }
+    // Not even opened: a FIFO in the file's place would hold the program up.
+    if (type != fs::file_type::regular) {
+        const std::string reason = failure ? failure.message() : "it is no regular file";
+        return PreferencesFile::Error{file.string() + ": cannot be read: " + reason};
+    }
     errno = 0;
     std::ifstream stream(file, std::ios::binary);
     std::string bytes{std::istreambuf_iterator<char>(stream), {}};
-    if (!stream.is_open() || stream.bad() || type != fs::file_type::regular) {
+    if (!stream.is_open() || stream.bad()) {
         return PreferencesFile::Error{file.string() + ": cannot be read: " + std::strerror(errno != 0 ? errno : EIO)};
     }
     return bytes;

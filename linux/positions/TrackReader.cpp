@@ -149,13 +149,17 @@ std::variant<std::vector<TimedPosition>, TrackReader::Error> TrackReader::readSc
 
 std::variant<std::vector<TimedPosition>, TrackReader::Error> TrackReader::readFile(const std::string& file) {
     std::error_code failure;
+    // Only a regular file has a size; a FIFO, once opened, would hold the program up.
     const auto size = std::filesystem::file_size(file, failure);
-    std::ifstream stream(file, std::ios::binary);
+    if (!failure && size > kLargestFile) {
+        return Error{file + ": the track is larger than 64 MiB"};
+    }
+    std::ifstream stream;
+    if (!failure) {
+        stream.open(file, std::ios::binary);
+    }
     if (failure || !stream) {
         return Error{file + ": the track cannot be read"};
-    }
-    if (size > kLargestFile) {
-        return Error{file + ": the track is larger than 64 MiB"};
     }
     const std::string text{std::istreambuf_iterator<char>(stream), {}};
     const std::size_t first = text.find_first_not_of("\xEF\xBB\xBF \t\r\n");

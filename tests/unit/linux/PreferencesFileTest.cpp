@@ -179,4 +179,13 @@ TEST_F(PreferencesFileTest, FileThatHoldsNoPreferences_IsPutAside) {
     EXPECT_EQ(TemporaryFolder::read(file.string() + ".broken"), "{\"host\": \"cut of");
 }
 
+TEST_F(PreferencesFileTest, Pipe_IsRefusedAndHoldsNobodyUp) {
+    ASSERT_TRUE(std::filesystem::create_directories(file.parent_path()));
+    ASSERT_EQ(::mkfifo(file.c_str(), 0600), 0);
+    const auto texts = PreferencesFile::read(file);
+    ASSERT_TRUE(std::holds_alternative<PreferencesFile::Error>(texts));
+    EXPECT_EQ(std::get<PreferencesFile::Error>(texts).text, file.string() + ": cannot be read: it is no regular file");
+    EXPECT_FALSE(merge({{"host", "new.example"}}));
+}
+
 }  // namespace ktr::test

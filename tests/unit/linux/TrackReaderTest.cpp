@@ -1,6 +1,7 @@
 #include "linux/positions/TrackReader.h"
 
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 
 #include "tests/support/TemporaryFolder.h"
 
@@ -63,6 +64,13 @@ TEST_F(TrackReaderTest, Errors_NameFileAndLine) {
               "s.json: $.positions[0]: expected latitude and longitude in degrees");
     EXPECT_EQ(errorOf(TrackReader::readFile("/nonexistent/walk.gpx")),
               "/nonexistent/walk.gpx: the track cannot be read");
+}
+
+TEST_F(TrackReaderTest, Pipe_IsRefusedAndHoldsNobodyUp) {
+    const TemporaryFolder folder;
+    const std::string pipe = (folder.path() / "pipe").string();
+    ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
+    EXPECT_EQ(errorOf(TrackReader::readFile(pipe)), pipe + ": the track cannot be read");
 }
 
 TEST_F(TrackReaderTest, File_IsGpxOrScenarioByItsText) {
