@@ -59,7 +59,10 @@ std::optional<std::string> ConfiguredAccountStore::readToken(const Configuration
                                                              std::string& problem) const {
     std::string secretProblem;
     if (!account.tokenFile && account.host) {
-        if (auto token = secrets_(account.personId, *account.host, secretProblem)) {
+        if (const auto secret = secrets_(account.personId, *account.host, secretProblem)) {
+            // Tools that read a secret from a pipe keep the line end that came with it.
+            auto token = TokenFile::tokenIn(*secret);
+            problem = token ? "" : "the Secret Service's secret is refused: expected one line of at most 16 KiB";
             return token;
         }
     }

@@ -9,6 +9,7 @@
 #include <cerrno>
 #include <cstdio>
 #include <cstring>
+#include <utility>
 
 namespace ktr::linux_ {
 
@@ -66,15 +67,19 @@ std::variant<std::string, TokenFile::Error> TokenFile::read(const std::filesyste
     if (!problem.empty()) {
         return Error{false, file.string() + ": the token file is refused: it " + problem};
     }
-    while (!token.empty() && (token.back() == '\n' || token.back() == '\r')) {
-        token.pop_back();
+    if (auto line = tokenIn(std::move(token))) {
+        return *std::move(line);
     }
-    const bool control = std::any_of(token.begin(), token.end(),
-                                     [](char c) { return static_cast<unsigned char>(c) < 0x20 || c == 0x7F; });
-    if (token.empty() || control || token.size() > kLongestToken) {
-        return Error{false, file.string() + ": expected one line of at most 16 KiB that holds the app token"};
+    return Error{false, file.string() + ": expected one line of at most 16 KiB that holds the app token"};
+}
+
+std::optional<std::string> TokenFile::tokenIn(std::string text) {
+    while (!text.empty() && (text.back() == '\n' || text.back() == '\r')) {
+        text.pop_back();
     }
-    return token;
+    const bool control =
+        std::any_of(text.begin(), text.end(), [](char c) { return static_cast<unsigned char>(c) < 0x20 || c == 0x7F; });
+    return text.empty() || control || text.size() > kLongestToken ? std::nullopt : std::optional(std::move(text));
 }
 
 }  // namespace ktr::linux_

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <filesystem>
+#include <optional>
 #include <string>
 #include <variant>
 
@@ -18,6 +19,9 @@ class TokenFile {
     /// read, write or execute, what is no regular file, more than 16 KiB, and an empty token or one with control
     /// characters.
     static std::variant<std::string, Error> read(const std::filesystem::path& file);
+
+    /// The token in a text: without the line end at its end. None for what is refused in a file's text, too.
+    static std::optional<std::string> tokenIn(std::string text);
 };
 
 }  // namespace ktr::linux_

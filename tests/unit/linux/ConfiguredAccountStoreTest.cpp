@@ -61,6 +61,25 @@ TEST_F(ConfiguredAccountStoreTest, SecretService_GoesBeforeTheFile) {
     EXPECT_EQ(account->tokenOfType(0), "from the keyring") << "what was handed out does not change";
 }
 
+TEST_F(ConfiguredAccountStoreTest, SecretWithItsLineEnd_IsTheTokenWithout) {
+    folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example"}})");
+    secret = "s3cret\n";
+    auto signedIn = store();
+    EXPECT_TRUE(signedIn.load());
+    EXPECT_EQ(signedIn.deviceOwnerAccount()->tokenOfType(0), "s3cret");
+    EXPECT_EQ(signedIn.problem(), "");
+}
+
+TEST_F(ConfiguredAccountStoreTest, SecretThatNoHeaderCanHold_IsRefusedWithoutItsText) {
+    folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example"}})");
+    folder.write("token", "from the file\n");
+    secret = "s3cret\nsecond";
+    auto signedIn = store();
+    EXPECT_TRUE(signedIn.load());
+    EXPECT_EQ(signedIn.deviceOwnerAccount()->tokenOfType(0), std::nullopt);
+    EXPECT_EQ(onlyError(), "account: the Secret Service's secret is refused: expected one line of at most 16 KiB");
+}
+
 TEST_F(ConfiguredAccountStoreTest, NamedTokenFile_IsTheOnlySource) {
     folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example", "tokenFile": "t"}})");
     folder.write("t", "mine", 0644);
