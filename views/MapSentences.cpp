@@ -9,6 +9,7 @@
 #include "platform/base/Format.h"
 #include "platform/base/LengthFormatter.h"
 #include "platform/base/Platform.h"
+#include "platform/base/Utf8.h"
 #include "platform/location/Geodesy.h"
 #include "service/KTRVAUtils.h"
 
@@ -81,11 +82,13 @@ std::string MapSentences::ofFriend(const KTRVALocation& record, const std::share
 
 std::string MapSentences::ofFence(const platform::VAKtrGeoFence& fence, const std::shared_ptr<PlatformLocation>& user) {
     const auto place = KTRVAUtils::geoLocationForVALocation(fence.location);
-    // The names that the row has for it.
+    // The names that the row has for it: a fence's default label is looked up in small letters, a friend's is not.
     const auto label = fence.location ? fence.location->label : std::nullopt;
-    const std::string name = label && !label->empty() ? shownLabel(*label)
-                             : fence.location         ? fence.location->street.value_or("")
-                                                      : "";
+    const std::string name =
+        label && !label->empty()
+            ? shownLabel(LabelUtil::isDefaultLabel(label) ? platform::asciiLowercased(*label) : *label)
+        : fence.location ? fence.location->street.value_or("")
+                         : "";
     std::string text =
         name.empty() ? sentence("ACCESSIBILITY_MAP_FENCE", {}) : sentence("ACCESSIBILITY_MAP_FENCE_AT", {name});
     appendLength(text, "ACCESSIBILITY_MAP_RADIUS", fence.location ? fence.location->accuracy : std::nullopt);

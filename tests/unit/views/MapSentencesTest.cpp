@@ -92,6 +92,13 @@ TEST_F(MapSentencesTest, Fence_PlaceRadiusAndDistance) {
     EXPECT_EQ(MapSentences::ofFence(*nameless, user->position), "Map: the area");
 }
 
+TEST_F(MapSentencesTest, Fence_DefaultLabelInAnyLetters_IsNamedAsInTheRow) {
+    for (const char* label : {"_$!<Home>!$_", "_$!<HOME>!$_"}) {
+        const auto fence = fenceOf(nullptr, std::nullopt, label);
+        EXPECT_EQ(MapSentences::ofFence(*fence, nullptr), "Map: the area around Home. Radius: 100 metres") << label;
+    }
+}
+
 TEST_F(MapSentencesTest, User_WithAccuracyOrUnknown) {
     EXPECT_EQ(MapSentences::ofUser(position(51.0, -1.0, 15.0)), "Map: you are here. Accurate to 15 metres");
     EXPECT_EQ(MapSentences::ofUser(nullptr), "Map: where you are is not known yet");
