@@ -19,10 +19,12 @@ constexpr double kFenceRadius = 100.0;
 constexpr const char* kFenceZoom = "0.00225";
 
 std::string nameOf(const ServedFriend& person) {
-    if (!person.fullName.empty()) {
-        return person.fullName;
+    for (const std::string& name : {person.fullName, person.handle(), person.firstName, person.lastName}) {
+        if (!name.empty()) {
+            return name;
+        }
     }
-    return person.emails.empty() ? person.phones.front() : person.emails.front();
+    return "Somebody";
 }
 
 void setWhenPresent(Dictionary& dictionary, const char* name, const std::string& text) {
@@ -47,8 +49,10 @@ Value personOf(const ServedFriend& person) {
     }
     object.set("emails", emails);
     object.set("phones", phones);
-    const std::string& handle = person.emails.empty() ? person.phones.front() : person.emails.front();
-    return Dictionary{{"data", handle}, {"object", object}};
+    // Somebody whom a scenario describes may have neither.
+    Dictionary friendOf{{"object", object}};
+    setWhenPresent(friendOf, "data", person.handle());
+    return friendOf;
 }
 
 }  // namespace

@@ -80,6 +80,10 @@ Fault readFault(FieldReader& fields) {
     fault.entry = fields.string("entry").value_or("");
     if (fields.member("interval") != nullptr) {
         fault.intervalSeconds = fields.number("interval");
+        // In milliseconds it has to be a number still.
+        if (fault.intervalSeconds && !(std::abs(*fault.intervalSeconds) <= kMost)) {
+            fields.complain("interval", "expected a number from -1000000000 to 1000000000");
+        }
     }
     constexpr const char* kKnown[] = {"at",         "count",          "delay", "cut",     "status",
                                       "redirect",   "redirectStatus", "body",  "text",    "bytesPerSecond",

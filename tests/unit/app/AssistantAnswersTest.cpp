@@ -64,6 +64,26 @@ TEST_F(AssistantAnswersTest, WhatIsNotUnderstood_GetsASentenceThatHelps) {
     }
 }
 
+TEST_F(AssistantAnswersTest, PeopleOfAScenario_MayHaveNoHandleAndNoName) {
+    const auto read = app::FriendsReader::readText(R"({"snippet": {"locations": [
+        {"latitude": 1, "longitude": 2}, {"friend": {"object": {"firstName": "Zed"}}}]}})",
+                                                   "s.json");
+    ASSERT_TRUE(std::holds_alternative<app::FriendsFile>(read));
+    const LocationService unnamed(std::get<app::FriendsFile>(read));
+    const AssistantAnswers assistant(unnamed);
+    const auto sentence = [&](const char* question) {
+        return *assistant.answer(question, {0.0, 1.7e12}).find("sentence")->string();
+    };
+    EXPECT_EQ(sentence("Where are my friends?"), "Here is where they are.");
+    EXPECT_EQ(sentence("Who is near me?"), "Somebody is here.");
+    EXPECT_EQ(sentence("Where is Zed?"), "Looking for Zed.");
+    EXPECT_EQ(sentence("Tell me when Zed leaves"), "Looking for Zed.");
+    const auto answer =
+        app::ScenarioReader(platform::Date{0.0})
+            .readText(platform::writeJson(assistant.answer("Where are my friends?", {0.0, 1.7e12})), "answer");
+    EXPECT_TRUE(std::holds_alternative<app::Scenario>(answer));
+}
+
 TEST_F(AssistantAnswersTest, Answer_IsAScenario) {
     for (const char* question : {"Where is Ann?", "Where are my friends?", "Where is Shirin?"}) {
         const auto read =

@@ -60,6 +60,7 @@ TEST_F(FaultScriptTest, WhatIsNoFault_IsRefused) {
     EXPECT_EQ(complaintOf("cut=somewhere").rfind("$.cut: expected one of before, headers, body, found ", 0), 0U);
     EXPECT_EQ(complaintOf("status").rfind("expected words such as status=503,at=2", 0), 0U);
     EXPECT_EQ(complaintOf("delay=-1"), "$.delay: expected a number from 0 to 1000000000");
+    EXPECT_EQ(complaintOf("interval=1e308"), "$.interval: expected a number from -1000000000 to 1000000000");
     const auto read = FaultScript::readText(R"({"faults": [{"delay": "long"}]})", "f.json");
     ASSERT_TRUE(std::holds_alternative<ScenarioError>(read));
     EXPECT_EQ(std::get<ScenarioError>(read).text(),
