@@ -113,7 +113,10 @@ double Optimizer::stopOf(int row, double slope) const {
     }
     const bool isApproached =
         (guard == Guard::AtLeastZero && slope < 0.0) || (guard == Guard::AtMostZero && slope > 0.0);
-    return isApproached ? std::max(0.0, -state_.values[e] / slope) : kInfinite;
+    if (!isApproached) {
+        return kInfinite;
+    }
+    return std::max(0.0, -state_.values[e] / slope);
 }
 
 Optimizer::Break Optimizer::firstStop(int column, int direction, int exceptRow) const {
