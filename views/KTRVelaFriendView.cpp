@@ -1,6 +1,7 @@
 #include "views/KTRVelaFriendView.h"
 
 #include <utility>
+#include <vector>
 
 #include "model/ContactsUtilities.h"
 #include "model/KTRVATheme.h"
@@ -10,6 +11,7 @@
 #include "model/PluginBundle.h"
 #include "platform/base/MainLoop.h"
 #include "platform/base/Platform.h"
+#include "platform/layout/ConstraintRule.h"
 #include "platform/layout/VisualFormat.h"
 #include "platform/ui/Device.h"
 #include "service/Common.h"
@@ -97,10 +99,15 @@ void KTRVelaFriendView::setupAvatar() {
     friendIconView_->setTranslatesAutoresizingMaskIntoConstraints(false);
     friendIconView_->addSubview(avatar);
     using platform::LayoutAttribute;
+    const platform::ViewReference image(*avatar);
+    const platform::ViewReference icon(*friendIconView_);
+    std::vector<platform::ConstraintRule> edges;
+    edges.reserve(4);
     for (const auto edge :
          {LayoutAttribute::Top, LayoutAttribute::Bottom, LayoutAttribute::Leading, LayoutAttribute::Trailing}) {
-        avatar->anchor(edge).constraintEqualTo(friendIconView_->anchor(edge))->setActive(true);
+        edges.push_back({image, icon, {edge, edge}});
     }
+    friendIconView_->addRules(edges);
     addSubview(friendIconView_);
 }
 

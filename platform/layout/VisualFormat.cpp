@@ -1,7 +1,6 @@
 #include "platform/layout/VisualFormat.h"
 
 #include <cmath>
-#include <iterator>
 
 #include "platform/base/Log.h"
 #include "platform/base/Platform.h"
@@ -33,21 +32,21 @@ constexpr Alignment kAlignments[] = {
     {VisualFormatAlignment::LastBaseline, LayoutAttribute::LastBaseline, LayoutAxis::Horizontal},
 };
 
-/// Makes the constraints of one format, looking its names up.
+/// Makes the constraints of one format, looking its names up. The views stay alive in `views`.
 class Builder {
   public:
     Builder(std::string_view text, const Syntax& syntax, VisualFormatOptions options,
-            const VisualFormatMetrics& metrics, const VisualFormatViews& views)
-        : text_(text), syntax_(syntax), options_(options), metrics_(metrics), views_(views) {
+            const VisualFormatMetrics& metrics, const VisualFormatViews& views, std::vector<ConstraintRule>& rules)
+        : text_(text), syntax_(syntax), options_(options), metrics_(metrics), views_(views), rules_(rules) {
         setEdges();
     }
 
-    /// None when there is an error.
-    std::vector<ConstraintRule> build() {
+    /// Appends the rules; none when there is an error.
+    void build() {
+        const std::size_t before = rules_.size();
         if (!findViews() || !addItems() || !addAlignments()) {
-            rules_.clear();
+            rules_.resize(before);
         }
-        return std::move(rules_);
     }
     const std::optional<VisualFormatError>& error() const { return error_; }
 
@@ -74,24 +73,30 @@ class Builder {
     }
 
     bool findViews() {
+        items_.reserve(syntax_.items.size());
         for (const Syntax::Item& item : syntax_.items) {
-            const auto view = viewNamed(item.view.text);
+            View* const view = viewNamed(item.view.text);
             if (!view) {
                 return fail(item.view.offset, "no view is named '" + std::string(item.view.text) + "'");
             }
             items_.push_back(view);
         }
-        return (!syntax_.leadingEdge || hasSuperview(*syntax_.leadingEdge, items_.front(), syntax_.items.front())) &&
-               (!syntax_.trailingEdge || hasSuperview(*syntax_.trailingEdge, items_.back(), syntax_.items.back()));
+        return findSuperview(syntax_.leadingEdge, *items_.front(), syntax_.items.front(), before_) &&
+               findSuperview(syntax_.trailingEdge, *items_.back(), syntax_.items.back(), behind_);
     }
 
-    bool hasSuperview(std::size_t edge, const std::shared_ptr<View>& view, const Syntax::Item& item) {
-        return view->superview() || fail(edge, "the view '" + std::string(item.view.text) + "' has no superview");
+    bool findSuperview(const std::optional<std::size_t>& edge, const View& view, const Syntax::Item& item,
+                       std::shared_ptr<View>& superview) {
+        if (!edge) {
+            return true;
+        }
+        superview = view.superview();
+        return superview || fail(*edge, "the view '" + std::string(item.view.text) + "' has no superview");
     }
 
-    std::shared_ptr<View> viewNamed(std::string_view name) const {
+    View* viewNamed(std::string_view name) const {
         const auto found = views_.find(name);
-        return found == views_.end() ? nullptr : found->second;
+        return found == views_.end() ? nullptr : found->second.get();
     }
 
     bool addItems() {
@@ -103,7 +108,7 @@ class Builder {
                     return false;
                 }
             } else if (syntax_.leadingEdge) {
-                if (!addGap(item.before, view.superview()->anchor(near_), view.anchor(near_), true)) {
+                if (!addGap(item.before, before_->anchor(near_), view.anchor(near_), true)) {
                     return false;
                 }
             }
@@ -111,8 +116,7 @@ class Builder {
                 return false;
             }
         }
-        View& last = *items_.back();
-        return !syntax_.trailingEdge || addGap(syntax_.last, last.anchor(far_), last.superview()->anchor(far_), true);
+        return !syntax_.trailingEdge || addGap(syntax_.last, items_.back()->anchor(far_), behind_->anchor(far_), true);
     }
 
     /// second = first + gap, or, from right to left, the same with all edges turned round.
@@ -152,7 +156,7 @@ class Builder {
             }
             const auto* name = std::get_if<Syntax::Name>(&predicate.object);
             if (name && metrics_.find(name->text) == metrics_.end()) {
-                const auto other = viewNamed(name->text);
+                View* const other = viewNamed(name->text);
                 if (!other) {
                     return fail(name->offset, "no metric or view is named '" + std::string(name->text) + "'");
                 }
@@ -226,8 +230,11 @@ class Builder {
     LayoutAttribute near_ = LayoutAttribute::Leading;
     LayoutAttribute far_ = LayoutAttribute::Trailing;
     bool isBackwards_ = false;
-    std::vector<std::shared_ptr<View>> items_;
-    std::vector<ConstraintRule> rules_;
+    std::vector<View*> items_;
+    /// Of the first view and of the last one, where the format says "|".
+    std::shared_ptr<View> before_;
+    std::shared_ptr<View> behind_;
+    std::vector<ConstraintRule>& rules_;
     std::optional<VisualFormatError> error_;
 };
 
@@ -242,8 +249,8 @@ class KnownFormats {
 
     static std::shared_ptr<KnownFormats> makeShared() { return std::make_shared<KnownFormats>(); }
 
-    static std::shared_ptr<const Format> parsed(std::string_view text) {
-        const auto known = shared<KnownFormats>();
+    /// `known` may be none: nothing is kept then.
+    static std::shared_ptr<const Format> parsed(KnownFormats* known, std::string_view text) {
         if (!known) {
             return parse(text);
         }
@@ -282,18 +289,17 @@ std::string VisualFormatError::message() const {
 
 namespace {
 
-std::vector<ConstraintRule> rulesOf(std::string_view format, VisualFormatOptions options,
-                                    const VisualFormatMetrics& metrics, const VisualFormatViews& views,
-                                    std::optional<VisualFormatError>& error) {
-    const auto known = KnownFormats::parsed(format);
+/// Appends the rules of a format; the error where there is one.
+std::optional<VisualFormatError> appendRules(KnownFormats* formats, std::string_view format,
+                                             VisualFormatOptions options, const VisualFormatMetrics& metrics,
+                                             const VisualFormatViews& views, std::vector<ConstraintRule>& rules) {
+    const auto known = KnownFormats::parsed(formats, format);
     if (!known->syntax) {
-        error = known->error;
-        return {};
+        return known->error;
     }
-    Builder builder(known->text, *known->syntax, options, metrics, views);
-    auto rules = builder.build();
-    error = builder.error();
-    return rules;
+    Builder builder(known->text, *known->syntax, options, metrics, views, rules);
+    builder.build();
+    return builder.error();
 }
 
 void logError(std::string_view format, const VisualFormatError& error) {
@@ -306,7 +312,9 @@ void logError(std::string_view format, const VisualFormatError& error) {
 VisualFormatResult VisualFormat::parse(std::string_view format, VisualFormatOptions options,
                                        const VisualFormatMetrics& metrics, const VisualFormatViews& views) {
     VisualFormatResult result;
-    for (ConstraintRule& rule : rulesOf(format, options, metrics, views, result.error)) {
+    std::vector<ConstraintRule> rules;
+    result.error = appendRules(shared<KnownFormats>().get(), format, options, metrics, views, rules);
+    for (ConstraintRule& rule : rules) {
         result.constraints.push_back(std::make_shared<LayoutConstraint>(std::move(rule)));
     }
     return result;
@@ -324,16 +332,16 @@ std::vector<std::shared_ptr<LayoutConstraint>> VisualFormat::constraintsWithVisu
 
 void VisualFormat::addConstraints(View& view, std::span<const Picture> pictures, const VisualFormatMetrics& metrics,
                                   const VisualFormatViews& views) {
-    std::vector<ConstraintRule> all;
+    constexpr std::size_t kRulesOfAPicture = 4;
+    const auto formats = shared<KnownFormats>();
+    std::vector<ConstraintRule> rules;
+    rules.reserve(kRulesOfAPicture * pictures.size());
     for (const Picture& picture : pictures) {
-        std::optional<VisualFormatError> error;
-        auto rules = rulesOf(picture.format, picture.options, metrics, views, error);
-        if (error) {
+        if (const auto error = appendRules(formats.get(), picture.format, picture.options, metrics, views, rules)) {
             logError(picture.format, *error);
         }
-        std::move(rules.begin(), rules.end(), std::back_inserter(all));
     }
-    view.addRules(all);
+    view.addRules(rules);
 }
 
 }  // namespace ktr::platform
