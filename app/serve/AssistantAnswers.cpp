@@ -1,5 +1,6 @@
 #include "app/serve/AssistantAnswers.h"
 
+#include <QUrl>
 #include <algorithm>
 #include <array>
 #include <cmath>
@@ -25,6 +26,11 @@ std::string nameOf(const ServedFriend& person) {
         }
     }
     return "Somebody";
+}
+
+/// As a value in a context, which white space, "&" and "=" would end.
+std::string escaped(const std::string& text) {
+    return QUrl::toPercentEncoding(QString::fromStdString(text), "@").toStdString();
 }
 
 void setWhenPresent(Dictionary& dictionary, const char* name, const std::string& text) {
@@ -146,7 +152,7 @@ Dictionary AssistantAnswers::sharingAnswer(SharingQuestion::Wish wish) const {
     const std::string state = hidden ? "Friends can\u2019t see where you are." : "Friends can see where you are.";
     std::string searchContext = context();
     if (const auto& emails = service_.file().user.emails; !emails.empty()) {
-        searchContext += "preferredEmail=" + emails.front() + "&";
+        searchContext += "preferredEmail=" + escaped(emails.front()) + "&";
     }
     return Dictionary{
         {"sentence", wish == SharingQuestion::Wish::Know ? state : "Done. " + state},

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <QUrl>
+
 #include "app/ScenarioReader.h"
 #include "app/serve/FriendsReader.h"
 #include "platform/assistant/VASnippet.h"
@@ -91,6 +93,24 @@ TEST_F(AssistantAnswersTest, Answer_IsAScenario) {
         const auto* error = std::get_if<app::ScenarioError>(&read);
         ASSERT_EQ(error, nullptr) << error->text();
         EXPECT_EQ(std::get<app::Scenario>(read).kind, "VAKtrLocationSnippet");
+    }
+}
+
+TEST_F(AssistantAnswersTest, PreferredEmail_ArrivesAsItIsWhateverItsCharacters) {
+    for (const char* email : {"mara.lind@harbour.example", "a&b=c d+%41@x.example", "\xC3\xBC@x.example"}) {
+        app::FriendsFile file;
+        file.user.emails = {email};
+        service = LocationService(file);
+        const auto drawn = app::ScenarioReader(platform::Date{0.0})
+                               .readText(platform::writeJson(answer("Share my location")), "answer");
+        const auto* scenario = std::get_if<app::Scenario>(&drawn);
+        ASSERT_NE(scenario, nullptr) << email;
+        const auto snippet = std::dynamic_pointer_cast<platform::VASnippet>(scenario->snippet);
+        ASSERT_NE(snippet, nullptr);
+        const QString context = QString::fromStdString(snippet->searchContext->text());
+        const QString value = context.section(QStringLiteral("preferredEmail="), 1).section(u'&', 0, 0);
+        EXPECT_EQ(value.count(u'='), 0);
+        EXPECT_EQ(QUrl::fromPercentEncoding(value.toLatin1()).toStdString(), email);
     }
 }
 
