@@ -30,10 +30,14 @@ void append(std::string& text, const std::string& next) {
     text = text.empty() ? next : sentence("ACCESSIBILITY_MAP_SENTENCES", {text, next});
 }
 
-/// A length aloud, for one that is greater than 0.
+/// Metres from a place to the one on the other side of the earth: who is less sure than that knows nothing.
+constexpr double kFarthest = 2.01e7;
+
+/// A length aloud, for one that is greater than 0 and found on earth: others come from mistakes, with hundreds of
+/// digits to listen to.
 void appendLength(std::string& text, const char* key, const std::optional<double>& metres) {
     const auto lengths = Platform::installed()->lengths;
-    if (lengths && metres && *metres > 0.0 && std::isfinite(*metres)) {
+    if (lengths && metres && *metres > 0.0 && *metres <= kFarthest) {
         append(text, sentence(key, {lengths->textForMetres(*metres, platform::LengthWidth::Spoken)}));
     }
 }

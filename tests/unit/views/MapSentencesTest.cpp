@@ -1,5 +1,7 @@
 #include "views/MapSentences.h"
 
+#include <limits>
+
 #include "tests/support/MapTest.h"
 
 namespace ktr {
@@ -97,6 +99,22 @@ TEST_F(MapSentencesTest, Fence_DefaultLabelInAnyLetters_IsNamedAsInTheRow) {
         const auto fence = fenceOf(nullptr, std::nullopt, label);
         EXPECT_EQ(MapSentences::ofFence(*fence, nullptr), "Map: the area around Home. Radius: 100 metres") << label;
     }
+}
+
+TEST_F(MapSentencesTest, LengthsBeyondTheEarth_AreNotTold) {
+    user->position = nullptr;
+    for (const double metres : {2.02e7, 1e300, std::numeric_limits<double>::infinity()}) {
+        const auto fence = fenceOf(nullptr, std::nullopt);
+        fence->location->accuracy = metres;
+        EXPECT_EQ(MapSentences::ofFence(*fence, nullptr), "Map: the area");
+        auto object = ann();
+        object->accuracy = metres;
+        EXPECT_EQ(ofFriend(object), "Map: Ann, at Springfield");
+        EXPECT_EQ(MapSentences::ofUser(position(51.0, -1.0, metres)), "Map: you are here");
+    }
+    const auto fence = fenceOf(nullptr, std::nullopt);
+    fence->location->accuracy = 5000.0;
+    EXPECT_EQ(MapSentences::ofFence(*fence, nullptr), "Map: the area. Radius: 5 kilometres");
 }
 
 TEST_F(MapSentencesTest, User_WithAccuracyOrUnknown) {
