@@ -1,5 +1,7 @@
 #include "app/Description.h"
 
+#include <string_view>
+
 namespace ktr::app {
 
 using platform::AccessibilityNode;
@@ -16,13 +18,27 @@ void collectTexts(const AccessibilityNode& node, std::string& line) {
     }
 }
 
-void writeLine(std::string line, AccessibilityRole role, std::string& out) {
-    for (char& c : line) {
-        if (static_cast<unsigned char>(c) < 0x20 || c == 0x7F) {
-            c = ' ';
+/// Blanks for what would end a line or steer a terminal: the control characters of both ranges, in UTF-8, and the line
+/// and the paragraph separator.
+std::string withoutControls(const std::string& text) {
+    std::string out;
+    for (std::size_t at = 0; at < text.size();) {
+        const std::string_view rest = std::string_view(text).substr(at);
+        const auto first = static_cast<unsigned char>(rest[0]);
+        std::size_t length = first < 0x20 || first == 0x7F ? 1 : 0;
+        if (first == 0xC2 && rest.size() > 1 && static_cast<unsigned char>(rest[1]) < 0xA0) {
+            length = 2;
+        } else if (rest.substr(0, 3) == "\u2028" || rest.substr(0, 3) == "\u2029") {
+            length = 3;
         }
+        out += length > 0 ? ' ' : text[at];
+        at += length > 0 ? length : 1;
     }
-    out += line;
+    return out;
+}
+
+void writeLine(const std::string& line, AccessibilityRole role, std::string& out) {
+    out += withoutControls(line);
     if (role == AccessibilityRole::Link) {
         out += " (link)";
     } else if (role == AccessibilityRole::Image) {
@@ -35,7 +51,7 @@ void writeNode(const AccessibilityNode& node, std::string& out) {
     if (node.role == AccessibilityRole::Link) {
         std::string line;
         collectTexts(node, line);
-        writeLine(std::move(line), node.role, out);
+        writeLine(line, node.role, out);
         return;
     }
     if (!node.text.empty()) {

@@ -33,6 +33,11 @@ TEST(KTRDescriptionTest, Describe_KeepsLineEndsOutOfALine) {
     EXPECT_EQ(describe(node(AccessibilityRole::Text, "a\nb\tc")), "a b c\n");
 }
 
+TEST(KTRDescriptionTest, Describe_KeepsWhatSteersATerminalOutOfALine) {
+    EXPECT_EQ(describe(node(AccessibilityRole::Text, "a\x1B[2J\u009B2J\u0085b\u2028c\u2029d\u00A0\u00E9\u2027")),
+              "a [2J 2J b c d\u00A0\u00E9\u2027\n");
+}
+
 TEST(KTRDescriptionTest, Describe_OfNothingIsEmpty) {
     EXPECT_EQ(describe(node(AccessibilityRole::Group, "")), "");
 }
