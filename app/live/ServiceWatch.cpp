@@ -1,6 +1,9 @@
 #include "app/live/ServiceWatch.h"
 
+#include <algorithm>
+#include <charconv>
 #include <cmath>
+#include <string_view>
 #include <utility>
 
 namespace ktr::app {
@@ -12,15 +15,13 @@ namespace {
 
 constexpr double kMillisecondsASecond = 1000.0;
 
-/// Seconds; 0 where the service names none.
-double intervalOf(const HttpAnswer& answer) {
-    const auto* root = answer.json ? answer.json->dictionary() : nullptr;
-    const auto* context = root != nullptr ? root->find("serverContext") : nullptr;
-    const auto* fields = context != nullptr ? context->dictionary() : nullptr;
-    const auto* interval = fields != nullptr ? fields->find("minCallbackIntervalInMS") : nullptr;
-    const auto milliseconds = interval != nullptr ? interval->number() : std::nullopt;
-    return milliseconds && std::isfinite(*milliseconds) && *milliseconds > 0.0 ? *milliseconds / kMillisecondsASecond
-                                                                               : 0.0;
+/// The number that a text begins with; 0 for none.
+double leadingNumber(std::string_view text) {
+    text.remove_prefix(std::min(text.find_first_not_of(" \t\n\v\f\r"), text.size()));
+    text.remove_prefix(text.starts_with('+') ? 1 : 0);
+    double number = 0.0;
+    std::from_chars(text.data(), text.data() + text.size(), number);
+    return number;
 }
 
 }  // namespace
@@ -41,6 +42,19 @@ ServiceWatch::Trouble ServiceWatch::troubleOf(const HttpAnswer& answer) {
     }
     const bool says = answer.failure == HttpFailure::None && answer.json && answer.json->dictionary() != nullptr;
     return says ? Trouble::None : Trouble::Unreachable;
+}
+
+double ServiceWatch::intervalOf(const HttpAnswer& answer) {
+    const auto* root = answer.json ? answer.json->dictionary() : nullptr;
+    const auto* context = root != nullptr ? root->find("serverContext") : nullptr;
+    const auto* fields = context != nullptr ? context->dictionary() : nullptr;
+    const auto* interval = fields != nullptr ? fields->find("minCallbackIntervalInMS") : nullptr;
+    if (interval == nullptr) {
+        return 0.0;
+    }
+    const std::string* text = interval->string();
+    const double milliseconds = text != nullptr ? leadingNumber(*text) : interval->number().value_or(0.0);
+    return std::isfinite(milliseconds) && milliseconds > 0.0 ? milliseconds / kMillisecondsASecond : 0.0;
 }
 
 void ServiceWatch::State::take(Trouble trouble, std::optional<double> interval) {

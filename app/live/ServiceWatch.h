@@ -44,6 +44,9 @@ class ServiceWatch : public platform::HttpTransport {
 
     /// What an answer says of the service. Any thread.
     static Trouble troubleOf(const platform::HttpAnswer& answer);
+    /// After how many seconds the plugin will ask again after this answer; it also reads numbers that stand in a text.
+    /// 0 where the service names none. Any thread.
+    static double intervalOf(const platform::HttpAnswer& answer);
 
   private:
     struct State {
