@@ -157,6 +157,7 @@ void Host::answer(TurnView& turn, const Scenario& answer) {
 double Host::layOut(double width) {
     const double height = conversation_->layOut(width);
     window_->setFrame({0.0, 0.0, width, height});
+    window_->layoutIfNeeded();
     return height;
 }
 

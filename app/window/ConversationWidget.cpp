@@ -167,9 +167,10 @@ void ConversationWidget::move() {
     const double before = turn ? conversation->topOf(*turn) : 0.0;
     layingOut_ = true;
     const bool moves = conversation->advance(seconds());
-    layingOut_ = false;
     contentHeight_ = conversation->frame().height;
     host_.window()->setFrame(conversation->frame());
+    host_.window()->layoutIfNeeded();
+    layingOut_ = false;
     updateBar();
     keepInPlace(turn, before);
     rows_.refresh();
@@ -195,10 +196,19 @@ void ConversationWidget::requestLayout() {
         this,
         [this] {
             if (layoutRequested_) {
-                layOut();
+                layOutMarked();
             }
         },
         Qt::QueuedConnection);
+}
+
+/// What has changed within its card, such as a distance when the user moves: heights change by the controllers' word
+/// alone.
+void ConversationWidget::layOutMarked() {
+    layoutRequested_ = false;
+    layingOut_ = true;
+    host_.window()->layoutIfNeeded();
+    layingOut_ = false;
 }
 
 void ConversationWidget::updateBar() {
@@ -301,7 +311,7 @@ void ConversationWidget::animateRings() {
 
 void ConversationWidget::paintEvent(QPaintEvent* event) {
     if (layoutRequested_) {
-        layOut();
+        layOutMarked();
     }
     lastPainted_ = event->region();
     QPainter painter(this);

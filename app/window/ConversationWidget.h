@@ -63,6 +63,7 @@ class ConversationWidget : public QWidget {
 
     void layOut();
     void requestLayout();
+    void layOutMarked();
     /// The next picture of what moves.
     void move();
     void startMoving();

@@ -150,6 +150,8 @@ class KTR_API View : public Object {
     virtual void subviewInputChanged(const View& /*subview*/) {}
     /// Called at the root of a tree when part of it has to be painted again.
     virtual void needsDisplayInRoot(const Rect& /*rect*/) {}
+    /// Called at the root of a tree when part of it has to be laid out, once until the root has laid that out.
+    virtual void needsLayoutInRoot() {}
     /// Which of the presented subviews may touch `rect`, as [first, second) of them.
     virtual std::pair<std::size_t, std::size_t> presentedWithin(const Rect& rect) const;
     /// Whether a subview of this view is presented. Subviews are, until this says otherwise.

@@ -150,12 +150,18 @@ void View::setNeedsLayout() {
     markInSuperview();
 }
 
-/// Tells the views above where something is to be laid out. A view that is marked has marked views above.
+/// Tells the views above where something is to be laid out. A view that is marked has marked views above, and a root
+/// that knows.
 void View::markInSuperview() {
-    for (View* view = this; view->superview_ && !view->isMarkedInSuperview_; view = view->superview_) {
+    View* view = this;
+    for (; view->superview_; view = view->superview_) {
+        if (view->isMarkedInSuperview_) {
+            return;
+        }
         view->isMarkedInSuperview_ = true;
         view->superview_->madeChildren().marked.emplace_back(*view);
     }
+    view->needsLayoutInRoot();
 }
 
 void View::setPresents(View& subview, bool isPresented) const {

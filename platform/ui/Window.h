@@ -25,6 +25,7 @@ class KTR_API Window : public View {
 
   protected:
     void needsDisplayInRoot(const Rect& rect) override { needsDisplay(rect); }
+    void needsLayoutInRoot() override { needsLayout(); }
 
   private:
     std::weak_ptr<WindowClient> client_;

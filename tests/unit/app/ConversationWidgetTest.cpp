@@ -15,6 +15,7 @@
 #include "app/conversation/Measures.h"
 #include "platform/base/Platform.h"
 #include "platform/ui/Appearance.h"
+#include "platform/ui/Label.h"
 
 #include <gtest/gtest.h>
 
@@ -62,6 +63,19 @@ class KTRConversationWidgetTest : public ::testing::Test {
     void TearDown() override {
         widget.reset();
         host.reset();
+    }
+
+    static std::shared_ptr<platform::Label> labelOf(const platform::View& within, const std::string& text) {
+        for (const auto& view : within.subviews()) {
+            auto label = std::dynamic_pointer_cast<platform::Label>(view);
+            if (!label || !label->text().starts_with(text)) {
+                label = labelOf(*view, text);
+            }
+            if (label) {
+                return label;
+            }
+        }
+        return nullptr;
     }
 
     void mouse(QEvent::Type type, QPointF at) {
@@ -251,6 +265,20 @@ TEST_F(KTRConversationWidgetTest, HeightChange_KeepsTheCardsTopOrItsBottom) {
     controller->height += 300.0;
     host->delegate().heightDidChange(*controller, false);
     EXPECT_NEAR(bottom(), bottomBefore, 1.0);
+}
+
+TEST_F(KTRConversationWidgetTest, TextThatChangesWithoutAWord_HasItsRoomOnTheNextTurn) {
+    open({"dinner"});
+    const auto distance = labelOf(*host->conversation(), "310");
+    ASSERT_TRUE(distance);
+    const double before = distance->frame().width;
+    distance->setText("12,345 km");
+    QApplication::processEvents();
+    EXPECT_GT(distance->frame().width, before + 20.0);
+    // Again, since the window has to have learnt that all is laid out.
+    distance->setText("1 m");
+    QApplication::processEvents();
+    EXPECT_LT(distance->frame().width, before);
 }
 
 TEST_F(KTRConversationWidgetTest, Ring_GoesWhenTheSearchEndsThoughNobodyTells) {

@@ -35,6 +35,29 @@ TEST_F(ViewTest, AddSubview_MovesFromTheFormerSuperview) {
     EXPECT_EQ(child->superview(), b);
 }
 
+TEST_F(ViewTest, NeedForLayout_IsToldToTheWindowOnceUntilItHasLaidOut) {
+    const auto outer = view({0, 0, 100, 100});
+    const auto inner = view({0, 0, 10, 10});
+    outer->addSubview(inner);
+    inner->setNeedsLayout();
+    window->addSubview(outer);
+    window->layoutIfNeeded();
+    client->layouts = 0;
+    inner->setNeedsLayout();
+    inner->setNeedsLayout();
+    EXPECT_EQ(client->layouts, 1);
+    window->layoutIfNeeded();
+    EXPECT_EQ(client->layouts, 1);
+    inner->setNeedsLayout();
+    EXPECT_EQ(client->layouts, 2);
+    // Nobody is told of a tree that has left.
+    outer->removeFromSuperview();
+    window->layoutIfNeeded();
+    client->layouts = 0;
+    inner->setNeedsLayout();
+    EXPECT_EQ(client->layouts, 0);
+}
+
 TEST_F(ViewTest, AddSubview_OfItselfOrAnAncestor_DoesNothing) {
     const auto a = view({});
     const auto b = view({});
