@@ -4,6 +4,7 @@ namespace ktr::linux_ {
 
 TilePictures::~TilePictures() = default;
 
+// As who overrides it keeps it. NOLINTNEXTLINE(performance-unnecessary-value-param)
 void TilePictures::setChangeHandler(std::function<void()> /*changed*/) {}
 
 }  // namespace ktr::linux_

@@ -275,8 +275,8 @@ void VectorLabels::placeAreas(MapLabels& labels, MapKind kind) {
             continue;
         }
         const auto spots = candidates(bounds, centroidOf(path));
-        bool isPlaced = std::any_of(spots.begin(), spots.end(), [&](const QPointF& spot) {
-            return holds(path, spot, label) && labels.placeAt(std::string(name), look, spot);
+        bool isPlaced = std::any_of(spots.begin(), spots.end(), [&, text = std::string(name)](const QPointF& spot) {
+            return holds(path, spot, label) && labels.placeAt(text, look, spot);
         });
         if (!isPlaced && kind == MapKind::Park) {
             isPlaced = labels.placeAt(std::string(name), look, spots.front());

@@ -210,9 +210,7 @@ bool LayoutEquations::readHeightsFor(View& owner, const std::vector<double>& val
 }
 
 bool LayoutEquations::writeInputs(const std::vector<Content>& contents) {
-    const auto contentOf = [&contents](int participant) -> const Content& {
-        return contents.begin()[participant + 1];
-    };
+    const auto contentOf = [&contents](int participant) -> const Content& { return contents.begin()[participant + 1]; };
     bool isChanged = false;
     const auto write = [&](std::size_t input, double constant) {
         isChanged = isChanged || inputs_[input] != constant;
