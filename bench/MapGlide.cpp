@@ -1,7 +1,5 @@
 #include "bench/MapGlide.h"
 
-#include <time.h>
-
 #include <QImage>
 #include <QPainter>
 #include <algorithm>
@@ -10,6 +8,7 @@
 
 #include "app/Environment.h"
 #include "app/Options.h"
+#include "bench/ThreadTime.h"
 #include "linux/maps/ThreadedMapSource.h"
 #include "linux/ui/QtCanvas.h"
 #include "platform/base/Object.h"
@@ -29,12 +28,6 @@ constexpr int kFrames = 30;            // of one glide
 constexpr int kWalks = 21;
 constexpr double kStep = 0.0006;  // degrees: some 60 metres
 constexpr CoordinateSpan kSpan{0.004, 0.004};
-
-double computed() {
-    timespec now{};
-    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &now);
-    return 1e3 * static_cast<double>(now.tv_sec) + 1e-6 * static_cast<double>(now.tv_nsec);
-}
 
 /// Notes how long another ground takes: with virtual time the worker's turn is this thread's.
 class TimedGround final : public linux_::MapGround {

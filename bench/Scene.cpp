@@ -1,8 +1,7 @@
 #include "bench/Scene.h"
+#include "bench/ThreadTime.h"
 
 #include <malloc.h>
-#include <time.h>
-
 #include <QGuiApplication>
 #include <algorithm>
 #include <cstdio>
@@ -15,13 +14,6 @@
 namespace ktr::bench {
 
 namespace {
-
-/// Milliseconds that this thread has computed; what else the machine does is no part of it.
-double computed() {
-    timespec now{};
-    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &now);
-    return 1e3 * static_cast<double>(now.tv_sec) + 1e-6 * static_cast<double>(now.tv_nsec);
-}
 
 /// The median time of as many calls as fit into the budget, five at least.
 double median(

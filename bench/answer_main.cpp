@@ -1,7 +1,5 @@
 // One answer of the service in the whole program: what the network thread does with it, and what the main thread does,
 // part by part, from the command that asks to the screenful that shows it.
-#include <time.h>
-
 #include <QApplication>
 #include <QImage>
 #include <QPainter>
@@ -13,10 +11,10 @@
 #include <string>
 
 #include "app/Host.h"
-#include "app/Options.h"
 #include "app/ScenarioReader.h"
+#include "bench/ScenarioHost.h"
+#include "bench/ThreadTime.h"
 #include "linux/json/JsonReader.h"
-#include "linux/ui/FontSetup.h"
 #include "linux/ui/QtCanvas.h"
 #include "platform/assistant/VALocation.h"
 #include "platform/assistant/VASnippet.h"
@@ -27,6 +25,7 @@
 namespace {
 
 using namespace ktr;
+using bench::timed;
 using namespace ktr::platform;
 
 constexpr double kWidth = 400.0;   // points
@@ -35,19 +34,6 @@ constexpr double kScale = 2.0;
 constexpr double kInterval = 10.0;  // seconds between two answers
 constexpr int kWarmUp = 3;
 constexpr int kRounds = 41;
-
-/// Milliseconds that this thread has computed; what else the machine does is no part of it.
-double computed() {
-    timespec now{};
-    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &now);
-    return 1e3 * static_cast<double>(now.tv_sec) + 1e-6 * static_cast<double>(now.tv_nsec);
-}
-
-double timed(const std::function<void()>& work) {
-    const double start = computed();
-    work();
-    return computed() - start;
-}
 
 struct BenchAccount : DeviceOwnerAccount {
     std::optional<std::string> personIdentifier() const override { return "person"; }
@@ -188,19 +174,11 @@ int run(const char* file) {
     snippet->searchContext =
         Url("ktrServerContext://serverContext?clientId=bench&minCallbackIntervalInMS=10000&"
             "callbackTimeoutIntervalInMS=100000000&");
-    app::Options options;
-    options.scenarios = {file};
-    const auto decided = app::HostSettings::decide(options, {*scenario}, {});
-    if (const auto* failure = std::get_if<app::Failure>(&decided)) {
-        std::fprintf(stderr, "%s\n", failure->line.c_str());
+    const auto made = bench::hostFor(file, *scenario, app::Host::Time::Virtual);
+    if (!made) {
         return 1;
     }
-    auto made = app::Host::make(std::get<app::HostSettings>(decided), app::Host::Time::Virtual, {});
-    if (const auto* failure = std::get_if<app::Failure>(&made)) {
-        std::fprintf(stderr, "%s\n", failure->line.c_str());
-        return 1;
-    }
-    app::Host& host = *std::get<std::unique_ptr<app::Host>>(made);
+    app::Host& host = *made;
     // The platform is used from the first turn on.
     const auto transport = std::make_shared<BenchTransport>();
     Platform::installed()->httpTransport = transport;
@@ -217,12 +195,5 @@ int run(const char* file) {
 }  // namespace
 
 int main(int argc, char** argv) {
-    if (argc != 2) {
-        std::fprintf(stderr, "usage: %s SCENARIO      bench/make-scenario writes long ones\n", argv[0]);
-        return 2;
-    }
-    qputenv("QT_QPA_PLATFORM", "offscreen");
-    linux_::FontSetup::prepare(linux_::FontSetup::Mode::System);
-    const QApplication application(argc, argv);
-    return run(argv[1]);
+    return bench::runScenario(argc, argv, run);
 }

@@ -17,6 +17,7 @@
 
 #include "bench/MapGlide.h"
 #include "bench/PictureMap.h"
+#include "bench/ThreadTime.h"
 #include "linux/maps/MapDrawer.h"
 #include "linux/maps/MbtilesPictures.h"
 #include "linux/maps/PictureGround.h"
@@ -29,23 +30,17 @@
 namespace {
 
 using namespace ktr;
+using bench::computed;
 using namespace ktr::linux_;
 
 constexpr int kRounds = 41;
 
-/// Computing time of the thread: what other programs do does not count. Milliseconds.
-double now() {
-    timespec time{};
-    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &time);
-    return static_cast<double>(time.tv_sec) * 1e3 + static_cast<double>(time.tv_nsec) / 1e6;
-}
-
 double median(int rounds, const std::function<void(int)>& work) {
     std::vector<double> times;
     for (int round = 0; round < rounds; ++round) {
-        const double begin = now();
+        const double begin = computed();
         work(round);
-        times.push_back(now() - begin);
+        times.push_back(computed() - begin);
     }
     std::sort(times.begin(), times.end());
     return times[times.size() / 2];
@@ -98,15 +93,15 @@ int benchFile(const char* file, const platform::Coordinate& centre, double zoom)
     };
     bool isPictures = false;
     auto ground = groundOf(file, isPictures);
-    double begin = now();
+    double begin = computed();
     auto first = draw(wanted, ground);
     if (!first || first->attribution.empty()) {
         isPictures = true;
         ground = groundOf(file, isPictures);
-        begin = now();
+        begin = computed();
         first = draw(wanted, ground);
     }
-    const double cold = now() - begin;
+    const double cold = computed() - begin;
     if (!first || first->attribution.empty()) {
         std::fprintf(stderr, "%s shows nothing there\n", file);
         return 1;

@@ -1,8 +1,6 @@
 // A scenario in the whole program: how long its answer takes to open, how long a screenful takes to paint wherever it
 // is scrolled to, and what filling its rows costs, part by part.
 #include <malloc.h>
-#include <time.h>
-
 #include <QApplication>
 #include <QImage>
 #include <QPainter>
@@ -11,9 +9,9 @@
 #include <functional>
 
 #include "app/Host.h"
-#include "app/Options.h"
 #include "app/ScenarioReader.h"
-#include "linux/ui/FontSetup.h"
+#include "bench/ScenarioHost.h"
+#include "bench/ThreadTime.h"
 #include "linux/ui/QtCanvas.h"
 #include "model/ContactsUtilities.h"
 #include "model/KTRVALocation.h"
@@ -26,19 +24,8 @@
 namespace {
 
 using namespace ktr;
+using bench::timed;
 using namespace ktr::platform;
-/// Milliseconds that this thread computes; what else the machine does is no part of it.
-double timed(const std::function<void()>& work) {
-    const auto computed = [] {
-        timespec now{};
-        clock_gettime(CLOCK_THREAD_CPUTIME_ID, &now);
-        return 1e3 * static_cast<double>(now.tv_sec) + 1e-6 * static_cast<double>(now.tv_nsec);
-    };
-    const double start = computed();
-    work();
-    return computed() - start;
-}
-
 /// Paints a screenful at many places of the conversation, as a window that is scrolled does.
 void scroll(app::Host& host, double height) {
     constexpr double kScreen = 800.0;  // points
@@ -127,19 +114,11 @@ int run(const char* file) {
         std::fprintf(stderr, "%s\n", std::get<app::ScenarioError>(read).text().c_str());
         return 1;
     }
-    app::Options options;
-    options.scenarios = {file};
-    const auto decided = app::HostSettings::decide(options, {*scenario}, {});
-    if (const auto* failure = std::get_if<app::Failure>(&decided)) {
-        std::fprintf(stderr, "%s\n", failure->line.c_str());
+    const auto made = bench::hostFor(file, *scenario, app::Host::Time::Virtual);
+    if (!made) {
         return 1;
     }
-    auto made = app::Host::make(std::get<app::HostSettings>(decided), app::Host::Time::Virtual, {});
-    if (const auto* failure = std::get_if<app::Failure>(&made)) {
-        std::fprintf(stderr, "%s\n", failure->line.c_str());
-        return 1;
-    }
-    app::Host& host = *std::get<std::unique_ptr<app::Host>>(made);
+    app::Host& host = *made;
     std::optional<app::Failure> failure;
     const double added = timed([&] { failure = host.addTurn(*scenario); });
     if (failure) {
@@ -160,12 +139,5 @@ int run(const char* file) {
 }  // namespace
 
 int main(int argc, char** argv) {
-    if (argc != 2) {
-        std::fprintf(stderr, "usage: %s SCENARIO      bench/make-scenario writes long ones\n", argv[0]);
-        return 2;
-    }
-    qputenv("QT_QPA_PLATFORM", "offscreen");
-    linux_::FontSetup::prepare(linux_::FontSetup::Mode::System);
-    const QApplication application(argc, argv);
-    return run(argv[1]);
+    return bench::runScenario(argc, argv, run);
 }

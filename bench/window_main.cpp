@@ -1,7 +1,5 @@
 // A scenario in the program's window, on whatever display there is: how soon it is on the screen, how long each frame
 // takes while it is scrolled, with the pointer over it, and what it keeps in memory.
-#include <time.h>
-
 #include <QApplication>
 #include <QMouseEvent>
 #include <algorithm>
@@ -14,14 +12,16 @@
 #include <vector>
 
 #include "app/Host.h"
-#include "app/Options.h"
 #include "app/ScenarioReader.h"
 #include "app/window/ConversationWindow.h"
+#include "bench/ScenarioHost.h"
+#include "bench/ThreadTime.h"
 #include "linux/ui/FontSetup.h"
 
 namespace {
 
 using namespace ktr;
+using bench::computed;
 using Clock = std::chrono::steady_clock;
 
 constexpr int kFrames = 600;
@@ -30,13 +30,6 @@ constexpr double kFrame = 1000.0 / 60.0;  // milliseconds
 
 double since(Clock::time_point start) {
     return std::chrono::duration<double, std::milli>(Clock::now() - start).count();
-}
-
-/// Milliseconds that this thread has computed; what else the machine does is no part of it.
-double computed() {
-    timespec now{};
-    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &now);
-    return 1e3 * static_cast<double>(now.tv_sec) + 1e-6 * static_cast<double>(now.tv_nsec);
 }
 
 /// Resident memory, megabytes (Linux, /proc).
@@ -95,19 +88,11 @@ int run(const char* file, Clock::time_point start) {
         return 1;
     }
     const double hasRead = since(start);
-    app::Options options;
-    options.scenarios = {file};
-    const auto decided = app::HostSettings::decide(options, {*scenario}, {});
-    if (const auto* failure = std::get_if<app::Failure>(&decided)) {
-        std::fprintf(stderr, "%s\n", failure->line.c_str());
+    const auto made = bench::hostFor(file, *scenario, app::Host::Time::Running);
+    if (!made) {
         return 1;
     }
-    auto made = app::Host::make(std::get<app::HostSettings>(decided), app::Host::Time::Running, {});
-    if (const auto* failure = std::get_if<app::Failure>(&made)) {
-        std::fprintf(stderr, "%s\n", failure->line.c_str());
-        return 1;
-    }
-    app::Host& host = *std::get<std::unique_ptr<app::Host>>(made);
+    app::Host& host = *made;
     if (const auto failure = host.addTurn(*scenario)) {
         std::fprintf(stderr, "%s\n", failure->line.c_str());
         return 1;

@@ -26,13 +26,7 @@ constexpr double kArrowStep = 40.0;
 /// A wheel's notch, in the eighths of a degree that Qt counts, and how far it goes in points.
 constexpr double kNotch = 120.0;
 constexpr double kNotchStep = 60.0;
-constexpr int kFrame = 16;         // milliseconds
-constexpr double kRingTurn = 1.2;  // seconds
-constexpr double kStillRing = 0.75;
-
-bool nothingMoves(const QWidget& widget) {
-    return widget.style()->styleHint(QStyle::SH_Widget_Animation_Duration, nullptr, &widget) == 0;
-}
+constexpr int kFrame = 16;  // milliseconds
 
 }  // namespace
 
@@ -57,7 +51,8 @@ ConversationWidget::ConversationWidget(Host& host, QWidget* parent)
       touches_(std::make_shared<platform::TouchDispatcher>(host.window())),
       rows_(host.window(), host.conversation(), host.rightToLeft()),
       palette_(&Palette::of(ColorScheme::Light)),
-      bar_(new QScrollBar(Qt::Vertical, this)) {
+      bar_(new QScrollBar(Qt::Vertical, this)),
+      rings_(host.conversation(), [this] { return standsStill(); }) {
     setAttribute(Qt::WA_OpaquePaintEvent);
     setAttribute(Qt::WA_AcceptTouchEvents);
     setMouseTracking(true);
@@ -71,8 +66,6 @@ ConversationWidget::ConversationWidget(Host& host, QWidget* parent)
         update();
         AccessibleConversation::moved(*this);
     });
-    ringTimer_.setInterval(kFrame * 2);
-    connect(&ringTimer_, &QTimer::timeout, this, [this] { animateRings(); });
     flingTimer_.setInterval(kFrame);
     connect(&flingTimer_, &QTimer::timeout, this, [this] { fling(); });
     motionTimer_.setInterval(kFrame);
@@ -128,14 +121,17 @@ void ConversationWidget::layOut() {
     keepInPlace(turn, before);
     startMoving();
     rows_.refresh();
-    animateRings();
+    rings_.update();
     update();
     AccessibleConversation::changed(*this);
 }
 
+bool ConversationWidget::standsStill() const {
+    return reducedMotion_ || style()->styleHint(QStyle::SH_Widget_Animation_Duration, nullptr, this) == 0;
+}
+
 void ConversationWidget::chooseMotion() {
-    const bool reduced = reducedMotion_ || nothingMoves(*this);
-    host_.conversation()->setMotionStyle(reduced ? MotionStyle::Reduced : MotionStyle::Full);
+    host_.conversation()->setMotionStyle(standsStill() ? MotionStyle::Reduced : MotionStyle::Full);
 }
 
 void ConversationWidget::startMoving() {
@@ -281,32 +277,11 @@ void ConversationWidget::answerCame(TurnView& turn) {
 void ConversationWidget::setReducedMotion(bool reduced) {
     reducedMotion_ = reduced;
     chooseMotion();
-    animateRings();
+    rings_.update();
 }
 
 void ConversationWidget::scrollBy(const QKeyEvent& key) {
     keyPressEvent(const_cast<QKeyEvent*>(&key));
-}
-
-void ConversationWidget::animateRings() {
-    const bool still = reducedMotion_ || nothingMoves(*this);
-    bool any = false;
-    for (const auto& turn : host_.conversation()->turns()) {
-        turn->card()->updateRing();
-        const auto& ring = turn->card()->ring();
-        if (ring->hidden()) {
-            continue;
-        }
-        any = true;
-        ring->setShare(still ? kStillRing : 0.25);
-        ring->setTurn(still ? 0.0 : std::fmod(seconds() / kRingTurn, 1.0));
-    }
-    // Also for rings that stand still: they go when the search is over.
-    if (any && !ringTimer_.isActive()) {
-        ringTimer_.start();
-    } else if (!any) {
-        ringTimer_.stop();
-    }
 }
 
 void ConversationWidget::paintEvent(QPaintEvent* event) {

@@ -11,6 +11,7 @@
 
 #include "app/Host.h"
 #include "app/window/KineticScroll.h"
+#include "app/window/RingTurner.h"
 #include "app/window/RowFocus.h"
 #include "linux/ui/Palette.h"
 #include "platform/ui/TouchDispatcher.h"
@@ -67,6 +68,8 @@ class ConversationWidget : public QWidget {
     /// The next picture of what moves.
     void move();
     void startMoving();
+    /// The user, or the desktop, wants nothing to slide or turn.
+    bool standsStill() const;
     void chooseMotion();
     void stopScrolling() { scrollFrom_.reset(); }
     /// Where the turn stands on screen that the reader's eye is on: the first that is seen.
@@ -78,7 +81,6 @@ class ConversationWidget : public QWidget {
     /// How far is scrolled when the newest turn is at the top, points.
     double newestTop() const;
     void choosePalette();
-    void animateRings();
     bool touch(QTouchEvent& event);
     void fling();
     void showFocus();
@@ -93,7 +95,7 @@ class ConversationWidget : public QWidget {
     std::function<void()> paletteChanged_;
     bool reducedMotion_ = false;
     QScrollBar* bar_;
-    QTimer ringTimer_;
+    RingTurner rings_;
     QTimer flingTimer_;
     QTimer motionTimer_;
     /// Where the way to the newest turn began; none: nothing scrolls by itself.
