@@ -5,10 +5,10 @@
 #include <charconv>
 #include <cmath>
 
-#include "app/Scenario.h"
-#include "app/serve/ServeArguments.h"
-#include "linux/json/Words.h"
-#include "linux/ui/LinuxDevice.h"
+#include "app/ServeArguments.h"
+#include "documents/Words.h"
+#include "host/scenario/Scenario.h"
+#include "linux/device/LinuxDevice.h"
 
 #ifndef KTR_VERSION
 #error "KTR_VERSION is given by the build"
@@ -29,7 +29,7 @@ const char* const kFooter = R"(Exit status:
   4  an answer cannot be drawn: its kind, the text size, or a picture too large
   5  the plugin cannot be loaded
 
-Environment:
+host::Environment:
   KTR_PLUGIN       the plugin's library, when --plugin is not given
   KTR_LOG          debug, info, default, error (as it comes) or off: which log lines are written
   KTR_FONTS        pinned: only the Noto fonts, from their packaged files, for pictures that are compared
@@ -79,7 +79,7 @@ CLI::Validator range(double least, double most) {
         const char* end = text.data() + text.size();
         const auto [stop, error] = std::from_chars(text.data(), end, number);
         const bool fits = error == std::errc() && stop == end && number >= least && number <= most;
-        return fits ? std::string() : "expected " + expected + ", found " + linux_::inQuotes(text);
+        return fits ? std::string() : "expected " + expected + ", found " + documents::inQuotes(text);
     };
     return CLI::Validator(check, "");
 }
@@ -177,13 +177,13 @@ std::optional<double> durationOf(const std::string& text) {
 }
 
 std::string wrong(const std::string& option, const std::string& expected, const std::string& found) {
-    return option + ": expected " + expected + ", found " + linux_::inQuotes(found);
+    return option + ": expected " + expected + ", found " + documents::inQuotes(found);
 }
 
 /// Fills in what the words say; the complaint about the first wrong one, or an empty text.
 std::string readWords(const Words& words, Options& options) {
     if (!words.language.empty()) {
-        if (!isLanguageTag(words.language)) {
+        if (!host::isLanguageTag(words.language)) {
             return wrong("--language", "a language such as en-GB", words.language);
         }
         options.language = words.language;
@@ -201,7 +201,7 @@ std::string readWords(const Words& words, Options& options) {
         }
     }
     if (!words.at.empty()) {
-        options.at = parseIsoTime(words.at);
+        options.at = documents::parseIsoTime(words.at);
         options.atSeconds = secondsOf(words.at);
         if (!options.at && !options.atSeconds) {
             return wrong("--at", "a time such as 2026-05-16T17:42:00+02:00, or +90 for seconds up to a week", words.at);
@@ -248,15 +248,15 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
     // The parser takes the arguments from the back.
     std::reverse(arguments.begin(), arguments.end());
     const auto misuse = [](const std::string& line) {
-        return Ending{ExitCode::Usage, "ktr: " + line + "\nSee ktr --help.\n"};
+        return Ending{host::ExitCode::Usage, "ktr: " + line + "\nSee ktr --help.\n"};
     };
     try {
         parser.app.parse(std::move(arguments));
     } catch (const CLI::CallForVersion& version) {
-        return Ending{ExitCode::Ok, std::string(version.what()) + "\n"};
+        return Ending{host::ExitCode::Ok, std::string(version.what()) + "\n"};
     } catch (const CLI::CallForHelp&) {
         const auto asked = parser.app.get_subcommands();
-        return Ending{ExitCode::Ok, (asked.empty() ? parser.app.help() : asked.front()->help("ktr")) + "\n"};
+        return Ending{host::ExitCode::Ok, (asked.empty() ? parser.app.help() : asked.front()->help("ktr")) + "\n"};
     } catch (const CLI::ParseError& error) {
         return misuse(error.what());
     }

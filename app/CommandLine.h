@@ -4,8 +4,8 @@
 #include <variant>
 #include <vector>
 
-#include "app/ExitCode.h"
 #include "app/Options.h"
+#include "host/ExitCode.h"
 
 namespace ktr::app {
 
@@ -15,7 +15,7 @@ class CommandLine {
     /// What ends the program at once: help and version on the standard output, or a line about a wrong use on the
     /// standard error.
     struct Ending {
-        ExitCode code = ExitCode::Ok;
+        host::ExitCode code = host::ExitCode::Ok;
         std::string text;
     };
 

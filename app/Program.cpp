@@ -9,40 +9,41 @@
 
 #include "app/CommandLine.h"
 #include "app/Description.h"
-#include "app/Host.h"
+#include "app/LiveRun.h"
 #include "app/RenderCommand.h"
-#include "app/ScenarioReader.h"
-#include "app/live/LiveRun.h"
-#include "app/serve/ServeCommand.h"
+#include "app/ServeCommand.h"
 #include "app/window/ShowCommand.h"
-#include "linux/account/ConfigurationReader.h"
-#include "linux/account/XdgFolders.h"
-#include "linux/services/SystemClock.h"
-#include "linux/ui/FontSetup.h"
+#include "host/Host.h"
+#include "host/scenario/ScenarioReader.h"
+#include "linux/configuration/ConfigurationReader.h"
+#include "linux/configuration/XdgFolders.h"
+#include "linux/device/SystemClock.h"
+#include "linux/paint/FontSetup.h"
 
 namespace ktr::app {
 
 namespace {
 
-ExitCode fail(const Failure& failure) {
+host::ExitCode fail(const host::Failure& failure) {
     std::fprintf(stderr, "ktr: %s\n", failure.line.c_str());
     return failure.code;
 }
 
 /// The present moment in the session's time zone.
-IsoTime sessionNow() {
+documents::IsoTime sessionNow() {
     return {linux_::SystemClock().now(), QDateTime::currentDateTime().offsetFromUtc()};
 }
 
-std::variant<std::vector<Scenario>, Failure> readScenarios(const Options& options, platform::Date now) {
-    std::vector<Scenario> scenarios;
+std::variant<std::vector<host::Scenario>, host::Failure> readScenarios(const Options& options, platform::Date now) {
+    std::vector<host::Scenario> scenarios;
     for (const std::string& file : options.scenarios) {
-        const auto clock = options.live ? ScenarioReader::Clock::Present : ScenarioReader::Clock::OfTheScenario;
-        auto read = ScenarioReader(now, clock).readFile(file);
-        if (const auto* error = std::get_if<ScenarioError>(&read)) {
-            return Failure{ExitCode::BadScenario, error->text()};
+        const auto clock =
+            options.live ? host::ScenarioReader::Clock::Present : host::ScenarioReader::Clock::OfTheScenario;
+        auto read = host::ScenarioReader(now, clock).readFile(file);
+        if (const auto* error = std::get_if<documents::DocumentError>(&read)) {
+            return host::Failure{host::ExitCode::BadScenario, error->text()};
         }
-        scenarios.push_back(std::move(std::get<Scenario>(read)));
+        scenarios.push_back(std::move(std::get<host::Scenario>(read)));
     }
     return scenarios;
 }
@@ -54,12 +55,14 @@ linux_::Configuration configurationOf(const std::filesystem::path& file) {
     return configuration == nullptr ? linux_::Configuration() : std::move(*configuration);
 }
 
-std::variant<std::unique_ptr<Host>, Failure> makeHost(const Options& options, const HostSettings& settings,
-                                                      const std::vector<Scenario>& scenarios, Host::Time time) {
-    auto made = Host::make(settings, time, options.plugin);
+std::variant<std::unique_ptr<host::Host>, host::Failure> makeHost(const Options& options,
+                                                                  const host::HostSettings& settings,
+                                                                  const std::vector<host::Scenario>& scenarios,
+                                                                  host::Host::Time time) {
+    auto made = host::Host::make(settings, time, options.plugin);
     // What is live waits for the account first.
-    if (auto* host = std::get_if<std::unique_ptr<Host>>(&made); host != nullptr && !options.live) {
-        for (const Scenario& scenario : scenarios) {
+    if (auto* host = std::get_if<std::unique_ptr<host::Host>>(&made); host != nullptr && !options.live) {
+        for (const host::Scenario& scenario : scenarios) {
             if (auto failure = (*host)->addTurn(scenario)) {
                 return *failure;
             }
@@ -68,13 +71,14 @@ std::variant<std::unique_ptr<Host>, Failure> makeHost(const Options& options, co
     return made;
 }
 
-ExitCode runHeadless(const Options& options, const HostSettings& settings, const std::vector<Scenario>& scenarios) {
-    auto made = makeHost(options, settings, scenarios, Host::Time::Virtual);
-    if (const auto* failure = std::get_if<Failure>(&made)) {
+host::ExitCode runHeadless(const Options& options, const host::HostSettings& settings,
+                           const std::vector<host::Scenario>& scenarios) {
+    auto made = makeHost(options, settings, scenarios, host::Host::Time::Virtual);
+    if (const auto* failure = std::get_if<host::Failure>(&made)) {
         return fail(*failure);
     }
-    Host& host = *std::get<std::unique_ptr<Host>>(made);
-    const ExitCode code = options.live ? LiveRun(host, options).run(scenarios) : ExitCode::Ok;
+    host::Host& host = *std::get<std::unique_ptr<host::Host>>(made);
+    const host::ExitCode code = options.live ? LiveRun(host, options).run(scenarios) : host::ExitCode::Ok;
     if (options.command == Options::Command::Render) {
         const auto failure = RenderCommand(host).write(options.output);
         return failure ? fail(*failure) : code;
@@ -82,18 +86,19 @@ ExitCode runHeadless(const Options& options, const HostSettings& settings, const
     host.settle(settings.width);
     const std::string text = describe(platform::accessibilityTree(host.window(), host.rightToLeft()));
     if (std::fputs(text.c_str(), stdout) == EOF || std::fflush(stdout) != 0) {
-        return fail({ExitCode::Failure, "the description cannot be written"});
+        return fail({host::ExitCode::Failure, "the description cannot be written"});
     }
     return code;
 }
 
-ExitCode runShow(const Options& options, HostSettings settings, const std::vector<Scenario>& scenarios) {
+host::ExitCode runShow(const Options& options, host::HostSettings settings,
+                       const std::vector<host::Scenario>& scenarios) {
     settings.scale = qApp->devicePixelRatio();
-    auto made = makeHost(options, settings, scenarios, Host::Time::Running);
-    if (const auto* failure = std::get_if<Failure>(&made)) {
+    auto made = makeHost(options, settings, scenarios, host::Host::Time::Running);
+    if (const auto* failure = std::get_if<host::Failure>(&made)) {
         return fail(*failure);
     }
-    return ShowCommand(*std::get<std::unique_ptr<Host>>(made), options).run(scenarios);
+    return ShowCommand(*std::get<std::unique_ptr<host::Host>>(made), options).run(scenarios);
 }
 
 /// The display that a window needs; Qt ends the process when it looks for one in vain.
@@ -113,7 +118,7 @@ void passOnQtMessage(QtMsgType type, const QMessageLogContext& /*context*/, cons
         std::fprintf(stderr, "ktr: %s\n", text.section(u'\n', 0, 0).toUtf8().constData());
     }
     if (type == QtFatalMsg) {
-        std::_Exit(static_cast<int>(ExitCode::Failure));
+        std::_Exit(static_cast<int>(host::ExitCode::Failure));
     }
 }
 
@@ -122,42 +127,43 @@ linux_::FontSetup::Mode fontMode() {
     return qgetenv("KTR_FONTS") == "pinned" ? linux_::FontSetup::Mode::Pinned : linux_::FontSetup::Mode::System;
 }
 
-std::optional<Failure> prepareFonts() {
+std::optional<host::Failure> prepareFonts() {
     std::string error;
     if (!linux_::FontSetup::prepare(fontMode(), &error)) {
-        return Failure{ExitCode::Failure, "the fonts cannot be set up: " + error};
+        return host::Failure{host::ExitCode::Failure, "the fonts cannot be set up: " + error};
     }
     return std::nullopt;
 }
 
-std::optional<Failure> loadFonts() {
+std::optional<host::Failure> loadFonts() {
     const auto missing = linux_::FontSetup::load(fontMode());
     if (!missing.empty()) {
-        return Failure{ExitCode::Failure, "a font file is missing: " + missing.front()};
+        return host::Failure{host::ExitCode::Failure, "a font file is missing: " + missing.front()};
     }
     return std::nullopt;
 }
 
-ExitCode run(const Options& options, int argc, char** argv) {
-    const IsoTime now = sessionNow();
+host::ExitCode run(const Options& options, int argc, char** argv) {
+    const documents::IsoTime now = sessionNow();
     const auto read = readScenarios(options, options.at ? options.at->date : now.date);
-    if (const auto* failure = std::get_if<Failure>(&read)) {
+    if (const auto* failure = std::get_if<host::Failure>(&read)) {
         return fail(*failure);
     }
-    const auto& scenarios = std::get<std::vector<Scenario>>(read);
+    const auto& scenarios = std::get<std::vector<host::Scenario>>(read);
     const auto configuration = linux_::XdgFolders::configurationFile();
-    auto decided = HostSettings::decide(options, scenarios, now,
-                                        options.live ? configurationOf(configuration) : linux_::Configuration());
-    if (const auto* failure = std::get_if<Failure>(&decided)) {
+    auto decided = host::HostSettings::decide(options, scenarios, now,
+                                              options.live ? configurationOf(configuration) : linux_::Configuration());
+    if (const auto* failure = std::get_if<host::Failure>(&decided)) {
         return fail(*failure);
     }
-    auto& settings = std::get<HostSettings>(decided);
+    auto& settings = std::get<host::HostSettings>(decided);
     if (options.live) {
         settings.liveConfiguration = configuration;
     }
     const bool window = options.command == Options::Command::Show;
     if (window && !hasDisplay()) {
-        return fail({ExitCode::Failure, "there is no display to open a window on; `ktr render` draws without one"});
+        return fail(
+            {host::ExitCode::Failure, "there is no display to open a window on; `ktr render` draws without one"});
     }
     if (!window) {
         qputenv("QT_QPA_PLATFORM", "offscreen");
@@ -178,10 +184,10 @@ ExitCode run(const Options& options, int argc, char** argv) {
 
 }  // namespace
 
-ExitCode runProgram(int argc, char** argv) {
+host::ExitCode runProgram(int argc, char** argv) {
     const auto parsed = CommandLine::parse(std::vector<std::string>(argv + (argc > 0 ? 1 : 0), argv + argc));
     if (const auto* ending = std::get_if<CommandLine::Ending>(&parsed)) {
-        std::fputs(ending->text.c_str(), ending->code == ExitCode::Ok ? stdout : stderr);
+        std::fputs(ending->text.c_str(), ending->code == host::ExitCode::Ok ? stdout : stderr);
         return ending->code;
     }
     const auto& options = std::get<Options>(parsed);

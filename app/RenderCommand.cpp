@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <cmath>
 
-#include "linux/ui/ScenePainter.h"
+#include "linux/paint/ScenePainter.h"
 
 namespace ktr::app {
 
@@ -32,8 +32,8 @@ std::string RenderCommand::pieceName(const std::string& output, int number) {
     return output.substr(0, dot) + "-" + std::to_string(number) + output.substr(dot);
 }
 
-std::optional<Failure> RenderCommand::write(const std::string& output) const {
-    const HostSettings& settings = host_.settings();
+std::optional<host::Failure> RenderCommand::write(const std::string& output) const {
+    const host::HostSettings& settings = host_.settings();
     const Palette& palette = Palette::of(settings.dark.value_or(false) ? ColorScheme::Dark : ColorScheme::Light,
                                          settings.highContrast ? Contrast::High : Contrast::Normal);
     host_.conversation()->setPalette(palette);
@@ -47,11 +47,11 @@ std::optional<Failure> RenderCommand::write(const std::string& output) const {
         const double partHeight = std::min(most, height - top);
         const ScenePainter painter({settings.width, partHeight}, settings.scale, palette);
         if (const auto reason = painter.refusal()) {
-            return Failure{ExitCode::NotDrawn, output + ": " + *reason};
+            return host::Failure{host::ExitCode::NotDrawn, output + ": " + *reason};
         }
         const std::string file = splits ? pieceName(output, number) : output;
         if (const auto error = painter.write(file, part(host_.window(), top, partHeight))) {
-            return Failure{ExitCode::Failure, *error};
+            return host::Failure{host::ExitCode::Failure, *error};
         }
     }
     return std::nullopt;

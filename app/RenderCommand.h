@@ -4,8 +4,8 @@
 #include <string>
 #include <vector>
 
-#include "app/Failure.h"
-#include "app/Host.h"
+#include "host/Failure.h"
+#include "host/Host.h"
 
 namespace ktr::app {
 
@@ -18,12 +18,12 @@ class RenderCommand {
     /// The name of a piece: "dinner.png" and 2 give "dinner-2.png".
     static std::string pieceName(const std::string& output, int number);
 
-    explicit RenderCommand(Host& host) : host_(host) {}
+    explicit RenderCommand(host::Host& host) : host_(host) {}
     /// Writes the picture; a PNG that would be too high in pieces, each as high as allowed but the last.
-    std::optional<Failure> write(const std::string& output) const;
+    std::optional<host::Failure> write(const std::string& output) const;
 
   private:
-    Host& host_;
+    host::Host& host_;
 };
 
 }  // namespace ktr::app

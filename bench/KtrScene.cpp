@@ -3,10 +3,10 @@
 #include <QFile>
 #include <QPainter>
 
-#include "linux/ui/PngEncoder.h"
-#include "linux/ui/QtCanvas.h"
-#include "linux/ui/QtImage.h"
-#include "linux/ui/QtTextEngine.h"
+#include "linux/paint/PngEncoder.h"
+#include "linux/paint/QtCanvas.h"
+#include "linux/paint/QtImage.h"
+#include "linux/paint/QtTextEngine.h"
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/base/Log.h"
 #include "platform/base/VirtualTime.h"

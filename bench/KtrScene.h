@@ -4,7 +4,7 @@
 #include <vector>
 
 #include "bench/Scene.h"
-#include "linux/ui/Palette.h"
+#include "linux/paint/Palette.h"
 #include "platform/base/Platform.h"
 #include "platform/ui/StackView.h"
 #include "platform/ui/Window.h"

@@ -6,11 +6,11 @@
 #include <utility>
 #include <variant>
 
-#include "app/Environment.h"
 #include "app/Options.h"
 #include "bench/ThreadTime.h"
+#include "host/Environment.h"
 #include "linux/maps/ThreadedMapSource.h"
-#include "linux/ui/QtCanvas.h"
+#include "linux/paint/QtCanvas.h"
 #include "platform/base/Object.h"
 #include "platform/base/Platform.h"
 
@@ -56,15 +56,15 @@ double median(std::vector<double> values) {
 std::unique_ptr<MapGlide> MapGlide::make(std::shared_ptr<linux_::MapGround> ground, const Coordinate& start) {
     app::Options options;
     options.scale = kScale;
-    const auto settings = app::HostSettings::decide(options, {}, {});
-    if (!std::holds_alternative<app::HostSettings>(settings)) {
+    const auto settings = host::HostSettings::decide(options, {}, {});
+    if (!std::holds_alternative<host::HostSettings>(settings)) {
         return nullptr;
     }
-    auto environment = app::Environment::make(std::get<app::HostSettings>(settings), true);
-    if (!std::holds_alternative<app::Environment>(environment)) {
+    auto environment = host::Environment::make(std::get<host::HostSettings>(settings), true);
+    if (!std::holds_alternative<host::Environment>(environment)) {
         return nullptr;
     }
-    auto& made = std::get<app::Environment>(environment);
+    auto& made = std::get<host::Environment>(environment);
     std::unique_ptr<MapGlide> glide(new MapGlide);
     glide->time_ = made.virtualTime;
     glide->start_ = start;

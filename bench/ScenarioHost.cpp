@@ -5,26 +5,26 @@
 #include <utility>
 #include <variant>
 
-#include "app/HostSettings.h"
 #include "app/Options.h"
-#include "linux/ui/FontSetup.h"
+#include "host/HostSettings.h"
+#include "linux/paint/FontSetup.h"
 
 namespace ktr::bench {
 
-std::unique_ptr<app::Host> hostFor(const char* file, const app::Scenario& scenario, app::Host::Time time) {
+std::unique_ptr<host::Host> hostFor(const char* file, const host::Scenario& scenario, host::Host::Time time) {
     app::Options options;
     options.scenarios = {file};
-    const auto decided = app::HostSettings::decide(options, {scenario}, {});
-    if (const auto* failure = std::get_if<app::Failure>(&decided)) {
+    const auto decided = host::HostSettings::decide(options, {scenario}, {});
+    if (const auto* failure = std::get_if<host::Failure>(&decided)) {
         std::fprintf(stderr, "%s\n", failure->line.c_str());
         return nullptr;
     }
-    auto made = app::Host::make(std::get<app::HostSettings>(decided), time, {});
-    if (const auto* failure = std::get_if<app::Failure>(&made)) {
+    auto made = host::Host::make(std::get<host::HostSettings>(decided), time, {});
+    if (const auto* failure = std::get_if<host::Failure>(&made)) {
         std::fprintf(stderr, "%s\n", failure->line.c_str());
         return nullptr;
     }
-    return std::move(std::get<std::unique_ptr<app::Host>>(made));
+    return std::move(std::get<std::unique_ptr<host::Host>>(made));
 }
 
 int runScenario(int argc, char** argv, int (*run)(const char* file)) {

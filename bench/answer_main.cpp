@@ -10,12 +10,12 @@
 #include <map>
 #include <string>
 
-#include "app/Host.h"
-#include "app/ScenarioReader.h"
 #include "bench/ScenarioHost.h"
 #include "bench/ThreadTime.h"
-#include "linux/json/JsonReader.h"
-#include "linux/ui/QtCanvas.h"
+#include "documents/JsonReader.h"
+#include "host/Host.h"
+#include "host/scenario/ScenarioReader.h"
+#include "linux/paint/QtCanvas.h"
 #include "platform/assistant/VALocation.h"
 #include "platform/assistant/VASnippet.h"
 #include "platform/base/Json.h"
@@ -110,7 +110,7 @@ class Parts {
     std::map<std::string, std::vector<double>> times_;
 };
 
-void paint(app::Host& host, const linux_::Palette& palette, QImage& image) {
+void paint(host::Host& host, const linux_::Palette& palette, QImage& image) {
     image.fill(palette.window);
     QPainter painter(&image);
     painter.setRenderHint(QPainter::Antialiasing);
@@ -119,7 +119,7 @@ void paint(app::Host& host, const linux_::Palette& palette, QImage& image) {
     host.window()->paint(canvas, {0.0, 0.0, kWidth, kScreen});
 }
 
-void measure(app::Host& host, const LocationList& friends, BenchTransport& transport) {
+void measure(host::Host& host, const LocationList& friends, BenchTransport& transport) {
     const auto time = std::dynamic_pointer_cast<VirtualTime>(Platform::installed()->mainLoop);
     const linux_::Palette palette = linux_::Palette::of(linux_::ColorScheme::Light);
     QImage image(static_cast<int>(kWidth * kScale), static_cast<int>(kScreen * kScale),
@@ -140,7 +140,7 @@ void measure(app::Host& host, const LocationList& friends, BenchTransport& trans
         bytes = body.size();
         HttpAnswer answer;
         answer.status = 200;
-        const double decoded = timed([&] { answer.json = std::get<Value>(linux_::JsonReader::read(body)); });
+        const double decoded = timed([&] { answer.json = std::get<Value>(documents::JsonReader::read(body)); });
         completion(std::move(answer));
         const double rebuilt = timed([&] { time->runPosted(); });
         const double laidOut = timed([&] { host.layOut(kWidth); });
@@ -160,10 +160,10 @@ void measure(app::Host& host, const LocationList& friends, BenchTransport& trans
 }
 
 int run(const char* file) {
-    auto read = app::ScenarioReader(Date{}).readFile(file);
-    auto* scenario = std::get_if<app::Scenario>(&read);
+    auto read = host::ScenarioReader(Date{}).readFile(file);
+    auto* scenario = std::get_if<host::Scenario>(&read);
     if (scenario == nullptr) {
-        std::fprintf(stderr, "%s\n", std::get<app::ScenarioError>(read).text().c_str());
+        std::fprintf(stderr, "%s\n", std::get<documents::DocumentError>(read).text().c_str());
         return 1;
     }
     const auto snippet = std::dynamic_pointer_cast<VAKtrLocationSnippet>(scenario->snippet);
@@ -174,11 +174,11 @@ int run(const char* file) {
     snippet->searchContext =
         Url("ktrServerContext://serverContext?clientId=bench&minCallbackIntervalInMS=10000&"
             "callbackTimeoutIntervalInMS=100000000&");
-    const auto made = bench::hostFor(file, *scenario, app::Host::Time::Virtual);
+    const auto made = bench::hostFor(file, *scenario, host::Host::Time::Virtual);
     if (!made) {
         return 1;
     }
-    app::Host& host = *made;
+    host::Host& host = *made;
     // The platform is used from the first turn on.
     const auto transport = std::make_shared<BenchTransport>();
     Platform::installed()->httpTransport = transport;

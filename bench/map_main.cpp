@@ -23,8 +23,8 @@
 #include "linux/maps/PictureGround.h"
 #include "linux/maps/ThreadedMapSource.h"
 #include "linux/maps/VectorGround.h"
-#include "linux/ui/FontSetup.h"
-#include "linux/ui/QtImage.h"
+#include "linux/paint/FontSetup.h"
+#include "linux/paint/QtImage.h"
 #include "platform/base/VirtualTime.h"
 
 namespace {

@@ -8,11 +8,11 @@
 #include <cstdio>
 #include <functional>
 
-#include "app/Host.h"
-#include "app/ScenarioReader.h"
 #include "bench/ScenarioHost.h"
 #include "bench/ThreadTime.h"
-#include "linux/ui/QtCanvas.h"
+#include "host/Host.h"
+#include "host/scenario/ScenarioReader.h"
+#include "linux/paint/QtCanvas.h"
 #include "model/ContactsUtilities.h"
 #include "model/KTRVALocation.h"
 #include "model/KTRVAUIUtils.h"
@@ -27,7 +27,7 @@ using namespace ktr;
 using bench::timed;
 using namespace ktr::platform;
 /// Paints a screenful at many places of the conversation, as a window that is scrolled does.
-void scroll(app::Host& host, double height) {
+void scroll(host::Host& host, double height) {
     constexpr double kScreen = 800.0;  // points
     constexpr double kScale = 2.0;
     constexpr int kPlaces = 300;
@@ -55,7 +55,7 @@ void scroll(app::Host& host, double height) {
 }
 
 /// Fills a row for each record: the first time, and again as at a refresh.
-void fillRows(const app::Scenario& scenario) {
+void fillRows(const host::Scenario& scenario) {
     const auto snippet = std::dynamic_pointer_cast<VAKtrLocationSnippet>(scenario.snippet);
     if (!snippet || !snippet->locations || scenario.positions.empty()) {
         return;
@@ -107,19 +107,19 @@ void fillRows(const app::Scenario& scenario) {
 
 int run(const char* file) {
     const double heapBefore = static_cast<double>(mallinfo2().uordblks);
-    std::variant<app::Scenario, app::ScenarioError> read = app::ScenarioError{};
-    std::printf("read: %.1f ms\n", timed([&] { read = app::ScenarioReader(Date{}).readFile(file); }));
-    const auto* scenario = std::get_if<app::Scenario>(&read);
+    std::variant<host::Scenario, documents::DocumentError> read = documents::DocumentError{};
+    std::printf("read: %.1f ms\n", timed([&] { read = host::ScenarioReader(Date{}).readFile(file); }));
+    const auto* scenario = std::get_if<host::Scenario>(&read);
     if (scenario == nullptr) {
-        std::fprintf(stderr, "%s\n", std::get<app::ScenarioError>(read).text().c_str());
+        std::fprintf(stderr, "%s\n", std::get<documents::DocumentError>(read).text().c_str());
         return 1;
     }
-    const auto made = bench::hostFor(file, *scenario, app::Host::Time::Virtual);
+    const auto made = bench::hostFor(file, *scenario, host::Host::Time::Virtual);
     if (!made) {
         return 1;
     }
-    app::Host& host = *made;
-    std::optional<app::Failure> failure;
+    host::Host& host = *made;
+    std::optional<host::Failure> failure;
     const double added = timed([&] { failure = host.addTurn(*scenario); });
     if (failure) {
         std::fprintf(stderr, "%s\n", failure->line.c_str());

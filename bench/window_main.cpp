@@ -11,12 +11,12 @@
 #include <string>
 #include <vector>
 
-#include "app/Host.h"
-#include "app/ScenarioReader.h"
 #include "app/window/ConversationWindow.h"
 #include "bench/ScenarioHost.h"
 #include "bench/ThreadTime.h"
-#include "linux/ui/FontSetup.h"
+#include "host/Host.h"
+#include "host/scenario/ScenarioReader.h"
+#include "linux/paint/FontSetup.h"
 
 namespace {
 
@@ -81,18 +81,18 @@ void movePointer(QWidget& widget, QPointF at) {
 
 int run(const char* file, Clock::time_point start) {
     const double residentBefore = residentMegabytes();
-    auto read = app::ScenarioReader(platform::Date{}).readFile(file);
-    const auto* scenario = std::get_if<app::Scenario>(&read);
+    auto read = host::ScenarioReader(platform::Date{}).readFile(file);
+    const auto* scenario = std::get_if<host::Scenario>(&read);
     if (scenario == nullptr) {
-        std::fprintf(stderr, "%s\n", std::get<app::ScenarioError>(read).text().c_str());
+        std::fprintf(stderr, "%s\n", std::get<documents::DocumentError>(read).text().c_str());
         return 1;
     }
     const double hasRead = since(start);
-    const auto made = bench::hostFor(file, *scenario, app::Host::Time::Running);
+    const auto made = bench::hostFor(file, *scenario, host::Host::Time::Running);
     if (!made) {
         return 1;
     }
-    app::Host& host = *made;
+    host::Host& host = *made;
     if (const auto failure = host.addTurn(*scenario)) {
         std::fprintf(stderr, "%s\n", failure->line.c_str());
         return 1;

@@ -3,7 +3,7 @@
 #include <QFocusEvent>
 #include <QPainter>
 
-#include "linux/ui/FontChoice.h"
+#include "linux/paint/FontChoice.h"
 #include "platform/ui/Font.h"
 
 namespace ktr::app {

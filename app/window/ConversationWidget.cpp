@@ -9,9 +9,9 @@
 #include <algorithm>
 #include <cmath>
 
-#include "app/conversation/Measures.h"
 #include "app/window/AccessibleConversation.h"
-#include "linux/ui/QtCanvas.h"
+#include "host/conversation/Measures.h"
+#include "linux/paint/QtCanvas.h"
 
 namespace ktr::app {
 
@@ -44,7 +44,7 @@ class ConversationWidget::Client : public platform::WindowClient {
     ConversationWidget& widget_;
 };
 
-ConversationWidget::ConversationWidget(Host& host, QWidget* parent)
+ConversationWidget::ConversationWidget(host::Host& host, QWidget* parent)
     : QWidget(parent),
       host_(host),
       client_(std::make_shared<Client>(*this)),
@@ -90,7 +90,7 @@ double ConversationWidget::seconds() const {
 
 void ConversationWidget::choosePalette() {
     const bool systemIsDark = QApplication::palette().color(QPalette::Window).lightness() < 128;
-    const HostSettings& settings = host_.settings();
+    const host::HostSettings& settings = host_.settings();
     palette_ = &Palette::of(settings.dark.value_or(systemIsDark) ? ColorScheme::Dark : ColorScheme::Light,
                             settings.highContrast ? Contrast::High : Contrast::Normal);
     host_.conversation()->setPalette(*palette_);
@@ -131,7 +131,7 @@ bool ConversationWidget::standsStill() const {
 }
 
 void ConversationWidget::chooseMotion() {
-    host_.conversation()->setMotionStyle(standsStill() ? MotionStyle::Reduced : MotionStyle::Full);
+    host_.conversation()->setMotionStyle(standsStill() ? host::MotionStyle::Reduced : host::MotionStyle::Full);
 }
 
 void ConversationWidget::startMoving() {
@@ -140,14 +140,14 @@ void ConversationWidget::startMoving() {
     }
 }
 
-std::shared_ptr<TurnView> ConversationWidget::anchor() const {
+std::shared_ptr<host::TurnView> ConversationWidget::anchor() const {
     const auto& turns = host_.conversation()->turns();
     const auto seen =
         std::find_if(turns.begin(), turns.end(), [&](const auto& turn) { return turn->frame().maxY() > scrolled(); });
     return seen == turns.end() ? nullptr : *seen;
 }
 
-void ConversationWidget::keepInPlace(const std::shared_ptr<TurnView>& turn, double before) {
+void ConversationWidget::keepInPlace(const std::shared_ptr<host::TurnView>& turn, double before) {
     const double moved = turn ? host_.conversation()->topOf(*turn) - before : 0.0;
     if (moved != 0.0) {
         scrollTo(scrolled() + moved);
@@ -229,7 +229,7 @@ void ConversationWidget::resizeCard(platform::HostSnippetViewController& control
         return;
     }
     // At once: a bottom that stays while its card grows would push everything else about.
-    host_.conversation()->setMotionStyle(MotionStyle::None);
+    host_.conversation()->setMotionStyle(host::MotionStyle::None);
     const double before = (*turn)->card()->frameInRoot().maxY() - scrolled();
     layOut();
     scrollTo((*turn)->card()->frameInRoot().maxY() - before);
@@ -246,7 +246,7 @@ double ConversationWidget::newestTop() const {
         return 0.0;
     }
     // Side by side, question and card begin at their turn's very top: the space above them is nobody's.
-    const double above = width() >= measures::kWideFrom ? measures::kCardToQuestion : 0.0;
+    const double above = width() >= host::measures::kWideFrom ? host::measures::kCardToQuestion : 0.0;
     return host_.conversation()->topOf(*turns.back()) - above;
 }
 
@@ -254,22 +254,22 @@ void ConversationWidget::scrollToNewest(bool moves) {
     if (host_.conversation()->turns().size() < 2) {
         return;
     }
-    if (moves && host_.conversation()->motionStyle() == MotionStyle::Full) {
+    if (moves && host_.conversation()->motionStyle() == host::MotionStyle::Full) {
         scrollFrom_ = scrolled();
-        scroll_ = Motion(0.0, 1.0, seconds(), motions::kArrival);
+        scroll_ = host::Motion(0.0, 1.0, seconds(), host::motions::kArrival);
         startMoving();
     } else {
         scrollTo(newestTop());
     }
 }
 
-void ConversationWidget::turnCame(TurnView& turn) {
+void ConversationWidget::turnCame(host::TurnView& turn) {
     turn.arrive(seconds());
     layOut();
     scrollToNewest(true);
 }
 
-void ConversationWidget::answerCame(TurnView& turn) {
+void ConversationWidget::answerCame(host::TurnView& turn) {
     turn.answerArrives(seconds());
     layOut();
 }

@@ -9,11 +9,11 @@
 #include <memory>
 #include <optional>
 
-#include "app/Host.h"
 #include "app/window/KineticScroll.h"
 #include "app/window/RingTurner.h"
 #include "app/window/RowFocus.h"
-#include "linux/ui/Palette.h"
+#include "host/Host.h"
+#include "linux/paint/Palette.h"
 #include "platform/ui/TouchDispatcher.h"
 #include "platform/ui/Window.h"
 
@@ -24,10 +24,10 @@ namespace ktr::app {
 class ConversationWidget : public QWidget {
   public:
     /// The host outlives the widget.
-    explicit ConversationWidget(Host& host, QWidget* parent = nullptr);
+    explicit ConversationWidget(host::Host& host, QWidget* parent = nullptr);
     ~ConversationWidget() override;
 
-    Host& host() const { return host_; }
+    host::Host& host() const { return host_; }
     /// From the view tree's coordinates to the widget's: points that are scrolled away at the top.
     double scrolled() const { return bar_->value(); }
     void scrollTo(double y);
@@ -36,8 +36,8 @@ class ConversationWidget : public QWidget {
     /// What the arrow keys and the page keys do.
     void scrollBy(const QKeyEvent& key);
     /// A turn was added, which is the newest then; a turn got its answer.
-    void turnCame(TurnView& turn);
-    void answerCame(TurnView& turn);
+    void turnCame(host::TurnView& turn);
+    void answerCame(host::TurnView& turn);
     void setReducedMotion(bool reduced);
     const linux_::Palette& colors() const { return *palette_; }
     /// Called after the colours have become others.
@@ -73,8 +73,8 @@ class ConversationWidget : public QWidget {
     void chooseMotion();
     void stopScrolling() { scrollFrom_.reset(); }
     /// Where the turn stands on screen that the reader's eye is on: the first that is seen.
-    std::shared_ptr<TurnView> anchor() const;
-    void keepInPlace(const std::shared_ptr<TurnView>& turn, double before);
+    std::shared_ptr<host::TurnView> anchor() const;
+    void keepInPlace(const std::shared_ptr<host::TurnView>& turn, double before);
     /// Lays out again after a card's height changed; its top, or else its bottom, stays where it is on screen.
     void resizeCard(platform::HostSnippetViewController& controller, bool pinTop);
     void updateBar();
@@ -87,7 +87,7 @@ class ConversationWidget : public QWidget {
     platform::Point inTree(QPointF point) const { return {point.x(), point.y() + scrolled()}; }
     double seconds() const;
 
-    Host& host_;
+    host::Host& host_;
     std::shared_ptr<Client> client_;
     std::shared_ptr<platform::TouchDispatcher> touches_;
     RowFocus rows_;
@@ -100,7 +100,7 @@ class ConversationWidget : public QWidget {
     QTimer motionTimer_;
     /// Where the way to the newest turn began; none: nothing scrolls by itself.
     std::optional<double> scrollFrom_;
-    Motion scroll_;
+    host::Motion scroll_;
     QElapsedTimer clock_;
     KineticScroll kinetic_;
     /// Where the finger went down, while it has not moved far enough to scroll.

@@ -3,7 +3,7 @@
 #include <QKeyEvent>
 #include <QPainter>
 
-#include "app/conversation/WideColumns.h"
+#include "host/conversation/WideColumns.h"
 
 namespace ktr::app {
 
@@ -16,7 +16,8 @@ constexpr int kStatusEvery = 1000;  // milliseconds
 
 }  // namespace
 
-ConversationWindow::ConversationWindow(Host& host) : host_(host), conversation_(new ConversationWidget(host, this)) {
+ConversationWindow::ConversationWindow(host::Host& host)
+    : host_(host), conversation_(new ConversationWidget(host, this)) {
     setAttribute(Qt::WA_OpaquePaintEvent);
     setLayoutDirection(host.rightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
     setMinimumSize(conversation_->minimumSize());
@@ -38,20 +39,21 @@ ConversationWindow::~ConversationWindow() {
 }
 
 void ConversationWindow::addField() {
-    live_ = LiveConversation::make(host_);
+    live_ = host::LiveConversation::make(host_);
     field_ = new AskField({host_.text("ASK_FIELD"), host_.text("ASK_SEND")}, this);
     field_->setAsked([this](const std::string& question) { live_->ask(question); });
     field_->edit().installEventFilter(this);
     status_ = new StatusLine(this);
     setFocusProxy(&field_->edit());
     field_->edit().setFocus();
-    live_->setHandlers({[this](TurnView& turn) { conversation_->turnCame(turn); },
-                        [this](TurnView& turn) { conversation_->answerCame(turn); }, [this] { showStatus(); }});
+    live_->setHandlers({[this](host::TurnView& turn) { conversation_->turnCame(turn); },
+                        [this](host::TurnView& turn) { conversation_->answerCame(turn); }, [this] { showStatus(); }});
     statusTimer_.setInterval(kStatusEvery);
     connect(&statusTimer_, &QTimer::timeout, this, [this] { showStatus(); });
 }
 
-void ConversationWindow::start(const std::vector<Scenario>& scenarios, const std::vector<std::string>& questions) {
+void ConversationWindow::start(const std::vector<host::Scenario>& scenarios,
+                               const std::vector<std::string>& questions) {
     conversation_->scrollToNewest();
     if (live_) {
         for (const std::string& question : questions) {
@@ -85,10 +87,10 @@ void ConversationWindow::resizeEvent(QResizeEvent*) {
     if (field_ == nullptr) {
         return;
     }
-    const bool wide = width() >= measures::kWideFrom;
-    const auto columns = WideColumns::of(width());
-    const int fieldWidth = static_cast<int>(wide ? columns.cardWidth : width() - 2.0 * measures::kGutter);
-    const int start = static_cast<int>(wide ? columns.cardStart : measures::kGutter);
+    const bool wide = width() >= host::measures::kWideFrom;
+    const auto columns = host::WideColumns::of(width());
+    const int fieldWidth = static_cast<int>(wide ? columns.cardWidth : width() - 2.0 * host::measures::kGutter);
+    const int start = static_cast<int>(wide ? columns.cardStart : host::measures::kGutter);
     const int x = host_.rightToLeft() ? width() - start - fieldWidth : start;
     const int y = height() - bar + kAboveField;
     constexpr int kAround = AskField::kAround;

@@ -6,10 +6,10 @@
 #include <string>
 #include <vector>
 
-#include "app/live/LiveConversation.h"
 #include "app/window/AskField.h"
 #include "app/window/ConversationWidget.h"
 #include "app/window/StatusLine.h"
+#include "host/live/LiveConversation.h"
 
 namespace ktr::app {
 
@@ -17,12 +17,12 @@ namespace ktr::app {
 class ConversationWindow : public QWidget {
   public:
     /// The host outlives the window.
-    explicit ConversationWindow(Host& host);
+    explicit ConversationWindow(host::Host& host);
     ~ConversationWindow() override;
 
     void setReducedMotion(bool reduced) { conversation_->setReducedMotion(reduced); }
     /// Where the window is live: shows the scenarios and asks the questions once the account is read.
-    void start(const std::vector<Scenario>& scenarios, const std::vector<std::string>& questions);
+    void start(const std::vector<host::Scenario>& scenarios, const std::vector<std::string>& questions);
 
     ConversationWidget& conversation() const { return *conversation_; }
     /// None where nothing is live.
@@ -41,9 +41,9 @@ class ConversationWindow : public QWidget {
     void showStatus();
     int barHeight() const;
 
-    Host& host_;
+    host::Host& host_;
     ConversationWidget* conversation_;
-    std::shared_ptr<LiveConversation> live_;
+    std::shared_ptr<host::LiveConversation> live_;
     AskField* field_ = nullptr;
     StatusLine* status_ = nullptr;
     QTimer statusTimer_;

@@ -3,7 +3,7 @@
 #include <QLineEdit>
 #include <QTimer>
 
-#include "linux/ui/Palette.h"
+#include "linux/paint/Palette.h"
 
 namespace ktr::app {
 

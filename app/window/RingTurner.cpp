@@ -14,7 +14,7 @@ constexpr double kStillShare = 0.75;
 
 }  // namespace
 
-RingTurner::RingTurner(std::shared_ptr<ConversationView> conversation, std::function<bool()> isStill)
+RingTurner::RingTurner(std::shared_ptr<host::ConversationView> conversation, std::function<bool()> isStill)
     : conversation_(std::move(conversation)), isStill_(std::move(isStill)) {
     clock_.start();
     timer_.setInterval(kStep);

@@ -5,7 +5,7 @@
 #include <functional>
 #include <memory>
 
-#include "app/conversation/ConversationView.h"
+#include "host/conversation/ConversationView.h"
 
 namespace ktr::app {
 
@@ -13,13 +13,13 @@ namespace ktr::app {
 class RingTurner {
   public:
     /// `isStill`: whether rings stand, asked at each step.
-    RingTurner(std::shared_ptr<ConversationView> conversation, std::function<bool()> isStill);
+    RingTurner(std::shared_ptr<host::ConversationView> conversation, std::function<bool()> isStill);
 
     /// Brings every ring up to date, and goes on by itself while one is shown.
     void update();
 
   private:
-    std::shared_ptr<ConversationView> conversation_;
+    std::shared_ptr<host::ConversationView> conversation_;
     std::function<bool()> isStill_;
     QTimer timer_;
     QElapsedTimer clock_;

@@ -20,7 +20,7 @@ void collectPressable(const AccessibilityNode& node, std::vector<AccessibilityNo
 }
 
 /// A view's rectangle in a card's coordinates; none when it stands in another card, or in none any more.
-std::optional<Rect> rectIn(const CardView& card, const std::shared_ptr<View>& view) {
+std::optional<Rect> rectIn(const host::CardView& card, const std::shared_ptr<View>& view) {
     if (!view || !view->isDescendantOf(card)) {
         return std::nullopt;
     }

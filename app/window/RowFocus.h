@@ -3,7 +3,7 @@
 #include <memory>
 #include <optional>
 
-#include "app/conversation/ConversationView.h"
+#include "host/conversation/ConversationView.h"
 #include "platform/ui/Accessibility.h"
 #include "platform/ui/View.h"
 
@@ -13,7 +13,8 @@ namespace ktr::app {
 /// opened. Main thread.
 class RowFocus {
   public:
-    RowFocus(std::shared_ptr<platform::View> root, std::shared_ptr<ConversationView> conversation, bool rightToLeft)
+    RowFocus(std::shared_ptr<platform::View> root, std::shared_ptr<host::ConversationView> conversation,
+             bool rightToLeft)
         : root_(std::move(root)), conversation_(std::move(conversation)), rightToLeft_(rightToLeft) {}
 
     /// A point in the root's coordinates; none: the pointer has left, or is a finger.
@@ -41,7 +42,7 @@ class RowFocus {
     void markHover();
 
     std::shared_ptr<platform::View> root_;
-    std::shared_ptr<ConversationView> conversation_;
+    std::shared_ptr<host::ConversationView> conversation_;
     bool rightToLeft_;
     std::weak_ptr<platform::View> focused_;
     std::weak_ptr<platform::View> hovered_;

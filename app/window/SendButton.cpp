@@ -55,7 +55,7 @@ void SendButton::setReady(bool ready, bool animated) {
     setCursor(ready ? Qt::PointingHandCursor : Qt::ArrowCursor);
     const double now = seconds();
     const double to = ready ? 1.0 : 0.0;
-    colour_ = animated ? Motion::linear(colour_.at(now), to, now, motions::kReady) : Motion(to);
+    colour_ = animated ? host::Motion::linear(colour_.at(now), to, now, host::motions::kReady) : host::Motion(to);
     if (animated) {
         timer_.start();
     }

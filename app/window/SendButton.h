@@ -4,8 +4,8 @@
 #include <QElapsedTimer>
 #include <QTimer>
 
-#include "app/conversation/Motion.h"
-#include "linux/ui/Palette.h"
+#include "host/conversation/Motion.h"
+#include "linux/paint/Palette.h"
 
 namespace ktr::app {
 
@@ -34,7 +34,7 @@ class SendButton : public QAbstractButton {
     const linux_::Palette* palette_;
     QElapsedTimer clock_;
     QTimer timer_;
-    Motion colour_;
+    host::Motion colour_;
     bool marksFocus_ = false;
 };
 

@@ -24,7 +24,7 @@ bool openOnDesktop(const platform::Url& url) {
 
 }  // namespace
 
-ExitCode ShowCommand::run(const std::vector<Scenario>& scenarios) {
+host::ExitCode ShowCommand::run(const std::vector<host::Scenario>& scenarios) {
     QGuiApplication::setApplicationName(QStringLiteral("ktr"));
     host_.delegate().open = options_.printUrls ? printUrl : openOnDesktop;
     ConversationWindow window(host_);
@@ -34,7 +34,7 @@ ExitCode ShowCommand::run(const std::vector<Scenario>& scenarios) {
     window.resize(width, width < 900 ? kTallWindow : kWideWindow);
     window.show();
     window.start(scenarios, options_.questions);
-    return QApplication::exec() == 0 ? ExitCode::Ok : ExitCode::Failure;
+    return QApplication::exec() == 0 ? host::ExitCode::Ok : host::ExitCode::Failure;
 }
 
 }  // namespace ktr::app

@@ -4,7 +4,7 @@
 #include <QPainterPath>
 #include <cmath>
 
-#include "linux/ui/FontChoice.h"
+#include "linux/paint/FontChoice.h"
 #include "platform/ui/Font.h"
 
 namespace ktr::app {
@@ -57,7 +57,7 @@ StatusLine::StatusLine(QWidget* parent)
     words_->setTextFormat(Qt::PlainText);
 }
 
-void StatusLine::setStatus(const LiveStatus& status) {
+void StatusLine::setStatus(const host::LiveStatus& status) {
     const QString words = QString::fromStdString(status.words);
     if (words_->text() != words) {
         words_->setText(words);
@@ -87,26 +87,26 @@ void StatusLine::paintEvent(QPaintEvent*) {
     const bool mirrored = layoutDirection() == Qt::RightToLeft;
     const QPointF centre(mirrored ? width() - kMarkCentre : kMarkCentre, height() / 2.0 + 0.5);
     switch (mark_) {
-        case LiveStatus::Mark::Live:
+        case host::LiveStatus::Mark::Live:
             painter.setPen(Qt::NoPen);
             painter.setBrush(palette_->pine);
             painter.drawEllipse(centre, kDot / 2.0, kDot / 2.0);
             break;
-        case LiveStatus::Mark::Waiting:
+        case host::LiveStatus::Mark::Waiting:
             painter.setPen(QPen(palette_->inkSoft, kRingStroke));
             painter.drawEllipse(centre, (kDot - kRingStroke) / 2.0, (kDot - kRingStroke) / 2.0);
             break;
-        case LiveStatus::Mark::Warning:
+        case host::LiveStatus::Mark::Warning:
             painter.translate(centre - QPointF(kWarning / 2.0, kWarning / 2.0));
             painter.setPen(QPen(palette_->warning, kWarningStroke, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
             painter.drawPath(warningPath());
             break;
-        case LiveStatus::Mark::Hidden:
+        case host::LiveStatus::Mark::Hidden:
             painter.translate(centre - QPointF(kHidden / 2.0, kHidden / 2.0));
             painter.setPen(QPen(palette_->inkSoft, kHiddenStroke, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
             painter.drawPath(hiddenPath());
             break;
-        case LiveStatus::Mark::None:
+        case host::LiveStatus::Mark::None:
             break;
     }
 }

@@ -3,8 +3,8 @@
 #include <QLabel>
 #include <QWidget>
 
-#include "app/live/LiveStatus.h"
-#include "linux/ui/Palette.h"
+#include "host/live/LiveStatus.h"
+#include "linux/paint/Palette.h"
 
 namespace ktr::app {
 
@@ -17,7 +17,7 @@ class StatusLine : public QWidget {
 
     explicit StatusLine(QWidget* parent = nullptr);
 
-    void setStatus(const LiveStatus& status);
+    void setStatus(const host::LiveStatus& status);
     void setColors(const linux_::Palette& palette);
     QString words() const { return words_->text(); }
     int lineHeight() const { return lineHeight_; }
@@ -29,7 +29,7 @@ class StatusLine : public QWidget {
   private:
     QLabel* words_;
     const linux_::Palette* palette_;
-    LiveStatus::Mark mark_ = LiveStatus::Mark::None;
+    host::LiveStatus::Mark mark_ = host::LiveStatus::Mark::None;
     int lineHeight_ = 0;
 };
 

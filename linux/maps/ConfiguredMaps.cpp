@@ -1,6 +1,6 @@
 #include "linux/maps/ConfiguredMaps.h"
 
-#include "linux/account/XdgFolders.h"
+#include "linux/configuration/XdgFolders.h"
 #include "linux/maps/AttributedGround.h"
 #include "linux/maps/HttpsPictures.h"
 #include "linux/maps/MbtilesPictures.h"

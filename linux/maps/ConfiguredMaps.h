@@ -3,7 +3,7 @@
 #include <filesystem>
 #include <memory>
 
-#include "linux/account/Configuration.h"
+#include "linux/configuration/Configuration.h"
 #include "linux/maps/ThreadedMapSource.h"
 
 namespace ktr::linux_ {

@@ -66,7 +66,7 @@ seconds retryAfter(const QByteArray& field) {
     return isNumber ? std::clamp(seconds(wanted), kLeastPause, kPauseWhenGone) : kLeastPause;
 }
 
-QUrl addressOf(const std::string& pattern, const TileKey& key) {
+QUrl addressOf(const std::string& pattern, const tiles::TileKey& key) {
     QString address = QString::fromStdString(pattern);
     address.replace(QLatin1String("{z}"), QString::number(key.z));
     address.replace(QLatin1String("{x}"), QString::number(key.x));
@@ -82,7 +82,7 @@ class HttpsPictures::Fetcher : public QObject {
     explicit Fetcher(HttpsPictures& pictures) : pictures_(pictures), settings_(pictures.settings_) {}
 
     /// `known`: what is on disk already, to ask only for something newer.
-    void want(const TileKey& key, std::optional<TileStore::Entry> known) {
+    void want(const tiles::TileKey& key, std::optional<TileStore::Entry> known) {
         waiting_.push_front({key, std::move(known)});
         while (waiting_.size() > kMostWaiting) {
             ended(waiting_.back().key, seconds(0));
@@ -102,7 +102,7 @@ class HttpsPictures::Fetcher : public QObject {
 
   private:
     struct Wanted {
-        TileKey key;
+        tiles::TileKey key;
         std::optional<TileStore::Entry> known;
     };
 
@@ -221,7 +221,7 @@ class HttpsPictures::Fetcher : public QObject {
         }
     }
 
-    void ended(const TileKey& key, seconds pause, bool isGone = false) {
+    void ended(const tiles::TileKey& key, seconds pause, bool isGone = false) {
         const std::lock_guard lock(pictures_.mutex_);
         State& state = pictures_.states_[key];
         state.isUnderWay = false;
@@ -295,7 +295,7 @@ void HttpsPictures::setChangeHandler(std::function<void()> changed) {
     changed_ = std::move(changed);
 }
 
-TilePictures::Answer HttpsPictures::tile(const TileKey& key, bool isWanted) {
+TilePictures::Answer HttpsPictures::tile(const tiles::TileKey& key, bool isWanted) {
     Answer answer;
     std::optional<TileStore::Entry> known = store_->load(key);
     const std::lock_guard lock(mutex_);

@@ -42,7 +42,7 @@ class HttpsPictures final : public TilePictures {
     int coarsest() const override { return settings_.coarsest; }
     int finest() const override { return settings_.finest; }
     std::string attribution() const override { return settings_.attribution; }
-    Answer tile(const TileKey& key, bool isWanted) override;
+    Answer tile(const tiles::TileKey& key, bool isWanted) override;
     void setChangeHandler(std::function<void()> changed) override;
 
   private:
@@ -59,7 +59,7 @@ class HttpsPictures final : public TilePictures {
     Settings settings_;
     std::shared_ptr<TileStore> store_;
     std::mutex mutex_;
-    std::map<TileKey, State> states_;
+    std::map<tiles::TileKey, State> states_;
     std::function<void()> changed_;
     QThread thread_;
     /// Lives on the thread and is deleted there.

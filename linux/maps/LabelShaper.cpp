@@ -6,7 +6,7 @@
 #include <QRawFont>
 #include <QTextLayout>
 
-#include "linux/ui/FontChoice.h"
+#include "linux/paint/FontChoice.h"
 #include "platform/ui/Font.h"
 
 namespace ktr::linux_ {

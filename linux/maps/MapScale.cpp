@@ -48,28 +48,28 @@ double between(double metres, double (*column)(const Row&)) {
 
 }  // namespace
 
-MapScale::Width MapScale::road(MapKind kind) const {
+MapScale::Width MapScale::road(tiles::MapKind kind) const {
     Width width;
     switch (kind) {
-        case MapKind::Major:
+        case tiles::MapKind::Major:
             width = {between(metres_, [](const Row& row) { return row.major.fill; }),
                      between(metres_, [](const Row& row) { return row.major.casing; })};
             break;
-        case MapKind::Secondary:
+        case tiles::MapKind::Secondary:
             width = {between(metres_, [](const Row& row) { return row.secondary.fill; }),
                      between(metres_, [](const Row& row) { return row.secondary.casing; })};
             break;
-        case MapKind::Minor:
-        case MapKind::Service:
+        case tiles::MapKind::Minor:
+        case tiles::MapKind::Service:
             width = {between(metres_, [](const Row& row) { return row.minor.fill; }),
                      between(metres_, [](const Row& row) { return row.minor.casing; })};
             break;
-        case MapKind::Path:
+        case tiles::MapKind::Path:
             return {metres_ <= kFarthestPath ? between(metres_, [](const Row& row) { return row.path; }) : 0.0, 0.0};
         default:
             return {};
     }
-    if (kind == MapKind::Service) {
+    if (kind == tiles::MapKind::Service) {
         const double edge = width.casing - width.fill;
         width.fill = metres_ <= kFarthestService ? width.fill * kServiceShare : 0.0;
         width.casing = width.fill + edge;
@@ -95,35 +95,35 @@ double MapScale::lineFactor() const {
     return std::clamp(0.45 + 0.55 * (25.0 - metres_) / 19.0, 0.45, 1.0);
 }
 
-bool MapScale::showsNames(MapKind kind) const {
+bool MapScale::showsNames(tiles::MapKind kind) const {
     switch (kind) {
-        case MapKind::WaterName:
-        case MapKind::Water:
-        case MapKind::Place:
-        case MapKind::BoundaryName:
+        case tiles::MapKind::WaterName:
+        case tiles::MapKind::Water:
+        case tiles::MapKind::Place:
+        case tiles::MapKind::BoundaryName:
             return true;
-        case MapKind::WaterLine:
+        case tiles::MapKind::WaterLine:
             return metres_ <= 25.0;
-        case MapKind::Major:
+        case tiles::MapKind::Major:
             return metres_ <= 12.0;
-        case MapKind::Secondary:
+        case tiles::MapKind::Secondary:
             return metres_ <= 6.0;
-        case MapKind::Park:
-        case MapKind::ParkName:
+        case tiles::MapKind::Park:
+        case tiles::MapKind::ParkName:
             return metres_ <= 4.0;
-        case MapKind::Minor:
+        case tiles::MapKind::Minor:
             return metres_ <= 2.2;
-        case MapKind::Service:
-        case MapKind::Square:
-        case MapKind::Pier:
-        case MapKind::PointOfInterest:
+        case tiles::MapKind::Service:
+        case tiles::MapKind::Square:
+        case tiles::MapKind::Pier:
+        case tiles::MapKind::PointOfInterest:
             return metres_ <= 1.2;
         default:
             return false;
     }
 }
 
-bool MapScale::showsPlace(PlaceRank rank) const {
+bool MapScale::showsPlace(tiles::PlaceRank rank) const {
     struct Span {
         double nearest;
         double farthest;

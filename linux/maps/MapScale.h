@@ -1,6 +1,6 @@
 #pragma once
 
-#include "linux/maps/MapTile.h"
+#include "tiles/MapTile.h"
 
 namespace ktr::linux_ {
 
@@ -18,16 +18,16 @@ class MapScale {
 
     double metresPerPoint() const { return metres_; }
     /// Of a class of road (Service, Minor, Secondary, Major) or path; nothing for other kinds.
-    Width road(MapKind kind) const;
+    Width road(tiles::MapKind kind) const;
     /// Of a river, canal or stream of this width in metres; 0 when it is too small to be seen.
     double waterLine(double metres) const;
     /// The share of its full width that a rail, pier line or boundary has.
     double lineFactor() const;
     bool showsBuildings() const { return metres_ <= 4.0; }
     /// Whether streets of this class, or labels of this kind, have their names.
-    bool showsNames(MapKind kind) const;
+    bool showsNames(tiles::MapKind kind) const;
     /// Whether a place of this rank is shown: neither from too far nor from so near that it fills the map.
-    bool showsPlace(PlaceRank rank) const;
+    bool showsPlace(tiles::PlaceRank rank) const;
     /// What the sizes of labels are multiplied with.
     double labelFactor() const;
 

@@ -6,7 +6,7 @@
 #include <QTextLayout>
 #include <algorithm>
 
-#include "linux/ui/FontChoice.h"
+#include "linux/paint/FontChoice.h"
 
 namespace ktr::linux_ {
 

@@ -6,13 +6,13 @@
 #include <QRectF>
 
 #include "linux/maps/MapGround.h"
-#include "linux/maps/TileKey.h"
+#include "tiles/TileKey.h"
 
 namespace ktr::linux_ {
 
 /// Where a tile stands in a picture. Neighbours share their edges to the pixel.
 struct PlacedTile {
-    TileKey key;
+    tiles::TileKey key;
     QRect pixels;   ///< of the picture; may reach beyond it
     QRectF points;  ///< the exact square, in the viewport's points
 };

@@ -1,4 +1,5 @@
 #include "linux/maps/MbtilesPictures.h"
+#include "linux/maps/MbtilesLoader.h"
 
 #include <system_error>
 
@@ -35,11 +36,11 @@ bool MbtilesPictures::open() {
 }
 
 bool MbtilesPictures::read(std::string& error) {
-    file_ = MbtilesFile::open(path_, error);
+    file_ = MbtilesLoader::open(path_, error);
     if (!file_) {
         return false;
     }
-    facts_ = TilesetFacts::of(file_->metadata());
+    facts_ = tiles::TilesetFacts::of(file_->metadata());
     if (facts_.format.empty() || facts_.format == "pbf" || facts_.format == "mvt") {
         return false;  // vector tiles: another ground's
     }
@@ -54,7 +55,7 @@ bool MbtilesPictures::read(std::string& error) {
     return true;
 }
 
-TilePictures::Answer MbtilesPictures::tile(const TileKey& key, bool /*isWanted*/) {
+TilePictures::Answer MbtilesPictures::tile(const tiles::TileKey& key, bool /*isWanted*/) {
     Answer answer;
     answer.version = version_;
     if (file_) {

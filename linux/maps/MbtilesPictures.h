@@ -4,8 +4,8 @@
 #include <filesystem>
 #include <memory>
 
-#include "linux/maps/MbtilesFile.h"
 #include "linux/maps/TilePictures.h"
+#include "tiles/MbtilesFile.h"
 
 namespace ktr::linux_ {
 
@@ -18,20 +18,20 @@ class MbtilesPictures final : public TilePictures {
     bool open() override;
     int coarsest() const override { return coarsest_; }
     int finest() const override { return finest_; }
-    std::optional<TilesetFacts::Bounds> bounds() const override { return facts_.bounds; }
+    std::optional<tiles::TilesetFacts::Bounds> bounds() const override { return facts_.bounds; }
     std::string attribution() const override { return facts_.attribution; }
-    Answer tile(const TileKey& key, bool isWanted) override;
+    Answer tile(const tiles::TileKey& key, bool isWanted) override;
 
   private:
     bool read(std::string& error);
 
     std::string path_;
-    std::shared_ptr<MbtilesFile> file_;
+    std::shared_ptr<tiles::MbtilesFile> file_;
     std::optional<std::chrono::steady_clock::time_point> looked_;
     std::filesystem::file_time_type written_;
     std::string reported_;
     unsigned version_ = 0;
-    TilesetFacts facts_;
+    tiles::TilesetFacts facts_;
     int coarsest_ = 0;
     int finest_ = 0;
 };

@@ -6,7 +6,7 @@
 #include <numbers>
 
 #include "linux/maps/MapStyle.h"
-#include "linux/ui/ImageDecoder.h"
+#include "linux/paint/ImageDecoder.h"
 
 namespace ktr::linux_ {
 
@@ -61,7 +61,7 @@ void PictureGround::darken(QImage& pixels) {
     }
 }
 
-QImage PictureGround::read(const TileKey& key, bool isDark, bool isWanted, bool& isComing) {
+QImage PictureGround::read(const tiles::TileKey& key, bool isDark, bool isWanted, bool& isComing) {
     const TilePictures::Answer answer = pictures_->tile(key, isWanted);
     isComing = isComing || answer.isComing;
     const auto known = std::find_if(kept_.begin(), kept_.end(),
@@ -98,9 +98,9 @@ QImage PictureGround::read(const TileKey& key, bool isDark, bool isWanted, bool&
     return pixels;
 }
 
-std::optional<PictureGround::Found> PictureGround::find(const TileKey& key, bool isDark, bool& isComing) {
+std::optional<PictureGround::Found> PictureGround::find(const tiles::TileKey& key, bool isDark, bool& isComing) {
     for (int level = key.z; level >= pictures_->coarsest(); --level) {
-        const TileKey parent = key.parent(level);
+        const tiles::TileKey parent = key.parent(level);
         // A coarser tile is fetched only where there is no finer one.
         const QImage pixels = read(parent, isDark, !isComing, isComing);
         if (!pixels.isNull()) {

@@ -32,7 +32,7 @@ class PictureGround final : public MapGround {
 
   private:
     struct Kept {
-        TileKey key;
+        tiles::TileKey key;
         bool isDark = false;
         unsigned version = 0;
         QImage pixels;  ///< null for what is no picture
@@ -43,8 +43,8 @@ class PictureGround final : public MapGround {
         QRectF part;
     };
 
-    QImage read(const TileKey& key, bool isDark, bool isWanted, bool& isComing);
-    std::optional<Found> find(const TileKey& key, bool isDark, bool& isComing);
+    QImage read(const tiles::TileKey& key, bool isDark, bool isWanted, bool& isComing);
+    std::optional<Found> find(const tiles::TileKey& key, bool isDark, bool& isComing);
     QRegion covered(const PlacedTile& placed) const;
 
     std::unique_ptr<TilePictures> pictures_;

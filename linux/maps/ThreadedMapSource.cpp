@@ -11,7 +11,7 @@
 
 #include "linux/maps/MapDrawer.h"
 #include "linux/maps/MapStyle.h"
-#include "linux/ui/RasterImage.h"
+#include "linux/paint/RasterImage.h"
 #include "platform/base/Log.h"
 
 namespace ktr::linux_ {

@@ -11,7 +11,7 @@ constexpr std::size_t kEntryBytes = 200;
 
 }  // namespace
 
-std::optional<std::shared_ptr<const MapTile>> TileCache::find(const TileKey& key) {
+std::optional<std::shared_ptr<const tiles::MapTile>> TileCache::find(const tiles::TileKey& key) {
     const auto found = byKey_.find(key);
     if (found == byKey_.end()) {
         return std::nullopt;
@@ -20,7 +20,7 @@ std::optional<std::shared_ptr<const MapTile>> TileCache::find(const TileKey& key
     return found->second->tile;
 }
 
-void TileCache::put(const TileKey& key, std::shared_ptr<const MapTile> tile) {
+void TileCache::put(const tiles::TileKey& key, std::shared_ptr<const tiles::MapTile> tile) {
     if (const auto known = byKey_.find(key); known != byKey_.end()) {
         bytes_ -= known->second->bytes;
         entries_.erase(known->second);

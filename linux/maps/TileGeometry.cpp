@@ -61,17 +61,17 @@ bool cutSegment(const QPointF& from, const QPointF& to, const QRectF& window, do
 }
 
 /// Whether an edge of an area runs along the tile's own edge: there the tile was cut, not the area.
-bool isCut(const MapTile::Spot& from, const MapTile::Spot& to) {
-    const auto onEdge = [](float a, float b) { return a == b && (a <= 0.0F || a >= MapTile::kExtent); };
+bool isCut(const tiles::MapTile::Spot& from, const tiles::MapTile::Spot& to) {
+    const auto onEdge = [](float a, float b) { return a == b && (a <= 0.0F || a >= tiles::MapTile::kExtent); };
     return onEdge(from.x, to.x) || onEdge(from.y, to.y);
 }
 
 }  // namespace
 
 TileGeometry::TileGeometry(const VisibleTile& visible)
-    : visible_(visible), unit_(visible.square.width() / static_cast<double>(MapTile::kExtent)) {}
+    : visible_(visible), unit_(visible.square.width() / static_cast<double>(tiles::MapTile::kExtent)) {}
 
-bool TileGeometry::isVisible(const MapTile::Feature& feature) const {
+bool TileGeometry::isVisible(const tiles::MapTile::Feature& feature) const {
     const QPointF first = point({feature.left, feature.top});
     const QPointF last = point({feature.right, feature.bottom});
     const QRectF& window = visible_.window;
@@ -79,7 +79,7 @@ bool TileGeometry::isVisible(const MapTile::Feature& feature) const {
            last.y() >= window.top();
 }
 
-bool TileGeometry::isInside(const MapTile::Feature& feature) const {
+bool TileGeometry::isInside(const tiles::MapTile::Feature& feature) const {
     const QPointF first = point({feature.left, feature.top});
     const QPointF last = point({feature.right, feature.bottom});
     const QRectF& window = visible_.window;
@@ -87,8 +87,8 @@ bool TileGeometry::isInside(const MapTile::Feature& feature) const {
            last.y() <= window.bottom();
 }
 
-void TileGeometry::addArea(const MapTile::Feature& feature, QPainterPath& path) const {
-    const MapTile& tile = *visible_.tile;
+void TileGeometry::addArea(const tiles::MapTile::Feature& feature, QPainterPath& path) const {
+    const tiles::MapTile& tile = *visible_.tile;
     const QRectF& window = visible_.window;
     const Side sides[] = {{true, window.left(), 1.0},
                           {true, window.right(), -1.0},
@@ -113,15 +113,15 @@ void TileGeometry::addArea(const MapTile::Feature& feature, QPainterPath& path) 
     }
 }
 
-void TileGeometry::eachEdge(const MapTile::Feature& feature, const LineReceiver& receive) const {
-    const MapTile& tile = *visible_.tile;
+void TileGeometry::eachEdge(const tiles::MapTile::Feature& feature, const LineReceiver& receive) const {
+    const tiles::MapTile& tile = *visible_.tile;
     for (std::uint32_t part = feature.firstPart; part < feature.firstPart + feature.partCount; ++part) {
         const std::uint32_t begin = tile.partBegin(part);
         const std::uint32_t end = tile.partEnds[part];
         QPolygonF line;
         for (std::uint32_t spot = begin; spot < end; ++spot) {
-            const MapTile::Spot& from = tile.spots[spot];
-            const MapTile::Spot& to = tile.spots[spot + 1 == end ? begin : spot + 1];
+            const tiles::MapTile::Spot& from = tile.spots[spot];
+            const tiles::MapTile::Spot& to = tile.spots[spot + 1 == end ? begin : spot + 1];
             if (isCut(from, to)) {
                 cutLine(line, receive);
                 line.clear();
@@ -136,8 +136,8 @@ void TileGeometry::eachEdge(const MapTile::Feature& feature, const LineReceiver&
     }
 }
 
-void TileGeometry::eachLine(const MapTile::Feature& feature, const LineReceiver& receive) const {
-    const MapTile& tile = *visible_.tile;
+void TileGeometry::eachLine(const tiles::MapTile::Feature& feature, const LineReceiver& receive) const {
+    const tiles::MapTile& tile = *visible_.tile;
     for (std::uint32_t part = feature.firstPart; part < feature.firstPart + feature.partCount; ++part) {
         QPolygonF line;
         line.reserve(tile.partEnds[part] - tile.partBegin(part));
@@ -181,8 +181,8 @@ void TileGeometry::cutLine(const QPolygonF& line, const LineReceiver& receive) c
     finish();
 }
 
-std::vector<QPointF> TileGeometry::spots(const MapTile::Feature& feature) const {
-    const MapTile& tile = *visible_.tile;
+std::vector<QPointF> TileGeometry::spots(const tiles::MapTile::Feature& feature) const {
+    const tiles::MapTile& tile = *visible_.tile;
     std::vector<QPointF> inside;
     for (std::uint32_t part = feature.firstPart; part < feature.firstPart + feature.partCount; ++part) {
         const QPointF spot = point(tile.spots[tile.partBegin(part)]);

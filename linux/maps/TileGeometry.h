@@ -8,13 +8,13 @@
 #include <QPolygonF>
 #include <QRectF>
 
-#include "linux/maps/MapTile.h"
+#include "tiles/MapTile.h"
 
 namespace ktr::linux_ {
 
 /// A tile where a picture shows it. Points of the picture.
 struct VisibleTile {
-    std::shared_ptr<const MapTile> tile;
+    std::shared_ptr<const tiles::MapTile> tile;
     QRectF square;  ///< the whole tile
     QRectF window;  ///< the part of it that is drawn: inside the tile, and little more than the picture shows
 };
@@ -29,20 +29,20 @@ class TileGeometry {
 
     explicit TileGeometry(const VisibleTile& visible);
 
-    bool isVisible(const MapTile::Feature& feature) const;
+    bool isVisible(const tiles::MapTile::Feature& feature) const;
     /// Whether nothing of it is cut off.
-    bool isInside(const MapTile::Feature& feature) const;
+    bool isInside(const tiles::MapTile::Feature& feature) const;
     /// Rings, to be filled with Qt::WindingFill.
-    void addArea(const MapTile::Feature& feature, QPainterPath& path) const;
+    void addArea(const tiles::MapTile::Feature& feature, QPainterPath& path) const;
     /// The edges of an area as lines, without those that only cut it at the tile's edge. Closed ones end where they
     /// begin.
-    void eachEdge(const MapTile::Feature& feature, const LineReceiver& receive) const;
-    void eachLine(const MapTile::Feature& feature, const LineReceiver& receive) const;
+    void eachEdge(const tiles::MapTile::Feature& feature, const LineReceiver& receive) const;
+    void eachLine(const tiles::MapTile::Feature& feature, const LineReceiver& receive) const;
     /// The spots inside the window.
-    std::vector<QPointF> spots(const MapTile::Feature& feature) const;
+    std::vector<QPointF> spots(const tiles::MapTile::Feature& feature) const;
 
   private:
-    QPointF point(const MapTile::Spot& spot) const {
+    QPointF point(const tiles::MapTile::Spot& spot) const {
         return {visible_.square.x() + static_cast<double>(spot.x) * unit_,
                 visible_.square.y() + static_cast<double>(spot.y) * unit_};
     }

@@ -4,9 +4,9 @@
 #include <optional>
 #include <string>
 
-#include "linux/maps/TileKey.h"
-#include "linux/maps/TilesetFacts.h"
 #include "platform/ui/Image.h"
+#include "tiles/TileKey.h"
+#include "tiles/TilesetFacts.h"
 
 namespace ktr::linux_ {
 
@@ -26,10 +26,10 @@ class TilePictures {
     virtual int coarsest() const = 0;
     virtual int finest() const = 0;
     /// The part of the world that it covers; none for all.
-    virtual std::optional<TilesetFacts::Bounds> bounds() const { return std::nullopt; }
+    virtual std::optional<tiles::TilesetFacts::Bounds> bounds() const { return std::nullopt; }
     virtual std::string attribution() const = 0;
     /// `isWanted`: fetch it where that takes a while; else only what is at hand is of use.
-    virtual Answer tile(const TileKey& key, bool isWanted) = 0;
+    virtual Answer tile(const tiles::TileKey& key, bool isWanted) = 0;
     /// As MapGround's.
     virtual void setChangeHandler(std::function<void()> changed);
 };

@@ -73,11 +73,11 @@ std::string lineOf(const std::string& field) {
 TileStore::TileStore(fs::path root, const std::string& name, std::uint64_t mostBytes)
     : root_(std::move(root)), folder_(root_ / hashOf(name)), mostBytes_(mostBytes) {}
 
-fs::path TileStore::fileOf(const TileKey& key) const {
+fs::path TileStore::fileOf(const tiles::TileKey& key) const {
     return folder_ / std::to_string(key.z) / std::to_string(key.x) / (std::to_string(key.y) + ".tile");
 }
 
-std::optional<TileStore::Entry> TileStore::load(const TileKey& key) {
+std::optional<TileStore::Entry> TileStore::load(const tiles::TileKey& key) {
     const std::lock_guard lock(mutex_);
     const fs::path file = fileOf(key);
     std::ifstream stream(file, std::ios::binary);
@@ -99,7 +99,7 @@ std::optional<TileStore::Entry> TileStore::load(const TileKey& key) {
     return parsed(text);
 }
 
-void TileStore::save(const TileKey& key, const Entry& entry) {
+void TileStore::save(const tiles::TileKey& key, const Entry& entry) {
     if (entry.data.empty() || entry.data.size() > kLargestTile) {
         return;
     }

@@ -6,8 +6,8 @@
 #include <optional>
 #include <string>
 
-#include "linux/maps/TileKey.h"
 #include "platform/ui/Image.h"
+#include "tiles/TileKey.h"
 
 namespace ktr::linux_ {
 
@@ -28,12 +28,12 @@ class TileStore {
     /// `name` tells stores apart: the address that the tiles come from.
     TileStore(std::filesystem::path root, const std::string& name, std::uint64_t mostBytes);
 
-    std::optional<Entry> load(const TileKey& key);
+    std::optional<Entry> load(const tiles::TileKey& key);
     /// Failing to write loses the tile and nothing else.
-    void save(const TileKey& key, const Entry& entry);
+    void save(const tiles::TileKey& key, const Entry& entry);
 
   private:
-    std::filesystem::path fileOf(const TileKey& key) const;
+    std::filesystem::path fileOf(const tiles::TileKey& key) const;
     void trim();
 
     std::filesystem::path root_;

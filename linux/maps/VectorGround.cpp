@@ -1,4 +1,5 @@
 #include "linux/maps/VectorGround.h"
+#include "linux/maps/MbtilesLoader.h"
 
 #include <algorithm>
 #include <cmath>
@@ -6,14 +7,14 @@
 #include <system_error>
 #include <utility>
 
-#include "linux/maps/Gunzip.h"
 #include "linux/maps/MapLabels.h"
 #include "linux/maps/MapScale.h"
 #include "linux/maps/MapStyle.h"
 #include "linux/maps/VectorLabels.h"
 #include "linux/maps/VectorPainter.h"
-#include "linux/maps/VectorTileDecoder.h"
 #include "platform/base/Log.h"
+#include "tiles/Gunzip.h"
+#include "tiles/VectorTileDecoder.h"
 
 namespace ktr::linux_ {
 
@@ -43,9 +44,9 @@ bool VectorGround::open() {
     written_ = written;
     cache_.clear();
     std::string error;
-    file_ = MbtilesFile::open(path_, error);
+    file_ = MbtilesLoader::open(path_, error);
     if (file_) {
-        facts_ = TilesetFacts::of(file_->metadata());
+        facts_ = tiles::TilesetFacts::of(file_->metadata());
         const auto coarsest = facts_.coarsest ? facts_.coarsest : file_->coarsestLevel();
         const auto finest = facts_.finest ? facts_.finest : file_->finestLevel();
         if (!facts_.format.empty() && facts_.format != "pbf" && facts_.format != "mvt") {
@@ -65,7 +66,7 @@ bool VectorGround::open() {
     return file_ != nullptr;
 }
 
-std::shared_ptr<const MapTile> VectorGround::read(const TileKey& key, const std::string& language) {
+std::shared_ptr<const tiles::MapTile> VectorGround::read(const tiles::TileKey& key, const std::string& language) {
     if (language != language_) {
         cache_.clear();
         language_ = language;
@@ -73,22 +74,22 @@ std::shared_ptr<const MapTile> VectorGround::read(const TileKey& key, const std:
     if (const auto known = cache_.find(key)) {
         return *known;
     }
-    std::shared_ptr<const MapTile> tile;
+    std::shared_ptr<const tiles::MapTile> tile;
     if (const auto stored = file_->tile(key)) {
-        const auto unpacked =
-            gunzip({reinterpret_cast<const char*>(stored->data()), stored->size()}, VectorTileDecoder::kLargestTile);
+        const auto unpacked = tiles::gunzip({reinterpret_cast<const char*>(stored->data()), stored->size()},
+                                            tiles::VectorTileDecoder::kLargestTile);
         if (unpacked) {
-            tile =
-                VectorTileDecoder(language).decode({reinterpret_cast<const char*>(unpacked->data()), unpacked->size()});
+            tile = tiles::VectorTileDecoder(language).decode(
+                {reinterpret_cast<const char*>(unpacked->data()), unpacked->size()});
         }
     }
     cache_.put(key, tile);
     return tile;
 }
 
-std::optional<VectorGround::Found> VectorGround::find(const TileKey& key, const std::string& language) {
+std::optional<VectorGround::Found> VectorGround::find(const tiles::TileKey& key, const std::string& language) {
     for (int level = key.z; level >= coarsest_; --level) {
-        const TileKey parent = key.parent(level);
+        const tiles::TileKey parent = key.parent(level);
         if (auto tile = read(parent, language)) {
             return Found{std::move(tile), parent};
         }

@@ -10,10 +10,10 @@
 #include "linux/maps/LabelShaper.h"
 #include "linux/maps/MapGround.h"
 #include "linux/maps/MapTiles.h"
-#include "linux/maps/MbtilesFile.h"
 #include "linux/maps/TileCache.h"
 #include "linux/maps/TileGeometry.h"
-#include "linux/maps/TilesetFacts.h"
+#include "tiles/MbtilesFile.h"
+#include "tiles/TilesetFacts.h"
 
 namespace ktr::linux_ {
 
@@ -31,23 +31,23 @@ class VectorGround final : public MapGround {
 
   private:
     struct Found {
-        std::shared_ptr<const MapTile> tile;
-        TileKey key;  ///< of the tile found: the one asked for, or one of a coarser level
+        std::shared_ptr<const tiles::MapTile> tile;
+        tiles::TileKey key;  ///< of the tile found: the one asked for, or one of a coarser level
     };
 
     bool open();
-    std::shared_ptr<const MapTile> read(const TileKey& key, const std::string& language);
-    std::optional<Found> find(const TileKey& key, const std::string& language);
+    std::shared_ptr<const tiles::MapTile> read(const tiles::TileKey& key, const std::string& language);
+    std::optional<Found> find(const tiles::TileKey& key, const std::string& language);
     std::optional<VisibleTile> place(const PlacedTile& placed, const Found& found, const QRectF& shown) const;
     QRegion covered(const PlacedTile& placed) const;
 
     std::string path_;
-    std::shared_ptr<MbtilesFile> file_;
+    std::shared_ptr<tiles::MbtilesFile> file_;
     /// When the file was looked at last, and what it was then.
     std::optional<std::chrono::steady_clock::time_point> opened_;
     std::filesystem::file_time_type written_;
     std::string reported_;  ///< the last reason in the log
-    TilesetFacts facts_;
+    tiles::TilesetFacts facts_;
     int coarsest_ = 0;
     int finest_ = 0;
     std::string language_;  ///< of the names in the cache

@@ -26,8 +26,9 @@ constexpr std::size_t kMostStreetPieces = 10'000;
 constexpr int kColumns = 9;
 constexpr int kRows = 9;
 
-bool isRoad(MapKind kind) {
-    return kind == MapKind::Major || kind == MapKind::Secondary || kind == MapKind::Minor || kind == MapKind::Service;
+bool isRoad(tiles::MapKind kind) {
+    return kind == tiles::MapKind::Major || kind == tiles::MapKind::Secondary || kind == tiles::MapKind::Minor ||
+           kind == tiles::MapKind::Service;
 }
 
 double areaOf(const QPolygonF& ring) {
@@ -96,34 +97,34 @@ VectorLabels::VectorLabels(const MapDrawing& drawing, const std::vector<VisibleT
       scale_(scale),
       style_(MapStyle::of(drawing.request.isDark, drawing.request.isHighContrast)) {}
 
-LabelLook VectorLabels::lookOf(MapKind kind) const {
+LabelLook VectorLabels::lookOf(tiles::MapKind kind) const {
     LabelLook look{style_.label, style_.halo, kMinorSize * scale_.labelFactor()};
     switch (kind) {
-        case MapKind::Major:
+        case tiles::MapKind::Major:
             look.size = kMajorSize * scale_.labelFactor();
             break;
-        case MapKind::Secondary:
+        case tiles::MapKind::Secondary:
             look.size = kSecondarySize * scale_.labelFactor();
             break;
-        case MapKind::Park:
-        case MapKind::ParkName:
+        case tiles::MapKind::Park:
+        case tiles::MapKind::ParkName:
             look.color = style_.parkLabel;
             look.size = kParkSize * scale_.labelFactor();
             look.spacing = kSpacedLetters;
             break;
-        case MapKind::Water:
-        case MapKind::WaterName:
-        case MapKind::WaterLine:
+        case tiles::MapKind::Water:
+        case tiles::MapKind::WaterName:
+        case tiles::MapKind::WaterLine:
             look.color = style_.waterLabel;
             look.halo = style_.water;
             look.size = kWaterSize * scale_.labelFactor();
             look.spacing = kSpacedLetters;
             look.isSlanted = true;
             break;
-        case MapKind::PointOfInterest:
+        case tiles::MapKind::PointOfInterest:
             look.color = style_.pointOfInterest;
             break;
-        case MapKind::BoundaryName:
+        case tiles::MapKind::BoundaryName:
             look.color = style_.boundaryLabel;
             break;
         default:
@@ -132,11 +133,11 @@ LabelLook VectorLabels::lookOf(MapKind kind) const {
     return look;
 }
 
-LabelLook VectorLabels::lookOf(PlaceRank rank) const {
+LabelLook VectorLabels::lookOf(tiles::PlaceRank rank) const {
     static constexpr std::array<double, 9> kSizes = {13.0, 11.5, 14.0, 14.0, 13.0, 12.0, 11.5, 10.5, 10.5};
     LabelLook look{style_.label, style_.halo, kSizes[static_cast<std::size_t>(rank)]};
-    look.isBold = rank == PlaceRank::Capital || rank == PlaceRank::City;
-    if (rank == PlaceRank::Country || rank == PlaceRank::State) {
+    look.isBold = rank == tiles::PlaceRank::Capital || rank == tiles::PlaceRank::City;
+    if (rank == tiles::PlaceRank::Country || rank == tiles::PlaceRank::State) {
         look.color = style_.boundaryLabel;
         look.spacing = 1.0;
     }
@@ -152,12 +153,13 @@ void VectorLabels::collect(const VisibleTile& visible) {
     }
 }
 
-void VectorLabels::collectFeature(const TileGeometry& geometry, const MapTile::Feature& feature, Name name) {
-    if (feature.shape == MapTile::Shape::Lines) {
+void VectorLabels::collectFeature(const TileGeometry& geometry, const tiles::MapTile::Feature& feature, Name name) {
+    if (feature.shape == tiles::MapTile::Shape::Lines) {
         if (streetPieces_ >= kMostStreetPieces) {
             return;
         }
-        if (isRoad(feature.kind) || feature.kind == MapKind::WaterLine || feature.kind == MapKind::WaterName) {
+        if (isRoad(feature.kind) || feature.kind == tiles::MapKind::WaterLine ||
+            feature.kind == tiles::MapKind::WaterName) {
             auto& street = streets_[name];
             street.kind = street.pieces.empty() ? feature.kind : std::max(street.kind, feature.kind);
             geometry.eachLine(feature, [&](const QPolygonF& piece, double /*from*/) {
@@ -167,9 +169,10 @@ void VectorLabels::collectFeature(const TileGeometry& geometry, const MapTile::F
                 }
             });
         }
-    } else if (feature.shape == MapTile::Shape::Areas) {
+    } else if (feature.shape == tiles::MapTile::Shape::Areas) {
         if (areas_.size() < kMostAreas &&
-            (feature.kind == MapKind::Water || feature.kind == MapKind::Park || feature.kind == MapKind::Square)) {
+            (feature.kind == tiles::MapKind::Water || feature.kind == tiles::MapKind::Park ||
+             feature.kind == tiles::MapKind::Square)) {
             auto& path = areas_[{feature.kind, name}];
             path.setFillRule(Qt::WindingFill);
             geometry.addArea(feature, path);
@@ -177,7 +180,8 @@ void VectorLabels::collectFeature(const TileGeometry& geometry, const MapTile::F
     } else {
         const auto inside = geometry.spots(feature);
         if (!inside.empty()) {
-            const auto rank = feature.kind == MapKind::Place ? static_cast<PlaceRank>(feature.rank) : PlaceRank::Hamlet;
+            const auto rank = feature.kind == tiles::MapKind::Place ? static_cast<tiles::PlaceRank>(feature.rank)
+                                                                    : tiles::PlaceRank::Hamlet;
             spots_.try_emplace({feature.kind, name}, Spot{feature.kind, rank, inside.front()});
         }
     }
@@ -195,18 +199,18 @@ void VectorLabels::place(MapLabels& labels) {
         street.length = street.pieces.empty() ? 0.0 : lengthOf(street.pieces.front());
     }
     placePlaces(labels);
-    placeStreets(labels, MapKind::Major);
-    placeSpots(labels, MapKind::WaterName);
-    placeAreas(labels, MapKind::Water);
-    placeSpots(labels, MapKind::ParkName);
-    placeAreas(labels, MapKind::Park);
-    placeStreets(labels, MapKind::Secondary);
-    placeStreets(labels, MapKind::WaterName);
-    placeStreets(labels, MapKind::WaterLine);
-    placeStreets(labels, MapKind::Minor);
-    placeSpots(labels, MapKind::PointOfInterest);
-    placeAreas(labels, MapKind::Square);
-    placeStreets(labels, MapKind::Service);
+    placeStreets(labels, tiles::MapKind::Major);
+    placeSpots(labels, tiles::MapKind::WaterName);
+    placeAreas(labels, tiles::MapKind::Water);
+    placeSpots(labels, tiles::MapKind::ParkName);
+    placeAreas(labels, tiles::MapKind::Park);
+    placeStreets(labels, tiles::MapKind::Secondary);
+    placeStreets(labels, tiles::MapKind::WaterName);
+    placeStreets(labels, tiles::MapKind::WaterLine);
+    placeStreets(labels, tiles::MapKind::Minor);
+    placeSpots(labels, tiles::MapKind::PointOfInterest);
+    placeAreas(labels, tiles::MapKind::Square);
+    placeStreets(labels, tiles::MapKind::Service);
 }
 
 bool VectorLabels::mayTry() {
@@ -216,7 +220,7 @@ bool VectorLabels::mayTry() {
 void VectorLabels::placePlaces(MapLabels& labels) {
     std::vector<std::pair<Name, const Spot*>> places;
     for (const auto& [key, spot] : spots_) {
-        if (spot.kind == MapKind::Place && scale_.showsPlace(spot.rank)) {
+        if (spot.kind == tiles::MapKind::Place && scale_.showsPlace(spot.rank)) {
             places.emplace_back(key.second, &spot);
         }
     }
@@ -232,7 +236,7 @@ void VectorLabels::placePlaces(MapLabels& labels) {
     }
 }
 
-void VectorLabels::placeStreets(MapLabels& labels, MapKind kind) {
+void VectorLabels::placeStreets(MapLabels& labels, tiles::MapKind kind) {
     std::vector<std::pair<Name, const Street*>> streets;
     for (const auto& [name, street] : streets_) {
         if (street.kind == kind) {
@@ -251,8 +255,9 @@ void VectorLabels::placeStreets(MapLabels& labels, MapKind kind) {
     }
 }
 
-void VectorLabels::placeAreas(MapLabels& labels, MapKind kind) {
-    const MapKind spotKind = kind == MapKind::Water ? MapKind::WaterName : MapKind::ParkName;
+void VectorLabels::placeAreas(MapLabels& labels, tiles::MapKind kind) {
+    const tiles::MapKind spotKind =
+        kind == tiles::MapKind::Water ? tiles::MapKind::WaterName : tiles::MapKind::ParkName;
     const LabelLook look = lookOf(kind);
     std::vector<std::pair<double, Name>> areas;
     for (const auto& [key, path] : areas_) {
@@ -278,13 +283,13 @@ void VectorLabels::placeAreas(MapLabels& labels, MapKind kind) {
         bool isPlaced = std::any_of(spots.begin(), spots.end(), [&, text = std::string(name)](const QPointF& spot) {
             return holds(path, spot, label) && labels.placeAt(text, look, spot);
         });
-        if (!isPlaced && kind == MapKind::Park) {
+        if (!isPlaced && kind == tiles::MapKind::Park) {
             isPlaced = labels.placeAt(std::string(name), look, spots.front());
         }
     }
 }
 
-void VectorLabels::placeSpots(MapLabels& labels, MapKind kind) {
+void VectorLabels::placeSpots(MapLabels& labels, tiles::MapKind kind) {
     const LabelLook look = lookOf(kind);
     for (const auto& [key, spot] : spots_) {
         if (spot.kind != kind) {

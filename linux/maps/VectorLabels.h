@@ -26,37 +26,37 @@ class VectorLabels {
 
   private:
     struct Street {
-        MapKind kind = MapKind::Service;  ///< the highest of its pieces
+        tiles::MapKind kind = tiles::MapKind::Service;  ///< the highest of its pieces
         std::vector<QPolygonF> pieces;
         double length = 0.0;  ///< of the longest way through it, once it is joined
     };
     struct Spot {
-        MapKind kind;
-        PlaceRank rank;
+        tiles::MapKind kind;
+        tiles::PlaceRank rank;
         QPointF point;
     };
     using Name = std::string_view;  ///< of a tile
 
     void collect(const VisibleTile& visible);
-    void collectFeature(const TileGeometry& geometry, const MapTile::Feature& feature, Name name);
+    void collectFeature(const TileGeometry& geometry, const tiles::MapTile::Feature& feature, Name name);
     void placePlaces(MapLabels& labels);
-    void placeStreets(MapLabels& labels, MapKind kind);
-    void placeAreas(MapLabels& labels, MapKind kind);
-    void placeSpots(MapLabels& labels, MapKind kind);
+    void placeStreets(MapLabels& labels, tiles::MapKind kind);
+    void placeAreas(MapLabels& labels, tiles::MapKind kind);
+    void placeSpots(MapLabels& labels, tiles::MapKind kind);
     /// Whether one more label may be tried.
     bool mayTry();
-    LabelLook lookOf(MapKind kind) const;
-    LabelLook lookOf(PlaceRank rank) const;
+    LabelLook lookOf(tiles::MapKind kind) const;
+    LabelLook lookOf(tiles::PlaceRank rank) const;
 
     const MapDrawing& drawing_;
     const std::vector<VisibleTile>& tiles_;
     const MapScale& scale_;
     const MapStyle& style_;
     std::map<Name, Street> streets_;
-    std::map<std::pair<MapKind, Name>, QPainterPath> areas_;
-    std::map<std::pair<MapKind, Name>, Spot> spots_;
+    std::map<std::pair<tiles::MapKind, Name>, QPainterPath> areas_;
+    std::map<std::pair<tiles::MapKind, Name>, Spot> spots_;
     /// Parks and waters that have their name.
-    std::vector<std::pair<MapKind, Name>> named_;
+    std::vector<std::pair<tiles::MapKind, Name>> named_;
     std::size_t streetPieces_ = 0;
     int tries_ = 0;
 };

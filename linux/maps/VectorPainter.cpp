@@ -13,10 +13,10 @@ constexpr int kMostElements = 20'000;
 
 /// The features of one kind: they stand together.
 template <class Receiver>
-void eachOf(const MapTile& tile, MapKind kind, const Receiver& receive) {
-    const auto first =
-        std::lower_bound(tile.features.begin(), tile.features.end(), kind,
-                         [](const MapTile::Feature& feature, MapKind wanted) { return feature.kind < wanted; });
+void eachOf(const tiles::MapTile& tile, tiles::MapKind kind, const Receiver& receive) {
+    const auto first = std::lower_bound(
+        tile.features.begin(), tile.features.end(), kind,
+        [](const tiles::MapTile::Feature& feature, tiles::MapKind wanted) { return feature.kind < wanted; });
     for (auto feature = first; feature != tile.features.end() && feature->kind == kind; ++feature) {
         receive(*feature);
     }
@@ -36,10 +36,10 @@ VectorPainter::VectorPainter(const MapDrawing& drawing, const std::vector<Visibl
       budget_(drawing),
       style_(MapStyle::of(drawing.request.isDark, drawing.request.isHighContrast)) {}
 
-void VectorPainter::each(MapKind kind, MapTile::Shape shape, const Receiver& receive) const {
+void VectorPainter::each(tiles::MapKind kind, tiles::MapTile::Shape shape, const Receiver& receive) const {
     for (const auto& visible : tiles_) {
         const TileGeometry geometry(visible);
-        eachOf(*visible.tile, kind, [&](const MapTile::Feature& feature) {
+        eachOf(*visible.tile, kind, [&](const tiles::MapTile::Feature& feature) {
             if (feature.shape == shape && geometry.isVisible(feature)) {
                 receive(geometry, feature);
             }
@@ -47,15 +47,15 @@ void VectorPainter::each(MapKind kind, MapTile::Shape shape, const Receiver& rec
     }
 }
 
-std::vector<QPolygonF> VectorPainter::lines(MapKind kind) const {
+std::vector<QPolygonF> VectorPainter::lines(tiles::MapKind kind) const {
     std::vector<QPolygonF> pieces;
-    each(kind, MapTile::Shape::Lines, [&](const TileGeometry& geometry, const MapTile::Feature& feature) {
+    each(kind, tiles::MapTile::Shape::Lines, [&](const TileGeometry& geometry, const tiles::MapTile::Feature& feature) {
         geometry.eachLine(feature, [&](const QPolygonF& piece, double /*from*/) { pieces.push_back(piece); });
     });
     return pieces;
 }
 
-void VectorPainter::fill(MapKind kind, const QColor& color) {
+void VectorPainter::fill(tiles::MapKind kind, const QColor& color) {
     // What is cut at a tile's edge is filled as one surface: no seam. The rest is filled piece by piece: the painter's
     // time grows faster than the size of a surface.
     QPainterPath cut;
@@ -65,7 +65,7 @@ void VectorPainter::fill(MapKind kind, const QColor& color) {
             painter_.fillPath(path, color);
         }
     };
-    each(kind, MapTile::Shape::Areas, [&](const TileGeometry& geometry, const MapTile::Feature& feature) {
+    each(kind, tiles::MapTile::Shape::Areas, [&](const TileGeometry& geometry, const tiles::MapTile::Feature& feature) {
         if (!geometry.isInside(feature)) {
             geometry.addArea(feature, cut);
             if (cut.elementCount() > kMostElements) {
@@ -82,9 +82,9 @@ void VectorPainter::fill(MapKind kind, const QColor& color) {
     fillPath(cut);
 }
 
-void VectorPainter::strokeEdges(MapKind kind, const QColor& color, double width) {
+void VectorPainter::strokeEdges(tiles::MapKind kind, const QColor& color, double width) {
     painter_.setPen(roundPen(color, width));
-    each(kind, MapTile::Shape::Areas, [&](const TileGeometry& geometry, const MapTile::Feature& feature) {
+    each(kind, tiles::MapTile::Shape::Areas, [&](const TileGeometry& geometry, const tiles::MapTile::Feature& feature) {
         geometry.eachEdge(feature, [&](const QPolygonF& piece, double /*from*/) { strokeLine(piece, width); });
     });
 }
@@ -114,21 +114,21 @@ void VectorPainter::draw() {
         }
         (this->*step)();
     }
-    drawDashed(MapKind::Boundary, style_.boundary, MapStyle::kBoundaryWidth * scale_.lineFactor(),
+    drawDashed(tiles::MapKind::Boundary, style_.boundary, MapStyle::kBoundaryWidth * scale_.lineFactor(),
                {7.0, 3.0, 1.5, 3.0});
 }
 
 void VectorPainter::drawSurfaces() {
-    fill(MapKind::BuiltUp, style_.builtUp);
+    fill(tiles::MapKind::BuiltUp, style_.builtUp);
     // Edges first, twice as wide, then the surface: where areas touch, no line divides them.
-    strokeEdges(MapKind::Park, style_.parkEdge, 2.0 * MapStyle::kParkEdgeWidth);
-    fill(MapKind::Park, style_.park);
+    strokeEdges(tiles::MapKind::Park, style_.parkEdge, 2.0 * MapStyle::kParkEdgeWidth);
+    fill(tiles::MapKind::Park, style_.park);
     drawWater();
-    fill(MapKind::Square, style_.square);
-    fill(MapKind::Pier, style_.pier);
+    fill(tiles::MapKind::Square, style_.square);
+    fill(tiles::MapKind::Pier, style_.pier);
     const double pier = std::clamp(5.0 / scale_.metresPerPoint(), 0.8, 8.0);
     painter_.setPen(QPen(style_.pier, pier, Qt::SolidLine, Qt::FlatCap, Qt::RoundJoin));
-    for (const auto& piece : lines(MapKind::PierLine)) {
+    for (const auto& piece : lines(tiles::MapKind::PierLine)) {
         strokeLine(piece, pier);
     }
 }
@@ -140,44 +140,45 @@ void VectorPainter::drawWater() {
         double width;
     };
     std::vector<River> rivers;
-    each(MapKind::WaterLine, MapTile::Shape::Lines, [&](const TileGeometry& geometry, const MapTile::Feature& feature) {
-        const double width = scale_.waterLine(feature.rank);
-        if (width > 0.0) {
-            geometry.eachLine(feature, [&](const QPolygonF& piece, double /*from*/) {
-                rivers.push_back({piece, width});
-            });
-        }
-    });
+    each(tiles::MapKind::WaterLine, tiles::MapTile::Shape::Lines,
+         [&](const TileGeometry& geometry, const tiles::MapTile::Feature& feature) {
+             const double width = scale_.waterLine(feature.rank);
+             if (width > 0.0) {
+                 geometry.eachLine(feature, [&](const QPolygonF& piece, double /*from*/) {
+                     rivers.push_back({piece, width});
+                 });
+             }
+         });
     const auto drawRivers = [&](const QColor& color, double more) {
         for (const auto& river : rivers) {
             painter_.setPen(roundPen(color, river.width + more));
             strokeLine(river.line, river.width + more);
         }
     };
-    strokeEdges(MapKind::Water, style_.shore, 2.0 * shore);
+    strokeEdges(tiles::MapKind::Water, style_.shore, 2.0 * shore);
     drawRivers(style_.shore, shore);
-    fill(MapKind::Water, style_.water);
+    fill(tiles::MapKind::Water, style_.water);
     drawRivers(style_.water, 0.0);
 }
 
 void VectorPainter::drawBuildings() {
     if (scale_.showsBuildings()) {
-        fill(MapKind::Building, style_.building);
-        strokeEdges(MapKind::Building, style_.buildingEdge, MapStyle::kBuildingEdgeWidth);
+        fill(tiles::MapKind::Building, style_.building);
+        strokeEdges(tiles::MapKind::Building, style_.buildingEdge, MapStyle::kBuildingEdgeWidth);
     }
 }
 
 void VectorPainter::drawRoads() {
-    drawDashed(MapKind::Path, style_.path, scale_.road(MapKind::Path).fill, {3.0, 2.4});
+    drawDashed(tiles::MapKind::Path, style_.path, scale_.road(tiles::MapKind::Path).fill, {3.0, 2.4});
     struct Class {
-        MapKind kind;
+        tiles::MapKind kind;
         QColor fill, casing;
         std::vector<QPolygonF> pieces;
     };
-    std::array<Class, 4> classes = {{{MapKind::Service, style_.minor, style_.minorCasing, {}},
-                                     {MapKind::Minor, style_.minor, style_.minorCasing, {}},
-                                     {MapKind::Secondary, style_.secondary, style_.secondaryCasing, {}},
-                                     {MapKind::Major, style_.major, style_.majorCasing, {}}}};
+    std::array<Class, 4> classes = {{{tiles::MapKind::Service, style_.minor, style_.minorCasing, {}},
+                                     {tiles::MapKind::Minor, style_.minor, style_.minorCasing, {}},
+                                     {tiles::MapKind::Secondary, style_.secondary, style_.secondaryCasing, {}},
+                                     {tiles::MapKind::Major, style_.major, style_.majorCasing, {}}}};
     for (auto& road : classes) {
         if (scale_.road(road.kind).fill > 0.0) {
             road.pieces = lines(road.kind);
@@ -189,7 +190,8 @@ void VectorPainter::drawRoads() {
     }
 }
 
-void VectorPainter::drawDashed(MapKind kind, const QColor& color, double width, const std::vector<double>& dashes) {
+void VectorPainter::drawDashed(tiles::MapKind kind, const QColor& color, double width,
+                               const std::vector<double>& dashes) {
     if (width <= 0.0) {
         return;
     }
@@ -201,7 +203,7 @@ void VectorPainter::drawDashed(MapKind kind, const QColor& color, double width, 
         period += dash;
     }
     pen.setDashPattern(pattern);
-    each(kind, MapTile::Shape::Lines, [&](const TileGeometry& geometry, const MapTile::Feature& feature) {
+    each(kind, tiles::MapTile::Shape::Lines, [&](const TileGeometry& geometry, const tiles::MapTile::Feature& feature) {
         geometry.eachLine(feature, [&](const QPolygonF& piece, double from) {
             pen.setDashOffset(std::fmod(from, period) / width);
             painter_.setPen(pen);
@@ -212,9 +214,9 @@ void VectorPainter::drawDashed(MapKind kind, const QColor& color, double width, 
 
 void VectorPainter::drawRails() {
     const double factor = scale_.lineFactor();
-    strokeLines(lines(MapKind::Rail), style_.rail, MapStyle::kRailWidth * factor);
+    strokeLines(lines(tiles::MapKind::Rail), style_.rail, MapStyle::kRailWidth * factor);
     if (factor >= 0.75) {
-        drawDashed(MapKind::Rail, style_.railInner, MapStyle::kRailInnerWidth * factor, {6.0, 6.0});
+        drawDashed(tiles::MapKind::Rail, style_.railInner, MapStyle::kRailInnerWidth * factor, {6.0, 6.0});
     }
 }
 

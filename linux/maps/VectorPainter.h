@@ -21,19 +21,19 @@ class VectorPainter {
     void draw();
 
   private:
-    using Receiver = std::function<void(const TileGeometry&, const MapTile::Feature&)>;
+    using Receiver = std::function<void(const TileGeometry&, const tiles::MapTile::Feature&)>;
 
-    void each(MapKind kind, MapTile::Shape shape, const Receiver& receive) const;
-    std::vector<QPolygonF> lines(MapKind kind) const;
-    void fill(MapKind kind, const QColor& color);
-    void strokeEdges(MapKind kind, const QColor& color, double width);
+    void each(tiles::MapKind kind, tiles::MapTile::Shape shape, const Receiver& receive) const;
+    std::vector<QPolygonF> lines(tiles::MapKind kind) const;
+    void fill(tiles::MapKind kind, const QColor& color);
+    void strokeEdges(tiles::MapKind kind, const QColor& color, double width);
     void strokeLine(const QPolygonF& piece, double width);
     void strokeLines(const std::vector<QPolygonF>& pieces, const QColor& color, double width);
     void drawSurfaces();
     void drawWater();
     void drawBuildings();
     void drawRoads();
-    void drawDashed(MapKind kind, const QColor& color, double width, const std::vector<double>& dashes);
+    void drawDashed(tiles::MapKind kind, const QColor& color, double width, const std::vector<double>& dashes);
     void drawRails();
 
     const MapDrawing& drawing_;

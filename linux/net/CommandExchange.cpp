@@ -8,7 +8,7 @@
 #include <utility>
 #include <variant>
 
-#include "linux/json/JsonReader.h"
+#include "documents/JsonReader.h"
 #include "linux/net/OneShotBody.h"
 
 namespace ktr::linux_ {
@@ -181,7 +181,7 @@ void CommandExchange::replyFinished() {
         return;
     }
     if (isSuccess(answer.status)) {
-        auto read = JsonReader::read({received_.constData(), static_cast<std::size_t>(received_.size())});
+        auto read = documents::JsonReader::read({received_.constData(), static_cast<std::size_t>(received_.size())});
         if (auto* value = std::get_if<platform::Value>(&read)) {
             answer.json = std::move(*value);
         }

@@ -4,9 +4,9 @@
 
 #include "linux/positions/GeoClueSource.h"
 #include "linux/positions/GpsdSource.h"
+#include "linux/positions/ScenarioLocationManagerFactory.h"
 #include "linux/positions/SourceLocationManagerFactory.h"
 #include "linux/positions/TrackReader.h"
-#include "linux/services/ScenarioLocationManagerFactory.h"
 #include "platform/base/Log.h"
 
 namespace ktr::linux_ {

@@ -2,7 +2,7 @@
 
 #include <memory>
 
-#include "linux/account/Configuration.h"
+#include "linux/configuration/Configuration.h"
 #include "platform/base/Clock.h"
 #include "platform/base/MainLoop.h"
 #include "platform/location/Geodesy.h"

@@ -4,7 +4,7 @@
 #include <variant>
 #include <vector>
 
-#include "linux/services/ScenarioLocationManager.h"
+#include "linux/positions/ScenarioLocationManager.h"
 
 namespace ktr::linux_ {
 

@@ -2,7 +2,7 @@
 #include <cstdint>
 #include <string_view>
 
-#include "linux/json/JsonReader.h"
+#include "documents/JsonReader.h"
 #include "platform/base/Utf8.h"
 #include "plugin/VAKTRMultipleLocationsSnippetController.h"
 #include "plugin/VAKTRVisibilityController.h"
@@ -41,7 +41,7 @@ platform::HttpAnswer answerOf(const std::uint8_t* data, std::size_t size) {
         answer.json = Value(fuzz::DictionaryMaker(data + 1, size - 1).answer());
         return answer;
     }
-    auto read = linux_::JsonReader::read({reinterpret_cast<const char*>(data + 1), size - 1});
+    auto read = documents::JsonReader::read({reinterpret_cast<const char*>(data + 1), size - 1});
     if (auto* value = std::get_if<Value>(&read)) {
         answer.json = std::move(*value);
     }

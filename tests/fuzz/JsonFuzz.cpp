@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <string_view>
 
-#include "linux/json/JsonReader.h"
+#include "documents/JsonReader.h"
 #include "platform/base/Json.h"
 #include "platform/base/Utf8.h"
 #include "tests/fuzz/Require.h"
@@ -13,11 +13,11 @@
 
 namespace {
 
+using ktr::documents::JsonError;
+using ktr::documents::JsonPath;
+using ktr::documents::JsonPosition;
+using ktr::documents::JsonReader;
 using ktr::fuzz::require;
-using ktr::linux_::JsonError;
-using ktr::linux_::JsonPath;
-using ktr::linux_::JsonPosition;
-using ktr::linux_::JsonReader;
 using ktr::platform::Value;
 
 std::size_t depthOf(const Value& value) {
@@ -93,7 +93,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         return 0;
     }
     const auto& value = std::get<Value>(read);
-    require(depthOf(value) <= ktr::linux_::kDeepestJson, "nothing is nested deeper than the limit");
+    require(depthOf(value) <= ktr::documents::kDeepestJson, "nothing is nested deeper than the limit");
     requireInside(JsonReader::locate(text, lastPath(value)), text);
     const std::string written = ktr::platform::writeJson(value);
     const auto again = JsonReader::read(written);

@@ -3,10 +3,10 @@
 #include <cstdint>
 #include <string_view>
 
-#include "linux/maps/Gunzip.h"
-#include "linux/maps/VectorTileDecoder.h"
 #include "platform/base/Utf8.h"
 #include "tests/fuzz/Require.h"
+#include "tiles/Gunzip.h"
+#include "tiles/VectorTileDecoder.h"
 
 // Any bytes as a stored vector tile: read or refused within its caps, and what was read refers to nothing beyond
 // itself.
@@ -14,8 +14,8 @@
 namespace {
 
 using ktr::fuzz::require;
-using ktr::linux_::MapTile;
-using ktr::linux_::VectorTileDecoder;
+using ktr::tiles::MapTile;
+using ktr::tiles::VectorTileDecoder;
 
 void check(const MapTile& tile) {
     require(tile.features.size() <= VectorTileDecoder::kMostFeatures, "features are capped");
@@ -31,11 +31,11 @@ void check(const MapTile& tile) {
     for (const auto& name : tile.names) {
         require(name.size() <= VectorTileDecoder::kLongestName && ktr::platform::isValidUtf8(name), "names are text");
     }
-    auto kind = ktr::linux_::MapKind::BuiltUp;
+    auto kind = tiles::MapKind::BuiltUp;
     for (const auto& feature : tile.features) {
         require(feature.kind >= kind, "features are sorted");
         kind = feature.kind;
-        require(static_cast<std::size_t>(feature.kind) < ktr::linux_::kMapKinds, "kinds are known");
+        require(static_cast<std::size_t>(feature.kind) < tiles::kMapKinds, "kinds are known");
         require(feature.partCount > 0 && feature.firstPart + feature.partCount <= tile.partEnds.size(),
                 "a feature has its parts");
         require(feature.name < static_cast<std::int32_t>(tile.names.size()), "a feature has its name");
@@ -47,7 +47,7 @@ void check(const MapTile& tile) {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     constexpr std::size_t kLargest = std::size_t{1} << 20;
-    const auto unpacked = ktr::linux_::gunzip({reinterpret_cast<const char*>(data), size}, kLargest);
+    const auto unpacked = tiles::gunzip({reinterpret_cast<const char*>(data), size}, kLargest);
     if (!unpacked) {
         return 0;
     }

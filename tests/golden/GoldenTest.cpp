@@ -10,10 +10,10 @@
 #include <memory>
 
 #include "app/CommandLine.h"
-#include "app/Host.h"
 #include "app/RenderCommand.h"
-#include "app/ScenarioReader.h"
-#include "linux/ui/FontSetup.h"
+#include "host/Host.h"
+#include "host/scenario/ScenarioReader.h"
+#include "linux/paint/FontSetup.h"
 #include "tests/golden/GoldenCase.h"
 #include "tests/golden/PictureComparison.h"
 #include "tests/support/TreeDump.h"
@@ -58,19 +58,20 @@ class GoldenTest : public ::testing::TestWithParam<GoldenCase> {
         const auto& own = GetParam().arguments;
         arguments.insert(arguments.end(), own.begin(), own.end());
         arguments.insert(arguments.end(),
-                         {"-o", resultPath(GetParam().name + ".png").toStdString(), "--plugin", KTR_PLUGIN_PATH});
+                         {"-o", resultPath(GetParam().name + ".png").toStdString(), "--plugin", KTR_PLUGIN_FILE});
         const auto parsed = app::CommandLine::parse(arguments);
         ASSERT_TRUE(std::holds_alternative<app::Options>(parsed)) << std::get<app::CommandLine::Ending>(parsed).text;
         options = std::get<app::Options>(parsed);
-        auto scenario = app::ScenarioReader(kNow).readFile(options.scenarios.front());
-        ASSERT_TRUE(std::holds_alternative<app::Scenario>(scenario)) << std::get<app::ScenarioError>(scenario).text();
-        const std::vector<app::Scenario> scenarios = {std::get<app::Scenario>(scenario)};
+        auto scenario = host::ScenarioReader(kNow).readFile(options.scenarios.front());
+        ASSERT_TRUE(std::holds_alternative<host::Scenario>(scenario))
+            << std::get<documents::DocumentError>(scenario).text();
+        const std::vector<host::Scenario> scenarios = {std::get<host::Scenario>(scenario)};
         ASSERT_TRUE(scenarios.front().clock) << "a golden scenario needs a clock of its own";
-        auto settings = app::HostSettings::decide(options, scenarios, {kNow, 0});
-        ASSERT_TRUE(std::holds_alternative<app::HostSettings>(settings)) << std::get<app::Failure>(settings).line;
-        auto made = app::Host::make(std::get<app::HostSettings>(settings), app::Host::Time::Virtual, options.plugin);
-        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<app::Host>>(made)) << std::get<app::Failure>(made).line;
-        host = std::move(std::get<std::unique_ptr<app::Host>>(made));
+        auto settings = host::HostSettings::decide(options, scenarios, {kNow, 0});
+        ASSERT_TRUE(std::holds_alternative<host::HostSettings>(settings)) << std::get<host::Failure>(settings).line;
+        auto made = host::Host::make(std::get<host::HostSettings>(settings), host::Host::Time::Virtual, options.plugin);
+        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made)) << std::get<host::Failure>(made).line;
+        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
         const auto failure = host->addTurn(scenarios.front());
         ASSERT_FALSE(failure) << failure->line;
     }
@@ -123,7 +124,7 @@ class GoldenTest : public ::testing::TestWithParam<GoldenCase> {
     }
 
     app::Options options;
-    std::unique_ptr<app::Host> host;
+    std::unique_ptr<host::Host> host;
 };
 
 TEST_P(GoldenTest, LooksAndReadsAsItDid) {

@@ -13,9 +13,9 @@
 #include <numbers>
 
 #include "app/CommandLine.h"
-#include "app/Host.h"
 #include "app/RenderCommand.h"
-#include "app/ScenarioReader.h"
+#include "host/Host.h"
+#include "host/scenario/ScenarioReader.h"
 
 namespace ktr::test {
 
@@ -87,16 +87,17 @@ class MapSpotTest : public ::testing::TestWithParam<double> {
     QImage render(const std::string& path) {
         const std::string picture = folder_.filePath(QStringLiteral("ann.png")).toStdString();
         const auto parsed = app::CommandLine::parse(
-            {"render", path, "-o", picture, "--scale", std::to_string(GetParam()), "--plugin", KTR_PLUGIN_PATH});
+            {"render", path, "-o", picture, "--scale", std::to_string(GetParam()), "--plugin", KTR_PLUGIN_FILE});
         const auto* options = std::get_if<app::Options>(&parsed);
-        auto read = app::ScenarioReader({0.0}).readFile(path);
-        const auto* scenario = std::get_if<app::Scenario>(&read);
+        auto read = host::ScenarioReader({0.0}).readFile(path);
+        const auto* scenario = std::get_if<host::Scenario>(&read);
         if (options == nullptr || scenario == nullptr) {
             return {};
         }
-        const auto settings = app::HostSettings::decide(*options, {*scenario}, {});
-        auto made = app::Host::make(std::get<app::HostSettings>(settings), app::Host::Time::Virtual, options->plugin);
-        const auto& host = std::get<std::unique_ptr<app::Host>>(made);
+        const auto settings = host::HostSettings::decide(*options, {*scenario}, {});
+        auto made =
+            host::Host::make(std::get<host::HostSettings>(settings), host::Host::Time::Virtual, options->plugin);
+        const auto& host = std::get<std::unique_ptr<host::Host>>(made);
         if (host->addTurn(*scenario) || app::RenderCommand(*host).write(picture)) {
             return {};
         }

@@ -14,7 +14,7 @@
 namespace ktr::test {
 
 using linux_::HttpsPictures;
-using linux_::TileKey;
+using tiles::TileKey;
 
 namespace {
 

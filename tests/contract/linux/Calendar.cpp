@@ -1,4 +1,4 @@
-#include "linux/services/LocalCalendar.h"
+#include "linux/locale/LocalCalendar.h"
 #include "tests/contract/CalendarContract.h"
 #include "tests/support/EnvironmentVariable.h"
 

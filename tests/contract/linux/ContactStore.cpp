@@ -1,7 +1,7 @@
 #include <QFile>
 #include <QTemporaryDir>
 
-#include "linux/services/VCardContactStore.h"
+#include "linux/contacts/VCardContactStore.h"
 #include "tests/contract/ContactStoreContract.h"
 #include "tests/support/RecordingLogSink.h"
 

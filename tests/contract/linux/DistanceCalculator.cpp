@@ -1,5 +1,5 @@
-#include "linux/services/GeographicLibGeodesy.h"
-#include "linux/services/IcuDistanceCalculatorFactory.h"
+#include "linux/locale/IcuDistanceCalculatorFactory.h"
+#include "linux/positions/GeographicLibGeodesy.h"
 #include "tests/contract/DistanceCalculatorContract.h"
 
 namespace ktr::test {

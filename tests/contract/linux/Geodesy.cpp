@@ -1,4 +1,4 @@
-#include "linux/services/GeographicLibGeodesy.h"
+#include "linux/positions/GeographicLibGeodesy.h"
 #include "tests/contract/GeodesyContract.h"
 
 namespace ktr::test {

@@ -3,7 +3,7 @@
 #include <QProcess>
 #include <QTemporaryDir>
 
-#include "linux/services/QtLocalization.h"
+#include "linux/locale/QtLocalization.h"
 #include "tests/contract/LocalizationContract.h"
 
 namespace ktr::test {

@@ -1,6 +1,6 @@
+#include "linux/positions/GeographicLibGeodesy.h"
+#include "linux/positions/ScenarioLocationManagerFactory.h"
 #include "linux/positions/SourceLocationManagerFactory.h"
-#include "linux/services/GeographicLibGeodesy.h"
-#include "linux/services/ScenarioLocationManagerFactory.h"
 #include "tests/contract/LocationManagerContract.h"
 
 namespace ktr::test {

@@ -3,7 +3,7 @@
 #include <QEventLoop>
 #include <QTimer>
 
-#include "linux/services/QtMainLoop.h"
+#include "linux/device/QtMainLoop.h"
 #include "tests/contract/MainLoopContract.h"
 
 namespace ktr::test {

@@ -1,4 +1,4 @@
-#include "linux/services/IcuNumberFormatter.h"
+#include "linux/locale/IcuNumberFormatter.h"
 #include "tests/contract/NumberFormatterContract.h"
 
 namespace ktr::test {

@@ -3,7 +3,7 @@
 #include <QGuiApplication>
 #include <memory>
 
-#include "linux/ui/FontSetup.h"
+#include "linux/paint/FontSetup.h"
 
 // Programs that link this have an application with the pinned fonts while their tests run.
 

@@ -3,7 +3,7 @@
 #include <QApplication>
 #include <memory>
 
-#include "linux/ui/FontSetup.h"
+#include "linux/paint/FontSetup.h"
 
 // The tests of the program have an application for widgets, off screen and with the pinned fonts.
 

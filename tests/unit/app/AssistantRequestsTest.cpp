@@ -1,21 +1,21 @@
 // Questions that ask for something: fences, and the user's own sharing.
 #include <gtest/gtest.h>
 
-#include "app/ScenarioReader.h"
-#include "app/serve/AssistantAnswers.h"
-#include "app/serve/FriendsReader.h"
+#include "host/scenario/ScenarioReader.h"
 #include "platform/assistant/VASnippet.h"
 #include "platform/base/Json.h"
+#include "serve/AssistantAnswers.h"
+#include "serve/FriendsReader.h"
 
 namespace ktr::test {
 
-using app::AssistantAnswers;
-using app::LocationService;
+using serve::AssistantAnswers;
+using serve::LocationService;
 
 class AssistantRequestsTest : public ::testing::Test {
   protected:
     static LocationService people() {
-        auto read = app::FriendsReader::readText(R"({"intervalSeconds": 5, "friends": [
+        auto read = serve::FriendsReader::readText(R"({"intervalSeconds": 5, "friends": [
             {"fullName": "Ann Marsh", "firstName": "Ann", "lastName": "Marsh", "emails": "ann@b.example",
              "track": [{"at": 0, "latitude": 51.5, "longitude": -2.5, "street": "Quay Road"},
                        {"at": 10, "latitude": 51.51, "longitude": -2.51, "street": "Salt Lane", "label": "Work"},
@@ -23,19 +23,19 @@ class AssistantRequestsTest : public ::testing::Test {
             {"fullName": "Otto Brandt", "firstName": "Otto", "lastName": "Brandt", "emails": "otto@b.example",
              "track": [{"latitude": 51.6, "longitude": -2.6, "label": "Fish Market"}]},
             {"fullName": "Shirin", "firstName": "Shirin", "phones": "+44 1", "hidden": true}]})",
-                                                 "f.json");
-        return LocationService(std::get<app::FriendsFile>(read));
+                                                   "f.json");
+        return LocationService(std::get<serve::FriendsFile>(read));
     }
     platform::Dictionary answer(const std::string& question) const {
         return AssistantAnswers(service).answer(question, {0.0, 1.7e12});
     }
     /// What the window would make of the answer.
-    app::Scenario scenario(const std::string& question) const {
+    host::Scenario scenario(const std::string& question) const {
         const auto read =
-            app::ScenarioReader(platform::Date{0.0}).readText(platform::writeJson(answer(question)), "answer");
-        const auto* error = std::get_if<app::ScenarioError>(&read);
+            host::ScenarioReader(platform::Date{0.0}).readText(platform::writeJson(answer(question)), "answer");
+        const auto* error = std::get_if<documents::DocumentError>(&read);
         EXPECT_EQ(error, nullptr) << error->text();
-        return error != nullptr ? app::Scenario() : std::get<app::Scenario>(read);
+        return error != nullptr ? host::Scenario() : std::get<host::Scenario>(read);
     }
     /// "trigger label street latitude" of the fence; "-" without one.
     std::string fence(const std::string& question) const {
@@ -90,7 +90,7 @@ TEST_F(AssistantRequestsTest, WithoutAPlace_WhereTheFriendIs) {
 
 TEST_F(AssistantRequestsTest, Here_IsWhereTheUserIs) {
     EXPECT_EQ(fence("Tell me when Ann gets here"), "-");
-    service.sharing().command(false, app::SharingState::Position{51.51, -2.51});
+    service.sharing().command(false, serve::SharingState::Position{51.51, -2.51});
     EXPECT_EQ(fence("Tell me when Ann gets here"), "OnArrival none Salt Lane 51.51");
 }
 

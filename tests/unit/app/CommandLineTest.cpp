@@ -63,18 +63,18 @@ TEST(KTRCommandLineTest, At_TakesAMoment) {
 
 TEST(KTRCommandLineTest, Help_HasExamplesAndTheExitStatus) {
     const auto all = ending({"--help"});
-    EXPECT_EQ(all.code, ExitCode::Ok);
+    EXPECT_EQ(all.code, host::ExitCode::Ok);
     EXPECT_NE(all.text.find("Exit status:"), std::string::npos);
     for (const char* command : {"show", "render", "describe"}) {
         const auto help = ending({command, "--help"});
-        EXPECT_EQ(help.code, ExitCode::Ok);
+        EXPECT_EQ(help.code, host::ExitCode::Ok);
         EXPECT_NE(help.text.find(std::string("  ktr ") + command), std::string::npos) << help.text;
     }
 }
 
 TEST(KTRCommandLineTest, Version_IsPrinted) {
     const auto version = ending({"--version"});
-    EXPECT_EQ(version.code, ExitCode::Ok);
+    EXPECT_EQ(version.code, host::ExitCode::Ok);
     EXPECT_EQ(version.text.rfind("ktr ", 0), 0u);
 }
 
@@ -134,7 +134,7 @@ TEST(KTRCommandLineTest, Misuse_IsToldWithStatusTwo) {
             line += " " + argument;
         }
         const auto end = ending(arguments);
-        EXPECT_EQ(end.code, ExitCode::Usage) << line;
+        EXPECT_EQ(end.code, host::ExitCode::Usage) << line;
         EXPECT_EQ(end.text.rfind("ktr: ", 0), 0u) << line << ": " << end.text;
     }
 }

@@ -11,8 +11,8 @@
 #include <QWheelEvent>
 #include <memory>
 
-#include "app/ScenarioReader.h"
-#include "app/conversation/Measures.h"
+#include "host/conversation/Measures.h"
+#include "host/scenario/ScenarioReader.h"
 #include "platform/base/Platform.h"
 #include "platform/ui/Appearance.h"
 #include "platform/ui/Label.h"
@@ -35,20 +35,22 @@ class GrowingController : public platform::HostSnippetViewController {
 class KTRConversationWidgetTest : public ::testing::Test {
   public:
     void open(const std::vector<std::string>& names, int width = 400, int height = 700) {
-        std::vector<Scenario> scenarios;
+        std::vector<host::Scenario> scenarios;
         for (const std::string& name : names) {
-            auto read = ScenarioReader({0.0}).readFile(KTR_SOURCE_DIR "/resources/scenarios/" + name + ".json");
-            ASSERT_TRUE(std::holds_alternative<Scenario>(read)) << std::get<ScenarioError>(read).text();
-            scenarios.push_back(std::get<Scenario>(read));
+            auto read = host::ScenarioReader({0.0}).readFile(KTR_SOURCE_DIR "/resources/scenarios/" + name + ".json");
+            ASSERT_TRUE(std::holds_alternative<host::Scenario>(read))
+                << std::get<documents::DocumentError>(read).text();
+            scenarios.push_back(std::get<host::Scenario>(read));
         }
-        Options options;
+        host::HostOptions options;
         options.dark = false;
-        const auto settings = HostSettings::decide(options, scenarios, {});
-        ASSERT_TRUE(std::holds_alternative<HostSettings>(settings));
-        auto made = Host::make(std::get<HostSettings>(settings), Host::Time::Virtual, KTR_PLUGIN_FILE);
-        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<Host>>(made)) << std::get<Failure>(made).line;
-        host = std::move(std::get<std::unique_ptr<Host>>(made));
-        for (const Scenario& scenario : scenarios) {
+        const auto settings = host::HostSettings::decide(options, scenarios, {});
+        ASSERT_TRUE(std::holds_alternative<host::HostSettings>(settings));
+        auto made =
+            host::Host::make(std::get<host::HostSettings>(settings), host::Host::Time::Virtual, KTR_PLUGIN_FILE);
+        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made)) << std::get<host::Failure>(made).line;
+        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
+        for (const host::Scenario& scenario : scenarios) {
             ASSERT_FALSE(host->addTurn(scenario));
         }
         host->delegate().open = [this](const platform::Url& url) {
@@ -123,7 +125,7 @@ class KTRConversationWidgetTest : public ::testing::Test {
                            QInputDevice::Capability::Position,
                            1,
                            0};
-    std::unique_ptr<Host> host;
+    std::unique_ptr<host::Host> host;
     std::unique_ptr<ConversationWidget> widget;
     std::vector<std::string> opened;
 };
@@ -248,7 +250,7 @@ TEST_F(KTRConversationWidgetTest, Hover_PaintsTheRowAlone) {
 
 TEST_F(KTRConversationWidgetTest, HeightChange_KeepsTheCardsTopOrItsBottom) {
     open({"dinner"});
-    auto turn = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
+    auto turn = platform::create<host::TurnView>(&host::TurnView::initWithFrame, platform::Rect{});
     const auto controller = platform::create<GrowingController>(&GrowingController::init);
     turn->setController(controller);
     host->conversation()->addTurn(turn);
@@ -283,7 +285,7 @@ TEST_F(KTRConversationWidgetTest, TextThatChangesWithoutAWord_HasItsRoomOnTheNex
 
 TEST_F(KTRConversationWidgetTest, Ring_GoesWhenTheSearchEndsThoughNobodyTells) {
     open({"dinner"});
-    auto turn = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
+    auto turn = platform::create<host::TurnView>(&host::TurnView::initWithFrame, platform::Rect{});
     const auto controller = platform::create<GrowingController>(&GrowingController::init);
     controller->searching = true;
     turn->card()->setController(controller);
@@ -308,7 +310,7 @@ TEST_F(KTRConversationWidgetTest, SeveralTurns_BeginWithTheNewestAtTheTop) {
 TEST_F(KTRConversationWidgetTest, NewestOfAWideConversation_KeepsItsSpaceAbove) {
     open({"dinner", "locating"}, 1100, 700);
     widget->scrollToNewest();
-    EXPECT_NEAR(widget->scrolled(), host->conversation()->turns()[1]->frame().y - measures::kCardToQuestion, 1.0);
+    EXPECT_NEAR(widget->scrolled(), host->conversation()->turns()[1]->frame().y - host::measures::kCardToQuestion, 1.0);
 }
 
 TEST_F(KTRConversationWidgetTest, Accessibility_NamesRolesAndPress) {
@@ -358,7 +360,7 @@ TEST_F(KTRConversationWidgetTest, ReducedMotion_HoldsForMapsToo) {
     widget->setReducedMotion(true);
     EXPECT_TRUE(platform::Platform::installed()->appearance->reducesMotion());
     widget->setReducedMotion(false);
-    const bool still = host->conversation()->motionStyle() == MotionStyle::Reduced;
+    const bool still = host->conversation()->motionStyle() == host::MotionStyle::Reduced;
     EXPECT_EQ(platform::Platform::installed()->appearance->reducesMotion(), still);
 }
 

@@ -1,13 +1,13 @@
-#include "linux/ui/AvatarImage.h"
+#include "linux/paint/AvatarImage.h"
 
 #include <gtest/gtest.h>
 
 #include <QBuffer>
 #include <QPainter>
 
-#include "linux/ui/PersonColors.h"
-#include "linux/ui/QtAvatarImages.h"
-#include "linux/ui/QtMonogramMakerFactory.h"
+#include "linux/paint/PersonColors.h"
+#include "linux/paint/QtAvatarImages.h"
+#include "linux/paint/QtMonogramMakerFactory.h"
 
 namespace ktr::linux_ {
 

@@ -1,4 +1,4 @@
-#include "linux/account/ConfigurationReader.h"
+#include "linux/configuration/ConfigurationReader.h"
 
 #include <gtest/gtest.h>
 

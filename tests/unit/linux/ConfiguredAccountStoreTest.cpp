@@ -1,4 +1,4 @@
-#include "linux/account/ConfiguredAccountStore.h"
+#include "linux/configuration/ConfiguredAccountStore.h"
 
 #include "tests/support/PlatformTest.h"
 #include "tests/support/TemporaryFolder.h"

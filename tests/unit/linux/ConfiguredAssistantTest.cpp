@@ -1,4 +1,4 @@
-#include "linux/services/ConfiguredAssistant.h"
+#include "linux/configuration/ConfiguredAssistant.h"
 
 #include <gtest/gtest.h>
 

@@ -11,8 +11,8 @@
 
 #include "linux/maps/MapDrawer.h"
 #include "tests/support/PlatformTest.h"
-#include "tests/unit/linux/maps/MbtilesWriter.h"
-#include "tests/unit/linux/maps/TileWriter.h"
+#include "tests/support/maps/MbtilesWriter.h"
+#include "tests/support/maps/TileWriter.h"
 
 namespace ktr::linux_ {
 

@@ -1,4 +1,4 @@
-#include "linux/account/FilePreferences.h"
+#include "linux/configuration/FilePreferences.h"
 
 #include "tests/support/PlatformTest.h"
 #include "tests/support/TemporaryFolder.h"

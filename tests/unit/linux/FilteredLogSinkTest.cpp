@@ -1,4 +1,4 @@
-#include "linux/services/FilteredLogSink.h"
+#include "linux/device/FilteredLogSink.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "linux/ui/FontSetup.h"
+#include "linux/paint/FontSetup.h"
 
 #include <gtest/gtest.h>
 

@@ -1,11 +1,11 @@
-#include "linux/services/IcuDistanceCalculatorFactory.h"
+#include "linux/locale/IcuDistanceCalculatorFactory.h"
 
 #include <gtest/gtest.h>
 
 #include <QFile>
 #include <QTemporaryDir>
 
-#include "linux/services/GeographicLibGeodesy.h"
+#include "linux/positions/GeographicLibGeodesy.h"
 #include "tests/support/EnvironmentVariable.h"
 
 namespace ktr::linux_ {

@@ -1,11 +1,11 @@
-#include "linux/services/IcuDistanceCalculator.h"
+#include "linux/locale/IcuDistanceCalculator.h"
 
 #include <gtest/gtest.h>
 
 #include <cmath>
 #include <limits>
 
-#include "linux/services/GeographicLibGeodesy.h"
+#include "linux/positions/GeographicLibGeodesy.h"
 #include "tests/support/Doubles.h"
 
 namespace ktr::linux_ {

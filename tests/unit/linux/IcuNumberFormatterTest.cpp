@@ -1,4 +1,4 @@
-#include "linux/services/IcuNumberFormatter.h"
+#include "linux/locale/IcuNumberFormatter.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "linux/ui/Initials.h"
+#include "linux/paint/Initials.h"
 
 #include <gtest/gtest.h>
 

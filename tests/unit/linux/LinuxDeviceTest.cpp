@@ -1,4 +1,4 @@
-#include "linux/ui/LinuxDevice.h"
+#include "linux/device/LinuxDevice.h"
 
 #include <gtest/gtest.h>
 

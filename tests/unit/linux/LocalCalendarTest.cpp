@@ -1,4 +1,4 @@
-#include "linux/services/LocalCalendar.h"
+#include "linux/locale/LocalCalendar.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "linux/services/LocaleRegion.h"
+#include "linux/locale/LocaleRegion.h"
 
 #include <gtest/gtest.h>
 

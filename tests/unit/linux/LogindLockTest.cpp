@@ -1,4 +1,4 @@
-#include "linux/account/LogindLock.h"
+#include "linux/device/LogindLock.h"
 
 #include <QDBusObjectPath>
 #include <QDBusVariant>

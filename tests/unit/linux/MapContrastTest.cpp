@@ -5,7 +5,7 @@
 #include <vector>
 
 #include "linux/maps/MapStyle.h"
-#include "linux/ui/Palette.h"
+#include "linux/paint/Palette.h"
 
 // What stands on a map is told from every ground that it may stand on.
 

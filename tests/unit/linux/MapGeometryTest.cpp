@@ -13,14 +13,15 @@ namespace ktr::linux_ {
 
 namespace {
 
-constexpr auto kArea = MapTile::Shape::Areas;
-constexpr auto kLines = MapTile::Shape::Lines;
+constexpr auto kArea = tiles::MapTile::Shape::Areas;
+constexpr auto kLines = tiles::MapTile::Shape::Lines;
 
-VisibleTile tileWith(MapTile::Shape shape, const std::vector<MapTile::Spot>& spots, const QRectF& window) {
-    auto tile = std::make_shared<MapTile>();
+VisibleTile tileWith(tiles::MapTile::Shape shape, const std::vector<tiles::MapTile::Spot>& spots,
+                     const QRectF& window) {
+    auto tile = std::make_shared<tiles::MapTile>();
     tile->spots = spots;
     tile->partEnds = {static_cast<std::uint32_t>(spots.size())};
-    MapTile::Feature feature;
+    tiles::MapTile::Feature feature;
     feature.shape = shape;
     feature.partCount = 1;
     feature.left = feature.top = 1e9F;
@@ -130,44 +131,44 @@ TEST(MapScaleTest, Widths_AreThoseOfTheTable) {
                             Row{2.2, 9.5, 12.0, 7.4, 9.2, 5.0, 6.4}, Row{1.2, 15.0, 19.0, 12.0, 15.0, 8.0, 10.0},
                             Row{0.9, 18.0, 23.0, 14.0, 17.5, 9.5, 12.0}, Row{0.2, 18.0, 23.0, 14.0, 17.5, 9.5, 12.0}}) {
         const MapScale scale(row.metres);
-        EXPECT_DOUBLE_EQ(scale.road(MapKind::Major).fill, row.major) << row.metres;
-        EXPECT_DOUBLE_EQ(scale.road(MapKind::Major).casing, row.majorCasing) << row.metres;
-        EXPECT_DOUBLE_EQ(scale.road(MapKind::Secondary).fill, row.secondary) << row.metres;
-        EXPECT_DOUBLE_EQ(scale.road(MapKind::Secondary).casing, row.secondaryCasing) << row.metres;
-        EXPECT_DOUBLE_EQ(scale.road(MapKind::Minor).fill, row.minor) << row.metres;
-        EXPECT_DOUBLE_EQ(scale.road(MapKind::Minor).casing, row.minorCasing) << row.metres;
+        EXPECT_DOUBLE_EQ(scale.road(tiles::MapKind::Major).fill, row.major) << row.metres;
+        EXPECT_DOUBLE_EQ(scale.road(tiles::MapKind::Major).casing, row.majorCasing) << row.metres;
+        EXPECT_DOUBLE_EQ(scale.road(tiles::MapKind::Secondary).fill, row.secondary) << row.metres;
+        EXPECT_DOUBLE_EQ(scale.road(tiles::MapKind::Secondary).casing, row.secondaryCasing) << row.metres;
+        EXPECT_DOUBLE_EQ(scale.road(tiles::MapKind::Minor).fill, row.minor) << row.metres;
+        EXPECT_DOUBLE_EQ(scale.road(tiles::MapKind::Minor).casing, row.minorCasing) << row.metres;
     }
 }
 
 TEST(MapScaleTest, BetweenTwoRows_IsInProportion) {
-    EXPECT_DOUBLE_EQ(MapScale(5.0).road(MapKind::Major).fill, (5.8 + 7.6) / 2.0);
-    EXPECT_DOUBLE_EQ(MapScale(1.7).road(MapKind::Secondary).casing, (9.2 + 15.0) / 2.0);
-    EXPECT_DOUBLE_EQ(MapScale(3.1).road(MapKind::Path).fill, 1.1);
-    EXPECT_EQ(MapScale(4.1).road(MapKind::Path).fill, 0.0);
-    EXPECT_EQ(MapScale(5000.0).road(MapKind::Minor).fill, 0.0);
-    EXPECT_GT(MapScale(5000.0).road(MapKind::Major).fill, 0.0);
+    EXPECT_DOUBLE_EQ(MapScale(5.0).road(tiles::MapKind::Major).fill, (5.8 + 7.6) / 2.0);
+    EXPECT_DOUBLE_EQ(MapScale(1.7).road(tiles::MapKind::Secondary).casing, (9.2 + 15.0) / 2.0);
+    EXPECT_DOUBLE_EQ(MapScale(3.1).road(tiles::MapKind::Path).fill, 1.1);
+    EXPECT_EQ(MapScale(4.1).road(tiles::MapKind::Path).fill, 0.0);
+    EXPECT_EQ(MapScale(5000.0).road(tiles::MapKind::Minor).fill, 0.0);
+    EXPECT_GT(MapScale(5000.0).road(tiles::MapKind::Major).fill, 0.0);
 }
 
 TEST(MapScaleTest, Names_AppearOneClassAfterTheOther) {
-    EXPECT_TRUE(MapScale(25.0).showsNames(MapKind::WaterName));
-    EXPECT_FALSE(MapScale(25.0).showsNames(MapKind::Major));
-    EXPECT_TRUE(MapScale(12.0).showsNames(MapKind::Major));
-    EXPECT_FALSE(MapScale(12.0).showsNames(MapKind::Secondary));
-    EXPECT_TRUE(MapScale(6.0).showsNames(MapKind::Secondary));
-    EXPECT_FALSE(MapScale(6.0).showsNames(MapKind::Park));
-    EXPECT_TRUE(MapScale(4.0).showsNames(MapKind::ParkName));
-    EXPECT_FALSE(MapScale(4.0).showsNames(MapKind::Minor));
-    EXPECT_TRUE(MapScale(2.2).showsNames(MapKind::Minor));
-    EXPECT_FALSE(MapScale(2.2).showsNames(MapKind::PointOfInterest));
-    EXPECT_TRUE(MapScale(1.2).showsNames(MapKind::PointOfInterest));
+    EXPECT_TRUE(MapScale(25.0).showsNames(tiles::MapKind::WaterName));
+    EXPECT_FALSE(MapScale(25.0).showsNames(tiles::MapKind::Major));
+    EXPECT_TRUE(MapScale(12.0).showsNames(tiles::MapKind::Major));
+    EXPECT_FALSE(MapScale(12.0).showsNames(tiles::MapKind::Secondary));
+    EXPECT_TRUE(MapScale(6.0).showsNames(tiles::MapKind::Secondary));
+    EXPECT_FALSE(MapScale(6.0).showsNames(tiles::MapKind::Park));
+    EXPECT_TRUE(MapScale(4.0).showsNames(tiles::MapKind::ParkName));
+    EXPECT_FALSE(MapScale(4.0).showsNames(tiles::MapKind::Minor));
+    EXPECT_TRUE(MapScale(2.2).showsNames(tiles::MapKind::Minor));
+    EXPECT_FALSE(MapScale(2.2).showsNames(tiles::MapKind::PointOfInterest));
+    EXPECT_TRUE(MapScale(1.2).showsNames(tiles::MapKind::PointOfInterest));
     EXPECT_FALSE(MapScale(4.1).showsBuildings());
     EXPECT_TRUE(MapScale(4.0).showsBuildings());
     EXPECT_DOUBLE_EQ(MapScale(2.2).labelFactor(), 1.0);
     EXPECT_DOUBLE_EQ(MapScale(1.2).labelFactor(), 1.2);
     EXPECT_DOUBLE_EQ(MapScale(0.3).labelFactor(), 1.2);
-    EXPECT_TRUE(MapScale(3000.0).showsPlace(PlaceRank::Country));
-    EXPECT_FALSE(MapScale(3000.0).showsPlace(PlaceRank::Village));
-    EXPECT_FALSE(MapScale(1.0).showsPlace(PlaceRank::City));
+    EXPECT_TRUE(MapScale(3000.0).showsPlace(tiles::PlaceRank::Country));
+    EXPECT_FALSE(MapScale(3000.0).showsPlace(tiles::PlaceRank::Village));
+    EXPECT_FALSE(MapScale(1.0).showsPlace(tiles::PlaceRank::City));
 }
 
 TEST(MapStyleTest, HighContrast_DarkensLettersAndEdgesOnly) {
@@ -211,11 +212,11 @@ TEST(MapTilesTest, Antimeridian_GoesOnWithTheOtherSide) {
     request.viewport = {{0.0, 180.0}, 3.0, {300.0, 100.0}};
     const auto tiles = tilesOf(request, 3);
     ASSERT_EQ(tiles.size(), 4U);
-    EXPECT_EQ(tiles[0].key, (TileKey{3, 7, 3}));
-    EXPECT_EQ(tiles[1].key, (TileKey{3, 0, 3}));
+    EXPECT_EQ(tiles[0].key, (tiles::TileKey{3, 7, 3}));
+    EXPECT_EQ(tiles[1].key, (tiles::TileKey{3, 0, 3}));
     EXPECT_DOUBLE_EQ(tiles[1].points.x(), 150.0);
     request.viewport.centre.longitude = -180.0;
-    EXPECT_EQ(tilesOf(request, 3).front().key, (TileKey{3, 7, 3}));
+    EXPECT_EQ(tilesOf(request, 3).front().key, (tiles::TileKey{3, 7, 3}));
 }
 
 TEST(MapTilesTest, Poles_HaveNoTilesBeyondTheWorld) {
@@ -251,7 +252,7 @@ TEST(MapTilesTest, Level_MakesTilesOfTheSizeAskedFor) {
 TEST(TileCacheTest, Bytes_AreBounded) {
     TileCache cache(10'000);
     const auto tile = [] {
-        auto made = std::make_shared<MapTile>();
+        auto made = std::make_shared<tiles::MapTile>();
         made->spots.resize(300);
         return made;
     };
@@ -272,9 +273,9 @@ TEST(TileCacheTest, Bytes_AreBounded) {
 }
 
 TEST(TileKeyTest, Parent_HoldsTheTile) {
-    EXPECT_EQ((TileKey{14, 8701, 5302}).parent(12), (TileKey{12, 2175, 1325}));
-    EXPECT_EQ((TileKey{14, 8701, 5302}).parent(14), (TileKey{14, 8701, 5302}));
-    EXPECT_EQ((TileKey{14, 8701, 5302}).parent(0), (TileKey{0, 0, 0}));
+    EXPECT_EQ((tiles::TileKey{14, 8701, 5302}).parent(12), (tiles::TileKey{12, 2175, 1325}));
+    EXPECT_EQ((tiles::TileKey{14, 8701, 5302}).parent(14), (tiles::TileKey{14, 8701, 5302}));
+    EXPECT_EQ((tiles::TileKey{14, 8701, 5302}).parent(0), (tiles::TileKey{0, 0, 0}));
 }
 
 }  // namespace ktr::linux_

@@ -1,4 +1,4 @@
-#include "linux/services/MemoryContactStore.h"
+#include "linux/contacts/MemoryContactStore.h"
 
 #include <gtest/gtest.h>
 

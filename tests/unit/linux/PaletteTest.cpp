@@ -1,4 +1,4 @@
-#include "linux/ui/Palette.h"
+#include "linux/paint/Palette.h"
 
 #include <gtest/gtest.h>
 

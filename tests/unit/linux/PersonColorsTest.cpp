@@ -1,4 +1,4 @@
-#include "linux/ui/PersonColors.h"
+#include "linux/paint/PersonColors.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "linux/services/PhonenumberLibrary.h"
+#include "linux/contacts/PhonenumberLibrary.h"
 
 #include <gtest/gtest.h>
 

@@ -11,7 +11,7 @@
 #include "linux/maps/MapStyle.h"
 #include "linux/maps/MbtilesPictures.h"
 #include "tests/support/PlatformTest.h"
-#include "tests/unit/linux/maps/MbtilesWriter.h"
+#include "tests/support/maps/MbtilesWriter.h"
 
 namespace ktr::linux_ {
 
@@ -19,7 +19,7 @@ using test::MbtilesWriter;
 
 namespace {
 
-constexpr TileKey kMiddle{10, 540, 330};
+constexpr tiles::TileKey kMiddle{10, 540, 330};
 
 std::string png(const QImage& image) {
     QByteArray data;
@@ -62,7 +62,7 @@ class RestGround final : public MapGround {
 class PictureGroundTest : public test::PlatformTest {
   protected:
     std::string path() const { return folder.filePath(QStringLiteral("map.mbtiles")).toStdString(); }
-    void write(const std::vector<std::pair<TileKey, std::string>>& tiles,
+    void write(const std::vector<std::pair<tiles::TileKey, std::string>>& tiles,
                const std::vector<std::pair<std::string, std::string>>& metadata = {{"format", "png"}}) {
         MbtilesWriter writer(path());
         writer.makeTables();
@@ -74,7 +74,7 @@ class PictureGroundTest : public test::PlatformTest {
         }
     }
     /// The tile fills 256 × 256 points.
-    static platform::MapPictureRequest request(const TileKey& key = kMiddle) {
+    static platform::MapPictureRequest request(const tiles::TileKey& key = kMiddle) {
         platform::MapPictureRequest made;
         const platform::MapViewport world{{0.0, 0.0}, static_cast<double>(key.z), {0.0, 0.0}};
         const double half = 128.0 * std::exp2(key.z);
@@ -116,14 +116,14 @@ TEST_F(PictureGroundTest, AMissingTile_IsFilledFromItsParent) {
 /// Pictures that are at hand, and which were wanted.
 class ListedPictures final : public TilePictures {
   public:
-    std::map<TileKey, Answer> answers;
-    std::vector<TileKey> wanted;
+    std::map<tiles::TileKey, Answer> answers;
+    std::vector<tiles::TileKey> wanted;
 
     bool open() override { return true; }
     int coarsest() const override { return 0; }
     int finest() const override { return 19; }
     std::string attribution() const override { return "Listed"; }
-    Answer tile(const TileKey& key, bool isWanted) override {
+    Answer tile(const tiles::TileKey& key, bool isWanted) override {
         if (isWanted) {
             wanted.push_back(key);
         }

@@ -1,4 +1,4 @@
-#include "linux/ui/PngEncoder.h"
+#include "linux/paint/PngEncoder.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "linux/account/PreferencesFile.h"
+#include "linux/configuration/PreferencesFile.h"
 
 #include <gtest/gtest.h>
 #include <sched.h>

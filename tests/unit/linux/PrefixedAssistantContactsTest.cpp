@@ -1,4 +1,4 @@
-#include "linux/services/PrefixedAssistantContacts.h"
+#include "linux/contacts/PrefixedAssistantContacts.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "linux/ui/PreparedText.h"
+#include "linux/paint/PreparedText.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "linux/ui/QtCanvas.h"
+#include "linux/paint/QtCanvas.h"
 
 #include <gtest/gtest.h>
 

@@ -1,12 +1,12 @@
-#include "linux/ui/QtImageSource.h"
+#include "linux/paint/QtImageSource.h"
 
 #include <QBuffer>
 #include <QFile>
 #include <QPainter>
 #include <QTemporaryDir>
 
-#include "linux/ui/ImageDecoder.h"
-#include "linux/ui/LinuxDevice.h"
+#include "linux/device/LinuxDevice.h"
+#include "linux/paint/ImageDecoder.h"
 #include "tests/support/PlatformTest.h"
 
 namespace ktr::linux_ {

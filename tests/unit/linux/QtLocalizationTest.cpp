@@ -1,4 +1,4 @@
-#include "linux/services/QtLocalization.h"
+#include "linux/locale/QtLocalization.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "linux/services/QtMainLoop.h"
+#include "linux/device/QtMainLoop.h"
 
 #include <gtest/gtest.h>
 

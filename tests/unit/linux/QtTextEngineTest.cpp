@@ -1,4 +1,4 @@
-#include "linux/ui/QtTextEngine.h"
+#include "linux/paint/QtTextEngine.h"
 
 #include <gtest/gtest.h>
 

@@ -1,8 +1,8 @@
-#include "linux/services/ScenarioLocationManager.h"
+#include "linux/positions/ScenarioLocationManager.h"
 
 #include <gtest/gtest.h>
 
-#include "linux/services/ScenarioLocationManagerFactory.h"
+#include "linux/positions/ScenarioLocationManagerFactory.h"
 #include "tests/support/PlatformTest.h"
 
 namespace ktr::linux_ {

@@ -1,4 +1,4 @@
-#include "linux/ui/ScenePainter.h"
+#include "linux/paint/ScenePainter.h"
 
 #include <gtest/gtest.h>
 
@@ -7,8 +7,8 @@
 #include <QTemporaryDir>
 #include <limits>
 
-#include "linux/ui/AvatarImage.h"
-#include "linux/ui/QtTextEngine.h"
+#include "linux/paint/AvatarImage.h"
+#include "linux/paint/QtTextEngine.h"
 
 namespace ktr::linux_ {
 

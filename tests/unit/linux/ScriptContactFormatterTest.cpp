@@ -1,4 +1,4 @@
-#include "linux/services/ScriptContactFormatter.h"
+#include "linux/contacts/ScriptContactFormatter.h"
 
 #include <gtest/gtest.h>
 

@@ -1,10 +1,10 @@
-#include "linux/account/SecretModule.h"
+#include "linux/configuration/SecretModule.h"
 
 #include <QDBusConnectionInterface>
 #include <QProcess>
 #include <memory>
 
-#include "linux/services/LoadableModule.h"
+#include "linux/device/LoadableModule.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/qt/PrivateBus.h"
 

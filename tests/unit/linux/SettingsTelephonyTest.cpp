@@ -1,4 +1,4 @@
-#include "linux/services/SettingsTelephony.h"
+#include "linux/locale/SettingsTelephony.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "linux/services/StderrLogSink.h"
+#include "linux/device/StderrLogSink.h"
 
 #include <gtest/gtest.h>
 

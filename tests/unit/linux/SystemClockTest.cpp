@@ -1,4 +1,4 @@
-#include "linux/services/SystemClock.h"
+#include "linux/device/SystemClock.h"
 
 #include <gtest/gtest.h>
 

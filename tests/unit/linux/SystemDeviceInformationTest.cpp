@@ -1,4 +1,4 @@
-#include "linux/account/SystemDeviceInformation.h"
+#include "linux/device/SystemDeviceInformation.h"
 
 #include <gtest/gtest.h>
 #include <sys/utsname.h>

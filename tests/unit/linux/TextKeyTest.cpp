@@ -1,4 +1,4 @@
-#include "linux/ui/TextKey.h"
+#include "linux/paint/TextKey.h"
 
 #include <gtest/gtest.h>
 

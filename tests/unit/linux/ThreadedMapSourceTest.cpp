@@ -6,7 +6,7 @@
 #include <optional>
 #include <stdexcept>
 
-#include "linux/ui/QtImage.h"
+#include "linux/paint/QtImage.h"
 #include "tests/support/PlatformTest.h"
 
 namespace ktr::linux_ {

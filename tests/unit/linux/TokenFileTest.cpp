@@ -1,4 +1,4 @@
-#include "linux/account/TokenFile.h"
+#include "linux/configuration/TokenFile.h"
 
 #include <gtest/gtest.h>
 #include <sys/stat.h>

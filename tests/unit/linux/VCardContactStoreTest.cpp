@@ -1,4 +1,4 @@
-#include "linux/services/VCardContactStore.h"
+#include "linux/contacts/VCardContactStore.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "linux/services/VCardReader.h"
+#include "linux/contacts/VCardReader.h"
 
 #include <gtest/gtest.h>
 

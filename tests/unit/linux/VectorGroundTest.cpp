@@ -8,8 +8,8 @@
 #include "linux/maps/MapDrawer.h"
 #include "linux/maps/MapStyle.h"
 #include "tests/support/PlatformTest.h"
-#include "tests/unit/linux/maps/MbtilesWriter.h"
-#include "tests/unit/linux/maps/TileWriter.h"
+#include "tests/support/maps/MbtilesWriter.h"
+#include "tests/support/maps/TileWriter.h"
 
 namespace ktr::linux_ {
 
@@ -19,7 +19,7 @@ using test::tileOf;
 
 namespace {
 
-constexpr TileKey kMiddle{14, 8700, 5300};
+constexpr tiles::TileKey kMiddle{14, 8700, 5300};
 
 /// Fills what nobody else has drawn.
 class PlainGround final : public MapGround {
@@ -53,7 +53,7 @@ class VectorGroundTest : public test::PlatformTest {
   protected:
     std::string path() const { return folder.filePath(QStringLiteral("map.mbtiles")).toStdString(); }
     /// The tile fills 256 × 256 points.
-    static platform::MapPictureRequest request(const TileKey& key = kMiddle, double scale = 1.0) {
+    static platform::MapPictureRequest request(const tiles::TileKey& key = kMiddle, double scale = 1.0) {
         platform::MapPictureRequest made;
         platform::MapViewport world{{0.0, 0.0}, static_cast<double>(key.z), {0.0, 0.0}};
         const double half = 128.0 * std::exp2(key.z);
@@ -75,7 +75,7 @@ class VectorGroundTest : public test::PlatformTest {
         return ground_;
     }
     void makeFile(const std::map<std::string, std::string>& metadata,
-                  const std::map<TileKey, std::string>& tiles) const {
+                  const std::map<tiles::TileKey, std::string>& tiles) const {
         MbtilesWriter writer(path());
         writer.makeTables();
         for (const auto& [name, value] : metadata) {
@@ -128,7 +128,7 @@ TEST_F(VectorGroundTest, Dark_AndHighContrast_HaveTheirColors) {
 }
 
 TEST_F(VectorGroundTest, Neighbours_MeetWithoutASeam) {
-    const TileKey east{14, 8701, 5300};
+    const tiles::TileKey east{14, 8701, 5300};
     const std::string lake =
         tileOf({LayerWriter("water_polygons").area({{0, 0}, {4096, 0}, {4096, 4096}, {0, 4096}}, {{"kind", "lake"}}),
                 LayerWriter("streets").line({{0, 2048}, {4096, 2048}}, {{"kind", "primary"}})});
@@ -151,7 +151,7 @@ TEST_F(VectorGroundTest, MissingTile_IsFilledFromACoarserLevel) {
     makeFile({{"format", "pbf"}, {"minzoom", "12"}, {"maxzoom", "14"}}, {{kMiddle.parent(12), gzipped(lakeTile())}});
     // Of the parent's four columns the first two are lake.
     for (int column = 0; column < 4; ++column) {
-        const TileKey key{14, kMiddle.parent(12).x * 4 + column, kMiddle.parent(12).y * 4 + 1};
+        const tiles::TileKey key{14, kMiddle.parent(12).x * 4 + column, kMiddle.parent(12).y * 4 + 1};
         const auto color = draw(request(key)).pixels.pixelColor(100, 30);
         EXPECT_EQ(color, column < 2 ? style.water : column == 3 ? style.land : QColor(Qt::magenta)) << column;
     }
@@ -160,13 +160,13 @@ TEST_F(VectorGroundTest, MissingTile_IsFilledFromACoarserLevel) {
 TEST_F(VectorGroundTest, DamagedTile_IsFilledFromACoarserLevel) {
     const std::string packed = gzipped(lakeTile());
     const std::string bomb = gzipped(std::string(std::size_t{64} << 20, '\0'));
-    ASSERT_LT(bomb.size(), MbtilesFile::kLargestTile);
+    ASSERT_LT(bomb.size(), tiles::MbtilesFile::kLargestTile);
     for (const std::string& damaged :
          {std::string("no tile at all"), packed.substr(0, packed.size() / 2), bomb, lakeTile().substr(0, 30)}) {
         QFile::remove(QString::fromStdString(path()));
         makeFile({{"format", "pbf"}}, {{kMiddle, damaged}, {{14, 1, 1}, packed}, {kMiddle.parent(12), packed}});
         VectorGround fresh(path());
-        const auto west = TileKey{14, kMiddle.parent(12).x * 4, kMiddle.y};
+        const auto west = tiles::TileKey{14, kMiddle.parent(12).x * 4, kMiddle.y};
         const auto picture = draw(request(west));
         EXPECT_EQ(picture.pixels.pixelColor(30, 30), style.water);
         const auto own = draw(request());

@@ -1,0 +1,184 @@
+#include "host/Environment.h"
+
+#include <filesystem>
+#include <optional>
+
+#include "host/Resources.h"
+#include "host/scenario/ScenarioAccounts.h"
+#include "host/scenario/ScenarioClock.h"
+#include "linux/configuration/ConfiguredAssistant.h"
+#include "linux/contacts/PhonenumberLibrary.h"
+#include "linux/contacts/PrefixedAssistantContacts.h"
+#include "linux/contacts/ScriptContactFormatter.h"
+#include "linux/contacts/VCardContactStore.h"
+#include "linux/device/FilteredLogSink.h"
+#include "linux/device/LinuxDevice.h"
+#include "linux/device/QtMainLoop.h"
+#include "linux/device/StderrLogSink.h"
+#include "linux/device/SystemClock.h"
+#include "linux/locale/IcuDistanceCalculatorFactory.h"
+#include "linux/locale/IcuLengthFormatter.h"
+#include "linux/locale/IcuNumberFormatter.h"
+#include "linux/locale/LocalCalendar.h"
+#include "linux/locale/LocaleRegion.h"
+#include "linux/locale/QtLocalization.h"
+#include "linux/locale/SettingsTelephony.h"
+#include "linux/maps/ConfiguredMaps.h"
+#include "linux/maps/DesktopMapsApplication.h"
+#include "linux/paint/QtAppearance.h"
+#include "linux/paint/QtAvatarImages.h"
+#include "linux/paint/QtImageSource.h"
+#include "linux/paint/QtMonogramMakerFactory.h"
+#include "linux/paint/QtTextEngine.h"
+#include "linux/positions/GeographicLibGeodesy.h"
+#include "linux/positions/ScenarioLocationManagerFactory.h"
+
+namespace ktr::host {
+
+namespace {
+
+using platform::Platform;
+
+std::vector<linux_::TimedPosition> walkOf(const std::vector<ScenarioPosition>& positions) {
+    std::vector<linux_::TimedPosition> walk;
+    for (const ScenarioPosition& position : positions) {
+        linux_::TimedPosition timed;
+        timed.seconds = position.at;
+        timed.fix.coordinate = position.coordinate;
+        timed.fix.horizontalAccuracy = position.accuracy;
+        timed.fix.verticalAccuracy = -1.0;
+        timed.fix.course = -1.0;
+        timed.fix.speed = -1.0;
+        walk.push_back(timed);
+    }
+    return walk;
+}
+
+/// The contacts of all paths in one store; none, and the reason in `error`, when one cannot be read.
+std::shared_ptr<platform::ContactStore> readContacts(const HostSettings& settings,
+                                                     const std::shared_ptr<linux_::PhonenumberLibrary>& phoneNumbers,
+                                                     platform::LogSink& log, std::string& error) {
+    const std::string country = settings.country.value_or("");
+    platform::ContactStore::Contacts all;
+    for (const std::string& path : settings.contacts) {
+        const auto loaded = linux_::VCardContactStore::load(path, phoneNumbers, country, log);
+        if (!loaded.result) {
+            error = "the contacts cannot be read: " + loaded.error.value_or(path);
+            return nullptr;
+        }
+        all.insert(all.end(), loaded.result->contacts().begin(), loaded.result->contacts().end());
+    }
+    return std::make_shared<linux_::MemoryContactStore>(std::move(all), phoneNumbers, country);
+}
+
+std::shared_ptr<linux_::QtLocalization> readTexts(const HostSettings& settings, std::string& error) {
+    auto texts = std::make_shared<linux_::QtLocalization>(settings.language);
+    const auto folder = resourceFolder() / "localization";
+    if (!texts->addBundle(linux_::QtLocalization::kSnippetsBundle, folder, "snippets") ||
+        !texts->addBundle(linux_::QtLocalization::kHostBundle, folder, "host")) {
+        error = "the program's texts cannot be read: " + folder.string();
+    }
+    return texts;
+}
+
+/// Lengths on maps are told in the units of the distances beside them, whatever decides those.
+platform::LengthSystem lengthSystem(const Platform& platform) {
+    platform::DistanceCalculator::Settings settings;
+    settings.defaultsSuite = "group.org.ktr";
+    settings.measurementSystemLocale = platform.region->localeIdentifier();
+    switch (platform.distanceCalculators->makeDistanceCalculator(settings)->measurementSystem()) {
+        case 1:
+            return platform::LengthSystem::UnitedStates;
+        case 2:
+            return platform::LengthSystem::UnitedKingdom;
+        default:
+            return platform::LengthSystem::Metric;
+    }
+}
+
+void addMaps(Platform& platform, const HostSettings& settings, LiveServices* live) {
+    platform.lengths = std::make_shared<linux_::IcuLengthFormatter>(
+        linux_::LocaleRegion(settings.region).localeWithLanguage(settings.language), lengthSystem(platform));
+    platform.mapsApplication = std::make_shared<linux_::DesktopMapsApplication>();
+    const auto maps = linux_::ConfiguredMaps::make(live ? live->configuration() : linux_::Configuration{},
+                                                   resourceFolder(), platform.mainLoop);
+    platform.maps = maps;
+    if (live) {
+        live->drawConfiguredMaps(maps);
+    }
+}
+
+void addUserInterface(Platform& platform, const HostSettings& settings, bool isWithoutWindow) {
+    auto device = std::make_shared<linux_::LinuxDevice>();
+    device->setUserInterfaceIdiom(settings.idiom);
+    device->setMainScreenScale(settings.scale);
+    device->setContentSizeCategory(settings.textSize);
+    platform.device = device;
+    platform.textEngine = std::make_shared<linux_::QtTextEngine>(QString::fromStdString(settings.language));
+    platform.images = std::make_shared<linux_::QtImageSource>((resourceFolder() / "images").string(), device);
+    auto appearance = std::make_shared<linux_::QtAppearance>();
+    // In real time without a window nobody watches: at any moment maps are where they would come to rest.
+    appearance->setReducesMotion(isWithoutWindow && settings.liveConfiguration.has_value());
+    platform.appearance = appearance;
+    platform.avatarImages = std::make_shared<linux_::QtAvatarImages>();
+    platform.monogramMakers = std::make_shared<linux_::QtMonogramMakerFactory>();
+}
+
+}  // namespace
+
+std::variant<Environment, Failure> Environment::make(const HostSettings& settings, bool isVirtual) {
+    Environment environment;
+    environment.platform = std::make_shared<Platform>();
+    Platform& platform = *environment.platform;
+    platform.logSink = std::make_shared<linux_::FilteredLogSink>(
+        std::make_shared<linux_::StderrLogSink>(linux_::StderrLogSink::environmentShowsPrivate()),
+        linux_::FilteredLogSink::environmentLevel());
+    const bool isLive = settings.liveConfiguration.has_value();
+    if (isVirtual && !isLive) {
+        environment.virtualTime = std::make_shared<platform::VirtualTime>(settings.start);
+        platform.mainLoop = environment.virtualTime;
+        platform.clock = environment.virtualTime;
+    } else {
+        platform.mainLoop = std::make_shared<linux_::QtMainLoop>();
+        platform.clock = isLive ? std::shared_ptr<platform::Clock>(std::make_shared<linux_::SystemClock>())
+                                : std::make_shared<ScenarioClock>(settings.start);
+    }
+    platform.calendar = std::make_shared<linux_::LocalCalendar>();
+    platform.assistant = std::make_shared<linux_::ConfiguredAssistant>(settings.language);
+    const auto region = std::make_shared<linux_::LocaleRegion>(settings.region);
+    platform.region = region;
+    platform.decimalNumbers =
+        std::make_shared<linux_::IcuNumberFormatter>(region->localeWithLanguage(settings.language));
+    platform.geodesy = std::make_shared<linux_::GeographicLibGeodesy>();
+    // A picture or a text must not depend on whose session it is made in.
+    using Distances = linux_::IcuDistanceCalculatorFactory;
+    platform.distanceCalculators = std::make_shared<Distances>(
+        platform.geodesy, isVirtual ? std::nullopt : std::optional(Distances::sessionPreferences()));
+    platform.locationManagers = std::make_shared<linux_::ScenarioLocationManagerFactory>(
+        walkOf(settings.positions), platform.mainLoop, platform.clock, platform.geodesy);
+    const auto phoneNumbers = std::make_shared<linux_::PhonenumberLibrary>();
+    platform.phoneNumbers = phoneNumbers;
+    platform.telephony = std::make_shared<linux_::SettingsTelephony>(settings.country);
+    platform.contactFormatter = std::make_shared<linux_::ScriptContactFormatter>();
+    platform.assistantContacts = std::make_shared<linux_::PrefixedAssistantContacts>();
+    std::string error;
+    platform.localization = readTexts(settings, error);
+    if (error.empty()) {
+        platform.contactStore = readContacts(settings, phoneNumbers, *platform.logSink, error);
+    }
+    if (!error.empty()) {
+        return Failure{ExitCode::Failure, error};
+    }
+    addUserInterface(platform, settings, isVirtual);
+    if (settings.userName) {
+        platform.accounts = std::make_shared<ScenarioAccounts>(*settings.userName);
+    }
+    if (isLive) {
+        environment.live = std::make_unique<LiveServices>(*settings.liveConfiguration);
+        environment.live->addTo(platform, settings.language, !settings.positions.empty());
+    }
+    addMaps(platform, settings, environment.live.get());
+    return environment;
+}
+
+}  // namespace ktr::host

@@ -1,0 +1,90 @@
+#include "host/HostSettings.h"
+
+#include <algorithm>
+
+#include "linux/locale/LocaleRegion.h"
+
+namespace ktr::host {
+
+namespace {
+
+constexpr double kLongestRun = 7.0 * 86400.0;
+
+/// The first scenario's answer to a question that it may leave open.
+template <class Member>
+auto firstOf(const std::vector<Scenario>& scenarios, Member member) {
+    for (const Scenario& scenario : scenarios) {
+        if (scenario.*member) {
+            return scenario.*member;
+        }
+    }
+    return decltype(std::declval<Scenario>().*member){};
+}
+
+template <class T>
+std::optional<T> either(const std::optional<T>& first, const std::optional<T>& second) {
+    return first ? first : second;
+}
+
+std::optional<std::string> countryOf(const std::string& locale) {
+    return linux_::LocaleRegion(locale).countryCode();
+}
+
+double usualWidth(platform::UserInterfaceIdiom idiom) {
+    return idiom == platform::UserInterfaceIdiom::Phone ? 400.0 : 1100.0;
+}
+
+}  // namespace
+
+std::variant<HostSettings, Failure> HostSettings::decide(const HostOptions& options,
+                                                         const std::vector<Scenario>& scenarios,
+                                                         const documents::IsoTime& now,
+                                                         const linux_::Configuration& configuration) {
+    HostSettings settings;
+    settings.language =
+        either(either(options.language, firstOf(scenarios, &Scenario::language)), configuration.language)
+            .value_or(linux_::LocaleRegion::sessionLanguage());
+    settings.region =
+        firstOf(scenarios, &Scenario::region)
+            .value_or(countryOf(settings.language) ? settings.language : linux_::LocaleRegion::sessionLocale());
+    settings.country = either(firstOf(scenarios, &Scenario::country), countryOf(settings.region));
+    settings.idiom =
+        either(options.idiom, firstOf(scenarios, &Scenario::idiom)).value_or(platform::UserInterfaceIdiom::Phone);
+    const auto usualSize = settings.idiom == platform::UserInterfaceIdiom::Display ? platform::ContentSizeCategory::XL
+                                                                                   : platform::ContentSizeCategory::L;
+    settings.textSize = either(options.textSize, firstOf(scenarios, &Scenario::textSize)).value_or(usualSize);
+    if (platform::isAccessibilityCategory(settings.textSize)) {
+        return Failure{ExitCode::NotDrawn,
+                       "the text sizes AX1 to AX5 cannot be drawn by this version; the largest is XXXL"};
+    }
+    settings.scale = options.scale;
+    settings.width = options.width > 0.0 ? options.width : usualWidth(settings.idiom);
+    settings.dark = either(options.dark, firstOf(scenarios, &Scenario::dark));
+    settings.userName = firstOf(scenarios, &Scenario::userName);
+    settings.highContrast = options.highContrast;
+    const documents::IsoTime start = firstOf(scenarios, &Scenario::clock).value_or(options.at.value_or(now));
+    settings.start = start.date;
+    settings.offsetSeconds = start.offsetSeconds;
+    if (options.atSeconds) {
+        settings.runSeconds = *options.atSeconds;
+    } else if (options.at) {
+        settings.runSeconds = options.at->date.secondsSinceReferenceDate - start.date.secondsSinceReferenceDate;
+        if (settings.runSeconds < 0.0 || settings.runSeconds > kLongestRun) {
+            return Failure{ExitCode::Usage, "--at: expected a time from the scenario's start to a week after it"};
+        }
+    }
+    for (const Scenario& scenario : scenarios) {
+        for (const std::string& path : scenario.contacts) {
+            if (std::find(settings.contacts.begin(), settings.contacts.end(), path) == settings.contacts.end()) {
+                settings.contacts.push_back(path);
+            }
+        }
+        if (settings.positions.empty()) {
+            settings.positions = scenario.positions;
+        }
+    }
+    settings.contacts.insert(settings.contacts.end(), configuration.contacts.begin(), configuration.contacts.end());
+    return settings;
+}
+
+}  // namespace ktr::host

@@ -1,0 +1,175 @@
+#include "host/conversation/CardView.h"
+
+#include <QPainter>
+#include <algorithm>
+#include <cmath>
+
+#include "host/conversation/Measures.h"
+#include "host/conversation/Shapes.h"
+#include "platform/assistant/AssistantSettings.h"
+#include "platform/base/Platform.h"
+#include "platform/ui/Window.h"
+
+namespace ktr::host {
+
+using namespace platform;
+
+namespace {
+
+bool rightToLeft() {
+    return Platform::installed()->assistant->languageIsRightToLeft();
+}
+
+}  // namespace
+
+/// What lies over the rows: the card's edge, and the focus ring.
+class CardView::Overlay : public View {
+  public:
+    Overlay() { setUserInteractionEnabled(false); }
+    std::optional<Rect> focus;
+
+  protected:
+    void draw(Canvas& canvas) const override {
+        auto* qt = qtCanvas(canvas);
+        if (qt == nullptr) {
+            return;
+        }
+        const auto& palette = qt->palette();
+        strokeInside(*qt, toQt(bounds()), measures::kCardCorner, palette.cardEdge.color, palette.cardEdge.width);
+        if (focus) {
+            constexpr double kInset = measures::kFocusInset;
+            strokeInside(*qt, toQt(*focus).adjusted(kInset, kInset, -kInset, -kInset), measures::kFocusCorner,
+                         palette.pine, palette.focusRing);
+        }
+    }
+};
+
+bool CardView::initWithFrame(const Rect& frame) {
+    if (!View::initWithFrame(frame)) {
+        return false;
+    }
+    icon_ = create<ImageView>(&ImageView::initWithFrame, Rect{});
+    title_ = create<Label>(&Label::initWithFrame, Rect{});
+    title_->setFont(preferredFont(TextStyle::Headline));
+    ring_ = create<RingView>(&RingView::initWithFrame, Rect{});
+    ring_->setHidden(true);
+    content_ = create<View>(&View::initWithFrame, Rect{});
+    overlay_ = create<Overlay>(&Overlay::initWithFrame, Rect{});
+    for (const std::shared_ptr<View>& view :
+         {std::shared_ptr<View>(icon_), std::shared_ptr<View>(title_), std::shared_ptr<View>(ring_), content_,
+          std::shared_ptr<View>(overlay_)}) {
+        addSubview(view);
+    }
+    return true;
+}
+
+void CardView::setController(const std::shared_ptr<HostSnippetViewController>& controller) {
+    controller_ = controller;
+    if (const auto header = controller->sashItem()) {
+        icon_->setImage(header->image());
+        title_->setText(header->title());
+    }
+    content_->addSubview(controller->view());
+    controller->updateViewConstraints();
+    controller->viewWillAppear(false);
+}
+
+double CardView::heightForWidth(double width) {
+    if (controller_) {
+        // Rows measure themselves at the width that they have: it is given first, the height follows.
+        content_->setFrame({0.0, measures::kHeaderHeight, width, contentHeight_});
+        content_->layoutIfNeeded();
+        contentHeight_ = std::max(controller_->desiredHeightForWidth(width), 0.0);
+        content_->setFrame({0.0, measures::kHeaderHeight, width, contentHeight_});
+        content_->layoutIfNeeded();
+    }
+    updateRing();
+    return measures::kHeaderHeight + contentHeight_;
+}
+
+void CardView::updateRing() {
+    ring_->setHidden(!controller_ || !controller_->isSearching());
+}
+
+void CardView::layoutSubviews() {
+    layOutHeader();
+    content_->setFrame({0.0, measures::kHeaderHeight, bounds().width, contentHeight_});
+    overlay_->setFrame(bounds());
+}
+
+void CardView::layOutHeader() {
+    const double width = bounds().width;
+    const bool rtl = rightToLeft();
+    const auto place = [&](View& view, const Rect& rect) { view.setFrame(mirrored(rect, width, rtl)); };
+    place(*icon_, {measures::kAxisAvatar - measures::kHeaderIcon / 2.0, measures::kHeaderIconTop, measures::kHeaderIcon,
+                   measures::kHeaderIcon});
+    const double ringStart = width - measures::kRingToEnd - measures::kRing;
+    const double titleEnd = ring_->hidden() ? width - measures::kCardInset : ringStart - measures::kCardInset;
+    const double titleHeight = title_->font().lineHeight();
+    place(*title_, {measures::kAxisText, std::floor((measures::kHeaderHeight - titleHeight) / 2.0),
+                    std::max(titleEnd - measures::kAxisText, 0.0), titleHeight});
+    place(*ring_, {ringStart, (measures::kHeaderHeight - measures::kRing) / 2.0, measures::kRing, measures::kRing});
+}
+
+void CardView::redraw(const std::optional<Rect>& rect) const {
+    const auto window = this->window();
+    if (rect && window) {
+        const Rect card = frameInRoot();
+        window->needsDisplay(rect->offsetBy(card.x, card.y));
+    }
+}
+
+void CardView::setHighlight(const std::optional<Rect>& rect) {
+    if (rect != highlight_) {
+        redraw(highlight_);
+        highlight_ = rect;
+        redraw(highlight_);
+    }
+}
+
+void CardView::setFocus(const std::optional<Rect>& rect) {
+    if (rect != overlay_->focus) {
+        redraw(overlay_->focus);
+        overlay_->focus = rect;
+        redraw(overlay_->focus);
+    }
+}
+
+namespace {
+
+/// The card without what lies far beyond the part that is painted: a shape costs by its height, and a long answer's is
+/// a hundred times the window's. The corners that it has instead are out of sight.
+QRectF visibleCard(linux_::QtCanvas& canvas, QRectF card) {
+    const QPainter& painter = canvas.painter();
+    if (painter.hasClipping()) {
+        constexpr double kBeyond = 2.0 * measures::kCardCorner + 2.0;
+        const QRectF visible = painter.clipBoundingRect();
+        card.setTop(std::max(card.top(), std::min(visible.top(), card.bottom()) - kBeyond));
+        card.setBottom(std::min(card.bottom(), std::max(visible.bottom(), card.top()) + kBeyond));
+    }
+    return card;
+}
+
+}  // namespace
+
+void CardView::draw(Canvas& canvas) const {
+    auto* qt = qtCanvas(canvas);
+    if (qt == nullptr) {
+        return;
+    }
+    if (opacity_ < 1.0) {
+        qt->painter().setOpacity(qt->painter().opacity() * opacity_);
+    }
+    const QPainterPath shape = roundedPath(visibleCard(*qt, toQt(bounds())), measures::kCardCorner);
+    fillPath(*qt, shape, qt->palette().card);
+    // Holds for everything in the card: the caller restores the canvas when it leaves the card.
+    qt->painter().setClipPath(shape, Qt::IntersectClip);
+    if (highlight_) {
+        const QRectF row = qt->snapped(*highlight_);
+        qt->painter().fillRect(row, qt->palette().highlight);
+        const auto& edge = qt->palette().highlightEdge;
+        strokeInside(*qt, row, 0.0, edge.color, edge.width);
+    }
+}
+
+}  // namespace ktr::host

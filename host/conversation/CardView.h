@@ -1,0 +1,61 @@
+#pragma once
+
+#include <memory>
+#include <optional>
+
+#include "host/conversation/RingView.h"
+#include "platform/host/HostSnippetViewController.h"
+#include "platform/ui/ImageView.h"
+#include "platform/ui/Label.h"
+#include "platform/ui/View.h"
+
+namespace ktr::host {
+
+/// An answer: a header and the plugin's own view, cut to rounded corners. The highlight lies under the plugin's rows
+/// and the focus ring over them; neither touches them. Main thread.
+class CardView : public platform::View {
+  public:
+    bool initWithFrame(const platform::Rect& frame) override;
+
+    /// Puts the controller's view under the header, and tells the controller that it appears.
+    void setController(const std::shared_ptr<platform::HostSnippetViewController>& controller);
+    const std::shared_ptr<platform::HostSnippetViewController>& controller() const { return controller_; }
+    /// Asks the controller for its height at this width and lays everything out; the card's height, points.
+    double heightForWidth(double width);
+    void layoutSubviews() override;
+    platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Group; }
+
+    /// The plugin's part of the card.
+    const std::shared_ptr<platform::View>& content() const { return content_; }
+    const std::shared_ptr<RingView>& ring() const { return ring_; }
+    /// Shows the ring as long as the controller searches. The controller does not tell when that ends: whoever turns
+    /// the ring asks here.
+    void updateRing();
+
+    /// Rectangles in the card's coordinates; none: nothing is marked.
+    void setHighlight(const std::optional<platform::Rect>& rect);
+    void setFocus(const std::optional<platform::Rect>& rect);
+    /// How much of the card is seen, from 0 to 1.
+    void setOpacity(double opacity) { opacity_ = opacity; }
+
+  protected:
+    void draw(platform::Canvas& canvas) const override;
+
+  private:
+    class Overlay;
+
+    void layOutHeader();
+    void redraw(const std::optional<platform::Rect>& rect) const;
+
+    std::shared_ptr<platform::HostSnippetViewController> controller_;
+    std::shared_ptr<platform::ImageView> icon_;
+    std::shared_ptr<platform::Label> title_;
+    std::shared_ptr<RingView> ring_;
+    std::shared_ptr<platform::View> content_;
+    std::shared_ptr<Overlay> overlay_;
+    std::optional<platform::Rect> highlight_;
+    double contentHeight_ = 0.0;
+    double opacity_ = 1.0;
+};
+
+}  // namespace ktr::host

@@ -1,0 +1,21 @@
+#pragma once
+
+#include "platform/ui/View.h"
+
+namespace ktr::host {
+
+/// Shows its subviews as faintly as it is told. Main thread.
+class FadeView : public platform::View {
+  public:
+    /// From 0 to 1.
+    double opacity() const { return opacity_; }
+    void setOpacity(double opacity);
+
+  protected:
+    void draw(platform::Canvas& canvas) const override;
+
+  private:
+    double opacity_ = 1.0;
+};
+
+}  // namespace ktr::host

@@ -1,0 +1,45 @@
+#include "host/conversation/RingView.h"
+
+#include <QPainter>
+
+#include "host/conversation/Measures.h"
+#include "host/conversation/Shapes.h"
+
+namespace ktr::host {
+
+void RingView::setTurn(double turn) {
+    if (turn != turn_) {
+        turn_ = turn;
+        setNeedsDisplay();
+    }
+}
+
+void RingView::setShare(double share) {
+    if (share != share_) {
+        share_ = share;
+        setNeedsDisplay();
+    }
+}
+
+void RingView::draw(platform::Canvas& canvas) const {
+    auto* qt = qtCanvas(canvas);
+    if (qt == nullptr) {
+        return;
+    }
+    constexpr double kTrackAlpha = 0.2;
+    const double half = measures::kRingStroke / 2.0;
+    const QRectF circle = toQt(bounds()).adjusted(half, half, -half, -half);
+    QColor track = qt->palette().pine;
+    track.setAlphaF(static_cast<float>(kTrackAlpha));
+    QPainterPath whole;
+    whole.addEllipse(circle);
+    qt->painter().strokePath(whole, QPen(track, measures::kRingStroke));
+    // Qt counts angles from three o'clock, counter-clockwise.
+    const double start = 90.0 - 360.0 * turn_;
+    QPainterPath arc;
+    arc.arcMoveTo(circle, start);
+    arc.arcTo(circle, start, -360.0 * share_);
+    qt->painter().strokePath(arc, QPen(qt->palette().pine, measures::kRingStroke, Qt::SolidLine, Qt::RoundCap));
+}
+
+}  // namespace ktr::host

@@ -1,0 +1,246 @@
+#include "host/conversation/TurnView.h"
+
+#include <QPainter>
+#include <algorithm>
+
+#include "host/conversation/Measures.h"
+#include "host/conversation/Shapes.h"
+#include "host/conversation/WideColumns.h"
+#include "platform/assistant/AssistantSettings.h"
+#include "platform/base/Platform.h"
+
+namespace ktr::host {
+
+using namespace platform;
+
+namespace {
+
+/// What is said beside or above the card: a group of its own, so that it is read before the card wherever it stands.
+class SpeechView : public View {
+  public:
+    AccessibilityRole accessibilityRole() const override { return AccessibilityRole::Group; }
+};
+
+bool rightToLeft() {
+    return Platform::installed()->assistant->languageIsRightToLeft();
+}
+
+/// The end edge as an alignment: a natural one has no name for it.
+TextAlignment endAlignment() {
+    return rightToLeft() ? TextAlignment::Left : TextAlignment::Right;
+}
+
+void place(View& view, const Rect& rect, double parentWidth) {
+    view.setFrame(mirrored(rect, parentWidth, rightToLeft()));
+}
+
+}  // namespace
+
+bool TurnView::initWithFrame(const Rect& frame) {
+    if (!View::initWithFrame(frame)) {
+        return false;
+    }
+    speech_ = create<SpeechView>(&SpeechView::initWithFrame, Rect{});
+    time_ = create<Label>(&Label::initWithFrame, Rect{});
+    time_->setFont(preferredFont(TextStyle::Footnote));
+    bubble_ = create<BubbleView>(&BubbleView::initWithFrame, Rect{});
+    sentence_ = create<Label>(&Label::initWithFrame, Rect{});
+    sentence_->setFont(preferredFont(TextStyle::Body));
+    sentence_->setNumberOfLines(0);
+    sentence_->setLineBreakMode(LineBreakMode::WordWrapping);
+    card_ = create<CardView>(&CardView::initWithFrame, Rect{});
+    card_->setHidden(true);
+    speech_->addSubview(time_);
+    speech_->addSubview(bubble_);
+    speech_->addSubview(sentence_);
+    addSubview(speech_);
+    addSubview(card_);
+    return true;
+}
+
+void TurnView::setTexts(const TurnTexts& texts) {
+    texts_ = texts;
+    bubble_->setText(texts.question);
+    bubble_->setHidden(texts.question.empty());
+    setSentence(texts.sentence);
+}
+
+void TurnView::setSentence(const std::string& sentence) {
+    texts_.sentence = sentence;
+    sentence_->setText(sentence);
+    sentence_->setHidden(sentence.empty());
+}
+
+void TurnView::setController(const std::shared_ptr<HostSnippetViewController>& controller) {
+    card_->setController(controller);
+    card_->setHidden(false);
+}
+
+double TurnView::sentenceHeight(double width) const {
+    return wrappedSize(sentence_->text(), sentence_->font(), width).size.height;
+}
+
+double TurnView::layOut(double width, bool first) {
+    places_.width = width;
+    if (width >= measures::kWideFrom) {
+        layOutWide(width);
+    } else {
+        layOutNarrow(width, first);
+    }
+    if (!card_->hidden()) {
+        setCardHeight(card_->heightForWidth(places_.card.width), places_.card.width);
+    }
+    placeAnswer();
+    return height_;
+}
+
+void TurnView::layOutNarrow(double width, bool first) {
+    const double cardTop = layOutNarrowSpeech(width, first);
+    speech_->setFrame({0.0, 0.0, width, cardTop});
+    places_.least = cardTop;
+    places_.card = {measures::kGutter, cardTop, width - 2.0 * measures::kGutter, 0.0};
+}
+
+void TurnView::setCardHeight(double height, double width) {
+    const bool moves = style_ == MotionStyle::Full && laidOutCard_ == width;
+    laidOutCard_ = width;
+    if (!moves) {
+        growth_ = Motion(height);
+    } else if (height != growth_.target()) {
+        growth_ = Motion(growth_.at(now_), height, now_, motions::kGrowth);
+    }
+}
+
+void TurnView::placeAnswer() {
+    const double rise = riseOf(answerArrival_);
+    if (sentenceFade_) {
+        place(*sentenceFade_, places_.sentence.offsetBy(0.0, rise), places_.sentenceParent);
+        sentence_->setFrame(sentenceFade_->bounds());
+    } else {
+        place(*sentence_, places_.sentence, places_.sentenceParent);
+    }
+    height_ = places_.least;
+    if (!card_->hidden()) {
+        Rect card = places_.card.offsetBy(0.0, rise);
+        card.height = growth_.at(now_);
+        place(*card_, card, places_.width);
+        height_ = std::max(height_, places_.card.y + card.height);
+    }
+}
+
+double TurnView::riseOf(const Motion& arrival) const {
+    return style_ == MotionStyle::Full ? motions::kRise * (1.0 - arrival.at(now_)) : 0.0;
+}
+
+double TurnView::cardOpacity() const {
+    return arrival_.at(now_) * answerArrival_.at(now_);
+}
+
+void TurnView::arrive(double now) {
+    if (style_ != MotionStyle::None) {
+        arrival_ = Motion(0.0, 1.0, now, style_ == MotionStyle::Full ? motions::kArrival : motions::kFade);
+    }
+}
+
+void TurnView::answerArrives(double now) {
+    if (style_ != MotionStyle::None) {
+        if (!sentenceFade_) {
+            sentenceFade_ = create<FadeView>(&FadeView::initWithFrame, Rect{});
+            speech_->addSubview(sentenceFade_);
+            sentenceFade_->addSubview(sentence_);
+        }
+        answerArrival_ = Motion(0.0, 1.0, now, style_ == MotionStyle::Full ? motions::kArrival : motions::kFade);
+    }
+}
+
+bool TurnView::advance(double now) {
+    const auto isOver = [&](double moment) {
+        return arrival_.isOver(moment) && answerArrival_.isOver(moment) && growth_.isOver(moment);
+    };
+    const bool moved = !isOver(now_);
+    now_ = now;
+    const bool moves = !isOver(now);
+    if (moved || moves) {
+        if (sentenceFade_) {
+            sentenceFade_->setOpacity(answerArrival_.at(now));
+        }
+        card_->setOpacity(answerArrival_.at(now));
+        placeAnswer();
+        setNeedsDisplay();
+    }
+    return moves;
+}
+
+void TurnView::draw(Canvas& canvas) const {
+    auto* qt = qtCanvas(canvas);
+    const double opacity = arrival_.at(now_);
+    if (qt != nullptr && opacity < 1.0) {
+        // Holds for everything in the turn: the caller restores the canvas when it leaves it.
+        qt->painter().setOpacity(qt->painter().opacity() * opacity);
+    }
+}
+
+double TurnView::layOutNarrowSpeech(double width, bool first) {
+    double y = 0.0;
+    time_->setHidden(!first || texts_.longTime.empty());
+    if (!time_->hidden()) {
+        time_->setText(texts_.longTime);
+        time_->setTextAlignment(TextAlignment::Center);
+        y += measures::kTimeAbove;
+        place(*time_, {measures::kGutter, y, width - 2.0 * measures::kGutter, time_->font().lineHeight()}, width);
+        y += time_->font().lineHeight() + measures::kTimeBelow;
+    } else {
+        y += first ? measures::kTimeAbove : measures::kCardToQuestion;
+    }
+    if (!bubble_->hidden()) {
+        const Size size =
+            bubble_->sizeForWidth(std::min(width * measures::kBubbleShare, width - 2.0 * measures::kGutter));
+        place(*bubble_, {width - measures::kGutter - size.width, y, size.width, size.height}, width);
+        y += size.height + (sentence_->hidden() ? measures::kSentenceToCard : measures::kQuestionToSentence);
+    }
+    if (!sentence_->hidden()) {
+        const double room = width - 2.0 * measures::kSentenceStart;
+        const double height = sentenceHeight(room);
+        sentence_->setTextAlignment(TextAlignment::Natural);
+        places_.sentence = {measures::kSentenceStart, y, room, height};
+        places_.sentenceParent = width;
+        y += height + measures::kSentenceToCard;
+    }
+    return y;
+}
+
+void TurnView::layOutWide(double width) {
+    const WideColumns columns = WideColumns::of(width);
+    const double speechHeight = layOutWideSpeech();
+    place(*speech_, {columns.speechStart, 0.0, measures::kSpeechColumn, speechHeight}, width);
+    places_.least = speechHeight;
+    places_.card = {columns.cardStart, 0.0, columns.cardWidth, 0.0};
+}
+
+double TurnView::layOutWideSpeech() {
+    constexpr double kColumn = measures::kSpeechColumn;
+    constexpr double kTextWidth = kColumn - measures::kSpeechInset;
+    double y = 0.0;
+    if (!bubble_->hidden()) {
+        const Size size = bubble_->sizeForWidth(kColumn);
+        place(*bubble_, {kColumn - size.width, y, size.width, size.height}, kColumn);
+        y += size.height + measures::kQuestionToSentence;
+    }
+    if (!sentence_->hidden()) {
+        const double height = sentenceHeight(kTextWidth);
+        sentence_->setTextAlignment(endAlignment());
+        places_.sentence = {0.0, y, kTextWidth, height};
+        places_.sentenceParent = kColumn;
+        y += height + measures::kSentenceToTime;
+    }
+    time_->setHidden(texts_.shortTime.empty());
+    if (!time_->hidden()) {
+        time_->setText(texts_.shortTime);
+        time_->setTextAlignment(endAlignment());
+        place(*time_, {0.0, y, kTextWidth, time_->font().lineHeight()}, kColumn);
+        y += time_->font().lineHeight();
+    }
+    return y;
+}
+
+}  // namespace ktr::host

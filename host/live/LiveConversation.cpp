@@ -1,0 +1,213 @@
+#include "host/live/LiveConversation.h"
+
+#include <utility>
+
+#include "host/scenario/ScenarioReader.h"
+#include "platform/base/Clock.h"
+#include "platform/base/MainLoop.h"
+#include "platform/base/Utf8.h"
+
+namespace ktr::host {
+
+using platform::HttpFailure;
+
+namespace {
+
+/// How long the status line says that a position is looked for, seconds.
+constexpr double kFindingPosition = 20.0;
+
+std::string trimmed(const std::string& text) {
+    constexpr const char* kBlanks = " \t\r\n";
+    const auto first = text.find_first_not_of(kBlanks);
+    if (first == std::string::npos) {
+        return "";
+    }
+    std::string whole = text.substr(first, text.find_last_not_of(kBlanks) - first + 1);
+    if (whole.size() > LiveConversation::kLongestQuestion) {
+        std::size_t end = LiveConversation::kLongestQuestion;
+        while (end > 0 && (static_cast<unsigned char>(whole[end]) & 0xC0u) == 0x80u) {
+            --end;
+        }
+        whole.resize(end);
+    }
+    return whole;
+}
+
+std::string reasonOf(const linux_::AssistantClient::Answer& answer) {
+    switch (answer.failure) {
+        case HttpFailure::BadRequest:
+            return "the configuration names no host";
+        case HttpFailure::Tls:
+            return "its host could not prove who it is";
+        case HttpFailure::Timeout:
+            return "it took too long";
+        case HttpFailure::TooLarge:
+            return "its answer is too large";
+        case HttpFailure::RedirectRefused:
+            return "its answer is a redirect";
+        case HttpFailure::Cancelled:
+            return "cancelled";
+        case HttpFailure::Network:
+            return "no connection, or a broken one";
+        case HttpFailure::None:
+            break;
+    }
+    return "it answers with the status " + std::to_string(answer.status);
+}
+
+}  // namespace
+
+std::shared_ptr<LiveConversation> LiveConversation::make(Host& host) {
+    std::shared_ptr<LiveConversation> live(new LiveConversation(host));
+    host.live()->setChanged([weak = std::weak_ptr<LiveConversation>(live)] {
+        if (const auto self = weak.lock()) {
+            self->tellChanged();
+        }
+    });
+    return live;
+}
+
+platform::Date LiveConversation::now() const {
+    return host_.platform()->clock->now();
+}
+
+void LiveConversation::tellChanged() {
+    if (handlers_.changed) {
+        handlers_.changed();
+    }
+}
+
+void LiveConversation::start(std::vector<Scenario> scenarios) {
+    scenarios_ = std::move(scenarios);
+    host_.live()->start([weak = weak_from_this()] {
+        if (const auto self = weak.lock()) {
+            self->accountRead();
+        }
+    });
+}
+
+void LiveConversation::accountRead() {
+    ready_ = true;
+    for (const Scenario& scenario : std::exchange(scenarios_, {})) {
+        if (auto failure = host_.addTurn(scenario)) {
+            failure_ = std::move(failure);
+            continue;
+        }
+        shown();
+        if (handlers_.asked) {
+            handlers_.asked(*host_.conversation()->turns().back());
+        }
+    }
+    sendNext();
+    tellChanged();
+}
+
+void LiveConversation::ask(const std::string& text) {
+    const std::string question = trimmed(text);
+    if (question.empty()) {
+        return;
+    }
+    const auto turn = host_.addQuestion(question);
+    if (handlers_.asked) {
+        handlers_.asked(*turn);
+    }
+    ++asking_;
+    askedAt_ = now();
+    waiting_.emplace_back(turn, question);
+    sendNext();
+    tellChanged();
+}
+
+void LiveConversation::sendNext() {
+    if (!ready_ || underWay_ || waiting_.empty()) {
+        return;
+    }
+    const auto [turn, question] = std::move(waiting_.front());
+    waiting_.pop_front();
+    underWay_ = true;
+    // The assistant's client ends before the loop does, and what it posts after this has gone does nothing.
+    platform::MainLoop* const mainLoop = host_.platform()->mainLoop.get();
+    host_.live()->assistant().ask(question, [weak = weak_from_this(), mainLoop, asked = turn](auto answer) {
+        mainLoop->post([weak, asked, answer = std::move(answer)] {
+            if (const auto self = weak.lock()) {
+                self->receive(asked, answer);
+            }
+        });
+    });
+}
+
+void LiveConversation::receive(const std::weak_ptr<TurnView>& weakTurn, const linux_::AssistantClient::Answer& answer) {
+    underWay_ = false;
+    if (--asking_ == 0) {
+        askedAt_.reset();
+    }
+    if (const auto turn = weakTurn.lock()) {
+        host_.answer(*turn, read(answer));
+        if (!turn->card()->hidden()) {
+            shown();
+        }
+        if (handlers_.answered) {
+            handlers_.answered(*turn);
+        }
+    }
+    sendNext();
+    tellChanged();
+}
+
+Scenario LiveConversation::read(const linux_::AssistantClient::Answer& answer) {
+    failure_.reset();
+    Scenario scenario;
+    assistantIsAway_ = !answer.hasBody();
+    if (!answer.hasBody()) {
+        failure_ = Failure{ExitCode::Failure, "the assistant cannot be asked: " + reasonOf(answer)};
+        scenario.sentence =
+            LocalizedText(host_.text(host_.live()->isSignedIn() ? "ANSWER_UNREACHABLE" : "ANSWER_SIGN_IN"));
+        return scenario;
+    }
+    auto read = ScenarioReader(now(), ScenarioReader::Clock::Present).readText(answer.body, "the assistant's answer");
+    if (const auto* error = std::get_if<documents::DocumentError>(&read)) {
+        failure_ = Failure{ExitCode::Failure, error->text()};
+        return scenario;
+    }
+    return std::get<Scenario>(std::move(read));
+}
+
+void LiveConversation::shown() {
+    shownAt_ = now();
+    if (positions_ || !host_.live()->looksForPosition()) {
+        return;
+    }
+    positions_ = host_.platform()->locationManagers->makeManager(nullptr);
+    positions_->setDelegate(weak_from_this());
+    positions_->setDesiredAccuracy(platform::kLocationAccuracyNearestTenMeters);
+    findingPosition_ = positions_->location() == nullptr;
+    if (findingPosition_) {
+        positions_->startUpdatingLocation();
+    }
+}
+
+void LiveConversation::didUpdateLocations(platform::PlatformLocationManager& manager,
+                                          const platform::PlatformLocations&) {
+    manager.stopUpdatingLocation();
+    findingPosition_ = false;
+    tellChanged();
+}
+
+LiveStatus LiveConversation::status() const {
+    LiveStatus::Facts facts;
+    facts.ready = ready_;
+    facts.signedIn = host_.live()->isSignedIn();
+    facts.asking = askedAt_;
+    facts.assistantIsAway = assistantIsAway_;
+    facts.shown = shownAt_;
+    facts.now = now();
+    facts.findingPosition =
+        findingPosition_ && shownAt_ &&
+        facts.now.secondsSinceReferenceDate - shownAt_->secondsSinceReferenceDate < kFindingPosition;
+    facts.hidden = host_.saysHidden();
+    facts.service = host_.live()->service().notes();
+    return LiveStatus::of(facts, {[this](const std::string& key) { return host_.text(key); },
+                                  [this](platform::Date moment) { return host_.clockFace(moment); }});
+}
+
+}  // namespace ktr::host

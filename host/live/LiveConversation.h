@@ -1,0 +1,76 @@
+#pragma once
+
+#include <deque>
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+#include <variant>
+#include <vector>
+
+#include "host/Host.h"
+#include "host/live/LiveStatus.h"
+#include "platform/location/PlatformLocationManager.h"
+
+namespace ktr::host {
+
+/// Asks the assistant questions and puts the answers into a host's conversation; knows what the status line says. The
+/// host is a live one and outlives this. Main thread.
+class LiveConversation : public platform::PlatformLocationManagerDelegate,
+                         public std::enable_shared_from_this<LiveConversation> {
+  public:
+    /// Longer questions are cut to so many bytes.
+    static constexpr std::size_t kLongestQuestion = 2000;
+
+    struct Handlers {
+        std::function<void(TurnView&)> asked;     ///< a turn came: a question, or a scenario's
+        std::function<void(TurnView&)> answered;  ///< a question's turn has its answer
+        std::function<void()> changed;            ///< what `status` says may be another
+    };
+
+    static std::shared_ptr<LiveConversation> make(Host& host);
+
+    void setHandlers(Handlers handlers) { handlers_ = std::move(handlers); }
+    /// Reads the account; the scenarios and the questions that were asked meanwhile come after that.
+    void start(std::vector<Scenario> scenarios = {});
+    /// Blanks at both ends do not count; a question of nothing else is none.
+    void ask(const std::string& question);
+
+    LiveStatus status() const;
+    /// Whether questions, or the account, are still waited for.
+    bool isWaiting() const { return !ready_ || asking_ > 0; }
+    /// Why the last question, or the last scenario, has no answer; none when it has one.
+    const std::optional<Failure>& failure() const { return failure_; }
+
+    void didUpdateLocations(platform::PlatformLocationManager&, const platform::PlatformLocations&) override;
+
+  private:
+    explicit LiveConversation(Host& host) : host_(host) {}
+    void accountRead();
+    /// Sends the question that waits longest, unless one is under way.
+    void sendNext();
+    void receive(const std::weak_ptr<TurnView>& turn, const linux_::AssistantClient::Answer& answer);
+    /// What to show for an answer; sets `failure_`.
+    Scenario read(const linux_::AssistantClient::Answer& answer);
+    void shown();
+    void tellChanged();
+    platform::Date now() const;
+
+    Host& host_;
+    Handlers handlers_;
+    bool ready_ = false;
+    /// In the order they were asked. One at a time is sent: a question may be a wish, such as to hide, and the last one
+    /// has to be honoured last.
+    std::deque<std::pair<std::weak_ptr<TurnView>, std::string>> waiting_;
+    bool underWay_ = false;
+    std::vector<Scenario> scenarios_;
+    int asking_ = 0;  ///< under way, or waiting
+    std::optional<platform::Date> askedAt_;
+    bool assistantIsAway_ = false;
+    std::optional<platform::Date> shownAt_;
+    std::optional<Failure> failure_;
+    std::shared_ptr<platform::PlatformLocationManager> positions_;
+    bool findingPosition_ = false;
+};
+
+}  // namespace ktr::host

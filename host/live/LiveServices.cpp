@@ -1,0 +1,133 @@
+#include "host/live/LiveServices.h"
+
+#include <utility>
+#include <variant>
+
+#include "host/Resources.h"
+#include "linux/configuration/ConfigurationReader.h"
+#include "linux/configuration/ConfiguredGeography.h"
+#include "linux/configuration/ConfiguredRestrictions.h"
+#include "linux/configuration/FilePreferences.h"
+#include "linux/configuration/XdgFolders.h"
+#include "linux/device/LogindLock.h"
+#include "linux/device/SystemDeviceInformation.h"
+#include "linux/maps/ConfiguredMaps.h"
+#include "linux/net/QtHttpTransport.h"
+#include "linux/net/RememberedHostTransport.h"
+#include "linux/positions/ConfiguredPositions.h"
+#include "platform/base/MainLoop.h"
+#include "platform/client/DeviceOwnerAccount.h"
+
+namespace ktr::host {
+
+namespace {
+
+/// Where the plugin keeps its preferences.
+constexpr const char* kPreferences = "org.ktr.snippets";
+
+linux_::QtHttpTransport::Settings transportSettings(const linux_::ConfiguredAccountStore& accounts) {
+    const auto configuration = accounts.configuration();
+    linux_::QtHttpTransport::Settings settings;
+    if (configuration.account) {
+        settings.serviceHost = configuration.account->host;
+        settings.domains = configuration.account->domains;
+    }
+    settings.certificateFiles = configuration.certificates;
+    return settings;
+}
+
+}  // namespace
+
+LiveServices::LiveServices(std::filesystem::path configurationFile)
+    : file_(std::move(configurationFile)), accounts_(std::make_shared<linux_::ConfiguredAccountStore>(file_)) {
+    // What is wrong with the file is told when the account is read.
+    auto read = linux_::ConfigurationReader::readFile(file_);
+    if (auto* configuration = std::get_if<linux_::Configuration>(&read)) {
+        configuration_ = std::move(*configuration);
+    }
+}
+
+LiveServices::~LiveServices() {
+    *alive_ = false;
+    if (service_) {
+        service_->setChanged(nullptr);
+    }
+}
+
+void LiveServices::addTo(platform::Platform& platform, const std::string& language, bool ownPositions) {
+    mainLoop_ = platform.mainLoop;
+    platform.accounts = accounts_;
+    platform.deviceInformation = std::make_shared<linux_::SystemDeviceInformation>();
+    platform.deviceLock = std::make_shared<linux_::LogindLock>();
+    platform.restrictions = std::make_shared<linux_::ConfiguredRestrictions>(accounts_);
+    platform.geographicSettings = std::make_shared<linux_::ConfiguredGeography>(accounts_);
+    const auto preferences = std::make_shared<linux_::FilePreferences>(linux_::XdgFolders::state() / "preferences");
+    preferences->load(kPreferences);
+    platform.preferences = preferences;
+    if (!ownPositions) {
+        platform.locationManagers =
+            linux_::ConfiguredPositions::make(configuration_.positions, mainLoop_, platform.clock, platform.geodesy);
+    }
+    looksForPosition_ =
+        ownPositions || configuration_.positions.source != linux_::Configuration::Positions::Source::None;
+    const auto transport =
+        std::make_shared<linux_::QtHttpTransport>([accounts = accounts_] { return transportSettings(*accounts); });
+    service_ = std::make_shared<ServiceWatch>(
+        std::make_shared<linux_::RememberedHostTransport>(transport, preferences, kPreferences), mainLoop_,
+        platform.clock);
+    platform.httpTransport = service_;
+    assistant_ = std::make_unique<linux_::AssistantClient>([accounts = accounts_, language] {
+        const auto settings = transportSettings(*accounts);
+        return linux_::AssistantClient::Settings{settings.serviceHost, settings.certificateFiles, language};
+    });
+    service_->setChanged([this] {
+        if (changed_) {
+            changed_();
+        }
+    });
+}
+
+void LiveServices::start(std::function<void()> ready) {
+    platform::MainLoop* const mainLoop = mainLoop_.get();
+    mainLoop->runInBackground([this, mainLoop, accounts = accounts_, alive = std::weak_ptr<bool>(alive_),
+                               ready = std::move(ready)] {
+        accounts->load();
+        mainLoop->post([this, accounts, alive, ready] {
+            const auto still = alive.lock();
+            if (!still || !*still) {
+                return;
+            }
+            watcher_ =
+                std::make_unique<linux_::ConfigurationWatcher>(accounts, mainLoop_, [this] { configurationChanged(); });
+            ready();
+        });
+    });
+}
+
+void LiveServices::drawConfiguredMaps(std::shared_ptr<linux_::ThreadedMapSource> maps) {
+    maps_ = std::move(maps);
+}
+
+void LiveServices::configurationChanged() {
+    const auto now = accounts_->configuration();
+    if (maps_ && (now.maps != configuration_.maps || now.certificates != configuration_.certificates)) {
+        configuration_.maps = now.maps;
+        configuration_.certificates = now.certificates;
+        maps_->setGrounds(linux_::ConfiguredMaps::grounds(now, resourceFolder()));
+    }
+    if (changed_) {
+        changed_();
+    }
+}
+
+bool LiveServices::isSignedIn() const {
+    const auto account = accounts_->deviceOwnerAccount();
+    return account && account->personIdentifier() && account->hostNameOfType(platform::kFriendLocationService) &&
+           account->tokenOfType(platform::kFriendLocationService);
+}
+
+void LiveServices::setChanged(std::function<void()> changed) {
+    changed_ = std::move(changed);
+}
+
+}  // namespace ktr::host

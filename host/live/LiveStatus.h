@@ -1,0 +1,54 @@
+#pragma once
+
+#include <functional>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "host/live/ServiceWatch.h"
+#include "platform/base/Date.h"
+
+namespace ktr::host {
+
+/// What the status line says of a live conversation. A value.
+struct LiveStatus {
+    /// What stands before the words; the words carry the meaning alone.
+    enum class Mark { None, Live, Waiting, Warning, Hidden };
+
+    /// What there is to know.
+    struct Facts {
+        bool ready = false;     ///< the account has been read
+        bool signedIn = false;  ///< there is an account with a token
+        /// Since when a question waits for its answer.
+        std::optional<platform::Date> asking;
+        /// The last question found no assistant.
+        bool assistantIsAway = false;
+        /// When what is on screen was first known; none: nothing is on screen.
+        std::optional<platform::Date> shown;
+        /// The user's position is still looked for.
+        bool findingPosition = false;
+        /// What is on screen last says that friends cannot see the user.
+        bool hidden = false;
+        ServiceWatch::Notes service;
+        platform::Date now;
+    };
+
+    /// A text of the host by its key, and the clock face of a moment.
+    struct Words {
+        std::function<std::string(const std::string& key)> text;
+        std::function<std::string(platform::Date moment)> clock;
+    };
+
+    /// A question that is answered within this time is not called waiting, seconds.
+    static constexpr double kPatience = 0.5;
+    /// Younger than this is "just now", seconds.
+    static constexpr double kJustNow = 15.0;
+
+    static LiveStatus of(const Facts& facts, const Words& words);
+
+    Mark mark = Mark::None;
+    std::string words;  ///< empty: the line is empty
+    bool operator==(const LiveStatus&) const = default;
+};
+
+}  // namespace ktr::host

@@ -1,0 +1,150 @@
+#include "host/scenario/AssistantObjectReader.h"
+
+#include "documents/Words.h"
+#include "host/scenario/Scenario.h"
+
+namespace ktr::host {
+
+using namespace platform;
+
+namespace {
+
+/// Parts of a snippet may leave their kind out, since their place tells it; a wrong one is a slip.
+void expectKind(documents::FieldReader& fields, const std::string& expected) {
+    const auto kind = fields.string("kind");
+    if (kind && *kind != expected) {
+        fields.complain("kind", "expected " + documents::inQuotes(expected) + ", found " + documents::inQuotes(*kind));
+    }
+}
+
+void readContext(documents::FieldReader& fields, VASnippet& snippet) {
+    if (auto context = fields.string("searchContext")) {
+        snippet.searchContext = Url::fromText(*context);
+        if (!snippet.searchContext) {
+            fields.complain("searchContext", "expected a URL, without white space");
+        }
+    }
+}
+
+/// What every kind of place has.
+void readPlace(documents::FieldReader& fields, VALocation& place) {
+    place.latitude = fields.number("latitude");
+    place.longitude = fields.number("longitude");
+    place.accuracy = fields.number("accuracy");
+    place.label = fields.string("label");
+    place.street = fields.string("street");
+}
+
+}  // namespace
+
+std::shared_ptr<AssistantObject> AssistantObjectReader::readSnippet(documents::FieldReader& fields,
+                                                                    std::string& kind) const {
+    const auto named = fields.string("kind");
+    if (!named) {
+        fields.complain("", "expected a member \"kind\" such as \"VAKtrLocationSnippet\"");
+        return nullptr;
+    }
+    kind = *named;
+    if (kind == "VAKtrLocationSnippet") {
+        return readLocationSnippet(fields);
+    }
+    if (kind == "VAKtrGeoFenceSnippet") {
+        return readGeoFenceSnippet(fields);
+    }
+    if (kind == "VAKtrVisibilityView") {
+        return readVisibilityView(fields);
+    }
+    return std::make_shared<UnknownAssistantObject>(kind);
+}
+
+std::shared_ptr<VAKtrLocationSnippet> AssistantObjectReader::readLocationSnippet(documents::FieldReader& fields) const {
+    auto snippet = std::make_shared<VAKtrLocationSnippet>();
+    readContext(fields, *snippet);
+    snippet->proximity = fields.string("proximity");
+    auto locations = std::make_shared<LocationList>();
+    fields.objects("locations",
+                   [&](documents::FieldReader& location) { locations->push_back(readLocation(location)); });
+    snippet->locations = std::move(locations);
+    return snippet;
+}
+
+std::shared_ptr<VAKtrGeoFenceSnippet> AssistantObjectReader::readGeoFenceSnippet(documents::FieldReader& fields) const {
+    auto snippet = std::make_shared<VAKtrGeoFenceSnippet>();
+    readContext(fields, *snippet);
+    fields.object("cueKtrGeoFence",
+                  [&](documents::FieldReader& fence) { snippet->cueKtrGeoFence = readGeoFence(fence); });
+    return snippet;
+}
+
+std::shared_ptr<VAKtrVisibilityView> AssistantObjectReader::readVisibilityView(documents::FieldReader& fields) const {
+    auto snippet = std::make_shared<VAKtrVisibilityView>();
+    readContext(fields, *snippet);
+    snippet->visible = fields.boolean("visible").value_or(false);
+    return snippet;
+}
+
+std::shared_ptr<VAKtrGeoFence> AssistantObjectReader::readGeoFence(documents::FieldReader& fields) const {
+    expectKind(fields, "VAKtrGeoFence");
+    auto fence = std::make_shared<VAKtrGeoFence>();
+    fields.object("friend", [&](documents::FieldReader& person) { fence->friend_ = readPersonAttribute(person); });
+    fence->geoFenceTrigger = fields.string("geoFenceTrigger");
+    fields.object("location", [&](documents::FieldReader& place) {
+        expectKind(place, "VALocation");
+        fence->location = std::make_shared<VALocation>();
+        readPlace(place, *fence->location);
+    });
+    return fence;
+}
+
+std::shared_ptr<VAKtrLocation> AssistantObjectReader::readLocation(documents::FieldReader& fields) const {
+    expectKind(fields, "VAKtrLocation");
+    auto location = std::make_shared<VAKtrLocation>();
+    fields.object("friend", [&](documents::FieldReader& person) { location->friend_ = readPersonAttribute(person); });
+    readPlace(fields, *location);
+    location->distance = fields.number("distance");
+    location->city = fields.string("city");
+    location->stateCode = fields.string("stateCode");
+    location->locationDate = readLocationDate(fields);
+    return location;
+}
+
+std::optional<double> AssistantObjectReader::readLocationDate(documents::FieldReader& fields) const {
+    const auto date = fields.number("locationDate");
+    const auto age = fields.number("ageSeconds");
+    if (date && age) {
+        fields.complain("ageSeconds", "expected either locationDate or ageSeconds, found both");
+    }
+    return age ? std::optional(now_.secondsSinceReferenceDate - *age) : date;
+}
+
+std::shared_ptr<VAPersonAttribute> AssistantObjectReader::readPersonAttribute(documents::FieldReader& fields) const {
+    expectKind(fields, "VAPersonAttribute");
+    auto attribute = std::make_shared<VAPersonAttribute>();
+    attribute->data = fields.string("data");
+    fields.object("object", [&](documents::FieldReader& person) { attribute->object = readPerson(person); });
+    return attribute;
+}
+
+std::shared_ptr<VAPerson> AssistantObjectReader::readPerson(documents::FieldReader& fields) const {
+    expectKind(fields, "VAPerson");
+    auto person = std::make_shared<VAPerson>();
+    person->fullName = fields.string("fullName");
+    person->firstName = fields.string("firstName");
+    person->lastName = fields.string("lastName");
+    person->identifier = fields.string("identifier");
+    fields.objects("emails", [&](documents::FieldReader& email) {
+        expectKind(email, "VAEmail");
+        auto object = std::make_shared<VAEmail>();
+        object->emailAddress = email.string("emailAddress");
+        person->emails.push_back(std::move(object));
+    });
+    fields.objects("phones", [&](documents::FieldReader& phone) {
+        expectKind(phone, "VAPhone");
+        auto object = std::make_shared<VAPhone>();
+        object->number = phone.string("number");
+        person->phones.push_back(std::move(object));
+    });
+    return person;
+}
+
+}  // namespace ktr::host

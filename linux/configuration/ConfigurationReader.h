@@ -1,0 +1,26 @@
+#pragma once
+
+#include <filesystem>
+#include <string>
+#include <variant>
+
+#include "linux/configuration/Configuration.h"
+
+namespace ktr::linux_ {
+
+/// Reads the configuration file. Any thread; it reads the disk.
+class ConfigurationReader {
+  public:
+    /// One line that names the file, the place in it and what was expected there:
+    /// `/home/ann/.config/ktr/config.json: $.account.personId: expected a text, found a number`.
+    struct Error {
+        std::string text;
+    };
+
+    /// A file that does not exist reads as an empty one: nobody is signed in and everything has its default.
+    static std::variant<Configuration, Error> readFile(const std::filesystem::path& file);
+    /// `file` names the text in messages; relative paths inside it start from its folder.
+    static std::variant<Configuration, Error> readText(const std::string& text, const std::filesystem::path& file);
+};
+
+}  // namespace ktr::linux_

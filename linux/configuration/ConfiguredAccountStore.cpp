@@ -1,0 +1,135 @@
+#include "linux/configuration/ConfiguredAccountStore.h"
+
+#include <variant>
+
+#include "linux/configuration/ConfigurationReader.h"
+#include "linux/configuration/SecretModule.h"
+#include "linux/configuration/TokenFile.h"
+#include "linux/device/LoadableModule.h"
+#include "platform/base/Log.h"
+
+namespace ktr::linux_ {
+
+namespace {
+
+/// Long enough for somebody to type a keyring's password.
+constexpr double kSecretSeconds = 60.0;
+
+}  // namespace
+
+class ConfiguredAccountStore::OwnerAccount : public platform::DeviceOwnerAccount {
+  public:
+    OwnerAccount(Configuration::Account account, std::optional<std::string> token)
+        : account_(std::move(account)), token_(std::move(token)) {}
+
+    std::optional<std::string> personIdentifier() const override { return account_.personId; }
+    std::optional<std::string> userName() const override { return account_.userName; }
+    std::optional<std::string> tokenOfType(int type) const override {
+        return type == platform::kFriendLocationService ? token_ : std::nullopt;
+    }
+    std::optional<std::string> hostNameOfType(int type) const override {
+        return type == platform::kFriendLocationService ? account_.host : std::nullopt;
+    }
+    bool operator==(const OwnerAccount& other) const { return account_ == other.account_ && token_ == other.token_; }
+
+  private:
+    Configuration::Account account_;
+    std::optional<std::string> token_;
+};
+
+ConfiguredAccountStore::ConfiguredAccountStore(const std::filesystem::path& configurationFile)
+    : ConfiguredAccountStore(configurationFile, askSecretService) {}
+
+ConfiguredAccountStore::ConfiguredAccountStore(const std::filesystem::path& configurationFile, Secrets secrets)
+    : file_(std::filesystem::absolute(configurationFile)), secrets_(std::move(secrets)) {}
+
+ConfiguredAccountStore::~ConfiguredAccountStore() = default;
+
+std::optional<std::string> ConfiguredAccountStore::askSecretService(const std::string& person, const std::string& host,
+                                                                    std::string& problem) {
+    void* entry = LoadableModule::entry("libktr-secret.so", kSecretModuleEntry, problem);
+    if (entry == nullptr) {
+        return std::nullopt;
+    }
+    const std::unique_ptr<SecretModule> module(reinterpret_cast<SecretModuleEntry>(entry)());
+    return module ? module->lookUp(person, host, kSecretSeconds, problem) : std::nullopt;
+}
+
+std::optional<std::string> ConfiguredAccountStore::readToken(const Configuration::Account& account,
+                                                             std::string& problem) const {
+    std::string secretProblem;
+    if (!account.tokenFile && account.host) {
+        if (const auto secret = secrets_(account.personId, *account.host, secretProblem)) {
+            // Tools that read a secret from a pipe keep the line end that came with it.
+            auto token = TokenFile::tokenIn(*secret);
+            problem = token ? "" : "the Secret Service's secret is refused: expected one line of at most 16 KiB";
+            return token;
+        }
+    }
+    const auto read =
+        TokenFile::read(account.tokenFile ? std::filesystem::path(*account.tokenFile) : file_.parent_path() / "token");
+    if (const auto* token = std::get_if<std::string>(&read)) {
+        return *token;
+    }
+    const auto& error = std::get<TokenFile::Error>(read);
+    problem = error.text;
+    if (!account.tokenFile && error.missing) {
+        problem = "no app token: the Secret Service has none" +
+                  (secretProblem.empty() ? std::string() : " (" + secretProblem + ")") + ", and " + error.text;
+    }
+    return std::nullopt;
+}
+
+bool ConfiguredAccountStore::load() {
+    auto read = ConfigurationReader::readFile(file_);
+    std::string problem;
+    std::shared_ptr<OwnerAccount> account;
+    auto* configuration = std::get_if<Configuration>(&read);
+    if (configuration == nullptr) {
+        problem = std::get<ConfigurationReader::Error>(read).text;
+    } else if (configuration->account) {
+        account = std::make_shared<OwnerAccount>(*configuration->account, readToken(*configuration->account, problem));
+    }
+    if (!problem.empty()) {
+        platform::platformLog().write(platform::LogLevel::Error, "account: %@",
+                                      platform::FormatArgument(problem).shown());
+    }
+    const std::lock_guard<std::mutex> lock(mutex_);
+    problem_ = problem;
+    if (configuration == nullptr) {
+        return false;
+    }
+    const bool sameAccount = account && account_ ? *account == *account_ : account == account_;
+    const bool changed = !sameAccount || !(*configuration == configuration_);
+    configuration_ = std::move(*configuration);
+    if (!sameAccount) {
+        account_ = std::move(account);
+    }
+    return changed;
+}
+
+Configuration ConfiguredAccountStore::configuration() const {
+    const std::lock_guard<std::mutex> lock(mutex_);
+    return configuration_;
+}
+
+std::string ConfiguredAccountStore::problem() const {
+    const std::lock_guard<std::mutex> lock(mutex_);
+    return problem_;
+}
+
+std::filesystem::path ConfiguredAccountStore::tokenFile() const {
+    const std::lock_guard<std::mutex> lock(mutex_);
+    if (!configuration_.account) {
+        return {};
+    }
+    return configuration_.account->tokenFile ? std::filesystem::path(*configuration_.account->tokenFile)
+                                             : file_.parent_path() / "token";
+}
+
+std::shared_ptr<platform::DeviceOwnerAccount> ConfiguredAccountStore::deviceOwnerAccount() const {
+    const std::lock_guard<std::mutex> lock(mutex_);
+    return account_;
+}
+
+}  // namespace ktr::linux_

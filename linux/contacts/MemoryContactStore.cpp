@@ -1,0 +1,170 @@
+#include "linux/contacts/MemoryContactStore.h"
+
+#include <algorithm>
+#include <array>
+#include <cstdint>
+#include <cstdio>
+#include <string_view>
+#include <utility>
+
+#include <unicode/uchar.h>
+
+#include "platform/base/Utf8.h"
+
+namespace ktr::linux_ {
+
+namespace {
+
+/// Numbers that are the same share at least this many digits at their end.
+constexpr std::size_t kSharedDigits = 6;
+
+/// The number without what follows an extension mark: "... ext. 12", "... x12", "...;ext=12", "...#12".
+std::string_view withoutExtension(std::string_view number) {
+    const auto mark = number.find_last_of("xX#;,");
+    if (mark == std::string_view::npos || mark == 0) {
+        return number;
+    }
+    const auto semicolon = number.find(';');
+    if (semicolon != std::string_view::npos) {
+        return number.substr(0, semicolon);
+    }
+    const std::string lower = platform::asciiLowercased(number);
+    const auto word = lower.find("ext");
+    return number.substr(0, word == std::string::npos ? mark : word);
+}
+
+/// Decimal digits of every script as ASCII, letters as the keypad's digits, all else dropped.
+std::string digitsOf(std::string_view number) {
+    constexpr std::string_view keypad = "22233344455566677778889999";
+    std::string out;
+    for (std::size_t at = 0; at < number.size();) {
+        const auto step = platform::decodeUtf8(number, at);
+        at += step.length;
+        const auto c = static_cast<UChar32>(step.codePoint);
+        if (const int digit = u_charDigitValue(c); digit >= 0) {
+            out += static_cast<char>('0' + digit);
+        } else if (c >= 'a' && c <= 'z') {
+            out += keypad[static_cast<std::size_t>(c - 'a')];
+        } else if (c >= 'A' && c <= 'Z') {
+            out += keypad[static_cast<std::size_t>(c - 'A')];
+        }
+    }
+    return out;
+}
+
+std::string lastDigits(const std::string& digits) {
+    return digits.size() <= kSharedDigits ? digits : digits.substr(digits.size() - kSharedDigits);
+}
+
+std::string withoutScheme(const std::string& number) {
+    return platform::asciiLowercased(number.substr(0, 4)) == "tel:" ? number.substr(4) : number;
+}
+
+/// The same card gives the same identifier at every start.
+std::string madeIdentifier(const platform::Contact& contact) {
+    // 64-bit FNV-1a.
+    std::uint64_t hash = 0xcbf29ce484222325;
+    const auto add = [&hash](const std::string& text) {
+        for (const char c : text + '\n') {
+            hash = (hash ^ static_cast<unsigned char>(c)) * 0x100000001b3;
+        }
+    };
+    add(contact.storedFullName);
+    add(contact.givenName);
+    add(contact.familyName);
+    add(contact.organizationName);
+    for (const auto& email : contact.emailAddresses) {
+        add(email.value);
+    }
+    for (const auto& phone : contact.phoneNumbers) {
+        add(phone.value);
+    }
+    std::array<char, 24> text{};
+    std::snprintf(text.data(), text.size(), "card-%016llx", static_cast<unsigned long long>(hash));
+    return text.data();
+}
+
+}  // namespace
+
+MemoryContactStore::MemoryContactStore(Contacts contacts, std::shared_ptr<PhonenumberLibrary> phoneNumbers,
+                                       std::string homeCountryCode)
+    : contacts_(std::move(contacts)),
+      phoneNumbers_(std::move(phoneNumbers)),
+      homeCountryCode_(std::move(homeCountryCode)) {
+    for (std::size_t position = 0; position < contacts_.size(); ++position) {
+        platform::Contact& contact = *contacts_[position];
+        if (contact.identifier.empty()) {
+            contact.identifier = madeIdentifier(contact);
+        }
+        // Two cards may claim one identifier: the later ones are counted, so that each can be found.
+        const std::string claimed = contact.identifier;
+        for (int count = 2; !byIdentifier_.emplace(contact.identifier, position).second; ++count) {
+            contact.identifier = claimed + "#" + std::to_string(count);
+        }
+        for (const auto& email : contact.emailAddresses) {
+            byEmail_[platform::asciiLowercased(email.value)].push_back(position);
+        }
+        for (std::size_t number = 0; number < contact.phoneNumbers.size(); ++number) {
+            const auto digits = digitsOf(withoutExtension(withoutScheme(contact.phoneNumbers[number].value)));
+            if (!digits.empty()) {
+                byLastDigits_[lastDigits(digits)].push_back({position, number});
+            }
+        }
+    }
+}
+
+MemoryContactStore::~MemoryContactStore() = default;
+
+platform::ContactStore::Contacts MemoryContactStore::contactsAt(std::vector<std::size_t> positions) const {
+    std::sort(positions.begin(), positions.end());
+    positions.erase(std::unique(positions.begin(), positions.end()), positions.end());
+    Contacts out;
+    out.reserve(positions.size());
+    for (const std::size_t position : positions) {
+        out.push_back(contacts_[position]);
+    }
+    return out;
+}
+
+platform::ContactFetch<platform::ContactStore::Contacts> MemoryContactStore::unifiedContactsMatchingEmailAddress(
+    const std::string& address, const platform::ContactKeys&) {
+    const auto found = byEmail_.find(platform::asciiLowercased(address));
+    return {found == byEmail_.end() ? Contacts() : contactsAt(found->second), std::nullopt};
+}
+
+bool MemoryContactStore::matches(const std::string& stored, const std::string& asked,
+                                 const std::optional<PhoneNumberParts>& askedParts) const {
+    const auto storedParts = phoneNumbers_->parts(stored, homeCountryCode_);
+    if (!storedParts || !askedParts) {
+        return digitsOf(withoutScheme(stored)) == digitsOf(withoutScheme(asked));
+    }
+    return storedParts->complete && askedParts->complete ? storedParts->e164 == askedParts->e164
+                                                         : storedParts->nationalPart == askedParts->nationalPart;
+}
+
+platform::ContactFetch<platform::ContactStore::Contacts> MemoryContactStore::unifiedContactsMatchingPhoneNumber(
+    const std::string& number, const platform::ContactKeys&) {
+    const auto candidates = byLastDigits_.find(lastDigits(digitsOf(withoutExtension(withoutScheme(number)))));
+    if (candidates == byLastDigits_.end()) {
+        return {{}, std::nullopt};
+    }
+    const auto parts = phoneNumbers_->parts(number, homeCountryCode_);
+    std::vector<std::size_t> positions;
+    for (const StoredNumber& candidate : candidates->second) {
+        if (matches(contacts_[candidate.contact]->phoneNumbers[candidate.number].value, number, parts)) {
+            positions.push_back(candidate.contact);
+        }
+    }
+    return {contactsAt(std::move(positions)), std::nullopt};
+}
+
+platform::ContactFetch<std::shared_ptr<platform::Contact>> MemoryContactStore::unifiedContactWithIdentifier(
+    const std::string& identifier, const platform::ContactKeys&) {
+    const auto found = byIdentifier_.find(identifier);
+    if (found == byIdentifier_.end()) {
+        return {nullptr, "no contact has this identifier"};
+    }
+    return {contacts_[found->second], std::nullopt};
+}
+
+}  // namespace ktr::linux_

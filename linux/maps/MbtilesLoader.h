@@ -1,0 +1,18 @@
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "tiles/MbtilesFile.h"
+
+namespace ktr::linux_ {
+
+/// Opens MBTiles files with SQLite, which is loaded with the first of them.
+class MbtilesLoader {
+  public:
+    /// None, with a reason in `error`: missing, no database, damaged, locked for writing, without tiles. Waits for the
+    /// disk: not on the main thread.
+    static std::shared_ptr<tiles::MbtilesFile> open(const std::string& path, std::string& error);
+};
+
+}  // namespace ktr::linux_

@@ -1,0 +1,24 @@
+#pragma once
+
+#include <QRectF>
+
+#include "linux/paint/Palette.h"
+#include "platform/ui/Image.h"
+
+class QPainter;
+
+namespace ktr::linux_ {
+
+/// A picture that a QtCanvas draws. Immutable to its users. Main thread.
+class QtImage : public platform::Image {
+  public:
+    /// Fills `rect` of the painter's coordinates, at the best resolution that the painter's device shows. `palette`
+    /// decides between the variants of an image that differs by appearance.
+    virtual void draw(QPainter& painter, const QRectF& rect, const Palette& palette) const = 0;
+
+  protected:
+    /// Device pixels a unit of the painter's coordinates; for vector output a resolution that prints well.
+    static double pixelsPerUnit(const QPainter& painter);
+};
+
+}  // namespace ktr::linux_

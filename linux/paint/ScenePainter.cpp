@@ -1,0 +1,178 @@
+#include "linux/paint/ScenePainter.h"
+
+#include <QBuffer>
+#include <QHashFunctions>
+#include <QImageWriter>
+#include <QPageSize>
+#include <QPainter>
+#include <QPdfWriter>
+#include <QSaveFile>
+#include <QSvgGenerator>
+#include <cmath>
+
+#include "linux/paint/PngEncoder.h"
+
+namespace ktr::linux_ {
+
+namespace {
+
+int pixels(double points, double scale) {
+    return static_cast<int>(std::ceil(points * scale - 1e-6));
+}
+
+std::string numbered(int width, int height) {
+    return std::to_string(width) + " x " + std::to_string(height) + " pixels";
+}
+
+std::string failure(const std::string& path, const QString& reason) {
+    return path + ": cannot be written: " + reason.toStdString();
+}
+
+class FixedHashes {
+  public:
+    FixedHashes() { QHashSeed::setDeterministicGlobalSeed(); }
+    ~FixedHashes() { QHashSeed::resetRandomGlobalSeed(); }
+    FixedHashes(const FixedHashes&) = delete;
+    FixedHashes& operator=(const FixedHashes&) = delete;
+};
+
+/// The creation date in a PDF would make each run's file another one.
+QByteArray withoutDates(QByteArray pdf) {
+    for (const QByteArray& key : {QByteArray("/CreationDate (D:"), QByteArray("/ModDate (D:")}) {
+        const qsizetype at = pdf.indexOf(key);
+        if (at < 0) {
+            continue;
+        }
+        for (qsizetype i = at + key.size(); i < pdf.size() && pdf[i] != ')'; ++i) {
+            if (pdf[i] >= '0' && pdf[i] <= '9') {
+                pdf[i] = '0';
+            }
+        }
+    }
+    return pdf;
+}
+
+}  // namespace
+
+ScenePainter::ScenePainter(platform::Size size, double scale, const Palette& palette)
+    : size_(size), scale_(scale), palette_(palette), background_(palette.window) {}
+
+std::optional<std::string> ScenePainter::refusal() const {
+    if (!(scale_ > 0.0) || !(size_.width > 0.0) || !(size_.height > 0.0) || !std::isfinite(size_.width * scale_) ||
+        !std::isfinite(size_.height * scale_)) {
+        return "there is nothing to draw";
+    }
+    if (size_.width * scale_ > kMostPixels || size_.height * scale_ > kMostPixels) {
+        const bool countable = size_.width * scale_ < 1e9 && size_.height * scale_ < 1e9;
+        return (countable
+                    ? "the picture would be " + numbered(pixels(size_.width, scale_), pixels(size_.height, scale_))
+                    : std::string("the picture is far too large")) +
+               "; at most " + std::to_string(kMostPixels) + " a side can be drawn. A smaller scale may help";
+    }
+    return std::nullopt;
+}
+
+void ScenePainter::paintOn(QPaintDevice& device, double painterScale, double pixelsPerDeviceUnit,
+                           const Paint& paint) const {
+    QPainter painter(&device);
+    painter.setRenderHints(QPainter::Antialiasing | QPainter::TextAntialiasing | QPainter::SmoothPixmapTransform);
+    painter.scale(painterScale, painterScale);
+    QtCanvas canvas(painter, palette_, pixelsPerDeviceUnit);
+    if (background_.alpha() > 0) {
+        painter.fillRect(QRectF(0, 0, size_.width + 1.0, size_.height + 1.0), background_);
+    }
+    paint(canvas);
+}
+
+QImage ScenePainter::image(const Paint& paint) const {
+    if (refusal()) {
+        return {};
+    }
+    QImage image(pixels(size_.width, scale_), pixels(size_.height, scale_), QImage::Format_ARGB32_Premultiplied);
+    if (image.isNull()) {
+        return image;
+    }
+    image.fill(Qt::transparent);
+    paintOn(image, scale_, 1.0, paint);
+    return image;
+}
+
+bool ScenePainter::writeSvg(QIODevice& file, const Paint& paint) const {
+    QSvgGenerator generator;
+    generator.setOutputDevice(&file);
+    const QSize whole(pixels(size_.width, 1.0), pixels(size_.height, 1.0));
+    generator.setSize(whole);
+    generator.setViewBox(QRect(QPoint(0, 0), whole));
+    generator.setResolution(96);
+    generator.setTitle(title_);
+    paintOn(generator, 1.0, scale_, paint);
+    return true;
+}
+
+bool ScenePainter::writePdf(QIODevice& file, const Paint& paint) const {
+    // Fonts stand in the file in the order of a hash: with a random seed each run would write another file.
+    const FixedHashes fixed;
+    QByteArray data;
+    QBuffer buffer(&data);
+    buffer.open(QIODevice::WriteOnly);
+    {
+        QPdfWriter writer(&buffer);
+        writer.setTitle(title_);
+        writer.setCreator(QStringLiteral("ktr"));
+        const QPageSize page(QSizeF(size_.width, size_.height), QPageSize::Point, QString(), QPageSize::ExactMatch);
+        writer.setPageSize(page);
+        writer.setPageMargins(QMarginsF(0, 0, 0, 0));
+        // A resolution above 72 keeps hairlines and letters in their places; the painter's unit stays the point.
+        constexpr int kResolution = 720;
+        writer.setResolution(kResolution);
+        const double unitsPerPoint = kResolution / 72.0;
+        paintOn(writer, unitsPerPoint, scale_ / unitsPerPoint, paint);
+    }
+    return file.write(withoutDates(std::move(data))) >= 0;
+}
+
+std::optional<std::string> ScenePainter::write(const std::string& path, const Paint& paint) const {
+    if (const auto reason = refusal()) {
+        return path + ": " + *reason;
+    }
+    const QString name = QString::fromStdString(path);
+    const QString format = name.section(u'.', -1).toLower();
+    const bool known = format == u"png" || format == u"svg" || format == u"pdf";
+    if (!known || !name.contains(u'.')) {
+        return path + ": the name must end in .png, .svg or .pdf";
+    }
+    QSaveFile file(name);
+    if (!file.open(QIODevice::WriteOnly)) {
+        return failure(path, file.errorString());
+    }
+    if (format == u"png") {
+        const QImage picture = image(paint);
+        if (picture.isNull()) {
+            return path + ": there is not enough memory for the picture";
+        }
+        if (const QByteArray data = encodedAsPng(picture); !data.isEmpty()) {
+            file.write(data);  // an error is seen at the commit
+        } else if (QImageWriter writer(&file, "png"); !writer.write(picture)) {
+            return failure(path, file.error() != QFileDevice::NoError ? file.errorString() : writer.errorString());
+        }
+    } else if (format == u"svg") {
+        writeSvg(file, paint);
+    } else {
+        writePdf(file, paint);
+    }
+    if (!file.commit()) {
+        return failure(path, file.errorString());
+    }
+    return std::nullopt;
+}
+
+ScenePainter::Paint ScenePainter::view(const std::shared_ptr<platform::View>& view) {
+    return [view](QtCanvas& canvas) {
+        if (view) {
+            view->layoutIfNeeded();
+            view->paint(canvas, view->bounds());
+        }
+    };
+}
+
+}  // namespace ktr::linux_

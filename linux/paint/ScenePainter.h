@@ -1,0 +1,59 @@
+#pragma once
+
+#include <QImage>
+#include <QString>
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "linux/paint/Palette.h"
+#include "linux/paint/QtCanvas.h"
+#include "platform/base/Geometry.h"
+#include "platform/ui/View.h"
+
+namespace ktr::linux_ {
+
+/// Makes pictures of views: pixels in memory, or a file. The same views give the same picture, run after run. Main
+/// thread, while a QGuiApplication exists.
+class ScenePainter {
+  public:
+    /// Paints the scene on a canvas whose coordinates are points.
+    using Paint = std::function<void(QtCanvas&)>;
+
+    /// Neither side of a picture may have more pixels.
+    static constexpr int kMostPixels = 32000;
+
+    /// `size` in points; `scale` is pixels a point (and the grid that a vector picture snaps to).
+    ScenePainter(platform::Size size, double scale, const Palette& palette);
+
+    /// What lies behind the scene; the palette's window colour unless set. A transparent colour leaves PNG and SVG
+    /// transparent.
+    void setBackground(const QColor& color) { background_ = color; }
+    /// A title for the file; SVG and PDF only.
+    void setTitle(const QString& title) { title_ = title; }
+
+    /// Why no picture of this size and scale can be made, or none.
+    std::optional<std::string> refusal() const;
+    /// A null image when refused.
+    QImage image(const Paint& paint) const;
+    /// Writes the format that the file's name ends in: .png, .svg or .pdf (one page). The file appears whole or not at
+    /// all: it is written beside its place and renamed. None, or an error that names the file and the reason.
+    std::optional<std::string> write(const std::string& path, const Paint& paint) const;
+
+    /// Lays out a view and gives the painting of it, at the scene's origin.
+    static Paint view(const std::shared_ptr<platform::View>& view);
+
+  private:
+    void paintOn(QPaintDevice& device, double painterScale, double pixelsPerDeviceUnit, const Paint& paint) const;
+    bool writeSvg(class QIODevice& file, const Paint& paint) const;
+    bool writePdf(class QIODevice& file, const Paint& paint) const;
+
+    platform::Size size_;
+    double scale_;
+    const Palette& palette_;
+    QColor background_;
+    QString title_;
+};
+
+}  // namespace ktr::linux_

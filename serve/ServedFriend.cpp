@@ -1,0 +1,65 @@
+#include "serve/ServedFriend.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace ktr::serve {
+
+namespace {
+
+std::string comparable(const std::string& handle) {
+    const bool email = handle.find('@') != std::string::npos;
+    std::string text;
+    for (const char c : handle) {
+        if (email) {
+            text += c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
+        } else if ((c >= '0' && c <= '9') || c == '+') {
+            text += c;
+        }
+    }
+    return text;
+}
+
+}  // namespace
+
+std::optional<Waypoint> ServedFriend::placeAt(double seconds) const {
+    if (track.empty() || hidden || seconds < locatedAfter) {
+        return std::nullopt;
+    }
+    const double end = track.back().at;
+    const double moment = repeats && end > 0.0 && seconds > end ? std::fmod(seconds, end) : seconds;
+    const auto next = std::upper_bound(track.begin(), track.end(), moment,
+                                       [](double at, const Waypoint& waypoint) { return at < waypoint.at; });
+    if (next == track.begin()) {
+        return track.front();
+    }
+    Waypoint place = *(next - 1);
+    if (next != track.end()) {
+        const double part = (moment - place.at) / (next->at - place.at);
+        place.latitude += part * (next->latitude - place.latitude);
+        place.longitude += part * (next->longitude - place.longitude);
+    }
+    return place;
+}
+
+std::string ServedFriend::handle() const {
+    return !emails.empty() ? emails.front() : !phones.empty() ? phones.front() : "";
+}
+
+ServedFriend FriendsFile::defaultUser() {
+    ServedFriend user;
+    user.fullName = "Mara Lind";
+    user.firstName = "Mara";
+    user.lastName = "Lind";
+    user.emails = {"mara.lind@harbour.example"};
+    return user;
+}
+
+bool ServedFriend::answersTo(const std::string& handle) const {
+    const std::string wanted = comparable(handle);
+    const auto same = [&](const std::string& own) { return comparable(own) == wanted; };
+    return !wanted.empty() &&
+           (std::any_of(emails.begin(), emails.end(), same) || std::any_of(phones.begin(), phones.end(), same));
+}
+
+}  // namespace ktr::serve

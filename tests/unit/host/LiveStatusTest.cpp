@@ -1,0 +1,51 @@
+#include "host/live/LiveStatus.h"
+
+#include <gtest/gtest.h>
+
+namespace ktr::test {
+
+using host::LiveStatus;
+using platform::Date;
+
+class LiveStatusTest : public ::testing::Test {
+  protected:
+    LiveStatusTest() {
+        facts.ready = true;
+        facts.signedIn = true;
+        facts.shown = Date{100.0};
+        facts.now = Date{105.0};
+    }
+    std::string words() const { return status().words; }
+    LiveStatus status() const {
+        return LiveStatus::of(facts,
+                              {[](const std::string& key) { return key; }, [](Date) { return std::string("17:42"); }});
+    }
+    LiveStatus::Facts facts;
+};
+
+TEST_F(LiveStatusTest, AnswerOnScreen_IsLive) {
+    EXPECT_EQ(status(), (LiveStatus{LiveStatus::Mark::Live, "STATUS_LIVE_NOW"}));
+}
+
+TEST_F(LiveStatusTest, HiddenUser_IsSaidInsteadOfHowLiveTheAnswerIs) {
+    facts.hidden = true;
+    EXPECT_EQ(status(), (LiveStatus{LiveStatus::Mark::Hidden, "STATUS_HIDDEN"}));
+    facts.now = Date{100000.0};
+    EXPECT_EQ(words(), "STATUS_HIDDEN") << "that does not grow old";
+}
+
+TEST_F(LiveStatusTest, TroubleGoesBeforeHiding) {
+    facts.hidden = true;
+    facts.assistantIsAway = true;
+    EXPECT_EQ(status().mark, LiveStatus::Mark::Warning);
+    facts.signedIn = false;
+    EXPECT_EQ(words(), "STATUS_SIGN_IN");
+}
+
+TEST_F(LiveStatusTest, QuestionUnderWayGoesBeforeHiding) {
+    facts.hidden = true;
+    facts.asking = Date{104.0};
+    EXPECT_EQ(words(), "STATUS_ASKING");
+}
+
+}  // namespace ktr::test
