@@ -11,15 +11,15 @@
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     using ktr::fuzz::require;
     const std::string_view text(reinterpret_cast<const char*>(data), size);
-    const host::ScenarioReader reader(ktr::platform::Date{790171200.0});
+    const ktr::host::ScenarioReader reader(ktr::platform::Date{790171200.0});
     const auto read = reader.readText(text, "fuzz.json");
-    if (const auto* error = std::get_if<documents::DocumentError>(&read)) {
+    if (const auto* error = std::get_if<ktr::documents::DocumentError>(&read)) {
         const std::string line = error->text();
         require(!error->message.empty() && line.find_first_of("\n\r\x1b") == std::string::npos, "an error is one line");
         require(ktr::platform::isValidUtf8(line), "an error is UTF-8");
         return 0;
     }
-    const auto& scenario = std::get<host::Scenario>(read);
+    const auto& scenario = std::get<ktr::host::Scenario>(read);
     // A question that the assistant does not understand is answered by a sentence alone.
     require(scenario.snippet != nullptr || !scenario.sentence.empty(), "a scenario has an answer");
     if (scenario.snippet) {
