@@ -41,7 +41,7 @@ platform::HttpAnswer answerOf(const std::uint8_t* data, std::size_t size) {
         answer.json = Value(fuzz::DictionaryMaker(data + 1, size - 1).answer());
         return answer;
     }
-    auto read = documents::JsonReader::read({reinterpret_cast<const char*>(data + 1), size - 1});
+    auto read = ktr::documents::JsonReader::read({reinterpret_cast<const char*>(data + 1), size - 1});
     if (auto* value = std::get_if<Value>(&read)) {
         answer.json = std::move(*value);
     }

@@ -31,11 +31,11 @@ void check(const MapTile& tile) {
     for (const auto& name : tile.names) {
         require(name.size() <= VectorTileDecoder::kLongestName && ktr::platform::isValidUtf8(name), "names are text");
     }
-    auto kind = tiles::MapKind::BuiltUp;
+    auto kind = ktr::tiles::MapKind::BuiltUp;
     for (const auto& feature : tile.features) {
         require(feature.kind >= kind, "features are sorted");
         kind = feature.kind;
-        require(static_cast<std::size_t>(feature.kind) < tiles::kMapKinds, "kinds are known");
+        require(static_cast<std::size_t>(feature.kind) < ktr::tiles::kMapKinds, "kinds are known");
         require(feature.partCount > 0 && feature.firstPart + feature.partCount <= tile.partEnds.size(),
                 "a feature has its parts");
         require(feature.name < static_cast<std::int32_t>(tile.names.size()), "a feature has its name");
@@ -47,7 +47,7 @@ void check(const MapTile& tile) {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     constexpr std::size_t kLargest = std::size_t{1} << 20;
-    const auto unpacked = tiles::gunzip({reinterpret_cast<const char*>(data), size}, kLargest);
+    const auto unpacked = ktr::tiles::gunzip({reinterpret_cast<const char*>(data), size}, kLargest);
     if (!unpacked) {
         return 0;
     }
