@@ -96,10 +96,15 @@ platform::LengthSystem lengthSystem(const Platform& platform) {
     }
 }
 
-void addMaps(Platform& platform, const HostSettings& settings, LiveServices* live) {
+void addMaps(Platform& platform, const HostSettings& settings, LiveServices* live, const Platform* earlier) {
     platform.lengths = std::make_shared<linux_::IcuLengthFormatter>(
         linux_::LocaleRegion(settings.region).localeWithLanguage(settings.language), lengthSystem(platform));
     platform.mapsApplication = std::make_shared<linux_::DesktopMapsApplication>();
+    if (earlier != nullptr) {
+        // What it has drawn and fetched is good in every language.
+        platform.maps = earlier->maps;
+        return;
+    }
     const auto maps = linux_::ConfiguredMaps::make(live ? live->configuration() : linux_::Configuration{},
                                                    resourceFolder(), platform.mainLoop);
     platform.maps = maps;
@@ -108,7 +113,7 @@ void addMaps(Platform& platform, const HostSettings& settings, LiveServices* liv
     }
 }
 
-void addUserInterface(Platform& platform, const HostSettings& settings, bool isWithoutWindow) {
+void addUserInterface(Platform& platform, const HostSettings& settings, bool isWithoutWindow, const Platform* earlier) {
     auto device = std::make_shared<linux_::LinuxDevice>();
     device->setUserInterfaceIdiom(settings.idiom);
     device->setMainScreenScale(settings.scale);
@@ -116,33 +121,22 @@ void addUserInterface(Platform& platform, const HostSettings& settings, bool isW
     platform.device = device;
     platform.textEngine = std::make_shared<linux_::QtTextEngine>(QString::fromStdString(settings.language));
     platform.images = std::make_shared<linux_::QtImageSource>((resourceFolder() / "images").string(), device);
-    auto appearance = std::make_shared<linux_::QtAppearance>();
-    // In real time without a window nobody watches: at any moment maps are where they would come to rest.
-    appearance->setReducesMotion(isWithoutWindow && settings.liveConfiguration.has_value());
-    platform.appearance = appearance;
+    if (earlier != nullptr) {
+        platform.appearance = earlier->appearance;
+    } else {
+        auto appearance = std::make_shared<linux_::QtAppearance>();
+        // In real time without a window nobody watches: at any moment maps are where they would come to rest.
+        appearance->setReducesMotion(isWithoutWindow && settings.liveConfiguration.has_value());
+        platform.appearance = appearance;
+    }
     platform.avatarImages = std::make_shared<linux_::QtAvatarImages>();
     platform.monogramMakers = std::make_shared<linux_::QtMonogramMakerFactory>();
 }
 
 }  // namespace
 
-std::variant<Environment, Failure> Environment::make(const HostSettings& settings, bool isVirtual) {
-    Environment environment;
-    environment.platform = std::make_shared<Platform>();
-    Platform& platform = *environment.platform;
-    platform.logSink = std::make_shared<linux_::FilteredLogSink>(
-        std::make_shared<linux_::StderrLogSink>(linux_::StderrLogSink::environmentShowsPrivate()),
-        linux_::FilteredLogSink::environmentLevel());
-    const bool isLive = settings.liveConfiguration.has_value();
-    if (isVirtual && !isLive) {
-        environment.virtualTime = std::make_shared<platform::VirtualTime>(settings.start);
-        platform.mainLoop = environment.virtualTime;
-        platform.clock = environment.virtualTime;
-    } else {
-        platform.mainLoop = std::make_shared<linux_::QtMainLoop>();
-        platform.clock = isLive ? std::shared_ptr<platform::Clock>(std::make_shared<linux_::SystemClock>())
-                                : std::make_shared<ScenarioClock>(settings.start);
-    }
+std::optional<Failure> Environment::fill(Platform& platform, const HostSettings& settings, bool isVirtual,
+                                         LiveServices* live, const Platform* earlier) {
     platform.calendar = std::make_shared<linux_::LocalCalendar>();
     platform.assistant = std::make_shared<linux_::ConfiguredAssistant>(settings.language);
     const auto region = std::make_shared<linux_::LocaleRegion>(settings.region);
@@ -154,8 +148,13 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
     using Distances = linux_::IcuDistanceCalculatorFactory;
     platform.distanceCalculators = std::make_shared<Distances>(
         platform.geodesy, isVirtual ? std::nullopt : std::optional(Distances::sessionPreferences()));
-    platform.locationManagers = std::make_shared<linux_::ScenarioLocationManagerFactory>(
-        walkOf(settings.positions), platform.mainLoop, platform.clock, platform.geodesy);
+    if (earlier != nullptr) {
+        // Whoever walks goes on from where they are.
+        platform.locationManagers = earlier->locationManagers;
+    } else {
+        platform.locationManagers = std::make_shared<linux_::ScenarioLocationManagerFactory>(
+            walkOf(settings.positions), platform.mainLoop, platform.clock, platform.geodesy);
+    }
     const auto phoneNumbers = std::make_shared<linux_::PhonenumberLibrary>();
     platform.phoneNumbers = phoneNumbers;
     platform.telephony = std::make_shared<linux_::SettingsTelephony>(settings.country);
@@ -169,16 +168,59 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
     if (!error.empty()) {
         return Failure{ExitCode::Failure, error};
     }
-    addUserInterface(platform, settings, isVirtual);
+    addUserInterface(platform, settings, isVirtual, earlier);
     if (settings.userName) {
         platform.accounts = std::make_shared<ScenarioAccounts>(*settings.userName);
     }
+    if (live != nullptr) {
+        live->addTo(platform, settings.language, !settings.positions.empty());
+    }
+    addMaps(platform, settings, live, earlier);
+    return std::nullopt;
+}
+
+std::variant<Environment, Failure> Environment::make(const HostSettings& settings, bool isVirtual) {
+    Environment environment;
+    environment.isVirtual_ = isVirtual;
+    const auto foundation = std::make_shared<Platform>();
+    foundation->logSink = std::make_shared<linux_::FilteredLogSink>(
+        std::make_shared<linux_::StderrLogSink>(linux_::StderrLogSink::environmentShowsPrivate()),
+        linux_::FilteredLogSink::environmentLevel());
+    const bool isLive = settings.liveConfiguration.has_value();
+    if (isVirtual && !isLive) {
+        environment.virtualTime = std::make_shared<platform::VirtualTime>(settings.start);
+        foundation->mainLoop = environment.virtualTime;
+        foundation->clock = environment.virtualTime;
+    } else {
+        foundation->mainLoop = std::make_shared<linux_::QtMainLoop>();
+        foundation->clock = isLive ? std::shared_ptr<platform::Clock>(std::make_shared<linux_::SystemClock>())
+                                   : std::make_shared<ScenarioClock>(settings.start);
+    }
+    Platform::install(foundation);
+    environment.platform = std::make_shared<Platform>();
+    environment.platform->logSink = foundation->logSink;
+    environment.platform->mainLoop = foundation->mainLoop;
+    environment.platform->clock = foundation->clock;
     if (isLive) {
         environment.live = std::make_unique<LiveServices>(*settings.liveConfiguration);
-        environment.live->addTo(platform, settings.language, !settings.positions.empty());
     }
-    addMaps(platform, settings, environment.live.get());
+    if (auto failure = fill(*environment.platform, settings, isVirtual, environment.live.get(), nullptr)) {
+        Platform::install(nullptr);
+        return *failure;
+    }
     return environment;
+}
+
+std::optional<Failure> Environment::remake(const HostSettings& settings) {
+    const auto next = std::make_shared<Platform>();
+    next->logSink = platform->logSink;
+    next->mainLoop = platform->mainLoop;
+    next->clock = platform->clock;
+    if (auto failure = fill(*next, settings, isVirtual_, live.get(), platform.get())) {
+        return failure;
+    }
+    platform = next;
+    return std::nullopt;
 }
 
 }  // namespace ktr::host

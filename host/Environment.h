@@ -21,9 +21,20 @@ struct Environment {
     /// What a live conversation asks; else none.
     std::unique_ptr<LiveServices> live;
 
-    /// Not installed yet. A failure for contacts that cannot be read and for missing resources. With a live
-    /// configuration time is the present; without one nothing outside the conversation is asked.
+    /// Log and loop come first and are installed while the rest is made, so that what is found on the way is reported.
+    /// The platform itself is not installed yet, and a failure leaves none behind. A failure for contacts that cannot
+    /// be read and for missing resources. With a live configuration time is the present; without one nothing outside
+    /// the conversation is asked.
     static std::variant<Environment, Failure> make(const HostSettings& settings, bool virtualTime);
+    /// Makes another platform for settings that have changed, in the place of `platform`, which the caller has
+    /// installed and uninstalls. Log, loop, clock, appearance, maps and what is live go on. With a failure everything
+    /// stays as it was.
+    std::optional<Failure> remake(const HostSettings& settings);
+
+  private:
+    static std::optional<Failure> fill(platform::Platform& platform, const HostSettings& settings, bool isVirtual,
+                                       LiveServices* live, const platform::Platform* earlier);
+    bool isVirtual_ = false;
 };
 
 }  // namespace ktr::host

@@ -2,15 +2,18 @@
 
 #include <QCoreApplication>
 #include <QDateTime>
+#include <algorithm>
+#include <utility>
 
 #include "host/ClockText.h"
-#include "host/Environment.h"
 #include "host/PluginFinder.h"
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/assistant/Localization.h"
 #include "platform/assistant/VASnippet.h"
 #include "platform/base/Clock.h"
 #include "platform/base/Format.h"
+#include "platform/base/Log.h"
+#include "platform/client/FriendLocationRestrictions.h"
 
 namespace ktr::host {
 
@@ -27,132 +30,261 @@ std::variant<std::unique_ptr<Host>, Failure> Host::make(const HostSettings& sett
                                                         const std::string& pluginPath) {
     std::unique_ptr<Host> host(new Host);
     host->settings_ = settings;
+    host->pluginPath_ = PluginFinder::find(pluginPath);
     auto made = Environment::make(settings, time == Time::Virtual);
     if (const auto* failure = std::get_if<Failure>(&made)) {
         return *failure;
     }
-    auto& environment = std::get<Environment>(made);
-    host->platform_ = environment.platform;
-    host->virtualTime_ = environment.virtualTime;
-    host->live_ = std::move(environment.live);
-    Platform::install(host->platform_);
-    auto plugin = Plugin::load(PluginFinder::find(pluginPath));
-    if (const auto* reason = std::get_if<std::string>(&plugin)) {
-        return Failure{ExitCode::Plugin, *reason};
+    host->environment_ = std::move(std::get<Environment>(made));
+    Platform::install(host->platform());
+    if (auto failure = host->loadPlugin()) {
+        return *failure;
     }
-    host->plugin_ = std::move(std::get<std::unique_ptr<Plugin>>(plugin));
     host->delegate_ = std::make_shared<HostDelegate>(
-        std::make_shared<platform::Bundle>(host->platform_->localization->hostBundleIdentifier()));
+        std::make_shared<platform::Bundle>(host->platform()->localization->hostBundleIdentifier()));
     host->window_ = platform::create<platform::Window>(&platform::Window::initWithFrame, platform::Rect{});
     host->conversation_ = platform::create<ConversationView>(&ConversationView::initWithFrame, platform::Rect{});
     host->window_->addSubview(host->conversation_);
+    if (auto* live = host->live()) {
+        live->setOutdated([self = host.get()] {
+            HostSettings now = self->settings_;
+            self->live()->takeConfiguration();
+            now.follow(self->live()->configuration());
+            if (const auto failure = self->remake(now)) {
+                platform::platformLog().write(platform::LogLevel::Error, "the changed configuration is not used: %@",
+                                              platform::FormatArgument(failure->line).shown());
+            }
+        });
+    }
     return host;
 }
 
-Host::~Host() {
-    if (conversation_) {
-        for (const auto& turn : conversation_->turns()) {
-            if (const auto& controller = turn->card()->controller()) {
-                controller->viewWillDisappear(false);
-            }
-        }
+std::optional<Failure> Host::loadPlugin() {
+    auto plugin = Plugin::load(pluginPath_);
+    if (const auto* reason = std::get_if<std::string>(&plugin)) {
+        return Failure{ExitCode::Plugin, *reason};
     }
+    plugin_ = std::move(std::get<std::unique_ptr<Plugin>>(plugin));
+    return std::nullopt;
+}
+
+Host::~Host() {
     // Views and controllers come from the plugin, and all of them use the platform.
+    for (const Turn& turn : turns_) {
+        turn.view->card()->letGo();
+    }
+    turns_.clear();
     conversation_.reset();
     window_.reset();
     delegate_.reset();
-    if (live_) {
+    if (environment_.live) {
         // Commands under way end now, and what they leave behind runs while everything that it uses is still there:
         // work that waits in a loop and owns that loop would keep both for ever.
-        live_.reset();
-        platform_->httpTransport.reset();
+        environment_.live.reset();
+        platform()->httpTransport.reset();
         QCoreApplication::sendPostedEvents();
     }
     plugin_.reset();
-    if (Platform::installed() == platform_) {
+    if (Platform::installed() == platform()) {
         Platform::install(nullptr);
     }
 }
 
 bool Host::rightToLeft() const {
-    return platform_->assistant->languageIsRightToLeft();
+    return platform()->assistant->languageIsRightToLeft();
 }
 
 std::string Host::text(const std::string& key) const {
-    const auto& localization = *platform_->localization;
+    const auto& localization = *platform()->localization;
     return localization.text(key, localization.hostBundleIdentifier());
 }
 
 std::string Host::clockFace(platform::Date moment) const {
-    const int offset = live_ ? QDateTime::currentDateTime().offsetFromUtc() : settings_.offsetSeconds;
+    const int offset = live() ? QDateTime::currentDateTime().offsetFromUtc() : settings_.offsetSeconds;
     return clockText(moment, offset, settings_.language, settings_.region);
 }
 
-void Host::setTimes(TurnTexts& texts, const std::string& clockFace) const {
-    texts.shortTime = clockFace;
-    texts.longTime = platform::formatted(text("TODAY"), {platform::FormatArgument(clockFace)});
+bool Host::isRestricted() const {
+    const auto& restrictions = platform()->restrictions;
+    return restrictions && (restrictions->isFriendLocationRestricted() || !restrictions->isFriendLocationAllowed());
 }
 
-TurnTexts Host::textsOf(const Scenario& scenario) const {
+TurnTexts Host::textsOf(const Turn& turn) const {
     TurnTexts texts;
-    const documents::IsoTime asked =
-        scenario.clock.value_or(documents::IsoTime{settings_.start, settings_.offsetSeconds});
-    setTimes(texts, clockText(asked.date, asked.offsetSeconds, settings_.language, settings_.region));
-    texts.question = scenario.question.text(settings_.language);
-    texts.sentence = scenario.sentence.text(settings_.language);
+    texts.shortTime = clockText(turn.asked.date, turn.asked.offsetSeconds, settings_.language, settings_.region);
+    texts.longTime = platform::formatted(text("TODAY"), {platform::FormatArgument(texts.shortTime)});
+    texts.question = turn.scenario.question.text(settings_.language);
+    texts.sentence = turn.scenario.sentence.text(settings_.language);
     return texts;
 }
 
-bool Host::addCard(TurnView& turn, const Scenario& scenario) {
-    const auto controller = plugin_->factory().viewControllerForSnippet(scenario.snippet);
+bool Host::addCard(Turn& turn) {
+    const auto controller = plugin_ ? plugin_->factory().viewControllerForSnippet(turn.scenario.snippet) : nullptr;
     if (!controller) {
         return false;
     }
-    const auto sharing = std::dynamic_pointer_cast<platform::VAKtrVisibilityView>(scenario.snippet);
+    const auto sharing = std::dynamic_pointer_cast<platform::VAKtrVisibilityView>(turn.scenario.snippet);
     if (sharing) {
-        endEarlierSharing(controller);
+        endSharing();
+        sharing_ = turn.view;
+        if (live() && sharing->visible) {
+            live()->openSharing();
+        }
     }
     saysHidden_ = sharing && !sharing->visible;
     controller->setDelegate(delegate_);
-    turn.setController(controller);
+    turn.view->setController(controller);
     return true;
 }
 
-void Host::endEarlierSharing(const std::shared_ptr<platform::HostSnippetViewController>& controller) {
-    if (const auto earlier = sharing_.lock()) {
-        earlier->viewWillDisappear(false);
+bool Host::show(Turn& turn) {
+    TurnTexts texts = textsOf(turn);
+    const bool isRefused = turn.scenario.snippet && isRestricted();
+    const bool isDrawn = turn.scenario.snippet && !isRefused && (turn.view->card()->still() || addCard(turn));
+    if (isRefused) {
+        texts.sentence = text("ANSWER_RESTRICTED");
+    } else if (turn.isAnswered && !isDrawn && texts.sentence.empty()) {
+        texts.sentence = text("ANSWER_NOT_SHOWN");
     }
-    sharing_ = controller;
+    turn.view->setTexts(texts);
+    return isDrawn || isRefused || !turn.scenario.snippet;
+}
+
+void Host::endSharing() {
+    if (live()) {
+        live()->closeSharing();
+    }
+    const auto earlier = std::exchange(sharing_, {}).lock();
+    const auto controller = earlier ? earlier->card()->controller() : nullptr;
+    if (controller && live()) {
+        makeStill(*earlier);
+    } else if (controller) {
+        // Without a service nothing of it can leave: it just goes on no more.
+        controller->viewWillDisappear(false);
+    }
+}
+
+std::optional<platform::Url> Host::pageOf(const platform::AccessibilityNode& link) const {
+    std::optional<platform::Url> page;
+    const auto open = std::exchange(delegate_->open, [&page](const platform::Url& url) {
+        page = url;
+        return true;
+    });
+    platform::accessibilityPress(link);
+    delegate_->open = open;
+    return page;
+}
+
+namespace {
+
+/// The first of a tree that can be pressed; none when nothing can.
+const platform::AccessibilityNode* firstLink(const platform::AccessibilityNode& node) {
+    if (node.pressable) {
+        return &node;
+    }
+    for (const auto& child : node.children) {
+        if (const auto* link = firstLink(child)) {
+            return link;
+        }
+    }
+    return nullptr;
+}
+
+}  // namespace
+
+void Host::makeStill(TurnView& turn) {
+    const auto& card = turn.card();
+    const auto& content = card->content();
+    content->layoutIfNeeded();
+    const auto tree = platform::accessibilityTree(content, rightToLeft());
+    // The row comes first, and leads to the user's own page.
+    const auto* link = firstLink(tree);
+    const auto page = link != nullptr ? pageOf(*link) : std::nullopt;
+    const auto open = [delegate = std::weak_ptr<HostDelegate>(delegate_)](const platform::Url& url) {
+        if (const auto opener = delegate.lock(); opener && opener->open) {
+            opener->open(url);
+        }
+    };
+    const auto contrast = settings_.highContrast ? linux_::Contrast::High : linux_::Contrast::Normal;
+    const auto still = StillView::of(content, settings_.scale, contrast, rightToLeft(), page, open);
+    card->letGo();
+    card->setStill(still);
+}
+
+void Host::letCardsGo() {
+    endSharing();
+    for (Turn& turn : turns_) {
+        if (const auto controller = turn.view->card()->controller()) {
+            if (auto snippet = controller->currentSnippet()) {
+                turn.scenario.snippet = std::move(snippet);
+            }
+            turn.view->card()->letGo();
+        }
+    }
+    if (live()) {
+        live()->cancelCommands();
+    }
+}
+
+std::optional<Failure> Host::remake(const HostSettings& settings) {
+    // What is under way may hold on to it a little longer than its place lasts.
+    const auto earlier = platform();
+    if (auto failure = environment_.remake(settings)) {
+        return failure;
+    }
+    settings_ = settings;
+    letCardsGo();
+    plugin_.reset();
+    Platform::install(nullptr);
+    Platform::install(platform());
+    auto failure = loadPlugin();
+    const bool saidHidden = saysHidden_;
+    for (Turn& turn : turns_) {
+        turn.view->renew();
+        show(turn);
+    }
+    saysHidden_ = saidHidden;
+    if (remade_) {
+        remade_();
+    }
+    return failure;
 }
 
 std::optional<Failure> Host::addTurn(const Scenario& scenario) {
-    auto turn = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
-    turn->setTexts(textsOf(scenario));
-    conversation_->addTurn(turn);
-    if (scenario.snippet && !addCard(*turn, scenario)) {
-        conversation_->removeTurn(turn);
+    Turn turn;
+    turn.view = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
+    turn.scenario = scenario;
+    turn.asked = scenario.clock.value_or(documents::IsoTime{settings_.start, settings_.offsetSeconds});
+    conversation_->addTurn(turn.view);
+    if (!show(turn)) {
+        conversation_->removeTurn(turn.view);
         return Failure{ExitCode::NotDrawn, scenario.file + ": the plugin draws no such answer: a " + scenario.kind};
     }
+    turns_.push_back(std::move(turn));
     return std::nullopt;
 }
 
 std::shared_ptr<TurnView> Host::addQuestion(const std::string& question) {
-    auto turn = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
-    TurnTexts texts;
-    setTimes(texts, clockFace(platform_->clock->now()));
-    texts.question = question;
-    turn->setTexts(texts);
-    conversation_->addTurn(turn);
-    return turn;
+    Turn turn;
+    turn.view = platform::create<TurnView>(&TurnView::initWithFrame, platform::Rect{});
+    turn.scenario.question = LocalizedText(question);
+    turn.asked = {platform()->clock->now(), QDateTime::currentDateTime().offsetFromUtc()};
+    show(turn);
+    conversation_->addTurn(turn.view);
+    turns_.push_back(turn);
+    return turn.view;
 }
 
-void Host::answer(TurnView& turn, const Scenario& answer) {
-    std::string sentence = answer.sentence.text(settings_.language);
-    const bool drawn = answer.snippet && addCard(turn, answer);
-    if (!drawn && sentence.empty()) {
-        sentence = text("ANSWER_NOT_SHOWN");
+void Host::answer(TurnView& view, const Scenario& answer) {
+    const auto turn = std::find_if(turns_.begin(), turns_.end(), [&](const Turn& t) { return t.view.get() == &view; });
+    if (turn == turns_.end()) {
+        return;
     }
-    turn.setSentence(sentence);
+    LocalizedText question = std::move(turn->scenario.question);
+    turn->scenario = answer;
+    turn->scenario.question = std::move(question);
+    turn->isAnswered = true;
+    show(*turn);
 }
 
 double Host::layOut(double width) {
@@ -164,9 +296,9 @@ double Host::layOut(double width) {
 
 double Host::settle(double width) {
     layOut(width);
-    if (virtualTime_) {
-        virtualTime_->advance(settings_.runSeconds);
-        virtualTime_->runUntilIdle(kIdleHorizon);
+    if (environment_.virtualTime) {
+        environment_.virtualTime->advance(settings_.runSeconds);
+        environment_.virtualTime->runUntilIdle(kIdleHorizon);
     }
     return layOut(width);
 }

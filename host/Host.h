@@ -5,7 +5,9 @@
 #include <optional>
 #include <string>
 #include <variant>
+#include <vector>
 
+#include "host/Environment.h"
 #include "host/Failure.h"
 #include "host/HostDelegate.h"
 #include "host/HostSettings.h"
@@ -43,12 +45,33 @@ class Host {
     /// `width` before and after. The conversation's height, points.
     double settle(double width);
 
+    /// A question goes to the assistant, and may be a wish about the user's own sharing: what the newest card about
+    /// that has under way ends now, before the question leaves, so that nothing of it can arrive later and undo the
+    /// wish. The card becomes a still: a picture, its spoken text, and a tap to the user's own page. Where nothing is
+    /// live nothing leaves, and the card stays as it is.
+    void endSharing();
+
+    /// Makes everything anew for settings that have changed: language, region, text size, account, contacts. The
+    /// installed platform is uninstalled with all that it holds, another one is installed, and each card is made again
+    /// of the newest that its controller knew; a live one about the user's own sharing becomes a still instead, since a
+    /// new one would show a user who may have hidden since. Window, conversation and turns stay the same objects, cards
+    /// and what is in them do not; `remade` is called at the end, and whoever shows the conversation lays it out again.
+    /// With a failure everything stays as it was, unless it is the plugin that fails: then there are no cards.
+    std::optional<Failure> remake(const HostSettings& settings);
+    /// Called after `remake`.
+    void setRemade(std::function<void()> remade) { remade_ = std::move(remade); }
+
+    /// The device allows no friends' locations: no card is made and nothing is asked; a turn says so instead.
+    bool isRestricted() const;
+
+    /// The same for as long as the host stands.
     const std::shared_ptr<platform::Window>& window() const { return window_; }
     const std::shared_ptr<ConversationView>& conversation() const { return conversation_; }
     HostDelegate& delegate() { return *delegate_; }
     /// None where nothing is live.
-    LiveServices* live() const { return live_.get(); }
-    const std::shared_ptr<platform::Platform>& platform() const { return platform_; }
+    LiveServices* live() const { return environment_.live.get(); }
+    /// The installed one; another after `remake`.
+    const std::shared_ptr<platform::Platform>& platform() const { return environment_.platform; }
     /// A text of the host's own, by its key.
     std::string text(const std::string& key) const;
     /// The clock face of a moment, as the conversation shows it.
@@ -62,25 +85,40 @@ class Host {
     double layOut(double width);
 
   private:
+    /// A turn and what it is made of.
+    struct Turn {
+        std::shared_ptr<TurnView> view;
+        Scenario scenario;  ///< its snippet is the newest at the last making
+        documents::IsoTime asked;
+        bool isAnswered = false;  ///< of a question
+    };
+
     Host() = default;
-    TurnTexts textsOf(const Scenario& scenario) const;
-    void setTimes(TurnTexts& texts, const std::string& clockFace) const;
+    std::optional<Failure> loadPlugin();
+    /// Sets a turn's texts, and its card. False when the plugin draws no such answer.
+    bool show(Turn& turn);
+    TurnTexts textsOf(const Turn& turn) const;
     /// False when the plugin draws no such answer.
-    bool addCard(TurnView& turn, const Scenario& scenario);
-    /// Of the answers about the user's own sharing only the newest is live: an earlier one would go on showing a user
-    /// who has hidden since.
-    void endEarlierSharing(const std::shared_ptr<platform::HostSnippetViewController>& controller);
+    bool addCard(Turn& turn);
+    void makeStill(TurnView& turn);
+    /// Where pressing leads, without going there.
+    std::optional<platform::Url> pageOf(const platform::AccessibilityNode& link) const;
+    /// Keeps what the cards know, and lets go of their controllers.
+    void letCardsGo();
 
     HostSettings settings_;
-    std::shared_ptr<platform::Platform> platform_;
-    std::shared_ptr<platform::VirtualTime> virtualTime_;
-    std::unique_ptr<LiveServices> live_;
+    std::string pluginPath_;
+    Environment environment_;
     std::unique_ptr<Plugin> plugin_;
     std::shared_ptr<HostDelegate> delegate_;
     std::shared_ptr<platform::Window> window_;
     std::shared_ptr<ConversationView> conversation_;
-    std::weak_ptr<platform::HostSnippetViewController> sharing_;
+    std::vector<Turn> turns_;
+    /// The newest turn about the user's own sharing. Of those only the newest is live: an earlier one would go on
+    /// showing a user who has hidden since.
+    std::weak_ptr<TurnView> sharing_;
     bool saysHidden_ = false;
+    std::function<void()> remade_;
 };
 
 }  // namespace ktr::host

@@ -41,13 +41,9 @@ std::variant<HostSettings, Failure> HostSettings::decide(const HostOptions& opti
                                                          const documents::IsoTime& now,
                                                          const linux_::Configuration& configuration) {
     HostSettings settings;
-    settings.language =
-        either(either(options.language, firstOf(scenarios, &Scenario::language)), configuration.language)
-            .value_or(linux_::LocaleRegion::sessionLanguage());
-    settings.region =
-        firstOf(scenarios, &Scenario::region)
-            .value_or(countryOf(settings.language) ? settings.language : linux_::LocaleRegion::sessionLocale());
-    settings.country = either(firstOf(scenarios, &Scenario::country), countryOf(settings.region));
+    settings.said.language = either(options.language, firstOf(scenarios, &Scenario::language));
+    settings.said.region = firstOf(scenarios, &Scenario::region);
+    settings.said.country = firstOf(scenarios, &Scenario::country);
     settings.idiom =
         either(options.idiom, firstOf(scenarios, &Scenario::idiom)).value_or(platform::UserInterfaceIdiom::Phone);
     const auto usualSize = settings.idiom == platform::UserInterfaceIdiom::Display ? platform::ContentSizeCategory::XL
@@ -75,16 +71,25 @@ std::variant<HostSettings, Failure> HostSettings::decide(const HostOptions& opti
     }
     for (const Scenario& scenario : scenarios) {
         for (const std::string& path : scenario.contacts) {
-            if (std::find(settings.contacts.begin(), settings.contacts.end(), path) == settings.contacts.end()) {
-                settings.contacts.push_back(path);
+            auto& contacts = settings.said.contacts;
+            if (std::find(contacts.begin(), contacts.end(), path) == contacts.end()) {
+                contacts.push_back(path);
             }
         }
         if (settings.positions.empty()) {
             settings.positions = scenario.positions;
         }
     }
-    settings.contacts.insert(settings.contacts.end(), configuration.contacts.begin(), configuration.contacts.end());
+    settings.follow(configuration);
     return settings;
+}
+
+void HostSettings::follow(const linux_::Configuration& configuration) {
+    language = either(said.language, configuration.language).value_or(linux_::LocaleRegion::sessionLanguage());
+    region = said.region.value_or(countryOf(language) ? language : linux_::LocaleRegion::sessionLocale());
+    country = either(said.country, countryOf(region));
+    contacts = said.contacts;
+    contacts.insert(contacts.end(), configuration.contacts.begin(), configuration.contacts.end());
 }
 
 }  // namespace ktr::host

@@ -26,16 +26,28 @@ struct HostSettings {
     double width = 400.0;      ///< points
     std::optional<bool> dark;  ///< none: as the session has it
     bool highContrast = false;
-    platform::Date start;     ///< the conversation's first moment
-    int offsetSeconds = 0;    ///< of the clock face that is shown, east of UTC
-    double runSeconds = 0.0;  ///< from the start to the moment of the picture
-    std::vector<std::string> contacts;
+    platform::Date start;               ///< the conversation's first moment
+    int offsetSeconds = 0;              ///< of the clock face that is shown, east of UTC
+    double runSeconds = 0.0;            ///< from the start to the moment of the picture
+    std::vector<std::string> contacts;  ///< paths: the scenarios', then the configuration's
     std::vector<ScenarioPosition> positions;
     /// Of the account that the scenarios tell; a live conversation has its own.
     std::optional<std::string> userName;
     /// The configuration file of a live conversation: one with an account, a service and the present moment. None: the
     /// conversation stands for itself, and nothing outside it is asked.
     std::optional<std::filesystem::path> liveConfiguration;
+
+    /// What options or scenarios say themselves; the rest follows the configuration, then the session.
+    struct Said {
+        std::optional<std::string> language;
+        std::optional<std::string> region;
+        std::optional<std::string> country;
+        std::vector<std::string> contacts;
+    };
+    Said said;
+
+    /// Decides again what a configuration has a word in: language, region, country and contacts.
+    void follow(const linux_::Configuration& configuration);
 
     /// `now` and its local offset serve where no scenario has a clock. A failure for what cannot be drawn: text sizes
     /// for accessibility, and a moment too far from the start. What `configuration` says counts after the scenarios; it

@@ -35,6 +35,7 @@ bool VAKTRBaseSnippetController::initWithCueObject(const std::shared_ptr<platfor
         return false;
     }
     LogCategory_Unspecified()->line("snippet: %@", snippet);
+    snippet_ = snippet;
     if (const auto located = std::dynamic_pointer_cast<platform::VAKtrLocationSnippet>(snippet)) {
         setLocations(located->locations);
         proximity_ = located->proximity;
@@ -143,6 +144,18 @@ double VAKTRBaseSnippetController::desiredHeightForWidth(double width) {
 std::shared_ptr<platform::HeaderItem> VAKTRBaseSnippetController::sashItem() {
     return std::make_shared<platform::HeaderItem>(AssistantLocalizedString("APPLICATION_NAME"),
                                                   KTRVATheme::themeImageNamed("appIcon_dyn"));
+}
+
+std::shared_ptr<platform::AssistantObject> VAKTRBaseSnippetController::currentSnippet() const {
+    const auto made = std::dynamic_pointer_cast<platform::VAKtrLocationSnippet>(snippet_);
+    if (!made) {
+        return nullptr;
+    }
+    auto now = std::make_shared<platform::VAKtrLocationSnippet>();
+    now->searchContext = made->searchContext;
+    now->proximity = proximity_;
+    now->locations = sourceLocations_;
+    return now;
 }
 
 void VAKTRBaseSnippetController::reloadData() {}

@@ -49,6 +49,8 @@ class VAKTRBaseSnippetController : public platform::HostSnippetViewController,
     /// Points. The base answers with the container's smallest height.
     double desiredHeightForWidth(double width) override;
     std::shared_ptr<platform::HeaderItem> sashItem() override;
+    /// Of friends' locations: the snippet with those of the last answer in their place.
+    std::shared_ptr<platform::AssistantObject> currentSnippet() const override;
 
     /// Redraws the rows; the base has none.
     virtual void reloadData();
@@ -103,6 +105,8 @@ class VAKTRBaseSnippetController : public platform::HostSnippetViewController,
   private:
     void startReloadTimer();
 
+    /// What the controller was made of; may be none.
+    std::shared_ptr<platform::VASnippet> snippet_;
     bool refreshingCancelled_ = false;
     std::optional<std::string> clientId_;
     /// The list that `locations_` was made of, to know it again.

@@ -5,7 +5,6 @@
 #include "app/window/AccessibleNode.h"
 #include "app/window/AccessibleWidget.h"
 #include "app/window/ConversationWidget.h"
-#include "platform/base/Platform.h"
 
 namespace ktr::app {
 
@@ -15,33 +14,9 @@ using platform::View;
 
 namespace {
 
-/// The conversations that somebody asked about: Qt's factory is a plain function, so they stand beside it, and go with
-/// the platform.
-struct Registry {
-    static std::shared_ptr<Registry> makeShared() { return std::make_shared<Registry>(); }
-    std::unordered_map<const QObject*, std::unique_ptr<AccessibleConversation>> all;
-};
-
-AccessibleConversation* known(const ConversationWidget& widget) {
-    const auto registry = platform::shared<Registry>();
-    if (!registry) {
-        return nullptr;
-    }
-    const auto found = registry->all.find(&widget);
-    return found == registry->all.end() ? nullptr : found->second.get();
-}
-
 QAccessibleInterface* interfaceOf(const QString& /*className*/, QObject* object) {
     auto* widget = dynamic_cast<ConversationWidget*>(object);
-    const auto registry = platform::shared<Registry>();
-    if (widget == nullptr || !registry) {
-        return nullptr;
-    }
-    auto& conversation = registry->all[widget];
-    if (!conversation) {
-        conversation = std::make_unique<AccessibleConversation>(*widget);
-    }
-    return new AccessibleWidget(*widget, *conversation);
+    return widget == nullptr ? nullptr : new AccessibleWidget(*widget, widget->accessible());
 }
 
 void collectTexts(const AccessibilityNode& node, std::string& name) {
@@ -61,17 +36,16 @@ void AccessibleConversation::install() {
 }
 
 void AccessibleConversation::changed(ConversationWidget& widget) {
-    if (auto* conversation = known(widget)) {
-        conversation->update();
+    if (widget.isAccessed()) {
+        widget.accessible().update();
     }
 }
 
 void AccessibleConversation::moved(ConversationWidget& widget) {
-    auto* conversation = known(widget);
-    if (conversation == nullptr) {
+    if (!widget.isAccessed()) {
         return;
     }
-    for (const auto& [view, id] : conversation->interfaces_) {
+    for (const auto& [view, id] : widget.accessible().interfaces_) {
         if (auto* node = QAccessible::accessibleInterface(id)) {
             QAccessibleEvent event(node, QAccessible::LocationChanged);
             QAccessible::updateAccessibility(&event);
@@ -80,20 +54,13 @@ void AccessibleConversation::moved(ConversationWidget& widget) {
 }
 
 void AccessibleConversation::focused(ConversationWidget& widget) {
-    auto* conversation = known(widget);
     const auto view = widget.rows().focused();
-    if (conversation == nullptr || !view) {
+    if (!widget.isAccessed() || !view) {
         return;
     }
-    if (auto* node = conversation->interfaceFor(view.get())) {
+    if (auto* node = widget.accessible().interfaceFor(view.get())) {
         QAccessibleEvent event(node, QAccessible::Focus);
         QAccessible::updateAccessibility(&event);
-    }
-}
-
-void AccessibleConversation::forget(ConversationWidget& widget) {
-    if (const auto registry = platform::shared<Registry>()) {
-        registry->all.erase(&widget);
     }
 }
 

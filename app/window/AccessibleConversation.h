@@ -24,8 +24,6 @@ class AccessibleConversation {
     static void moved(ConversationWidget& widget);
     /// The keyboard's focus came to a row.
     static void focused(ConversationWidget& widget);
-    /// The widget goes.
-    static void forget(ConversationWidget& widget);
 
     explicit AccessibleConversation(ConversationWidget& widget) : widget_(widget) {}
     ~AccessibleConversation();

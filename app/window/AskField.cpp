@@ -34,10 +34,7 @@ AskField::AskField(const Texts& texts, QWidget* parent)
       button_(new SendButton(this)),
       palette_(&linux_::Palette::of(linux_::ColorScheme::Light)) {
     edit_->setFont(fieldFont());
-    edit_->setPlaceholderText(QString::fromStdString(texts.placeholder));
-    edit_->setAccessibleName(QString::fromStdString(texts.placeholder));
-    button_->setAccessibleName(QString::fromStdString(texts.send));
-    button_->setToolTip(QString::fromStdString(texts.send));
+    setTexts(texts);
     setCursor(Qt::IBeamCursor);
     setTabOrder(edit_, button_);
     edit_->installEventFilter(this);
@@ -46,6 +43,13 @@ AskField::AskField(const Texts& texts, QWidget* parent)
             [this](const QString& text) { button_->setReady(!text.trimmed().isEmpty(), animated_); });
     connect(edit_, &QLineEdit::returnPressed, this, [this] { send(); });
     connect(button_, &QAbstractButton::clicked, this, [this] { send(); });
+}
+
+void AskField::setTexts(const Texts& texts) {
+    edit_->setPlaceholderText(QString::fromStdString(texts.placeholder));
+    edit_->setAccessibleName(QString::fromStdString(texts.placeholder));
+    button_->setAccessibleName(QString::fromStdString(texts.send));
+    button_->setToolTip(QString::fromStdString(texts.send));
 }
 
 void AskField::send() {

@@ -22,6 +22,8 @@ class AskField : public QWidget {
     };
 
     explicit AskField(const Texts& texts, QWidget* parent = nullptr);
+    /// Where the language has become another.
+    void setTexts(const Texts& texts);
 
     /// Called with what was typed, which is not blank; the field is empty then.
     void setAsked(std::function<void(const std::string&)> asked) { asked_ = std::move(asked); }

@@ -80,8 +80,21 @@ ConversationWidget::ConversationWidget(host::Host& host, QWidget* parent)
 }
 
 ConversationWidget::~ConversationWidget() {
-    AccessibleConversation::forget(*this);
+    accessible_.reset();
     host_.delegate().resize = nullptr;
+}
+
+AccessibleConversation& ConversationWidget::accessible() {
+    if (!accessible_) {
+        accessible_ = std::make_unique<AccessibleConversation>(*this);
+    }
+    return *accessible_;
+}
+
+void ConversationWidget::remade() {
+    setLayoutDirection(host_.rightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
+    rows_.setRightToLeft(host_.rightToLeft());
+    layOut();
 }
 
 double ConversationWidget::seconds() const {

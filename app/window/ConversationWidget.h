@@ -19,6 +19,8 @@
 
 namespace ktr::app {
 
+class AccessibleConversation;
+
 /// Shows a host's conversation: paints what changed, scrolls, and turns what mouse, pen, finger and keyboard do into
 /// touches. One point is one logical pixel. Main thread.
 class ConversationWidget : public QWidget {
@@ -43,6 +45,11 @@ class ConversationWidget : public QWidget {
     /// Called after the colours have become others.
     void setPaletteChanged(std::function<void()> changed) { paletteChanged_ = std::move(changed); }
     const RowFocus& rows() const { return rows_; }
+    /// The host has made everything anew: cards are others, and the language may be.
+    void remade();
+    /// Made once somebody asks for it; from then on it hears what changes.
+    AccessibleConversation& accessible();
+    bool isAccessed() const { return accessible_ != nullptr; }
     /// How often something was painted: what a test asks to see that only what changed is.
     const QRegion& lastPainted() const { return lastPainted_; }
 
@@ -88,6 +95,7 @@ class ConversationWidget : public QWidget {
     double seconds() const;
 
     host::Host& host_;
+    std::unique_ptr<AccessibleConversation> accessible_;
     std::shared_ptr<Client> client_;
     std::shared_ptr<platform::TouchDispatcher> touches_;
     RowFocus rows_;

@@ -28,11 +28,13 @@ ConversationWindow::ConversationWindow(host::Host& host)
         conversation_->setFocus();
     }
     conversation_->setPaletteChanged([this] { choosePalette(); });
+    host_.setRemade([this] { remade(); });
     choosePalette();
 }
 
 ConversationWindow::~ConversationWindow() {
     conversation_->setPaletteChanged(nullptr);
+    host_.setRemade(nullptr);
     if (live_) {
         live_->setHandlers({});
     }
@@ -40,7 +42,7 @@ ConversationWindow::~ConversationWindow() {
 
 void ConversationWindow::addField() {
     live_ = host::LiveConversation::make(host_);
-    field_ = new AskField({host_.text("ASK_FIELD"), host_.text("ASK_SEND")}, this);
+    field_ = new AskField(fieldTexts(), this);
     field_->setAsked([this](const std::string& question) { live_->ask(question); });
     field_->edit().installEventFilter(this);
     status_ = new StatusLine(this);
@@ -50,6 +52,20 @@ void ConversationWindow::addField() {
                         [this](host::TurnView& turn) { conversation_->answerCame(turn); }, [this] { showStatus(); }});
     statusTimer_.setInterval(kStatusEvery);
     connect(&statusTimer_, &QTimer::timeout, this, [this] { showStatus(); });
+}
+
+AskField::Texts ConversationWindow::fieldTexts() const {
+    return {host_.text("ASK_FIELD"), host_.text("ASK_SEND")};
+}
+
+void ConversationWindow::remade() {
+    setLayoutDirection(host_.rightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
+    conversation_->remade();
+    if (field_ != nullptr) {
+        field_->setTexts(fieldTexts());
+        showStatus();
+    }
+    place();
 }
 
 void ConversationWindow::start(const std::vector<host::Scenario>& scenarios,
@@ -82,6 +98,10 @@ int ConversationWindow::barHeight() const {
 }
 
 void ConversationWindow::resizeEvent(QResizeEvent*) {
+    place();
+}
+
+void ConversationWindow::place() {
     const int bar = barHeight();
     conversation_->setGeometry(0, 0, width(), std::max(height() - bar, 0));
     if (field_ == nullptr) {

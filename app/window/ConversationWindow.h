@@ -39,6 +39,10 @@ class ConversationWindow : public QWidget {
     void addField();
     void choosePalette();
     void showStatus();
+    void remade();
+    /// Puts conversation, field and status line where they belong.
+    void place();
+    AskField::Texts fieldTexts() const;
     int barHeight() const;
 
     host::Host& host_;

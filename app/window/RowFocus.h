@@ -17,6 +17,8 @@ class RowFocus {
              bool rightToLeft)
         : root_(std::move(root)), conversation_(std::move(conversation)), rightToLeft_(rightToLeft) {}
 
+    void setRightToLeft(bool rightToLeft) { rightToLeft_ = rightToLeft; }
+
     /// A point in the root's coordinates; none: the pointer has left, or is a finger.
     void hover(const std::optional<platform::Point>& point);
     bool isHovering() const { return !hovered_.expired(); }

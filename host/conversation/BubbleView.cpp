@@ -45,11 +45,15 @@ bool BubbleView::initWithFrame(const platform::Rect& frame) {
         return false;
     }
     label_ = platform::create<platform::Label>(&platform::Label::initWithFrame, platform::Rect{});
-    label_->setFont(platform::preferredFont(platform::TextStyle::Body));
+    chooseFont();
     label_->setNumberOfLines(0);
     label_->setLineBreakMode(platform::LineBreakMode::WordWrapping);
     addSubview(label_);
     return true;
+}
+
+void BubbleView::chooseFont() {
+    label_->setFont(platform::preferredFont(platform::TextStyle::Body));
 }
 
 void BubbleView::setText(const std::string& text) {

@@ -14,6 +14,8 @@ class BubbleView : public platform::View {
   public:
     bool initWithFrame(const platform::Rect& frame) override;
     void setText(const std::string& text);
+    /// Takes the font that fits the text size of now.
+    void chooseFont();
     /// The bubble's own size when it may be `mostWidth` wide; zero without a text.
     platform::Size sizeForWidth(double mostWidth) const;
     void layoutSubviews() override;

@@ -50,7 +50,7 @@ bool CardView::initWithFrame(const Rect& frame) {
     }
     icon_ = create<ImageView>(&ImageView::initWithFrame, Rect{});
     title_ = create<Label>(&Label::initWithFrame, Rect{});
-    title_->setFont(preferredFont(TextStyle::Headline));
+    chooseFont();
     ring_ = create<RingView>(&RingView::initWithFrame, Rect{});
     ring_->setHidden(true);
     content_ = create<View>(&View::initWithFrame, Rect{});
@@ -74,8 +74,34 @@ void CardView::setController(const std::shared_ptr<HostSnippetViewController>& c
     controller->viewWillAppear(false);
 }
 
+void CardView::chooseFont() {
+    title_->setFont(preferredFont(TextStyle::Headline));
+}
+
+void CardView::letGo() {
+    if (!controller_) {
+        return;
+    }
+    controller_->viewWillDisappear(false);
+    if (const auto view = controller_->viewIfLoaded()) {
+        view->removeFromSuperview();
+    }
+    controller_.reset();
+    updateRing();
+}
+
+void CardView::setStill(const std::shared_ptr<StillView>& still) {
+    still_ = still;
+    content_->addSubview(still);
+}
+
 double CardView::heightForWidth(double width) {
-    if (controller_) {
+    if (still_) {
+        contentHeight_ = still_->heightForWidth(width);
+        content_->setFrame({0.0, measures::kHeaderHeight, width, contentHeight_});
+        still_->setFrame(content_->bounds());
+        content_->layoutIfNeeded();
+    } else if (controller_) {
         // Rows measure themselves at the width that they have: it is given first, the height follows.
         content_->setFrame({0.0, measures::kHeaderHeight, width, contentHeight_});
         content_->layoutIfNeeded();

@@ -4,6 +4,7 @@
 #include <optional>
 
 #include "host/conversation/RingView.h"
+#include "host/conversation/StillView.h"
 #include "platform/host/HostSnippetViewController.h"
 #include "platform/ui/ImageView.h"
 #include "platform/ui/Label.h"
@@ -19,7 +20,15 @@ class CardView : public platform::View {
 
     /// Puts the controller's view under the header, and tells the controller that it appears.
     void setController(const std::shared_ptr<platform::HostSnippetViewController>& controller);
+    /// None before an answer is there, and in a card that is a still.
     const std::shared_ptr<platform::HostSnippetViewController>& controller() const { return controller_; }
+    /// Lets go of the controller and its view, which hears that it disappears. The header stays, over nothing.
+    void letGo();
+    /// Puts a still in the place of the controller's view, which has been let go of.
+    void setStill(const std::shared_ptr<StillView>& still);
+    const std::shared_ptr<StillView>& still() const { return still_; }
+    /// Takes the font that fits the text size of now.
+    void chooseFont();
     /// Asks the controller for its height at this width and lays everything out; the card's height, points.
     double heightForWidth(double width);
     void layoutSubviews() override;
@@ -48,6 +57,7 @@ class CardView : public platform::View {
     void redraw(const std::optional<platform::Rect>& rect) const;
 
     std::shared_ptr<platform::HostSnippetViewController> controller_;
+    std::shared_ptr<StillView> still_;
     std::shared_ptr<platform::ImageView> icon_;
     std::shared_ptr<platform::Label> title_;
     std::shared_ptr<RingView> ring_;

@@ -42,20 +42,39 @@ bool TurnView::initWithFrame(const Rect& frame) {
     }
     speech_ = create<SpeechView>(&SpeechView::initWithFrame, Rect{});
     time_ = create<Label>(&Label::initWithFrame, Rect{});
-    time_->setFont(preferredFont(TextStyle::Footnote));
     bubble_ = create<BubbleView>(&BubbleView::initWithFrame, Rect{});
     sentence_ = create<Label>(&Label::initWithFrame, Rect{});
-    sentence_->setFont(preferredFont(TextStyle::Body));
     sentence_->setNumberOfLines(0);
     sentence_->setLineBreakMode(LineBreakMode::WordWrapping);
     card_ = create<CardView>(&CardView::initWithFrame, Rect{});
     card_->setHidden(true);
+    chooseFonts();
     speech_->addSubview(time_);
     speech_->addSubview(bubble_);
     speech_->addSubview(sentence_);
     addSubview(speech_);
     addSubview(card_);
     return true;
+}
+
+void TurnView::chooseFonts() {
+    time_->setFont(preferredFont(TextStyle::Footnote));
+    sentence_->setFont(preferredFont(TextStyle::Body));
+    bubble_->chooseFont();
+    card_->chooseFont();
+}
+
+void TurnView::renew() {
+    if (!card_->still()) {
+        card_->letGo();
+        card_->removeFromSuperview();
+        card_ = create<CardView>(&CardView::initWithFrame, Rect{});
+        card_->setHidden(true);
+        addSubview(card_);
+    }
+    // What comes next stands at once in its own size.
+    laidOutCard_ = 0.0;
+    chooseFonts();
 }
 
 void TurnView::setTexts(const TurnTexts& texts) {

@@ -29,6 +29,9 @@ class TurnView : public platform::View {
     void setSentence(const std::string& sentence);
     /// Puts an answer into the card, which is not shown before.
     void setController(const std::shared_ptr<platform::HostSnippetViewController>& controller);
+    /// Begins anew where the language or the text size may be another: with the fonts of now, and with a new card in
+    /// the place of the old one. A still is kept, any other answer is taken away; texts stay until they are set.
+    void renew();
     /// Of the time.
     void setSoftColor(const platform::Color& color) { time_->setTextColor(color); }
     const std::shared_ptr<CardView>& card() const { return card_; }
@@ -62,6 +65,7 @@ class TurnView : public platform::View {
     void setCardHeight(double height, double width);
     /// Puts sentence and card where they are at this moment, and finds the turn's height.
     void placeAnswer();
+    void chooseFonts();
     /// The heights of what is said: the time, the question and the sentence.
     double layOutNarrowSpeech(double width, bool first);
     double layOutWideSpeech();

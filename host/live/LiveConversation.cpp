@@ -125,24 +125,36 @@ void LiveConversation::sendNext() {
     const auto [turn, question] = std::move(waiting_.front());
     waiting_.pop_front();
     underWay_ = true;
+    if (host_.isRestricted()) {
+        Scenario refusal;
+        refusal.sentence = LocalizedText(host_.text("ANSWER_RESTRICTED"));
+        host_.platform()->mainLoop->post([weak = weak_from_this(), asked = turn, refusal] {
+            if (const auto self = weak.lock()) {
+                self->receive(asked, refusal);
+            }
+        });
+        return;
+    }
+    // Whatever the question is: it may be a wish to hide, and nobody here can tell.
+    host_.endSharing();
     // The assistant's client ends before the loop does, and what it posts after this has gone does nothing.
     platform::MainLoop* const mainLoop = host_.platform()->mainLoop.get();
     host_.live()->assistant().ask(question, [weak = weak_from_this(), mainLoop, asked = turn](auto answer) {
         mainLoop->post([weak, asked, answer = std::move(answer)] {
             if (const auto self = weak.lock()) {
-                self->receive(asked, answer);
+                self->receive(asked, self->read(answer));
             }
         });
     });
 }
 
-void LiveConversation::receive(const std::weak_ptr<TurnView>& weakTurn, const linux_::AssistantClient::Answer& answer) {
+void LiveConversation::receive(const std::weak_ptr<TurnView>& weakTurn, const Scenario& answer) {
     underWay_ = false;
     if (--asking_ == 0) {
         askedAt_.reset();
     }
     if (const auto turn = weakTurn.lock()) {
-        host_.answer(*turn, read(answer));
+        host_.answer(*turn, answer);
         if (!turn->card()->hidden()) {
             shown();
         }

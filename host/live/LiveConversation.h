@@ -49,7 +49,7 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
     void accountRead();
     /// Sends the question that waits longest, unless one is under way.
     void sendNext();
-    void receive(const std::weak_ptr<TurnView>& turn, const linux_::AssistantClient::Answer& answer);
+    void receive(const std::weak_ptr<TurnView>& turn, const Scenario& answer);
     /// What to show for an answer; sets `failure_`.
     Scenario read(const linux_::AssistantClient::Answer& answer);
     void shown();

@@ -49,42 +49,59 @@ LiveServices::LiveServices(std::filesystem::path configurationFile)
 
 LiveServices::~LiveServices() {
     *alive_ = false;
+    outdated_ = nullptr;
     if (service_) {
         service_->setChanged(nullptr);
     }
 }
 
-void LiveServices::addTo(platform::Platform& platform, const std::string& language, bool ownPositions) {
+void LiveServices::makeOnce(const platform::Platform& platform) {
     mainLoop_ = platform.mainLoop;
-    platform.accounts = accounts_;
-    platform.deviceInformation = std::make_shared<linux_::SystemDeviceInformation>();
-    platform.deviceLock = std::make_shared<linux_::LogindLock>();
-    platform.restrictions = std::make_shared<linux_::ConfiguredRestrictions>(accounts_);
-    platform.geographicSettings = std::make_shared<linux_::ConfiguredGeography>(accounts_);
-    const auto preferences = std::make_shared<linux_::FilePreferences>(linux_::XdgFolders::state() / "preferences");
-    preferences->load(kPreferences);
-    platform.preferences = preferences;
-    if (!ownPositions) {
-        platform.locationManagers =
-            linux_::ConfiguredPositions::make(configuration_.positions, mainLoop_, platform.clock, platform.geodesy);
-    }
-    looksForPosition_ =
-        ownPositions || configuration_.positions.source != linux_::Configuration::Positions::Source::None;
-    const auto transport =
-        std::make_shared<linux_::QtHttpTransport>([accounts = accounts_] { return transportSettings(*accounts); });
-    service_ = std::make_shared<ServiceWatch>(
-        std::make_shared<linux_::RememberedHostTransport>(transport, preferences, kPreferences), mainLoop_,
-        platform.clock);
-    platform.httpTransport = service_;
-    assistant_ = std::make_unique<linux_::AssistantClient>([accounts = accounts_, language] {
-        const auto settings = transportSettings(*accounts);
-        return linux_::AssistantClient::Settings{settings.serviceHost, settings.certificateFiles, language};
-    });
+    deviceInformation_ = std::make_shared<linux_::SystemDeviceInformation>();
+    deviceLock_ = std::make_shared<linux_::LogindLock>();
+    preferences_ = std::make_shared<linux_::FilePreferences>(linux_::XdgFolders::state() / "preferences");
+    preferences_->load(kPreferences);
+    const auto lane = [accounts = accounts_, preferences = preferences_]() -> std::shared_ptr<platform::HttpTransport> {
+        const auto transport =
+            std::make_shared<linux_::QtHttpTransport>([accounts] { return transportSettings(*accounts); });
+        return std::make_shared<linux_::RememberedHostTransport>(transport, preferences, kPreferences);
+    };
+    lanes_ = std::make_shared<ServiceLanes>(lane, mainLoop_);
+    service_ = std::make_shared<ServiceWatch>(lanes_, mainLoop_, platform.clock);
     service_->setChanged([this] {
         if (changed_) {
             changed_();
         }
     });
+    // Asked on the main thread, at each question.
+    assistant_ = std::make_unique<linux_::AssistantClient>([this] {
+        const auto settings = transportSettings(*accounts_);
+        return linux_::AssistantClient::Settings{settings.serviceHost, settings.certificateFiles, language_};
+    });
+}
+
+void LiveServices::addTo(platform::Platform& platform, const std::string& language, bool ownPositions) {
+    using Source = linux_::Configuration::Positions::Source;
+    if (!mainLoop_) {
+        makeOnce(platform);
+    }
+    language_ = language;
+    account_ = accounts_->deviceOwnerAccount();
+    platform.accounts = accounts_;
+    platform.deviceInformation = deviceInformation_;
+    platform.deviceLock = deviceLock_;
+    platform.restrictions = std::make_shared<linux_::ConfiguredRestrictions>(accounts_);
+    platform.geographicSettings = std::make_shared<linux_::ConfiguredGeography>(accounts_);
+    platform.preferences = preferences_;
+    platform.httpTransport = service_;
+    if (!ownPositions) {
+        if (!positions_ || positionsMade_ != configuration_.positions) {
+            positionsMade_ = configuration_.positions;
+            positions_ = linux_::ConfiguredPositions::make(positionsMade_, mainLoop_, platform.clock, platform.geodesy);
+        }
+        platform.locationManagers = positions_;
+    }
+    looksForPosition_ = ownPositions || configuration_.positions.source != Source::None;
 }
 
 void LiveServices::start(std::function<void()> ready) {
@@ -99,6 +116,9 @@ void LiveServices::start(std::function<void()> ready) {
             }
             watcher_ =
                 std::make_unique<linux_::ConfigurationWatcher>(accounts, mainLoop_, [this] { configurationChanged(); });
+            // Nothing has asked for the account before it is read for the first time.
+            account_ = accounts->deviceOwnerAccount();
+            configurationChanged();
             ready();
         });
     });
@@ -108,12 +128,20 @@ void LiveServices::drawConfiguredMaps(std::shared_ptr<linux_::ThreadedMapSource>
     maps_ = std::move(maps);
 }
 
+void LiveServices::takeConfiguration() {
+    configuration_ = accounts_->configuration();
+}
+
 void LiveServices::configurationChanged() {
     const auto now = accounts_->configuration();
     if (maps_ && (now.maps != configuration_.maps || now.certificates != configuration_.certificates)) {
-        configuration_.maps = now.maps;
-        configuration_.certificates = now.certificates;
         maps_->setGrounds(linux_::ConfiguredMaps::grounds(now, resourceFolder()));
+    }
+    configuration_.maps = now.maps;
+    configuration_.certificates = now.certificates;
+    // The store keeps an account that reads as before.
+    if ((now != configuration_ || accounts_->deviceOwnerAccount() != account_) && outdated_) {
+        outdated_();
     }
     if (changed_) {
         changed_();

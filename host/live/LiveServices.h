@@ -6,10 +6,12 @@
 #include <string>
 #include <vector>
 
+#include "host/live/ServiceLanes.h"
 #include "host/live/ServiceWatch.h"
 #include "linux/configuration/Configuration.h"
 #include "linux/configuration/ConfigurationWatcher.h"
 #include "linux/configuration/ConfiguredAccountStore.h"
+#include "linux/configuration/FilePreferences.h"
 #include "linux/maps/ThreadedMapSource.h"
 #include "linux/net/AssistantClient.h"
 #include "platform/base/Platform.h"
@@ -27,17 +29,29 @@ class LiveServices {
     LiveServices(const LiveServices&) = delete;
     LiveServices& operator=(const LiveServices&) = delete;
 
-    /// As it was when the program started.
+    /// As the platform was told last.
     const linux_::Configuration& configuration() const { return configuration_; }
     /// What was wrong with the configuration or the token at the last reading, in one line; empty when nothing was.
     std::string problem() const { return accounts_->problem(); }
 
     /// Sets the members that lead to account, service and position. The platform's loop, clock and geodesy are set
-    /// already. With `ownPositions` its location managers are left as they are.
+    /// already. With `ownPositions` its location managers are left as they are. Called again for the platform that
+    /// takes another's place, with what the configuration says by then: what did not change goes on.
     void addTo(platform::Platform& platform, const std::string& language, bool ownPositions);
     /// Reads the account in the background, and again whenever its files change. `ready` is called once, when the first
     /// reading has ended, well or not.
     void start(std::function<void()> ready);
+    /// Called when account, token, language, contacts or anything else has changed that a platform is asked only once:
+    /// it wants another platform, with the configuration as it is now.
+    void setOutdated(std::function<void()> outdated) { outdated_ = std::move(outdated); }
+    /// Takes over the configuration as it was read last.
+    void takeConfiguration();
+
+    /// Ends all commands under way.
+    void cancelCommands() { lanes_->cancelAll(); }
+    /// Lets commands show the user, or ends those that do (`ServiceLanes`).
+    void openSharing() { lanes_->openSharing(); }
+    void closeSharing() { lanes_->closeSharing(); }
 
     /// Has this source draw what the configuration names whenever that changes; the datum stays as it was made.
     void drawConfiguredMaps(std::shared_ptr<linux_::ThreadedMapSource> maps);
@@ -52,17 +66,29 @@ class LiveServices {
     void setChanged(std::function<void()> changed);
 
   private:
+    /// What stays for as long as the conversation does.
+    void makeOnce(const platform::Platform& platform);
     void configurationChanged();
 
     const std::filesystem::path file_;
     linux_::Configuration configuration_;
+    /// Of the platform that there is: the account as it found it.
+    std::shared_ptr<platform::DeviceOwnerAccount> account_;
     std::shared_ptr<linux_::ConfiguredAccountStore> accounts_;
     std::shared_ptr<platform::MainLoop> mainLoop_;
+    std::shared_ptr<linux_::FilePreferences> preferences_;
+    std::shared_ptr<platform::DeviceInformation> deviceInformation_;
+    std::shared_ptr<platform::DeviceLock> deviceLock_;
+    std::shared_ptr<platform::LocationManagerFactory> positions_;
+    linux_::Configuration::Positions positionsMade_;
+    std::shared_ptr<ServiceLanes> lanes_;
     std::shared_ptr<ServiceWatch> service_;
+    std::string language_;
     std::unique_ptr<linux_::AssistantClient> assistant_;
     std::unique_ptr<linux_::ConfigurationWatcher> watcher_;
     std::shared_ptr<linux_::ThreadedMapSource> maps_;
     std::function<void()> changed_;
+    std::function<void()> outdated_;
     bool looksForPosition_ = false;
     /// Tells work in the background whether this still stands.
     std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);

@@ -57,14 +57,14 @@ double ServiceWatch::intervalOf(const HttpAnswer& answer) {
     return std::isfinite(milliseconds) && milliseconds > 0.0 ? milliseconds / kMillisecondsASecond : 0.0;
 }
 
-void ServiceWatch::State::take(Trouble trouble, std::optional<double> interval) {
+void ServiceWatch::State::take(std::optional<Trouble> trouble, std::optional<double> interval) {
     --notes.underWay;
-    notes.trouble = trouble;
+    notes.trouble = trouble.value_or(notes.trouble);
     if (interval) {
         notes.answered = clock->now();
         notes.interval = *interval;
         ++notes.answers;
-    } else {
+    } else if (trouble) {
         ++notes.failures;
     }
     if (changed) {
@@ -80,7 +80,7 @@ void ServiceWatch::send(const platform::HttpRequest& request, Completion complet
     // The loop outlives every command: whoever owns it ends the transport first.
     platform::MainLoop* const mainLoop = mainLoop_.get();
     next_->send(request, [state = state_, mainLoop, completion = std::move(completion)](HttpAnswer answer) {
-        const Trouble trouble = troubleOf(answer);
+        const auto trouble = answer.failure == HttpFailure::Cancelled ? std::nullopt : std::optional(troubleOf(answer));
         const auto interval = trouble == Trouble::None ? std::optional(intervalOf(answer)) : std::nullopt;
         completion(std::move(answer));
         mainLoop->post([state, trouble, interval] { state->take(trouble, interval); });

@@ -53,7 +53,8 @@ class ServiceWatch : public platform::HttpTransport {
         Notes notes;
         std::function<void()> changed;
         std::shared_ptr<platform::Clock> clock;
-        void take(Trouble trouble, std::optional<double> interval);
+        /// No trouble at all, not even `None`: the command was ended by this side.
+        void take(std::optional<Trouble> trouble, std::optional<double> interval);
     };
 
     std::shared_ptr<platform::MainLoop> mainLoop_;

@@ -35,6 +35,10 @@ void HostSnippetViewController::updateViewConstraints() {}
 double HostSnippetViewController::desiredHeightForWidth(double /*width*/) {
     return 0.0;
 }
+std::shared_ptr<AssistantObject> HostSnippetViewController::currentSnippet() const {
+    return nullptr;
+}
+
 bool HostSnippetViewController::isSearching() const {
     return false;
 }

@@ -39,6 +39,10 @@ class KTR_API HostSnippetViewController : public Object {
     /// without the height or anything else changing, so a host that shows it asks again and again. Cheap. The base
     /// looks for nothing.
     virtual bool isSearching() const;
+    /// The snippet as it stands now, with the newest that the service said in it: another controller that is made of it
+    /// shows the same. A host asks before it makes its cards anew. None: there is nothing newer than what the
+    /// controller was made of; so it is with the base.
+    virtual std::shared_ptr<AssistantObject> currentSnippet() const;
 
     void setDefaultViewInsets(const EdgeInsets& insets) { insets_ = insets; }
     const EdgeInsets& defaultViewInsets() const { return insets_; }

@@ -11,7 +11,7 @@
 extern "C" {
 
 /// Raised with every change of a class that host and plugin share.
-#define KTR_PLUGIN_ABI 1u
+#define KTR_PLUGIN_ABI 2u
 
 struct ktr_plugin_manifest {
     std::uint32_t abi;

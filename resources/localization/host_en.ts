@@ -134,6 +134,16 @@
         <translation>This answer cannot be shown here.</translation>
     </message>
     <message>
+        <source>ANSWER_RESTRICTED</source>
+        <extracomment>Below a question, while the device allows no friends’ locations</extracomment>
+        <translation>Friends’ locations are switched off on this device.</translation>
+    </message>
+    <message>
+        <source>STATUS_UNREADABLE</source>
+        <extracomment>Status line: the configuration is broken</extracomment>
+        <translation>Your settings cannot be read.</translation>
+    </message>
+    <message>
         <source>MAP_NOT_AVAILABLE</source>
         <extracomment>In place of a map that nobody can draw. English: “Map not available”</extracomment>
         <translation>Map not available</translation>

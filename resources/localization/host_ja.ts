@@ -134,6 +134,16 @@
         <translation>この回答はここでは表示できません。</translation>
     </message>
     <message>
+        <source>ANSWER_RESTRICTED</source>
+        <extracomment>Below a question, while the device allows no friends’ locations. English: “Friends’ locations are switched off on this device.”</extracomment>
+        <translation>このデバイスでは友だちの位置情報がオフになっています。</translation>
+    </message>
+    <message>
+        <source>STATUS_UNREADABLE</source>
+        <extracomment>Status line: the configuration is broken. English: “Your settings cannot be read.”</extracomment>
+        <translation>設定を読み込めません。</translation>
+    </message>
+    <message>
         <source>MAP_NOT_AVAILABLE</source>
         <extracomment>In place of a map that nobody can draw. English: “Map not available”</extracomment>
         <translation>地図を表示できません</translation>

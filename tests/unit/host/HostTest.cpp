@@ -33,15 +33,6 @@ class HostTest : public ::testing::Test {
     std::unique_ptr<Host> host;
 };
 
-TEST_F(HostTest, NewerAnswerAboutSharing_EndsTheOneBefore) {
-    add("sharing-visible");
-    EXPECT_EQ(ended(), 0);
-    add("sharing-hidden");
-    EXPECT_EQ(ended(), 1);
-    add("sharing-visible");
-    EXPECT_EQ(ended(), 2);
-}
-
 TEST_F(HostTest, OtherAnswers_LeaveSharingGoingOn) {
     add("sharing-visible");
     add("fence-leaving");
