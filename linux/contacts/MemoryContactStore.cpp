@@ -91,6 +91,7 @@ MemoryContactStore::MemoryContactStore(Contacts contacts, std::shared_ptr<Phonen
     : contacts_(std::move(contacts)),
       phoneNumbers_(std::move(phoneNumbers)),
       homeCountryCode_(std::move(homeCountryCode)) {
+    std::unordered_map<std::string, int> claims;
     for (std::size_t position = 0; position < contacts_.size(); ++position) {
         platform::Contact& contact = *contacts_[position];
         if (contact.identifier.empty()) {
@@ -98,16 +99,24 @@ MemoryContactStore::MemoryContactStore(Contacts contacts, std::shared_ptr<Phonen
         }
         // Two cards may claim one identifier: the later ones are counted, so that each can be found.
         const std::string claimed = contact.identifier;
-        for (int count = 2; !byIdentifier_.emplace(contact.identifier, position).second; ++count) {
-            contact.identifier = claimed + "#" + std::to_string(count);
+        while (!byIdentifier_.emplace(contact.identifier, position).second) {
+            // From where the one before stopped: thousands of cards may claim the same.
+            int& count = claims.emplace(claimed, 1).first->second;
+            contact.identifier = claimed + "#" + std::to_string(++count);
         }
         for (const auto& email : contact.emailAddresses) {
-            byEmail_[platform::asciiLowercased(email.value)].push_back(position);
+            if (auto& alike = byEmail_[platform::asciiLowercased(email.value)];
+                alike.size() < kMostAlike && (alike.empty() || alike.back() != position)) {
+                alike.push_back(position);
+            }
         }
         for (std::size_t number = 0; number < contact.phoneNumbers.size(); ++number) {
             const auto digits = digitsOf(withoutExtension(withoutScheme(contact.phoneNumbers[number].value)));
-            if (!digits.empty()) {
-                byLastDigits_[lastDigits(digits)].push_back({position, number});
+            if (digits.empty()) {
+                continue;
+            }
+            if (auto& alike = byLastDigits_[lastDigits(digits)]; alike.size() < kMostCompared) {
+                alike.push_back({position, number});
             }
         }
     }
@@ -151,7 +160,9 @@ platform::ContactFetch<platform::ContactStore::Contacts> MemoryContactStore::uni
     const auto parts = phoneNumbers_->parts(number, homeCountryCode_);
     std::vector<std::size_t> positions;
     for (const StoredNumber& candidate : candidates->second) {
-        if (matches(contacts_[candidate.contact]->phoneNumbers[candidate.number].value, number, parts)) {
+        const bool isKnown = !positions.empty() && positions.back() == candidate.contact;
+        if (positions.size() < kMostAlike && !isKnown &&
+            matches(contacts_[candidate.contact]->phoneNumbers[candidate.number].value, number, parts)) {
             positions.push_back(candidate.contact);
         }
     }

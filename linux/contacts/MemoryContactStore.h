@@ -15,6 +15,10 @@ namespace ktr::linux_ {
 /// are always fetched. Main thread.
 class MemoryContactStore : public platform::ContactStore {
   public:
+    /// Of contacts with the same handle so many, the first, are found; of numbers that end alike so many are compared.
+    static constexpr std::size_t kMostAlike = 32;
+    static constexpr std::size_t kMostCompared = 256;
+
     /// The order of the list is the store's. A contact without an identifier is given one made from its names and
     /// handles, the same at every start. Numbers that are not complete are read as those of the home country.
     MemoryContactStore(Contacts contacts, std::shared_ptr<PhonenumberLibrary> phoneNumbers,

@@ -3,17 +3,16 @@
 #include <algorithm>
 #include <fstream>
 #include <iterator>
-#include <mutex>
-#include <string_view>
 #include <system_error>
 #include <utility>
 
 #include <QBuffer>
 #include <QByteArray>
 #include <QImage>
-#include <QImageReader>
 
+#include "linux/device/ComputingTime.h"
 #include "linux/device/LoadableModule.h"
+#include "linux/paint/ImageDecoder.h"
 #include "platform/base/Utf8.h"
 
 namespace ktr::linux_ {
@@ -41,53 +40,8 @@ const Module& module() {
     return loaded;
 }
 
-struct Line {
-    std::string_view text;  ///< without its end
-    std::size_t end = 0;    ///< where the next one begins
-};
-
-Line lineAt(std::string_view text, std::size_t begin) {
-    const auto end = text.find_first_of("\r\n", begin);
-    if (end == std::string_view::npos) {
-        return {text.substr(begin), text.size()};
-    }
-    const bool both = text[end] == '\r' && end + 1 < text.size() && text[end + 1] == '\n';
-    return {text.substr(begin, end - begin), end + (both ? 2 : 1)};
-}
-
-std::string_view trimmed(std::string_view text) {
-    const auto begin = text.find_first_not_of(" \t");
-    return begin == std::string_view::npos ? std::string_view()
-                                           : text.substr(begin, text.find_last_not_of(" \t") - begin + 1);
-}
-
-/// Whether a line is this one, whatever the case. A folded line (which begins with a blank) never is.
-bool isLine(std::string_view line, std::string_view wanted) {
-    return !line.empty() && line.front() != ' ' && line.front() != '\t' &&
-           platform::asciiLowercased(trimmed(line)) == wanted;
-}
-
-/// A picture too large to be kept for each row is made smaller; one that cannot be read gives none.
-std::optional<platform::Bytes> thumbnailOf(const platform::Bytes& image) {
-    if (image.size() <= kLargestThumbnail) {
-        return image;
-    }
-    QByteArray data =
-        QByteArray::fromRawData(reinterpret_cast<const char*>(image.data()), static_cast<qsizetype>(image.size()));
-    QBuffer source(&data);
-    source.open(QIODevice::ReadOnly);
-    QImageReader reader(&source);
-    reader.setAutoTransform(true);
-    if (const QSize size = reader.size(); size.width() > kThumbnailSide || size.height() > kThumbnailSide) {
-        reader.setScaledSize(size.scaled(kThumbnailSide, kThumbnailSide, Qt::KeepAspectRatio));
-    }
-    QImage picture = reader.read();
-    if (picture.isNull()) {
-        return std::nullopt;
-    }
-    if (picture.width() > kThumbnailSide || picture.height() > kThumbnailSide) {
-        picture = picture.scaled(kThumbnailSide, kThumbnailSide, Qt::KeepAspectRatio, Qt::SmoothTransformation);
-    }
+/// A picture as a file again.
+std::optional<platform::Bytes> encoded(const QImage& picture) {
     QByteArray out;
     QBuffer target(&out);
     target.open(QIODevice::WriteOnly);
@@ -99,8 +53,80 @@ std::optional<platform::Bytes> thumbnailOf(const platform::Bytes& image) {
 
 }  // namespace
 
-VCardReader::Result VCardReader::read(const std::filesystem::path& path) const {
+/// One reading, of a text or of many files.
+class VCardReader::Reading {
+  public:
     Result result;
+
+    void readFile(const std::filesystem::path& file) {
+        std::error_code failed;
+        const auto size = std::filesystem::file_size(file, failed);
+        if (!failed && size > kLargestFile) {
+            problem({file, 0, "the file is larger than 256 MiB"});
+            return;
+        }
+        std::ifstream stream(file, std::ios::binary);
+        if (failed || !stream) {
+            problem({file, 0, failed ? failed.message() : "the file cannot be opened"});
+            return;
+        }
+        readCards(std::string(std::istreambuf_iterator<char>(stream), {}), file);
+    }
+
+    void readCards(const std::string& text, const std::filesystem::path& file) {
+        const VCardText found = VCardText::of(text);
+        std::vector<Problem> problems;
+        for (const auto& known : found.problems) {
+            problems.push_back({file, known.line, known.message});
+        }
+        for (const VCardText::Card& card : found.cards) {
+            if (result.contacts.size() == kMostContacts) {
+                problems.push_back({file, card.line, "there are more than 100000 contacts"});
+                break;
+            }
+            auto contact = std::make_shared<platform::Contact>();
+            if (!module().read(platform::sanitizedUtf8(VCardText::essential(card.text)), *contact)) {
+                problems.push_back({file, card.line, "the card holds neither a name nor an address nor a number"});
+                continue;
+            }
+            if (contact->imageData) {
+                contact->thumbnailImageData = thumbnailOf(*contact->imageData);
+            }
+            result.contacts.push_back(std::move(contact));
+        }
+        std::stable_sort(problems.begin(), problems.end(),
+                         [](const Problem& a, const Problem& b) { return a.line < b.line; });
+        for (auto& one : problems) {
+            problem(std::move(one));
+        }
+    }
+
+  private:
+    void problem(Problem one) {
+        if (result.problems.size() < VCardText::kMostProblems) {
+            result.problems.push_back(std::move(one));
+        }
+    }
+
+    /// A picture too large to be kept for each row is made smaller; one that cannot be read gives none.
+    std::optional<platform::Bytes> thumbnailOf(const platform::Bytes& image) {
+        if (image.size() <= kLargestThumbnail) {
+            return image;
+        }
+        const auto before = computingTime();
+        const auto decoded = ImageDecoder::decode(
+            image, kThumbnailSide, std::min<std::chrono::nanoseconds>(timeLeft_, ImageDecoder::kMostTime));
+        auto thumbnail = decoded ? encoded(decoded->pixels) : std::nullopt;
+        timeLeft_ -= computingTime() - before;
+        return thumbnail;
+    }
+
+    std::chrono::nanoseconds timeLeft_ = kThumbnailTime;
+};
+
+VCardReader::Result VCardReader::read(const std::filesystem::path& path) const {
+    Reading reading;
+    Result& result = reading.result;
     std::error_code failed;
     if (!std::filesystem::exists(path, failed)) {
         result.error = path.string() + ": no such file or folder";
@@ -111,7 +137,7 @@ VCardReader::Result VCardReader::read(const std::filesystem::path& path) const {
         return result;
     }
     if (!std::filesystem::is_directory(path, failed)) {
-        readFile(path, result);
+        reading.readFile(path);
         if (result.contacts.empty() && !result.problems.empty() && result.problems.front().line == 0) {
             result.error = path.string() + ": " + result.problems.front().message;
             result.problems.clear();
@@ -132,80 +158,19 @@ VCardReader::Result VCardReader::read(const std::filesystem::path& path) const {
     }
     std::sort(files.begin(), files.end());
     for (const auto& file : files) {
-        readFile(file, result);
+        reading.readFile(file);
     }
     return result;
 }
 
 VCardReader::Result VCardReader::readText(const std::string& text, const std::filesystem::path& file) const {
-    Result result;
+    Reading reading;
     if (!module().read) {
-        result.error = "contacts cannot be read: " + module().error;
-        return result;
+        reading.result.error = "contacts cannot be read: " + module().error;
+    } else {
+        reading.readCards(text, file);
     }
-    readCards(text, file, result);
-    return result;
-}
-
-void VCardReader::readFile(const std::filesystem::path& file, Result& result) const {
-    std::error_code failed;
-    const auto size = std::filesystem::file_size(file, failed);
-    if (!failed && size > kLargestFile) {
-        result.problems.push_back({file, 0, "the file is larger than 256 MiB"});
-        return;
-    }
-    std::ifstream stream(file, std::ios::binary);
-    if (failed || !stream) {
-        result.problems.push_back({file, 0, failed ? failed.message() : "the file cannot be opened"});
-        return;
-    }
-    readCards(std::string(std::istreambuf_iterator<char>(stream), {}), file, result);
-}
-
-void VCardReader::readCards(const std::string& text, const std::filesystem::path& file, Result& result) const {
-    const auto problem = [&](std::size_t line, const char* message) {
-        result.problems.push_back({file, line, message});
-    };
-    constexpr std::string_view kByteOrderMark = "\xef\xbb\xbf";
-    std::size_t at =
-        std::string_view(text).substr(0, kByteOrderMark.size()) == kByteOrderMark ? kByteOrderMark.size() : 0;
-    std::size_t number = 0;    // of the line under way
-    std::size_t cardLine = 0;  // 0: outside a card
-    std::size_t cardBegin = 0;
-    bool strayTold = false;
-    while (at < text.size()) {
-        const Line line = lineAt(text, at);
-        ++number;
-        if (isLine(line.text, "begin:vcard")) {
-            if (cardLine != 0) {
-                problem(cardLine, "the card has no END:VCARD");
-            }
-            cardLine = number;
-            cardBegin = at;
-        } else if (cardLine == 0 && !trimmed(line.text).empty() && !strayTold) {
-            strayTold = true;
-            problem(number, "text outside a card");
-        } else if (cardLine != 0 && isLine(line.text, "end:vcard")) {
-            auto contact = std::make_shared<platform::Contact>();
-            if (line.end - cardBegin > kLargestCard) {
-                problem(cardLine, "the card is larger than 16 MiB");
-            } else if (!module().read(platform::sanitizedUtf8(text.substr(cardBegin, line.end - cardBegin)),
-                                      *contact)) {
-                problem(cardLine, "the card holds neither a name nor an address nor a number");
-            } else {
-                if (contact->imageData) {
-                    contact->thumbnailImageData = thumbnailOf(*contact->imageData);
-                }
-                result.contacts.push_back(std::move(contact));
-            }
-            cardLine = 0;
-            strayTold = false;
-        }
-        at = line.end;
-    }
-    if (cardLine != 0) {
-        problem(cardLine, "the card has no END:VCARD");
-    }
+    return std::move(reading.result);
 }
 
 }  // namespace ktr::linux_

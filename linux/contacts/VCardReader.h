@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <filesystem>
 #include <memory>
 #include <optional>
@@ -7,6 +8,7 @@
 #include <vector>
 
 #include "linux/contacts/VCardModule.h"
+#include "linux/contacts/VCardText.h"
 #include "platform/contacts/Contact.h"
 
 namespace ktr::linux_ {
@@ -22,16 +24,18 @@ class VCardReader {
     struct Result {
         /// In the order of the files' names, and of the cards in them.
         std::vector<std::shared_ptr<platform::Contact>> contacts;
-        /// Cards and files that were passed over.
+        /// Cards and files that were passed over: the first VCardText::kMostProblems.
         std::vector<Problem> problems;
         /// Why nothing could be read at all: the path is missing or cannot be opened, or the parser cannot be loaded.
         std::optional<std::string> error;
     };
 
-    /// A file beyond this is passed over; bytes.
+    /// A file beyond this is passed over; bytes. What a card may hold is VCardText's to say.
     static constexpr std::uintmax_t kLargestFile = std::uintmax_t{256} << 20;
-    /// A card beyond this is passed over; bytes.
-    static constexpr std::size_t kLargestCard = std::size_t{16} << 20;
+    /// Contacts beyond these many are passed over, in however many files they stand.
+    static constexpr std::size_t kMostContacts = VCardText::kMostCards;
+    /// Computing time that thumbnails of large photos may take in all; contacts after that have none.
+    static constexpr std::chrono::seconds kThumbnailTime{10};
 
     /// Of a folder all its files named *.vcf (not of folders in it); of a file all its cards.
     Result read(const std::filesystem::path& path) const;
@@ -39,8 +43,7 @@ class VCardReader {
     Result readText(const std::string& text, const std::filesystem::path& file) const;
 
   private:
-    void readFile(const std::filesystem::path& file, Result& result) const;
-    void readCards(const std::string& text, const std::filesystem::path& file, Result& result) const;
+    class Reading;
 };
 
 }  // namespace ktr::linux_

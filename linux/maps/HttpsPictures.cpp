@@ -1,6 +1,5 @@
 #include "linux/maps/HttpsPictures.h"
 
-#include <QImageReader>
 #include <QMetaObject>
 #include <QNetworkAccessManager>
 #include <QNetworkReply>
@@ -47,15 +46,8 @@ std::int64_t secondsNow() {
     return std::chrono::duration_cast<seconds>(std::chrono::system_clock::now().time_since_epoch()).count();
 }
 
-/// WebP needs a plugin of Qt's that may not be there.
-bool readsWebp() {
-    static const bool reads = QImageReader::supportedImageFormats().contains("webp");
-    return reads;
-}
-
 bool isPicture(const QByteArray& data) {
-    return data.startsWith("\x89PNG\r\n\x1a\n") || data.startsWith("\xff\xd8\xff") ||
-           (readsWebp() && data.startsWith("RIFF") && data.mid(8, 4) == "WEBP");
+    return data.startsWith("\x89PNG\r\n\x1a\n") || data.startsWith("\xff\xd8\xff");
 }
 
 /// How long a server wants to be left alone (RFC 9110, section 10.2.3); it need not say, and is not asked to say it
@@ -126,7 +118,7 @@ class HttpsPictures::Fetcher : public QObject {
         request.setAttribute(QNetworkRequest::CookieSaveControlAttribute, QNetworkRequest::Manual);
         request.setAttribute(QNetworkRequest::AuthenticationReuseAttribute, QNetworkRequest::Manual);
         request.setRawHeader("User-Agent", "ktr/" KTR_VERSION);
-        request.setRawHeader("Accept", readsWebp() ? "image/png, image/jpeg, image/webp" : "image/png, image/jpeg");
+        request.setRawHeader("Accept", "image/png, image/jpeg");
         request.setRawHeader("Accept-Encoding", "identity");
         // Qt would name the system's language.
         request.setRawHeader("Accept-Language", "*");

@@ -14,7 +14,7 @@ namespace ktr::linux_ {
 class TilePictures {
   public:
     struct Answer {
-        std::optional<platform::Bytes> data;  ///< PNG, JPEG or WebP, not checked
+        std::optional<platform::Bytes> data;  ///< PNG or JPEG, not checked
         bool isComing = false;                ///< there will be one, or a newer one, later
         /// Grows when another picture takes this one's place.
         unsigned version = 0;

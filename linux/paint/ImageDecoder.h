@@ -2,18 +2,27 @@
 
 #include <QImage>
 #include <QSize>
+#include <chrono>
 #include <optional>
 
+#include "linux/paint/PictureData.h"
 #include "platform/ui/Image.h"
 
 namespace ktr::linux_ {
 
-/// Reads pictures from data that came from anywhere. Any thread.
+/// The one place where a picture is decoded, whatever it is for: faces, map tiles, named images. Any thread.
+///
+/// The policy, for data that came from anywhere:
+/// - PNG and JPEG alone. Other formats run for long, refer to what is outside of them, or are seldom looked after.
+/// - 16 MiB of data; 8192 pixels a side; 2^24 pixels in all, half as many with 16 bits a channel; 64 scans.
+///   PictureData holds these before anything is decoded, and keeps all else that the data announces from the decoder.
+/// - Two seconds of the thread's computing time; then the picture is given up. Not of the clock's: a busy machine
+///   loses no faces.
+/// - Together these bound the memory of one decoding to 256 MiB, whatever the data says.
+/// Drawings (SVG) are no pictures here: SvgImage reads only those that come with the program.
 class ImageDecoder {
   public:
-    /// Data beyond kMostBytes and pictures beyond kMostSide pixels a side are refused.
-    static constexpr std::size_t kMostBytes = 16UL * 1024UL * 1024UL;
-    static constexpr int kMostSide = 4096;
+    static constexpr std::chrono::milliseconds kMostTime{2000};
 
     struct Picture {
         /// Upright, at most as large as was asked for.
@@ -22,9 +31,10 @@ class ImageDecoder {
         QSize original;
     };
 
-    /// None when the data is no JPEG, PNG, GIF, BMP or WebP picture that can be read, or one beyond the caps. Pictures
-    /// whose longer side exceeds `longest` pixels are scaled down to it while they are read.
-    static std::optional<Picture> decode(const platform::Bytes& data, int longest);
+    /// None when the policy refuses the data, or it is damaged. Pictures whose longer side exceeds `longest` pixels are
+    /// scaled down to it while they are read. At most `time` of computing time; what is not done by then is none.
+    static std::optional<Picture> decode(const platform::Bytes& data, int longest,
+                                         std::chrono::nanoseconds time = kMostTime);
 };
 
 }  // namespace ktr::linux_

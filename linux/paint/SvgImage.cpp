@@ -1,15 +1,51 @@
 #include "linux/paint/SvgImage.h"
 
 #include <QPainter>
+#include <QXmlStreamReader>
+#include <algorithm>
 
 namespace ktr::linux_ {
 
+namespace {
+
+/// Whether a drawing stands by itself: read before the renderer sees it, which would follow what it refers to.
+bool standsByItself(const QByteArray& source) {
+    QXmlStreamReader reader(source);
+    while (!reader.atEnd()) {
+        const auto token = reader.readNext();
+        if (token == QXmlStreamReader::DTD) {
+            return false;
+        }
+        if (token != QXmlStreamReader::StartElement) {
+            continue;
+        }
+        const auto name = reader.name();
+        if (name == u"image" || name == u"script" || name == u"foreignObject" || name == u"video" || name == u"audio") {
+            return false;
+        }
+        const auto attributes = reader.attributes();
+        const bool refersInside = std::all_of(attributes.begin(), attributes.end(), [](const auto& attribute) {
+            return attribute.name() != u"href" || attribute.value().startsWith(u'#');
+        });
+        if (!refersInside) {
+            return false;
+        }
+    }
+    return !reader.hasError();
+}
+
+}  // namespace
+
 std::shared_ptr<SvgImage> SvgImage::fromSource(const QByteArray& source) {
-    auto image = std::shared_ptr<SvgImage>(new SvgImage);
-    if (!image->renderer_.load(source) || image->renderer_.defaultSize().isEmpty()) {
+    if (source.size() > kMostBytes || !standsByItself(source)) {
         return nullptr;
     }
-    return image;
+    auto image = std::shared_ptr<SvgImage>(new SvgImage);
+    if (!image->renderer_.load(source)) {
+        return nullptr;
+    }
+    const QSize size = image->renderer_.defaultSize();
+    return size.isEmpty() || size.width() > kMostSide || size.height() > kMostSide ? nullptr : image;
 }
 
 platform::Size SvgImage::size() const {

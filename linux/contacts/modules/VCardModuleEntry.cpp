@@ -4,6 +4,7 @@
 #include <memory>
 #include <string>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 #include "linux/contacts/VCardModule.h"
@@ -62,15 +63,25 @@ std::string groupOf(EVCardAttribute* attribute) {
     return platform::asciiLowercased(group ? group : "");
 }
 
-/// The owner's own word for a grouped property ("item1.X-ABLABEL"), else the built-in label of its type, else nothing.
-std::string labelOf(EVCard* card, EVCardAttribute* attribute) {
-    if (const std::string group = groupOf(attribute); !group.empty()) {
-        for (GList* node = e_vcard_get_attributes(card); node; node = node->next) {
-            auto* other = static_cast<EVCardAttribute*>(node->data);
-            if (groupOf(other) == group && lowerName(other) == "x-ablabel") {
-                return component(valuesOf(other), 0);
-            }
+/// The owner's own words for grouped properties ("item1.X-ABLABEL"), by group.
+using Labels = std::unordered_map<std::string, std::string>;
+
+Labels labelsOf(EVCard* card) {
+    Labels labels;
+    for (GList* node = e_vcard_get_attributes(card); node; node = node->next) {
+        auto* attribute = static_cast<EVCardAttribute*>(node->data);
+        if (lowerName(attribute) == "x-ablabel") {
+            labels.emplace(groupOf(attribute), component(valuesOf(attribute), 0));
         }
+    }
+    labels.erase("");
+    return labels;
+}
+
+/// The owner's own word for a property, else the built-in label of its type, else nothing.
+std::string labelOf(const Labels& labels, EVCardAttribute* attribute) {
+    if (const auto own = labels.find(groupOf(attribute)); own != labels.end()) {
+        return own->second;
     }
     if (e_vcard_attribute_has_type(attribute, "HOME")) {
         return "_$!<home>!$_";
@@ -126,7 +137,7 @@ void readName(const std::vector<std::string>& values, platform::Contact& contact
     contact.nameSuffix = component(values, 4);
 }
 
-void readProperty(EVCard* card, EVCardAttribute* attribute, platform::Contact& contact) {
+void readProperty(const Labels& labels, EVCardAttribute* attribute, platform::Contact& contact) {
     const std::string name = lowerName(attribute);
     const auto setOnce = [&](std::string& field, std::size_t index) {
         if (field.empty()) {
@@ -158,7 +169,7 @@ void readProperty(EVCard* card, EVCardAttribute* attribute, platform::Contact& c
         const bool email = name == "email";
         const std::string value = trimmed(withoutScheme(component(valuesOf(attribute), 0), email ? "mailto:" : "tel:"));
         if (!value.empty()) {
-            (email ? contact.emailAddresses : contact.phoneNumbers).push_back({labelOf(card, attribute), value});
+            (email ? contact.emailAddresses : contact.phoneNumbers).push_back({labelOf(labels, attribute), value});
         }
     } else if (name == "photo" && !contact.imageData) {
         contact.imageData = pictureOf(attribute);
@@ -179,8 +190,9 @@ bool readCard(const std::string& text, platform::Contact& contact) {
     if (!card) {
         return false;
     }
+    const Labels labels = labelsOf(card.get());
     for (GList* node = e_vcard_get_attributes(card.get()); node; node = node->next) {
-        readProperty(card.get(), static_cast<EVCardAttribute*>(node->data), contact);
+        readProperty(labels, static_cast<EVCardAttribute*>(node->data), contact);
     }
     return saysSomething(contact);
 }

@@ -2,6 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <set>
+
+#include "linux/device/ComputingTime.h"
+
 namespace ktr::linux_ {
 
 namespace {
@@ -77,6 +81,30 @@ TEST_F(MemoryContactStoreTest, ASharedIdentifier_StaysWithTheFirstContact) {
     MemoryContactStore store(contacts, phoneNumbers, "GB");
     EXPECT_EQ(store.unifiedContactWithIdentifier("1", {}).result, first);
     EXPECT_EQ(store.unifiedContactWithIdentifier("1#2", {}).result, second);
+}
+
+TEST_F(MemoryContactStoreTest, ThousandsOfTheSameContact_AreNamedAndFoundInLinearTime) {
+    constexpr std::size_t kCount = 32'000;
+    for (std::size_t i = 0; i < kCount; ++i) {
+        add("Ann", "01632 960001")->emailAddresses.push_back({"", "ann@harbour.example"});
+    }
+    const auto before = computingTime();
+    MemoryContactStore store(contacts, phoneNumbers, "GB");
+    std::set<std::string> identifiers;
+    for (const auto& contact : contacts) {
+        identifiers.insert(contact->identifier);
+    }
+    EXPECT_EQ(identifiers.size(), kCount);
+    EXPECT_EQ(contacts.back()->identifier, contacts.front()->identifier + "#32000");
+    // Each of them asked for: only so many are compared.
+    for (std::size_t i = 0; i < kCount; ++i) {
+        ASSERT_EQ(store.unifiedContactsMatchingPhoneNumber("01632 960001", {}).result.size(),
+                  MemoryContactStore::kMostAlike);
+        ASSERT_EQ(store.unifiedContactsMatchingEmailAddress("ann@harbour.example", {}).result.size(),
+                  MemoryContactStore::kMostAlike);
+    }
+    // Far below what comparing each with each would take.
+    EXPECT_LT(computingTime() - before, std::chrono::seconds(10));
 }
 
 TEST_F(MemoryContactStoreTest, FiftyThousandContacts_AreIndexedWithoutReadingEveryNumber) {

@@ -1,17 +1,18 @@
 #include "linux/paint/QtImageSource.h"
 
-#include <QBuffer>
 #include <QFile>
 #include <QPainter>
 #include <QTemporaryDir>
 
 #include "linux/device/LinuxDevice.h"
-#include "linux/paint/ImageDecoder.h"
+#include "linux/paint/SvgImage.h"
 #include "tests/support/PlatformTest.h"
+#include "tests/support/qt/Pictures.h"
 
 namespace ktr::linux_ {
 
 using platform::UserInterfaceIdiom;
+using test::encoded;
 
 namespace {
 
@@ -42,14 +43,6 @@ class QtImageSourceTest : public test::PlatformTest {
     QTemporaryDir folder_;
     std::shared_ptr<LinuxDevice> linuxDevice_ = std::make_shared<LinuxDevice>();
 };
-
-platform::Bytes encoded(const QImage& image, const char* format) {
-    QByteArray data;
-    QBuffer buffer(&data);
-    buffer.open(QIODevice::WriteOnly);
-    image.save(&buffer, format);
-    return {data.begin(), data.end()};
-}
 
 }  // namespace
 
@@ -161,7 +154,7 @@ TEST_F(QtImageSourceTest, ImageFromData_HasThePicturesSize) {
     QImage pixels(30, 20, QImage::Format_RGB32);
     pixels.fill(Qt::red);
     auto found = source();
-    for (const char* format : {"PNG", "JPG", "BMP"}) {
+    for (const char* format : {"PNG", "JPG"}) {
         const auto image = found.imageFromData(encoded(pixels, format));
         ASSERT_NE(image, nullptr) << format;
         EXPECT_EQ(image->size(), (platform::Size{30, 20})) << format;
@@ -181,22 +174,27 @@ TEST_F(QtImageSourceTest, ImageFromData_OfNoPictureIsNone) {
     EXPECT_EQ(found.imageFromData(cut), nullptr);
 }
 
-TEST_F(QtImageSourceTest, ImageFromData_BeyondTheCapIsNone) {
-    auto found = source();
-    const QImage wide(ImageDecoder::kMostSide + 1, 1, QImage::Format_Mono);
-    EXPECT_EQ(found.imageFromData(encoded(wide, "PNG")), nullptr);
-    const QImage most(ImageDecoder::kMostSide, 1, QImage::Format_Mono);
-    EXPECT_NE(found.imageFromData(encoded(most, "PNG")), nullptr);
-    EXPECT_EQ(found.imageFromData(platform::Bytes(ImageDecoder::kMostBytes + 1)), nullptr);
-}
-
-TEST_F(QtImageSourceTest, Decoder_ScalesLargePicturesWhileReading) {
-    QImage pixels(1000, 500, QImage::Format_RGB32);
+TEST_F(QtImageSourceTest, DrawingsThatAreMoreThanThemselves_AreLeftOut) {
+    QImage pixels(10, 10, QImage::Format_RGB32);
     pixels.fill(Qt::red);
-    const auto picture = ImageDecoder::decode(encoded(pixels, "JPG"), 100);
-    ASSERT_TRUE(picture);
-    EXPECT_EQ(picture->pixels.size(), QSize(100, 50));
-    EXPECT_EQ(picture->original, QSize(1000, 500));
+    const auto data = encoded(pixels, "PNG");
+    put("foreign.png", std::string(data.begin(), data.end()), "elsewhere");
+    const std::string other = folder_.filePath(QStringLiteral("elsewhere/foreign.png")).toStdString();
+    const std::string start =
+        R"(<svg xmlns="http://www.w3.org/2000/svg" xmlns:xlink="http://www.w3.org/1999/xlink" width="10" height="10">)";
+    const std::string inside = R"(<rect id="a" width="10" height="10"/><use xlink:href="#a"/></svg>)";
+    put("inside.svg", start + inside);
+    put("picture.svg", start + R"(<image width="10" height="10" xlink:href=")" + other + R"("/></svg>)");
+    put("reference.svg", start + R"(<use xlink:href="file://)" + other + R"("/></svg>)");
+    put("plain.svg", start + R"(<use href="other.svg#a"/></svg>)");
+    put("type.svg", "<!DOCTYPE svg [<!ENTITY a 'x'>]>" + start + inside);
+    put("huge.svg", R"(<svg xmlns="http://www.w3.org/2000/svg" width="9000" height="10"/>)");
+    put("long.svg", start + "<!--" + std::string(SvgImage::kMostBytes, 'x') + "-->" + inside);
+    auto found = source();
+    EXPECT_NE(found.imageNamed("inside", "org.test"), nullptr);
+    for (const char* name : {"picture", "reference", "plain", "type", "huge", "long"}) {
+        EXPECT_EQ(found.imageNamed(name, "org.test"), nullptr) << name;
+    }
 }
 
 }  // namespace ktr::linux_

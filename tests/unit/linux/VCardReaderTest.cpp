@@ -1,12 +1,13 @@
 #include "linux/contacts/VCardReader.h"
 
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 
-#include <QBuffer>
 #include <QFile>
 #include <QImage>
-#include <QRandomGenerator>
 #include <QTemporaryDir>
+
+#include "tests/support/qt/Pictures.h"
 
 namespace ktr::linux_ {
 
@@ -24,6 +25,10 @@ class VCardReaderTest : public ::testing::Test {
         EXPECT_TRUE(result.problems.empty());
         EXPECT_EQ(result.contacts.size(), 1u);
         return result.contacts.empty() ? std::make_shared<platform::Contact>() : result.contacts.front();
+    }
+    std::shared_ptr<platform::Contact> withPhoto(const Bytes& photo) {
+        const QByteArray data(reinterpret_cast<const char*>(photo.data()), static_cast<qsizetype>(photo.size()));
+        return one("VERSION:4.0\r\nFN:A\r\nPHOTO:data:image/png;base64," + data.toBase64().toStdString() + "\r\n");
     }
     void write(const char* name, const QByteArray& text) {
         QFile file(folder.filePath(QString::fromLatin1(name)));
@@ -100,31 +105,36 @@ TEST_F(VCardReaderTest, PhotoElsewhere_IsNotFetched) {
 }
 
 TEST_F(VCardReaderTest, AHugePhoto_GetsASmallThumbnail) {
-    QImage noise(1200, 600, QImage::Format_RGB32);
-    QRandomGenerator random(7);
-    for (int y = 0; y < noise.height(); ++y) {
-        for (int x = 0; x < noise.width(); ++x) {
-            noise.setPixel(x, y, random.generate());
-        }
-    }
-    QByteArray data;
-    QBuffer buffer(&data);
-    ASSERT_TRUE(noise.save(&buffer, "PNG"));
-    const auto contact =
-        one("VERSION:4.0\r\nFN:A\r\nPHOTO:data:image/png;base64," + data.toBase64().toStdString() + "\r\n");
-    EXPECT_EQ(contact->imageData, Bytes(data.begin(), data.end()));
+    const Bytes png = test::encoded(test::noise(1200, 600), "PNG");
+    const auto contact = withPhoto(png);
+    EXPECT_EQ(contact->imageData, png);
     ASSERT_TRUE(contact->thumbnailImageData.has_value());
     const auto& bytes = *contact->thumbnailImageData;
     const auto thumbnail = QImage::fromData(bytes.data(), static_cast<int>(bytes.size()));
     EXPECT_EQ(thumbnail.size(), QSize(512, 256));
-    EXPECT_LT(bytes.size(), data.size());
+    EXPECT_LT(bytes.size(), png.size());
 }
 
 TEST_F(VCardReaderTest, AHugePhotoThatCannotBeRead_GivesNoThumbnail) {
-    const auto contact = one("VERSION:4.0\r\nFN:A\r\nPHOTO:data:image/png;base64," +
-                             QByteArray(600000, 'x').toBase64().toStdString() + "\r\n");
+    const auto contact = withPhoto(Bytes(600000, 'x'));
     EXPECT_TRUE(contact->imageData.has_value());
     EXPECT_EQ(contact->thumbnailImageData, std::nullopt);
+}
+
+TEST_F(VCardReaderTest, ADrawingAsAHugePhoto_ShowsNoFileOfThisMachine) {
+    QImage face(10, 10, QImage::Format_RGB32);
+    face.fill(Qt::red);
+    const QString other = folder.filePath(QStringLiteral("face.png"));
+    ASSERT_TRUE(face.save(other));
+    const QString pipe = folder.filePath(QStringLiteral("pipe"));
+    ASSERT_EQ(mkfifo(pipe.toUtf8().constData(), 0600), 0);
+    for (const QString& file : {other, pipe}) {
+        const std::string drawing =
+            R"(<svg xmlns="http://www.w3.org/2000/svg" xmlns:xlink="http://www.w3.org/1999/xlink" width="10" height="10">)"
+            R"(<image width="10" height="10" xlink:href=")" +
+            file.toStdString() + R"("/><!--)" + std::string(600000, 'x') + "--></svg>";
+        EXPECT_EQ(withPhoto(Bytes(drawing.begin(), drawing.end()))->thumbnailImageData, std::nullopt);
+    }
 }
 
 TEST_F(VCardReaderTest, MalformedCards_AreNamedByLineAndTheRestLoads) {
@@ -163,7 +173,7 @@ TEST_F(VCardReaderTest, AFoldedLineThatReadsLikeAnEnd_IsPartOfItsValue) {
 }
 
 TEST_F(VCardReaderTest, ACardBeyondTheCap_IsPassedOver) {
-    const auto result = read("BEGIN:VCARD\nFN:Big\nNOTE:" + std::string(VCardReader::kLargestCard, 'x') +
+    const auto result = read("BEGIN:VCARD\nFN:Big\nNOTE:" + std::string(VCardText::kLargestCard, 'x') +
                              "\nEND:VCARD\nBEGIN:VCARD\nFN:Small\nEND:VCARD\n");
     ASSERT_EQ(result.contacts.size(), 1u);
     EXPECT_EQ(result.contacts[0]->storedFullName, "Small");

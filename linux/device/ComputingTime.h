@@ -1,0 +1,15 @@
+#pragma once
+
+#include <chrono>
+#include <ctime>
+
+namespace ktr::linux_ {
+
+/// What this thread has computed so far: what a budget is counted in that a busy machine does not use up. Any thread.
+inline std::chrono::nanoseconds computingTime() {
+    timespec now{};
+    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &now);
+    return std::chrono::seconds(now.tv_sec) + std::chrono::nanoseconds(now.tv_nsec);
+}
+
+}  // namespace ktr::linux_
