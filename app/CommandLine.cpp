@@ -248,7 +248,7 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
     // The parser takes the arguments from the back.
     std::reverse(arguments.begin(), arguments.end());
     const auto misuse = [](const std::string& line) {
-        return Ending{host::ExitCode::Usage, "ktr: " + line + "\nSee ktr --help.\n"};
+        return Ending{host::ExitCode::Usage, "ktr: " + documents::forLine(line) + "\nSee ktr --help.\n"};
     };
     try {
         parser.app.parse(std::move(arguments));

@@ -3,8 +3,9 @@
 #include <QCoreApplication>
 #include <QEventLoop>
 #include <QTimer>
-#include <cstdio>
 #include <string>
+
+#include "app/Messages.h"
 
 namespace ktr::app {
 
@@ -12,11 +13,6 @@ namespace {
 
 constexpr int kTick = 200;  // milliseconds
 constexpr double kMillisecondsASecond = 1000.0;
-
-void tell(const std::string& line) {
-    std::fprintf(stderr, "ktr: %s\n", line.c_str());
-    std::fflush(stderr);
-}
 
 /// Writes what changed since the last time, a line a change.
 class Progress {

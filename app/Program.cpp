@@ -10,6 +10,7 @@
 #include "app/CommandLine.h"
 #include "app/Description.h"
 #include "app/LiveRun.h"
+#include "app/Messages.h"
 #include "app/RenderCommand.h"
 #include "app/ServeCommand.h"
 #include "app/window/ShowCommand.h"
@@ -25,7 +26,7 @@ namespace ktr::app {
 namespace {
 
 host::ExitCode fail(const host::Failure& failure) {
-    std::fprintf(stderr, "ktr: %s\n", failure.line.c_str());
+    tell(failure.line);
     return failure.code;
 }
 
@@ -36,21 +37,25 @@ documents::IsoTime sessionNow() {
 
 std::variant<std::vector<host::Scenario>, host::Failure> readScenarios(const Options& options, platform::Date now) {
     std::vector<host::Scenario> scenarios;
+    documents::DocumentWarnings warnings;
     for (const std::string& file : options.scenarios) {
         const auto clock =
             options.live ? host::ScenarioReader::Clock::Present : host::ScenarioReader::Clock::OfTheScenario;
-        auto read = host::ScenarioReader(now, clock).readFile(file);
+        auto read = host::ScenarioReader(now, clock).readFile(file, &warnings);
         if (const auto* error = std::get_if<documents::DocumentError>(&read)) {
             return host::Failure{host::ExitCode::BadScenario, error->text()};
         }
         scenarios.push_back(std::move(std::get<host::Scenario>(read)));
     }
+    tell(warnings);
     return scenarios;
 }
 
 /// What the file says, as far as it can be read: what is wrong with it is told once the account is read.
 linux_::Configuration configurationOf(const std::filesystem::path& file) {
-    auto read = linux_::ConfigurationReader::readFile(file);
+    documents::DocumentWarnings warnings;
+    auto read = linux_::ConfigurationReader::readFile(file, &warnings);
+    tell(warnings);
     auto* configuration = std::get_if<linux_::Configuration>(&read);
     return configuration == nullptr ? linux_::Configuration() : std::move(*configuration);
 }
@@ -115,7 +120,7 @@ bool hasDisplay() {
 /// that does not answer, Qt would end the process with a core dump: the line and the exit status say it better.
 void passOnQtMessage(QtMsgType type, const QMessageLogContext& /*context*/, const QString& text) {
     if (type == QtCriticalMsg || type == QtFatalMsg) {
-        std::fprintf(stderr, "ktr: %s\n", text.section(u'\n', 0, 0).toUtf8().constData());
+        tell(text.section(u'\n', 0, 0).toStdString());
     }
     if (type == QtFatalMsg) {
         std::_Exit(static_cast<int>(host::ExitCode::Failure));

@@ -42,6 +42,7 @@ std::optional<host::Failure> RenderCommand::write(const std::string& output) con
     // Whole points keep the pieces' edges on pixels at every usual scale.
     const double most = splits ? std::floor(kMostPixels / settings.scale) : height;
     const int pieces = splits ? static_cast<int>(std::ceil(height / most)) : 1;
+    documents::StagedFiles files;
     for (int number = 1; number <= pieces; ++number) {
         const double top = (number - 1) * most;
         const double partHeight = std::min(most, height - top);
@@ -50,11 +51,12 @@ std::optional<host::Failure> RenderCommand::write(const std::string& output) con
             return host::Failure{host::ExitCode::NotDrawn, output + ": " + *reason};
         }
         const std::string file = splits ? pieceName(output, number) : output;
-        if (const auto error = painter.write(file, part(host_.window(), top, partHeight))) {
+        if (const auto error = painter.add(file, part(host_.window(), top, partHeight), files)) {
             return host::Failure{host::ExitCode::Failure, *error};
         }
     }
-    return std::nullopt;
+    const std::string problem = files.commit();
+    return problem.empty() ? std::nullopt : std::optional(host::Failure{host::ExitCode::Failure, problem});
 }
 
 }  // namespace ktr::app

@@ -19,7 +19,8 @@ class RenderCommand {
     static std::string pieceName(const std::string& output, int number);
 
     explicit RenderCommand(host::Host& host) : host_(host) {}
-    /// Writes the picture; a PNG that would be too high in pieces, each as high as allowed but the last.
+    /// Writes the picture; a PNG that would be too high in pieces, each as high as allowed but the last:
+    /// all of them or none.
     std::optional<host::Failure> write(const std::string& output) const;
 
   private:

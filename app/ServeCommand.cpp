@@ -11,7 +11,9 @@
 #include <iostream>
 #include <variant>
 
+#include "app/Messages.h"
 #include "documents/AtomicFile.h"
+#include "documents/Words.h"
 #include "linux/configuration/XdgFolders.h"
 #include "platform/base/Json.h"
 #include "serve/DevelopmentServer.h"
@@ -28,7 +30,7 @@ namespace {
 namespace fs = std::filesystem;
 
 host::ExitCode complain(const std::string& line, host::ExitCode code = host::ExitCode::Failure) {
-    std::cerr << "ktr: " << line << std::endl;
+    tell(line);
     return code;
 }
 
@@ -109,7 +111,8 @@ int endingSignals() {
 std::variant<serve::DevelopmentServer::Setup, documents::DocumentError> readSetup(const serve::ServeOptions& options) {
     serve::DevelopmentServer::Setup setup;
     const std::string file = options.friends.empty() ? resource("friends.json").string() : options.friends;
-    auto friends = serve::FriendsReader::readFile(file);
+    documents::DocumentWarnings warnings;
+    auto friends = serve::FriendsReader::readFile(file, &warnings);
     if (const auto* error = std::get_if<documents::DocumentError>(&friends)) {
         return *error;
     }
@@ -118,7 +121,7 @@ std::variant<serve::DevelopmentServer::Setup, documents::DocumentError> readSetu
         setup.friends.intervalSeconds = options.intervalSeconds;
     }
     if (!options.faultScript.empty()) {
-        auto script = serve::FaultScript::readFile(options.faultScript);
+        auto script = serve::FaultScript::readFile(options.faultScript, &warnings);
         if (const auto* error = std::get_if<documents::DocumentError>(&script)) {
             return *error;
         }
@@ -127,6 +130,7 @@ std::variant<serve::DevelopmentServer::Setup, documents::DocumentError> readSetu
     for (const serve::Fault& fault : options.faults) {
         setup.faults.add(fault);
     }
+    tell(warnings);
     setup.port = options.port;
     setup.personId = options.personId;
     return setup;
@@ -156,7 +160,7 @@ host::ExitCode ServeCommand::run(const serve::ServeOptions& options) {
     const std::string contacts = contactsFor(options, folder, setup.friends, failure);
     setup.token = certificates.token();
     setup.certificate = *certificate;
-    setup.report = [](const std::string& line) { std::cout << line << std::endl; };
+    setup.report = [](const std::string& line) { std::cout << documents::forLine(line) << std::endl; };
     serve::DevelopmentServer server(std::move(setup));
     if (signals < 0 || !server.start()) {
         ::close(signals);

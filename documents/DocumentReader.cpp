@@ -1,15 +1,17 @@
 #include "documents/DocumentReader.h"
 
-#include <filesystem>
-#include <fstream>
-#include <iterator>
-
 #include "documents/JsonReader.h"
 
 namespace ktr::documents {
 
-std::optional<DocumentError> DocumentReader::readText(std::string_view text, const std::string& file,
-                                                      const Read& read) {
+std::string_view DocumentReader::withoutMark(std::string_view text) {
+    constexpr std::string_view kMark = "\xEF\xBB\xBF";
+    return text.starts_with(kMark) ? text.substr(kMark.size()) : text;
+}
+
+std::optional<DocumentError> DocumentReader::readText(std::string_view text, const std::string& file, const Read& read,
+                                                      DocumentWarnings* warnings) {
+    text = withoutMark(text);
     const auto document = JsonReader::read(text);
     if (const auto* error = std::get_if<JsonError>(&document)) {
         return DocumentError{file, error->position, error->path.text(), error->message};
@@ -21,24 +23,42 @@ std::optional<DocumentError> DocumentReader::readText(std::string_view text, con
     Complaints complaints;
     FieldReader fields(*root.dictionary(), {}, complaints);
     read(fields);
+    const auto placed = [&](const Complaint& complaint) {
+        return DocumentError{file, JsonReader::locate(text, complaint.path), complaint.path.text(), complaint.message};
+    };
     if (complaints) {
-        return DocumentError{file, JsonReader::locate(text, complaints->path), complaints->path.text(),
-                             complaints->message};
+        return placed(*complaints.first);
+    }
+    fields.warnOfOthers();
+    if (warnings != nullptr) {
+        for (const Complaint& unknown : complaints.unknown) {
+            warnings->push_back(placed(unknown));
+        }
+        if (complaints.moreUnknown > 0) {
+            warnings->push_back({file, std::nullopt, "",
+                                 "members that there are not, passed over: " + std::to_string(complaints.moreUnknown) +
+                                     " more"});
+        }
     }
     return std::nullopt;
 }
 
-std::variant<std::string, DocumentError> DocumentReader::textOf(const std::string& file) {
-    std::error_code failure;
-    const auto type = std::filesystem::status(file, failure).type();
-    if (type == std::filesystem::file_type::not_found) {
-        return DocumentError{file, std::nullopt, "", "there is no such file"};
+std::variant<std::string, DocumentError> DocumentReader::textOf(const std::filesystem::path& file,
+                                                                const FileReader::Terms& terms) {
+    auto read = FileReader::read(file, terms);
+    if (auto* error = std::get_if<FileReader::Error>(&read)) {
+        return DocumentError{file.string(), std::nullopt, "", std::move(error->reason), error->isMissing};
     }
-    std::ifstream stream(file, std::ios::binary);
-    if (!stream || type != std::filesystem::file_type::regular) {
-        return DocumentError{file, std::nullopt, "", "the file cannot be read"};
+    return std::get<std::string>(std::move(read));
+}
+
+std::optional<DocumentError> DocumentReader::readFile(const std::filesystem::path& file, const FileReader::Terms& terms,
+                                                      const Read& read, DocumentWarnings* warnings) {
+    const auto text = textOf(file, terms);
+    if (const auto* error = std::get_if<DocumentError>(&text)) {
+        return *error;
     }
-    return std::string(std::istreambuf_iterator<char>(stream), {});
+    return readText(std::get<std::string>(text), file.string(), read, warnings);
 }
 
 }  // namespace ktr::documents

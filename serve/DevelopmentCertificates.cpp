@@ -9,11 +9,11 @@
 #include <sys/stat.h>
 #include <array>
 #include <cstdint>
-#include <fstream>
-#include <iterator>
 
 #include "documents/AtomicFile.h"
 #include "documents/FileLock.h"
+#include "documents/FileReader.h"
+#include "documents/FileTrust.h"
 #include "linux/configuration/TokenFile.h"
 
 namespace ktr::serve {
@@ -26,6 +26,7 @@ using Key = DevelopmentCertificates::Key;
 using Memory = std::unique_ptr<BIO, decltype(&BIO_free)>;
 
 constexpr long kDay = 86400;
+constexpr std::size_t kLargestFile = std::size_t{64} * 1024;
 
 struct Outline {
     const char* name;
@@ -98,15 +99,21 @@ std::string textOf(BIO* memory) {
     return size > 0 ? std::string(data, static_cast<std::size_t>(size)) : std::string();
 }
 
-std::string readFile(const std::filesystem::path& file) {
-    std::ifstream stream(file, std::ios::binary);
-    return std::string(std::istreambuf_iterator<char>(stream), {});
+/// Empty for what is not there; what others may change, or what cannot be read, is a problem.
+std::string readFile(const std::filesystem::path& file, std::string& problem) {
+    const auto refusal = [&](const struct stat& facts) { return documents::FileTrust::problemOf(file, facts); };
+    auto read = documents::FileReader::read(file, {kLargestFile, refusal});
+    if (const auto* error = std::get_if<documents::FileReader::Error>(&read)) {
+        problem = error->isMissing ? problem : file.string() + ": " + error->reason;
+        return "";
+    }
+    return std::get<std::string>(std::move(read));
 }
 
 /// The authority that lies in the folder, when it is whole and good for two more days.
-std::optional<Pair> readAuthority(const std::filesystem::path& folder) {
-    const std::string certificateText = readFile(folder / "ca.pem");
-    const std::string keyText = readFile(folder / "ca-key.pem");
+std::optional<Pair> readAuthority(const std::filesystem::path& folder, std::string& problem) {
+    const std::string certificateText = readFile(folder / "ca.pem", problem);
+    const std::string keyText = readFile(folder / "ca-key.pem", problem);
     const Memory certificateMemory(BIO_new_mem_buf(certificateText.data(), static_cast<int>(certificateText.size())),
                                    BIO_free);
     const Memory keyMemory(BIO_new_mem_buf(keyText.data(), static_cast<int>(keyText.size())), BIO_free);
@@ -157,14 +164,23 @@ std::variant<DevelopmentCertificates, std::string> DevelopmentCertificates::prep
     if (auto failure = documents::AtomicFile::makeFolder(folder); !failure.empty()) {
         return failure;
     }
+    // Whoever can change what lies here decides whom the configurations that name it trust.
+    if (const auto problem = documents::FileTrust::problemOfFolder(folder); !problem.empty()) {
+        return folder.string() + ": the folder is refused: " + problem;
+    }
     // Two services that start together agree on one authority.
     const documents::FileLock lock(folder / "lock");
     if (!lock.isHeld()) {
-        return folder.string() + ": cannot be locked";
+        return folder.string() + ": cannot be locked: " + lock.problem();
     }
     DevelopmentCertificates certificates;
     certificates.folder_ = std::filesystem::absolute(folder).lexically_normal();
-    if (auto authority = readAuthority(folder)) {
+    std::string problem;
+    auto authority = readAuthority(folder, problem);
+    if (!problem.empty()) {
+        return problem;
+    }
+    if (authority) {
         certificates.authority_ = *authority;
     } else {
         authority = makeAuthority();

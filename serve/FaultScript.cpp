@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "documents/DocumentReader.h"
+#include "documents/NearestName.h"
 #include "documents/Words.h"
 
 namespace ktr::serve {
@@ -38,65 +39,32 @@ Word readWord(documents::FieldReader& fields, const std::string& name,
     return otherwise;
 }
 
-std::optional<int> readWhole(documents::FieldReader& fields, const std::string& name, int least, int most) {
-    const auto number = fields.number(name);
-    if (!number) {
-        return std::nullopt;
-    }
-    if (!(*number >= least && *number <= most) || std::floor(*number) != *number) {
-        fields.complain(name, "expected a whole number from " + std::to_string(least) + " to " + std::to_string(most));
-        return std::nullopt;
-    }
-    return static_cast<int>(*number);
-}
-
-double readAmount(documents::FieldReader& fields, const std::string& name, double otherwise) {
-    const double number = fields.number(name).value_or(otherwise);
-    if (!(number >= 0.0 && number <= 1.0e9)) {
-        fields.complain(name, "expected a number from 0 to 1000000000");
-        return otherwise;
-    }
-    return number;
-}
+constexpr double kMostAmount = 1.0e9;
 
 Fault readFault(documents::FieldReader& fields) {
     constexpr int kMost = 1000000000;
     Fault fault;
-    fault.at = readWhole(fields, "at", 1, kMost).value_or(1);
-    fault.count = readWhole(fields, "count", 0, kMost).value_or(0);
-    fault.delaySeconds = readAmount(fields, "delay", 0.0);
+    fault.at = fields.whole("at", 1, kMost).value_or(1);
+    fault.count = fields.whole("count", 0, kMost).value_or(0);
+    fault.delaySeconds = fields.number("delay", 0.0, kMostAmount).value_or(0.0);
     fault.cut = readWord(fields, "cut", kCuts, Fault::Cut::None);
-    fault.status = readWhole(fields, "status", 200, 599).value_or(0);
+    fault.status = fields.whole("status", 200, 599).value_or(0);
     fault.redirect = fields.string("redirect").value_or("");
-    fault.redirectStatus = readWhole(fields, "redirectStatus", 300, 399).value_or(307);
+    fault.redirectStatus = fields.whole("redirectStatus", 300, 399).value_or(307);
     fault.body = readWord(fields, "body", kBodies, Fault::Body::Ordinary);
     if (const auto text = fields.string("text")) {
         fault.body = Fault::Body::Text;
         fault.text = *text;
     }
-    fault.bytesPerSecond = readAmount(fields, "bytesPerSecond", 0.0);
-    fault.statusCode = readWhole(fields, "statusCode", -kMost, kMost);
-    fault.entryStatus = readWhole(fields, "entryStatus", -kMost, kMost);
+    fault.bytesPerSecond = fields.number("bytesPerSecond", 0.0, kMostAmount).value_or(0.0);
+    fault.statusCode = fields.whole("statusCode", -kMost, kMost);
+    fault.entryStatus = fields.whole("entryStatus", -kMost, kMost);
     fault.entry = fields.string("entry").value_or("");
-    if (fields.member("interval") != nullptr) {
-        fault.intervalSeconds = fields.number("interval");
-        // In milliseconds it has to be a number still.
-        if (fault.intervalSeconds && !(std::abs(*fault.intervalSeconds) <= kMost)) {
-            fields.complain("interval", "expected a number from -1000000000 to 1000000000");
-        }
-    }
-    constexpr const char* kKnown[] = {"at",         "count",          "delay", "cut",     "status",
-                                      "redirect",   "redirectStatus", "body",  "text",    "bytesPerSecond",
-                                      "statusCode", "entryStatus",    "entry", "interval"};
-    for (const auto& [name, value] : fields.dictionary()) {
-        bool known = false;
-        for (const char* word : kKnown) {
-            known = known || name == word;
-        }
-        // A misspelt fault would test nothing.
-        if (!known) {
-            fields.complain(name, "there is no such fault");
-        }
+    // In milliseconds it has to be a number still.
+    fault.intervalSeconds = fields.number("interval", -kMostAmount, kMostAmount);
+    // A misspelt fault would test nothing.
+    for (const std::string& name : fields.unasked()) {
+        fields.complain(name, "there is no such fault" + documents::didYouMean(name, fields.asked()));
     }
     return fault;
 }
@@ -112,25 +80,27 @@ Value valueOf(const std::string& text) {
 }  // namespace
 
 std::variant<FaultScript, documents::DocumentError> FaultScript::readText(std::string_view text,
-                                                                          const std::string& file) {
+                                                                          const std::string& file,
+                                                                          documents::DocumentWarnings* warnings) {
     FaultScript script;
     const auto read = [&](documents::FieldReader& fields) {
         if (!fields.objects("faults", [&](documents::FieldReader& fault) { script.add(readFault(fault)); })) {
             fields.complain("", "expected a member \"faults\"");
         }
     };
-    if (auto error = documents::DocumentReader::readText(text, file, read)) {
+    if (auto error = documents::DocumentReader::readText(text, file, read, warnings)) {
         return *error;
     }
     return script;
 }
 
-std::variant<FaultScript, documents::DocumentError> FaultScript::readFile(const std::string& file) {
-    const auto text = documents::DocumentReader::textOf(file);
+std::variant<FaultScript, documents::DocumentError> FaultScript::readFile(const std::string& file,
+                                                                          documents::DocumentWarnings* warnings) {
+    const auto text = documents::DocumentReader::textOf(file, {documents::kLargestJson, {}});
     if (const auto* error = std::get_if<documents::DocumentError>(&text)) {
         return *error;
     }
-    return readText(std::get<std::string>(text), file);
+    return readText(std::get<std::string>(text), file, warnings);
 }
 
 std::optional<Fault> FaultScript::readWords(const std::string& words, std::string& complaint) {

@@ -11,29 +11,19 @@ namespace {
 constexpr double kNoLimit = std::numeric_limits<double>::infinity();
 constexpr double kLongestTime = 1.0e6;
 
-double readNumber(documents::FieldReader& fields, const std::string& name, double least, double most,
-                  std::optional<double> otherwise) {
-    const auto number = fields.number(name);
-    if (!number) {
-        if (!otherwise) {
-            fields.complain(name, "expected a number, found nothing");
-        }
-        return otherwise.value_or(0.0);
+double needed(documents::FieldReader& fields, const std::string& name, double most) {
+    if (fields.member(name) == nullptr) {
+        fields.complain(name, "expected a number, found nothing");
     }
-    if (!(*number >= least && *number <= most)) {
-        fields.complain(name, most == kNoLimit ? "expected a number of 0 or more"
-                                               : "expected a number from " + std::to_string(static_cast<int>(least)) +
-                                                     " to " + std::to_string(static_cast<int>(most)));
-    }
-    return *number;
+    return fields.number(name, -most, most).value_or(0.0);
 }
 
 /// The position and the address, which a waypoint and a scenario's location name alike.
 Waypoint readPlace(documents::FieldReader& fields) {
     Waypoint waypoint;
-    waypoint.latitude = readNumber(fields, "latitude", -90.0, 90.0, std::nullopt);
-    waypoint.longitude = readNumber(fields, "longitude", -180.0, 180.0, std::nullopt);
-    waypoint.accuracy = readNumber(fields, "accuracy", 0.0, kNoLimit, waypoint.accuracy);
+    waypoint.latitude = needed(fields, "latitude", 90.0);
+    waypoint.longitude = needed(fields, "longitude", 180.0);
+    waypoint.accuracy = fields.number("accuracy", 0.0, kNoLimit).value_or(waypoint.accuracy);
     waypoint.street = fields.string("street");
     waypoint.city = fields.string("city");
     waypoint.stateCode = fields.string("stateCode");
@@ -63,10 +53,10 @@ ServedFriend readFriend(documents::FieldReader& fields) {
     ServedFriend person = readPerson(fields);
     person.repeats = fields.boolean("repeats").value_or(true);
     person.hidden = fields.boolean("hidden").value_or(false);
-    person.locatedAfter = readNumber(fields, "locatedAfter", 0.0, kLongestTime, 0.0);
+    person.locatedAfter = fields.number("locatedAfter", 0.0, kLongestTime).value_or(0.0);
     fields.objects("track", [&](documents::FieldReader& point) {
         Waypoint waypoint = readPlace(point);
-        waypoint.at = readNumber(point, "at", 0.0, kLongestTime, 0.0);
+        waypoint.at = point.number("at", 0.0, kLongestTime).value_or(0.0);
         if (!person.track.empty() && waypoint.at <= person.track.back().at) {
             point.complain("at", "expected the waypoints in the order of their time");
         }
@@ -78,15 +68,21 @@ ServedFriend readFriend(documents::FieldReader& fields) {
 /// One location of a scenario's snippet.
 ServedFriend readLocation(documents::FieldReader& fields) {
     ServedFriend person;
+    // A scenario tells more than a service needs; its own reader knows what is none.
+    fields.leaveOthers();
     fields.object("friend", [&](documents::FieldReader& attribute) {
+        attribute.leaveOthers();
         attribute.object("object", [&](documents::FieldReader& object) {
+            object.leaveOthers();
             readNames(object, person);
             object.objects("emails", [&](documents::FieldReader& email) {
+                email.leaveOthers();
                 if (auto address = email.string("emailAddress")) {
                     person.emails.push_back(*address);
                 }
             });
             object.objects("phones", [&](documents::FieldReader& phone) {
+                phone.leaveOthers();
                 if (auto number = phone.string("number")) {
                     person.phones.push_back(*number);
                 }
@@ -103,8 +99,8 @@ ServedFriend readLocation(documents::FieldReader& fields) {
 }
 
 void readAll(documents::FieldReader& fields, FriendsFile& file) {
-    file.intervalSeconds = readNumber(fields, "intervalSeconds", 0.0, kLongestTime, file.intervalSeconds);
-    file.timeoutSeconds = readNumber(fields, "timeoutSeconds", 0.0, kLongestTime, file.timeoutSeconds);
+    file.intervalSeconds = fields.number("intervalSeconds", 0.0, kLongestTime).value_or(file.intervalSeconds);
+    file.timeoutSeconds = fields.number("timeoutSeconds", 0.0, kLongestTime).value_or(file.timeoutSeconds);
     fields.object("user", [&](documents::FieldReader& user) { file.user = readPerson(user); });
     // What a scenario says of the account.
     fields.object("account", [&](documents::FieldReader& account) {
@@ -116,11 +112,15 @@ void readAll(documents::FieldReader& fields, FriendsFile& file) {
     const bool friends =
         fields.objects("friends", [&](documents::FieldReader& person) { file.friends.push_back(readFriend(person)); });
     const bool snippet = fields.object("snippet", [&](documents::FieldReader& object) {
+        object.leaveOthers();
         if (!friends) {
             object.objects("locations",
                            [&](documents::FieldReader& place) { file.friends.push_back(readLocation(place)); });
         }
     });
+    if (snippet) {
+        fields.leaveOthers();
+    }
     if (!friends && !snippet) {
         fields.complain("", "expected a member \"friends\", or a scenario's \"snippet\"");
     }
@@ -129,21 +129,23 @@ void readAll(documents::FieldReader& fields, FriendsFile& file) {
 }  // namespace
 
 std::variant<FriendsFile, documents::DocumentError> FriendsReader::readText(std::string_view text,
-                                                                            const std::string& file) {
+                                                                            const std::string& file,
+                                                                            documents::DocumentWarnings* warnings) {
     FriendsFile friends;
     if (auto error = documents::DocumentReader::readText(
-            text, file, [&](documents::FieldReader& fields) { readAll(fields, friends); })) {
+            text, file, [&](documents::FieldReader& fields) { readAll(fields, friends); }, warnings)) {
         return *error;
     }
     return friends;
 }
 
-std::variant<FriendsFile, documents::DocumentError> FriendsReader::readFile(const std::string& file) {
-    const auto text = documents::DocumentReader::textOf(file);
+std::variant<FriendsFile, documents::DocumentError> FriendsReader::readFile(const std::string& file,
+                                                                            documents::DocumentWarnings* warnings) {
+    const auto text = documents::DocumentReader::textOf(file, {documents::kLargestJson, {}});
     if (const auto* error = std::get_if<documents::DocumentError>(&text)) {
         return *error;
     }
-    return readText(std::get<std::string>(text), file);
+    return readText(std::get<std::string>(text), file, warnings);
 }
 
 }  // namespace ktr::serve

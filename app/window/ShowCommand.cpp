@@ -6,6 +6,7 @@
 #include <cstdio>
 
 #include "app/window/ConversationWindow.h"
+#include "documents/Words.h"
 
 namespace ktr::app {
 
@@ -15,7 +16,8 @@ constexpr int kTallWindow = 820;
 constexpr int kWideWindow = 760;
 
 bool printUrl(const platform::Url& url) {
-    return std::printf("%s\n", url.text().c_str()) >= 0 && std::fflush(stdout) == 0;
+    return std::printf("%s\n", documents::forLine(url.text(), std::string::npos).c_str()) >= 0 &&
+           std::fflush(stdout) == 0;
 }
 
 bool openOnDesktop(const platform::Url& url) {

@@ -54,6 +54,7 @@ std::shared_ptr<AssistantObject> AssistantObjectReader::readSnippet(documents::F
     if (kind == "VAKtrVisibilityView") {
         return readVisibilityView(fields);
     }
+    fields.leaveOthers();
     return std::make_shared<UnknownAssistantObject>(kind);
 }
 

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "documents/IsoTime.h"
+#include "linux/positions/ScenarioPositions.h"
 #include "platform/assistant/AssistantObject.h"
 #include "platform/location/PlatformLocation.h"
 #include "platform/ui/Device.h"
@@ -29,12 +30,7 @@ class LocalizedText {
     std::vector<std::pair<std::string, std::string>> texts_;
 };
 
-/// Where the user is from a moment on.
-struct ScenarioPosition {
-    double at = 0.0;  ///< seconds after the scenario's start
-    platform::Coordinate coordinate;
-    double accuracy = 10.0;  ///< metres
-};
+using linux_::ScenarioPosition;
 
 /// An assistant object of a kind that this host does not know: handed on, so that the plugin has the last word.
 class UnknownAssistantObject : public platform::AssistantObject {

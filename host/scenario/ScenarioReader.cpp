@@ -2,10 +2,8 @@
 
 #include <algorithm>
 #include <filesystem>
-#include <fstream>
-#include <limits>
 
-#include "documents/FieldReader.h"
+#include "documents/DocumentReader.h"
 #include "documents/Words.h"
 #include "host/scenario/AssistantObjectReader.h"
 #include "linux/device/LinuxDevice.h"
@@ -79,41 +77,6 @@ std::optional<std::string> countryCode(std::string text) {
     return text;
 }
 
-double readNeeded(documents::FieldReader& fields, const std::string& name, double least, double most,
-                  std::optional<double> otherwise) {
-    const auto number = fields.number(name);
-    if (!number) {
-        if (!otherwise && fields.member(name) == nullptr) {
-            fields.complain("", "expected a member \"" + name + "\"");
-        }
-        return otherwise.value_or(0.0);
-    }
-    if (!(*number >= least && *number <= most)) {
-        fields.complain(name, most == std::numeric_limits<double>::infinity()
-                                  ? "expected a number of 0 or more"
-                                  : "expected a number from " + std::to_string(static_cast<int>(least)) + " to " +
-                                        std::to_string(static_cast<int>(most)));
-    }
-    return *number;
-}
-
-std::vector<ScenarioPosition> readPositions(documents::FieldReader& fields) {
-    constexpr double kNoLimit = std::numeric_limits<double>::infinity();
-    std::vector<ScenarioPosition> positions;
-    fields.objects("positions", [&](documents::FieldReader& entry) {
-        ScenarioPosition position;
-        position.at = readNeeded(entry, "at", 0.0, kNoLimit, 0.0);
-        position.coordinate.latitude = readNeeded(entry, "latitude", -90.0, 90.0, std::nullopt);
-        position.coordinate.longitude = readNeeded(entry, "longitude", -180.0, 180.0, std::nullopt);
-        position.accuracy = readNeeded(entry, "accuracy", 0.0, kNoLimit, position.accuracy);
-        if (!positions.empty() && position.at < positions.back().at) {
-            entry.complain("at", "expected the positions in the order of their time");
-        }
-        positions.push_back(position);
-    });
-    return positions;
-}
-
 std::vector<std::string> resolved(std::vector<std::string> paths, const std::string& file) {
     const fs::path folder = fs::path(file).parent_path();
     std::transform(paths.begin(), paths.end(), paths.begin(),
@@ -135,7 +98,7 @@ void readScenario(documents::FieldReader& fields, platform::Date now, bool withC
                                  linux_::LinuxDevice::categoryNamed);
     scenario.idiom =
         readWord(fields, "idiom", "one of phone, tablet, desktop, display", linux_::LinuxDevice::idiomNamed);
-    scenario.positions = readPositions(fields);
+    scenario.positions = linux_::readScenarioPositions(fields);
     scenario.dark = fields.boolean("dark");
     fields.object("account", [&](documents::FieldReader& account) { scenario.userName = account.string("userName"); });
     const AssistantObjectReader objects(scenario.clock ? scenario.clock->date : now);
@@ -149,60 +112,26 @@ void readScenario(documents::FieldReader& fields, platform::Date now, bool withC
 
 }  // namespace
 
-std::variant<Scenario, documents::DocumentError> ScenarioReader::readText(std::string_view text,
-                                                                          const std::string& file) const {
-    // Some editors begin UTF-8 with a byte-order mark; RFC 8259 lets readers ignore it.
-    if (text.starts_with("\xEF\xBB\xBF")) {
-        text.remove_prefix(3);
-    }
-    auto read = documents::JsonReader::read(text);
-    if (const auto* error = std::get_if<documents::JsonError>(&read)) {
-        return documents::DocumentError{file, error->position, error->path.text(), error->message};
-    }
-    const Value& root = std::get<Value>(read);
-    if (root.dictionary() == nullptr) {
-        return documents::DocumentError{file, documents::JsonReader::locate(text, {}), "$",
-                                        "expected an object, found " + documents::nameOfKind(root)};
-    }
-    documents::Complaints complaints;
-    documents::FieldReader fields(*root.dictionary(), {}, complaints);
+std::variant<Scenario, documents::DocumentError> ScenarioReader::readText(
+    std::string_view text, const std::string& file, documents::DocumentWarnings* warnings) const {
     Scenario scenario;
     scenario.file = file;
-    readScenario(fields, now_, clock_ == Clock::OfTheScenario, scenario);
-    if (complaints) {
-        return documents::DocumentError{file, documents::JsonReader::locate(text, complaints->path),
-                                        complaints->path.text(), complaints->message};
+    const auto read = [&](documents::FieldReader& fields) {
+        readScenario(fields, now_, clock_ == Clock::OfTheScenario, scenario);
+    };
+    if (auto error = documents::DocumentReader::readText(text, file, read, warnings)) {
+        return *std::move(error);
     }
     return scenario;
 }
 
-std::variant<Scenario, documents::DocumentError> ScenarioReader::readFile(const std::string& file) const {
-    std::error_code failure;
-    const fs::file_status status = fs::status(file, failure);
-    if (status.type() == fs::file_type::not_found) {
-        return documents::DocumentError{file, std::nullopt, "", "there is no such file"};
+std::variant<Scenario, documents::DocumentError> ScenarioReader::readFile(const std::string& file,
+                                                                          documents::DocumentWarnings* warnings) const {
+    const auto text = documents::DocumentReader::textOf(file, {documents::kLargestJson, {}});
+    if (const auto* error = std::get_if<documents::DocumentError>(&text)) {
+        return *error;
     }
-    if (fs::is_directory(status)) {
-        return documents::DocumentError{file, std::nullopt, "", "this is a folder, not a scenario file"};
-    }
-    std::ifstream stream(file, std::ios::binary);
-    if (!stream) {
-        return documents::DocumentError{file, std::nullopt, "", "the file cannot be opened"};
-    }
-    // One byte more than allowed tells too large from just fitting, also for a pipe whose size nobody knows.
-    std::string text;
-    std::string block(1u << 16, '\0');
-    while (text.size() <= documents::kLargestJson &&
-           (stream.read(block.data(), static_cast<std::streamsize>(block.size())) || stream.gcount() > 0)) {
-        text.append(block.data(), static_cast<std::size_t>(stream.gcount()));
-    }
-    if (stream.bad()) {
-        return documents::DocumentError{file, std::nullopt, "", "the file cannot be read"};
-    }
-    if (text.size() > documents::kLargestJson) {
-        return documents::DocumentError{file, std::nullopt, "", "the file is larger than 64 MiB"};
-    }
-    return readText(text, file);
+    return readText(std::get<std::string>(text), file, warnings);
 }
 
 }  // namespace ktr::host

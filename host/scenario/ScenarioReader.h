@@ -19,9 +19,12 @@ class ScenarioReader {
     /// `now` stands for the scenario's own clock where the file has none; ages in seconds count back from it.
     explicit ScenarioReader(platform::Date now, Clock clock = Clock::OfTheScenario) : now_(now), clock_(clock) {}
 
-    std::variant<Scenario, documents::DocumentError> readFile(const std::string& file) const;
+    /// Unknown members go to `warnings`, if there are any to go to.
+    std::variant<Scenario, documents::DocumentError> readFile(const std::string& file,
+                                                              documents::DocumentWarnings* warnings = nullptr) const;
     /// `file` names the text in messages, and its folder is what relative paths start from.
-    std::variant<Scenario, documents::DocumentError> readText(std::string_view text, const std::string& file) const;
+    std::variant<Scenario, documents::DocumentError> readText(std::string_view text, const std::string& file,
+                                                              documents::DocumentWarnings* warnings = nullptr) const;
 
   private:
     platform::Date now_;

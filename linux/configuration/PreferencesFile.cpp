@@ -1,15 +1,11 @@
 #include "linux/configuration/PreferencesFile.h"
 
-#include <QByteArray>
-#include <QJsonDocument>
-#include <QJsonObject>
-#include <QString>
 #include <cerrno>
 #include <cstring>
-#include <fstream>
-#include <iterator>
+#include <utility>
 
 #include "documents/AtomicFile.h"
+#include "documents/DocumentReader.h"
 #include "documents/FileLock.h"
 #include "platform/base/Json.h"
 #include "platform/base/Value.h"
@@ -21,22 +17,22 @@ namespace {
 namespace fs = std::filesystem;
 using Texts = PreferencesFile::Texts;
 
-/// None for what is no object of texts.
-std::optional<Texts> parse(const std::string& text) {
-    QJsonParseError error;
-    const QJsonDocument document = QJsonDocument::fromJson(QByteArray::fromStdString(text), &error);
-    if (!document.isObject()) {
-        return std::nullopt;
-    }
+/// A few texts a domain; more is nothing that this program wrote.
+constexpr std::size_t kLargestFile = std::size_t{1} << 20;
+
+std::variant<Texts, documents::DocumentError> parse(const std::string& text, const fs::path& file) {
     Texts texts;
-    const QJsonObject object = document.object();
-    for (auto member = object.begin(); member != object.end(); ++member) {
-        if (!member.value().isString()) {
-            return std::nullopt;
+    const auto error = documents::DocumentReader::readText(text, file.string(), [&](documents::FieldReader& members) {
+        members.leaveOthers();
+        for (const auto& [key, value] : members.dictionary()) {
+            if (auto string = members.string(key)) {
+                texts[key] = *std::move(string);
+            } else if (value.isNull()) {
+                members.complain(key, "expected a string, found null");
+            }
         }
-        texts[member.key().toStdString()] = member.value().toString().toStdString();
-    }
-    return texts;
+    });
+    return error ? std::variant<Texts, documents::DocumentError>(*error) : std::move(texts);
 }
 
 std::string written(const Texts& texts) {
@@ -47,44 +43,22 @@ std::string written(const Texts& texts) {
     return platform::writeJson(object) + "\n";
 }
 
-/// The file's bytes, empty for no file; or why it cannot be read.
-std::variant<std::string, PreferencesFile::Error> bytesOf(const fs::path& file, bool& exists) {
-    std::error_code failure;
-    const fs::file_type type = fs::status(file, failure).type();
-    exists = type != fs::file_type::not_found;
-    if (!exists) {
-        return std::string();
-    }
-    // Not even opened: a FIFO in the file's place would hold the program up.
-    if (type != fs::file_type::regular) {
-        const std::string reason = failure ? failure.message() : "it is no regular file";
-        return PreferencesFile::Error{file.string() + ": cannot be read: " + reason};
-    }
-    errno = 0;
-    std::ifstream stream(file, std::ios::binary);
-    std::string bytes{std::istreambuf_iterator<char>(stream), {}};
-    if (!stream.is_open() || stream.bad()) {
-        return PreferencesFile::Error{file.string() + ": cannot be read: " + std::strerror(errno != 0 ? errno : EIO)};
-    }
-    return bytes;
+std::variant<std::string, documents::DocumentError> bytesOf(const fs::path& file) {
+    return documents::DocumentReader::textOf(file, {kLargestFile, {}});
 }
 
 }  // namespace
 
 std::variant<Texts, PreferencesFile::Error> PreferencesFile::read(const fs::path& file) {
-    bool exists = false;
-    const auto bytes = bytesOf(file, exists);
-    if (const auto* error = std::get_if<Error>(&bytes)) {
-        return *error;
+    const auto bytes = bytesOf(file);
+    if (const auto* error = std::get_if<documents::DocumentError>(&bytes)) {
+        return error->isMissing ? std::variant<Texts, Error>(Texts()) : Error{error->text()};
     }
-    if (!exists) {
-        return Texts();
+    auto texts = parse(std::get<std::string>(bytes), file);
+    if (const auto* error = std::get_if<documents::DocumentError>(&texts)) {
+        return Error{error->text()};
     }
-    auto texts = parse(std::get<std::string>(bytes));
-    if (!texts) {
-        return Error{file.string() + ": expected a JSON object of texts"};
-    }
-    return *texts;
+    return std::get<Texts>(std::move(texts));
 }
 
 std::variant<Texts, PreferencesFile::Error> PreferencesFile::merge(const fs::path& file, const Changes& changes) {
@@ -95,25 +69,27 @@ std::variant<Texts, PreferencesFile::Error> PreferencesFile::merge(const fs::pat
     lockFile += ".lock";
     const documents::FileLock lock(lockFile);
     if (!lock.isHeld()) {
-        return Error{file.string() + ": cannot be locked: " + std::strerror(errno)};
+        return Error{file.string() + ": cannot be locked: " + lock.problem()};
     }
-    bool exists = false;
-    const auto bytes = bytesOf(file, exists);
-    if (const auto* error = std::get_if<Error>(&bytes)) {
-        return *error;
-    }
-    auto stored = exists ? parse(std::get<std::string>(bytes)) : Texts();
-    if (!stored) {
-        fs::path broken = file;
-        broken += ".broken";
-        std::error_code failure;
-        fs::rename(file, broken, failure);
-        if (failure) {
-            return Error{file.string() + ": expected a JSON object of texts"};
+    const auto bytes = bytesOf(file);
+    Texts stored;
+    if (const auto* text = std::get_if<std::string>(&bytes)) {
+        auto parsed = parse(*text, file);
+        if (auto* texts = std::get_if<Texts>(&parsed)) {
+            stored = std::move(*texts);
+        } else {
+            fs::path broken = file;
+            broken += ".broken";
+            std::error_code failure;
+            fs::rename(file, broken, failure);
+            if (failure) {
+                return Error{std::get<documents::DocumentError>(parsed).text()};
+            }
         }
-        stored = Texts();
+    } else if (const auto& error = std::get<documents::DocumentError>(bytes); !error.isMissing) {
+        return Error{error.text()};
     }
-    Texts texts = *stored;
+    Texts texts = stored;
     for (const auto& [key, value] : changes) {
         if (value) {
             texts[key] = *value;
@@ -121,7 +97,7 @@ std::variant<Texts, PreferencesFile::Error> PreferencesFile::merge(const fs::pat
             texts.erase(key);
         }
     }
-    if (texts != *stored) {
+    if (texts != stored) {
         if (auto failure = documents::AtomicFile::write(file, written(texts)); !failure.empty()) {
             return Error{failure};
         }

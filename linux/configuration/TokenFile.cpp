@@ -1,15 +1,14 @@
 #include "linux/configuration/TokenFile.h"
 
-#include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
 #include <algorithm>
 #include <array>
-#include <cerrno>
 #include <cstdio>
-#include <cstring>
 #include <utility>
+
+#include "documents/FileReader.h"
 
 namespace ktr::linux_ {
 
@@ -18,55 +17,26 @@ namespace {
 constexpr std::size_t kLongestToken = std::size_t{16} * 1024;
 
 std::string refusal(const struct stat& facts) {
-    if (!S_ISREG(facts.st_mode)) {
-        return "is no regular file";
-    }
     if (facts.st_uid != ::geteuid()) {
-        return "belongs to another user";
+        return "it belongs to another user";
     }
     if ((facts.st_mode & 077U) != 0) {
         std::array<char, 8> mode{};
         std::snprintf(mode.data(), mode.size(), "%04o", static_cast<unsigned>(facts.st_mode & 07777U));
-        return std::string("has mode ") + mode.data() +
+        return std::string("it has mode ") + mode.data() +
                ", so that others can reach it; make it private with: chmod 600";
     }
     return "";
 }
 
-/// False on a read error.
-bool readAll(int descriptor, std::string& token) {
-    std::array<char, 4096> block{};
-    while (token.size() <= kLongestToken) {
-        const ssize_t count = ::read(descriptor, block.data(), block.size());
-        if (count < 0 && errno == EINTR) {
-            continue;
-        }
-        if (count <= 0) {
-            return count == 0;
-        }
-        token.append(block.data(), static_cast<std::size_t>(count));
-    }
-    return true;
-}
-
 }  // namespace
 
 std::variant<std::string, TokenFile::Error> TokenFile::read(const std::filesystem::path& file) {
-    // Not blocking: a FIFO in the file's place must not hold the program up.
-    const int descriptor = ::open(file.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK);
-    if (descriptor < 0) {
-        return Error{errno == ENOENT, file.string() + ": cannot be read: " + std::strerror(errno)};
+    auto read = documents::FileReader::read(file, {kLongestToken + 1, refusal});
+    if (const auto* error = std::get_if<documents::FileReader::Error>(&read)) {
+        return Error{error->isMissing, file.string() + ": the app token cannot be taken from here: " + error->reason};
     }
-    struct stat facts {};
-    std::string token;
-    std::string problem = ::fstat(descriptor, &facts) == 0 ? refusal(facts) : std::strerror(errno);
-    if (problem.empty() && !readAll(descriptor, token)) {
-        problem = std::strerror(errno);
-    }
-    ::close(descriptor);
-    if (!problem.empty()) {
-        return Error{false, file.string() + ": the token file is refused: it " + problem};
-    }
+    auto& token = std::get<std::string>(read);
     if (auto line = tokenIn(std::move(token))) {
         return *std::move(line);
     }

@@ -9,6 +9,7 @@
 #include <array>
 #include <cstdio>
 
+#include "documents/Words.h"
 #include "linux/paint/FontChoice.h"
 
 namespace ktr::linux_ {
@@ -39,7 +40,7 @@ void passOn(QtMsgType type, const QMessageLogContext& context, const QString& te
     if (previousHandler != nullptr) {
         previousHandler(type, context, text);
     } else {
-        std::fprintf(stderr, "%s\n", qFormatLogMessage(type, context, text).toLocal8Bit().constData());
+        std::fprintf(stderr, "%s\n", documents::forLine(qFormatLogMessage(type, context, text).toStdString()).c_str());
     }
 }
 

@@ -6,7 +6,6 @@
 #include <QPageSize>
 #include <QPainter>
 #include <QPdfWriter>
-#include <QSaveFile>
 #include <QSvgGenerator>
 #include <cmath>
 
@@ -22,10 +21,6 @@ int pixels(double points, double scale) {
 
 std::string numbered(int width, int height) {
     return std::to_string(width) + " x " + std::to_string(height) + " pixels";
-}
-
-std::string failure(const std::string& path, const QString& reason) {
-    return path + ": cannot be written: " + reason.toStdString();
 }
 
 class FixedHashes {
@@ -97,19 +92,22 @@ QImage ScenePainter::image(const Paint& paint) const {
     return image;
 }
 
-bool ScenePainter::writeSvg(QIODevice& file, const Paint& paint) const {
+QByteArray ScenePainter::svg(const Paint& paint) const {
+    QByteArray data;
+    QBuffer buffer(&data);
+    buffer.open(QIODevice::WriteOnly);
     QSvgGenerator generator;
-    generator.setOutputDevice(&file);
+    generator.setOutputDevice(&buffer);
     const QSize whole(pixels(size_.width, 1.0), pixels(size_.height, 1.0));
     generator.setSize(whole);
     generator.setViewBox(QRect(QPoint(0, 0), whole));
     generator.setResolution(96);
     generator.setTitle(title_);
     paintOn(generator, 1.0, scale_, paint);
-    return true;
+    return data;
 }
 
-bool ScenePainter::writePdf(QIODevice& file, const Paint& paint) const {
+QByteArray ScenePainter::pdf(const Paint& paint) const {
     // Fonts stand in the file in the order of a hash: with a random seed each run would write another file.
     const FixedHashes fixed;
     QByteArray data;
@@ -128,10 +126,23 @@ bool ScenePainter::writePdf(QIODevice& file, const Paint& paint) const {
         const double unitsPerPoint = kResolution / 72.0;
         paintOn(writer, unitsPerPoint, scale_ / unitsPerPoint, paint);
     }
-    return file.write(withoutDates(std::move(data))) >= 0;
+    return withoutDates(std::move(data));
 }
 
-std::optional<std::string> ScenePainter::write(const std::string& path, const Paint& paint) const {
+QByteArray ScenePainter::png(const QImage& picture) {
+    QByteArray data = encodedAsPng(picture);
+    if (data.isEmpty()) {
+        QBuffer buffer(&data);
+        buffer.open(QIODevice::WriteOnly);
+        if (!QImageWriter(&buffer, "png").write(picture)) {
+            data.clear();
+        }
+    }
+    return data;
+}
+
+std::optional<std::string> ScenePainter::add(const std::string& path, const Paint& paint,
+                                             documents::StagedFiles& files) const {
     if (const auto reason = refusal()) {
         return path + ": " + *reason;
     }
@@ -141,29 +152,25 @@ std::optional<std::string> ScenePainter::write(const std::string& path, const Pa
     if (!known || !name.contains(u'.')) {
         return path + ": the name must end in .png, .svg or .pdf";
     }
-    QSaveFile file(name);
-    if (!file.open(QIODevice::WriteOnly)) {
-        return failure(path, file.errorString());
+    // Before the work of drawing, not after it.
+    if (auto problem = documents::StagedFiles::refusal(path); !problem.empty()) {
+        return problem;
     }
-    if (format == u"png") {
-        const QImage picture = image(paint);
-        if (picture.isNull()) {
-            return path + ": there is not enough memory for the picture";
-        }
-        if (const QByteArray data = encodedAsPng(picture); !data.isEmpty()) {
-            file.write(data);  // an error is seen at the commit
-        } else if (QImageWriter writer(&file, "png"); !writer.write(picture)) {
-            return failure(path, file.error() != QFileDevice::NoError ? file.errorString() : writer.errorString());
-        }
-    } else if (format == u"svg") {
-        writeSvg(file, paint);
-    } else {
-        writePdf(file, paint);
+    const QByteArray data = format == u"png" ? png(image(paint)) : format == u"svg" ? svg(paint) : pdf(paint);
+    if (data.isEmpty()) {
+        return path + ": there is not enough memory for the picture";
     }
-    if (!file.commit()) {
-        return failure(path, file.errorString());
+    const auto problem = files.add(path, {data.constData(), static_cast<std::size_t>(data.size())});
+    return problem.empty() ? std::nullopt : std::optional(problem);
+}
+
+std::optional<std::string> ScenePainter::write(const std::string& path, const Paint& paint) const {
+    documents::StagedFiles files;
+    if (auto problem = add(path, paint, files)) {
+        return problem;
     }
-    return std::nullopt;
+    const auto problem = files.commit();
+    return problem.empty() ? std::nullopt : std::optional(problem);
 }
 
 ScenePainter::Paint ScenePainter::view(const std::shared_ptr<platform::View>& view) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QByteArray>
 #include <QImage>
 #include <QString>
 #include <functional>
@@ -7,6 +8,7 @@
 #include <optional>
 #include <string>
 
+#include "documents/StagedFiles.h"
 #include "linux/paint/Palette.h"
 #include "linux/paint/QtCanvas.h"
 #include "platform/base/Geometry.h"
@@ -37,8 +39,10 @@ class ScenePainter {
     std::optional<std::string> refusal() const;
     /// A null image when refused.
     QImage image(const Paint& paint) const;
-    /// Writes the format that the file's name ends in: .png, .svg or .pdf (one page). The file appears whole or not at
-    /// all: it is written beside its place and renamed. None, or an error that names the file and the reason.
+    /// Draws the format that the file's name ends in, .png, .svg or .pdf (one page), and writes it beside its place; it
+    /// takes that when `files` are committed. None, or an error that names the file and the reason.
+    std::optional<std::string> add(const std::string& path, const Paint& paint, documents::StagedFiles& files) const;
+    /// The same of one file alone, which appears whole or not at all.
     std::optional<std::string> write(const std::string& path, const Paint& paint) const;
 
     /// Lays out a view and gives the painting of it, at the scene's origin.
@@ -46,8 +50,9 @@ class ScenePainter {
 
   private:
     void paintOn(QPaintDevice& device, double painterScale, double pixelsPerDeviceUnit, const Paint& paint) const;
-    bool writeSvg(class QIODevice& file, const Paint& paint) const;
-    bool writePdf(class QIODevice& file, const Paint& paint) const;
+    QByteArray svg(const Paint& paint) const;
+    QByteArray pdf(const Paint& paint) const;
+    static QByteArray png(const QImage& picture);
 
     platform::Size size_;
     double scale_;

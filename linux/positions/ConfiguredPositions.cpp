@@ -33,7 +33,7 @@ std::shared_ptr<platform::LocationManagerFactory> ConfiguredPositions::make(
             } else {
                 platform::platformLog().write(
                     platform::LogLevel::Error, "positions: %@",
-                    platform::FormatArgument(std::get<TrackReader::Error>(read).text).shown());
+                    platform::FormatArgument(std::get<documents::DocumentError>(read).text()).shown());
             }
             break;
         }

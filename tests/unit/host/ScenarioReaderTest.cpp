@@ -257,18 +257,17 @@ TEST_F(KTRScenarioReaderTest, Messages_AreOneShortLineWhateverWasFound) {
 TEST_F(KTRScenarioReaderTest, Files_ThatCannotBeReadAreTold) {
     EXPECT_EQ(errorOfFile("/nowhere/at/all.json"), "/nowhere/at/all.json: there is no such file");
     EXPECT_EQ(errorOfFile(std::filesystem::temp_directory_path().string()),
-              std::filesystem::temp_directory_path().string() + ": this is a folder, not a scenario file");
+              std::filesystem::temp_directory_path().string() + ": this is a folder, not a file");
 }
 
-TEST_F(KTRScenarioReaderTest, EndlessFile_IsGivenUp) {
-    EXPECT_EQ(errorOfFile("/dev/zero"), "/dev/zero: the file is larger than 64 MiB");
-}
-
-TEST_F(KTRScenarioReaderTest, DemoScenarios_AreAllRead) {
+TEST_F(KTRScenarioReaderTest, DemoScenarios_AreAllReadWithoutAWarning) {
     int count = 0;
     for (const auto& entry : std::filesystem::directory_iterator(KTR_SOURCE_DIR "/resources/scenarios")) {
         if (entry.path().extension() == ".json") {
             EXPECT_EQ(errorOfFile(entry.path().string()), "no error");
+            documents::DocumentWarnings warnings;
+            ScenarioReader({kNow}).readFile(entry.path().string(), &warnings);
+            EXPECT_TRUE(warnings.empty()) << warnings.front().text();
             ++count;
         }
     }

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <regex>
+
 #include "tests/support/TemporaryFolder.h"
 
 namespace ktr::test {
@@ -20,7 +22,11 @@ class ConfigurationReaderTest : public ::testing::Test {
     static std::string errorOf(const std::string& text) {
         const auto read = ConfigurationReader::readText(text, "/etc/ktr/config.json");
         const auto* error = std::get_if<ConfigurationReader::Error>(&read);
-        return error != nullptr ? error->text : "no error";
+        return error != nullptr ? withoutPlace(error->text) : "no error";
+    }
+    /// "config.json:1:15: $.a" without its line and column, which others test.
+    static std::string withoutPlace(const std::string& line) {
+        return std::regex_replace(line, std::regex(R"(:1:\d+: )"), ": ");
     }
 };
 
@@ -96,7 +102,7 @@ TEST_F(ConfigurationReaderTest, Maps_ErrorsNameThePlace) {
                   start + "sources[1].url: expected an https address with {z}, {x} and {y} in its path, found \"" +
                       url + "\"");
     }
-    EXPECT_EQ(errorOf(R"({"maps": {"sources": {}}})"), start + "sources: expected a list of objects, found an object");
+    EXPECT_EQ(errorOf(R"({"maps": {"sources": {}}})"), start + "sources: expected a list, found an object");
     EXPECT_EQ(errorOf(R"({"maps": {"sources": [1]}})"), start + "sources[0]: expected an object, found a number");
     EXPECT_EQ(errorOf(R"({"maps": {"datum": "here"}})"),
               start + "datum: expected one of \"wgs84\", \"gcj02\", found \"here\"");
@@ -109,20 +115,20 @@ TEST_F(ConfigurationReaderTest, Maps_ErrorsNameThePlace) {
 TEST_F(ConfigurationReaderTest, Errors_NameFileAndPlace) {
     const std::string file = "/etc/ktr/config.json";
     EXPECT_EQ(errorOf(R"({"account": {"personId": 7}})"),
-              file + ": $.account.personId: expected a text, found a number");
+              file + ": $.account.personId: expected a string, found a number");
     EXPECT_EQ(errorOf(R"({"account": {}})"),
               file + ": $.account.personId: expected the person identifier that the service knows, found nothing");
     EXPECT_EQ(errorOf(R"({"account": {"personId": "a:b"}})"),
               file + ": $.account.personId: expected a text without \":\"");
     EXPECT_EQ(errorOf(R"({"account": {"personId": "a", "domains": ["x", 3]}})"),
-              file + ": $.account.domains[1]: expected a text, found a number");
+              file + ": $.account.domains[1]: expected a string, found a number");
     EXPECT_EQ(
         errorOf(R"({"positions": {"source": "stars"}})"),
         file + ": $.positions.source: expected one of \"geoclue\", \"gpsd\", \"track\", \"none\", found \"stars\"");
     EXPECT_EQ(errorOf(R"({"positions": {"port": 70000}})"),
               file + ": $.positions.port: expected a whole number from 1 to 65535");
     EXPECT_EQ(errorOf(R"({"restrictions": {"friendLocationAllowed": "no"}})"),
-              file + ": $.restrictions.friendLocationAllowed: expected true or false, found a text");
+              file + ": $.restrictions.friendLocationAllowed: expected true or false, found a string");
     EXPECT_EQ(errorOf("{\n  \"account\": }").rfind(file + ":2:", 0), 0U);
     EXPECT_EQ(errorOf("[]"), file + ": $: expected an object, found a list");
 }

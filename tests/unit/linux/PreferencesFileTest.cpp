@@ -9,8 +9,10 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <chrono>
 #include <csignal>
 
+#include "documents/FileLock.h"
 #include "tests/support/TemporaryFolder.h"
 
 namespace ktr::test {
@@ -184,8 +186,21 @@ TEST_F(PreferencesFileTest, Pipe_IsRefusedAndHoldsNobodyUp) {
     ASSERT_EQ(::mkfifo(file.c_str(), 0600), 0);
     const auto texts = PreferencesFile::read(file);
     ASSERT_TRUE(std::holds_alternative<PreferencesFile::Error>(texts));
-    EXPECT_EQ(std::get<PreferencesFile::Error>(texts).text, file.string() + ": cannot be read: it is no regular file");
+    EXPECT_EQ(std::get<PreferencesFile::Error>(texts).text, file.string() + ": this is a pipe, not a file");
     EXPECT_FALSE(merge({{"host", "new.example"}}));
+}
+
+TEST_F(PreferencesFileTest, LockHeldElsewhere_IsNotWaitedForWithoutEnd) {
+    ASSERT_TRUE(merge({{"host", "old.example"}}));
+    const documents::FileLock held(file.string() + ".lock");
+    ASSERT_TRUE(held.isHeld());
+    const auto start = std::chrono::steady_clock::now();
+    const auto merged = PreferencesFile::merge(file, {{"host", "new.example"}});
+    ASSERT_TRUE(std::holds_alternative<PreferencesFile::Error>(merged));
+    EXPECT_EQ(std::get<PreferencesFile::Error>(merged).text,
+              file.string() + ": cannot be locked: another process holds the lock");
+    EXPECT_LT(std::chrono::steady_clock::now() - start, 3 * documents::FileLock::kLongestWait);
+    EXPECT_EQ(read(), (PreferencesFile::Texts{{"host", "old.example"}}));
 }
 
 }  // namespace ktr::test

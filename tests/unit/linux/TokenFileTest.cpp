@@ -36,13 +36,13 @@ TEST_F(TokenFileTest, FileThatOthersReach_IsRefusedWithItsModeAndWithoutItsText)
 }
 
 TEST_F(TokenFileTest, WhatIsNoTokenFile_IsRefused) {
-    EXPECT_NE(refusalOf(folder.path()).find("no regular file"), std::string::npos);
+    EXPECT_NE(refusalOf(folder.path()).find("a folder, not a file"), std::string::npos);
     EXPECT_NE(refusalOf(folder.write("a", "")).find("one line"), std::string::npos);
     EXPECT_NE(refusalOf(folder.write("b", "one\ntwo\n")).find("one line"), std::string::npos);
-    EXPECT_NE(refusalOf(folder.write("c", std::string(20000, 'x'))).find("one line"), std::string::npos);
+    EXPECT_NE(refusalOf(folder.write("c", std::string(20000, 'x'))).find("larger than 16 KiB"), std::string::npos);
     const auto pipe = folder.path() / "pipe";
     ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
-    EXPECT_NE(refusalOf(pipe).find("no regular file"), std::string::npos);
+    EXPECT_NE(refusalOf(pipe).find("a pipe, not a file"), std::string::npos);
     const auto read = TokenFile::read(folder.path() / "none");
     ASSERT_TRUE(std::holds_alternative<TokenFile::Error>(read));
     EXPECT_TRUE(std::get<TokenFile::Error>(read).missing);

@@ -53,8 +53,8 @@ TEST_F(FaultScriptTest, Request_GetsTheFirstFaultThatConcernsIt) {
 }
 
 TEST_F(FaultScriptTest, WhatIsNoFault_IsRefused) {
-    EXPECT_EQ(complaintOf("statos=503"), "$.statos: there is no such fault");
-    EXPECT_EQ(complaintOf("status=five"), "$.status: expected a number, found a string");
+    EXPECT_EQ(complaintOf("statos=503"), "$.statos: there is no such fault; did you mean \"status\"?");
+    EXPECT_EQ(complaintOf("status=five"), "$.status: expected a whole number from 200 to 599, found a string");
     EXPECT_EQ(complaintOf("status=99"), "$.status: expected a whole number from 200 to 599");
     EXPECT_EQ(complaintOf("at=1.5"), "$.at: expected a whole number from 1 to 1000000000");
     EXPECT_EQ(complaintOf("cut=somewhere").rfind("$.cut: expected one of before, headers, body, found ", 0), 0U);

@@ -1,0 +1,81 @@
+#include "documents/FileSteps.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstring>
+
+namespace ktr::documents {
+
+namespace {
+
+int writeAll(int descriptor, std::string_view bytes) {
+    while (!bytes.empty()) {
+        const ssize_t count = ::write(descriptor, bytes.data(), bytes.size());
+        if (count < 0 && errno != EINTR) {
+            return errno;
+        }
+        bytes.remove_prefix(count < 0 ? 0 : static_cast<std::size_t>(count));
+    }
+    return 0;
+}
+
+int sync(int descriptor) {
+    int result = 0;
+    do {
+        result = ::fsync(descriptor);
+    } while (result != 0 && errno == EINTR);
+    return result == 0 ? 0 : errno;
+}
+
+int openPatiently(const char* file, int flags, mode_t mode = 0) {
+    int descriptor = -1;
+    do {
+        descriptor = ::open(file, flags | O_CLOEXEC, mode);
+    } while (descriptor < 0 && errno == EINTR);
+    return descriptor;
+}
+
+}  // namespace
+
+int FileSteps::writeNew(const std::filesystem::path& file, std::string_view bytes, mode_t mode) {
+    const int descriptor = openPatiently(file.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW, mode);
+    if (descriptor < 0) {
+        return errno;
+    }
+    int failure = writeAll(descriptor, bytes);
+    if (failure == 0) {
+        failure = sync(descriptor);
+    }
+    // Some file systems report a full disk only here. The descriptor is gone whatever is said.
+    if (::close(descriptor) != 0 && failure == 0 && errno != EINTR) {
+        failure = errno;
+    }
+    if (failure != 0) {
+        ::unlink(file.c_str());
+    }
+    return failure;
+}
+
+int FileSteps::syncFolder(const std::filesystem::path& folder) {
+    const int descriptor = openPatiently(folder.c_str(), O_RDONLY | O_DIRECTORY);
+    if (descriptor < 0) {
+        return errno;
+    }
+    const int failure = sync(descriptor);
+    ::close(descriptor);
+    // Not every file system can; those that cannot have nothing to bring there.
+    return failure == EINVAL || failure == ENOTSUP ? 0 : failure;
+}
+
+std::filesystem::path FileSteps::folderOf(const std::filesystem::path& file) {
+    return file.has_parent_path() ? file.parent_path() : std::filesystem::path(".");
+}
+
+std::string FileSteps::sentence(const std::filesystem::path& file, const char* what, int failure) {
+    return file.string() + ": cannot be " + what + ": " + std::strerror(failure);
+}
+
+}  // namespace ktr::documents

@@ -1,0 +1,23 @@
+#pragma once
+
+#include <sys/types.h>
+
+#include <filesystem>
+#include <string>
+#include <string_view>
+
+namespace ktr::documents {
+
+/// The steps of replacing a file, each of which gives 0 or the errno of its failure. Any thread; they wait for the disk.
+class FileSteps {
+  public:
+    /// Makes a file that was not there, writes all bytes and brings them to the disk. What a failure leaves is removed.
+    static int writeNew(const std::filesystem::path& file, std::string_view bytes, mode_t mode);
+    /// Brings the names in a folder to the disk.
+    static int syncFolder(const std::filesystem::path& folder);
+    static std::filesystem::path folderOf(const std::filesystem::path& file);
+    /// "dinner.png: cannot be written: No space left on device".
+    static std::string sentence(const std::filesystem::path& file, const char* what, int failure);
+};
+
+}  // namespace ktr::documents
