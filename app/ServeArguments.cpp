@@ -1,6 +1,7 @@
 #include "app/ServeArguments.h"
 
 #include <CLI/CLI.hpp>
+#include <cmath>
 
 #include "documents/Words.h"
 #include "serve/FaultScript.h"
@@ -86,6 +87,10 @@ std::string ServeArguments::read(serve::ServeOptions& options) const {
         options.certificate = serve::CertificateKind::Foreign;
     } else {
         return "--certificate: expected one of good, expired, wrong-host, foreign, found " + documents::inQuotes(kind);
+    }
+    // The parser's own check lets "nan" through.
+    if (std::isnan(options.intervalSeconds)) {
+        return "--interval: expected a number from 0 to 86400, found \"nan\"";
     }
     if (options.personId.empty() || options.personId.find(':') != std::string::npos) {
         return "--person: expected a text without \":\", found " + documents::inQuotes(options.personId);

@@ -63,6 +63,10 @@ std::string configuration(const serve::ServeOptions& options, const serve::Devel
 std::string contactsFor(const serve::ServeOptions& options, const fs::path& folder, const serve::FriendsFile& friends,
                         std::string& failure) {
     if (!options.contacts.empty()) {
+        std::error_code failed;
+        if (!fs::exists(options.contacts, failed)) {
+            failure = "--contacts: " + documents::inQuotes(options.contacts) + " is not there";
+        }
         return fs::absolute(options.contacts).lexically_normal().string();
     }
     const fs::path file = fs::absolute(folder / "contacts.vcf").lexically_normal();
@@ -153,18 +157,22 @@ host::ExitCode ServeCommand::run(const serve::ServeOptions& options) {
     if (!certificate) {
         return complain("the service's certificate cannot be made");
     }
-    const int signals = endingSignals();
     auto& setup = std::get<serve::DevelopmentServer::Setup>(read);
     const std::string userName = setup.friends.user.handle();
     std::string failure;
     const std::string contacts = contactsFor(options, folder, setup.friends, failure);
+    if (!failure.empty()) {
+        return complain(failure);
+    }
+    const int signals = endingSignals();
     setup.token = certificates.token();
     setup.certificate = *certificate;
     setup.report = [](const std::string& line) { std::cout << documents::forLine(line) << std::endl; };
     serve::DevelopmentServer server(std::move(setup));
-    if (signals < 0 || !server.start()) {
+    const std::string refused = signals < 0 ? "signals cannot be waited for" : server.start();
+    if (!refused.empty()) {
         ::close(signals);
-        return complain("port " + std::to_string(options.port) + " of 127.0.0.1 cannot be used");
+        return complain(refused);
     }
     const std::string config = configuration(options, certificates, userName, contacts, server.port());
     if (failure.empty() && !options.writeConfig.empty()) {

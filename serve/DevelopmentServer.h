@@ -31,8 +31,8 @@ class DevelopmentServer {
     DevelopmentServer(const DevelopmentServer&) = delete;
     DevelopmentServer& operator=(const DevelopmentServer&) = delete;
 
-    /// Takes the port and begins to answer. False when the port or the certificate cannot be used.
-    bool start();
+    /// Takes the port and begins to answer. Empty when done, else what failed.
+    std::string start();
     /// Breaks off answers under way and returns when all threads have ended.
     void stop();
     /// After `start`.

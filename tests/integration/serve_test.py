@@ -5,6 +5,7 @@
 """
 import base64
 import concurrent.futures
+import gzip
 import http.client
 import json
 import os
@@ -12,6 +13,7 @@ import pathlib
 import signal
 import socket
 import ssl
+import subprocess
 import sys
 import time
 import unittest
@@ -178,6 +180,75 @@ class RequestTest(unittest.TestCase):
             bound = [line.split()[1] for line in table if line.split()[1].endswith(f":{self.service.port:04X}")
                      and line.split()[3] == "0A"]
         self.assertEqual(bound, [f"0100007F:{self.service.port:04X}"])
+
+
+class CrowdTest(unittest.TestCase):
+    """Clients that mean no good, or nothing."""
+
+    def test_silent_and_dripping_clients_starve_nobody(self):
+        with Service(PROGRAM) as service:
+            crowd = [socket.create_connection(("127.0.0.1", service.port)) for _ in range(200)]
+            try:
+                for number, client in enumerate(crowd):
+                    client.send(b"\x16\x03\x01"[:number % 4])
+                begin = time.monotonic()
+                for _ in range(20):
+                    self.assertEqual(post(service)[0].status, 200)
+                self.assertLess(time.monotonic() - begin, 5)
+            finally:
+                for client in crowd:
+                    client.close()
+
+    def test_many_who_come_at_once_are_all_answered(self):
+        with Service(PROGRAM) as service:
+            with concurrent.futures.ThreadPoolExecutor(100) as pool:
+                begin = time.monotonic()
+                statuses = list(pool.map(lambda _: post(service)[0].status, range(200)))
+                self.assertEqual(set(statuses), {200})
+                self.assertLess(time.monotonic() - begin, 20)
+
+    def test_packed_bodies_are_not_unpacked(self):
+        with Service(PROGRAM) as service:
+            packed = gzip.compress(b" " * (64 << 20))
+            self.assertEqual(post(service, packed, **{"Content-Encoding": "gzip"})[0].status, 415)
+            with open(f"/proc/{service.process.pid}/status", encoding="ascii") as status:
+                peak = next(int(line.split()[1]) for line in status if line.startswith("VmHWM:"))
+            self.assertLess(peak, 200 << 10, "kB")
+
+    def test_length_beside_chunks_is_refused(self):
+        with Service(PROGRAM) as service:
+            connection = connect(service)
+            connection.putrequest("POST", PATH)
+            for name, value in headers(service).items():
+                connection.putheader(name, value)
+            connection.putheader("Content-Length", "20")
+            connection.putheader("Transfer-Encoding", "chunked")
+            connection.endheaders(b"14\r\n" + b'{"clientContext":{}}' + b"\r\n0\r\n\r\n")
+            self.assertEqual(connection.getresponse().status, 400)
+
+
+class StartTest(unittest.TestCase):
+    """What cannot be started says so and does not claim to be ready."""
+
+    def refused(self, *options):
+        ended = subprocess.run([PROGRAM, "serve", "--until-stdin-closes", *options], stdin=subprocess.DEVNULL,
+                               capture_output=True, text=True, timeout=60, check=False)
+        self.assertNotEqual(ended.returncode, 0, ended.stdout)
+        self.assertNotIn("ready", ended.stdout)
+        return ended.stderr
+
+    def test_a_port_has_one_service(self):
+        with Service(PROGRAM) as service:
+            self.assertIn("in use", self.refused("--ca-dir", str(service.folder / "other"), "--port",
+                                                 str(service.port)))
+            self.assertEqual(post(service)[0].status, 200)
+
+    def test_an_interval_is_a_number(self):
+        for text in ("nan", "-nan", "inf", "-1", "soon"):
+            self.assertIn("--interval", self.refused("--interval", text), text)
+
+    def test_contacts_are_there(self):
+        self.assertIn("/not/there.vcf", self.refused("--contacts", "/not/there.vcf"))
 
 
 class SharingTest(unittest.TestCase):

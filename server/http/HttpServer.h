@@ -1,0 +1,49 @@
+#pragma once
+
+#include <openssl/ssl.h>
+
+#include <chrono>
+#include <functional>
+#include <memory>
+#include <string>
+
+#include "server/http/HttpHandler.h"
+#include "server/http/HttpLimits.h"
+
+namespace ktr::server {
+
+/// A strict HTTP/1.1 edge: one address, a few threads, as many connections as its limits say. What is public belongs to
+/// the thread that made it, but for `later`.
+class HttpServer {
+  public:
+    struct Setup {
+        std::string address = "127.0.0.1";  ///< an IPv4 or IPv6 address
+        int port = 0;                       ///< 0: a free one
+        std::shared_ptr<SSL_CTX> tls;       ///< none: without TLS
+        HttpLimits limits;
+        HttpHandler handler;
+        int threads = 2;
+    };
+
+    explicit HttpServer(Setup setup);
+    /// Stops.
+    ~HttpServer();
+    HttpServer(const HttpServer&) = delete;
+    HttpServer& operator=(const HttpServer&) = delete;
+
+    /// Takes the port and begins to answer. Empty when done, else what failed: the port may be somebody else's.
+    std::string start();
+    /// Lets nobody in any more, closes what waits, gives answers under way this long, breaks off what is left, and
+    /// returns when all threads have ended.
+    void stop(std::chrono::milliseconds grace = std::chrono::milliseconds(2000));
+    /// After `start`.
+    int port() const;
+    /// Calls `what` after so many seconds on one of the threads; drops it when the server stops before. Any thread.
+    void later(double seconds, std::function<void()> what);
+
+  private:
+    class Listener;
+    std::unique_ptr<Listener> listener_;
+};
+
+}  // namespace ktr::server

@@ -1,0 +1,276 @@
+#include "server/http/HttpServer.h"
+
+#include <arpa/inet.h>
+#include <gtest/gtest.h>
+#include <netinet/in.h>
+#include <poll.h>
+#include <sys/socket.h>
+#include <unistd.h>
+
+#include <atomic>
+#include <chrono>
+#include <cstdint>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <thread>
+#include <vector>
+
+namespace ktr::test {
+
+using server::HttpReply;
+using server::HttpRequest;
+using server::HttpResponse;
+using server::HttpServer;
+using std::chrono::milliseconds;
+
+namespace {
+
+/// A client that sends and reads exactly what it is told.
+class RawClient {
+  public:
+    explicit RawClient(int port) : descriptor_(::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
+        sockaddr_in address{};
+        address.sin_family = AF_INET;
+        address.sin_port = htons(static_cast<std::uint16_t>(port));
+        address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+        connected_ = ::connect(descriptor_, reinterpret_cast<sockaddr*>(&address), sizeof address) == 0;
+    }
+    ~RawClient() { ::close(descriptor_); }
+    RawClient(const RawClient&) = delete;
+    RawClient& operator=(const RawClient&) = delete;
+
+    bool connected() const { return connected_; }
+    void send(const std::string& bytes) const { ::send(descriptor_, bytes.data(), bytes.size(), MSG_NOSIGNAL); }
+    /// What comes until `end` stands in it, the other side ends, or the time is over.
+    std::string read(const std::string& end, milliseconds time = milliseconds(5000)) const {
+        const auto until = std::chrono::steady_clock::now() + time;
+        std::string text;
+        while (text.find(end) == std::string::npos || end.empty()) {
+            const auto left = std::chrono::duration_cast<milliseconds>(until - std::chrono::steady_clock::now());
+            pollfd wait{descriptor_, POLLIN, 0};
+            char block[4096];
+            if (left.count() <= 0 || ::poll(&wait, 1, static_cast<int>(left.count())) <= 0) {
+                return text + "(nothing more in time)";
+            }
+            const ssize_t count = ::recv(descriptor_, block, sizeof block, 0);
+            if (count <= 0) {
+                return text + "(end)";
+            }
+            text.append(block, static_cast<std::size_t>(count));
+        }
+        return text;
+    }
+    std::string get(const std::string& path = "/") const {
+        send("GET " + path + " HTTP/1.1\r\nHost: localhost\r\n\r\n");
+        return read("ok:" + path);
+    }
+
+  private:
+    int descriptor_;
+    bool connected_ = false;
+};
+
+}  // namespace
+
+class HttpServerTest : public ::testing::Test {
+  protected:
+    static HttpServer::Setup setup() {
+        HttpServer::Setup setup;
+        setup.handler = [](const HttpRequest& request, const HttpReply& reply) {
+            reply.send(HttpResponse::json(200, "ok:" + request.path + request.body));
+        };
+        return setup;
+    }
+};
+
+TEST_F(HttpServerTest, KeptConnection_AndPipelinedRequests_AreAnsweredInTheirOrder) {
+    HttpServer server(setup());
+    ASSERT_EQ(server.start(), "");
+    const RawClient client(server.port());
+    EXPECT_NE(client.get("/a").find("ok:/a"), std::string::npos);
+    client.send("GET /b HTTP/1.1\r\nHost: a\r\n\r\nPOST /c HTTP/1.1\r\nHost: a\r\nContent-Length: 1\r\n\r\nx");
+    const std::string both = client.read("ok:/cx");
+    EXPECT_LT(both.find("ok:/b"), both.find("ok:/cx"));
+    EXPECT_NE(both.find("ok:/cx"), std::string::npos);
+}
+
+TEST_F(HttpServerTest, SecondServerOnOnePort_SaysThatItIsTaken) {
+    HttpServer first(setup());
+    ASSERT_EQ(first.start(), "");
+    auto same = setup();
+    same.port = first.port();
+    HttpServer second(std::move(same));
+    EXPECT_NE(second.start().find("in use"), std::string::npos);
+    EXPECT_NE(RawClient(first.port()).get().find("ok:"), std::string::npos);
+}
+
+TEST_F(HttpServerTest, RefusedRequest_LearnsWhy_AndTheConnectionEnds) {
+    HttpServer server(setup());
+    ASSERT_EQ(server.start(), "");
+    const RawClient client(server.port());
+    client.send(
+        "POST / HTTP/1.1\r\nHost: a\r\nContent-Length: 1\r\nTransfer-Encoding: chunked\r\n\r\n1\r\na\r\n0\r\n\r\n");
+    const std::string answer = client.read("(never)");
+    EXPECT_EQ(answer.rfind("HTTP/1.1 400 ", 0), 0U) << answer;
+    EXPECT_TRUE(answer.ends_with("(end)")) << answer;
+}
+
+TEST_F(HttpServerTest, BodyThatIsTooLong_IsRefusedBeforeItIsRead_AndSeenToBe) {
+    HttpServer server(setup());
+    ASSERT_EQ(server.start(), "");
+    const RawClient client(server.port());
+    client.send("POST / HTTP/1.1\r\nHost: a\r\nContent-Length: 3000000\r\n\r\n");
+    for (int i = 0; i < 30; ++i) {
+        client.send(std::string(100000, 'x'));
+    }
+    EXPECT_EQ(client.read("}").rfind("HTTP/1.1 413 ", 0), 0U);
+}
+
+TEST_F(HttpServerTest, SilentAndDrippingClients_AreClosedAtTheDeadlineForTheWhole) {
+    auto short_ = setup();
+    short_.limits.headerTime = milliseconds(300);
+    short_.limits.bodyTime = milliseconds(300);
+    HttpServer server(std::move(short_));
+    ASSERT_EQ(server.start(), "");
+    const RawClient silent(server.port());
+    const RawClient header(server.port());
+    const RawClient body(server.port());
+    header.send("GET / HTTP/1.1\r\nX: ");
+    body.send("POST / HTTP/1.1\r\nHost: a\r\nContent-Length: 1000\r\n\r\n");
+    for (int i = 0; i < 40; ++i) {
+        header.send("x");
+        body.send("x");
+        std::this_thread::sleep_for(milliseconds(25));
+    }
+    for (const RawClient* client : {&silent, &header, &body}) {
+        EXPECT_EQ(client->read("(never)", milliseconds(50)), "(end)");
+    }
+}
+
+TEST_F(HttpServerTest, IdleConnection_IsClosedAfterItsTime_ARestingOneNotBefore) {
+    auto short_ = setup();
+    short_.limits.headerTime = milliseconds(100);
+    short_.limits.idleTime = milliseconds(600);
+    HttpServer server(std::move(short_));
+    ASSERT_EQ(server.start(), "");
+    const RawClient client(server.port());
+    EXPECT_NE(client.get().find("ok:"), std::string::npos);
+    std::this_thread::sleep_for(milliseconds(300));
+    EXPECT_NE(client.get().find("ok:"), std::string::npos) << "the header's time begins with its first byte";
+    EXPECT_EQ(client.read("(never)", milliseconds(3000)), "(end)");
+}
+
+TEST_F(HttpServerTest, ManySilentClients_GiveWayToOneThatSpeaks) {
+    auto narrow = setup();
+    narrow.limits.connectionsPerAddress = 50;
+    HttpServer server(std::move(narrow));
+    ASSERT_EQ(server.start(), "");
+    std::vector<std::unique_ptr<RawClient>> crowd;
+    for (int i = 0; i < 200; ++i) {
+        crowd.push_back(std::make_unique<RawClient>(server.port()));
+        crowd.back()->send(i % 2 == 0 ? "GET / HT" : "POST / HTTP/1.1\r\nHost: a\r\nContent-Length: 9\r\n\r\n1");
+    }
+    for (int i = 0; i < 20; ++i) {
+        const RawClient good(server.port());
+        EXPECT_NE(good.get().find("ok:"), std::string::npos);
+    }
+    int closed = 0;
+    for (const auto& client : crowd) {
+        closed += client->read("(never)", milliseconds(20)) == "(end)" ? 1 : 0;
+    }
+    EXPECT_GE(closed, 150);
+}
+
+TEST_F(HttpServerTest, AnsweredConnections_DoNotGiveWay) {
+    auto narrow = setup();
+    narrow.limits.connectionsPerAddress = 1;
+    std::vector<HttpReply> replies;
+    std::mutex mutex;
+    narrow.handler = [&](const HttpRequest&, const HttpReply& reply) {
+        const std::lock_guard<std::mutex> lock(mutex);
+        replies.push_back(reply);
+    };
+    HttpServer server(std::move(narrow));
+    ASSERT_EQ(server.start(), "");
+    const RawClient first(server.port());
+    first.send("GET / HTTP/1.1\r\nHost: a\r\n\r\n");
+    for (bool asked = false; !asked;) {
+        std::this_thread::sleep_for(milliseconds(5));
+        const std::lock_guard<std::mutex> lock(mutex);
+        asked = !replies.empty();
+    }
+    const RawClient second(server.port());
+    EXPECT_EQ(second.read("(never)"), "(end)");
+    replies.front().send(HttpResponse::json(200, "ok:late"));
+    EXPECT_NE(first.read("late").find("ok:late"), std::string::npos);
+}
+
+TEST_F(HttpServerTest, ReplyThatNobodyGives_ClosesTheConnection) {
+    auto mute = setup();
+    mute.handler = [](const HttpRequest&, const HttpReply&) {};
+    HttpServer server(std::move(mute));
+    ASSERT_EQ(server.start(), "");
+    const RawClient client(server.port());
+    client.send("GET / HTTP/1.1\r\nHost: a\r\n\r\n");
+    EXPECT_EQ(client.read("(never)"), "(end)");
+}
+
+TEST_F(HttpServerTest, Continue_IsSent_HeadHasNoBody) {
+    HttpServer server(setup());
+    ASSERT_EQ(server.start(), "");
+    const RawClient client(server.port());
+    client.send("POST /e HTTP/1.1\r\nHost: a\r\nExpect: 100-continue\r\nContent-Length: 1\r\n\r\n");
+    EXPECT_EQ(client.read("\r\n\r\n"), "HTTP/1.1 100 Continue\r\n\r\n");
+    client.send("x");
+    EXPECT_NE(client.read("ok:/ex").find("200 OK"), std::string::npos);
+    client.send("HEAD /h HTTP/1.1\r\nHost: a\r\n\r\n");
+    const std::string head = client.read("(never)");
+    EXPECT_NE(head.find("Content-Length: 5\r\n"), std::string::npos) << head;
+    EXPECT_TRUE(head.ends_with("\r\n\r\n(end)")) << head;
+}
+
+TEST_F(HttpServerTest, Stop_EndsWaitingClients_AndLetsAnAnswerEnd) {
+    auto slow = setup();
+    slow.handler = [](const HttpRequest&, const HttpReply& reply) {
+        std::thread([reply] {
+            std::this_thread::sleep_for(milliseconds(300));
+            reply.send(HttpResponse::json(200, "ok:late"));
+        }).detach();
+    };
+    HttpServer server(std::move(slow));
+    ASSERT_EQ(server.start(), "");
+    const RawClient waiting(server.port());
+    const RawClient asking(server.port());
+    asking.send("GET / HTTP/1.1\r\nHost: a\r\n\r\n");
+    std::this_thread::sleep_for(milliseconds(100));
+    const auto begin = std::chrono::steady_clock::now();
+    server.stop();
+    EXPECT_LT(std::chrono::steady_clock::now() - begin, milliseconds(3000));
+    EXPECT_NE(asking.read("(never)").find("ok:late"), std::string::npos);
+    EXPECT_EQ(waiting.read("(never)"), "(end)");
+    EXPECT_FALSE(RawClient(server.port()).connected());
+}
+
+TEST_F(HttpServerTest, Later_IsCalledInTime_AndDroppedByTheStop) {
+    std::atomic<int> calls = 0;
+    HttpServer server(setup());
+    ASSERT_EQ(server.start(), "");
+    server.later(0.01, [&] { ++calls; });
+    server.later(60.0, [&] { calls += 100; });
+    for (int i = 0; i < 500 && calls == 0; ++i) {
+        std::this_thread::sleep_for(milliseconds(10));
+    }
+    const auto begin = std::chrono::steady_clock::now();
+    server.stop();
+    EXPECT_LT(std::chrono::steady_clock::now() - begin, milliseconds(5000));
+    EXPECT_EQ(calls, 1);
+}
+
+TEST_F(HttpServerTest, AddressThatIsNone_IsSaid) {
+    auto wrong = setup();
+    wrong.address = "localhost";
+    EXPECT_EQ(HttpServer(std::move(wrong)).start(), "localhost: is no address");
+}
+
+}  // namespace ktr::test
