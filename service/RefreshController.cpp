@@ -22,6 +22,11 @@ std::shared_ptr<platform::MainLoop> mainLoop() {
     return installed ? installed->mainLoop : nullptr;
 }
 
+/// Deferred work may come to run when the host has taken the platform away, which everything that it leads to asks.
+bool isPlatformThere() {
+    return platform::Platform::installed() != nullptr;
+}
+
 /// What is not known lies at 0, 0, as in the commands.
 platform::Coordinate coordinateOf(const std::shared_ptr<platform::PlatformLocation>& location) {
     return location ? location->coordinate() : platform::Coordinate();
@@ -59,7 +64,7 @@ void RefreshController::beginTimerWithRefresh(double refresh, double timeout) {
     if (timeout_ > 0.0) {
         if (const auto loop = mainLoop()) {
             loop->schedule(timeout, false, [controller = platform::weak(this)] {
-                if (const auto self = controller.lock()) {
+                if (const auto self = controller.lock(); self && isPlatformThere()) {
                     self->cancelTimer();
                 }
             });
@@ -80,7 +85,7 @@ void RefreshController::scheduleTimerWithInterval(double interval) {
     // The timer that is replaced here goes on and fires.
     const auto itself = std::make_shared<std::weak_ptr<platform::Timer>>();
     pollTimer_ = loop->schedule(interval, false, [controller = platform::weak(this), itself] {
-        if (const auto self = controller.lock()) {
+        if (const auto self = controller.lock(); self && isPlatformThere()) {
             self->timerFired(itself->lock());
         }
     });
@@ -147,7 +152,11 @@ void RefreshController::sendCommand(const std::shared_ptr<KTRBaseCmd>& command) 
     // request under way is completed. The sender lets go of both on the main thread.
     serverInteractionController_->sendCommand(command, [self = platform::strong(this), command, loop] {
         if (command->wasSuccessful()) {
-            loop->post([self, command] { self->handleAnswer(*command); });
+            loop->post([self, command] {
+                if (isPlatformThere()) {
+                    self->handleAnswer(*command);
+                }
+            });
         }
         command->setCompletionBlock(nullptr);
     });
