@@ -13,7 +13,7 @@
 
 #include "linux/maps/TileFreshness.h"
 #include "linux/net/TlsTrust.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 #ifndef KTR_VERSION
 #error "KTR_VERSION is given by the build"
@@ -225,7 +225,7 @@ class HttpsPictures::Fetcher : public QObject {
     void report(const std::string& reason) {
         if (reason != reported_) {
             const std::string host = QUrl(addressOf(settings_.url, {})).host().toStdString();
-            platform::platformLog().line("Tiles from %@ cannot be fetched: %@", host, reason);
+            platform::areaLog(platform::LogArea::Maps).line("Tiles from %@ cannot be fetched: %@", host, reason);
             reported_ = reason;
         }
     }

@@ -5,7 +5,7 @@
 #include <exception>
 
 #include "linux/maps/MapStyle.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -42,7 +42,7 @@ MapDrawn drawGround(MapGround& ground, const MapDrawing& drawing) {
     try {
         drawn = ground.draw(drawing);
     } catch (const std::exception& error) {
-        platform::platformLog().line("A map cannot be drawn: %@", std::string(error.what()));
+        platform::areaLog(platform::LogArea::Maps).line("A map cannot be drawn: %@", std::string(error.what()));
     }
     drawing.painter.restore();
     drawn.filled &= drawing.region;

@@ -3,7 +3,7 @@
 
 #include <system_error>
 
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -29,7 +29,7 @@ bool MbtilesPictures::open() {
         file_.reset();
     }
     if (!error.empty() && error != reported_) {
-        platform::platformLog().line("The map %@ cannot be read: %@", path_, error);
+        platform::areaLog(platform::LogArea::Maps).line("The map %@ cannot be read: %@", path_, error);
     }
     reported_ = error;
     return file_ != nullptr;

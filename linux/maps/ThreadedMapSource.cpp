@@ -12,7 +12,7 @@
 #include "linux/maps/MapDrawer.h"
 #include "linux/maps/MapStyle.h"
 #include "linux/paint/RasterImage.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -27,7 +27,7 @@ std::optional<MapDrawer::Result> drawSafely(const platform::MapPictureRequest& r
     try {
         return MapDrawer::draw(request, grounds, token);
     } catch (const std::exception& error) {
-        platform::platformLog().line("A map cannot be drawn: %@", std::string(error.what()));
+        platform::areaLog(platform::LogArea::Maps).line("A map cannot be drawn: %@", std::string(error.what()));
         MapDrawer::Result empty;
         empty.pixels = QImage(1, 1, QImage::Format_RGB32);
         empty.pixels.fill(MapStyle::of(request.isDark, request.isHighContrast).land);

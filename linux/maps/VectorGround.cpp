@@ -12,7 +12,7 @@
 #include "linux/maps/MapStyle.h"
 #include "linux/maps/VectorLabels.h"
 #include "linux/maps/VectorPainter.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 #include "tiles/Gunzip.h"
 #include "tiles/VectorTileDecoder.h"
 
@@ -60,7 +60,7 @@ bool VectorGround::open() {
         }
     }
     if (!error.empty() && error != reported_) {
-        platform::platformLog().line("The map %@ cannot be read: %@", path_, error);
+        platform::areaLog(platform::LogArea::Maps).line("The map %@ cannot be read: %@", path_, error);
     }
     reported_ = error;
     return file_ != nullptr;

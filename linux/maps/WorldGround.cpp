@@ -11,7 +11,7 @@
 #include "linux/maps/MapStyle.h"
 #include "linux/maps/MapText.h"
 #include "linux/maps/WorldNames.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -357,7 +357,8 @@ MapDrawn WorldGround::draw(const MapDrawing& drawing) {
         std::string reason;
         map_ = WorldMap::read(file_, reason);
         if (!map_) {
-            platform::platformLog().line("The built-in map %@ cannot be used: %@", file_.string(), reason);
+            platform::areaLog(platform::LogArea::Maps)
+                .line("The built-in map %@ cannot be used: %@", file_.string(), reason);
         }
     }
     drawing.painter.save();

@@ -7,7 +7,7 @@
 #include "linux/paint/ImageDecoder.h"
 #include "linux/paint/RasterImage.h"
 #include "linux/paint/SvgImage.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -53,7 +53,8 @@ void QtImageSource::readBundle(const QString& folder, const std::string& bundle)
             variant->picture = pictureOf(dir.filePath(name), variant->scale);
         }
         if (!variant || !variant->picture) {
-            platform::platformLog().line("The image %@ of %@ cannot be used", name.toStdString(), bundle);
+            platform::areaLog(platform::LogArea::Paint)
+                .line("The image %@ of %@ cannot be used", name.toStdString(), bundle);
             continue;
         }
         const Key key{bundle, variant->name.toStdString()};

@@ -7,7 +7,7 @@
 #include "linux/positions/ScenarioLocationManagerFactory.h"
 #include "linux/positions/SourceLocationManagerFactory.h"
 #include "linux/positions/TrackReader.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -31,9 +31,9 @@ std::shared_ptr<platform::LocationManagerFactory> ConfiguredPositions::make(
             if (auto* positions = std::get_if<std::vector<TimedPosition>>(&read)) {
                 walk = std::move(*positions);
             } else {
-                platform::platformLog().write(
-                    platform::LogLevel::Error, "positions: %@",
-                    platform::FormatArgument(std::get<documents::DocumentError>(read).text()).shown());
+                platform::areaLog(platform::LogArea::Positions)
+                    .write(platform::LogLevel::Error, "%@",
+                           platform::FormatArgument(std::get<documents::DocumentError>(read).text()).shown());
             }
             break;
         }

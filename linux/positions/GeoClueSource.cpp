@@ -10,7 +10,7 @@
 #include <cmath>
 #include <utility>
 
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -189,8 +189,9 @@ void GeoClueSource::startClient() {
             return;
         }
         if (answered.isError()) {
-            platform::platformLog().write(platform::LogLevel::Info, "GeoClue gives no positions: %@",
-                                          platform::FormatArgument(answered.error().name().toStdString()).shown());
+            platform::areaLog(platform::LogArea::Positions)
+                .write(platform::LogLevel::Info, "GeoClue gives no positions: %@",
+                       platform::FormatArgument(answered.error().name().toStdString()).shown());
             retry_.later();
         } else {
             retry_.succeeded();
