@@ -27,7 +27,7 @@ class Progress {
                  std::to_string(notes.failures) + " failures");
         }
         const auto status = conversation_.status();
-        if (!status.words.empty() && status.words != words_) {
+        if (!status.words.empty() && status.words != words_ && !host_.live()->isUnusable()) {
             words_ = status.words;
             tell(words_);
         }
@@ -67,11 +67,11 @@ host::ExitCode LiveRun::run(std::vector<host::Scenario> scenarios) {
     conversation->start(std::move(scenarios));
     tick.start(kTick);
     loop.exec();
-    if (const std::string problem = host_.live()->problem(); !problem.empty()) {
-        tell(problem);
-    }
     if (const auto& failure = conversation->failure()) {
-        tell(failure->line);
+        // The log has named the cause; what follows from it need not be said as well.
+        if (!host_.live()->isUnusable()) {
+            tell(failure->line);
+        }
         return failure->code;
     }
     return host::ExitCode::Ok;

@@ -18,6 +18,8 @@
 #include "host/scenario/ScenarioReader.h"
 #include "linux/configuration/ConfigurationReader.h"
 #include "linux/configuration/XdgFolders.h"
+#include "linux/device/Buses.h"
+#include "linux/device/Descriptors.h"
 #include "linux/device/SystemClock.h"
 #include "linux/paint/FontSetup.h"
 
@@ -149,6 +151,11 @@ std::optional<host::Failure> loadFonts() {
 }
 
 host::ExitCode run(const Options& options, int argc, char** argv) {
+    if ((options.live || options.command == Options::Command::Show) && !linux_::Descriptors::areEnough()) {
+        return fail({host::ExitCode::Failure, "too few files may be open at a time: at least " +
+                                                  std::to_string(linux_::Descriptors::kNeeded) +
+                                                  " more are needed (`ulimit -n`)"});
+    }
     const documents::IsoTime now = sessionNow();
     const auto read = readScenarios(options, options.at ? options.at->date : now.date);
     if (const auto* failure = std::get_if<host::Failure>(&read)) {
@@ -172,6 +179,10 @@ host::ExitCode run(const Options& options, int argc, char** argv) {
     }
     if (!window) {
         qputenv("QT_QPA_PLATFORM", "offscreen");
+    }
+    // Qt itself uses the buses, from the application's making on.
+    for (const std::string& line : linux_::Buses::switchOffSilent()) {
+        std::fprintf(stderr, "ktr: %s\n", line.c_str());
     }
     qInstallMessageHandler(passOnQtMessage);
     if (const auto failure = prepareFonts()) {

@@ -12,7 +12,7 @@
 #include "platform/assistant/VASnippet.h"
 #include "platform/base/Clock.h"
 #include "platform/base/Format.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 #include "platform/client/FriendLocationRestrictions.h"
 
 namespace ktr::host {
@@ -51,8 +51,9 @@ std::variant<std::unique_ptr<Host>, Failure> Host::make(const HostSettings& sett
             self->live()->takeConfiguration();
             now.follow(self->live()->configuration());
             if (const auto failure = self->remake(now)) {
-                platform::platformLog().write(platform::LogLevel::Error, "the changed configuration is not used: %@",
-                                              platform::FormatArgument(failure->line).shown());
+                platform::areaLog(platform::LogArea::Host)
+                    .write(platform::LogLevel::Error, "the changed configuration is not used: %@",
+                           platform::FormatArgument(failure->line).shown());
             }
         });
     }

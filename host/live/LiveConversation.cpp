@@ -172,8 +172,10 @@ Scenario LiveConversation::read(const linux_::AssistantClient::Answer& answer) {
     assistantIsAway_ = !answer.hasBody();
     if (!answer.hasBody()) {
         failure_ = Failure{ExitCode::Failure, "the assistant cannot be asked: " + reasonOf(answer)};
-        scenario.sentence =
-            LocalizedText(host_.text(host_.live()->isSignedIn() ? "ANSWER_UNREACHABLE" : "ANSWER_SIGN_IN"));
+        const char* sentence = host_.live()->isSignedIn()   ? "ANSWER_UNREACHABLE"
+                               : host_.live()->isUnusable() ? "STATUS_UNREADABLE"
+                                                            : "ANSWER_SIGN_IN";
+        scenario.sentence = LocalizedText(host_.text(sentence));
         return scenario;
     }
     auto read = ScenarioReader(now(), ScenarioReader::Clock::Present).readText(answer.body, "the assistant's answer");
@@ -209,6 +211,7 @@ LiveStatus LiveConversation::status() const {
     LiveStatus::Facts facts;
     facts.ready = ready_;
     facts.signedIn = host_.live()->isSignedIn();
+    facts.unusable = host_.live()->isUnusable();
     facts.asking = askedAt_;
     facts.assistantIsAway = assistantIsAway_;
     facts.shown = shownAt_;

@@ -50,6 +50,8 @@ LiveServices::LiveServices(std::filesystem::path configurationFile)
 LiveServices::~LiveServices() {
     *alive_ = false;
     outdated_ = nullptr;
+    // The loop waits for its workers when it ends.
+    accounts_->giveUp();
     if (service_) {
         service_->setChanged(nullptr);
     }

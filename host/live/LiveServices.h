@@ -33,6 +33,8 @@ class LiveServices {
     const linux_::Configuration& configuration() const { return configuration_; }
     /// What was wrong with the configuration or the token at the last reading, in one line; empty when nothing was.
     std::string problem() const { return accounts_->problem(); }
+    /// The configuration itself is broken, and none from before stands in for it. The cause stands in the log.
+    bool isUnusable() const { return accounts_->isBroken() && !isSignedIn(); }
 
     /// Sets the members that lead to account, service and position. The platform's loop, clock and geodesy are set
     /// already. With `ownPositions` its location managers are left as they are. Called again for the platform that

@@ -46,6 +46,9 @@ LiveStatus LiveStatus::of(const Facts& facts, const Words& words) {
     if (!facts.ready) {
         return {};
     }
+    if (facts.unusable) {
+        return {Mark::Warning, words.text("STATUS_UNREADABLE")};
+    }
     if (!facts.signedIn || service.trouble == Trouble::SignedOut) {
         return {Mark::Warning, words.text("STATUS_SIGN_IN")};
     }

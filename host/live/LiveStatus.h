@@ -19,6 +19,7 @@ struct LiveStatus {
     struct Facts {
         bool ready = false;     ///< the account has been read
         bool signedIn = false;  ///< there is an account with a token
+        bool unusable = false;  ///< the configuration is broken
         /// Since when a question waits for its answer.
         std::optional<platform::Date> asking;
         /// The last question found no assistant.

@@ -5,17 +5,11 @@
 #include "linux/configuration/ConfigurationReader.h"
 #include "linux/configuration/SecretModule.h"
 #include "linux/configuration/TokenFile.h"
+#include "linux/device/Buses.h"
 #include "linux/device/LoadableModule.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
-
-namespace {
-
-/// Long enough for somebody to type a keyring's password.
-constexpr double kSecretSeconds = 60.0;
-
-}  // namespace
 
 class ConfiguredAccountStore::OwnerAccount : public platform::DeviceOwnerAccount {
   public:
@@ -45,29 +39,33 @@ ConfiguredAccountStore::ConfiguredAccountStore(const std::filesystem::path& conf
 
 ConfiguredAccountStore::~ConfiguredAccountStore() = default;
 
-std::optional<std::string> ConfiguredAccountStore::askSecretService(const std::string& person, const std::string& host,
+std::optional<std::string> ConfiguredAccountStore::askSecretService(const SecretQuestion& question,
                                                                     std::string& problem) {
     void* entry = LoadableModule::entry("libktr-secret.so", kSecretModuleEntry, problem);
     if (entry == nullptr) {
         return std::nullopt;
     }
     const std::unique_ptr<SecretModule> module(reinterpret_cast<SecretModuleEntry>(entry)());
-    return module ? module->lookUp(person, host, kSecretSeconds, problem) : std::nullopt;
+    return module ? module->lookUp(question.person, question.host, question.seconds, question.givesUp, problem)
+                  : std::nullopt;
 }
 
 std::optional<std::string> ConfiguredAccountStore::readToken(const Configuration::Account& account,
                                                              std::string& problem) const {
     std::string secretProblem;
+    const std::filesystem::path usual = file_.parent_path() / "token";
     if (!account.tokenFile && account.host) {
-        if (const auto secret = secrets_(account.personId, *account.host, secretProblem)) {
+        std::error_code failure;
+        const bool isFileThere = std::filesystem::exists(usual, failure);
+        const double seconds = isFileThere ? Buses::kSecretBesideAFile : Buses::kSecretAlone;
+        if (const auto secret = secrets_({account.personId, *account.host, seconds, givesUp_}, secretProblem)) {
             // Tools that read a secret from a pipe keep the line end that came with it.
             auto token = TokenFile::tokenIn(*secret);
             problem = token ? "" : "the Secret Service's secret is refused: expected one line of at most 16 KiB";
             return token;
         }
     }
-    const auto read =
-        TokenFile::read(account.tokenFile ? std::filesystem::path(*account.tokenFile) : file_.parent_path() / "token");
+    const auto read = TokenFile::read(account.tokenFile ? std::filesystem::path(*account.tokenFile) : usual);
     if (const auto* token = std::get_if<std::string>(&read)) {
         return *token;
     }
@@ -91,11 +89,12 @@ bool ConfiguredAccountStore::load() {
         account = std::make_shared<OwnerAccount>(*configuration->account, readToken(*configuration->account, problem));
     }
     if (!problem.empty()) {
-        platform::platformLog().write(platform::LogLevel::Error, "account: %@",
-                                      platform::FormatArgument(problem).shown());
+        platform::areaLog(platform::LogArea::Account)
+            .write(platform::LogLevel::Error, "%@", platform::FormatArgument(problem).shown());
     }
     const std::lock_guard<std::mutex> lock(mutex_);
     problem_ = problem;
+    isBroken_ = configuration == nullptr;
     if (configuration == nullptr) {
         return false;
     }
@@ -116,6 +115,11 @@ Configuration ConfiguredAccountStore::configuration() const {
 std::string ConfiguredAccountStore::problem() const {
     const std::lock_guard<std::mutex> lock(mutex_);
     return problem_;
+}
+
+bool ConfiguredAccountStore::isBroken() const {
+    const std::lock_guard<std::mutex> lock(mutex_);
+    return isBroken_;
 }
 
 std::filesystem::path ConfiguredAccountStore::tokenFile() const {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <atomic>
 #include <filesystem>
 #include <functional>
 #include <memory>
@@ -15,10 +16,16 @@ namespace ktr::linux_ {
 /// from memory; `load` reads the disk and asks the bus.
 class ConfiguredAccountStore : public platform::AccountStore {
   public:
-    /// The secret for a person and a host from the Secret Service; none when it holds none, with the reason in the text
-    /// if there is one. Any thread.
-    using Secrets =
-        std::function<std::optional<std::string>(const std::string& person, const std::string& host, std::string&)>;
+    /// What is asked of the Secret Service, and for how long.
+    struct SecretQuestion {
+        std::string person;
+        std::string host;
+        double seconds = 0.0;
+        const std::atomic<bool>& givesUp;  ///< nobody waits for the answer any more
+    };
+    /// The secret from the Secret Service; none when it holds none, with the reason in the text if there is one. Any
+    /// thread.
+    using Secrets = std::function<std::optional<std::string>(const SecretQuestion& question, std::string& problem)>;
 
     /// With the user's Secret Service, whose library is loaded when it is first asked.
     explicit ConfiguredAccountStore(const std::filesystem::path& configurationFile);
@@ -29,10 +36,14 @@ class ConfiguredAccountStore : public platform::AccountStore {
     /// it was. Logs what is wrong, and keeps it for `problem`. Any thread, but for a keyring's sake not the main thread
     /// once a window is open.
     bool load();
+    /// The program ends: what a `load` still waits for is not waited for any longer. Any thread.
+    void giveUp() { givesUp_ = true; }
     /// The configuration last read. Any thread.
     Configuration configuration() const;
     /// What was wrong at the last `load`, in one line; empty when nothing was. Any thread.
     std::string problem() const;
+    /// Whether the configuration itself could not be used at the last `load`, so that an earlier one counts. Any thread.
+    bool isBroken() const;
     std::filesystem::path configurationFile() const { return file_; }
     /// The file that a change of the token changes; empty when no file is asked.
     std::filesystem::path tokenFile() const;
@@ -42,15 +53,16 @@ class ConfiguredAccountStore : public platform::AccountStore {
   private:
     class OwnerAccount;
     std::optional<std::string> readToken(const Configuration::Account& account, std::string& problem) const;
-    static std::optional<std::string> askSecretService(const std::string& person, const std::string& host,
-                                                       std::string& problem);
+    static std::optional<std::string> askSecretService(const SecretQuestion& question, std::string& problem);
 
     const std::filesystem::path file_;
     const Secrets secrets_;
+    std::atomic<bool> givesUp_ = false;
     mutable std::mutex mutex_;
     Configuration configuration_;
     std::shared_ptr<OwnerAccount> account_;
     std::string problem_;
+    bool isBroken_ = false;
 };
 
 }  // namespace ktr::linux_

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <variant>
 
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -19,7 +19,8 @@ bool isFileName(const std::string& domain) {
 }
 
 void logFailure(const std::string& text) {
-    platform::platformLog().write(platform::LogLevel::Error, "preferences: %@", platform::FormatArgument(text).shown());
+    platform::areaLog(platform::LogArea::Preferences)
+        .write(platform::LogLevel::Error, "%@", platform::FormatArgument(text).shown());
 }
 
 }  // namespace

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <atomic>
 #include <optional>
 #include <string>
 
@@ -12,9 +13,10 @@ class SecretModule {
   public:
     virtual ~SecretModule() = default;
     /// The secret stored with the attributes application=ktr, person and host. None when there is none; then `error`
-    /// says why, or is empty when the service simply holds no such item. Gives up after `seconds`.
+    /// says why, or is empty when the service simply holds no such item. Gives up after `seconds`, and within a tenth
+    /// of one when `givesUp` becomes true.
     virtual std::optional<std::string> lookUp(const std::string& person, const std::string& host, double seconds,
-                                              std::string& error) const = 0;
+                                              const std::atomic<bool>& givesUp, std::string& error) const = 0;
 };
 
 /// The module's only symbol, of type `SecretModuleEntry`: makes the module's object; null when it cannot be made.

@@ -69,9 +69,11 @@ class PositionsTest(unittest.TestCase):
             env={**os.environ, "KTR_CONFIG": str(self.config), "XDG_STATE_HOME": str(self.folder / "state"), **environment},
             stdout=subprocess.PIPE, stderr=subprocess.PIPE, text=True, encoding="utf-8")
 
-    def told(self, program):
+    def told(self, program, complains_of=None):
         told, rest = program.communicate(timeout=60)
         self.assertEqual(program.returncode, 0, rest)
+        if complains_of:
+            self.assertIn(complains_of, rest)
         self.assertRegex(rest, r"was asked: \d+ answers, 0 failures\n$")
         return told
 
@@ -105,7 +107,7 @@ class PositionsTest(unittest.TestCase):
         self.assertIn(f"At Home, Ann Marsh, {DISTANCE} away", told)
 
     def test_no_track_there(self):
-        told = self.told(self.start({"source": "track", "file": "nowhere.gpx"}))
+        told = self.told(self.start({"source": "track", "file": "nowhere.gpx"}), complains_of="nowhere.gpx: there is no such file")
         self.assertIn("At Home, Ann Marsh, Located now", told)
 
     def test_geoclue_without_a_bus(self):

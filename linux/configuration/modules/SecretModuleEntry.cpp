@@ -1,6 +1,7 @@
 #include <libsecret/secret.h>
 
 #include <algorithm>
+#include <atomic>
 #include <chrono>
 #include <condition_variable>
 #include <exception>
@@ -32,14 +33,19 @@ const SecretSchema* schema() {
     return &kSchema;
 }
 
-/// Cancels a call that takes too long.
+/// Cancels a call that takes too long, or that nobody waits for any more.
 class Deadline {
   public:
-    Deadline(GCancellable* cancellable, double seconds)
-        : thread_([this, cancellable, seconds] {
+    Deadline(GCancellable* cancellable, double seconds, const std::atomic<bool>& givesUp)
+        : thread_([this, cancellable, seconds, &givesUp] {
+              constexpr std::chrono::milliseconds kLook(50);
+              const auto end = std::chrono::steady_clock::now() + std::chrono::duration<double>(seconds);
               std::unique_lock<std::mutex> lock(mutex_);
-              if (!wake_.wait_for(lock, std::chrono::duration<double>(seconds), [this] { return done_; })) {
-                  g_cancellable_cancel(cancellable);
+              while (!wake_.wait_for(lock, kLook, [this] { return done_; })) {
+                  if (givesUp || std::chrono::steady_clock::now() >= end) {
+                      g_cancellable_cancel(cancellable);
+                      return;
+                  }
               }
           }) {}
     ~Deadline() {
@@ -61,12 +67,12 @@ class Deadline {
 class LibSecretModule : public SecretModule {
   public:
     std::optional<std::string> lookUp(const std::string& person, const std::string& host, double seconds,
-                                      std::string& error) const override {
+                                      const std::atomic<bool>& givesUp, std::string& error) const override {
         GCancellable* cancellable = g_cancellable_new();
         GError* failure = nullptr;
         gchar* found = nullptr;
         try {
-            const Deadline deadline(cancellable, seconds);
+            const Deadline deadline(cancellable, seconds, givesUp);
             found = secret_password_lookup_sync(schema(), cancellable, &failure, "application", "ktr", "person",
                                                 person.c_str(), "host", host.c_str(), nullptr);
         } catch (const std::exception& problem) {

@@ -1,5 +1,6 @@
 #include "linux/configuration/ConfiguredAccountStore.h"
 
+#include "linux/device/Buses.h"
 #include "tests/support/PlatformTest.h"
 #include "tests/support/TemporaryFolder.h"
 
@@ -11,8 +12,9 @@ class ConfiguredAccountStoreTest : public PlatformTest {
   protected:
     ConfiguredAccountStore store() {
         return ConfiguredAccountStore(folder.path() / "config.json",
-                                      [this](const std::string& person, const std::string& host, std::string& problem) {
-                                          asked.push_back(person + " " + host);
+                                      [this](const auto& question, std::string& problem) {
+                                          asked.push_back(question.person + " " + question.host);
+                                          seconds = question.seconds;
                                           problem = secretProblem;
                                           return secret;
                                       });
@@ -30,6 +32,7 @@ class ConfiguredAccountStoreTest : public PlatformTest {
     std::optional<std::string> secret;
     std::string secretProblem;
     std::vector<std::string> asked;
+    double seconds = 0.0;
 };
 
 TEST_F(ConfiguredAccountStoreTest, NoFile_NobodyIsSignedIn) {
@@ -61,6 +64,17 @@ TEST_F(ConfiguredAccountStoreTest, SecretService_GoesBeforeTheFile) {
     EXPECT_EQ(account->tokenOfType(0), "from the keyring") << "what was handed out does not change";
 }
 
+TEST_F(ConfiguredAccountStoreTest, SecretService_IsWaitedForShortly_WhereAFileHasAToken) {
+    folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example"}})");
+    secret = "from the keyring";
+    store().load();
+    EXPECT_EQ(seconds, linux_::Buses::kSecretAlone);
+    folder.write("token", "from the file\n");
+    store().load();
+    EXPECT_EQ(seconds, linux_::Buses::kSecretBesideAFile);
+    EXPECT_LT(seconds, 5.0);
+}
+
 TEST_F(ConfiguredAccountStoreTest, SecretWithItsLineEnd_IsTheTokenWithout) {
     folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example"}})");
     secret = "s3cret\n";
@@ -77,7 +91,7 @@ TEST_F(ConfiguredAccountStoreTest, SecretThatNoHeaderCanHold_IsRefusedWithoutIts
     auto signedIn = store();
     EXPECT_TRUE(signedIn.load());
     EXPECT_EQ(signedIn.deviceOwnerAccount()->tokenOfType(0), std::nullopt);
-    EXPECT_EQ(onlyError(), "account: the Secret Service's secret is refused: expected one line of at most 16 KiB");
+    EXPECT_EQ(onlyError(), "the Secret Service's secret is refused: expected one line of at most 16 KiB");
 }
 
 TEST_F(ConfiguredAccountStoreTest, NamedTokenFile_IsTheOnlySource) {
@@ -88,7 +102,7 @@ TEST_F(ConfiguredAccountStoreTest, NamedTokenFile_IsTheOnlySource) {
     EXPECT_TRUE(asked.empty());
     EXPECT_EQ(signedIn.deviceOwnerAccount()->tokenOfType(0), std::nullopt);
     EXPECT_NE(signedIn.problem().find("mode 0644"), std::string::npos);
-    EXPECT_EQ(onlyError(), "account: " + signedIn.problem());
+    EXPECT_EQ(onlyError(), signedIn.problem());
 }
 
 TEST_F(ConfiguredAccountStoreTest, NoTokenAnywhere_SaysWhereItLooked) {

@@ -35,7 +35,7 @@ class SecretModuleTest : public ::testing::Test {
 TEST_F(SecretModuleTest, WithoutABus_AnError_WithAKeyring_TheToken) {
     qputenv("DBUS_SESSION_BUS_ADDRESS", "unix:path=/nonexistent/bus");
     std::string error;
-    EXPECT_EQ(module->lookUp("7", "f.example", 5.0, error), std::nullopt);
+    EXPECT_EQ(module->lookUp("7", "f.example", 5.0, false, error), std::nullopt);
     EXPECT_FALSE(error.empty());
 
     const TemporaryFolder home;
@@ -60,9 +60,9 @@ TEST_F(SecretModuleTest, WithoutABus_AnError_WithAKeyring_TheToken) {
     EXPECT_EQ(run(QStringLiteral("secret-tool"), store, "s3cret"), 0);
 
     error.clear();
-    EXPECT_EQ(module->lookUp("7", "f.example", 20.0, error), "s3cret");
+    EXPECT_EQ(module->lookUp("7", "f.example", 20.0, false, error), "s3cret");
     EXPECT_EQ(error, "");
-    EXPECT_EQ(module->lookUp("8", "f.example", 20.0, error), std::nullopt);
+    EXPECT_EQ(module->lookUp("8", "f.example", 20.0, false, error), std::nullopt);
     EXPECT_EQ(error, "") << "a missing item is no error";
     keyring.terminate();
     EXPECT_TRUE(keyring.waitForFinished(10000));
