@@ -3,10 +3,12 @@
 #include "linux/configuration/XdgFolders.h"
 #include "linux/maps/AttributedGround.h"
 #include "linux/maps/HttpsPictures.h"
+#include "linux/maps/MainlandArea.h"
 #include "linux/maps/MbtilesPictures.h"
 #include "linux/maps/PictureGround.h"
 #include "linux/maps/VectorGround.h"
 #include "linux/maps/WorldGround.h"
+#include "platform/base/Log.h"
 
 namespace ktr::linux_ {
 
@@ -40,9 +42,18 @@ void addSource(ThreadedMapSource::Grounds& grounds, const Configuration::Maps::S
 std::shared_ptr<ThreadedMapSource> ConfiguredMaps::make(const Configuration& configuration,
                                                         const std::filesystem::path& resourceFolder,
                                                         std::shared_ptr<platform::MainLoop> mainLoop) {
-    const auto datum = configuration.maps.datum == Configuration::Maps::Datum::Gcj02 ? platform::MapDatum::Gcj02
-                                                                                     : platform::MapDatum::Wgs84;
-    return std::make_shared<ThreadedMapSource>(std::move(mainLoop), grounds(configuration, resourceFolder), datum);
+    std::shared_ptr<const MainlandArea> gcj02;
+    if (configuration.maps.datum == Configuration::Maps::Datum::Gcj02) {
+        const auto file = resourceFolder / "maps" / "world.bin";
+        std::string reason;
+        if (const auto world = WorldMap::read(file, reason)) {
+            gcj02 = std::make_shared<MainlandArea>(world->outline());
+        } else {
+            platform::platformLog().line("The built-in map %@ cannot be used: %@", file.string(), reason);
+        }
+    }
+    return std::make_shared<ThreadedMapSource>(std::move(mainLoop), grounds(configuration, resourceFolder),
+                                               std::move(gcj02));
 }
 
 ThreadedMapSource::Grounds ConfiguredMaps::grounds(const Configuration& configuration,

@@ -279,8 +279,8 @@ void ThreadedMapSource::Core::deliver(const Job& job, const MapDrawer::Result& r
 }
 
 ThreadedMapSource::ThreadedMapSource(std::shared_ptr<platform::MainLoop> mainLoop, Grounds grounds,
-                                     platform::MapDatum datum)
-    : core_(std::make_shared<Core>(std::move(mainLoop), std::move(grounds))), datum_(datum) {
+                                     std::shared_ptr<const MainlandArea> gcj02)
+    : core_(std::make_shared<Core>(std::move(mainLoop), std::move(grounds))), gcj02_(std::move(gcj02)) {
     core_->listen();
 }
 

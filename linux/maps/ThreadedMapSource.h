@@ -3,6 +3,7 @@
 #include <memory>
 #include <vector>
 
+#include "linux/maps/MainlandArea.h"
 #include "linux/maps/MapGround.h"
 #include "platform/base/MainLoop.h"
 
@@ -14,15 +15,18 @@ class ThreadedMapSource final : public platform::MapPictureSource {
   public:
     using Grounds = std::vector<std::shared_ptr<MapGround>>;
 
-    /// Each ground fills in what those before it left; what the last one leaves shows plain land.
+    /// Each ground fills in what those before it left; what the last one leaves shows plain land. `gcj02`: where their
+    /// data is in that datum; none for nowhere.
     ThreadedMapSource(std::shared_ptr<platform::MainLoop> mainLoop, Grounds grounds,
-                      platform::MapDatum datum = platform::MapDatum::Wgs84);
+                      std::shared_ptr<const MainlandArea> gcj02 = nullptr);
     ~ThreadedMapSource() override;
 
     int requestPicture(const platform::MapPictureRequest& request, Completion completion) override;
     void cancel(int request) override;
     std::shared_ptr<void> observeChanges(std::function<void()> changed) override;
-    platform::MapDatum datum() const override { return datum_; }
+    bool isInGcj02(const platform::Coordinate& coordinate) const override {
+        return gcj02_ && gcj02_->contains(coordinate);
+    }
 
     /// Draws from these from now on, and tells the observers. Drawings under way are made anew.
     void setGrounds(Grounds grounds);
@@ -30,7 +34,7 @@ class ThreadedMapSource final : public platform::MapPictureSource {
   private:
     class Core;
     std::shared_ptr<Core> core_;
-    platform::MapDatum datum_;
+    std::shared_ptr<const MainlandArea> gcj02_;
 };
 
 }  // namespace ktr::linux_

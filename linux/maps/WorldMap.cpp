@@ -10,7 +10,7 @@ namespace ktr::linux_ {
 
 namespace {
 
-constexpr unsigned char kMagic[] = {'K', 'T', 'R', 'W', 'O', 'R', 'L', 'D', 1};
+constexpr unsigned char kMagic[] = {'K', 'T', 'R', 'W', 'O', 'R', 'L', 'D', 2};
 constexpr std::size_t kHeader = sizeof(kMagic) + 4;
 constexpr std::size_t kMostBytes = std::size_t{16} << 20;
 constexpr int kPlaceBits = 22;
@@ -84,6 +84,14 @@ class WorldMap::Reader {
         return made;
     }
 
+    std::vector<Line> lines(int bits) {
+        std::vector<Line> made;
+        for (std::size_t left = count(); left > 0 && good_; --left) {
+            made.push_back(line(bits));
+        }
+        return made;
+    }
+
   private:
     static void finish(Line& line) {
         const std::size_t points = line.points.size();
@@ -152,11 +160,8 @@ std::shared_ptr<const WorldMap> WorldMap::parse(const std::vector<unsigned char>
         Level& level = map->levels_.emplace_back();
         level.zoom = reader.zoom();
         const int bits = static_cast<int>(reader.number(kPlaceBits));
-        for (auto* lines : {&level.shores, &level.borders}) {
-            for (std::size_t count = reader.count(); count > 0 && reader.isGood(); --count) {
-                lines->push_back(reader.line(bits));
-            }
-        }
+        level.shores = reader.lines(bits);
+        level.borders = reader.lines(bits);
     }
     for (std::size_t count = reader.count(); count > 0 && reader.isGood(); --count) {
         Country& country = map->countries_.emplace_back();
@@ -172,6 +177,10 @@ std::shared_ptr<const WorldMap> WorldMap::parse(const std::vector<unsigned char>
         town.isCapital = reader.number(1) == 1;
         town.name = reader.text();
         town.zone = reader.text();
+    }
+    Outline& outline = map->outline_;
+    for (auto* lines : {&outline.coasts, &outline.borders, &outline.cityBorders, &outline.foreignShores}) {
+        *lines = reader.lines(kPlaceBits);
     }
     if (!reader.isAtEnd() || map->levels_.empty()) {
         return nullptr;

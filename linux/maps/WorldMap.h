@@ -43,6 +43,15 @@ class WorldMap {
         std::string zone;  ///< the time zone that bears its name; may be empty
     };
 
+    /// Mainland China, for the datum that is in use there alone. All lines are open; the first three together are its
+    /// outline.
+    struct Outline {
+        std::vector<Line> coasts;
+        std::vector<Line> borders;
+        std::vector<Line> cityBorders;    ///< with Hong Kong and Macau
+        std::vector<Line> foreignShores;  ///< of others, near its coasts
+    };
+
     /// None, and a reason, when the file cannot be read or is damaged.
     static std::shared_ptr<const WorldMap> read(const std::filesystem::path& file, std::string& reason);
     static std::shared_ptr<const WorldMap> parse(const std::vector<unsigned char>& data, std::string& reason);
@@ -51,12 +60,14 @@ class WorldMap {
     const std::vector<Level>& levels() const { return levels_; }
     const std::vector<Country>& countries() const { return countries_; }
     const std::vector<Town>& towns() const { return towns_; }
+    const Outline& outline() const { return outline_; }
 
   private:
     class Reader;
     std::vector<Level> levels_;
     std::vector<Country> countries_;
     std::vector<Town> towns_;
+    Outline outline_;
 };
 
 }  // namespace ktr::linux_

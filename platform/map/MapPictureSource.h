@@ -6,7 +6,6 @@
 #include <vector>
 
 #include "platform/base/Geometry.h"
-#include "platform/map/LocationShifter.h"
 #include "platform/map/MapViewport.h"
 #include "platform/ui/Image.h"
 
@@ -45,8 +44,9 @@ class KTR_API MapPictureSource {
     /// Called on the main thread whenever pictures drawn earlier would now look different (a tile has arrived, the
     /// configuration names another source). Several may listen; the connection ends when the returned token goes.
     virtual std::shared_ptr<void> observeChanges(std::function<void()> changed) = 0;
-    /// In which datum the data is; coordinates of requests are in it, too.
-    virtual MapDatum datum() const { return MapDatum::Wgs84; }
+    /// Whether the data has this valid WGS84 coordinate in GCJ-02, the datum that maps of mainland China must use:
+    /// places are offset by some hundred metres. Coordinates of requests are in the data's datum, too.
+    virtual bool isInGcj02(const Coordinate& /*coordinate*/) const { return false; }
 };
 
 }  // namespace ktr::platform

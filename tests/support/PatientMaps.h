@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <map>
 #include <memory>
 #include <vector>
@@ -20,7 +21,7 @@ struct PatientMaps : platform::MapPictureSource {
     std::map<int, Waiting> waiting;
     std::vector<std::weak_ptr<std::function<void()>>> observers;
     std::string attribution = "Somebody";
-    platform::MapDatum mapDatum = platform::MapDatum::Wgs84;
+    std::function<bool(const platform::Coordinate&)> isShifted;
 
     int requestPicture(const platform::MapPictureRequest& request, Completion completion) override {
         requests.push_back(request);
@@ -38,7 +39,7 @@ struct PatientMaps : platform::MapPictureSource {
         observers.push_back(token);
         return token;
     }
-    platform::MapDatum datum() const override { return mapDatum; }
+    bool isInGcj02(const platform::Coordinate& coordinate) const override { return isShifted && isShifted(coordinate); }
 
     /// Answers all that wait; the picture of the last one.
     std::shared_ptr<FakeImage> answer() {

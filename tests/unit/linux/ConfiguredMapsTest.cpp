@@ -194,10 +194,16 @@ TEST_F(ConfiguredMapsTest, TheConfiguredAttribution_IsShown) {
 }
 
 TEST_F(ConfiguredMapsTest, Datum_IsTheConfigured) {
+    constexpr platform::Coordinate kBeijing{39.9, 116.4};
     Configuration configuration;
-    EXPECT_EQ(ConfiguredMaps::make(configuration, KTR_RESOURCES, time)->datum(), platform::MapDatum::Wgs84);
+    EXPECT_FALSE(ConfiguredMaps::make(configuration, KTR_RESOURCES, time)->isInGcj02(kBeijing));
     configuration.maps.datum = Configuration::Maps::Datum::Gcj02;
-    EXPECT_EQ(ConfiguredMaps::make(configuration, KTR_RESOURCES, time)->datum(), platform::MapDatum::Gcj02);
+    const auto maps = ConfiguredMaps::make(configuration, KTR_RESOURCES, time);
+    EXPECT_TRUE(maps->isInGcj02(kBeijing));
+    EXPECT_FALSE(maps->isInGcj02({22.28, 114.16}));
+    EXPECT_FALSE(ConfiguredMaps::make(configuration, "/nowhere", time)->isInGcj02(kBeijing));
+    EXPECT_TRUE(log->has(platform::LogLevel::Default,
+                         "The built-in map /nowhere/maps/world.bin cannot be used: it cannot be read"));
 }
 
 }  // namespace ktr::linux_
