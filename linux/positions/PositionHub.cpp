@@ -1,8 +1,8 @@
 #include "linux/positions/PositionHub.h"
 
 #include <algorithm>
-#include <cmath>
 
+#include "linux/positions/FixPolicy.h"
 #include "linux/positions/SourceLocationManager.h"
 
 namespace ktr::linux_ {
@@ -50,10 +50,11 @@ void PositionHub::retune() {
 }
 
 void PositionHub::receive(const platform::PlatformLocation::Fix& fix) {
-    if (!platform::isValid(fix.coordinate) || std::isnan(fix.horizontalAccuracy)) {
+    const auto checked = FixPolicy::checked(fix);
+    if (!checked) {
         return;
     }
-    newest_ = std::make_shared<platform::PlatformLocation>(fix);
+    newest_ = std::make_shared<platform::PlatformLocation>(*checked);
     // A delegate may stop its manager, or make another one.
     const auto told = managers_;
     const auto position = newest_;

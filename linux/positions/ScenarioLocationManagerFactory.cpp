@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "linux/positions/FixPolicy.h"
+
 namespace ktr::linux_ {
 
 ScenarioLocationManagerFactory::ScenarioLocationManagerFactory(std::vector<TimedPosition> positions,
@@ -9,6 +11,11 @@ ScenarioLocationManagerFactory::ScenarioLocationManagerFactory(std::vector<Timed
                                                                std::shared_ptr<platform::Clock> clock,
                                                                std::shared_ptr<platform::Geodesy> geodesy) {
     const platform::Date start = clock->now();
+    std::erase_if(positions, [](TimedPosition& position) {
+        const auto checked = FixPolicy::checked(position.fix);
+        position.fix = checked.value_or(position.fix);
+        return !checked;
+    });
     for (TimedPosition& position : positions) {
         if (!position.fix.timestamp) {
             position.fix.timestamp = platform::Date{start.secondsSinceReferenceDate + std::max(position.seconds, 0.0)};

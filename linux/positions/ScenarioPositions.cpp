@@ -2,6 +2,8 @@
 
 #include <limits>
 
+#include "linux/positions/FixPolicy.h"
+
 namespace ktr::linux_ {
 
 namespace {
@@ -23,7 +25,7 @@ std::vector<ScenarioPosition> readScenarioPositions(documents::FieldReader& scen
         ScenarioPosition position;
         position.at = entry.number("at", 0.0, kNoLimit).value_or(0.0);
         position.coordinate = {needed(entry, "latitude", 90.0), needed(entry, "longitude", 180.0)};
-        position.accuracy = entry.number("accuracy", 0.0, kNoLimit).value_or(position.accuracy);
+        position.accuracy = entry.number("accuracy", 0.0, FixPolicy::kMostAccuracy).value_or(position.accuracy);
         if (!positions.empty() && position.at < positions.back().at) {
             entry.complain("at", "expected the positions in the order of their time");
         }

@@ -42,6 +42,20 @@ class SourceLocationManagerTest : public PlatformTest {
     std::unique_ptr<linux_::SourceLocationManagerFactory> factory;
 };
 
+TEST_F(SourceLocationManagerTest, WhatIsNoPosition_IsHandedToNobody) {
+    auto manager = factory->makeManager(nullptr);
+    const auto listener = std::make_shared<Listener>();
+    manager->setDelegate(listener);
+    manager->startUpdatingLocation();
+    for (const double accuracy : {-1.0, 1e300, std::nan("")}) {
+        source->put(50.0, accuracy);
+    }
+    EXPECT_TRUE(listener->latitudes.empty());
+    EXPECT_EQ(manager->location(), nullptr);
+    source->put(51.0);
+    EXPECT_EQ(listener->latitudes, std::vector<double>{51.0});
+}
+
 TEST_F(SourceLocationManagerTest, Source_RunsWhileAnybodyWantsIt_AtTheBestAccuracy) {
     auto one = factory->makeManager(nullptr);
     auto other = factory->makeManager(nullptr);
