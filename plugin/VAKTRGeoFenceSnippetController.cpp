@@ -27,7 +27,7 @@ bool VAKTRGeoFenceSnippetController::initWithCueObject(const std::shared_ptr<pla
     }
     if (const auto& context = contextDict()) {
         zoomLevel_ = context->find("geoFenceZoomLevel") != nullptr
-                         ? static_cast<double>(static_cast<float>(ContextValues::number(*context, "geoFenceZoomLevel")))
+                         ? static_cast<double>(ContextValues::singleNumber(*context, "geoFenceZoomLevel"))
                          : kUsualZoom;
     }
     return true;

@@ -39,7 +39,7 @@ bool VAKTRLocationSnippetController::initWithCueObject(const std::shared_ptr<pla
     if (const auto& context = contextDict()) {
         displayShowAllRow_ = ContextValues::boolean(*context, "incomplete");
         zoomLevel_ = context->find("zoomLevel") != nullptr
-                         ? static_cast<double>(static_cast<float>(ContextValues::number(*context, "zoomLevel")))
+                         ? static_cast<double>(ContextValues::singleNumber(*context, "zoomLevel"))
                          : kUsualZoom;
     }
     return true;

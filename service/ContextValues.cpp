@@ -29,9 +29,10 @@ double takeSign(std::string_view& text) {
     return sign;
 }
 
-/// What stands for a number that no double can hold, which is either too great or too near to 0: its order of magnitude
-/// tells.
-double nearestToOutOfRange(std::string_view number) {
+/// What stands for a number that no double or float can hold, which is either too great or too near to 0: its order of
+/// magnitude tells.
+template <typename Number>
+Number nearestToOutOfRange(std::string_view number) {
     const auto end = std::min(number.find_first_of("eE"), number.size());
     const std::string_view mantissa = number.substr(0, end);
     std::string_view exponentText = number.substr(std::min(end + 1, number.size()));
@@ -44,21 +45,22 @@ double nearestToOutOfRange(std::string_view number) {
     const auto point = std::min(mantissa.find('.'), mantissa.size());
     const auto first = std::min(mantissa.find_first_not_of("0."), mantissa.size());
     const double order = static_cast<double>(point) - static_cast<double>(first);
-    return order + sign * static_cast<double>(exponent) > 0.0 ? std::numeric_limits<double>::max() : 0.0;
+    return order + sign * static_cast<double>(exponent) > 0.0 ? std::numeric_limits<Number>::max() : Number{0};
 }
 
-double leadingNumber(std::string_view text) {
+template <typename Number>
+Number leadingNumber(std::string_view text) {
     text = withoutLeadingBlanks(text);
-    const double sign = takeSign(text);
+    const auto sign = static_cast<Number>(takeSign(text));
     // "inf" and "nan" are no decimal numbers.
     const bool begins = !text.empty() && (isDigit(text[0]) || (text[0] == '.' && text.size() > 1 && isDigit(text[1])));
     if (!begins) {
-        return 0.0;
+        return Number{0};
     }
-    double number = 0.0;
+    Number number{0};
     const auto result = std::from_chars(text.data(), text.data() + text.size(), number, std::chars_format::general);
     if (result.ec == std::errc::result_out_of_range) {
-        number = nearestToOutOfRange(text.substr(0, static_cast<std::size_t>(result.ptr - text.data())));
+        number = nearestToOutOfRange<Number>(text.substr(0, static_cast<std::size_t>(result.ptr - text.data())));
     }
     return sign * number;
 }
@@ -79,9 +81,18 @@ double ContextValues::number(const platform::Dictionary& dictionary, std::string
         return 0.0;
     }
     if (const std::string* text = value->string()) {
-        return leadingNumber(*text);
+        return leadingNumber<double>(*text);
     }
     return value->number().value_or(value->boolean().value_or(false) ? 1.0 : 0.0);
+}
+
+float ContextValues::singleNumber(const platform::Dictionary& dictionary, std::string_view key) {
+    const platform::Value* value = dictionary.find(key);
+    if (const std::string* text = value != nullptr ? value->string() : nullptr) {
+        return leadingNumber<float>(*text);
+    }
+    constexpr double kMost = std::numeric_limits<float>::max();
+    return static_cast<float>(std::clamp(number(dictionary, key), -kMost, kMost));
 }
 
 bool ContextValues::boolean(const platform::Dictionary& dictionary, std::string_view key) {

@@ -14,6 +14,8 @@ class ContextValues {
     /// A number as it is, or the decimal number that a string begins with (blanks before it are skipped; beyond the
     /// range of a double: the nearest finite one); else 0.
     static double number(const platform::Dictionary& dictionary, std::string_view key);
+    /// The same in single precision: rounded once, not from a double.
+    static float singleNumber(const platform::Dictionary& dictionary, std::string_view key);
     /// Whether a number is not 0, or a string's first character after blanks, a sign and zeros is one of YyTt1-9; else
     /// false.
     static bool boolean(const platform::Dictionary& dictionary, std::string_view key);

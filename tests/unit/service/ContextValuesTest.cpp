@@ -28,6 +28,22 @@ TEST(ContextValuesTest, AMissingKeyReadsAsZeroFalseAndNone) {
     EXPECT_EQ(ContextValues::text({}, "k"), std::nullopt);
 }
 
+TEST(ContextValuesTest, SingleNumber_IsRoundedOnceAndNeverBeyondItsRange) {
+    const auto single = [](const Value& value) { return ContextValues::singleNumber(Dictionary{{"k", value}}, "k"); };
+    EXPECT_EQ(ContextValues::singleNumber({}, "k"), 0.0F);
+    EXPECT_EQ(single("0.2"), 0.2F);
+    EXPECT_EQ(single(" -0.2 degrees"), -0.2F);
+    EXPECT_EQ(single("far"), 0.0F);
+    EXPECT_EQ(single(3), 3.0F);
+    // Just above the middle between two floats, by less than a double can tell: through a double it would end below.
+    EXPECT_EQ(single("1.00000005960464477539062500000001"), 1.00000011920928955078F);
+    constexpr float kMost = std::numeric_limits<float>::max();
+    EXPECT_EQ(single("1e39"), kMost);
+    EXPECT_EQ(single("-1e300"), -kMost);
+    EXPECT_EQ(single("1e-300"), 0.0F);
+    EXPECT_EQ(single(1e300), kMost);
+}
+
 TEST(ContextValuesTest, NumberIsTakenAsItIs) {
     EXPECT_EQ(numberOf(2500), 2500.0);
     EXPECT_EQ(numberOf(-3), -3.0);
