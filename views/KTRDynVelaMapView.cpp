@@ -107,7 +107,7 @@ void KTRDynVelaMapView::setLocation(std::shared_ptr<KTRVALocation> location) {
     const auto position =
         locationAt(place ? place->latitude.value_or(0.0) : 0.0, place ? place->longitude.value_or(0.0) : 0.0);
     const unsigned shift = ++shifts_;
-    locationShifter_->shiftLocation(position, [target = platform::weak(this), place, shift](const Coordinate& shifted) {
+    const auto show = [target = platform::weak(this), place, shift](const Coordinate& shifted) {
         const auto self = target.lock();
         if (!self || self->shifts_ != shift || !Platform::installed()) {
             return;
@@ -118,7 +118,12 @@ void KTRDynVelaMapView::setLocation(std::shared_ptr<KTRVALocation> location) {
             copy->longitude = shifted.longitude;
         }
         self->updateMapWithLocation(copy);
-    });
+    };
+    if (locationShifter_) {
+        locationShifter_->shiftLocation(position, show);
+    } else {
+        show(position->coordinate());
+    }
 }
 
 void KTRDynVelaMapView::setGeoFence(std::shared_ptr<platform::VAKtrGeoFence> geoFence) {
@@ -136,6 +141,9 @@ std::shared_ptr<KTRVAMapAnnotation> KTRDynVelaMapView::mapAnnotation() {
 }
 
 void KTRDynVelaMapView::updateMapWithLocation(const std::shared_ptr<VALocation>& location) {
+    if (!mapView_) {
+        return;
+    }
     if (!mapView_->delegate()) {
         mapView_->setDelegate(KTRVAMapDelegate::sharedInstance());
     }
@@ -260,6 +268,9 @@ void KTRDynVelaMapView::updateFenceMap() {
     const double radius = singlePrecision(place ? place->accuracy : std::nullopt);
     const auto annotation = mapAnnotation();
     annotation->setLocation(place);
+    if (!mapView_) {
+        return;
+    }
     mapView_->removeOverlays(mapView_->overlays());
     mapView_->removeAnnotations(mapView_->annotations());
     mapView_->addAnnotation(annotation);
@@ -289,7 +300,7 @@ std::string KTRDynVelaMapView::accessibilityText() const {
     const auto tracker = currentLocationDelegate();
     const auto user = tracker ? tracker->currentLocation() : nullptr;
     // Without a delegate of its own (a fence has none) the map still knows where it shows the user.
-    const auto shown = user ? user : mapView_->userLocation()->location();
+    const auto shown = user || !mapView_ ? user : mapView_->userLocation()->location();
     if (isVisibilityMap_) {
         return MapSentences::ofUser(shown);
     }

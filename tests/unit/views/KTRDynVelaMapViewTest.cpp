@@ -57,6 +57,24 @@ TEST_F(KTRDynVelaMapViewTest, Made_IsAMapThatNobodyMoves) {
     EXPECT_EQ(map->accessibilityRole(), AccessibilityRole::Link);
 }
 
+TEST_F(KTRDynVelaMapViewTest, WithoutMapOrShifter_EverythingIsStillAnswered) {
+    const auto map = makeMap();
+    map->setLocationShifter(nullptr);
+    show(*map, ann());
+    EXPECT_EQ(map->mapAnnotation()->coordinate(), kAnn);
+    map->setMapView(nullptr);
+    map->setMapAnnotation(nullptr);
+    map->setLocation(nullptr);
+    map->setGeoFence(nullptr);
+    map->updateMapWithLocation(nullptr);
+    map->runMapRegionAfterDelay();
+    for (const bool isVisibility : {false, true}) {
+        map->setIsVisibilityMap(isVisibility);
+        EXPECT_NO_FATAL_FAILURE(map->accessibilityText());
+    }
+    EXPECT_EQ(map->urlForTouch(), Url("wayloc://friend/(null)"));
+}
+
 TEST_F(KTRDynVelaMapViewTest, Made_SettlesHowAllPinsLook) {
     KTAnnotationView::setLargeAnnotationBorderVisible(true);
     KTAnnotationView::setLayerMaskingEnabled(false);
