@@ -11,8 +11,9 @@
 namespace ktr::tiles {
 
 /// A file of map tiles (MBTiles 1.3, an SQLite database), read only and trusted in nothing: what it defines beyond
-/// tables and joins of them is refused, and a question that takes too long or too much memory is given up. Neither the
-/// file nor anything beside it is written. One thread at a time.
+/// tables and joins of them is refused, and a question that takes more than a second of computing, ten of waiting, or
+/// too much memory is given up: such a file answers none after that. Neither the file nor anything beside it is
+/// written. One thread at a time.
 class MbtilesFile {
   public:
     /// A stored tile is at most this large; bytes.

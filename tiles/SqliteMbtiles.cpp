@@ -3,9 +3,12 @@
 #include <sqlite3.h>
 
 #include <array>
+#include <chrono>
 #include <cstddef>
 #include <string_view>
 #include <utility>
+
+#include "documents/ComputingTime.h"
 
 namespace ktr::tiles {
 
@@ -13,9 +16,11 @@ namespace {
 
 /// Milliseconds to wait for somebody who writes.
 constexpr int kBusyWait = 250;
-/// Steps of SQLite's machine for one question: a look-up takes a dozen, a file without an index a few for each tile.
-constexpr long kMostSteps = 4'000'000;
-constexpr int kStepsBetweenLooks = 64;
+/// Time for one question, computed (a look-up takes a millisecond, a file without an index a few hundred) and by the
+/// clock (a disk may have to wake up). A single step may copy or compare megabytes, so that their number says little.
+constexpr std::chrono::seconds kMostComputing(1);
+constexpr std::chrono::seconds kMostTime(10);
+constexpr int kStepsBetweenLooks = 16;
 /// What one question may add to SQLite's memory; bytes.
 constexpr sqlite3_int64 kMostMemory = 48LL << 20;
 constexpr std::size_t kMostMetadataRows = 256;
@@ -38,17 +43,25 @@ int authorize(void* /*unused*/, int action, const char* /*first*/, const char* /
 
 /// What a question has used so far.
 struct Budget {
-    long steps = 0;
+    std::chrono::nanoseconds computed{};
+    std::chrono::steady_clock::time_point begun;
     sqlite3_int64 memory = 0;
+    /// A question was given up: whoever wrote the file knows more of that kind. It is asked nothing any more.
+    bool isExceeded = false;
 
     static int look(void* self) {
         auto* budget = static_cast<Budget*>(self);
-        budget->steps += kStepsBetweenLooks;
-        return budget->steps > kMostSteps || sqlite3_memory_used() - budget->memory > kMostMemory ? 1 : 0;
+        budget->isExceeded = budget->isExceeded || documents::computingTime() - budget->computed > kMostComputing ||
+                             std::chrono::steady_clock::now() - budget->begun > kMostTime ||
+                             sqlite3_memory_used() - budget->memory > kMostMemory;
+        return budget->isExceeded ? 1 : 0;
     }
-    void begin() {
-        steps = 0;
+    /// False when there is nothing left to begin with.
+    bool begin() {
+        computed = documents::computingTime();
+        begun = std::chrono::steady_clock::now();
         memory = sqlite3_memory_used();
+        return !isExceeded;
     }
 };
 
@@ -106,7 +119,9 @@ void OpenMbtiles::harden() {
 }
 
 Statement OpenMbtiles::prepare(const std::string& query) {
-    budget_.begin();
+    if (!budget_.begin()) {
+        return nullptr;
+    }
     sqlite3_stmt* statement = nullptr;
     sqlite3_prepare_v2(database_.get(), query.c_str(), static_cast<int>(query.size()), &statement, nullptr);
     return Statement(statement);
@@ -192,10 +207,9 @@ std::optional<int> OpenMbtiles::levelBy(const std::string& order) {
 }
 
 std::optional<platform::Bytes> OpenMbtiles::tile(const TileKey& key) {
-    if (key.z < 0 || key.z > 30) {
+    if (key.z < 0 || key.z > 30 || !budget_.begin()) {
         return std::nullopt;
     }
-    budget_.begin();
     sqlite3_stmt* statement = tile_.get();
     sqlite3_bind_int(statement, 1, key.z);
     sqlite3_bind_int(statement, 2, key.x);

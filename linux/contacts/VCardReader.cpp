@@ -10,7 +10,7 @@
 #include <QByteArray>
 #include <QImage>
 
-#include "linux/device/ComputingTime.h"
+#include "documents/ComputingTime.h"
 #include "linux/device/LoadableModule.h"
 #include "linux/paint/ImageDecoder.h"
 #include "platform/base/Utf8.h"
@@ -113,11 +113,11 @@ class VCardReader::Reading {
         if (image.size() <= kLargestThumbnail) {
             return image;
         }
-        const auto before = computingTime();
+        const auto before = documents::computingTime();
         const auto decoded = ImageDecoder::decode(
             image, kThumbnailSide, std::min<std::chrono::nanoseconds>(timeLeft_, ImageDecoder::kMostTime));
         auto thumbnail = decoded ? encoded(decoded->pixels) : std::nullopt;
-        timeLeft_ -= computingTime() - before;
+        timeLeft_ -= documents::computingTime() - before;
         return thumbnail;
     }
 

@@ -6,7 +6,7 @@
 #include <algorithm>
 #include <cstring>
 
-#include "linux/device/ComputingTime.h"
+#include "documents/ComputingTime.h"
 
 namespace ktr::linux_ {
 
@@ -16,7 +16,7 @@ namespace {
 class TimedData final : public QIODevice {
   public:
     TimedData(const platform::Bytes& data, std::chrono::nanoseconds time)
-        : data_(data), deadline_(computingTime() + time) {
+        : data_(data), deadline_(documents::computingTime() + time) {
         open(QIODevice::ReadOnly);
     }
 
@@ -25,7 +25,7 @@ class TimedData final : public QIODevice {
 
   protected:
     qint64 readData(char* to, qint64 most) override {
-        isLate_ = isLate_ || computingTime() >= deadline_;
+        isLate_ = isLate_ || documents::computingTime() >= deadline_;
         if (isLate_) {
             return -1;
         }

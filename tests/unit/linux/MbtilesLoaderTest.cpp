@@ -3,6 +3,7 @@
 #include <QDir>
 #include <QFile>
 #include <QTemporaryDir>
+#include <chrono>
 
 #include "tests/support/PlatformTest.h"
 #include "tests/support/maps/MbtilesWriter.h"
@@ -196,6 +197,30 @@ TEST_F(MbtilesLoaderTest, EndlessJoin_IsGivenUp) {
     EXPECT_EQ(file->tile({5, 4, 200}), std::nullopt);
     EXPECT_EQ(file->finestLevel(), std::nullopt);
     EXPECT_LT(sqlite3_memory_highwater(0) - before, 80LL << 20);
+}
+
+TEST_F(MbtilesLoaderTest, FewStepsOfMegabytesEach_AreGivenUpByTheClock) {
+    {
+        test::MbtilesWriter writer(path());
+        writer.run("CREATE TABLE n (i INTEGER, b BLOB)");
+        writer.run("BEGIN");
+        for (int row = 0; row < 10; ++row) {
+            writer.run("INSERT INTO n VALUES (" + std::to_string(row) + ", zeroblob(2000000))");
+        }
+        writer.run("COMMIT");
+        writer.run(
+            "CREATE VIEW tiles AS SELECT a.i AS zoom_level, b.i AS tile_column, c.i AS tile_row, d.b AS tile_data"
+            " FROM n a, n b, n c, n d, n e, n f WHERE a.b || b.b < c.b || d.b OR e.b || a.b < f.b || c.b");
+    }
+    const auto began = std::chrono::steady_clock::now();
+    const auto file = open();
+    ASSERT_NE(file, nullptr) << error;
+    for (int x = 0; x < 400; ++x) {
+        EXPECT_EQ(file->tile({9, x, 511}), std::nullopt);
+    }
+    EXPECT_EQ(file->finestLevel(), std::nullopt);
+    // One second of looking, however many tiles; the rest is a busy machine's.
+    EXPECT_LT(std::chrono::steady_clock::now() - began, std::chrono::seconds(15));
 }
 
 TEST_F(MbtilesLoaderTest, OddRows_AreNoTiles) {

@@ -2,8 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include "documents/ComputingTime.h"
 #include "linux/contacts/VCardReader.h"
-#include "linux/device/ComputingTime.h"
 
 namespace ktr::linux_ {
 
@@ -72,13 +72,13 @@ TEST(VCardTextTest, HostileCards_AreReadInLinearTime) {
         card("FN:Ann\r\n" + grouped),
         card("FN:Ann\r\nFN" + std::string(1'000'000, ' ') + "\r\n" + repeated(" \r\n", 300'000)),
     };
-    const auto before = computingTime();
+    const auto before = documents::computingTime();
     for (const std::string& text : texts) {
         const auto result = VCardReader().readText(text, "people.vcf");
         ASSERT_EQ(result.contacts.size(), 1U);
         EXPECT_EQ(result.contacts[0]->storedFullName, "Ann");
     }
-    EXPECT_LT(computingTime() - before, kLinear);
+    EXPECT_LT(documents::computingTime() - before, kLinear);
 }
 
 }  // namespace ktr::linux_
