@@ -16,6 +16,7 @@
 #include "linux/device/QtMainLoop.h"
 #include "linux/device/StderrLogSink.h"
 #include "linux/device/SystemClock.h"
+#include "linux/locale/HomeCountry.h"
 #include "linux/locale/IcuDistanceCalculatorFactory.h"
 #include "linux/locale/IcuLengthFormatter.h"
 #include "linux/locale/IcuNumberFormatter.h"
@@ -57,8 +58,8 @@ std::vector<linux_::TimedPosition> walkOf(const std::vector<ScenarioPosition>& p
 /// The contacts of all paths in one store; none, and the reason in `error`, when one cannot be read.
 std::shared_ptr<platform::ContactStore> readContacts(const HostSettings& settings,
                                                      const std::shared_ptr<linux_::PhonenumberLibrary>& phoneNumbers,
-                                                     platform::LogSink& log, std::string& error) {
-    const std::string country = settings.country.value_or("");
+                                                     const std::string& country, platform::LogSink& log,
+                                                     std::string& error) {
     platform::ContactStore::Contacts all;
     for (const std::string& path : settings.contacts) {
         const auto loaded = linux_::VCardContactStore::load(path, phoneNumbers, country, log);
@@ -163,7 +164,9 @@ std::optional<Failure> Environment::fill(Platform& platform, const HostSettings&
     std::string error;
     platform.localization = readTexts(settings, error);
     if (error.empty()) {
-        platform.contactStore = readContacts(settings, phoneNumbers, *platform.logSink, error);
+        platform.contactStore =
+            readContacts(settings, phoneNumbers, linux_::HomeCountry::of(*platform.telephony, *platform.region),
+                         *platform.logSink, error);
     }
     if (!error.empty()) {
         return Failure{ExitCode::Failure, error};

@@ -7,8 +7,7 @@
 #include <string_view>
 #include <utility>
 
-#include <unicode/uchar.h>
-
+#include "linux/contacts/PhoneText.h"
 #include "platform/base/Utf8.h"
 
 namespace ktr::linux_ {
@@ -18,46 +17,10 @@ namespace {
 /// Numbers that are the same share at least this many digits at their end.
 constexpr std::size_t kSharedDigits = 6;
 
-/// The number without what follows an extension mark: "... ext. 12", "... x12", "...;ext=12", "...#12".
-std::string_view withoutExtension(std::string_view number) {
-    const auto mark = number.find_last_of("xX#;,");
-    if (mark == std::string_view::npos || mark == 0) {
-        return number;
-    }
-    const auto semicolon = number.find(';');
-    if (semicolon != std::string_view::npos) {
-        return number.substr(0, semicolon);
-    }
-    const std::string lower = platform::asciiLowercased(number);
-    const auto word = lower.find("ext");
-    return number.substr(0, word == std::string::npos ? mark : word);
-}
-
-/// Decimal digits of every script as ASCII, letters as the keypad's digits, all else dropped.
-std::string digitsOf(std::string_view number) {
-    constexpr std::string_view keypad = "22233344455566677778889999";
-    std::string out;
-    for (std::size_t at = 0; at < number.size();) {
-        const auto step = platform::decodeUtf8(number, at);
-        at += step.length;
-        const auto c = static_cast<UChar32>(step.codePoint);
-        if (const int digit = u_charDigitValue(c); digit >= 0) {
-            out += static_cast<char>('0' + digit);
-        } else if (c >= 'a' && c <= 'z') {
-            out += keypad[static_cast<std::size_t>(c - 'a')];
-        } else if (c >= 'A' && c <= 'Z') {
-            out += keypad[static_cast<std::size_t>(c - 'A')];
-        }
-    }
-    return out;
-}
-
-std::string lastDigits(const std::string& digits) {
+/// By what a number is looked up; empty for one without digits.
+std::string lastDigits(std::string_view number) {
+    const std::string digits = PhoneText::digits(PhoneText::withoutExtension(PhoneText::withoutScheme(number)));
     return digits.size() <= kSharedDigits ? digits : digits.substr(digits.size() - kSharedDigits);
-}
-
-std::string withoutScheme(const std::string& number) {
-    return platform::asciiLowercased(number.substr(0, 4)) == "tel:" ? number.substr(4) : number;
 }
 
 /// The same card gives the same identifier at every start.
@@ -111,11 +74,11 @@ MemoryContactStore::MemoryContactStore(Contacts contacts, std::shared_ptr<Phonen
             }
         }
         for (std::size_t number = 0; number < contact.phoneNumbers.size(); ++number) {
-            const auto digits = digitsOf(withoutExtension(withoutScheme(contact.phoneNumbers[number].value)));
+            const std::string digits = lastDigits(contact.phoneNumbers[number].value);
             if (digits.empty()) {
                 continue;
             }
-            if (auto& alike = byLastDigits_[lastDigits(digits)]; alike.size() < kMostCompared) {
+            if (auto& alike = byLastDigits_[digits]; alike.size() < kMostCompared) {
                 alike.push_back({position, number});
             }
         }
@@ -145,7 +108,8 @@ bool MemoryContactStore::matches(const std::string& stored, const std::string& a
                                  const std::optional<PhoneNumberParts>& askedParts) const {
     const auto storedParts = phoneNumbers_->parts(stored, homeCountryCode_);
     if (!storedParts || !askedParts) {
-        return digitsOf(withoutScheme(stored)) == digitsOf(withoutScheme(asked));
+        return PhoneText::digits(PhoneText::withoutScheme(stored)) ==
+               PhoneText::digits(PhoneText::withoutScheme(asked));
     }
     return storedParts->complete && askedParts->complete ? storedParts->e164 == askedParts->e164
                                                          : storedParts->nationalPart == askedParts->nationalPart;
@@ -153,7 +117,7 @@ bool MemoryContactStore::matches(const std::string& stored, const std::string& a
 
 platform::ContactFetch<platform::ContactStore::Contacts> MemoryContactStore::unifiedContactsMatchingPhoneNumber(
     const std::string& number, const platform::ContactKeys&) {
-    const auto candidates = byLastDigits_.find(lastDigits(digitsOf(withoutExtension(withoutScheme(number)))));
+    const auto candidates = byLastDigits_.find(lastDigits(number));
     if (candidates == byLastDigits_.end()) {
         return {{}, std::nullopt};
     }

@@ -1,7 +1,9 @@
 #include "linux/contacts/PhonenumberLibrary.h"
 
+#include <algorithm>
 #include <utility>
 
+#include "linux/contacts/PhoneText.h"
 #include "linux/device/LoadableModule.h"
 #include "platform/base/Log.h"
 
@@ -32,7 +34,7 @@ class PhonenumberLibrary::Number : public platform::ParsedPhoneNumber {
     std::optional<PhoneNumberParts> parts_;
 };
 
-PhonenumberLibrary::PhonenumberLibrary() = default;
+PhonenumberLibrary::PhonenumberLibrary(std::size_t most) : most_(std::max<std::size_t>(most, 1)) {}
 PhonenumberLibrary::~PhonenumberLibrary() = default;
 
 const PhoneModule* PhonenumberLibrary::module() const {
@@ -52,23 +54,57 @@ const PhoneModule* PhonenumberLibrary::module() const {
     return module_.get();
 }
 
+std::optional<PhoneNumberParts> PhonenumberLibrary::understood(const std::string& text,
+                                                               const std::string& region) const {
+    const PhoneModule* library = module();
+    if (!library || text.size() > kLongestText) {
+        return std::nullopt;
+    }
+    auto whole = library->parse(text, region);
+    const std::string_view number = PhoneText::withoutExtension(text);
+    if (number.size() == text.size()) {
+        return whole;
+    }
+    // Of a word for an extension that it does not know the library makes digits.
+    auto plain = library->parse(std::string(number), region);
+    const bool knowsTheWord = whole && plain && whole->nationalPart == plain->nationalPart;
+    return plain && !knowsTheWord ? plain : whole;
+}
+
+std::size_t PhonenumberLibrary::place() const {
+    if (answers_.size() < most_) {
+        answers_.emplace_back();
+        return answers_.size() - 1;
+    }
+    constexpr int kTries = 16;
+    std::size_t found = 0;
+    for (int i = 0; i < kTries; ++i) {
+        found = chance_() % most_;
+        if (!std::exchange(answers_[found].wasAsked, false)) {
+            break;
+        }
+    }
+    index_.erase(*answers_[found].key);
+    return found;
+}
+
 std::shared_ptr<PhonenumberLibrary::Number> PhonenumberLibrary::number(const std::string& text,
                                                                        const std::string& countryCode) const {
     const std::string region = upperCased(countryCode);
     std::string key = region + '\n' + text;
     if (const auto found = index_.find(key); found != index_.end()) {
-        answers_.splice(answers_.begin(), answers_, found->second);
-        return found->second->number;
+        Answer& answer = answers_[found->second];
+        answer.wasAsked = true;
+        return answer.number;
     }
-    const PhoneModule* library = module();
-    const bool worthParsing = library && text.size() <= kLongestText;
-    auto made = std::make_shared<Number>(worthParsing ? library->parse(text, region) : std::nullopt);
-    answers_.push_front({key, made});
-    index_.emplace(std::move(key), answers_.begin());
-    if (index_.size() > kKept) {
-        index_.erase(answers_.back().key);
-        answers_.pop_back();
+    ++read_;
+    auto made = std::make_shared<Number>(understood(text, region));
+    if (key.size() > 2 * kLongestText) {
+        return made;
     }
+    const std::size_t at = place();
+    const auto kept = index_.emplace(std::move(key), at).first;
+    answers_[at] = {&kept->first, made, false};
     return made;
 }
 

@@ -3,9 +3,14 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <fstream>
 
 #include "host/scenario/ScenarioReader.h"
+#include "platform/base/Platform.h"
+#include "platform/contacts/ContactStore.h"
+#include "platform/contacts/PhoneNumberLibrary.h"
 #include "tests/support/RecordingLogSink.h"
+#include "tests/support/TemporaryFolder.h"
 
 namespace ktr::test {
 
@@ -48,6 +53,21 @@ TEST_F(HostTest, SaysHidden_WhileTheNewestCardDoes) {
     EXPECT_TRUE(host->saysHidden());
     add("dinner");
     EXPECT_FALSE(host->saysHidden());
+}
+
+TEST_F(HostTest, WithoutACountry_ContactsAndAnswersReadANumberAlike) {
+    TemporaryFolder folder;
+    const auto file = folder.path() / "people.vcf";
+    std::ofstream(file) << "BEGIN:VCARD\nFN:Ann\nTEL:(555) 555-0100\nEND:VCARD\n";
+    host::HostSettings settings;
+    settings.region = "C.UTF-8";
+    settings.contacts = {file.string()};
+    auto made = Host::make(settings, Host::Time::Virtual, KTR_PLUGIN_FILE);
+    const auto platform = std::get<std::unique_ptr<Host>>(made)->platform();
+    // As the plugin completes the number of a person for a question.
+    const auto number = platform->phoneNumbers->parse("(555) 555-0100", "us");
+    const auto complete = platform->phoneNumbers->text(*number, platform::PhoneNumberLibrary::kFormatE164);
+    EXPECT_EQ(platform->contactStore->unifiedContactsMatchingPhoneNumber(*complete, {}).result.size(), 1U);
 }
 
 }  // namespace ktr::test

@@ -4,7 +4,7 @@
 
 #include <set>
 
-#include "linux/device/ComputingTime.h"
+#include "documents/ComputingTime.h"
 
 namespace ktr::linux_ {
 
@@ -23,8 +23,8 @@ class MemoryContactStoreTest : public ::testing::Test {
         contacts.push_back(contact);
         return contact;
     }
-    std::vector<std::string> byPhone(const std::string& number) {
-        MemoryContactStore store(contacts, phoneNumbers, "GB");
+    std::vector<std::string> byPhone(const std::string& number, const std::string& home = "GB") {
+        MemoryContactStore store(contacts, phoneNumbers, home);
         std::vector<std::string> names;
         for (const auto& contact : store.unifiedContactsMatchingPhoneNumber(number, {}).result) {
             names.push_back(contact->storedFullName);
@@ -49,6 +49,42 @@ TEST_F(MemoryContactStoreTest, Numbers_AreTheSameHoweverTheyAreWritten) {
     EXPECT_EQ(byPhone("tel:+441632960003"), Names{"Noam"});
     EXPECT_EQ(byPhone("1-800-FLOWERS"), Names{});
     EXPECT_EQ(byPhone("+1-800-FLOWERS"), Names{"Flower"});
+}
+
+TEST_F(MemoryContactStoreTest, LettersForDigits_AreFound) {
+    add("Example", "1-800-EXAMPLE");
+    add("Bikes", "(800) FIX-BIKE");
+    EXPECT_EQ(byPhone("+18003926753", "US"), Names{"Example"});
+    EXPECT_EQ(byPhone("(800) 392-6753", "US"), Names{"Example"});
+    EXPECT_EQ(byPhone("+1 800-349-2453", "US"), Names{"Bikes"});
+    EXPECT_EQ(byPhone("800 FIX BIKE", "US"), Names{"Bikes"});
+}
+
+TEST_F(MemoryContactStoreTest, ExtensionsInAnyWords_DoNotHideANumber) {
+    const std::vector<std::string> written = {"01632 960003 ext. 5",
+                                              "01632 960003 ext 12345",
+                                              "01632 960003x5",
+                                              "01632 960003 (ext: 5)",
+                                              "01632 960003 доб. 5",
+                                              "01632 960003 int. 5",
+                                              "01632 960003 Durchwahl 5",
+                                              "01632 960003, poste 5",
+                                              "01632 960003 anexo 5",
+                                              "01632 960003 wew. 5",
+                                              "01632 960003 內線 5",
+                                              "01632 960003#5",
+                                              "01632 960003,,5",
+                                              "01632 960003;ext=5",
+                                              "tel:+44-1632-960003;ext=5",
+                                              "01632 960003 extension no. 5"};
+    for (const std::string& number : written) {
+        contacts.clear();
+        add("Noam", number);
+        EXPECT_EQ(byPhone("+441632960003"), Names{"Noam"}) << number;
+        contacts.clear();
+        add("Noam", "+44 1632 960003");
+        EXPECT_EQ(byPhone(number), Names{"Noam"}) << number;
+    }
 }
 
 TEST_F(MemoryContactStoreTest, ATextThatIsNoNumber_IsComparedByItsDigits) {
@@ -88,7 +124,7 @@ TEST_F(MemoryContactStoreTest, ThousandsOfTheSameContact_AreNamedAndFoundInLinea
     for (std::size_t i = 0; i < kCount; ++i) {
         add("Ann", "01632 960001")->emailAddresses.push_back({"", "ann@harbour.example"});
     }
-    const auto before = computingTime();
+    const auto before = documents::computingTime();
     MemoryContactStore store(contacts, phoneNumbers, "GB");
     std::set<std::string> identifiers;
     for (const auto& contact : contacts) {
@@ -104,7 +140,7 @@ TEST_F(MemoryContactStoreTest, ThousandsOfTheSameContact_AreNamedAndFoundInLinea
                   MemoryContactStore::kMostAlike);
     }
     // Far below what comparing each with each would take.
-    EXPECT_LT(computingTime() - before, std::chrono::seconds(10));
+    EXPECT_LT(documents::computingTime() - before, std::chrono::seconds(10));
 }
 
 TEST_F(MemoryContactStoreTest, FiftyThousandContacts_AreIndexedWithoutReadingEveryNumber) {

@@ -12,7 +12,9 @@ class PhonenumberLibraryTest : public ::testing::Test {
         const auto number = library.parse(text, country);
         return number ? library.displayText(*number, PhonenumberLibrary::kDisplayStyle, home) : std::nullopt;
     }
+    static constexpr std::size_t kFew = 512;
     PhonenumberLibrary library;
+    PhonenumberLibrary few{kFew};
 };
 
 }  // namespace
@@ -53,29 +55,73 @@ TEST_F(PhonenumberLibraryTest, Parts_SayWhetherTheNumberWasComplete) {
 }
 
 TEST_F(PhonenumberLibraryTest, Answers_AreKeptWithinABound) {
-    EXPECT_EQ(library.parse("+441632960018", "gb"), library.parse("+441632960018", "GB"));
-    for (std::size_t i = 0; i < 2 * PhonenumberLibrary::kKept; ++i) {
-        library.parse("+4416329" + std::to_string(10000 + i), "gb");
+    EXPECT_EQ(few.parse("+441632960018", "gb"), few.parse("+441632960018", "GB"));
+    for (std::size_t i = 0; i < 2 * kFew; ++i) {
+        few.parse("+4416329" + std::to_string(10000 + i), "gb");
     }
-    EXPECT_EQ(library.kept(), PhonenumberLibrary::kKept);
+    EXPECT_EQ(few.kept(), kFew);
+}
+
+TEST_F(PhonenumberLibraryTest, TenThousandFriendsWithTwoNumbers_AreReadOnce) {
+    const auto poll = [this] {
+        for (int i = 0; i < 10'000; ++i) {
+            library.parse("+4416329" + std::to_string(10'000 + i), "gb");
+            library.parse("+4416328" + std::to_string(10'000 + i), "gb");
+        }
+    };
+    poll();
+    EXPECT_EQ(library.read(), 20'000U);
+    poll();
+    EXPECT_EQ(library.read(), 20'000U);
+}
+
+TEST_F(PhonenumberLibraryTest, AListThatIsALittleTooLong_LosesALittle) {
+    constexpr std::size_t kCount = kFew * 5 / 4;
+    const auto poll = [&] {
+        const std::size_t before = few.read();
+        for (std::size_t i = 0; i < kCount; ++i) {
+            few.parse("no number " + std::to_string(i), "gb");
+        }
+        return few.read() - before;
+    };
+    EXPECT_EQ(poll(), kCount);
+    poll();
+    EXPECT_LT(poll(), kCount * 3 / 4);
+    EXPECT_EQ(few.kept(), kFew);
 }
 
 TEST_F(PhonenumberLibraryTest, AnAnswerAskedForAgain_IsNotTheNextToGo) {
-    const auto first = library.parse("+441632960018", "gb");
-    for (std::size_t i = 0; i < PhonenumberLibrary::kKept - 1; ++i) {
-        library.parse("+4416329" + std::to_string(10000 + i), "gb");
+    const auto fill = [&](std::size_t from, std::size_t count) {
+        for (std::size_t i = 0; i < count; ++i) {
+            few.parse("no number " + std::to_string(from + i), "gb");
+        }
+    };
+    few.parse("+441632960018", "gb");
+    fill(0, kFew - 1);
+    for (std::size_t round = 0; round < 200; ++round) {
+        const std::size_t before = few.read();
+        few.parse("+441632960018", "gb");
+        EXPECT_EQ(few.read(), before);
+        fill((round + 2) * kFew, 1);
     }
-    EXPECT_EQ(library.parse("+441632960018", "gb"), first);
-    library.parse("+441632999999", "gb");
-    EXPECT_EQ(library.parse("+441632960018", "gb"), first);
 }
 
 TEST_F(PhonenumberLibraryTest, AnAnswerThatWasGivenUp_StaysUsable) {
-    const auto number = library.parse("+441632960018", "gb");
-    for (std::size_t i = 0; i < 2 * PhonenumberLibrary::kKept; ++i) {
-        library.parse("no number " + std::to_string(i), "gb");
+    const auto number = few.parse("+441632960018", "gb");
+    for (std::size_t i = 0; i < 2 * kFew; ++i) {
+        few.parse("no number " + std::to_string(i), "gb");
     }
-    EXPECT_EQ(library.text(*number, PhonenumberLibrary::kFormatE164), "+441632960018");
+    EXPECT_EQ(few.text(*number, PhonenumberLibrary::kFormatE164), "+441632960018");
+}
+
+TEST_F(PhonenumberLibraryTest, ExtensionsInOtherWords_AreLeftOut) {
+    for (const char* text : {"01632 960018 ext. 5", "01632 960018 x5", "01632 960018 Durchwahl 5",
+                             "01632 960018 poste 5", "01632 960018 доб. 5", "01632 960018 wew. 5"}) {
+        const auto parts = library.parts(text, "gb");
+        ASSERT_TRUE(parts) << text;
+        EXPECT_EQ(parts->e164, "+441632960018") << text;
+    }
+    EXPECT_EQ(shown("+441632960018 ext. 5", "gb", "gb"), "01632 960018 x5");
 }
 
 TEST_F(PhonenumberLibraryTest, HugeTexts_AreNoNumbers) {
