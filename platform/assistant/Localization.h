@@ -17,6 +17,9 @@ class KTR_API Localization {
                              const std::optional<std::string>& table = std::nullopt,
                              const std::optional<std::string>& defaultValue = std::nullopt) const = 0;
     virtual std::string hostBundleIdentifier() const = 0;
+    /// The language that the texts are in (BCP 47), whose rules plural texts follow: English where there are none in
+    /// the language that was asked for. Any thread.
+    virtual std::string languageOfTexts() const { return "en"; }
 };
 
 }  // namespace ktr::platform

@@ -4,7 +4,11 @@
 #include <charconv>
 #include <cmath>
 
+#include "platform/assistant/Localization.h"
 #include "platform/base/Json.h"
+#include "platform/base/Platform.h"
+#include "platform/base/PluralRules.h"
+#include "platform/base/PluralText.h"
 
 namespace ktr::platform {
 
@@ -116,6 +120,17 @@ std::string argumentText(const Conversion& conversion, const FormatArguments& ar
     return conversion.kind == Conversion::Kind::Real ? wholeText(argument.number()) : argument.text();
 }
 
+/// The branch of a plural text that goes with the number in the first argument, by the rules of the texts' language.
+/// A text that is not built as it should be stands as it is.
+std::string_view branchFor(std::string_view text, const FormatArguments& arguments) {
+    const auto platform = Platform::installed();
+    std::string category = "other";
+    if (platform && platform->pluralRules && platform->localization && !arguments.empty()) {
+        category = platform->pluralRules->category(arguments.front().text(), platform->localization->languageOfTexts());
+    }
+    return PluralText::branch(text, category).value_or(text);
+}
+
 }  // namespace
 
 FormatArgument::FormatArgument(const char* text)
@@ -133,6 +148,9 @@ FormatArgument::FormatArgument(const std::optional<Dictionary>& dictionary)
 FormatArgument::FormatArgument(double number) : text_(writeJsonNumber(number)), number_(number) {}
 
 std::string formatted(std::string_view format, const FormatArguments& arguments, bool redact) {
+    if (PluralText::isPlural(format)) {
+        format = branchFor(format, arguments);
+    }
     std::string out;
     std::size_t next = 0;
     for (std::size_t at = 0; at < format.size();) {

@@ -61,7 +61,8 @@ using FormatArguments = std::vector<FormatArgument>;
 
 /// Fills a format: %@ (any argument), %i %d %li (whole numbers), %0.0f (a real without fraction, halves to even),
 /// %% (a percent sign) and positional %1$@. Missing arguments read "(null)"; an unknown conversion stands as it is.
-/// With `redact`, private arguments read "<private>". Any thread.
+/// With `redact`, private arguments read "<private>". A plural text (PluralText.h) is filled in the branch of its first
+/// argument. Any thread.
 KTR_API std::string formatted(std::string_view format, const FormatArguments& arguments, bool redact = false);
 
 }  // namespace ktr::platform

@@ -16,6 +16,7 @@ class LogSink;
 class MainLoop;
 class NotificationCenter;
 class NumberFormatter;
+class PluralRules;
 class RegionSettings;
 class AssistantSettings;
 class Localization;
@@ -60,6 +61,7 @@ class KTR_API Platform {
     std::shared_ptr<Calendar> calendar;
     std::shared_ptr<NotificationCenter> notificationCenter;  ///< made by the constructor
     std::shared_ptr<NumberFormatter> decimalNumbers;
+    std::shared_ptr<PluralRules> pluralRules;  ///< may be none: plural texts then read as for "other"
     std::shared_ptr<RegionSettings> region;
     std::shared_ptr<LengthFormatter> lengths;
     std::shared_ptr<AssistantSettings> assistant;

@@ -10,6 +10,7 @@
 #include "platform/assistant/Localization.h"
 #include "platform/base/Clock.h"
 #include "platform/base/LengthFormatter.h"
+#include "platform/base/PluralRules.h"
 #include "platform/base/Region.h"
 #include "platform/client/DistanceCalculator.h"
 #include "platform/contacts/ContactStore.h"
@@ -88,6 +89,19 @@ struct FakeLocalization : platform::Localization {
     std::string text(const std::string& key, const std::string& bundle, const std::optional<std::string>& table,
                      const std::optional<std::string>& defaultValue) const override;
     std::string hostBundleIdentifier() const override { return hostBundle; }
+    std::string languageOfTexts() const override { return language; }
+};
+
+/// English: "1" is one, what a test names is what it says, and all else is other.
+struct FakePlurals : platform::PluralRules {
+    std::map<std::string, std::string> categories = {{"1", "one"}};
+    mutable std::vector<std::string> asked;
+
+    std::string category(const std::string& number, const std::string& inLanguage) const override {
+        asked.push_back(inLanguage);
+        const auto found = categories.find(number);
+        return found != categories.end() ? found->second : "other";
+    }
 };
 
 /// Decimal numbers with "." and ASCII digits.

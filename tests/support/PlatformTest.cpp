@@ -8,6 +8,7 @@ PlatformTest::PlatformTest() {
     platform->clock = time;
     platform->calendar = calendar;
     platform->decimalNumbers = numbers;
+    platform->pluralRules = plurals;
     platform->region = region;
     platform->assistant = assistant;
     platform->localization = localization;

@@ -42,6 +42,7 @@ class PlatformTest : public ::testing::Test {
     std::shared_ptr<FakeAppearance> appearance = std::make_shared<FakeAppearance>();
     std::shared_ptr<FakeLocalization> localization = std::make_shared<FakeLocalization>();
     std::shared_ptr<FakeNumbers> numbers = std::make_shared<FakeNumbers>();
+    std::shared_ptr<FakePlurals> plurals = std::make_shared<FakePlurals>();
     std::shared_ptr<FakeImages> images = std::make_shared<FakeImages>();
     std::shared_ptr<FakeAvatars> avatars = std::make_shared<FakeAvatars>();
     std::shared_ptr<FakeMonogramMakers> monogramMakers = std::make_shared<FakeMonogramMakers>();
