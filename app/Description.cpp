@@ -1,6 +1,7 @@
 #include "app/Description.h"
 
 #include "documents/Words.h"
+#include "platform/base/Format.h"
 
 namespace ktr::app {
 
@@ -18,36 +19,34 @@ void collectTexts(const AccessibilityNode& node, std::string& line) {
     }
 }
 
-void writeLine(const std::string& line, AccessibilityRole role, std::string& out) {
-    out += documents::withoutControls(line);
-    if (role == AccessibilityRole::Link) {
-        out += " (link)";
-    } else if (role == AccessibilityRole::Image) {
-        out += " (image)";
-    }
+void writeLine(const std::string& line, AccessibilityRole role, const DescriptionWords& words, std::string& out) {
+    const std::string shown = documents::withoutControls(line);
+    out += role == AccessibilityRole::Link    ? platform::formatted(words.link, {shown})
+           : role == AccessibilityRole::Image ? platform::formatted(words.image, {shown})
+                                              : shown;
     out += '\n';
 }
 
-void writeNode(const AccessibilityNode& node, std::string& out) {
+void writeNode(const AccessibilityNode& node, const DescriptionWords& words, std::string& out) {
     if (node.role == AccessibilityRole::Link) {
         std::string line;
         collectTexts(node, line);
-        writeLine(line, node.role, out);
+        writeLine(line, node.role, words, out);
         return;
     }
     if (!node.text.empty()) {
-        writeLine(node.text, node.role, out);
+        writeLine(node.text, node.role, words, out);
     }
     for (const AccessibilityNode& child : node.children) {
-        writeNode(child, out);
+        writeNode(child, words, out);
     }
 }
 
 }  // namespace
 
-std::string describe(const AccessibilityNode& root) {
+std::string describe(const AccessibilityNode& root, const DescriptionWords& words) {
     std::string out;
-    writeNode(root, out);
+    writeNode(root, words, out);
     return out;
 }
 

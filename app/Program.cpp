@@ -91,7 +91,8 @@ host::ExitCode runHeadless(const Options& options, const host::HostSettings& set
         return failure ? fail(*failure) : code;
     }
     host.settle(settings.width);
-    const std::string text = describe(platform::accessibilityTree(host.window(), host.rightToLeft()));
+    const std::string text = describe(platform::accessibilityTree(host.window(), host.rightToLeft()),
+                                      {host.text("ACCESSIBILITY_LINK"), host.text("ACCESSIBILITY_IMAGE")});
     if (std::fputs(text.c_str(), stdout) == EOF || std::fflush(stdout) != 0) {
         return fail({host::ExitCode::Failure, "the description cannot be written"});
     }

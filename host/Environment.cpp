@@ -20,6 +20,7 @@
 #include "linux/locale/IcuDistanceCalculatorFactory.h"
 #include "linux/locale/IcuLengthFormatter.h"
 #include "linux/locale/IcuNumberFormatter.h"
+#include "linux/locale/IcuPluralRules.h"
 #include "linux/locale/LocalCalendar.h"
 #include "linux/locale/LocaleRegion.h"
 #include "linux/locale/QtLocalization.h"
@@ -144,6 +145,7 @@ std::optional<Failure> Environment::fill(Platform& platform, const HostSettings&
     platform.region = region;
     platform.decimalNumbers =
         std::make_shared<linux_::IcuNumberFormatter>(region->localeWithLanguage(settings.language));
+    platform.pluralRules = std::make_shared<linux_::IcuPluralRules>();
     platform.geodesy = std::make_shared<linux_::GeographicLibGeodesy>();
     // A picture or a text must not depend on whose session it is made in.
     using Distances = linux_::IcuDistanceCalculatorFactory;

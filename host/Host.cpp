@@ -13,6 +13,7 @@
 #include "platform/base/Clock.h"
 #include "platform/base/Format.h"
 #include "platform/base/LogArea.h"
+#include "platform/base/Region.h"
 #include "platform/client/FriendLocationRestrictions.h"
 
 namespace ktr::host {
@@ -98,6 +99,10 @@ bool Host::rightToLeft() const {
 std::string Host::text(const std::string& key) const {
     const auto& localization = *platform()->localization;
     return localization.text(key, localization.hostBundleIdentifier());
+}
+
+std::string Host::number(std::int64_t number) const {
+    return platform()->decimalNumbers->plainStringFromInteger(number);
 }
 
 std::string Host::clockFace(platform::Date moment) const {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <functional>
+#include <cstdint>
 #include <memory>
 #include <optional>
 #include <string>
@@ -74,6 +75,8 @@ class Host {
     const std::shared_ptr<platform::Platform>& platform() const { return environment_.platform; }
     /// A text of the host's own, by its key.
     std::string text(const std::string& key) const;
+    /// A whole number in the digits of the language.
+    std::string number(std::int64_t number) const;
     /// The clock face of a moment, as the conversation shows it.
     std::string clockFace(platform::Date moment) const;
     const HostSettings& settings() const { return settings_; }

@@ -222,7 +222,8 @@ LiveStatus LiveConversation::status() const {
     facts.hidden = host_.saysHidden();
     facts.service = host_.live()->service().notes();
     return LiveStatus::of(facts, {[this](const std::string& key) { return host_.text(key); },
-                                  [this](platform::Date moment) { return host_.clockFace(moment); }});
+                                  [this](platform::Date moment) { return host_.clockFace(moment); },
+                                  [this](std::int64_t number) { return host_.number(number); }});
 }
 
 }  // namespace ktr::host

@@ -26,7 +26,7 @@ std::string sentence(const LiveStatus::Words& words, const std::string& key, con
 
 /// "Live · updated 20 s ago": `key` is STATUS_LIVE or STATUS_PAUSED.
 std::string updated(const LiveStatus::Words& words, const std::string& key, double age) {
-    const auto whole = [](double number) { return std::to_string(static_cast<long long>(number)); };
+    const auto whole = [&](double number) { return words.number(static_cast<std::int64_t>(number)); };
     if (age < LiveStatus::kJustNow) {
         return words.text(key + "_NOW");
     }

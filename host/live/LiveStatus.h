@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <functional>
 #include <optional>
 #include <string>
@@ -34,10 +35,11 @@ struct LiveStatus {
         platform::Date now;
     };
 
-    /// A text of the host by its key, and the clock face of a moment.
+    /// A text of the host by its key, the clock face of a moment, and a whole number in the language's own digits.
     struct Words {
         std::function<std::string(const std::string& key)> text;
         std::function<std::string(platform::Date moment)> clock;
+        std::function<std::string(std::int64_t number)> number;
     };
 
     /// A question that is answered within this time is not called waiting, seconds.

@@ -7,8 +7,10 @@
 
 #include <unicode/locid.h>
 #include <unicode/numberformatter.h>
+#include <unicode/numsys.h>
 #include <unicode/ulocdata.h>
 
+#include "linux/locale/LocaleRegion.h"
 #include "platform/base/Format.h"
 
 namespace ktr::linux_ {
@@ -110,6 +112,18 @@ icu::Locale withRegionOverride(icu::Locale language, const std::string& region) 
     return language;
 }
 
+/// The language with the digits that it has in the region: those of the numbers beside the distance.
+icu::Locale withDigitsOf(icu::Locale language, const std::string& region) {
+    UErrorCode status = U_ZERO_ERROR;
+    const auto tag = language.toLanguageTag<std::string>(status);
+    const auto both = localeOf(LocaleRegion(region).localeWithLanguage(tag));
+    const std::unique_ptr<icu::NumberingSystem> digits(icu::NumberingSystem::createInstance(both, status));
+    if (U_SUCCESS(status)) {
+        language.setUnicodeKeywordValue("nu", digits->getName(), status);
+    }
+    return language;
+}
+
 }  // namespace
 
 struct IcuDistanceCalculator::Formatter {
@@ -131,7 +145,9 @@ IcuDistanceCalculator::IcuDistanceCalculator(Settings settings, std::optional<Un
     }
     const std::string region = override ? regionOf(*override) : regionOf(units);
     system_ = override ? *override : systemOf(region);
-    const icu::Locale language = localeOf(settings_.languageLocale.value_or(settings_.measurementSystemLocale));
+    const icu::Locale language =
+        withDigitsOf(localeOf(settings_.languageLocale.value_or(settings_.measurementSystemLocale)),
+                     settings_.measurementSystemLocale);
     // In Arabic the short form spells the unit out and inflects it; the narrow one is the abbreviation.
     const bool narrow = std::string_view(language.getLanguage()) == "ar";
     UErrorCode status = U_ZERO_ERROR;

@@ -38,6 +38,12 @@ TEST(KTRDescriptionTest, Describe_KeepsWhatSteersATerminalOutOfALine) {
               "a [2J 2J b c d\u00A0\u00E9\u2027\n");
 }
 
+TEST(KTRDescriptionTest, Describe_SaysWhatALinkAndAPictureAreInTheLanguagesWords) {
+    const auto tree = node(AccessibilityRole::Group, "",
+                           {node(AccessibilityRole::Link, "آن"), node(AccessibilityRole::Image, "الخريطة")});
+    EXPECT_EQ(describe(tree, {"%@ (رابط)", "%@ (صورة)"}), "آن (رابط)\nالخريطة (صورة)\n");
+}
+
 TEST(KTRDescriptionTest, Describe_OfNothingIsEmpty) {
     EXPECT_EQ(describe(node(AccessibilityRole::Group, "")), "");
 }

@@ -18,7 +18,8 @@ class LiveStatusTest : public ::testing::Test {
     std::string words() const { return status().words; }
     LiveStatus status() const {
         return LiveStatus::of(facts,
-                              {[](const std::string& key) { return key; }, [](Date) { return std::string("17:42"); }});
+                              {[](const std::string& key) { return key; }, [](Date) { return std::string("17:42"); },
+                               [](std::int64_t number) { return std::to_string(number); }});
     }
     LiveStatus::Facts facts;
 };
