@@ -51,7 +51,8 @@ const char* directionKey(double azimuth) {
     return kKeys[eighths % kKeys.size()];
 }
 
-/// How far and in which direction from the user; the distance in the words of the row.
+/// How far and in which direction from the user, the distance in the words of the row; no direction leads to where the
+/// user is.
 void appendWay(std::string& text, const std::shared_ptr<PlatformLocation>& user,
                const std::shared_ptr<PlatformLocation>& place, const std::optional<std::string>& distance) {
     const auto geodesy = Platform::installed()->geodesy;
@@ -60,7 +61,7 @@ void appendWay(std::string& text, const std::shared_ptr<PlatformLocation>& user,
     }
     const double azimuth = geodesy->azimuth(user->coordinate(), place->coordinate());
     append(text, std::isfinite(azimuth) ? sentence(directionKey(azimuth), {*distance})
-                                        : sentence("ACCESSIBILITY_DISTANCE", {*distance}));
+                                        : sentence("ACCESSIBILITY_MAP_SAME_PLACE", {}));
 }
 
 std::string shownLabel(const std::string& label) {

@@ -2,11 +2,15 @@
 
 #include <unicode/locid.h>
 
+#include <string_view>
 #include <utility>
 
 namespace ktr::linux_ {
 
 namespace {
+
+/// The variant of the pseudo-language that is written from right to left (docs/translating.md).
+constexpr std::string_view kMirrored = "PLOCM";
 
 bool isRightToLeft(const std::optional<std::string>& languageCode) {
     if (!languageCode) {
@@ -14,7 +18,7 @@ bool isRightToLeft(const std::optional<std::string>& languageCode) {
     }
     UErrorCode status = U_ZERO_ERROR;
     const auto locale = icu::Locale::forLanguageTag(*languageCode, status);
-    return U_SUCCESS(status) && locale.isRightToLeft();
+    return U_SUCCESS(status) && (locale.isRightToLeft() || locale.getVariant() == kMirrored);
 }
 
 }  // namespace

@@ -5,29 +5,42 @@
 #include <QString>
 #include <QTranslator>
 
+#include <unicode/locid.h>
+
 namespace ktr::linux_ {
 
 namespace {
 
 constexpr const char* kFallbackLanguage = "en";
 
-/// "zh-Hant-TW" gives itself, "zh-Hant", "zh", and then English.
-std::vector<std::string> candidates(std::string language) {
+void add(std::vector<std::string>& candidates, const std::string& language) {
+    if (!language.empty() && std::find(candidates.begin(), candidates.end(), language) == candidates.end()) {
+        candidates.push_back(language);
+    }
+}
+
+/// "zh-TW" gives itself, "zh-Hant", "zh", and then English: the region says which script is meant.
+std::vector<std::string> candidates(const std::string& language) {
     std::vector<std::string> out;
-    while (!language.empty()) {
-        out.push_back(language);
-        const auto cut = language.rfind('-');
-        language.resize(cut == std::string::npos ? 0 : cut);
+    UErrorCode status = U_ZERO_ERROR;
+    auto locale = icu::Locale::forLanguageTag(language, status);
+    if (U_SUCCESS(status) && !locale.isBogus()) {
+        add(out, locale.toLanguageTag<std::string>(status));
+        const std::string name = locale.getLanguage();
+        locale.addLikelySubtags(status);
+        if (const std::string script = locale.getScript(); U_SUCCESS(status) && !script.empty()) {
+            add(out, name + "-" + script);
+        }
+        add(out, name);
     }
-    if (std::find(out.begin(), out.end(), kFallbackLanguage) == out.end()) {
-        out.emplace_back(kFallbackLanguage);
-    }
+    add(out, kFallbackLanguage);
     return out;
 }
 
 }  // namespace
 
-QtLocalization::QtLocalization(std::string language) : language_(std::move(language)) {
+QtLocalization::QtLocalization(std::string language)
+    : language_(std::move(language)), languageOfTexts_(kFallbackLanguage) {
     std::replace(language_.begin(), language_.end(), '_', '-');
 }
 
@@ -44,6 +57,7 @@ bool QtLocalization::addBundle(const std::string& bundleIdentifier, const std::f
         if (std::filesystem::is_regular_file(file, ignored) &&
             translator->load(QString::fromStdString(file.string()))) {
             english = english || language == kFallbackLanguage;
+            languageOfTexts_ = translators.empty() ? language : languageOfTexts_;
             translators.push_back(std::move(translator));
         }
     }

@@ -23,7 +23,8 @@ class QtLocalization : public platform::Localization {
     /// The bundle of the plugin that comes with this project.
     static constexpr const char* kSnippetsBundle = "org.ktr.snippets";
 
-    /// BCP 47, such as "de-AT": looked for as it is, then with its last subtag dropped, and so on, then in English.
+    /// BCP 47, such as "de-AT": looked for as it is, then as its language and script ("zh-Hant" for "zh-TW"), then as
+    /// its language, then in English. Old names of languages ("iw") are understood.
     explicit QtLocalization(std::string language);
     ~QtLocalization() override;
     QtLocalization(const QtLocalization&) = delete;
@@ -37,11 +38,14 @@ class QtLocalization : public platform::Localization {
                      const std::optional<std::string>& table = std::nullopt,
                      const std::optional<std::string>& defaultValue = std::nullopt) const override;
     std::string hostBundleIdentifier() const override { return kHostBundle; }
+    std::string languageOfTexts() const override { return languageOfTexts_; }
 
   private:
     using Translators = std::vector<std::unique_ptr<QTranslator>>;
 
     std::string language_;
+    /// Of the bundle that was added last: the bundles of a project come in the same languages.
+    std::string languageOfTexts_;
     /// By bundle; the most fitting language first, English last.
     std::map<std::string, Translators> bundles_;
 };

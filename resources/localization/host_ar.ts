@@ -56,17 +56,17 @@
     <message>
         <source>STATUS_LIVE_SECONDS</source>
         <extracomment>The same; %@ is a number of seconds. English: “Live · updated %@ s ago”</extracomment>
-        <translation>مباشر · تم التحديث قبل %@ ث</translation>
+        <translation>{0, plural, few{مباشر · تم التحديث قبل %@ ثوانٍ} other{مباشر · تم التحديث قبل %@ ثانية}}</translation>
     </message>
     <message>
         <source>STATUS_LIVE_MINUTES</source>
         <extracomment>The same; %@ is a number of minutes. English: “Live · updated %@ min ago”</extracomment>
-        <translation>مباشر · تم التحديث قبل %@ د</translation>
+        <translation>{0, plural, one{مباشر · تم التحديث قبل دقيقة} two{مباشر · تم التحديث قبل دقيقتين} few{مباشر · تم التحديث قبل %@ دقائق} other{مباشر · تم التحديث قبل %@ دقيقة}}</translation>
     </message>
     <message>
         <source>STATUS_LIVE_HOURS</source>
         <extracomment>The same; %@ is a number of hours. English: “Live · updated %@ h ago”</extracomment>
-        <translation>مباشر · تم التحديث قبل %@ س</translation>
+        <translation>{0, plural, one{مباشر · تم التحديث قبل ساعة} two{مباشر · تم التحديث قبل ساعتين} few{مباشر · تم التحديث قبل %@ ساعات} other{مباشر · تم التحديث قبل %@ ساعة}}</translation>
     </message>
     <message>
         <source>STATUS_PAUSED_NOW</source>
@@ -76,17 +76,17 @@
     <message>
         <source>STATUS_PAUSED_SECONDS</source>
         <extracomment>The same; %@ is a number of seconds. English: “Paused · updated %@ s ago”</extracomment>
-        <translation>متوقف مؤقتًا · تم التحديث قبل %@ ث</translation>
+        <translation>{0, plural, few{متوقف مؤقتًا · تم التحديث قبل %@ ثوانٍ} other{متوقف مؤقتًا · تم التحديث قبل %@ ثانية}}</translation>
     </message>
     <message>
         <source>STATUS_PAUSED_MINUTES</source>
         <extracomment>The same; %@ is a number of minutes. English: “Paused · updated %@ min ago”</extracomment>
-        <translation>متوقف مؤقتًا · تم التحديث قبل %@ د</translation>
+        <translation>{0, plural, one{متوقف مؤقتًا · تم التحديث قبل دقيقة} two{متوقف مؤقتًا · تم التحديث قبل دقيقتين} few{متوقف مؤقتًا · تم التحديث قبل %@ دقائق} other{متوقف مؤقتًا · تم التحديث قبل %@ دقيقة}}</translation>
     </message>
     <message>
         <source>STATUS_PAUSED_HOURS</source>
         <extracomment>The same; %@ is a number of hours. English: “Paused · updated %@ h ago”</extracomment>
-        <translation>متوقف مؤقتًا · تم التحديث قبل %@ س</translation>
+        <translation>{0, plural, one{متوقف مؤقتًا · تم التحديث قبل ساعة} two{متوقف مؤقتًا · تم التحديث قبل ساعتين} few{متوقف مؤقتًا · تم التحديث قبل %@ ساعات} other{متوقف مؤقتًا · تم التحديث قبل %@ ساعة}}</translation>
     </message>
     <message>
         <source>STATUS_FINDING_YOU</source>
@@ -145,8 +145,18 @@
     </message>
     <message>
         <source>MAP_NOT_AVAILABLE</source>
-        <extracomment>In place of a map that nobody can draw. English: “Map not available”</extracomment>
+        <extracomment>In place of a map that nobody can draw. English: “Map not available”. English: “Map not available”</extracomment>
         <translation>الخريطة غير متوفرة</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LINK</source>
+        <extracomment>What a screen reader would say, written down: %@ can be opened. English: “%@ (link)”</extracomment>
+        <translation>%@ (رابط)</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_IMAGE</source>
+        <extracomment>The same: %@ describes a picture. English: “%@ (image)”</extracomment>
+        <translation>%@ (صورة)</translation>
     </message>
 </context>
 </TS>

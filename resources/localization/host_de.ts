@@ -56,17 +56,17 @@
     <message>
         <source>STATUS_LIVE_SECONDS</source>
         <extracomment>The same; %@ is a number of seconds. English: “Live · updated %@ s ago”</extracomment>
-        <translation>Live · vor %@ Sek. aktualisiert</translation>
+        <translation>Live · vor %@ Sek. aktualisiert</translation>
     </message>
     <message>
         <source>STATUS_LIVE_MINUTES</source>
         <extracomment>The same; %@ is a number of minutes. English: “Live · updated %@ min ago”</extracomment>
-        <translation>Live · vor %@ Min. aktualisiert</translation>
+        <translation>Live · vor %@ Min. aktualisiert</translation>
     </message>
     <message>
         <source>STATUS_LIVE_HOURS</source>
         <extracomment>The same; %@ is a number of hours. English: “Live · updated %@ h ago”</extracomment>
-        <translation>Live · vor %@ Std. aktualisiert</translation>
+        <translation>Live · vor %@ Std. aktualisiert</translation>
     </message>
     <message>
         <source>STATUS_PAUSED_NOW</source>
@@ -76,17 +76,17 @@
     <message>
         <source>STATUS_PAUSED_SECONDS</source>
         <extracomment>The same; %@ is a number of seconds. English: “Paused · updated %@ s ago”</extracomment>
-        <translation>Pausiert · vor %@ Sek. aktualisiert</translation>
+        <translation>Pausiert · vor %@ Sek. aktualisiert</translation>
     </message>
     <message>
         <source>STATUS_PAUSED_MINUTES</source>
         <extracomment>The same; %@ is a number of minutes. English: “Paused · updated %@ min ago”</extracomment>
-        <translation>Pausiert · vor %@ Min. aktualisiert</translation>
+        <translation>Pausiert · vor %@ Min. aktualisiert</translation>
     </message>
     <message>
         <source>STATUS_PAUSED_HOURS</source>
         <extracomment>The same; %@ is a number of hours. English: “Paused · updated %@ h ago”</extracomment>
-        <translation>Pausiert · vor %@ Std. aktualisiert</translation>
+        <translation>Pausiert · vor %@ Std. aktualisiert</translation>
     </message>
     <message>
         <source>STATUS_FINDING_YOU</source>
@@ -145,8 +145,18 @@
     </message>
     <message>
         <source>MAP_NOT_AVAILABLE</source>
-        <extracomment>In place of a map that nobody can draw. English: “Map not available”</extracomment>
+        <extracomment>In place of a map that nobody can draw. English: “Map not available”. English: “Map not available”</extracomment>
         <translation>Keine Karte verfügbar</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LINK</source>
+        <extracomment>What a screen reader would say, written down: %@ can be opened. English: “%@ (link)”</extracomment>
+        <translation>%@ (Link)</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_IMAGE</source>
+        <extracomment>The same: %@ describes a picture. English: “%@ (image)”</extracomment>
+        <translation>%@ (Bild)</translation>
     </message>
 </context>
 </TS>

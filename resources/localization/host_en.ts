@@ -148,5 +148,15 @@
         <extracomment>In place of a map that nobody can draw. English: “Map not available”</extracomment>
         <translation>Map not available</translation>
     </message>
+    <message>
+        <source>ACCESSIBILITY_LINK</source>
+        <extracomment>What a screen reader would say, written down: %@ can be opened</extracomment>
+        <translation>%@ (link)</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_IMAGE</source>
+        <extracomment>The same: %@ describes a picture</extracomment>
+        <translation>%@ (image)</translation>
+    </message>
 </context>
 </TS>

@@ -145,8 +145,18 @@
     </message>
     <message>
         <source>MAP_NOT_AVAILABLE</source>
-        <extracomment>In place of a map that nobody can draw. English: “Map not available”</extracomment>
+        <extracomment>In place of a map that nobody can draw. English: “Map not available”. English: “Map not available”</extracomment>
         <translation>地図を表示できません</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LINK</source>
+        <extracomment>What a screen reader would say, written down: %@ can be opened. English: “%@ (link)”</extracomment>
+        <translation>%@（リンク）</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_IMAGE</source>
+        <extracomment>The same: %@ describes a picture. English: “%@ (image)”</extracomment>
+        <translation>%@（画像）</translation>
     </message>
 </context>
 </TS>

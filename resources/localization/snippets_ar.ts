@@ -55,23 +55,23 @@
     </message>
     <message>
         <source>LOCATED_LESS_THAN_30SECONDS</source>
-        <extracomment>How old a position is: 31 to 59 seconds. The key’s name is misleading; %@ is always 30. Abbreviate the unit so that no plural is needed. English: “Over %@ s ago”</extracomment>
-        <translation>قبل أكثر من %@ ث</translation>
+        <extracomment>How old a position is: 31 to 59 seconds. The key’s name is misleading; %@ is always 30. English: “Over %@ s ago”</extracomment>
+        <translation>قبل أكثر من %@ ثانية</translation>
     </message>
     <message>
         <source>LOCATED_MINUTES</source>
-        <extracomment>How old a position is: %@ is 1 to 59. Abbreviate the unit so that no plural is needed. English: “%@ min ago”</extracomment>
-        <translation>قبل %@ د</translation>
+        <extracomment>How old a position is: %@ is 1 to 59. Short; a plural text where the language needs one. English: “%@ min ago”</extracomment>
+        <translation>{0, plural, one{قبل دقيقة واحدة} two{قبل دقيقتين} few{قبل %@ دقائق} many{قبل %@ دقيقة} other{قبل %@ دقيقة}}</translation>
     </message>
     <message>
         <source>LOCATED_LESS_THAN_1HR</source>
-        <extracomment>How old a position is: 60 to 119 minutes. The key’s name is misleading; %@ is always 1. Abbreviate the unit. English: “Over %@ h ago”</extracomment>
-        <translation>قبل أكثر من %@ س</translation>
+        <extracomment>How old a position is: 60 to 119 minutes. The key’s name is misleading; %@ is always 1. English: “Over %@ h ago”</extracomment>
+        <translation>{0, plural, one{قبل أكثر من ساعة} other{قبل أكثر من %@ ساعة}}</translation>
     </message>
     <message>
         <source>LOCATED_MORE_THAN_1HR</source>
-        <extracomment>How old a position is: %@ is 2 or more. Abbreviate the unit so that no plural is needed. English: “%@ h ago”</extracomment>
-        <translation>قبل %@ س</translation>
+        <extracomment>How old a position is: %@ is 2 or more. Short; a plural text where the language needs one. English: “%@ h ago”</extracomment>
+        <translation>{0, plural, one{قبل ساعة واحدة} two{قبل ساعتين} few{قبل %@ ساعات} many{قبل %@ ساعة} other{قبل %@ ساعة}}</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_NOW</source>
@@ -86,22 +86,22 @@
     <message>
         <source>ACCESSIBILITY_LOCATED_MINUTE</source>
         <extracomment>Read aloud: one minute; %@ is always 1. English: “Located %@ minute ago”</extracomment>
-        <translation>حُدّد الموقع قبل %@ دقيقة</translation>
+        <translation>{0, plural, one{حُدّد الموقع قبل دقيقة واحدة} other{حُدّد الموقع قبل %@ دقيقة}}</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MINUTES</source>
-        <extracomment>Read aloud: %@ is 2 to 59; word it so that it is right for each of them. English: “Located %@ minutes ago”</extracomment>
-        <translation>حُدّد الموقع قبل %@ من الدقائق</translation>
+        <extracomment>Read aloud: %@ is 2 to 59; a plural text where the language needs one. English: “Located %@ minutes ago”</extracomment>
+        <translation>{0, plural, one{حُدّد الموقع قبل دقيقة واحدة} two{حُدّد الموقع قبل دقيقتين} few{حُدّد الموقع قبل %@ دقائق} many{حُدّد الموقع قبل %@ دقيقة} other{حُدّد الموقع قبل %@ دقيقة}}</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_LESS_THAN_1HR</source>
         <extracomment>Read aloud: 60 to 119 minutes; %@ is always 1. English: “Located more than %@ hour ago”</extracomment>
-        <translation>حُدّد الموقع قبل أكثر من %@ ساعة</translation>
+        <translation>{0, plural, one{حُدّد الموقع قبل أكثر من ساعة} other{حُدّد الموقع قبل أكثر من %@ ساعة}}</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>
-        <extracomment>Read aloud: %@ is 2 or more; word it so that it is right for each of them. English: “Located %@ hours ago”</extracomment>
-        <translation>حُدّد الموقع قبل %@ من الساعات</translation>
+        <extracomment>Read aloud: %@ is 2 or more; a plural text where the language needs one. English: “Located %@ hours ago”</extracomment>
+        <translation>{0, plural, one{حُدّد الموقع قبل ساعة واحدة} two{حُدّد الموقع قبل ساعتين} few{حُدّد الموقع قبل %@ ساعات} many{حُدّد الموقع قبل %@ ساعة} other{حُدّد الموقع قبل %@ ساعة}}</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_DISTANCE</source>
@@ -110,8 +110,8 @@
     </message>
     <message>
         <source>ACCESSIBILITY_AT_LABEL</source>
-        <extracomment>Read aloud: %@ is a place, such as “Fish Market”, “Home” or “Brinmouth, HB”. English: “At %@”</extracomment>
-        <translation>في %@</translation>
+        <extracomment>Read aloud: %@ is a town (“Brinmouth, HB”), a place with a name (“Fish Market”, “Home”) or “Locating…”: word it so that each of them fits. English: “Place: %@”</extracomment>
+        <translation>المكان: %@</translation>
     </message>
     <message>
         <source>IMMEDIATE_LABEL</source>
@@ -120,12 +120,12 @@
     </message>
     <message>
         <source>LEAVING_LABEL</source>
-        <extracomment>A promise about one friend, of any gender; %@ is a place. English: “You’ll hear when they leave %@”</extracomment>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
         <translation>سيصلك إشعار عند مغادرة %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
-        <extracomment>A promise about one friend, of any gender; %@ is a place. English: “You’ll hear when they arrive at %@”</extracomment>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they reach %@”</extracomment>
         <translation>سيصلك إشعار عند الوصول إلى %@</translation>
     </message>
     <message>
@@ -165,7 +165,7 @@
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_FRIEND_AT</source>
-        <extracomment>A map read aloud: %1$@ is a friend, %2$@ their place, such as “Fish Market” or “Home”. English: “Map: %1$@, at %2$@”</extracomment>
+        <extracomment>A map read aloud: %1$@ is a friend, %2$@ their place: a town, a place with a name such as “Fish Market”, or “Home”. English: “Map: %1$@, %2$@”</extracomment>
         <translation>الخريطة: %1$@، %2$@</translation>
     </message>
     <message>
@@ -176,57 +176,62 @@
     <message>
         <source>ACCESSIBILITY_MAP_UNKNOWN</source>
         <extracomment>A map read aloud: %@ is a friend whose place is not known. English: “Map: no place known for %@”</extracomment>
-        <translation>الخريطة: لا يوجد مكان معروف لـ %@</translation>
+        <translation>الخريطة: %@، المكان غير معروف</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_ACCURACY</source>
         <extracomment>A map read aloud: how sure a place is; %@ is a length such as “25 metres”. English: “Accurate to %@”</extracomment>
-        <translation>بدقة %@</translation>
+        <translation>الدقة: %@</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_NORTH</source>
         <extracomment>A map read aloud: the direction from the user; %@ is a distance such as “310 m”. English: “%@ north of you”</extracomment>
-        <translation>على بُعد %@ شمالاً منك</translation>
+        <translation>على بُعد %@ إلى الشمال منك</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_NORTHEAST</source>
         <extracomment>The same. English: “%@ north-east of you”</extracomment>
-        <translation>على بُعد %@ شمال شرق منك</translation>
+        <translation>على بُعد %@ إلى الشمال الشرقي منك</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_EAST</source>
         <extracomment>The same. English: “%@ east of you”</extracomment>
-        <translation>على بُعد %@ شرقًا منك</translation>
+        <translation>على بُعد %@ إلى الشرق منك</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_SOUTHEAST</source>
         <extracomment>The same. English: “%@ south-east of you”</extracomment>
-        <translation>على بُعد %@ جنوب شرق منك</translation>
+        <translation>على بُعد %@ إلى الجنوب الشرقي منك</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_SOUTH</source>
         <extracomment>The same. English: “%@ south of you”</extracomment>
-        <translation>على بُعد %@ جنوبًا منك</translation>
+        <translation>على بُعد %@ إلى الجنوب منك</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_SOUTHWEST</source>
         <extracomment>The same. English: “%@ south-west of you”</extracomment>
-        <translation>على بُعد %@ جنوب غرب منك</translation>
+        <translation>على بُعد %@ إلى الجنوب الغربي منك</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_WEST</source>
         <extracomment>The same. English: “%@ west of you”</extracomment>
-        <translation>على بُعد %@ غربًا منك</translation>
+        <translation>على بُعد %@ إلى الغرب منك</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_NORTHWEST</source>
         <extracomment>The same. English: “%@ north-west of you”</extracomment>
-        <translation>على بُعد %@ شمال غرب منك</translation>
+        <translation>على بُعد %@ إلى الشمال الغربي منك</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SAME_PLACE</source>
+        <extracomment>The same for a friend or a place that is where the user is. English: “In the same place as you”</extracomment>
+        <translation>في المكان نفسه الذي أنت فيه</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_FENCE_AT</source>
         <extracomment>A map read aloud: a place that a friend leaves or arrives at; %@ is its name. English: “Map: the area around %@”</extracomment>
-        <translation>الخريطة: المنطقة المحيطة بـ %@</translation>
+        <translation>الخريطة: %@ والمنطقة المحيطة</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_FENCE</source>

@@ -11,7 +11,7 @@
     <message>
         <source>LOCATING_FRIENDS</source>
         <extracomment>Shown while nobody has been found yet. English: “Finding your friends…”</extracomment>
-        <translation>Deine Freunde werden gesucht …</translation>
+        <translation>Deine Freunde werden gesucht …</translation>
     </message>
     <message>
         <source>NO_FRIENDS_FOUND</source>
@@ -26,7 +26,7 @@
     <message>
         <source>LOCATING</source>
         <extracomment>In the place of a place, while one friend is still being looked for. English: “Locating…”</extracomment>
-        <translation>Standort wird gesucht …</translation>
+        <translation>Standort wird gesucht …</translation>
     </message>
     <message>
         <source>NO_LOCATION</source>
@@ -55,22 +55,22 @@
     </message>
     <message>
         <source>LOCATED_LESS_THAN_30SECONDS</source>
-        <extracomment>How old a position is: 31 to 59 seconds. The key’s name is misleading; %@ is always 30. Abbreviate the unit so that no plural is needed. English: “Over %@ s ago”</extracomment>
+        <extracomment>How old a position is: 31 to 59 seconds. The key’s name is misleading; %@ is always 30. English: “Over %@ s ago”</extracomment>
         <translation>Vor über %@ Sek.</translation>
     </message>
     <message>
         <source>LOCATED_MINUTES</source>
-        <extracomment>How old a position is: %@ is 1 to 59. Abbreviate the unit so that no plural is needed. English: “%@ min ago”</extracomment>
+        <extracomment>How old a position is: %@ is 1 to 59. Short; a plural text where the language needs one. English: “%@ min ago”</extracomment>
         <translation>Vor %@ Min.</translation>
     </message>
     <message>
         <source>LOCATED_LESS_THAN_1HR</source>
-        <extracomment>How old a position is: 60 to 119 minutes. The key’s name is misleading; %@ is always 1. Abbreviate the unit. English: “Over %@ h ago”</extracomment>
+        <extracomment>How old a position is: 60 to 119 minutes. The key’s name is misleading; %@ is always 1. English: “Over %@ h ago”</extracomment>
         <translation>Vor über %@ Std.</translation>
     </message>
     <message>
         <source>LOCATED_MORE_THAN_1HR</source>
-        <extracomment>How old a position is: %@ is 2 or more. Abbreviate the unit so that no plural is needed. English: “%@ h ago”</extracomment>
+        <extracomment>How old a position is: %@ is 2 or more. Short; a plural text where the language needs one. English: “%@ h ago”</extracomment>
         <translation>Vor %@ Std.</translation>
     </message>
     <message>
@@ -90,7 +90,7 @@
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MINUTES</source>
-        <extracomment>Read aloud: %@ is 2 to 59; word it so that it is right for each of them. English: “Located %@ minutes ago”</extracomment>
+        <extracomment>Read aloud: %@ is 2 to 59; a plural text where the language needs one. English: “Located %@ minutes ago”</extracomment>
         <translation>Vor %@ Minuten geortet</translation>
     </message>
     <message>
@@ -100,7 +100,7 @@
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>
-        <extracomment>Read aloud: %@ is 2 or more; word it so that it is right for each of them. English: “Located %@ hours ago”</extracomment>
+        <extracomment>Read aloud: %@ is 2 or more; a plural text where the language needs one. English: “Located %@ hours ago”</extracomment>
         <translation>Vor %@ Stunden geortet</translation>
     </message>
     <message>
@@ -110,7 +110,7 @@
     </message>
     <message>
         <source>ACCESSIBILITY_AT_LABEL</source>
-        <extracomment>Read aloud: %@ is a place, such as “Fish Market”, “Home” or “Brinmouth, HB”. English: “At %@”</extracomment>
+        <extracomment>Read aloud: %@ is a town (“Brinmouth, HB”), a place with a name (“Fish Market”, “Home”) or “Locating…”: word it so that each of them fits. English: “Place: %@”</extracomment>
         <translation>Ort: %@</translation>
     </message>
     <message>
@@ -120,12 +120,12 @@
     </message>
     <message>
         <source>LEAVING_LABEL</source>
-        <extracomment>A promise about one friend, of any gender; %@ is a place. English: “You’ll hear when they leave %@”</extracomment>
-        <translation>Nachricht beim Verlassen: %@</translation>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
+        <translation>Nachricht beim Verlassen von „%@“</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
-        <extracomment>A promise about one friend, of any gender; %@ is a place. English: “You’ll hear when they arrive at %@”</extracomment>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they reach %@”</extracomment>
         <translation>Nachricht bei Ankunft: %@</translation>
     </message>
     <message>
@@ -165,7 +165,7 @@
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_FRIEND_AT</source>
-        <extracomment>A map read aloud: %1$@ is a friend, %2$@ their place, such as “Fish Market” or “Home”. English: “Map: %1$@, at %2$@”</extracomment>
+        <extracomment>A map read aloud: %1$@ is a friend, %2$@ their place: a town, a place with a name such as “Fish Market”, or “Home”. English: “Map: %1$@, %2$@”</extracomment>
         <translation>Karte: %1$@, %2$@</translation>
     </message>
     <message>
@@ -224,9 +224,14 @@
         <translation>%@ nordwestlich von dir</translation>
     </message>
     <message>
+        <source>ACCESSIBILITY_MAP_SAME_PLACE</source>
+        <extracomment>The same for a friend or a place that is where the user is. English: “In the same place as you”</extracomment>
+        <translation>Am selben Ort wie du</translation>
+    </message>
+    <message>
         <source>ACCESSIBILITY_MAP_FENCE_AT</source>
         <extracomment>A map read aloud: a place that a friend leaves or arrives at; %@ is its name. English: “Map: the area around %@”</extracomment>
-        <translation>Karte: das Gebiet um %@</translation>
+        <translation>Karte: %@ und Umgebung</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_FENCE</source>

@@ -55,22 +55,22 @@
     </message>
     <message>
         <source>LOCATED_LESS_THAN_30SECONDS</source>
-        <extracomment>How old a position is: 31 to 59 seconds. The key’s name is misleading; %@ is always 30. Abbreviate the unit so that no plural is needed</extracomment>
+        <extracomment>How old a position is: 31 to 59 seconds. The key’s name is misleading; %@ is always 30</extracomment>
         <translation>Over %@ s ago</translation>
     </message>
     <message>
         <source>LOCATED_MINUTES</source>
-        <extracomment>How old a position is: %@ is 1 to 59. Abbreviate the unit so that no plural is needed</extracomment>
+        <extracomment>How old a position is: %@ is 1 to 59. Short; a plural text where the language needs one</extracomment>
         <translation>%@ min ago</translation>
     </message>
     <message>
         <source>LOCATED_LESS_THAN_1HR</source>
-        <extracomment>How old a position is: 60 to 119 minutes. The key’s name is misleading; %@ is always 1. Abbreviate the unit</extracomment>
+        <extracomment>How old a position is: 60 to 119 minutes. The key’s name is misleading; %@ is always 1</extracomment>
         <translation>Over %@ h ago</translation>
     </message>
     <message>
         <source>LOCATED_MORE_THAN_1HR</source>
-        <extracomment>How old a position is: %@ is 2 or more. Abbreviate the unit so that no plural is needed</extracomment>
+        <extracomment>How old a position is: %@ is 2 or more. Short; a plural text where the language needs one</extracomment>
         <translation>%@ h ago</translation>
     </message>
     <message>
@@ -90,7 +90,7 @@
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MINUTES</source>
-        <extracomment>Read aloud: %@ is 2 to 59; word it so that it is right for each of them</extracomment>
+        <extracomment>Read aloud: %@ is 2 to 59; a plural text where the language needs one</extracomment>
         <translation>Located %@ minutes ago</translation>
     </message>
     <message>
@@ -100,7 +100,7 @@
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>
-        <extracomment>Read aloud: %@ is 2 or more; word it so that it is right for each of them</extracomment>
+        <extracomment>Read aloud: %@ is 2 or more; a plural text where the language needs one</extracomment>
         <translation>Located %@ hours ago</translation>
     </message>
     <message>
@@ -110,8 +110,8 @@
     </message>
     <message>
         <source>ACCESSIBILITY_AT_LABEL</source>
-        <extracomment>Read aloud: %@ is a place, such as “Fish Market”, “Home” or “Brinmouth, HB”</extracomment>
-        <translation>At %@</translation>
+        <extracomment>Read aloud: %@ is a town (“Brinmouth, HB”), a place with a name (“Fish Market”, “Home”) or “Locating…”: word it so that each of them fits</extracomment>
+        <translation>Place: %@</translation>
     </message>
     <message>
         <source>IMMEDIATE_LABEL</source>
@@ -120,13 +120,13 @@
     </message>
     <message>
         <source>LEAVING_LABEL</source>
-        <extracomment>A promise about one friend, of any gender; %@ is a place</extracomment>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit</extracomment>
         <translation>You’ll hear when they leave %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
-        <extracomment>A promise about one friend, of any gender; %@ is a place</extracomment>
-        <translation>You’ll hear when they arrive at %@</translation>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit</extracomment>
+        <translation>You’ll hear when they reach %@</translation>
     </message>
     <message>
         <source>LEAVING_LABEL_ABSOLUTE</source>
@@ -165,8 +165,8 @@
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_FRIEND_AT</source>
-        <extracomment>A map read aloud: %1$@ is a friend, %2$@ their place, such as “Fish Market” or “Home”</extracomment>
-        <translation>Map: %1$@, at %2$@</translation>
+        <extracomment>A map read aloud: %1$@ is a friend, %2$@ their place: a town, a place with a name such as “Fish Market”, or “Home”</extracomment>
+        <translation>Map: %1$@, %2$@</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_FRIEND</source>
@@ -222,6 +222,11 @@
         <source>ACCESSIBILITY_MAP_NORTHWEST</source>
         <extracomment>The same</extracomment>
         <translation>%@ north-west of you</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SAME_PLACE</source>
+        <extracomment>The same for a friend or a place that is where the user is</extracomment>
+        <translation>In the same place as you</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_FENCE_AT</source>

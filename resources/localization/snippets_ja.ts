@@ -55,22 +55,22 @@
     </message>
     <message>
         <source>LOCATED_LESS_THAN_30SECONDS</source>
-        <extracomment>How old a position is: 31 to 59 seconds. The key’s name is misleading; %@ is always 30. Abbreviate the unit so that no plural is needed. English: “Over %@ s ago”</extracomment>
+        <extracomment>How old a position is: 31 to 59 seconds. The key’s name is misleading; %@ is always 30. English: “Over %@ s ago”</extracomment>
         <translation>%@秒以上前</translation>
     </message>
     <message>
         <source>LOCATED_MINUTES</source>
-        <extracomment>How old a position is: %@ is 1 to 59. Abbreviate the unit so that no plural is needed. English: “%@ min ago”</extracomment>
+        <extracomment>How old a position is: %@ is 1 to 59. Short; a plural text where the language needs one. English: “%@ min ago”</extracomment>
         <translation>%@分前</translation>
     </message>
     <message>
         <source>LOCATED_LESS_THAN_1HR</source>
-        <extracomment>How old a position is: 60 to 119 minutes. The key’s name is misleading; %@ is always 1. Abbreviate the unit. English: “Over %@ h ago”</extracomment>
+        <extracomment>How old a position is: 60 to 119 minutes. The key’s name is misleading; %@ is always 1. English: “Over %@ h ago”</extracomment>
         <translation>%@時間以上前</translation>
     </message>
     <message>
         <source>LOCATED_MORE_THAN_1HR</source>
-        <extracomment>How old a position is: %@ is 2 or more. Abbreviate the unit so that no plural is needed. English: “%@ h ago”</extracomment>
+        <extracomment>How old a position is: %@ is 2 or more. Short; a plural text where the language needs one. English: “%@ h ago”</extracomment>
         <translation>%@時間前</translation>
     </message>
     <message>
@@ -90,7 +90,7 @@
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MINUTES</source>
-        <extracomment>Read aloud: %@ is 2 to 59; word it so that it is right for each of them. English: “Located %@ minutes ago”</extracomment>
+        <extracomment>Read aloud: %@ is 2 to 59; a plural text where the language needs one. English: “Located %@ minutes ago”</extracomment>
         <translation>%@分前の位置情報です</translation>
     </message>
     <message>
@@ -100,7 +100,7 @@
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>
-        <extracomment>Read aloud: %@ is 2 or more; word it so that it is right for each of them. English: “Located %@ hours ago”</extracomment>
+        <extracomment>Read aloud: %@ is 2 or more; a plural text where the language needs one. English: “Located %@ hours ago”</extracomment>
         <translation>%@時間前の位置情報です</translation>
     </message>
     <message>
@@ -110,7 +110,7 @@
     </message>
     <message>
         <source>ACCESSIBILITY_AT_LABEL</source>
-        <extracomment>Read aloud: %@ is a place, such as “Fish Market”, “Home” or “Brinmouth, HB”. English: “At %@”</extracomment>
+        <extracomment>Read aloud: %@ is a town (“Brinmouth, HB”), a place with a name (“Fish Market”, “Home”) or “Locating…”: word it so that each of them fits. English: “Place: %@”</extracomment>
         <translation>場所：%@</translation>
     </message>
     <message>
@@ -120,12 +120,12 @@
     </message>
     <message>
         <source>LEAVING_LABEL</source>
-        <extracomment>A promise about one friend, of any gender; %@ is a place. English: “You’ll hear when they leave %@”</extracomment>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
         <translation>%@を出たらお知らせします</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
-        <extracomment>A promise about one friend, of any gender; %@ is a place. English: “You’ll hear when they arrive at %@”</extracomment>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they reach %@”</extracomment>
         <translation>%@に着いたらお知らせします</translation>
     </message>
     <message>
@@ -165,7 +165,7 @@
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_FRIEND_AT</source>
-        <extracomment>A map read aloud: %1$@ is a friend, %2$@ their place, such as “Fish Market” or “Home”. English: “Map: %1$@, at %2$@”</extracomment>
+        <extracomment>A map read aloud: %1$@ is a friend, %2$@ their place: a town, a place with a name such as “Fish Market”, or “Home”. English: “Map: %1$@, %2$@”</extracomment>
         <translation>地図：%1$@、%2$@</translation>
     </message>
     <message>
@@ -222,6 +222,11 @@
         <source>ACCESSIBILITY_MAP_NORTHWEST</source>
         <extracomment>The same. English: “%@ north-west of you”</extracomment>
         <translation>北西へ %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SAME_PLACE</source>
+        <extracomment>The same for a friend or a place that is where the user is. English: “In the same place as you”</extracomment>
+        <translation>あなたと同じ場所</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_MAP_FENCE_AT</source>

@@ -71,7 +71,7 @@ class SharingTest(unittest.TestCase):
     def test_resting_user_one_command_then_quiet(self):
         self.serve(track(1, 1))
         result = self.live(3, "Share my location")
-        self.assertIn("Friends can see where you are, At Brinmouth, HB, Mara Lind", result.stdout)
+        self.assertIn("Friends can see where you are, Place: Brinmouth, HB, Mara Lind", result.stdout)
         self.assertNotIn("Locating", result.stdout)
         self.assertEqual(self.commands(), [("showHideLocation", "200")])
 
@@ -161,7 +161,7 @@ class SharingTest(unittest.TestCase):
         self.live(0.5, "Hide my location")
         self.assertFalse(self.is_visible())
         result = self.live(2, "Share my location")
-        self.assertIn("At Brinmouth, HB, Mara Lind", result.stdout)
+        self.assertIn("Place: Brinmouth, HB, Mara Lind", result.stdout)
         self.assertTrue(self.is_visible())
 
     def test_answers_that_say_little(self):

@@ -10,10 +10,10 @@ TEST(ConfiguredAssistantTest, TheLanguageIsTheGivenOne) {
 }
 
 TEST(ConfiguredAssistantTest, DirectionFollowsTheScript) {
-    for (const char* language : {"ar", "ar-EG", "he", "fa-IR", "ur", "az-Arab", "ks"}) {
+    for (const char* language : {"ar", "ar-EG", "he", "fa-IR", "ur", "az-Arab", "ks", "iw", "qps-plocm"}) {
         EXPECT_TRUE(ConfiguredAssistant(language).languageIsRightToLeft()) << language;
     }
-    for (const char* language : {"en", "de-CH", "ja", "az", "ar-Latn", "", "nonsense tag"}) {
+    for (const char* language : {"en", "de-CH", "ja", "az", "ar-Latn", "qps", "", "nonsense tag"}) {
         EXPECT_FALSE(ConfiguredAssistant(language).languageIsRightToLeft()) << language;
     }
     EXPECT_FALSE(ConfiguredAssistant(std::nullopt).languageIsRightToLeft());

@@ -6,12 +6,19 @@
 #include <QFile>
 #include <QXmlStreamReader>
 #include <algorithm>
+#include <array>
 #include <map>
+#include <memory>
 #include <set>
 #include <string>
 #include <vector>
 
+#include <unicode/locid.h>
+#include <unicode/plurrule.h>
+#include <unicode/strenum.h>
+
 #include "platform/base/Format.h"
+#include "platform/base/PluralText.h"
 
 namespace ktr::linux_ {
 
@@ -62,6 +69,40 @@ std::multiset<int> argumentsOf(const std::string& text) {
     return arguments;
 }
 
+/// What a text can read like: itself, or each branch of a plural text by its category.
+std::map<std::string, std::string> formsOf(const std::string& text) {
+    if (!platform::PluralText::isPlural(text)) {
+        return {{"other", text}};
+    }
+    std::map<std::string, std::string> forms;
+    const auto other = platform::PluralText::branch(text, "other");
+    EXPECT_TRUE(other) << text;
+    for (const char* category : {"zero", "one", "two", "few", "many", "other"}) {
+        const auto branch = platform::PluralText::branch(text, category);
+        if (branch && (std::string(category) == "other" || branch->data() != other->data())) {
+            forms.emplace(category, *branch);
+        }
+    }
+    return forms;
+}
+
+/// The forms that numbers take in a language.
+std::set<std::string> categoriesOf(const std::string& language) {
+    UErrorCode status = U_ZERO_ERROR;
+    const std::unique_ptr<icu::PluralRules> rules(
+        icu::PluralRules::forLocale(icu::Locale::forLanguageTag(language, status), status));
+    const std::unique_ptr<icu::StringEnumeration> words(rules->getKeywords(status));
+    std::set<std::string> out;
+    while (const char* word = words->next(nullptr, status)) {
+        out.insert(word);
+    }
+    EXPECT_TRUE(U_SUCCESS(status)) << language;
+    return out;
+}
+
+constexpr std::array kLanguages = {"en", "de", "fr", "es", "pt", "it", "nl",      "sv",      "pl", "uk", "ru",
+                                   "tr", "el", "ar", "he", "fa", "hi", "zh-Hans", "zh-Hant", "ja", "ko"};
+
 class QtLocalizationTest : public ::testing::TestWithParam<const char*> {
   protected:
     /// Files of this bundle, by language.
@@ -90,7 +131,8 @@ class ProjectsTexts : public QtLocalization {
 
 TEST_P(QtLocalizationTest, EveryLanguage_HasEveryKey) {
     const auto all = languages();
-    for (const char* language : {"en", "de", "ar", "ja"}) {
+    EXPECT_EQ(all.size(), kLanguages.size());
+    for (const char* language : kLanguages) {
         ASSERT_TRUE(all.contains(language)) << language;
     }
     for (const auto& [language, texts] : all) {
@@ -105,7 +147,31 @@ TEST_P(QtLocalizationTest, EveryLanguage_TakesTheSameArguments) {
     const auto all = languages();
     for (const auto& [language, texts] : all) {
         for (const auto& [key, text] : texts) {
-            EXPECT_EQ(argumentsOf(text), argumentsOf(all.at("en").at(key))) << language << " " << key << ": " << text;
+            const auto expected = argumentsOf(formsOf(all.at("en").at(key)).at("other"));
+            for (const auto& [category, form] : formsOf(text)) {
+                // "An hour ago", "two hours ago": some languages have words for those that show no number.
+                const bool mayLack = category == "zero" || category == "one" || category == "two";
+                auto others = expected;
+                others.erase(1);
+                const auto taken = argumentsOf(form);
+                EXPECT_TRUE(taken == expected || (mayLack && taken == others))
+                    << language << " " << key << " " << category << ": " << text;
+            }
+            EXPECT_TRUE(std::includes(taken.begin(), taken.end(), expected.begin(), expected.end()) &&
+                        *taken.rbegin() <= static_cast<int>(expected.size()))
+                << language << " " << key << " " << category << ": " << text;
+        }
+    }
+}
+}
+
+TEST_P(QtLocalizationTest, PluralTexts_HaveTheFormsOfTheirLanguageAndNoOthers) {
+    for (const auto& [language, texts] : languages()) {
+        const auto categories = categoriesOf(language);
+        for (const auto& [key, text] : texts) {
+            for (const auto& [category, form] : formsOf(text)) {
+                EXPECT_TRUE(categories.contains(category)) << language << " " << key << ": " << category;
+            }
         }
     }
 }
@@ -136,7 +202,7 @@ INSTANTIATE_TEST_SUITE_P(Bundles, QtLocalizationTest, ::testing::Values("snippet
                          [](const auto& tested) { return tested.param; });
 
 TEST(QtLocalizationTextsTest, TheBuiltInLabels_StandInBothTables) {
-    for (const char* language : {"en", "de", "ar", "ja"}) {
+    for (const char* language : kLanguages) {
         const ProjectsTexts texts(language);
         for (const char* label : {"_$!<home>!$_", "_$!<work>!$_", "_$!<school>!$_", "_$!<gym>!$_", "_$!<other>!$_"}) {
             const auto shown = texts.text(label, QtLocalization::kSnippetsBundle);
@@ -155,7 +221,7 @@ TEST(QtLocalizationTextsTest, TheWordsReadAsTheyShould) {
     EXPECT_EQ(filled("CITY_STATE_LABEL", {"Brinmouth", "HB"}), "Brinmouth, HB");
     EXPECT_EQ(filled("LOCATED_MINUTES", {"4"}), "4\u00a0min ago");
     EXPECT_EQ(filled("LOCATED_LESS_THAN_30SECONDS", {"30"}), "Over 30\u00a0s ago");
-    EXPECT_EQ(filled("ARRIVING_LABEL", {"Work"}), "You’ll hear when they arrive at Work");
+    EXPECT_EQ(filled("ARRIVING_LABEL", {"Work"}), "You’ll hear when they reach Work");
     const ProjectsTexts arabic("ar-EG");
     EXPECT_EQ(platform::formatted(arabic.text("CITY_STATE_LABEL", QtLocalization::kSnippetsBundle), {"برينماوث", "HB"}),
               "برينماوث، HB");
@@ -166,9 +232,34 @@ TEST(QtLocalizationTextsTest, TheWordsReadAsTheyShould) {
 }
 
 TEST(QtLocalizationTextsTest, ALanguageWithoutTexts_ReadsEnglish) {
-    for (const char* language : {"fr-FR", "", "en-AU", "en_US"}) {
-        EXPECT_EQ(ProjectsTexts(language).text("APPLICATION_NAME", QtLocalization::kSnippetsBundle), "Friends")
-            << language;
+    for (const char* language : {"nb-NO", "", "en-AU", "en_US", "no such language", "cs", "sr-Latn"}) {
+        const ProjectsTexts texts(language);
+        EXPECT_EQ(texts.text("APPLICATION_NAME", QtLocalization::kSnippetsBundle), "Friends") << language;
+        EXPECT_EQ(texts.languageOfTexts(), "en") << language;
+    }
+}
+
+TEST(QtLocalizationTextsTest, ARegionOrAScript_FindsTheLanguagesTexts) {
+    const std::map<std::string, std::string> expected = {{"pt-BR", "pt"},
+                                                         {"pt-PT", "pt"},
+                                                         {"zh", "zh-Hans"},
+                                                         {"zh-CN", "zh-Hans"},
+                                                         {"zh-SG", "zh-Hans"},
+                                                         {"zh-TW", "zh-Hant"},
+                                                         {"zh-HK", "zh-Hant"},
+                                                         {"zh-MO", "zh-Hant"},
+                                                         {"zh-Hant-HK", "zh-Hant"},
+                                                         {"zh-Hans-TW", "zh-Hans"},
+                                                         {"zh_TW", "zh-Hant"},
+                                                         {"he-IL", "he"},
+                                                         {"iw", "he"},
+                                                         {"iw-IL", "he"},
+                                                         {"es-419", "es"},
+                                                         {"fr-CA", "fr"},
+                                                         {"ar-AE", "ar"},
+                                                         {"en-u-ms-metric", "en"}};
+    for (const auto& [language, found] : expected) {
+        EXPECT_EQ(ProjectsTexts(language).languageOfTexts(), found) << language;
     }
 }
 

@@ -24,7 +24,7 @@ class MapSentencesTest : public test::MapTest {
         set("ACCESSIBILITY_MAP_YOU", "Map: you are here");
         set("ACCESSIBILITY_MAP_YOU_UNKNOWN", "Map: where you are is not known yet");
         set("ACCESSIBILITY_MAP_SENTENCES", "%1$@. %2$@");
-        set("ACCESSIBILITY_DISTANCE", "%@ away");
+        set("ACCESSIBILITY_MAP_SAME_PLACE", "In the same place as you");
         for (const char* way : {"NORTH", "NORTHEAST", "EAST", "SOUTHEAST", "SOUTH", "SOUTHWEST", "WEST", "NORTHWEST"}) {
             set(std::string("ACCESSIBILITY_MAP_") + way, std::string("%@ ") + way);
         }
@@ -55,7 +55,7 @@ TEST_F(MapSentencesTest, Direction_IsTheNearestOfEight) {
 
 TEST_F(MapSentencesTest, SamePlace_HasNoDirection) {
     user->position = position(51.0, -1.0);
-    EXPECT_EQ(ofFriend(placed(ann(), 51.0, -1.0)), "Map: Ann. Accurate to 10 metres. 0 m away");
+    EXPECT_EQ(ofFriend(placed(ann(), 51.0, -1.0)), "Map: Ann. Accurate to 10 metres. In the same place as you");
 }
 
 TEST_F(MapSentencesTest, UserUnknown_NoDistance) {

@@ -1,0 +1,152 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="el" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>TODAY</source>
+        <extracomment>Above a question; %@ is the time of day. English: “Today, %@”</extracomment>
+        <translation>Σήμερα, %@</translation>
+    </message>
+    <message>
+        <source>DISTANCE_TEXT</source>
+        <extracomment>A frame around each distance (%@, with its unit), for a language that needs one; usually %@ alone. English: “%@”</extracomment>
+        <translation>%@</translation>
+    </message>
+    <message>
+        <source>_$!&lt;home&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Home”</extracomment>
+        <translation>Σπίτι</translation>
+    </message>
+    <message>
+        <source>_$!&lt;work&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Work”</extracomment>
+        <translation>Εργασία</translation>
+    </message>
+    <message>
+        <source>_$!&lt;school&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “School”</extracomment>
+        <translation>Σχολείο</translation>
+    </message>
+    <message>
+        <source>_$!&lt;gym&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Gym”</extracomment>
+        <translation>Γυμναστήριο</translation>
+    </message>
+    <message>
+        <source>_$!&lt;other&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Other”</extracomment>
+        <translation>Άλλο μέρος</translation>
+    </message>
+    <message>
+        <source>ASK_FIELD</source>
+        <extracomment>What stands in the empty field, and its name for a screen reader. English: “Ask about your friends”</extracomment>
+        <translation>Ρωτήστε για τους φίλους σας</translation>
+    </message>
+    <message>
+        <source>ASK_SEND</source>
+        <extracomment>The button that sends the question. English: “Send”</extracomment>
+        <translation>Αποστολή</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_NOW</source>
+        <extracomment>Status line: answers keep coming. English: “Live · updated just now”</extracomment>
+        <translation>Ζωντανά · ενημερώθηκε μόλις τώρα</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_SECONDS</source>
+        <extracomment>The same; %@ is a number of seconds. English: “Live · updated %@ s ago”</extracomment>
+        <translation>Ζωντανά · ενημερώθηκε πριν από %@ δευτ.</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_MINUTES</source>
+        <extracomment>The same; %@ is a number of minutes. English: “Live · updated %@ min ago”</extracomment>
+        <translation>Ζωντανά · ενημερώθηκε πριν από %@ λεπ.</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_HOURS</source>
+        <extracomment>The same; %@ is a number of hours. English: “Live · updated %@ h ago”</extracomment>
+        <translation>Ζωντανά · ενημερώθηκε πριν από %@ ώ.</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_NOW</source>
+        <extracomment>Status line: no more answers come by themselves. English: “Paused · updated just now”</extracomment>
+        <translation>Σε παύση · ενημερώθηκε μόλις τώρα</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_SECONDS</source>
+        <extracomment>The same; %@ is a number of seconds. English: “Paused · updated %@ s ago”</extracomment>
+        <translation>Σε παύση · ενημερώθηκε πριν από %@ δευτ.</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_MINUTES</source>
+        <extracomment>The same; %@ is a number of minutes. English: “Paused · updated %@ min ago”</extracomment>
+        <translation>Σε παύση · ενημερώθηκε πριν από %@ λεπ.</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_HOURS</source>
+        <extracomment>The same; %@ is a number of hours. English: “Paused · updated %@ h ago”</extracomment>
+        <translation>Σε παύση · ενημερώθηκε πριν από %@ ώ.</translation>
+    </message>
+    <message>
+        <source>STATUS_FINDING_YOU</source>
+        <extracomment>Status line: the user's own position is looked for. English: “Finding where you are…”</extracomment>
+        <translation>Αναζήτηση της τοποθεσίας σας…</translation>
+    </message>
+    <message>
+        <source>STATUS_HIDDEN</source>
+        <extracomment>The status line while friends cannot see where the user is. English: “Your location is hidden”</extracomment>
+        <translation>Η τοποθεσία σας είναι κρυφή</translation>
+    </message>
+    <message>
+        <source>STATUS_ASKING</source>
+        <extracomment>Status line: a question waits for its answer. English: “Asking…”</extracomment>
+        <translation>Υποβολή ερώτησης…</translation>
+    </message>
+    <message>
+        <source>STATUS_OFFLINE</source>
+        <extracomment>Status line: the service cannot be reached, and nothing is on screen. English: “Offline.”</extracomment>
+        <translation>Εκτός σύνδεσης.</translation>
+    </message>
+    <message>
+        <source>STATUS_OFFLINE_SINCE</source>
+        <extracomment>The same with an answer on screen; %@ is the time of day when it was known. English: “Offline. Showing what was known at %@.”</extracomment>
+        <translation>Εκτός σύνδεσης. Τελευταία γνωστά στοιχεία: %@.</translation>
+    </message>
+    <message>
+        <source>STATUS_SIGN_IN</source>
+        <extracomment>Status line: the service does not take the account's credentials, or there is no account. English: “Sign in again to see your friends.”</extracomment>
+        <translation>Συνδεθείτε ξανά για να δείτε τους φίλους σας.</translation>
+    </message>
+    <message>
+        <source>ANSWER_UNREACHABLE</source>
+        <extracomment>Below a question that nobody answered. English: “Your assistant is out of reach right now.”</extracomment>
+        <translation>Ο βοηθός σας δεν είναι διαθέσιμος αυτή τη στιγμή.</translation>
+    </message>
+    <message>
+        <source>ANSWER_SIGN_IN</source>
+        <extracomment>Below a question that was asked without an account. English: “Sign in to ask about your friends.”</extracomment>
+        <translation>Συνδεθείτε για να ρωτήσετε για τους φίλους σας.</translation>
+    </message>
+    <message>
+        <source>ANSWER_NOT_SHOWN</source>
+        <extracomment>Below a question whose answer is of a kind that cannot be shown. English: “This answer cannot be shown here.”</extracomment>
+        <translation>Αυτή η απάντηση δεν μπορεί να εμφανιστεί εδώ.</translation>
+    </message>
+    <message>
+        <source>MAP_NOT_AVAILABLE</source>
+        <extracomment>In place of a map that nobody can draw. English: “Map not available”. English: “Map not available”</extracomment>
+        <translation>Ο χάρτης δεν είναι διαθέσιμος</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LINK</source>
+        <extracomment>What a screen reader would say, written down: %@ can be opened. English: “%@ (link)”</extracomment>
+        <translation>%@ (σύνδεσμος)</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_IMAGE</source>
+        <extracomment>The same: %@ describes a picture. English: “%@ (image)”</extracomment>
+        <translation>%@ (εικόνα)</translation>
+    </message>
+</context>
+</TS>

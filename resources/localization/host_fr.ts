@@ -1,0 +1,152 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="fr" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>TODAY</source>
+        <extracomment>Above a question; %@ is the time of day. English: “Today, %@”</extracomment>
+        <translation>Aujourd’hui, %@</translation>
+    </message>
+    <message>
+        <source>DISTANCE_TEXT</source>
+        <extracomment>A frame around each distance (%@, with its unit), for a language that needs one; usually %@ alone. English: “%@”</extracomment>
+        <translation>%@</translation>
+    </message>
+    <message>
+        <source>_$!&lt;home&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Home”</extracomment>
+        <translation>Domicile</translation>
+    </message>
+    <message>
+        <source>_$!&lt;work&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Work”</extracomment>
+        <translation>Travail</translation>
+    </message>
+    <message>
+        <source>_$!&lt;school&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “School”</extracomment>
+        <translation>École</translation>
+    </message>
+    <message>
+        <source>_$!&lt;gym&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Gym”</extracomment>
+        <translation>Salle de sport</translation>
+    </message>
+    <message>
+        <source>_$!&lt;other&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Other”</extracomment>
+        <translation>Autre lieu</translation>
+    </message>
+    <message>
+        <source>ASK_FIELD</source>
+        <extracomment>What stands in the empty field, and its name for a screen reader. English: “Ask about your friends”</extracomment>
+        <translation>Demandez où sont vos amis</translation>
+    </message>
+    <message>
+        <source>ASK_SEND</source>
+        <extracomment>The button that sends the question. English: “Send”</extracomment>
+        <translation>Envoyer</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_NOW</source>
+        <extracomment>Status line: answers keep coming. English: “Live · updated just now”</extracomment>
+        <translation>En direct · actualisé à l’instant</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_SECONDS</source>
+        <extracomment>The same; %@ is a number of seconds. English: “Live · updated %@ s ago”</extracomment>
+        <translation>En direct · actualisé il y a %@ s</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_MINUTES</source>
+        <extracomment>The same; %@ is a number of minutes. English: “Live · updated %@ min ago”</extracomment>
+        <translation>En direct · actualisé il y a %@ min</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_HOURS</source>
+        <extracomment>The same; %@ is a number of hours. English: “Live · updated %@ h ago”</extracomment>
+        <translation>En direct · actualisé il y a %@ h</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_NOW</source>
+        <extracomment>Status line: no more answers come by themselves. English: “Paused · updated just now”</extracomment>
+        <translation>En pause · actualisé à l’instant</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_SECONDS</source>
+        <extracomment>The same; %@ is a number of seconds. English: “Paused · updated %@ s ago”</extracomment>
+        <translation>En pause · actualisé il y a %@ s</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_MINUTES</source>
+        <extracomment>The same; %@ is a number of minutes. English: “Paused · updated %@ min ago”</extracomment>
+        <translation>En pause · actualisé il y a %@ min</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_HOURS</source>
+        <extracomment>The same; %@ is a number of hours. English: “Paused · updated %@ h ago”</extracomment>
+        <translation>En pause · actualisé il y a %@ h</translation>
+    </message>
+    <message>
+        <source>STATUS_FINDING_YOU</source>
+        <extracomment>Status line: the user's own position is looked for. English: “Finding where you are…”</extracomment>
+        <translation>Recherche de votre position…</translation>
+    </message>
+    <message>
+        <source>STATUS_HIDDEN</source>
+        <extracomment>The status line while friends cannot see where the user is. English: “Your location is hidden”</extracomment>
+        <translation>Votre position est masquée</translation>
+    </message>
+    <message>
+        <source>STATUS_ASKING</source>
+        <extracomment>Status line: a question waits for its answer. English: “Asking…”</extracomment>
+        <translation>Question en cours…</translation>
+    </message>
+    <message>
+        <source>STATUS_OFFLINE</source>
+        <extracomment>Status line: the service cannot be reached, and nothing is on screen. English: “Offline.”</extracomment>
+        <translation>Hors ligne.</translation>
+    </message>
+    <message>
+        <source>STATUS_OFFLINE_SINCE</source>
+        <extracomment>The same with an answer on screen; %@ is the time of day when it was known. English: “Offline. Showing what was known at %@.”</extracomment>
+        <translation>Hors ligne. Dernières données connues : %@.</translation>
+    </message>
+    <message>
+        <source>STATUS_SIGN_IN</source>
+        <extracomment>Status line: the service does not take the account's credentials, or there is no account. English: “Sign in again to see your friends.”</extracomment>
+        <translation>Reconnectez-vous pour voir vos amis.</translation>
+    </message>
+    <message>
+        <source>ANSWER_UNREACHABLE</source>
+        <extracomment>Below a question that nobody answered. English: “Your assistant is out of reach right now.”</extracomment>
+        <translation>Votre assistant est injoignable pour le moment.</translation>
+    </message>
+    <message>
+        <source>ANSWER_SIGN_IN</source>
+        <extracomment>Below a question that was asked without an account. English: “Sign in to ask about your friends.”</extracomment>
+        <translation>Connectez-vous pour demander où sont vos amis.</translation>
+    </message>
+    <message>
+        <source>ANSWER_NOT_SHOWN</source>
+        <extracomment>Below a question whose answer is of a kind that cannot be shown. English: “This answer cannot be shown here.”</extracomment>
+        <translation>Cette réponse ne peut pas être affichée ici.</translation>
+    </message>
+    <message>
+        <source>MAP_NOT_AVAILABLE</source>
+        <extracomment>In place of a map that nobody can draw. English: “Map not available”. English: “Map not available”</extracomment>
+        <translation>Carte non disponible</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LINK</source>
+        <extracomment>What a screen reader would say, written down: %@ can be opened. English: “%@ (link)”</extracomment>
+        <translation>%@ (lien)</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_IMAGE</source>
+        <extracomment>The same: %@ describes a picture. English: “%@ (image)”</extracomment>
+        <translation>%@ (image)</translation>
+    </message>
+</context>
+</TS>

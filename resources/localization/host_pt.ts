@@ -1,0 +1,152 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="pt" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>TODAY</source>
+        <extracomment>Above a question; %@ is the time of day. English: “Today, %@”</extracomment>
+        <translation>Hoje, %@</translation>
+    </message>
+    <message>
+        <source>DISTANCE_TEXT</source>
+        <extracomment>A frame around each distance (%@, with its unit), for a language that needs one; usually %@ alone. English: “%@”</extracomment>
+        <translation>%@</translation>
+    </message>
+    <message>
+        <source>_$!&lt;home&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Home”</extracomment>
+        <translation>Casa</translation>
+    </message>
+    <message>
+        <source>_$!&lt;work&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Work”</extracomment>
+        <translation>Trabalho</translation>
+    </message>
+    <message>
+        <source>_$!&lt;school&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “School”</extracomment>
+        <translation>Escola</translation>
+    </message>
+    <message>
+        <source>_$!&lt;gym&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Gym”</extracomment>
+        <translation>Academia</translation>
+    </message>
+    <message>
+        <source>_$!&lt;other&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Other”</extracomment>
+        <translation>Outro local</translation>
+    </message>
+    <message>
+        <source>ASK_FIELD</source>
+        <extracomment>What stands in the empty field, and its name for a screen reader. English: “Ask about your friends”</extracomment>
+        <translation>Pergunte sobre seus amigos</translation>
+    </message>
+    <message>
+        <source>ASK_SEND</source>
+        <extracomment>The button that sends the question. English: “Send”</extracomment>
+        <translation>Enviar</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_NOW</source>
+        <extracomment>Status line: answers keep coming. English: “Live · updated just now”</extracomment>
+        <translation>Ao vivo · atualizado agora mesmo</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_SECONDS</source>
+        <extracomment>The same; %@ is a number of seconds. English: “Live · updated %@ s ago”</extracomment>
+        <translation>Ao vivo · atualizado há %@ s</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_MINUTES</source>
+        <extracomment>The same; %@ is a number of minutes. English: “Live · updated %@ min ago”</extracomment>
+        <translation>Ao vivo · atualizado há %@ min.</translation>
+    </message>
+    <message>
+        <source>STATUS_LIVE_HOURS</source>
+        <extracomment>The same; %@ is a number of hours. English: “Live · updated %@ h ago”</extracomment>
+        <translation>Ao vivo · atualizado há %@ h</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_NOW</source>
+        <extracomment>Status line: no more answers come by themselves. English: “Paused · updated just now”</extracomment>
+        <translation>Em pausa · atualizado agora mesmo</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_SECONDS</source>
+        <extracomment>The same; %@ is a number of seconds. English: “Paused · updated %@ s ago”</extracomment>
+        <translation>Em pausa · atualizado há %@ s</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_MINUTES</source>
+        <extracomment>The same; %@ is a number of minutes. English: “Paused · updated %@ min ago”</extracomment>
+        <translation>Em pausa · atualizado há %@ min.</translation>
+    </message>
+    <message>
+        <source>STATUS_PAUSED_HOURS</source>
+        <extracomment>The same; %@ is a number of hours. English: “Paused · updated %@ h ago”</extracomment>
+        <translation>Em pausa · atualizado há %@ h</translation>
+    </message>
+    <message>
+        <source>STATUS_FINDING_YOU</source>
+        <extracomment>Status line: the user's own position is looked for. English: “Finding where you are…”</extracomment>
+        <translation>Procurando sua localização…</translation>
+    </message>
+    <message>
+        <source>STATUS_HIDDEN</source>
+        <extracomment>The status line while friends cannot see where the user is. English: “Your location is hidden”</extracomment>
+        <translation>Sua localização está oculta</translation>
+    </message>
+    <message>
+        <source>STATUS_ASKING</source>
+        <extracomment>Status line: a question waits for its answer. English: “Asking…”</extracomment>
+        <translation>Perguntando…</translation>
+    </message>
+    <message>
+        <source>STATUS_OFFLINE</source>
+        <extracomment>Status line: the service cannot be reached, and nothing is on screen. English: “Offline.”</extracomment>
+        <translation>Sem conexão.</translation>
+    </message>
+    <message>
+        <source>STATUS_OFFLINE_SINCE</source>
+        <extracomment>The same with an answer on screen; %@ is the time of day when it was known. English: “Offline. Showing what was known at %@.”</extracomment>
+        <translation>Sem conexão. Últimos dados conhecidos: %@.</translation>
+    </message>
+    <message>
+        <source>STATUS_SIGN_IN</source>
+        <extracomment>Status line: the service does not take the account's credentials, or there is no account. English: “Sign in again to see your friends.”</extracomment>
+        <translation>Inicie sessão novamente para ver seus amigos.</translation>
+    </message>
+    <message>
+        <source>ANSWER_UNREACHABLE</source>
+        <extracomment>Below a question that nobody answered. English: “Your assistant is out of reach right now.”</extracomment>
+        <translation>Não é possível acessar seu assistente agora.</translation>
+    </message>
+    <message>
+        <source>ANSWER_SIGN_IN</source>
+        <extracomment>Below a question that was asked without an account. English: “Sign in to ask about your friends.”</extracomment>
+        <translation>Inicie sessão para perguntar sobre seus amigos.</translation>
+    </message>
+    <message>
+        <source>ANSWER_NOT_SHOWN</source>
+        <extracomment>Below a question whose answer is of a kind that cannot be shown. English: “This answer cannot be shown here.”</extracomment>
+        <translation>Esta resposta não pode ser mostrada aqui.</translation>
+    </message>
+    <message>
+        <source>MAP_NOT_AVAILABLE</source>
+        <extracomment>In place of a map that nobody can draw. English: “Map not available”. English: “Map not available”</extracomment>
+        <translation>Mapa não disponível</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LINK</source>
+        <extracomment>What a screen reader would say, written down: %@ can be opened. English: “%@ (link)”</extracomment>
+        <translation>%@ (link)</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_IMAGE</source>
+        <extracomment>The same: %@ describes a picture. English: “%@ (image)”</extracomment>
+        <translation>%@ (imagem)</translation>
+    </message>
+</context>
+</TS>

@@ -1,0 +1,262 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="ko" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>APPLICATION_NAME</source>
+        <extracomment>The title of the card. English: “Friends”</extracomment>
+        <translation>친구</translation>
+    </message>
+    <message>
+        <source>LOCATING_FRIENDS</source>
+        <extracomment>Shown while nobody has been found yet. English: “Finding your friends…”</extracomment>
+        <translation>친구를 찾는 중…</translation>
+    </message>
+    <message>
+        <source>NO_FRIENDS_FOUND</source>
+        <extracomment>Nobody is at the place that was asked for. English: “No friends found there.”</extracomment>
+        <translation>그곳에서 친구를 찾지 못했습니다.</translation>
+    </message>
+    <message>
+        <source>SHOW_ALL</source>
+        <extracomment>The last row of a list that shows only some friends; tapping it shows all. English: “Show all friends”</extracomment>
+        <translation>모든 친구 보기</translation>
+    </message>
+    <message>
+        <source>LOCATING</source>
+        <extracomment>In the place of a place, while one friend is still being looked for. English: “Locating…”</extracomment>
+        <translation>위치 확인 중…</translation>
+    </message>
+    <message>
+        <source>NO_LOCATION</source>
+        <extracomment>In the place of a place, when none is known. English: “No location found”</extracomment>
+        <translation>위치를 찾을 수 없음</translation>
+    </message>
+    <message>
+        <source>CITY_STATE_LABEL</source>
+        <extracomment>%1$@ is the city, %2$@ the state or its code; change their order where the language does. English: “%1$@, %2$@”</extracomment>
+        <translation>%2$@ %1$@</translation>
+    </message>
+    <message>
+        <source>HIDDEN_LOCATION</source>
+        <extracomment>In the user’s own row, in the place of a place, while friends cannot see it. English: “Hidden from friends”</extracomment>
+        <translation>친구에게 숨김</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_SHARED_LOCATION</source>
+        <extracomment>Read aloud before the user’s own row while friends can see where the user is. English: “Friends can see where you are”</extracomment>
+        <translation>친구가 내 위치를 볼 수 있음</translation>
+    </message>
+    <message>
+        <source>LOCATED_NOW</source>
+        <extracomment>How old a position is: up to 30 seconds. English: “Now”</extracomment>
+        <translation>지금</translation>
+    </message>
+    <message>
+        <source>LOCATED_LESS_THAN_30SECONDS</source>
+        <extracomment>How old a position is: 31 to 59 seconds. The key’s name is misleading; %@ is always 30. English: “Over %@ s ago”</extracomment>
+        <translation>%@초 이상 전</translation>
+    </message>
+    <message>
+        <source>LOCATED_MINUTES</source>
+        <extracomment>How old a position is: %@ is 1 to 59. Short; a plural text where the language needs one. English: “%@ min ago”</extracomment>
+        <translation>%@분 전</translation>
+    </message>
+    <message>
+        <source>LOCATED_LESS_THAN_1HR</source>
+        <extracomment>How old a position is: 60 to 119 minutes. The key’s name is misleading; %@ is always 1. English: “Over %@ h ago”</extracomment>
+        <translation>%@시간 이상 전</translation>
+    </message>
+    <message>
+        <source>LOCATED_MORE_THAN_1HR</source>
+        <extracomment>How old a position is: %@ is 2 or more. Short; a plural text where the language needs one. English: “%@ h ago”</extracomment>
+        <translation>%@시간 전</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_NOW</source>
+        <extracomment>Read aloud: how old a position is, up to 30 seconds. English: “Located now”</extracomment>
+        <translation>지금 위치</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_LESS_THAN_30SECONDS</source>
+        <extracomment>Read aloud: 31 to 59 seconds; %@ is always 30. English: “Located more than %@ seconds ago”</extracomment>
+        <translation>%@초 이상 전 위치</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_MINUTE</source>
+        <extracomment>Read aloud: one minute; %@ is always 1. English: “Located %@ minute ago”</extracomment>
+        <translation>%@분 전 위치</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_MINUTES</source>
+        <extracomment>Read aloud: %@ is 2 to 59; a plural text where the language needs one. English: “Located %@ minutes ago”</extracomment>
+        <translation>%@분 전 위치</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_LESS_THAN_1HR</source>
+        <extracomment>Read aloud: 60 to 119 minutes; %@ is always 1. English: “Located more than %@ hour ago”</extracomment>
+        <translation>%@시간 이상 전 위치</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>
+        <extracomment>Read aloud: %@ is 2 or more; a plural text where the language needs one. English: “Located %@ hours ago”</extracomment>
+        <translation>%@시간 전 위치</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_DISTANCE</source>
+        <extracomment>Read aloud: %@ is a distance with its unit. English: “%@ away”</extracomment>
+        <translation>%@ 거리</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_AT_LABEL</source>
+        <extracomment>Read aloud: %@ is a town (“Brinmouth, HB”), a place with a name (“Fish Market”, “Home”) or “Locating…”: word it so that each of them fits. English: “Place: %@”</extracomment>
+        <translation>장소: %@</translation>
+    </message>
+    <message>
+        <source>IMMEDIATE_LABEL</source>
+        <extracomment>A promise about one friend, of any gender: the user is told at once where they are. English: “You’ll hear where they are now”</extracomment>
+        <translation>지금 바로 위치를 알려 드립니다</translation>
+    </message>
+    <message>
+        <source>LEAVING_LABEL</source>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
+        <translation>출발 시 알림: %@</translation>
+    </message>
+    <message>
+        <source>ARRIVING_LABEL</source>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they reach %@”</extracomment>
+        <translation>도착 시 알림: %@</translation>
+    </message>
+    <message>
+        <source>LEAVING_LABEL_ABSOLUTE</source>
+        <extracomment>The same without a place. English: “You’ll hear when they leave”</extracomment>
+        <translation>출발 시 알림</translation>
+    </message>
+    <message>
+        <source>ARRIVING_LABEL_ABSOLUTE</source>
+        <extracomment>The same without a place. English: “You’ll hear when they arrive”</extracomment>
+        <translation>도착 시 알림</translation>
+    </message>
+    <message>
+        <source>_$!&lt;home&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Home”</extracomment>
+        <translation>집</translation>
+    </message>
+    <message>
+        <source>_$!&lt;work&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Work”</extracomment>
+        <translation>직장</translation>
+    </message>
+    <message>
+        <source>_$!&lt;school&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “School”</extracomment>
+        <translation>학교</translation>
+    </message>
+    <message>
+        <source>_$!&lt;gym&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Gym”</extracomment>
+        <translation>체육관</translation>
+    </message>
+    <message>
+        <source>_$!&lt;other&gt;!$_</source>
+        <extracomment>A built-in name for a place. English: “Other”</extracomment>
+        <translation>다른 장소</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FRIEND_AT</source>
+        <extracomment>A map read aloud: %1$@ is a friend, %2$@ their place: a town, a place with a name such as “Fish Market”, or “Home”. English: “Map: %1$@, %2$@”</extracomment>
+        <translation>지도: %1$@, %2$@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FRIEND</source>
+        <extracomment>A map read aloud: %@ is a friend whose place has no name. English: “Map: %@”</extracomment>
+        <translation>지도: %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_UNKNOWN</source>
+        <extracomment>A map read aloud: %@ is a friend whose place is not known. English: “Map: no place known for %@”</extracomment>
+        <translation>지도: %@, 장소를 알 수 없음</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_ACCURACY</source>
+        <extracomment>A map read aloud: how sure a place is; %@ is a length such as “25 metres”. English: “Accurate to %@”</extracomment>
+        <translation>정확도: %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_NORTH</source>
+        <extracomment>A map read aloud: the direction from the user; %@ is a distance such as “310 m”. English: “%@ north of you”</extracomment>
+        <translation>내 위치에서 북쪽으로 %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_NORTHEAST</source>
+        <extracomment>The same. English: “%@ north-east of you”</extracomment>
+        <translation>내 위치에서 북동쪽으로 %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_EAST</source>
+        <extracomment>The same. English: “%@ east of you”</extracomment>
+        <translation>내 위치에서 동쪽으로 %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SOUTHEAST</source>
+        <extracomment>The same. English: “%@ south-east of you”</extracomment>
+        <translation>내 위치에서 남동쪽으로 %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SOUTH</source>
+        <extracomment>The same. English: “%@ south of you”</extracomment>
+        <translation>내 위치에서 남쪽으로 %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SOUTHWEST</source>
+        <extracomment>The same. English: “%@ south-west of you”</extracomment>
+        <translation>내 위치에서 남서쪽으로 %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_WEST</source>
+        <extracomment>The same. English: “%@ west of you”</extracomment>
+        <translation>내 위치에서 서쪽으로 %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_NORTHWEST</source>
+        <extracomment>The same. English: “%@ north-west of you”</extracomment>
+        <translation>내 위치에서 북서쪽으로 %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SAME_PLACE</source>
+        <extracomment>The same for a friend or a place that is where the user is. English: “In the same place as you”</extracomment>
+        <translation>나와 같은 장소</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FENCE_AT</source>
+        <extracomment>A map read aloud: a place that a friend leaves or arrives at; %@ is its name. English: “Map: the area around %@”</extracomment>
+        <translation>지도: %@ 및 주변</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_FENCE</source>
+        <extracomment>The same without a name. English: “Map: the area of this notice”</extracomment>
+        <translation>지도: 이 알림의 구역</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_RADIUS</source>
+        <extracomment>A map read aloud: how large the area is; %@ is a length such as “200 metres”. English: “Radius: %@”</extracomment>
+        <translation>반경: %@</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_YOU</source>
+        <extracomment>A map read aloud: it shows the user. English: “Map: you are here”</extracomment>
+        <translation>지도: 현재 내 위치</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_YOU_UNKNOWN</source>
+        <extracomment>The same while the user’s position is not known. English: “Map: where you are is not known yet”</extracomment>
+        <translation>지도: 내 위치를 아직 알 수 없음</translation>
+    </message>
+    <message>
+        <source>ACCESSIBILITY_MAP_SENTENCES</source>
+        <extracomment>Two sentences of a map read aloud, without the last one’s full stop. English: “%1$@. %2$@”</extracomment>
+        <translation>%1$@. %2$@</translation>
+    </message>
+</context>
+</TS>
