@@ -24,6 +24,7 @@ std::vector<std::string> candidates(const std::string& language) {
     std::vector<std::string> out;
     UErrorCode status = U_ZERO_ERROR;
     auto locale = icu::Locale::forLanguageTag(language, status);
+    locale.canonicalize(status);
     if (U_SUCCESS(status) && !locale.isBogus()) {
         add(out, locale.toLanguageTag<std::string>(status));
         const std::string name = locale.getLanguage();

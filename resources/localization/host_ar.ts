@@ -136,7 +136,7 @@
     <message>
         <source>ANSWER_RESTRICTED</source>
         <extracomment>Below a question, while the device allows no friends’ locations. English: “Friends’ locations are switched off on this device.”</extracomment>
-        <translation>مواقع الأصدقاء معطّلة على هذا الجهاز.</translation>
+        <translation>مواقع الأصدقاء متوقفة على هذا الجهاز.</translation>
     </message>
     <message>
         <source>STATUS_UNREADABLE</source>

@@ -134,6 +134,16 @@
         <translation>Αυτή η απάντηση δεν μπορεί να εμφανιστεί εδώ.</translation>
     </message>
     <message>
+        <source>ANSWER_RESTRICTED</source>
+        <extracomment>Below a question, while the device allows no friends’ locations. English: “Friends’ locations are switched off on this device.”</extracomment>
+        <translation>Οι τοποθεσίες φίλων είναι απενεργοποιημένες σε αυτή τη συσκευή.</translation>
+    </message>
+    <message>
+        <source>STATUS_UNREADABLE</source>
+        <extracomment>Status line: the configuration is broken. English: “Your settings cannot be read.”</extracomment>
+        <translation>Δεν είναι δυνατή η ανάγνωση των ρυθμίσεών σας.</translation>
+    </message>
+    <message>
         <source>MAP_NOT_AVAILABLE</source>
         <extracomment>In place of a map that nobody can draw. English: “Map not available”. English: “Map not available”</extracomment>
         <translation>Ο χάρτης δεν είναι διαθέσιμος</translation>

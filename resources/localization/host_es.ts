@@ -134,6 +134,16 @@
         <translation>Esta respuesta no se puede mostrar aquí.</translation>
     </message>
     <message>
+        <source>ANSWER_RESTRICTED</source>
+        <extracomment>Below a question, while the device allows no friends’ locations. English: “Friends’ locations are switched off on this device.”</extracomment>
+        <translation>Las ubicaciones de amigos están desactivadas en este dispositivo.</translation>
+    </message>
+    <message>
+        <source>STATUS_UNREADABLE</source>
+        <extracomment>Status line: the configuration is broken. English: “Your settings cannot be read.”</extracomment>
+        <translation>No se pueden leer tus ajustes.</translation>
+    </message>
+    <message>
         <source>MAP_NOT_AVAILABLE</source>
         <extracomment>In place of a map that nobody can draw. English: “Map not available”. English: “Map not available”</extracomment>
         <translation>Mapa no disponible</translation>

@@ -134,6 +134,16 @@
         <translation>यह जवाब यहाँ नहीं दिखाया जा सकता।</translation>
     </message>
     <message>
+        <source>ANSWER_RESTRICTED</source>
+        <extracomment>Below a question, while the device allows no friends’ locations. English: “Friends’ locations are switched off on this device.”</extracomment>
+        <translation>इस डिवाइस पर दोस्तों की जगहें बंद हैं।</translation>
+    </message>
+    <message>
+        <source>STATUS_UNREADABLE</source>
+        <extracomment>Status line: the configuration is broken. English: “Your settings cannot be read.”</extracomment>
+        <translation>आपकी सेटिंग पढ़ी नहीं जा सकतीं।</translation>
+    </message>
+    <message>
         <source>MAP_NOT_AVAILABLE</source>
         <extracomment>In place of a map that nobody can draw. English: “Map not available”. English: “Map not available”</extracomment>
         <translation>नक्शा उपलब्ध नहीं है</translation>

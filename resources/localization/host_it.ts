@@ -134,6 +134,16 @@
         <translation>Questa risposta non può essere mostrata qui.</translation>
     </message>
     <message>
+        <source>ANSWER_RESTRICTED</source>
+        <extracomment>Below a question, while the device allows no friends’ locations. English: “Friends’ locations are switched off on this device.”</extracomment>
+        <translation>Le posizioni degli amici sono disattivate su questo dispositivo.</translation>
+    </message>
+    <message>
+        <source>STATUS_UNREADABLE</source>
+        <extracomment>Status line: the configuration is broken. English: “Your settings cannot be read.”</extracomment>
+        <translation>Impossibile leggere le tue impostazioni.</translation>
+    </message>
+    <message>
         <source>MAP_NOT_AVAILABLE</source>
         <extracomment>In place of a map that nobody can draw. English: “Map not available”. English: “Map not available”</extracomment>
         <translation>Mappa non disponibile</translation>

@@ -13,6 +13,8 @@ PROGRAM = os.environ["KTR_PROGRAM"]
 SCENARIOS = pathlib.Path(os.environ["KTR_SOURCE"]) / "resources" / "scenarios"
 # Every text of the pseudo-languages has accents on all of these letters.
 PLAIN = re.compile("[AaCcDdEeGgIiLlNnOoRrSsTtUuWwYyZz]+")
+# The names of units are the locale data's, which know no pseudo-language.
+UNITS = re.compile("[0-9.,]+[ \u00a0](kilo)?met(re|er)s?")
 MARKS = re.compile("[\u200f\u202e\u202c]")
 
 
@@ -43,14 +45,15 @@ class PseudoLanguageTest(unittest.TestCase):
         own = {text for text in texts_in(json.loads(scenario.read_text(encoding="utf-8"))) if text}
         own.update(text for text in contacts() if text)
         for line in self.described(scenario, language).splitlines():
-            left = line
+            if line in own:
+                continue
+            left = UNITS.sub("", line)
             for text in sorted(own, key=len, reverse=True):
                 left = left.replace(text, "")
             with self.subTest(scenario=scenario.name, line=line):
                 self.assertIsNone(PLAIN.search(left), f"not looked up: {PLAIN.findall(left)}")
                 self.assertEqual(line.count("["), line.count("]"))
-            if line not in own:
-                yield line
+            yield line
 
     def test_every_text_of_every_scenario_is_looked_up(self):
         scenarios = sorted(SCENARIOS.glob("*.json"))

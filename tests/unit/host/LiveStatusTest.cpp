@@ -28,6 +28,13 @@ TEST_F(LiveStatusTest, AnswerOnScreen_IsLive) {
     EXPECT_EQ(status(), (LiveStatus{LiveStatus::Mark::Live, "STATUS_LIVE_NOW"}));
 }
 
+TEST_F(LiveStatusTest, Numbers_StandInTheLanguagesDigits) {
+    facts.now = Date{100.0 + 5.0 * 60.0};
+    const LiveStatus::Words arabic{[](const std::string&) { return "قبل %@ دقائق"; }, [](Date) { return ""; },
+                                   [](std::int64_t number) { return number == 5 ? "٥" : "?"; }};
+    EXPECT_EQ(LiveStatus::of(facts, arabic).words, "قبل ٥ دقائق");
+}
+
 TEST_F(LiveStatusTest, HiddenUser_IsSaidInsteadOfHowLiveTheAnswerIs) {
     facts.hidden = true;
     EXPECT_EQ(status(), (LiveStatus{LiveStatus::Mark::Hidden, "STATUS_HIDDEN"}));

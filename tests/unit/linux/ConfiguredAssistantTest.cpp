@@ -10,7 +10,7 @@ TEST(ConfiguredAssistantTest, TheLanguageIsTheGivenOne) {
 }
 
 TEST(ConfiguredAssistantTest, DirectionFollowsTheScript) {
-    for (const char* language : {"ar", "ar-EG", "he", "fa-IR", "ur", "az-Arab", "ks", "iw", "qps-plocm"}) {
+    for (const char* language : {"ar", "ar-EG", "he", "fa-IR", "ur", "az-Arab", "ks", "iw", "iw-IL", "qps-plocm"}) {
         EXPECT_TRUE(ConfiguredAssistant(language).languageIsRightToLeft()) << language;
     }
     for (const char* language : {"en", "de-CH", "ja", "az", "ar-Latn", "qps", "", "nonsense tag"}) {

@@ -5,6 +5,8 @@
 #include <cmath>
 #include <limits>
 
+#include "linux/locale/IcuNumberFormatter.h"
+#include "linux/locale/LocaleRegion.h"
 #include "linux/positions/GeographicLibGeodesy.h"
 #include "tests/support/Doubles.h"
 
@@ -45,6 +47,17 @@ TEST_F(IcuDistanceCalculatorTest, UnitsFollowTheRegionAndWordsTheLanguage) {
 TEST_F(IcuDistanceCalculatorTest, Arabic_AbbreviatesTheUnitAndHasItsOwnDigits) {
     EXPECT_EQ(text("ar", "ar-EG", 120.0), "١٢٠\u00a0م");
     EXPECT_EQ(text("ar", "ar-EG", 2400.0), "٢٫٤\u00a0كم");
+}
+
+TEST_F(IcuDistanceCalculatorTest, Digits_AreThoseOfTheNumbersBesideIt) {
+    for (const char* region : {"ar-AE", "ar-EG", "ar-MA", "fa-IR", "de-DE"}) {
+        for (const char* language : {"ar", "fa", "en-GB"}) {
+            const auto five =
+                IcuNumberFormatter(LocaleRegion(region).localeWithLanguage(language)).plainStringFromInteger(5);
+            EXPECT_EQ(text(language, region, 5.0).substr(0, five.size()), five) << language << " in " << region;
+        }
+    }
+    EXPECT_EQ(text("ar", "ar-AE", 120.0), "120\u00a0م");
 }
 
 TEST_F(IcuDistanceCalculatorTest, WithoutALanguage_TheRegionsOwnIsUsed) {

@@ -157,12 +157,8 @@ TEST_P(QtLocalizationTest, EveryLanguage_TakesTheSameArguments) {
                 EXPECT_TRUE(taken == expected || (mayLack && taken == others))
                     << language << " " << key << " " << category << ": " << text;
             }
-            EXPECT_TRUE(std::includes(taken.begin(), taken.end(), expected.begin(), expected.end()) &&
-                        *taken.rbegin() <= static_cast<int>(expected.size()))
-                << language << " " << key << " " << category << ": " << text;
         }
     }
-}
 }
 
 TEST_P(QtLocalizationTest, PluralTexts_HaveTheFormsOfTheirLanguageAndNoOthers) {
