@@ -1,5 +1,5 @@
-// What texts that depend on a number cost: the filling of a text without branches, the question whether it has any, which
-// such a text pays for nothing, and the filling of one that has.
+// What texts that depend on a number cost: the filling of a text without branches, the question whether it has any,
+// which such a text pays for nothing, and the filling of one that has.
 #include <benchmark/benchmark.h>
 
 #include <memory>
@@ -18,7 +18,8 @@ using ktr::platform::formatted;
 using ktr::platform::Platform;
 
 const std::string kPlain = "Located %@ minutes ago";
-const std::string kPlural = "{0, plural, one{%@ минуту назад} few{%@ минуты назад} many{%@ минут назад} other{%@ минуты назад}}";
+const std::string kPlural =
+    "{0, plural, one{%@ минуту назад} few{%@ минуты назад} many{%@ минут назад} other{%@ минуты назад}}";
 
 void PlainText(benchmark::State& state) {
     const FormatArguments arguments = {"22"};

@@ -19,6 +19,13 @@ QLocale localeFor(const std::string& language, const std::string& region) {
     return both.language() == own.language() ? both : own;
 }
 
+/// The short format of a locale in letters that Qt fills: some say with "B" which part of the day it is, which Qt shows
+/// as a "B".
+QString shortFormat(const QLocale& locale) {
+    QString format = locale.timeFormat(QLocale::ShortFormat);
+    return format.replace(QLatin1Char('B'), QLatin1String("ap"));
+}
+
 }  // namespace
 
 std::string clockText(platform::Date moment, int offsetSeconds, const std::string& language,
@@ -26,7 +33,8 @@ std::string clockText(platform::Date moment, int offsetSeconds, const std::strin
     const double sinceEpoch = moment.secondsSinceReferenceDate + platform::kSecondsFrom1970ToReferenceDate;
     const QDateTime face =
         QDateTime::fromSecsSinceEpoch(static_cast<qint64>(std::floor(sinceEpoch)), Qt::OffsetFromUTC, offsetSeconds);
-    return localeFor(language, region).toString(face.time(), QLocale::ShortFormat).toStdString();
+    const QLocale locale = localeFor(language, region);
+    return locale.toString(face.time(), shortFormat(locale)).toStdString();
 }
 
 }  // namespace ktr::host

@@ -11,6 +11,7 @@
 #include <unicode/ulocdata.h>
 
 #include "linux/locale/LocaleRegion.h"
+#include "linux/locale/UnitWidth.h"
 #include "platform/base/Format.h"
 
 namespace ktr::linux_ {
@@ -148,11 +149,9 @@ IcuDistanceCalculator::IcuDistanceCalculator(Settings settings, std::optional<Un
     const icu::Locale language =
         withDigitsOf(localeOf(settings_.languageLocale.value_or(settings_.measurementSystemLocale)),
                      settings_.measurementSystemLocale);
-    // In Arabic the short form spells the unit out and inflects it; the narrow one is the abbreviation.
-    const bool narrow = std::string_view(language.getLanguage()) == "ar";
     UErrorCode status = U_ZERO_ERROR;
-    const auto road = icu::number::NumberFormatter::forSkeleton(
-        narrow ? u"unit/meter usage/road unit-width-narrow" : u"unit/meter usage/road unit-width-short", status);
+    const auto road = icu::number::NumberFormatter::forSkeleton(u"unit/meter usage/road", status)
+                          .unitWidth(UnitWidth::inRow(language));
     const icu::Locale locale = withRegionOverride(language, region);
     formatter_->road = road.locale(locale);
     formatter_->tens = road.precision(icu::number::Precision::increment(kStep)).locale(locale);

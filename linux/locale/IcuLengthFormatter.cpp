@@ -6,6 +6,7 @@
 #include <unicode/locid.h>
 #include <unicode/numberformatter.h>
 
+#include "linux/locale/UnitWidth.h"
 #include "platform/base/Json.h"
 
 namespace ktr::linux_ {
@@ -47,12 +48,8 @@ std::string IcuLengthFormatter::text(double amount, platform::LengthUnit unit, p
         locale = icu::Locale::getRoot();
         status = U_ZERO_ERROR;
     }
-    // In Arabic the short form spells the unit out and inflects it; the narrow one is the abbreviation.
-    const bool isArabic = std::string_view(locale.getLanguage()) == "ar";
     const bool isShort = width == platform::LengthWidth::Short;
-    const auto unitWidth = !isShort   ? UNUM_UNIT_WIDTH_FULL_NAME
-                           : isArabic ? UNUM_UNIT_WIDTH_NARROW
-                                      : UNUM_UNIT_WIDTH_SHORT;
+    const auto unitWidth = isShort ? UnitWidth::inRow(locale) : UNUM_UNIT_WIDTH_FULL_NAME;
     const auto formatter = icu::number::NumberFormatter::withLocale(locale)
                                .unit(unitOf(unit))
                                .unitWidth(unitWidth)

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "linux/paint/JapanesePhrases.h"
 #include "platform/base/Utf8.h"
 
 namespace ktr::linux_ {
@@ -69,7 +70,7 @@ QString cleaned(const std::string& utf8) {
 
 PreparedText::PreparedText(const platform::AttributedString& source) {
     for (const auto& run : source.runs()) {
-        QString piece = cleaned(run.text);
+        QString piece = JapanesePhrases::joined(cleaned(run.text));
         piece.append(closers(piece));
         runs.push_back({text.size(), piece.size(), run.font, run.color, run.paragraph});
         text.append(piece);

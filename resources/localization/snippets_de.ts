@@ -96,7 +96,7 @@
     <message>
         <source>ACCESSIBILITY_LOCATED_LESS_THAN_1HR</source>
         <extracomment>Read aloud: 60 to 119 minutes; %@ is always 1. English: “Located more than %@ hour ago”</extracomment>
-        <translation>Vor mehr als %@ Stunde geortet</translation>
+        <translation>{0, plural, one{Vor mehr als einer Stunde geortet} other{Vor mehr als %@ Stunden geortet}}</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>

@@ -96,7 +96,7 @@
     <message>
         <source>ACCESSIBILITY_LOCATED_LESS_THAN_1HR</source>
         <extracomment>Read aloud: 60 to 119 minutes; %@ is always 1. English: “Located more than %@ hour ago”</extracomment>
-        <translation>Ubicación de hace más de %@ hora</translation>
+        <translation>{0, plural, one{Ubicación de hace más de una hora} other{Ubicación de hace más de %@ horas}}</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>

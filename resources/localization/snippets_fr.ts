@@ -96,7 +96,7 @@
     <message>
         <source>ACCESSIBILITY_LOCATED_LESS_THAN_1HR</source>
         <extracomment>Read aloud: 60 to 119 minutes; %@ is always 1. English: “Located more than %@ hour ago”</extracomment>
-        <translation>Position relevée il y a plus d’%@ heure</translation>
+        <translation>{0, plural, one{Position relevée il y a plus d’une heure} other{Position relevée il y a plus de %@ heures}}</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>

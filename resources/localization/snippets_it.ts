@@ -96,7 +96,7 @@
     <message>
         <source>ACCESSIBILITY_LOCATED_LESS_THAN_1HR</source>
         <extracomment>Read aloud: 60 to 119 minutes; %@ is always 1. English: “Located more than %@ hour ago”</extracomment>
-        <translation>Posizione rilevata più di %@ ora fa</translation>
+        <translation>{0, plural, one{Posizione rilevata più di un’ora fa} other{Posizione rilevata più di %@ ore fa}}</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>

@@ -96,7 +96,7 @@
     <message>
         <source>ACCESSIBILITY_LOCATED_LESS_THAN_1HR</source>
         <extracomment>Read aloud: 60 to 119 minutes; %@ is always 1. English: “Located more than %@ hour ago”</extracomment>
-        <translation>Położenie ustalone ponad %@ godzinę temu</translation>
+        <translation>{0, plural, one{Położenie ustalone ponad godzinę temu} other{Położenie ustalone ponad %@ godz. temu}}</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>

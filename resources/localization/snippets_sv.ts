@@ -76,32 +76,32 @@
     <message>
         <source>ACCESSIBILITY_LOCATED_NOW</source>
         <extracomment>Read aloud: how old a position is, up to 30 seconds. English: “Located now”</extracomment>
-        <translation>Position från nu</translation>
+        <translation>Lokaliserad nu</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_LESS_THAN_30SECONDS</source>
         <extracomment>Read aloud: 31 to 59 seconds; %@ is always 30. English: “Located more than %@ seconds ago”</extracomment>
-        <translation>Position för mer än %@ sekunder sedan</translation>
+        <translation>Lokaliserad för mer än %@ sekunder sedan</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MINUTE</source>
         <extracomment>Read aloud: one minute; %@ is always 1. English: “Located %@ minute ago”</extracomment>
-        <translation>Position för %@ minut sedan</translation>
+        <translation>Lokaliserad för %@ minut sedan</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MINUTES</source>
         <extracomment>Read aloud: %@ is 2 to 59; a plural text where the language needs one. English: “Located %@ minutes ago”</extracomment>
-        <translation>Position för %@ minuter sedan</translation>
+        <translation>Lokaliserad för %@ minuter sedan</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_LESS_THAN_1HR</source>
         <extracomment>Read aloud: 60 to 119 minutes; %@ is always 1. English: “Located more than %@ hour ago”</extracomment>
-        <translation>Position för mer än %@ timme sedan</translation>
+        <translation>{0, plural, one{Lokaliserad för mer än en timme sedan} other{Lokaliserad för mer än %@ timmar sedan}}</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>
         <extracomment>Read aloud: %@ is 2 or more; a plural text where the language needs one. English: “Located %@ hours ago”</extracomment>
-        <translation>Position för %@ timmar sedan</translation>
+        <translation>Lokaliserad för %@ timmar sedan</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_DISTANCE</source>

@@ -96,7 +96,7 @@
     <message>
         <source>ACCESSIBILITY_LOCATED_LESS_THAN_1HR</source>
         <extracomment>Read aloud: 60 to 119 minutes; %@ is always 1. English: “Located more than %@ hour ago”</extracomment>
-        <translation>Konum %@ saatten uzun süre önce alındı</translation>
+        <translation>{0, plural, one{Konum bir saatten uzun süre önce alındı} other{Konum %@ saatten uzun süre önce alındı}}</translation>
     </message>
     <message>
         <source>ACCESSIBILITY_LOCATED_MORE_THAN_1HR</source>

@@ -20,6 +20,7 @@ std::string withoutSpaces(std::string text) {
 
 TEST(KTRClockTextTest, Clock_FollowsTheLanguage) {
     EXPECT_EQ(clockText({kNoon + 5 * 3600 + 42 * 60}, 0, "en-GB", "en-GB"), "17:42");
+    EXPECT_EQ(clockText({kNoon + 5 * 3600 + 42 * 60}, 0, "zh-TW", "zh-TW"), "下午5:42");
     EXPECT_EQ(clockText({kNoon + 5 * 3600 + 42 * 60}, 0, "de", "de-DE"), "17:42");
     EXPECT_EQ(withoutSpaces(clockText({kNoon + 5 * 3600 + 42 * 60}, 0, "en-US", "en-US")), "5:42PM");
 }

@@ -49,6 +49,11 @@ TEST_F(IcuDistanceCalculatorTest, Arabic_AbbreviatesTheUnitAndHasItsOwnDigits) {
     EXPECT_EQ(text("ar", "ar-EG", 2400.0), "٢٫٤\u00a0كم");
 }
 
+TEST_F(IcuDistanceCalculatorTest, Persian_HasNoLatinLetters) {
+    EXPECT_EQ(text("fa", "fa-IR", 120.0), "۱۲۰\u00a0متر");
+    EXPECT_EQ(text("fa", "fa-IR", 2400.0), "۲٫۴\u00a0کیلومتر");
+}
+
 TEST_F(IcuDistanceCalculatorTest, Digits_AreThoseOfTheNumbersBesideIt) {
     for (const char* region : {"ar-AE", "ar-EG", "ar-MA", "fa-IR", "de-DE"}) {
         for (const char* language : {"ar", "fa", "en-GB"}) {
