@@ -1,0 +1,99 @@
+#include "server/answers/LocationAnswers.h"
+
+#include <GeographicLib/Geodesic.hpp>
+#include <algorithm>
+#include <cmath>
+
+namespace ktr::server {
+
+using platform::Dictionary;
+using platform::Value;
+
+namespace {
+
+/// How near to a requested place counts as being there, metres.
+constexpr double kAtPlace = 150.0;
+
+double distance(const CommandPlace& place, const Seen& seen) {
+    double metres = 0.0;
+    GeographicLib::Geodesic::WGS84().Inverse(place.latitude, place.longitude, seen.latitude, seen.longitude, metres);
+    return metres;
+}
+
+Dictionary locationOf(const Seen& seen) {
+    Dictionary location{{"latitude", seen.latitude}, {"longitude", seen.longitude}};
+    if (seen.accuracy) {
+        location.set("horizontalAccuracy", *seen.accuracy);
+    }
+    location.set("timestamp", seen.time * 1000);
+    return location;
+}
+
+Dictionary entryOf(const Seen& seen, const LocationsRequest& request) {
+    Dictionary entry{{"status", 200}, {"location", locationOf(seen)}};
+    if (request.mine) {
+        // Whole centimetres, as decimal text.
+        entry.set("distanceInMeters", Value(std::round(distance(*request.mine, seen) * 100.0) / 100.0).description());
+    }
+    if (request.wanted) {
+        entry.set("match", distance(*request.wanted, seen) <= kAtPlace);
+    }
+    return entry;
+}
+
+Dictionary serverContext() {
+    return {{"minCallbackIntervalInMS", LocationAnswers::kInterval * 1000.0},
+            {"callbackTimeoutIntervalInMS", LocationAnswers::kTimeout * 1000.0}};
+}
+
+bool isEmail(const std::string& handle) {
+    return handle.find('@') != std::string::npos;
+}
+
+}  // namespace
+
+Dictionary LocationAnswers::locations(const LocationsRequest& request, std::vector<AskedFriend> friends) {
+    std::vector<AskedFriend> found;
+    Value::Array rest;
+    for (AskedFriend& one : friends) {
+        if (!one.seen) {
+            rest.emplace_back(one.handle);
+            continue;
+        }
+        const auto before = std::find_if(found.begin(), found.end(),
+                                         [&](const AskedFriend& other) { return other.person == one.person; });
+        if (before == found.end()) {
+            found.push_back(std::move(one));
+        } else if (!isEmail(before->handle) && isEmail(one.handle)) {
+            // An e-mail address comes back as it was asked for; a phone number may not.
+            before->handle = one.handle;
+        }
+    }
+    Dictionary locations;
+    Value::Array order;
+    for (const AskedFriend& one : found) {
+        locations.set(one.handle, entryOf(*one.seen, request));
+        order.emplace_back(one.handle);
+    }
+    order.insert(order.end(), rest.begin(), rest.end());
+    Dictionary context = serverContext();
+    if (request.clientId) {
+        context.set("clientId", *request.clientId);
+    }
+    return {{"statusCode", 200}, {"serverContext", context}, {"locations", locations}, {"emails", order}};
+}
+
+Dictionary LocationAnswers::sharing(bool hidden, const std::string& preferredHandle,
+                                    const std::optional<CommandPlace>& place, std::int64_t now) {
+    Dictionary myInfo;
+    if (!preferredHandle.empty()) {
+        myInfo.set("preferredEmail", preferredHandle);
+    }
+    myInfo.set("hidden", hidden);
+    myInfo.set("location", hidden || !place
+                               ? Value()
+                               : Value(locationOf({place->latitude, place->longitude, place->accuracy, now})));
+    return {{"statusCode", 200}, {"serverContext", serverContext()}, {"myInfo", myInfo}};
+}
+
+}  // namespace ktr::server

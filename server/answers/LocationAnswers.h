@@ -1,0 +1,40 @@
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "platform/base/Value.h"
+#include "server/answers/CommandRequest.h"
+#include "server/rules/Visibility.h"
+
+namespace ktr::server {
+
+/// Somebody who was asked for, and what the one who asks may see of them.
+struct AskedFriend {
+    std::string handle;       ///< as it was asked for
+    std::int64_t person = 0;  ///< 0: nobody has this handle
+    std::optional<Seen> seen;
+};
+
+/// Words the protocol's answers, of what `Visibility` lets through and of nothing else. Any thread.
+class LocationAnswers {
+  public:
+    /// Seconds between two answers, and after which a client stops asking.
+    static constexpr double kInterval = 30.0;
+    static constexpr double kTimeout = 600.0;
+    /// How many handles one command may name.
+    static constexpr std::size_t kMostHandles = 1000;
+
+    /// The answer to a get-locations command. Friends who are seen come first, one handle each, the e-mail address if
+    /// one was asked for. All others are listed as they were asked for, without an entry, whatever the reason.
+    static platform::Dictionary locations(const LocationsRequest& request, std::vector<AskedFriend> friends);
+
+    /// The answer to a command about the user's own sharing. `place` serves the answer and is kept nowhere.
+    static platform::Dictionary sharing(bool hidden, const std::string& preferredHandle,
+                                        const std::optional<CommandPlace>& place, std::int64_t now);
+};
+
+}  // namespace ktr::server

@@ -1,0 +1,70 @@
+#include "server/answers/PhoneAnswer.h"
+
+#include <cmath>
+
+#include "server/store/Secret.h"
+
+namespace ktr::server {
+
+using platform::Dictionary;
+using platform::Value;
+
+bool PhoneAnswer::isSound(const Dictionary& message) {
+    for (const auto& [name, value] : message) {
+        if (value.isNull() || (value.number() && !std::isfinite(*value.number()))) {
+            return false;
+        }
+    }
+    const auto text = [&](const char* name) {
+        const Value* value = message.find(name);
+        return value != nullptr && value->string() != nullptr && !value->string()->empty() ? *value->string() : "";
+    };
+    if (text("tid").empty()) {
+        return false;
+    }
+    if (text("_type") == "card") {
+        return !text("name").empty();
+    }
+    const auto number = [&](const char* name) {
+        const Value* value = message.find(name);
+        return value == nullptr ? std::nullopt : value->number();
+    };
+    const Value* time = message.find("tst");
+    return text("_type") == "location" && time != nullptr && time->integer() && *time->integer() > 0 && number("lat") &&
+           std::abs(*number("lat")) <= 90.0 && number("lon") && std::abs(*number("lon")) <= 180.0;
+}
+
+Value::Array PhoneAnswer::messages(const std::vector<PhoneFriend>& friends, bool withCards) {
+    Value::Array messages;
+    const auto add = [&](const Dictionary& message) {
+        if (isSound(message)) {
+            messages.emplace_back(message);
+        }
+    };
+    for (const PhoneFriend& one : friends) {
+        if (withCards) {
+            add({{"_type", "card"}, {"tid", one.name}, {"name", one.name}});
+        }
+        Dictionary location{{"_type", "location"},
+                            {"tid", one.name},
+                            {"lat", one.seen.latitude},
+                            {"lon", one.seen.longitude},
+                            {"tst", one.seen.time}};
+        if (one.seen.accuracy) {
+            // The apps read whole metres.
+            location.set("acc", static_cast<std::int64_t>(std::ceil(*one.seen.accuracy)));
+        }
+        add(location);
+    }
+    return messages;
+}
+
+std::string PhoneAnswer::cardsHash(const std::vector<PhoneFriend>& friends) {
+    std::string names;
+    for (const PhoneFriend& one : friends) {
+        names += one.name + '\n';
+    }
+    return Secret::hash(names);
+}
+
+}  // namespace ktr::server

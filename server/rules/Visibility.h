@@ -1,0 +1,50 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <vector>
+
+#include "server/ingest/Fix.h"
+#include "server/rules/Grant.h"
+
+namespace ktr::server {
+
+/// All that decides what one person sees of another.
+struct Sharing {
+    bool hidden = false;          ///< the owner hides from everybody
+    std::int64_t shownSince = 0;  ///< the last time the owner stopped hiding: nothing from before is seen again
+    std::int64_t retention = 0;   ///< seconds: nothing older is seen
+    std::int64_t latest = 0;      ///< the latest time the service has seen: a clock set back ends nothing later
+    std::optional<Grant> grant;   ///< none: a stranger
+    std::vector<Fix> fixes;       ///< the owner's, by ascending time
+};
+
+/// What is seen of somebody. Everything that leaves the service is made of this and of nothing else.
+struct Seen {
+    double latitude = 0.0;  ///< degrees
+    double longitude = 0.0;
+    std::optional<double> accuracy;  ///< metres; none when not known
+    std::int64_t time = 0;           ///< seconds since 1970
+
+    bool operator==(const Seen&) const = default;
+};
+
+/// Who sees what: the only way from a stored fix to anybody's eyes. Any thread.
+class Visibility {
+  public:
+    /// None for a stranger, somebody hidden, a grant that has not begun or is over, and while there is nothing to see:
+    /// these cannot be told apart.
+    ///
+    /// At exact precision the fix with the greatest time is seen as it is. Below it the centre of a cell is seen, which
+    /// follows the person only on a grid of time (town 15 minutes, 1 km 5 minutes), by what was heard before the
+    /// present slot began, and after two slots in the new cell: whoever crosses an edge to and fro is not seen to. The
+    /// time is that of the last fix, rounded down to the grid.
+    static std::optional<Seen> visible(const Sharing& sharing, std::int64_t now);
+
+    /// Metres; 0 for exact.
+    static double cellSide(Precision precision);
+    /// Seconds; 1 for exact.
+    static std::int64_t slotLength(Precision precision);
+};
+
+}  // namespace ktr::server

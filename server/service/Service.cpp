@@ -1,0 +1,286 @@
+#include "server/service/Service.h"
+
+#include <algorithm>
+
+#include "documents/JsonReader.h"
+#include "platform/base/Json.h"
+#include "server/answers/CommandRequest.h"
+#include "server/answers/LocationAnswers.h"
+#include "server/answers/PhoneAnswer.h"
+#include "server/http/BasicCredentials.h"
+#include "server/ingest/FixRules.h"
+#include "server/ingest/PhoneMessages.h"
+#include "server/ingest/SealedText.h"
+
+namespace ktr::server {
+
+using platform::Dictionary;
+using platform::Value;
+
+namespace {
+
+constexpr const char* kCommands = "/qloxservice/friends/va/";
+/// Between two steps of deleting what is too old, seconds.
+constexpr double kSweepPause = 1.0;
+
+bool isLoopback(const std::string& peer) {
+    return peer.rfind("127.", 0) == 0 || peer.empty() || peer == "::";
+}
+
+/// The host of a Host header, without its port.
+std::string hostOf(const std::string& header) {
+    const std::size_t colon = header.rfind(':');
+    const bool hasPort = colon != std::string::npos && header.find(']', colon) == std::string::npos;
+    return hasPort ? header.substr(0, colon) : header;
+}
+
+}  // namespace
+
+Service::Service(Setup setup)
+    : hosts_(std::move(setup.hosts)),
+      now_(std::move(setup.now)),
+      store_(std::move(setup.store)),
+      http_(httpSetup(setup)) {}
+
+Service::~Service() {
+    stop();
+}
+
+HttpServer::Setup Service::httpSetup(Setup& setup) {
+    HttpServer::Setup http = std::move(setup.http);
+    http.handler = [this](const HttpRequest& request, const HttpReply& reply) { route(request, reply); };
+    return http;
+}
+
+std::string Service::start() {
+    std::string failure = http_.start();
+    if (failure.empty()) {
+        http_.later(0.0, [this] { sweep(); });
+    }
+    return failure;
+}
+
+void Service::stop() {
+    http_.stop();
+    // Its last commits still answer through the edge.
+    store_.reset();
+}
+
+void Service::sweep() {
+    store_->deleteOld(now_(), nullptr);
+    http_.later(kSweepPause, [this] { sweep(); });
+}
+
+bool Service::isForUs(const HttpRequest& request) const {
+    return hosts_.empty() || std::any_of(hosts_.begin(), hosts_.end(), [&](const std::string& host) {
+               return equalIgnoringCase(host, hostOf(request.headerText("Host")));
+           });
+}
+
+void Service::route(const HttpRequest& request, const HttpReply& reply) {
+    const bool reads = request.method == "GET";
+    const bool posts = request.method == "POST";
+    if (reads && request.path == "/health" && isLoopback(request.peer)) {
+        return reply.send(HttpResponse::json(200, "{}"));
+    }
+    if (reads && request.path == "/metrics" && isLoopback(request.peer)) {
+        HttpResponse response;
+        response.headers.emplace_back("Content-Type", "text/plain; version=0.0.4");
+        response.body = counters_.text();
+        return reply.send(response);
+    }
+    if (!isForUs(request)) {
+        return reply.send(refusal(421, "this service has another name"));
+    }
+    if (posts && request.path == "/pub") {
+        return takeOwnTracks(request, reply);
+    }
+    if ((posts || reads) && request.path == "/") {
+        return takeParameters(request, reply);
+    }
+    if (posts && request.path.rfind(kCommands, 0) == 0) {
+        return answerCommand(request, reply);
+    }
+    reply.send(refusal(404, "there is no such path"));
+}
+
+void Service::refuseCredentials(const HttpRequest& request, const HttpReply& reply) {
+    ++counters_.wrongCredentials;
+    HttpResponse response = refusal(401, "the credentials are missing or wrong");
+    response.headers.emplace_back("WWW-Authenticate", "Basic realm=\"ktr\"");
+    http_.later(delays_.afterFailure(request.peer, FailureDelays::Clock::now()),
+                [reply, response] { reply.send(response); });
+}
+
+std::optional<Device> Service::authenticated(const HttpRequest& request, const std::string& ownSecret, DeviceKind kind,
+                                             const HttpReply& reply) {
+    const auto basic = BasicCredentials::read(request.headerText("Authorization"));
+    const std::string& secret = basic ? basic->password : ownSecret;
+    bool failed = false;
+    auto device = secret.empty() ? std::nullopt : store_->deviceOf(secret, failed);
+    if (failed) {
+        ++counters_.storeFailures;
+        reply.send(refusal(503, "the store cannot be read"));
+        return std::nullopt;
+    }
+    if (!device || device->kind != kind || (basic && !sameSecret(basic->user, device->name))) {
+        refuseCredentials(request, reply);
+        return std::nullopt;
+    }
+    return device;
+}
+
+std::vector<Fix> Service::admitted(const Report& report) {
+    ++counters_.posts;
+    counters_.junk += report.kind == Report::Kind::Junk ? 1 : 0;
+    std::vector<Fix> fixes;
+    for (const RawFix& raw : report.fixes) {
+        const auto [fix, loss] = FixRules::admit(raw, now_());
+        counters_.droppedNoPlace += loss == FixRules::Loss::NoPlace ? 1 : 0;
+        counters_.droppedNoTime += loss == FixRules::Loss::NoTime ? 1 : 0;
+        counters_.droppedTooOld += loss == FixRules::Loss::TooOld ? 1 : 0;
+        if (fix) {
+            ++counters_.fixes;
+            fixes.push_back(*fix);
+        }
+    }
+    return fixes;
+}
+
+void Service::takeOwnTracks(const HttpRequest& request, const HttpReply& reply) {
+    const auto device = authenticated(request, "", DeviceKind::Phone, reply);
+    if (!device) {
+        return;
+    }
+    const Report report = PhoneMessages::ownTracks(request.body, device->key);
+    store_->keep(device->id, device->person, admitted(report), store_->present(now_()),
+                 [this, device = *device, sealed = report.sealed, reply](bool good) {
+                     if (!good) {
+                         // A phone keeps what got a 5xx and sends it again.
+                         ++counters_.storeFailures;
+                         return reply.send(refusal(503, "the store cannot be written"));
+                     }
+                     http_.later(0.0, [this, device, sealed, reply] { reply.send(friendsAnswer(device, sealed)); });
+                 });
+}
+
+HttpResponse Service::friendsAnswer(const Device& device, bool sealed) {
+    std::vector<PhoneFriend> friends;
+    std::vector<std::int64_t> seen;
+    for (const Friend& one : store_->friendsOf(device.person)) {
+        if (const auto what = Visibility::visible(one.sharing, now_())) {
+            friends.push_back({one.name, *what});
+            seen.push_back(one.person);
+        }
+    }
+    const std::string hash = PhoneAnswer::cardsHash(friends);
+    const bool withCards = hash != device.cardsSent;
+    std::string body = platform::writeJson(PhoneAnswer::messages(friends, withCards));
+    if (sealed) {
+        const auto box = SealedText::seal(body, device.key);
+        // Nothing in the clear to a phone that seals.
+        body = box ? platform::writeJson(Dictionary{{"_type", "encrypted"}, {"data", *box}}) : "[]";
+    }
+    if (withCards) {
+        store_->noteCards(device.id, hash, nullptr);
+    }
+    if (!seen.empty()) {
+        store_->noteLooks(device.person, seen, false, now_(), nullptr);
+    }
+    return HttpResponse::json(200, body);
+}
+
+void Service::takeParameters(const HttpRequest& request, const HttpReply& reply) {
+    const bool isJson = request.headerText("Content-Type").rfind("application/json", 0) == 0;
+    const Report report =
+        isJson ? PhoneMessages::traccar(request.body) : PhoneMessages::parameters(request.query + "&" + request.body);
+    const auto device = authenticated(request, report.device, DeviceKind::Phone, reply);
+    if (!device) {
+        return;
+    }
+    store_->keep(device->id, device->person, admitted(report), store_->present(now_()), [this, reply](bool good) {
+        counters_.storeFailures += good ? 0 : 1;
+        reply.send(good ? HttpResponse() : refusal(503, "the store cannot be written"));
+    });
+}
+
+void Service::answerCommand(const HttpRequest& request, const HttpReply& reply) {
+    const auto device = authenticated(request, "", DeviceKind::Reader, reply);
+    if (!device) {
+        return;
+    }
+    ++counters_.commands;
+    if (const auto refused = refusalOfCommand(request)) {
+        return reply.send(*refused);
+    }
+    const auto document = documents::JsonReader::read(request.body);
+    const auto* value = std::get_if<Value>(&document);
+    if (value == nullptr || value->dictionary() == nullptr) {
+        return reply.send(refusal(400, "expected a JSON object as the body"));
+    }
+    const std::string command = request.path.substr(std::string(kCommands).size());
+    if (command == "getlocations") {
+        reply.send(locations(*device, *value->dictionary()));
+    } else if (command == "showHideLocation") {
+        changeSharing(*device, *value->dictionary(), reply);
+    } else {
+        reply.send(refusal(404, "there is no such path"));
+    }
+}
+
+HttpResponse Service::locations(const Device& device, const Dictionary& body) {
+    std::string complaint;
+    const auto request = LocationsRequest::read(body, complaint);
+    if (!request) {
+        return refusal(400, complaint);
+    }
+    if (request->handles.size() > LocationAnswers::kMostHandles) {
+        return refusal(400, "$.handles: expected at most " + std::to_string(LocationAnswers::kMostHandles));
+    }
+    store_->present(now_());
+    std::vector<AskedFriend> asked;
+    std::vector<std::int64_t> seen;
+    for (const std::string& handle : request->handles) {
+        const auto owner = store_->personOf(handle);
+        const auto sharing = owner ? store_->sharing(device.person, *owner) : std::nullopt;
+        asked.push_back({handle, owner.value_or(0), sharing ? Visibility::visible(*sharing, now_()) : std::nullopt});
+        if (asked.back().seen) {
+            seen.push_back(*owner);
+        }
+    }
+    if (!seen.empty()) {
+        store_->noteLooks(device.person, seen, true, now_(), nullptr);
+    }
+    return HttpResponse::json(200, platform::writeJson(LocationAnswers::locations(*request, std::move(asked))));
+}
+
+void Service::changeSharing(const Device& device, const Dictionary& body, const HttpReply& reply) {
+    std::string complaint;
+    const auto request = SharingRequest::read(body, complaint);
+    if (!request) {
+        return reply.send(refusal(400, complaint));
+    }
+    const auto answer = [this, device, place = request->place, reply](bool hides) {
+        const auto person = store_->person(device.person);
+        if (!person) {
+            ++counters_.storeFailures;
+            return reply.send(refusal(503, "the store cannot be read"));
+        }
+        const std::string handle = person->handles.empty() ? std::string() : person->handles.front();
+        reply.send(HttpResponse::json(
+            200, platform::writeJson(LocationAnswers::sharing(hides || person->hidden, handle, place, now_()))));
+    };
+    // "No" alone shows nobody: it may be an older answer that repeats itself.
+    if (!request->hides) {
+        return answer(false);
+    }
+    store_->hide(device.person, now_(), [this, answer, reply](bool good) {
+        if (!good) {
+            ++counters_.storeFailures;
+            return reply.send(refusal(503, "the store cannot be written"));
+        }
+        http_.later(0.0, [answer] { answer(true); });
+    });
+}
+
+}  // namespace ktr::server

@@ -1,0 +1,69 @@
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "platform/base/Value.h"
+#include "server/http/HttpServer.h"
+#include "server/ingest/Report.h"
+#include "server/service/FailureDelays.h"
+#include "server/service/ServiceCounters.h"
+#include "server/store/Store.h"
+
+namespace ktr::server {
+
+/// The service as the network meets it: phones post to "/pub" (OwnTracks) and "/" (OsmAnd, Traccar Client, GPSLogger),
+/// readers send the protocol's commands (docs/service-protocol.md). What is public belongs to the thread that made it.
+class Service {
+  public:
+    struct Setup {
+        HttpServer::Setup http;  ///< its handler is not used
+        std::unique_ptr<Store> store;
+        /// The host names of its address, without a port; empty: any.
+        std::vector<std::string> hosts;
+        std::function<std::int64_t()> now;  ///< seconds since 1970
+    };
+
+    explicit Service(Setup setup);
+    /// Stops, and writes what waits.
+    ~Service();
+    Service(const Service&) = delete;
+    Service& operator=(const Service&) = delete;
+
+    /// Empty when it answers, else what failed.
+    std::string start();
+    void stop();
+    int port() const { return http_.port(); }
+    const ServiceCounters& counters() const { return counters_; }
+
+  private:
+    HttpServer::Setup httpSetup(Setup& setup);
+    void route(const HttpRequest& request, const HttpReply& reply);
+    bool isForUs(const HttpRequest& request) const;
+    /// The device behind the credentials, of this kind; else it has answered.
+    std::optional<Device> authenticated(const HttpRequest& request, const std::string& ownSecret, DeviceKind kind,
+                                        const HttpReply& reply);
+    void refuseCredentials(const HttpRequest& request, const HttpReply& reply);
+    void takeOwnTracks(const HttpRequest& request, const HttpReply& reply);
+    void takeParameters(const HttpRequest& request, const HttpReply& reply);
+    /// What of a report is kept; counts the rest.
+    std::vector<Fix> admitted(const Report& report);
+    HttpResponse friendsAnswer(const Device& device, bool sealed);
+    void answerCommand(const HttpRequest& request, const HttpReply& reply);
+    HttpResponse locations(const Device& device, const platform::Dictionary& body);
+    void changeSharing(const Device& device, const platform::Dictionary& body, const HttpReply& reply);
+    void sweep();
+
+    const std::vector<std::string> hosts_;
+    const std::function<std::int64_t()> now_;
+    ServiceCounters counters_;
+    FailureDelays delays_;
+    std::unique_ptr<Store> store_;
+    HttpServer http_;
+};
+
+}  // namespace ktr::server

@@ -1,0 +1,113 @@
+#pragma once
+
+#include <condition_variable>
+#include <cstdint>
+#include <deque>
+#include <functional>
+#include <memory>
+#include <mutex>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <thread>
+#include <utility>
+#include <vector>
+
+#include "server/ingest/Fix.h"
+#include "server/store/Database.h"
+#include "server/store/Records.h"
+
+namespace ktr::server {
+
+/// What the service remembers, in one SQLite file ("service.db" in its folder). One thread writes: it takes all that
+/// waits into one commit, and says so to those who wait when that commit is on the disk. Reads go beside it. Other
+/// processes (the administration) may use the same file at the same time. Any thread.
+class Store {
+  public:
+    static constexpr int kSchema = 1;
+    /// Whether what was written is on the disk. Called on the writing thread: it must not wait.
+    using Done = std::function<void(bool)>;
+
+    /// None, with a sentence in `complaint`, when the file cannot be used, or a newer program has written it. `make`:
+    /// the store may be new.
+    static std::unique_ptr<Store> open(const std::string& folder, bool make, std::string& complaint);
+    /// Writes what waits.
+    ~Store();
+    Store(const Store&) = delete;
+    Store& operator=(const Store&) = delete;
+
+    // Writing, later: `done` follows the commit.
+
+    /// Keeps fixes of a person, each time once; nothing while the person hides. Also notes that the device was heard.
+    void keep(std::int64_t device, std::int64_t person, std::vector<Fix> fixes, std::int64_t now, Done done);
+    /// Hides somebody from everybody.
+    void hide(std::int64_t person, std::int64_t now, Done done);
+    /// Notes who saw whom, once an hour; `asked`: not merely carried along with a phone's answer.
+    void noteLooks(std::int64_t viewer, std::vector<std::int64_t> owners, bool asked, std::int64_t now, Done done);
+    void noteCards(std::int64_t device, std::string hash, Done done);
+    /// Deletes what is too old, of a few people in turn: to be called again and again.
+    void deleteOld(std::int64_t now, Done done);
+
+    // Reading.
+
+    /// Whose secret this is, if it is not revoked. None with `failed` set: the store could not be read.
+    std::optional<Device> deviceOf(std::string_view secret, bool& failed);
+    /// Who has this handle: e-mail addresses in any case, phone numbers by their digits and "+".
+    std::optional<std::int64_t> personOf(std::string_view handle);
+    std::optional<Person> person(std::int64_t id);
+    std::optional<Person> personNamed(std::string_view name);
+    std::vector<Person> people();
+    /// What decides what a viewer sees of an owner. None for one whom nobody knows.
+    std::optional<Sharing> sharing(std::int64_t viewer, std::int64_t owner);
+    /// Everybody who has granted something to a viewer.
+    std::vector<Friend> friendsOf(std::int64_t viewer);
+    /// The present, never before the latest that the store has seen: a clock that was set back ends nothing later.
+    std::int64_t present(std::int64_t now);
+
+    // Administration: these wait for the disk. False, or none, when it failed or there is no such person.
+
+    bool addPerson(const std::string& name, const std::vector<std::string>& handles, std::int64_t now);
+    bool addDevice(std::int64_t person, DeviceKind kind, std::string_view secret, std::string_view key,
+                   std::int64_t now);
+    bool grant(std::int64_t owner, std::int64_t viewer, const Grant& grant);
+    /// Whether there was one.
+    bool revokeGrant(std::int64_t owner, std::int64_t viewer);
+    /// How many secrets of a person ended.
+    int revokeDevices(std::int64_t person, std::int64_t now);
+    bool setHidden(std::int64_t person, bool hidden, std::int64_t now);
+    std::vector<std::pair<std::string, Grant>> grantsOf(std::int64_t owner);
+    /// When one of a person's devices was last heard; none: never.
+    std::optional<std::int64_t> lastHeard(std::int64_t person);
+    /// Whether the file is whole: empty, or what SQLite says of it.
+    std::string check();
+
+    static std::string normalisedHandle(std::string_view handle);
+
+  private:
+    struct Work {
+        std::function<void(Database&)> write;
+        Done done;
+    };
+
+    Store(std::unique_ptr<Database> reading, std::unique_ptr<Database> writing);
+    void write(std::function<void(Database&)> work, Done done);
+    /// Waits for the commit.
+    bool writeNow(const std::function<void(Database&)>& work);
+    void writeAll();
+    bool commit(const std::deque<Work>& batch);
+    Sharing sharingOf(Database::Run& row, int firstColumn);
+    void readFixes(std::int64_t owner, Sharing& sharing);
+
+    std::mutex readMutex_;
+    std::unique_ptr<Database> reading_;
+    std::unique_ptr<Database> writing_;
+    std::mutex mutex_;
+    std::condition_variable wake_;
+    std::deque<Work> waiting_;
+    bool ending_ = false;
+    std::int64_t latest_ = 0;     ///< under `mutex_`
+    std::int64_t lastSwept_ = 0;  ///< on the writing thread
+    std::thread thread_;
+};
+
+}  // namespace ktr::server

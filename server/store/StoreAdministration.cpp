@@ -1,0 +1,127 @@
+// The part of the store that people use from a command line: every call waits for the disk.
+#include "server/ingest/FixRules.h"
+#include "server/store/Secret.h"
+#include "server/store/Store.h"
+
+namespace ktr::server {
+
+bool Store::addPerson(const std::string& name, const std::vector<std::string>& handles, std::int64_t now) {
+    return writeNow([&](Database& database) {
+        std::int64_t person = 0;
+        {
+            auto row = database.statement("INSERT INTO person (name, retention, made) VALUES (?, ?, ?) RETURNING id");
+            row.bind(std::string_view(name)).bind(FixRules::kRetention).bind(now);
+            if (!row.next()) {
+                return;
+            }
+            person = row.integer(0);
+            row.run();
+        }
+        std::int64_t place = 0;
+        for (const std::string& handle : handles) {
+            database.statement("INSERT INTO handle VALUES (?, ?, ?, ?)")
+                .bind(std::string_view(normalisedHandle(handle)))
+                .bind(std::string_view(handle))
+                .bind(++place)
+                .bind(person)
+                .run();
+        }
+    });
+}
+
+bool Store::addDevice(std::int64_t person, DeviceKind kind, std::string_view secret, std::string_view key,
+                      std::int64_t now) {
+    return writeNow([&](Database& database) {
+        database.statement("INSERT INTO device (person, kind, secret, key, made) VALUES (?, ?, ?, ?, ?)")
+            .bind(person)
+            .bind(static_cast<std::int64_t>(kind))
+            .bindBytes(Secret::hash(secret))
+            .bind(key)
+            .bind(now)
+            .run();
+    });
+}
+
+bool Store::grant(std::int64_t owner, std::int64_t viewer, const Grant& grant) {
+    return writeNow([&](Database& database) {
+        database
+            .statement("INSERT OR REPLACE INTO share (viewer, owner, exactness, since, until) VALUES (?, ?, ?, ?, ?)")
+            .bind(viewer)
+            .bind(owner)
+            .bind(static_cast<std::int64_t>(grant.precision))
+            .bind(grant.from)
+            .bind(grant.until)
+            .run();
+    });
+}
+
+bool Store::revokeGrant(std::int64_t owner, std::int64_t viewer) {
+    int ended = 0;
+    const bool good = writeNow([&](Database& database) {
+        database.statement("DELETE FROM share WHERE viewer = ? AND owner = ?").bind(viewer).bind(owner).run();
+        ended = database.changes();
+    });
+    return good && ended > 0;
+}
+
+int Store::revokeDevices(std::int64_t person, std::int64_t now) {
+    int ended = 0;
+    const bool good = writeNow([&](Database& database) {
+        database.statement("UPDATE device SET revoked = ? WHERE person = ? AND revoked IS NULL")
+            .bind(now)
+            .bind(person)
+            .run();
+        ended = database.changes();
+    });
+    return good ? ended : 0;
+}
+
+bool Store::setHidden(std::int64_t person, bool hidden, std::int64_t now) {
+    return writeNow([&](Database& database) {
+        // Showing twice changes nothing: what was seen in between stays.
+        database
+            .statement(
+                "UPDATE person SET shown_since = CASE WHEN hidden AND NOT ?2 THEN ?3 ELSE shown_since END, "
+                "hidden = ?2 WHERE id = ?1")
+            .bind(person)
+            .bind(std::int64_t{hidden})
+            .bind(now)
+            .run();
+    });
+}
+
+std::vector<std::pair<std::string, Grant>> Store::grantsOf(std::int64_t owner) {
+    const std::lock_guard<std::mutex> lock(readMutex_);
+    reading_->clear();
+    std::vector<std::pair<std::string, Grant>> grants;
+    auto row = reading_->statement(
+        "SELECT name, exactness, since, until FROM share JOIN person ON person.id = viewer WHERE owner = ? ORDER BY "
+        "name");
+    row.bind(owner);
+    while (row.next()) {
+        grants.emplace_back(row.text(0),
+                            Grant{static_cast<Precision>(row.integer(1)), row.integer(2), row.maybeInteger(3)});
+    }
+    return grants;
+}
+
+std::optional<std::int64_t> Store::lastHeard(std::int64_t person) {
+    const std::lock_guard<std::mutex> lock(readMutex_);
+    reading_->clear();
+    auto row = reading_->statement("SELECT max(heard) FROM device WHERE person = ?");
+    return row.bind(person).next() ? row.maybeInteger(0) : std::nullopt;
+}
+
+std::string Store::check() {
+    const std::lock_guard<std::mutex> lock(readMutex_);
+    reading_->clear();
+    for (const char* question : {"PRAGMA integrity_check", "PRAGMA foreign_key_check"}) {
+        auto row = reading_->statement(question);
+        if (row.next() && row.text(0) != "ok") {
+            return row.text(0);
+        }
+    }
+    return reading_->complaint();
+}
+
+}  // namespace ktr::server
