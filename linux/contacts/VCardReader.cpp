@@ -1,16 +1,16 @@
 #include "linux/contacts/VCardReader.h"
 
 #include <algorithm>
-#include <fstream>
-#include <iterator>
 #include <system_error>
 #include <utility>
+#include <variant>
 
 #include <QBuffer>
 #include <QByteArray>
 #include <QImage>
 
 #include "documents/ComputingTime.h"
+#include "documents/FileReader.h"
 #include "linux/device/LoadableModule.h"
 #include "linux/paint/ImageDecoder.h"
 #include "platform/base/Utf8.h"
@@ -59,18 +59,18 @@ class VCardReader::Reading {
     Result result;
 
     void readFile(const std::filesystem::path& file) {
-        std::error_code failed;
-        const auto size = std::filesystem::file_size(file, failed);
-        if (!failed && size > kLargestFile) {
-            problem({file, 0, "the file is larger than 256 MiB"});
+        const auto read = documents::FileReader::read(file, {kLargestFile, {}});
+        if (const auto* error = std::get_if<documents::FileReader::Error>(&read)) {
+            problem({file, 0, error->reason});
             return;
         }
-        std::ifstream stream(file, std::ios::binary);
-        if (failed || !stream) {
-            problem({file, 0, failed ? failed.message() : "the file cannot be opened"});
+        const auto& text = std::get<std::string>(read);
+        bytesRead_ += text.size();
+        if (bytesRead_ > kMostBytes) {
+            problem({file, 0, "the contacts are larger than 512 MiB in all"});
             return;
         }
-        readCards(std::string(std::istreambuf_iterator<char>(stream), {}), file);
+        readCards(text, file);
     }
 
     void readCards(const std::string& text, const std::filesystem::path& file) {
@@ -122,6 +122,7 @@ class VCardReader::Reading {
     }
 
     std::chrono::nanoseconds timeLeft_ = kThumbnailTime;
+    std::uintmax_t bytesRead_ = 0;
 };
 
 VCardReader::Result VCardReader::read(const std::filesystem::path& path) const {

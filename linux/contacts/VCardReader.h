@@ -31,7 +31,9 @@ class VCardReader {
     };
 
     /// A file beyond this is passed over; bytes. What a card may hold is VCardText's to say.
-    static constexpr std::uintmax_t kLargestFile = std::uintmax_t{256} << 20;
+    static constexpr std::size_t kLargestFile = std::size_t{256} << 20;
+    /// And so are files after these many bytes in all.
+    static constexpr std::uintmax_t kMostBytes = std::uintmax_t{512} << 20;
     /// Contacts beyond these many are passed over, in however many files they stand.
     static constexpr std::size_t kMostContacts = VCardText::kMostCards;
     /// Computing time that thumbnails of large photos may take in all; contacts after that have none.

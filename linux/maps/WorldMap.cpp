@@ -2,9 +2,11 @@
 
 #include <algorithm>
 #include <cstring>
-#include <fstream>
+#include <variant>
 
 #include <libdeflate.h>
+
+#include "documents/FileReader.h"
 
 namespace ktr::linux_ {
 
@@ -123,15 +125,13 @@ class WorldMap::Reader {
 };
 
 std::shared_ptr<const WorldMap> WorldMap::read(const std::filesystem::path& file, std::string& reason) {
-    std::ifstream stream(file, std::ios::binary);
-    std::vector<unsigned char> data(kMostBytes);
-    stream.read(reinterpret_cast<char*>(data.data()), static_cast<std::streamsize>(data.size()));
-    if (!stream.is_open() || stream.bad()) {
-        reason = "it cannot be read";
+    const auto read = documents::FileReader::read(file, {kMostBytes, {}});
+    if (const auto* error = std::get_if<documents::FileReader::Error>(&read)) {
+        reason = error->reason;
         return nullptr;
     }
-    data.resize(static_cast<std::size_t>(stream.gcount()));
-    return parse(data, reason);
+    const auto& data = std::get<std::string>(read);
+    return parse({data.begin(), data.end()}, reason);
 }
 
 std::shared_ptr<const WorldMap> WorldMap::parse(const std::vector<unsigned char>& data, std::string& reason) {

@@ -1,9 +1,9 @@
 #include "linux/paint/QtImageSource.h"
 
 #include <QDir>
-#include <QFile>
 #include <QImage>
 
+#include "documents/FileReader.h"
 #include "linux/paint/ImageDecoder.h"
 #include "linux/paint/RasterImage.h"
 #include "linux/paint/SvgImage.h"
@@ -17,15 +17,15 @@ namespace {
 constexpr int kLongestSide = 2048;
 
 std::shared_ptr<const QtImage> pictureOf(const QString& path, double scale) {
-    QFile file(path);
-    if (!file.open(QIODevice::ReadOnly)) {
+    const auto read = documents::FileReader::read(path.toStdString(), {PictureData::kMostBytes, {}});
+    const auto* data = std::get_if<std::string>(&read);
+    if (data == nullptr) {
         return nullptr;
     }
-    const QByteArray data = file.readAll();
     if (path.endsWith(u".svg")) {
-        return SvgImage::fromSource(data);
+        return SvgImage::fromSource(QByteArray::fromStdString(*data));
     }
-    const auto picture = ImageDecoder::decode(platform::Bytes(data.begin(), data.end()), kLongestSide);
+    const auto picture = ImageDecoder::decode(platform::Bytes(data->begin(), data->end()), kLongestSide);
     if (!picture) {
         return nullptr;
     }

@@ -203,7 +203,7 @@ TEST_F(ConfiguredMapsTest, Datum_IsTheConfigured) {
     EXPECT_FALSE(maps->isInGcj02({22.28, 114.16}));
     EXPECT_FALSE(ConfiguredMaps::make(configuration, "/nowhere", time)->isInGcj02(kBeijing));
     EXPECT_TRUE(log->has(platform::LogLevel::Default,
-                         "The built-in map /nowhere/maps/world.bin cannot be used: it cannot be read"));
+                         "The built-in map /nowhere/maps/world.bin cannot be used: there is no such file"));
 }
 
 }  // namespace ktr::linux_

@@ -204,6 +204,18 @@ TEST_F(VCardReaderTest, AMissingPath_IsAnErrorThatNamesIt) {
     EXPECT_NE(result.error->find("no such file or folder"), std::string::npos);
 }
 
+TEST_F(VCardReaderTest, WhatIsNoFile_IsSaidAndNotWaitedFor) {
+    const auto pipe = path("pipe.vcf");
+    ASSERT_EQ(mkfifo(pipe.c_str(), 0600), 0);
+    EXPECT_EQ(reader.read(pipe).error, pipe.string() + ": this is a pipe, not a file");
+    EXPECT_EQ(reader.read("/dev/zero").error, "/dev/zero: this is a device, not a file");
+    write("ann.vcf", "BEGIN:VCARD\nFN:Ann\nEND:VCARD\n");
+    const auto result = reader.read(path());
+    EXPECT_EQ(result.contacts.size(), 1U);
+    ASSERT_EQ(result.problems.size(), 1U);
+    EXPECT_EQ(result.problems[0].file, pipe);
+}
+
 TEST_F(VCardReaderTest, AnEmptyFolder_IsAnEmptyStore) {
     const auto result = reader.read(path());
     EXPECT_EQ(result.error, std::nullopt);
