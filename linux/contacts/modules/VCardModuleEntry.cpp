@@ -47,8 +47,14 @@ std::vector<std::string> valuesOf(EVCardAttribute* attribute) {
     return out;
 }
 
+/// As text: what was encoded may have held any bytes.
 std::string component(const std::vector<std::string>& values, std::size_t index) {
-    return index < values.size() ? trimmed(values[index]) : std::string();
+    if (index >= values.size()) {
+        return {};
+    }
+    std::string text = platform::sanitizedUtf8(values[index]);
+    std::erase(text, '\0');
+    return trimmed(text);
 }
 
 std::string withoutScheme(const std::string& value, std::string_view scheme) {

@@ -85,6 +85,14 @@ TEST_F(VCardReaderTest, EscapedAndFoldedValues_AreRestored) {
     EXPECT_EQ(contact->phoneNumbers, (std::vector<LabeledText>{{"Boat", "1632960001"}}));
 }
 
+TEST_F(VCardReaderTest, EncodedBytesThatAreNoText_AreReplaced) {
+    const auto contact =
+        one("VERSION:2.1\r\nFN;ENCODING=QUOTED-PRINTABLE:J=C3=B6rg=FF=00!\r\n"
+            "TEL;ENCODING=b:/zE=\r\n");
+    EXPECT_EQ(contact->storedFullName, "Jörg\uFFFD!");
+    EXPECT_EQ(contact->phoneNumbers, (std::vector<LabeledText>{{"", "\uFFFD1"}}));
+}
+
 TEST_F(VCardReaderTest, Base64Photo_GivesImageAndThumbnail) {
     const auto contact = one("VERSION:3.0\r\nFN:A\r\nPHOTO;ENCODING=b;TYPE=PNG:aGVs\r\n bG8=\r\n");
     EXPECT_EQ(contact->imageData, (Bytes{'h', 'e', 'l', 'l', 'o'}));
