@@ -8,7 +8,7 @@
 #include "linux/maps/PictureGround.h"
 #include "linux/maps/VectorGround.h"
 #include "linux/maps/WorldGround.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -49,7 +49,8 @@ std::shared_ptr<ThreadedMapSource> ConfiguredMaps::make(const Configuration& con
         if (const auto world = WorldMap::read(file, reason)) {
             gcj02 = std::make_shared<MainlandArea>(world->outline());
         } else {
-            platform::platformLog().line("The built-in map %@ cannot be used: %@", file.string(), reason);
+            platform::areaLog(platform::LogArea::Maps)
+                .line("The built-in map %@ cannot be used: %@", file.string(), reason);
         }
     }
     return std::make_shared<ThreadedMapSource>(std::move(mainLoop), grounds(configuration, resourceFolder),

@@ -6,8 +6,8 @@
 #include "linux/paint/ImageDecoder.h"
 #include "tests/fuzz/Require.h"
 
-// Any bytes as a picture: decoded or refused within the policy, and what is handed to the decoder says the same of itself
-// as the whole.
+// Any bytes as a picture: decoded or refused within the policy, and what is handed to the decoder says the same of
+// itself as the whole.
 
 namespace {
 

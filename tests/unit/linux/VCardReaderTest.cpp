@@ -87,8 +87,8 @@ TEST_F(VCardReaderTest, EscapedAndFoldedValues_AreRestored) {
 
 TEST_F(VCardReaderTest, EncodedBytesThatAreNoText_AreReplaced) {
     const auto contact =
-        one("VERSION:2.1\r\nFN;ENCODING=QUOTED-PRINTABLE:J=C3=B6rg=FF=00!\r\n"
-            "TEL;ENCODING=b:/zE=\r\n");
+        one("VERSION:2.1\r\nFN;ENCODING=QUOTED-PRINTABLE:J=C3=B6rg=FF!\r\n"
+            "TEL;ENCODING=b:zDEA\r\n");
     EXPECT_EQ(contact->storedFullName, "Jörg\uFFFD!");
     EXPECT_EQ(contact->phoneNumbers, (std::vector<LabeledText>{{"", "\uFFFD1"}}));
 }
