@@ -48,6 +48,20 @@ class ProgramTest(unittest.TestCase):
                         encoding="utf-8")
         return path
 
+    def test_numbers_of_a_conversation_have_digits_of_one_kind(self):
+        friend = {"friend": person("آن"), "latitude": 53.0005, "longitude": -6.0, "locationDate": "2026-05-16T17:38:00+01:00",
+                  "city": "دبي"}
+        for region, language, digits in (("ar-AE", "ar", "0123456789"), ("ar-AE", "ar-AE", "0123456789"),
+                                         ("ar-EG", "ar", "٠١٢٣٤٥٦٧٨٩"), ("fa-IR", "fa", "۰۱۲۳۴۵۶۷۸۹")):
+            with self.subTest(region=region, language=language):
+                path = self.scenario([friend], language=language, region=region,
+                                     positions=[{"latitude": 53.0, "longitude": -6.0}])
+                result = run("describe", path)
+                self.assert_done(result)
+                found = {c for c in result.stdout if c.isdigit()}
+                self.assertGreater(len(found), 3, result.stdout)
+                self.assertLessEqual(found, set(digits), result.stdout)
+
     def assert_done(self, result):
         self.assertEqual(result.stderr, "")
         self.assertEqual(result.returncode, 0)

@@ -21,6 +21,7 @@ std::string withoutSpaces(std::string text) {
 TEST(KTRClockTextTest, Clock_FollowsTheLanguage) {
     EXPECT_EQ(clockText({kNoon + 5 * 3600 + 42 * 60}, 0, "en-GB", "en-GB"), "17:42");
     EXPECT_EQ(clockText({kNoon + 5 * 3600 + 42 * 60}, 0, "zh-TW", "zh-TW"), "下午5:42");
+    EXPECT_EQ(withoutSpaces(clockText({kNoon + 5 * 3600 + 42 * 60}, 0, "el-GR", "el-GR")), "5:42μ.μ.");
     EXPECT_EQ(clockText({kNoon + 5 * 3600 + 42 * 60}, 0, "de", "de-DE"), "17:42");
     EXPECT_EQ(withoutSpaces(clockText({kNoon + 5 * 3600 + 42 * 60}, 0, "en-US", "en-US")), "5:42PM");
 }
@@ -29,6 +30,14 @@ TEST(KTRClockTextTest, Region_DecidesWhereTheLanguageHasNoCountry) {
     EXPECT_EQ(clockText({kNoon + 5 * 3600}, 0, "en", "en-IE"), "17:00");
     EXPECT_EQ(withoutSpaces(clockText({kNoon + 5 * 3600}, 0, "en", "en-US")), "5:00PM");
     EXPECT_EQ(clockText({kNoon + 5 * 3600}, 0, "de", "en-US"), "17:00");
+}
+
+TEST(KTRClockTextTest, Digits_AreThoseOfTheCards) {
+    const platform::Date moment{kNoon + 5 * 3600 + 42 * 60};
+    EXPECT_EQ(withoutSpaces(clockText(moment, 0, "ar", "ar-EG")), "٥:٤٢م");
+    EXPECT_EQ(withoutSpaces(clockText(moment, 0, "ar", "ar-AE")), "5:42م");
+    EXPECT_EQ(withoutSpaces(clockText(moment, 0, "ar-EG", "ar-AE")), "5:42م");
+    EXPECT_EQ(clockText(moment, 0, "fa-IR", "de-DE"), "۱۷:۴۲");
 }
 
 TEST(KTRClockTextTest, Offset_IsTheOneGiven) {
