@@ -49,7 +49,8 @@ class ProgramTest(unittest.TestCase):
         return path
 
     def test_numbers_of_a_conversation_have_digits_of_one_kind(self):
-        friend = {"friend": person("آن"), "latitude": 53.0005, "longitude": -6.0, "locationDate": "2026-05-16T17:38:00+01:00",
+        # Four minutes ago.
+        friend = {"friend": person("آن"), "latitude": 53.0005, "longitude": -6.0, "locationDate": 800642280,
                   "city": "دبي"}
         for region, language, digits in (("ar-AE", "ar", "0123456789"), ("ar-AE", "ar-AE", "0123456789"),
                                          ("ar-EG", "ar", "٠١٢٣٤٥٦٧٨٩"), ("fa-IR", "fa", "۰۱۲۳۴۵۶۷۸۹")):
