@@ -6,9 +6,9 @@
 #include <QByteArray>
 #include <algorithm>
 #include <cmath>
-#include <numbers>
 
 #include "linux/maps/MapDrawer.h"
+#include "platform/map/Mercator.h"
 
 namespace ktr::bench {
 
@@ -37,11 +37,9 @@ bool insert(sqlite3* database, const Row& at, const QByteArray& data) {
 }
 
 QByteArray drawn(const std::shared_ptr<linux_::MapGround>& ground, const Row& at) {
-    using std::numbers::pi;
     const double count = std::exp2(at.level);
     platform::MapPictureRequest request;
-    request.viewport.centre = {std::atan(std::sinh(pi * (1.0 - 2.0 * (at.row + 0.5) / count))) * 180.0 / pi,
-                               (at.column + 0.5) / count * 360.0 - 180.0};
+    request.viewport.centre = platform::mercatorCoordinate({(at.column + 0.5) / count, (at.row + 0.5) / count});
     request.viewport.zoom = at.level;
     request.viewport.size = {kSide, kSide};
     QByteArray data;
@@ -57,7 +55,6 @@ QByteArray drawn(const std::shared_ptr<linux_::MapGround>& ground, const Row& at
 
 bool PictureMap::write(const std::string& path, const std::shared_ptr<linux_::MapGround>& ground,
                        const platform::Coordinate& centre) {
-    using std::numbers::pi;
     sqlite3* database = nullptr;
     sqlite3_open(path.c_str(), &database);
     bool isGood = sqlite3_exec(database,
@@ -69,8 +66,9 @@ bool PictureMap::write(const std::string& path, const std::shared_ptr<linux_::Ma
                                nullptr, nullptr, nullptr) == SQLITE_OK;
     for (int level = kCoarsest; level <= kFinest && isGood; ++level) {
         const double count = std::exp2(level);
-        const int x = static_cast<int>((centre.longitude / 360.0 + 0.5) * count);
-        const int y = static_cast<int>((1.0 - std::asinh(std::tan(centre.latitude * pi / 180.0)) / pi) / 2.0 * count);
+        const platform::Point middle = platform::mercatorPoint(centre);
+        const int x = static_cast<int>(middle.x * count);
+        const int y = static_cast<int>(middle.y * count);
         for (int column = x - kAround; column <= x + kAround && isGood; ++column) {
             for (int row = y - kAround; row <= y + kAround && isGood; ++row) {
                 isGood = insert(database, {level, column, row}, drawn(ground, {level, column, row}));

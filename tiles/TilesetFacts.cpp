@@ -4,9 +4,9 @@
 #include <array>
 #include <charconv>
 #include <cmath>
-#include <numbers>
 
 #include "platform/base/Utf8.h"
+#include "platform/map/Mercator.h"
 
 namespace ktr::tiles {
 
@@ -26,9 +26,10 @@ std::optional<int> levelOf(const std::string& text) {
     return failure == std::errc() && level >= 0 && level <= 30 ? std::optional(level) : std::nullopt;
 }
 
-double rowOf(double latitude) {
-    const double radians = std::clamp(latitude, -85.05112877980659, 85.05112877980659) * std::numbers::pi / 180.0;
-    return std::clamp(0.5 - std::asinh(std::tan(radians)) / (2.0 * std::numbers::pi), 0.0, 1.0);
+/// On the square of side 1, within it.
+platform::Point placeOf(double latitude, double longitude) {
+    const platform::Point point = platform::mercatorPoint({latitude, longitude});
+    return {std::clamp(point.x, 0.0, 1.0), std::clamp(point.y, 0.0, 1.0)};
 }
 
 /// "west,south,east,north" in degrees.
@@ -47,8 +48,9 @@ std::optional<TilesetFacts::Bounds> boundsOf(const std::string& text) {
         at = after;
     }
     const auto [west, south, east, north] = degrees;
-    TilesetFacts::Bounds bounds{std::clamp(west / 360.0 + 0.5, 0.0, 1.0), rowOf(north),
-                                std::clamp(east / 360.0 + 0.5, 0.0, 1.0), rowOf(south)};
+    const platform::Point first = placeOf(north, west);
+    const platform::Point last = placeOf(south, east);
+    TilesetFacts::Bounds bounds{first.x, first.y, last.x, last.y};
     const bool makesSense = bounds.left < bounds.right && bounds.top < bounds.bottom;
     return makesSense ? std::optional(bounds) : std::nullopt;
 }

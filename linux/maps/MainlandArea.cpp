@@ -14,8 +14,6 @@ namespace {
 
 using Lines = std::vector<WorldMap::Line>;
 
-constexpr double kEquatorMetres = 40075016.685578488;
-
 template <typename Each>
 void forEdges(const Lines& lines, Each each) {
     for (const WorldMap::Line& line : lines) {
@@ -48,7 +46,7 @@ MainlandArea::MainlandArea(WorldMap::Outline outline) : outline_(std::move(outli
         }
     }
     // The scale of the map is less than two as far north as the country reaches.
-    const double margin = 2.0 * kSeaMetres / kEquatorMetres;
+    const double margin = 2.0 * kSeaMetres / platform::kMercatorEquatorMetres;
     bounds_.adjust(-margin, -margin, margin, margin);
 }
 
@@ -77,7 +75,7 @@ bool MainlandArea::contains(const platform::Coordinate& coordinate) const {
     if (isInside(place)) {
         return true;
     }
-    const double metres = kEquatorMetres * std::cos(coordinate.latitude * std::numbers::pi / 180.0);
+    const double metres = platform::kMercatorEquatorMetres * std::cos(coordinate.latitude * std::numbers::pi / 180.0);
     const auto within = [&](double square, double most) { return std::sqrt(square) * metres <= most; };
     const double border = nearest(outline_.borders, place);
     const double cityBorder = nearest(outline_.cityBorders, place);

@@ -6,6 +6,7 @@
 
 #include "linux/maps/MapStyle.h"
 #include "platform/base/LogArea.h"
+#include "platform/map/Mercator.h"
 
 namespace ktr::linux_ {
 
@@ -14,7 +15,6 @@ namespace {
 /// The longest side of a picture, in points and in pixels: 64 MiB at most.
 constexpr double kLongestSide = 4096.0;
 constexpr double kHighestZoom = 24.0;
-constexpr double kLastLatitude = 85.05112877980659;
 
 double within(double value, double lowest, double highest, double otherwise) {
     return std::isfinite(value) ? std::clamp(value, lowest, highest) : otherwise;
@@ -25,7 +25,8 @@ platform::MapPictureRequest checked(platform::MapPictureRequest request) {
     viewport.size.width = within(viewport.size.width, 1.0, kLongestSide, 1.0);
     viewport.size.height = within(viewport.size.height, 1.0, kLongestSide, 1.0);
     viewport.zoom = within(viewport.zoom, 0.0, kHighestZoom, 0.0);
-    viewport.centre.latitude = within(viewport.centre.latitude, -kLastLatitude, kLastLatitude, 0.0);
+    viewport.centre.latitude =
+        within(viewport.centre.latitude, -platform::kLastMercatorLatitude, platform::kLastMercatorLatitude, 0.0);
     viewport.centre.longitude = std::remainder(within(viewport.centre.longitude, -1e6, 1e6, 0.0), 360.0);
     const double longest = std::max(viewport.size.width, viewport.size.height);
     request.scale = std::min(within(request.scale, 0.25, 4.0, 1.0), kLongestSide / longest);

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include "platform/map/Mercator.h"
+
 namespace ktr::linux_ {
 
 namespace {
@@ -18,10 +20,10 @@ std::vector<PlacedTile> MapTiles::of(const MapDrawing& drawing, int level) {
         return {};
     }
     const int count = 1 << level;
-    const double side = 256.0 * std::exp2(viewport.zoom - level);
+    const double side = platform::mercatorWorld(viewport.zoom - level);
     // The copy of the world that holds the centre.
-    const platform::Point world = viewport.pointFor({85.05112877980659, -180.0});
-    const double centreColumn = (viewport.centre.longitude / 360.0 + 0.5) * count;
+    const platform::Point world = viewport.pointFor({platform::kLastMercatorLatitude, -180.0});
+    const double centreColumn = platform::mercatorPoint(viewport.centre).x * count;
     const double left = viewport.size.width / 2.0 - centreColumn * side;
     const double top = world.y;
     const auto index = [&](double points) { return static_cast<long>(std::floor(points / side)); };

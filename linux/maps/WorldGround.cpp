@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <array>
 #include <cmath>
-#include <numbers>
 
 #include <QPainterPath>
 #include <QPolygonF>
@@ -12,6 +11,7 @@
 #include "linux/maps/MapText.h"
 #include "linux/maps/WorldNames.h"
 #include "platform/base/LogArea.h"
+#include "platform/map/Mercator.h"
 
 namespace ktr::linux_ {
 
@@ -35,10 +35,9 @@ struct Frame {
     QRectF seen;  ///< part of the world in the picture and its margin
 
     explicit Frame(const platform::MapViewport& viewport)
-        : side(256.0 * std::exp2(viewport.zoom)), size(viewport.size.width, viewport.size.height) {
-        const double latitude = viewport.centre.latitude * std::numbers::pi / 180.0;
-        centre = {viewport.centre.longitude / 360.0 + 0.5,
-                  0.5 - std::asinh(std::tan(latitude)) / (2.0 * std::numbers::pi)};
+        : side(platform::mercatorWorld(viewport.zoom)), size(viewport.size.width, viewport.size.height) {
+        const platform::Point middle = platform::mercatorPoint(viewport.centre);
+        centre = {middle.x, middle.y};
         const double width = (size.width() / 2.0 + kMargin) / side;
         const double height = (size.height() / 2.0 + kMargin) / side;
         seen = QRectF(centre.x() - width, centre.y() - height, 2.0 * width, 2.0 * height);

@@ -7,11 +7,6 @@
 #include "platform/map/Mercator.h"
 
 namespace ktr::platform {
-namespace {
-
-constexpr double kEquatorMetres = 40075016.685578488;  // 2π × the sphere's radius, 6,378,137 m
-
-}  // namespace
 
 Point MapViewport::pointFor(const Coordinate& coordinate) const {
     const Point middle = mercatorPoint(centre);
@@ -30,7 +25,7 @@ Coordinate MapViewport::coordinateAt(const Point& point) const {
 
 double MapViewport::metresPerPoint() const {
     const double degrees = std::clamp(centre.latitude, -kLastMercatorLatitude, kLastMercatorLatitude);
-    return kEquatorMetres * std::cos(degrees * std::numbers::pi / 180.0) / mercatorWorld(zoom);
+    return kMercatorEquatorMetres * std::cos(degrees * std::numbers::pi / 180.0) / mercatorWorld(zoom);
 }
 
 }  // namespace ktr::platform
