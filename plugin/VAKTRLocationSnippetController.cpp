@@ -104,10 +104,24 @@ double VAKTRLocationSnippetController::desiredHeightForWidth(double width) {
     return height == 0.0 ? map + kHeightOfNoRow : height;
 }
 
+namespace {
+
+/// Whether the row shows a place, or the map does: words are a place, and so is one on the equator or on the zeroth
+/// meridian; where both meet is none.
+bool isFound(const KTRVALocation& record) {
+    const auto& object = record.velaLocation();
+    if (!object) {
+        return false;
+    }
+    return object->label || object->city || object->stateCode ||
+           (record.hasCoordinate() && (*object->latitude != 0.0 || *object->longitude != 0.0));
+}
+
+}  // namespace
+
 bool VAKTRLocationSnippetController::isSearching() const {
     const auto record = disambiguatedLocation();
-    return record && friendView_ && friendView_->isRefreshingLocation() &&
-           !KTRVAUtils::geoLocationForVALocation(record->velaLocation());
+    return record && friendView_ && friendView_->isRefreshingLocation() && !isFound(*record);
 }
 
 bool VAKTRLocationSnippetController::allEmptyLocations() const {

@@ -85,7 +85,7 @@ class SharingTest(unittest.TestCase):
         self.assertLessEqual(len(sent), 7)
         self.assertIn("the service was asked: %d answers, 0 failures" % len(sent), result.stderr)
 
-    def test_hidden_user_tells_no_place(self):
+    def test_hidden_user_is_shown_to_nobody(self):
         self.serve(track(8, 0.25))
         result = self.live(2, "Hide my location")
         self.assertIn("Hidden from friends, Mara Lind", result.stdout)
@@ -150,6 +150,46 @@ class SharingTest(unittest.TestCase):
         self.assertEqual(seen, [event + wish for wish in wishes for event in ("asked: ", "answered: ")])
         places = [result.stdout.index("This is about: " + wish) for wish in wishes]
         self.assertEqual(places, sorted(places))
+
+    def test_nothing_shows_the_user_once_the_wish_to_hide_has_left(self):
+        heard = []
+
+        class Slow(http.server.BaseHTTPRequestHandler):
+            """Assistant and service in one. The wish to hide takes longer than the earlier card waits before it asks."""
+
+            def do_GET(self):
+                body = self.rfile.read(int(self.headers.get("Content-Length") or 0))
+                if not self.path.startswith("/assistant"):
+                    heard.append((self.path.rsplit("/", 1)[1], json.loads(body).get("prefs")))
+                    return self.answer({"serverContext": {"minCallbackIntervalInMS": 300}, "statusCode": 200})
+                hides = "hide" in (self.path + body.decode()).lower()
+                heard.append("hide" if hides else "share")
+                time.sleep(2 if hides else 0)
+                context = "minCallbackIntervalInMS=400&callbackTimeoutIntervalInMS=60000&"
+                self.answer({"sentence": "Done.", "snippet": {"kind": "VAKtrVisibilityView", "visible": not hides,
+                                                              "searchContext": "ktrServerContext://serverContext?" + context}})
+
+            do_POST = do_GET
+
+            def answer(self, said):
+                body = json.dumps(said).encode()
+                self.send_response(200)
+                self.send_header("Content-Type", "application/json")
+                self.send_header("Content-Length", str(len(body)))
+                self.end_headers()
+                self.wfile.write(body)
+
+            def log_message(self, *_):
+                pass
+
+        self.serve(track(8, 0.25))
+        self.assistant(Slow)
+        result = self.live(1.5, "Share my location", "Hide my location")
+        self.assertEqual(heard[:2], ["share", "hide"])
+        self.assertEqual([command for command in heard[2:] if command[0] != "getlocations"], [])
+        self.assertIn("Hidden from friends", result.stdout)
+        # The card of before is still there to be read.
+        self.assertIn("Friends can see where you are", result.stdout)
 
     def test_last_of_many_wishes_is_honoured(self):
         self.serve(track(1, 1))

@@ -100,15 +100,23 @@ TEST_F(LiveVisibilityTest, MapFollowsTheUser) {
     EXPECT_EQ(controller->mapView()->mapView()->requestedRegion()->center.latitude, 51.6);
 }
 
-TEST_F(LiveVisibilityTest, HiddenUser_AsksWhereTheUserIs_AndTellsNoPlace_IsKept) {
+TEST_F(LiveVisibilityTest, HiddenUser_AsksWhereTheUserIs_FromWhereTheyAre_AndShowsThemToNobody_IsKept) {
     show(false);
     time->advance(5.0);
     ASSERT_EQ(sent(), 1U);
     EXPECT_NE(transport->requests[0].path.find("getlocations"), std::string::npos);
     EXPECT_NE(transport->requests[0].body.find(R"("handles":["ann@example.org"])"), std::string::npos)
         << transport->requests[0].body;
+    // What is asked near whom goes along, as with any friend; nothing asks to be shown.
+    EXPECT_NE(transport->requests[0].body.find(R"("myLocation":{"latitude":51.5,"longitude":-2.5)"), std::string::npos)
+        << transport->requests[0].body;
     EXPECT_EQ(transport->requests[0].body.find("hideLocation"), std::string::npos);
     answer({{"locations", Dictionary{}}});
+    walkTo(51.6);
+    time->advance(1000.0);
+    for (const auto& request : transport->requests) {
+        EXPECT_EQ(request.path.find("showHideLocation"), std::string::npos);
+    }
     EXPECT_EQ(controller->friendView()->locationLabel()->text(), "Hidden");
 }
 

@@ -195,6 +195,11 @@ TEST_F(VAKTRLocationSnippetControllerTest, Searching_WhileTheShownFriendHasNoPla
     EXPECT_TRUE(shown({placed(lost("Ann"), 0.0, 0.0)})->isSearching());
     EXPECT_FALSE(shown({ann()})->isSearching());
     EXPECT_FALSE(shown({})->isSearching());
+    EXPECT_FALSE(shown({placed(lost("Ann"), 51.48, 0.0)})->isSearching()) << "on the zeroth meridian";
+    EXPECT_FALSE(shown({placed(lost("Ann"), 0.0, 32.5)})->isSearching()) << "on the equator";
+    const auto named = lost("Ann");
+    named->label = "Work";
+    EXPECT_FALSE(shown({named})->isSearching()) << "known by its name";
 }
 
 TEST_F(VAKTRLocationSnippetControllerTest, EndOfRefreshing_BeforeTheViewIsLoaded) {
