@@ -7,10 +7,10 @@
 #include "host/scenario/ScenarioAccounts.h"
 #include "host/scenario/ScenarioClock.h"
 #include "linux/configuration/ConfiguredAssistant.h"
+#include "linux/contacts/MemoryContactStore.h"
 #include "linux/contacts/PhonenumberLibrary.h"
 #include "linux/contacts/PrefixedAssistantContacts.h"
 #include "linux/contacts/ScriptContactFormatter.h"
-#include "linux/contacts/VCardContactStore.h"
 #include "linux/device/FilteredLogSink.h"
 #include "linux/device/LinuxDevice.h"
 #include "linux/device/QtMainLoop.h"
@@ -54,23 +54,6 @@ std::vector<linux_::TimedPosition> walkOf(const std::vector<ScenarioPosition>& p
         walk.push_back(timed);
     }
     return walk;
-}
-
-/// The contacts of all paths in one store; none, and the reason in `error`, when one cannot be read.
-std::shared_ptr<platform::ContactStore> readContacts(const HostSettings& settings,
-                                                     const std::shared_ptr<linux_::PhonenumberLibrary>& phoneNumbers,
-                                                     const std::string& country, platform::LogSink& log,
-                                                     std::string& error) {
-    platform::ContactStore::Contacts all;
-    for (const std::string& path : settings.contacts) {
-        const auto loaded = linux_::VCardContactStore::load(path, phoneNumbers, country, log);
-        if (!loaded.result) {
-            error = "the contacts cannot be read: " + loaded.error.value_or(path);
-            return nullptr;
-        }
-        all.insert(all.end(), loaded.result->contacts().begin(), loaded.result->contacts().end());
-    }
-    return std::make_shared<linux_::MemoryContactStore>(std::move(all), phoneNumbers, country);
 }
 
 std::shared_ptr<linux_::QtLocalization> readTexts(const HostSettings& settings, std::string& error) {
@@ -137,50 +120,46 @@ void addUserInterface(Platform& platform, const HostSettings& settings, bool isW
 
 }  // namespace
 
-std::optional<Failure> Environment::fill(Platform& platform, const HostSettings& settings, bool isVirtual,
-                                         LiveServices* live, const Platform* earlier) {
-    platform.calendar = std::make_shared<linux_::LocalCalendar>();
-    platform.assistant = std::make_shared<linux_::ConfiguredAssistant>(settings.language);
+std::optional<Failure> Environment::fill(Platform& made, const HostSettings& settings,
+                                         const linux_::ContactFiles::Contacts& contacts, const Platform* earlier) {
+    made.calendar = std::make_shared<linux_::LocalCalendar>();
+    made.assistant = std::make_shared<linux_::ConfiguredAssistant>(settings.language);
     const auto region = std::make_shared<linux_::LocaleRegion>(settings.region);
-    platform.region = region;
-    platform.decimalNumbers =
-        std::make_shared<linux_::IcuNumberFormatter>(region->localeWithLanguage(settings.language));
-    platform.pluralRules = std::make_shared<linux_::IcuPluralRules>();
-    platform.geodesy = std::make_shared<linux_::GeographicLibGeodesy>();
+    made.region = region;
+    made.decimalNumbers = std::make_shared<linux_::IcuNumberFormatter>(region->localeWithLanguage(settings.language));
+    made.pluralRules = std::make_shared<linux_::IcuPluralRules>();
+    made.geodesy = std::make_shared<linux_::GeographicLibGeodesy>();
     // A picture or a text must not depend on whose session it is made in.
     using Distances = linux_::IcuDistanceCalculatorFactory;
-    platform.distanceCalculators = std::make_shared<Distances>(
-        platform.geodesy, isVirtual ? std::nullopt : std::optional(Distances::sessionPreferences()));
+    made.distanceCalculators = std::make_shared<Distances>(
+        made.geodesy, isVirtual_ ? std::nullopt : std::optional(Distances::sessionPreferences()));
     if (earlier != nullptr) {
         // Whoever walks goes on from where they are.
-        platform.locationManagers = earlier->locationManagers;
+        made.locationManagers = earlier->locationManagers;
     } else {
-        platform.locationManagers = std::make_shared<linux_::ScenarioLocationManagerFactory>(
-            walkOf(settings.positions), platform.mainLoop, platform.clock, platform.geodesy);
+        made.locationManagers = std::make_shared<linux_::ScenarioLocationManagerFactory>(
+            walkOf(settings.positions), made.mainLoop, made.clock, made.geodesy);
     }
     const auto phoneNumbers = std::make_shared<linux_::PhonenumberLibrary>();
-    platform.phoneNumbers = phoneNumbers;
-    platform.telephony = std::make_shared<linux_::SettingsTelephony>(settings.country);
-    platform.contactFormatter = std::make_shared<linux_::ScriptContactFormatter>();
-    platform.assistantContacts = std::make_shared<linux_::PrefixedAssistantContacts>();
+    made.phoneNumbers = phoneNumbers;
+    made.telephony = std::make_shared<linux_::SettingsTelephony>(settings.country);
+    made.contactFormatter = std::make_shared<linux_::ScriptContactFormatter>();
+    made.assistantContacts = std::make_shared<linux_::PrefixedAssistantContacts>();
     std::string error;
-    platform.localization = readTexts(settings, error);
-    if (error.empty()) {
-        platform.contactStore =
-            readContacts(settings, phoneNumbers, linux_::HomeCountry::of(*platform.telephony, *platform.region),
-                         *platform.logSink, error);
-    }
+    made.localization = readTexts(settings, error);
     if (!error.empty()) {
         return Failure{ExitCode::Failure, error};
     }
-    addUserInterface(platform, settings, isVirtual, earlier);
+    made.contactStore = std::make_shared<linux_::MemoryContactStore>(
+        contacts, phoneNumbers, linux_::HomeCountry::of(*made.telephony, *made.region));
+    addUserInterface(made, settings, isVirtual_, earlier);
     if (settings.userName) {
-        platform.accounts = std::make_shared<ScenarioAccounts>(*settings.userName);
+        made.accounts = std::make_shared<ScenarioAccounts>(*settings.userName);
     }
-    if (live != nullptr) {
-        live->addTo(platform, settings.language, !settings.positions.empty());
+    if (live) {
+        live->addTo(made, settings.language, !settings.positions.empty());
     }
-    addMaps(platform, settings, live, earlier);
+    addMaps(made, settings, live.get(), earlier);
     return std::nullopt;
 }
 
@@ -209,22 +188,31 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
     if (isLive) {
         environment.live = std::make_unique<LiveServices>(*settings.liveConfiguration);
     }
-    if (auto failure = fill(*environment.platform, settings, isVirtual, environment.live.get(), nullptr)) {
+    std::string error;
+    auto contacts = linux_::ContactFiles::read(settings.contacts, error);
+    auto failure = contacts ? environment.fill(*environment.platform, settings, *contacts, nullptr)
+                            : Failure{ExitCode::Failure, "the contacts cannot be read: " + error};
+    if (failure) {
         Platform::install(nullptr);
         return *failure;
     }
+    environment.contacts_ = std::move(*contacts);
     return environment;
 }
 
-std::optional<Failure> Environment::remake(const HostSettings& settings) {
+std::optional<Failure> Environment::remake(const HostSettings& settings, const Contacts* contacts) {
     const auto next = std::make_shared<Platform>();
     next->logSink = platform->logSink;
     next->mainLoop = platform->mainLoop;
     next->clock = platform->clock;
-    if (auto failure = fill(*next, settings, isVirtual_, live.get(), platform.get())) {
+    const auto& now = contacts ? *contacts : contacts_;
+    if (auto failure = fill(*next, settings, now, platform.get())) {
         return failure;
     }
     platform = next;
+    if (contacts) {
+        contacts_ = *contacts;
+    }
     return std::nullopt;
 }
 

@@ -6,6 +6,7 @@
 #include "host/Failure.h"
 #include "host/HostSettings.h"
 #include "host/live/LiveServices.h"
+#include "linux/contacts/ContactFiles.h"
 #include "platform/base/Platform.h"
 #include "platform/base/VirtualTime.h"
 
@@ -14,6 +15,8 @@ namespace ktr::host {
 /// The platform of a conversation, put together from the Linux implementations. Main thread, while a QGuiApplication
 /// exists.
 struct Environment {
+    using Contacts = linux_::ContactFiles::Contacts;
+
     std::shared_ptr<platform::Platform> platform;
     /// The platform's clock and loop when time is virtual; else none.
     std::shared_ptr<platform::VirtualTime> virtualTime;
@@ -29,12 +32,14 @@ struct Environment {
     /// Makes another platform for settings that have changed, in the place of `platform`, which the caller has
     /// installed and uninstalls. Log, loop, clock, appearance, maps and what is live go on. With a failure everything
     /// stays as it was.
-    std::optional<Failure> remake(const HostSettings& settings);
+    /// `contacts`: what has been read again; none: those from before.
+    std::optional<Failure> remake(const HostSettings& settings, const Contacts* contacts = nullptr);
 
   private:
-    static std::optional<Failure> fill(platform::Platform& platform, const HostSettings& settings, bool isVirtual,
-                                       LiveServices* live, const platform::Platform* earlier);
+    std::optional<Failure> fill(platform::Platform& made, const HostSettings& settings, const Contacts& contacts,
+                                const platform::Platform* earlier);
     bool isVirtual_ = false;
+    Contacts contacts_;
 };
 
 }  // namespace ktr::host

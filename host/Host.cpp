@@ -46,19 +46,41 @@ std::variant<std::unique_ptr<Host>, Failure> Host::make(const HostSettings& sett
     host->window_ = platform::create<platform::Window>(&platform::Window::initWithFrame, platform::Rect{});
     host->conversation_ = platform::create<ConversationView>(&ConversationView::initWithFrame, platform::Rect{});
     host->window_->addSubview(host->conversation_);
-    if (auto* live = host->live()) {
-        live->setOutdated([self = host.get()] {
-            HostSettings now = self->settings_;
-            self->live()->takeConfiguration();
-            now.follow(self->live()->configuration());
-            if (const auto failure = self->remake(now)) {
-                platform::areaLog(platform::LogArea::Host)
-                    .write(platform::LogLevel::Error, "the changed configuration is not used: %@",
-                           platform::FormatArgument(failure->line).shown());
-            }
-        });
+    if (host->live()) {
+        host->followFiles();
     }
     return host;
+}
+
+void Host::followFiles() {
+    live()->setOutdated([this] { configurationChanged(); });
+    contactFiles_ = std::make_unique<linux_::ContactFiles>(platform()->mainLoop);
+    contactFiles_->follow(settings_.contacts, [this](const Environment::Contacts& contacts) {
+        HostSettings now = settings_;
+        now.follow(live()->configuration());
+        remakeOrSay(now, &contacts);
+    });
+}
+
+void Host::configurationChanged() {
+    live()->takeConfiguration();
+    HostSettings now = settings_;
+    now.follow(live()->configuration());
+    if (now.contacts != settings_.contacts) {
+        // Other files: what they hold is there when they have been read.
+        contactFiles_->setPaths(now.contacts);
+        contactFiles_->reload();
+        now.contacts = settings_.contacts;
+    }
+    remakeOrSay(now, nullptr);
+}
+
+void Host::remakeOrSay(const HostSettings& settings, const Environment::Contacts* contacts) {
+    if (const auto failure = remake(settings, contacts)) {
+        platform::areaLog(platform::LogArea::Host)
+            .write(platform::LogLevel::Error, "what has changed is not used: %@",
+                   platform::FormatArgument(failure->line).shown());
+    }
 }
 
 std::optional<Failure> Host::loadPlugin() {
@@ -71,6 +93,7 @@ std::optional<Failure> Host::loadPlugin() {
 }
 
 Host::~Host() {
+    contactFiles_.reset();
     // Views and controllers come from the plugin, and all of them use the platform.
     for (const Turn& turn : turns_) {
         turn.view->card()->letGo();
@@ -232,10 +255,10 @@ void Host::letCardsGo() {
     }
 }
 
-std::optional<Failure> Host::remake(const HostSettings& settings) {
+std::optional<Failure> Host::remake(const HostSettings& settings, const Environment::Contacts* contacts) {
     // What is under way may hold on to it a little longer than its place lasts.
     const auto earlier = platform();
-    if (auto failure = environment_.remake(settings)) {
+    if (auto failure = environment_.remake(settings, contacts)) {
         return failure;
     }
     settings_ = settings;

@@ -58,7 +58,7 @@ class Host {
     /// new one would show a user who may have hidden since. Window, conversation and turns stay the same objects, cards
     /// and what is in them do not; `remade` is called at the end, and whoever shows the conversation lays it out again.
     /// With a failure everything stays as it was, unless it is the plugin that fails: then there are no cards.
-    std::optional<Failure> remake(const HostSettings& settings);
+    std::optional<Failure> remake(const HostSettings& settings) { return remake(settings, nullptr); }
     /// Called after `remake`.
     void setRemade(std::function<void()> remade) { remade_ = std::move(remade); }
 
@@ -97,6 +97,11 @@ class Host {
     };
 
     Host() = default;
+    std::optional<Failure> remake(const HostSettings& settings, const Environment::Contacts* contacts);
+    /// Follows the configuration from then on, and the files of the contacts.
+    void followFiles();
+    void configurationChanged();
+    void remakeOrSay(const HostSettings& settings, const Environment::Contacts* contacts);
     std::optional<Failure> loadPlugin();
     /// Sets a turn's texts, and its card. False when the plugin draws no such answer.
     bool show(Turn& turn);
@@ -112,6 +117,8 @@ class Host {
     HostSettings settings_;
     std::string pluginPath_;
     Environment environment_;
+    /// Of what is live: a picture is of one moment.
+    std::unique_ptr<linux_::ContactFiles> contactFiles_;
     std::unique_ptr<Plugin> plugin_;
     std::shared_ptr<HostDelegate> delegate_;
     std::shared_ptr<platform::Window> window_;

@@ -68,7 +68,7 @@ std::shared_ptr<LiveConversation> LiveConversation::make(Host& host) {
 }
 
 platform::Date LiveConversation::now() const {
-    return host_.platform()->clock->now();
+    return host_.live()->evenClock().now();
 }
 
 void LiveConversation::tellChanged() {
@@ -178,7 +178,8 @@ Scenario LiveConversation::read(const linux_::AssistantClient::Answer& answer) {
         scenario.sentence = LocalizedText(host_.text(sentence));
         return scenario;
     }
-    auto read = ScenarioReader(now(), ScenarioReader::Clock::Present).readText(answer.body, "the assistant's answer");
+    auto read = ScenarioReader(host_.platform()->clock->now(), ScenarioReader::Clock::Present)
+                    .readText(answer.body, "the assistant's answer");
     if (const auto* error = std::get_if<documents::DocumentError>(&read)) {
         failure_ = Failure{ExitCode::Failure, error->text()};
         return scenario;
@@ -221,9 +222,10 @@ LiveStatus LiveConversation::status() const {
         facts.now.secondsSinceReferenceDate - shownAt_->secondsSinceReferenceDate < kFindingPosition;
     facts.hidden = host_.saysHidden();
     facts.service = host_.live()->service().notes();
-    return LiveStatus::of(facts, {[this](const std::string& key) { return host_.text(key); },
-                                  [this](platform::Date moment) { return host_.clockFace(moment); },
-                                  [this](std::int64_t number) { return host_.number(number); }});
+    return LiveStatus::of(
+        facts, {[this](const std::string& key) { return host_.text(key); },
+                [this](platform::Date moment) { return host_.clockFace(host_.live()->evenClock().onTheOther(moment)); },
+                [this](std::int64_t number) { return host_.number(number); }});
 }
 
 }  // namespace ktr::host

@@ -59,6 +59,7 @@ LiveServices::~LiveServices() {
 
 void LiveServices::makeOnce(const platform::Platform& platform) {
     mainLoop_ = platform.mainLoop;
+    evenClock_ = std::make_shared<linux_::EvenClock>(platform.clock);
     deviceInformation_ = std::make_shared<linux_::SystemDeviceInformation>();
     deviceLock_ = std::make_shared<linux_::LogindLock>();
     preferences_ = std::make_shared<linux_::FilePreferences>(linux_::XdgFolders::state() / "preferences");
@@ -69,7 +70,7 @@ void LiveServices::makeOnce(const platform::Platform& platform) {
         return std::make_shared<linux_::RememberedHostTransport>(transport, preferences, kPreferences);
     };
     lanes_ = std::make_shared<ServiceLanes>(lane, mainLoop_);
-    service_ = std::make_shared<ServiceWatch>(lanes_, mainLoop_, platform.clock);
+    service_ = std::make_shared<ServiceWatch>(lanes_, mainLoop_, evenClock_);
     service_->setChanged([this] {
         if (changed_) {
             changed_();

@@ -12,6 +12,7 @@
 #include "linux/configuration/ConfigurationWatcher.h"
 #include "linux/configuration/ConfiguredAccountStore.h"
 #include "linux/configuration/FilePreferences.h"
+#include "linux/device/EvenClock.h"
 #include "linux/maps/ThreadedMapSource.h"
 #include "linux/net/AssistantClient.h"
 #include "platform/base/Platform.h"
@@ -63,6 +64,8 @@ class LiveServices {
     /// Whether somebody tells where the user is.
     bool looksForPosition() const { return looksForPosition_; }
     const ServiceWatch& service() const { return *service_; }
+    /// What ages are counted by; the moments of `service` are its.
+    const linux_::EvenClock& evenClock() const { return *evenClock_; }
     linux_::AssistantClient& assistant() { return *assistant_; }
     /// Called after something that the user is told of may have changed.
     void setChanged(std::function<void()> changed);
@@ -83,6 +86,7 @@ class LiveServices {
     std::shared_ptr<platform::DeviceLock> deviceLock_;
     std::shared_ptr<platform::LocationManagerFactory> positions_;
     linux_::Configuration::Positions positionsMade_;
+    std::shared_ptr<linux_::EvenClock> evenClock_;
     std::shared_ptr<ServiceLanes> lanes_;
     std::shared_ptr<ServiceWatch> service_;
     std::string language_;

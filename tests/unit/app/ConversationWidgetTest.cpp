@@ -370,6 +370,36 @@ TEST_F(KTRConversationWidgetTest, RightToLeft_Mirrors) {
     EXPECT_EQ(widget->layoutDirection(), Qt::RightToLeft);
 }
 
+TEST_F(KTRConversationWidgetTest, Remade_SpeaksTheOtherLanguageAndKeepsWhatScreenReadersHold) {
+    open({"dinner"});
+    auto* root = QAccessible::queryAccessibleInterface(widget.get());
+    ASSERT_NE(root, nullptr);
+    ASSERT_GT(root->childCount(), 0);
+    const auto conversation = host->conversation();
+    host::HostSettings settings = host->settings();
+    settings.language = "ar";
+    settings.region = "ar";
+    host->setRemade([this] { widget->remade(); });
+    ASSERT_FALSE(host->remake(settings));
+    QApplication::processEvents();
+    EXPECT_EQ(widget->layoutDirection(), Qt::RightToLeft);
+    EXPECT_EQ(host->conversation(), conversation);
+    EXPECT_EQ(QAccessible::queryAccessibleInterface(widget.get()), root);
+    QString spoken;
+    const auto visit = [&](const auto& self, QAccessibleInterface* node) -> void {
+        spoken += node->text(QAccessible::Name);
+        for (int i = 0; i < node->childCount(); ++i) {
+            self(self, node->child(i));
+        }
+    };
+    visit(visit, root);
+    EXPECT_TRUE(spoken.contains(QChar(0x0627))) << "Arabic letters: " << spoken.toStdString();
+    // Back again: what was let go of is not touched.
+    settings.language = "en-GB";
+    ASSERT_FALSE(host->remake(settings));
+    EXPECT_EQ(widget->layoutDirection(), Qt::LeftToRight);
+}
+
 }  // namespace
 
 }  // namespace ktr::app

@@ -257,6 +257,29 @@ TEST_F(LiveHostTest, ChangedLanguage_IsSpoken) {
     EXPECT_NE(described().find("Freunde"), std::string::npos) << described();
 }
 
+TEST_F(LiveHostTest, ChangedContacts_AreReadAgain) {
+    const auto nameOfAnn = [this]() -> std::string {
+        const auto found =
+            host->platform()->contactStore->unifiedContactsMatchingEmailAddress("ann@harbour.example", {}).result;
+        return found.empty() ? "" : found.front()->givenName;
+    };
+    const auto write = [this](const std::string& name) {
+        std::ofstream(folder.filePath(QStringLiteral("cards.vcf")).toStdString())
+            << "BEGIN:VCARD\r\nVERSION:3.0\r\nFN:" << name << " Marsh\r\nN:Marsh;" << name
+            << ";;;\r\nEMAIL:ann@harbour.example\r\nEND:VCARD\r\n";
+    };
+    EXPECT_EQ(nameOfAnn(), "");
+    write("Ann");
+    const auto turn = add(kFriends);
+    configure(R"({"account": {"personId": "1000", "host": "service.example"}, "positions": {"source": "none"},
+                  "language": "en-GB", "contacts": ["cards.vcf"]})");
+    ASSERT_TRUE(runUntil([&] { return nameOfAnn() == "Ann"; }));
+    const auto before = turn->card()->controller();
+    write("Anna");
+    ASSERT_TRUE(runUntil([&] { return nameOfAnn() == "Anna"; }));
+    EXPECT_NE(turn->card()->controller(), before);
+}
+
 TEST_F(LiveHostTest, Restricted_MakesNoCardAndSaysSo) {
     const auto turn = add(kFriends);
     bool isRemade = false;

@@ -50,6 +50,12 @@ TEST_F(LiveStatusTest, TroubleGoesBeforeHiding) {
     EXPECT_EQ(words(), "STATUS_SIGN_IN");
 }
 
+TEST_F(LiveStatusTest, BrokenConfiguration_IsNotTakenForSigningOut) {
+    facts.signedIn = false;
+    facts.unusable = true;
+    EXPECT_EQ(status(), (LiveStatus{LiveStatus::Mark::Warning, "STATUS_UNREADABLE"}));
+}
+
 TEST_F(LiveStatusTest, QuestionUnderWayGoesBeforeHiding) {
     facts.hidden = true;
     facts.asking = Date{104.0};
