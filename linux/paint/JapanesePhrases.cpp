@@ -18,6 +18,14 @@ bool isKana(QChar c) {
     return c.unicode() >= 0x3041 && c.unicode() <= 0x30FF;
 }
 
+/// Endings of verbs ("ています"), which the phrases of the locale data part from their verbs.
+bool isEnding(QChar before, QChar c) {
+    constexpr char16_t kTe = 0x3066;
+    constexpr char16_t kTa = 0x305F;
+    constexpr char16_t kLastHiragana = 0x309F;
+    return isKana(before) && before.unicode() <= kLastHiragana && (c.unicode() == kTe || c.unicode() == kTa);
+}
+
 bool isJapaneseLetter(QChar c) {
     return isKana(c) || (c.unicode() >= 0x3400 && c.unicode() <= 0x9FFF) || c.unicode() == 0x3005;
 }
@@ -39,7 +47,7 @@ QString JapanesePhrases::joined(const QString& text) {
     QString out;
     for (qsizetype at = 0; at < text.size(); ++at) {
         const bool within = at > 0 && isJapaneseLetter(text[at - 1]) && isJapaneseLetter(text[at]);
-        if (within && !phrases->isBoundary(static_cast<int32_t>(at))) {
+        if (within && (isEnding(text[at - 1], text[at]) || !phrases->isBoundary(static_cast<int32_t>(at)))) {
             out.append(kWordJoiner);
         }
         out.append(text[at]);
