@@ -11,7 +11,6 @@
 #include "server/http/BasicCredentials.h"
 #include "server/http/HttpServer.h"
 #include "server/http/TlsContext.h"
-#include "server/http/UrlQuery.h"
 
 namespace ktr::serve {
 
@@ -105,7 +104,7 @@ class DevelopmentServer::Server {
         if (!isForUs(request)) {
             return reply.send(refusalOf(421, "this service is for localhost alone"));
         }
-        if (request.method == "GET" && request.path == "/assistant") {
+        if (request.path == "/assistant") {
             return reply.send(ask(request));
         }
         for (const Command& command : kAllCommands) {
@@ -142,19 +141,49 @@ class DevelopmentServer::Server {
     }
 
     HttpResponse ask(const HttpRequest& request) const {
-        const auto question = server::UrlQuery::read(request.query).find("q");
-        if (!question) {
-            return refusalOf(400, "expected a question: /assistant?q=where%20is%20ann");
+        if (request.method != "POST") {
+            // A question may be a wish, and a page of another site, a link or a look ahead can make a GET.
+            HttpResponse response = refusalOf(405, "a question is a POST");
+            response.headers.emplace_back("Allow", "POST");
+            return response;
         }
-        return HttpResponse::json(200, platform::writeJson(assistant_.answer(*question, now())));
+        if (const auto refused = refusalOfCredentials(request)) {
+            return *refused;
+        }
+        // Nor can it send this type without asking whether it may.
+        if (const auto refused = refusalOfType(request)) {
+            return *refused;
+        }
+        const auto document = documents::JsonReader::read(request.body);
+        const auto* value = std::get_if<Value>(&document);
+        const auto* members = value != nullptr ? value->dictionary() : nullptr;
+        const auto* question = members != nullptr ? members->find("question") : nullptr;
+        if (question == nullptr || question->string() == nullptr) {
+            return refusalOf(400, "expected a question: {\"question\": \"Where is Ann?\"}");
+        }
+        return HttpResponse::json(200, platform::writeJson(assistant_.answer(*question->string(), now())));
     }
 
-    /// What is wrong with the request around its body.
+    std::optional<HttpResponse> refusalOfCredentials(const HttpRequest& request) const {
+        if (server::sameSecret(request.headerText("Authorization"), authorization_)) {
+            return std::nullopt;
+        }
+        HttpResponse response = refusalOf(401, "the credentials are missing or wrong");
+        response.headers.emplace_back("WWW-Authenticate", "Basic realm=\"ktr serve\"");
+        return response;
+    }
+
+    static std::optional<HttpResponse> refusalOfType(const HttpRequest& request) {
+        if (request.headerText("Content-Type").rfind(kJson, 0) == 0) {
+            return std::nullopt;
+        }
+        return refusalOf(415, "expected the header Content-Type: application/json");
+    }
+
+    /// What is wrong with a command's request around its body.
     std::optional<HttpResponse> refusal(const HttpRequest& request) const {
-        if (!server::sameSecret(request.headerText("Authorization"), authorization_)) {
-            HttpResponse response = refusalOf(401, "the credentials are missing or wrong");
-            response.headers.emplace_back("WWW-Authenticate", "Basic realm=\"ktr serve\"");
-            return response;
+        if (auto refused = refusalOfCredentials(request)) {
+            return refused;
         }
         if (request.headerText("X-Orcha-Seek-API-Ver") != "4.0") {
             return refusalOf(400, "expected the header X-Orcha-Seek-API-Ver: 4.0");
@@ -162,10 +191,7 @@ class DevelopmentServer::Server {
         if (request.headerText("X-Orcha-AuthScheme") != "Forever") {
             return refusalOf(400, "expected the header X-Orcha-AuthScheme: Forever");
         }
-        if (request.headerText("Content-Type").rfind(kJson, 0) != 0) {
-            return refusalOf(415, "expected the header Content-Type: application/json");
-        }
-        return std::nullopt;
+        return refusalOfType(request);
     }
 
     void run(const Command& command, HttpRequest request, const HttpReply& reply) {

@@ -17,6 +17,7 @@
 #include "linux/positions/ConfiguredPositions.h"
 #include "platform/base/MainLoop.h"
 #include "platform/client/DeviceOwnerAccount.h"
+#include "platform/client/KTJSONCommand.h"
 
 namespace ktr::host {
 
@@ -79,7 +80,12 @@ void LiveServices::makeOnce(const platform::Platform& platform) {
     // Asked on the main thread, at each question.
     assistant_ = std::make_unique<linux_::AssistantClient>([this] {
         const auto settings = transportSettings(*accounts_);
-        return linux_::AssistantClient::Settings{settings.serviceHost, settings.certificateFiles, language_};
+        const auto account = accounts_->deviceOwnerAccount();
+        const auto token = account ? account->tokenOfType(platform::kFriendLocationService) : std::nullopt;
+        const auto authorization =
+            token ? platform::basicAuthorization(account->personIdentifier().value_or(""), *token) : std::nullopt;
+        return linux_::AssistantClient::Settings{settings.serviceHost, authorization, settings.certificateFiles,
+                                                 language_};
     });
 }
 

@@ -7,11 +7,12 @@
 #include <QNetworkRequest>
 #include <QPointer>
 #include <QTimer>
-#include <QUrlQuery>
 #include <utility>
 
+#include "linux/net/OneShotBody.h"
 #include "linux/net/Origin.h"
 #include "linux/net/TlsTrust.h"
+#include "platform/base/Json.h"
 
 namespace ktr::linux_ {
 
@@ -22,29 +23,31 @@ namespace {
 constexpr int kMillisecondsASecond = 1000;
 constexpr qint64 kStep = 64 * 1024;
 
-/// The question's URL; none for a host that is none.
-std::optional<QUrl> urlFor(const AssistantClient::Settings& settings, const std::string& question) {
+/// Where questions go; none for a host that is none.
+std::optional<QUrl> urlFor(const AssistantClient::Settings& settings) {
     const auto origin = Origin::fromText(settings.host.value_or(""));
     if (!origin) {
         return std::nullopt;
     }
     QUrl url(QStringLiteral("https://") + QString::fromStdString(origin->text()) + QStringLiteral("/assistant"),
              QUrl::StrictMode);
-    // A query leaves "+" as it is, which servers read as a blank.
-    url.setQuery(QStringLiteral("q=") + QString::fromLatin1(QUrl::toPercentEncoding(QString::fromStdString(question))),
-                 QUrl::StrictMode);
     return url.isValid() && Origin::fromUrl(url) == origin ? std::optional(url) : std::nullopt;
 }
 
 QNetworkRequest requestFor(const QUrl& url, const AssistantClient::Settings& settings, const QSslConfiguration& tls) {
     QNetworkRequest request(url);
     request.setRawHeader("Accept", "application/json");
+    request.setRawHeader("Authorization", QByteArray::fromStdString(settings.authorization.value_or("")));
+    request.setRawHeader("Connection", "close");
     // A compressed answer could be small and unfold to any size.
     request.setRawHeader("Accept-Encoding", "identity");
     request.setRawHeader("Accept-Language",
                          QByteArray::fromStdString(settings.language.empty() ? "*" : settings.language));
     request.setRawHeader("User-Agent", "ktr");
     request.setSslConfiguration(tls);
+    request.setHeader(QNetworkRequest::ContentTypeHeader, QStringLiteral("application/json"));
+    request.setAttribute(QNetworkRequest::DoNotBufferUploadDataAttribute, true);
+    request.setAttribute(QNetworkRequest::Http2AllowedAttribute, false);
     request.setAttribute(QNetworkRequest::RedirectPolicyAttribute, QNetworkRequest::ManualRedirectPolicy);
     request.setAttribute(QNetworkRequest::CookieLoadControlAttribute, QNetworkRequest::Manual);
     request.setAttribute(QNetworkRequest::CookieSaveControlAttribute, QNetworkRequest::Manual);
@@ -123,8 +126,8 @@ class AssistantClient::Exchange : public QObject {
 class AssistantClient::Worker : public QObject {
   public:
     void ask(const Settings& settings, const std::string& question, Completion completion) {
-        const auto url = urlFor(settings, question);
-        if (!url) {
+        const auto url = urlFor(settings);
+        if (!url || !settings.authorization) {
             completion({HttpFailure::BadRequest, 0, {}});
             return;
         }
@@ -140,7 +143,13 @@ class AssistantClient::Worker : public QObject {
             // A connection that waits was checked against the trust of before.
             manager_->clearConnectionCache();
         }
-        auto* exchange = new Exchange(manager_->get(requestFor(*url, settings, tls_)), std::move(completion));
+        // A question may be a wish: it goes once.
+        auto* body = new OneShotBody(QByteArray::fromStdString(platform::writeJson({{"question", question}})));
+        QNetworkRequest request = requestFor(*url, settings, tls_);
+        request.setHeader(QNetworkRequest::ContentLengthHeader, body->bytesAvailable());
+        QNetworkReply* reply = manager_->post(request, body);
+        body->setParent(reply);
+        auto* exchange = new Exchange(reply, std::move(completion));
         exchange->setParent(this);
     }
 

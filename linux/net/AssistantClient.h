@@ -11,12 +11,15 @@
 namespace ktr::linux_ {
 
 /// Asks the assistant's server a question (docs/service-protocol.md), over HTTPS with the trust of TlsTrust, on a
-/// thread of its own. A question carries no credentials. Redirects are not followed.
+/// thread of its own. A question may be a wish, such as to hide: it is one POST with the account's credentials, sent once
+/// whatever happens to it. Redirects are not followed.
 class AssistantClient {
   public:
     struct Settings {
         /// A host, with ":port" when the port is not 443; none: nobody is asked.
         std::optional<std::string> host;
+        /// The value of the field "Authorization"; none: nobody is asked.
+        std::optional<std::string> authorization;
         /// Files of certificates (PEM) that are trusted besides the system's.
         std::vector<std::string> certificateFiles;
         std::string language;  ///< BCP 47: the answer's, if the assistant speaks it

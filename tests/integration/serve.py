@@ -1,8 +1,12 @@
 """Runs `ktr serve` for a test."""
+import base64
+import http.client
+import json
 import os
 import pathlib
 import re
 import signal
+import ssl
 import subprocess
 import tempfile
 
@@ -25,6 +29,18 @@ class Service:
     @property
     def token(self):
         return (self.folder / "ca" / "token").read_text().strip()
+
+    @property
+    def credentials(self):
+        return "Basic " + base64.b64encode(f"1000:{self.token}".encode()).decode()
+
+    def ask(self, question):
+        """The assistant's answer to a question."""
+        context = ssl.create_default_context(cafile=self.authority)
+        connection = http.client.HTTPSConnection("localhost", self.port, context=context, timeout=20)
+        connection.request("POST", "/assistant", json.dumps({"question": question}),
+                           {"Authorization": self.credentials, "Content-Type": "application/json"})
+        return json.loads(connection.getresponse().read())
 
     def end(self, how=signal.SIGTERM):
         """Ends the service; gives its exit status and the lines that it wrote."""

@@ -3,7 +3,6 @@
 
   serve_test.py PROGRAM [unittest options]
 """
-import base64
 import concurrent.futures
 import gzip
 import http.client
@@ -17,7 +16,6 @@ import subprocess
 import sys
 import time
 import unittest
-import urllib.parse
 
 from serve import Service
 
@@ -32,8 +30,7 @@ def connect(service, host="localhost", authority=None):
 
 
 def headers(service, **changes):
-    credentials = base64.b64encode(f"1000:{service.token}".encode()).decode()
-    all_headers = {"Authorization": "Basic " + credentials, "X-Orcha-Seek-API-Ver": "4.0",
+    all_headers = {"Authorization": service.credentials, "X-Orcha-Seek-API-Ver": "4.0",
                    "X-Orcha-AuthScheme": "Forever", "Content-Type": "application/json"}
     all_headers.update(changes)
     return {name: value for name, value in all_headers.items() if value is not None}
@@ -261,9 +258,7 @@ class SharingTest(unittest.TestCase):
         return json.loads(connection.getresponse().read())["myInfo"]
 
     def visible(self, service, question):
-        connection = connect(service)
-        connection.request("GET", "/assistant?q=" + urllib.parse.quote(question))
-        return json.loads(connection.getresponse().read())["snippet"]["visible"]
+        return service.ask(question)["snippet"]["visible"]
 
     def test_state_is_kept_while_it_runs(self):
         with Service(PROGRAM) as service:
@@ -281,6 +276,28 @@ class SharingTest(unittest.TestCase):
             self.assertTrue(self.visible(service, "Can my friends see me?"))
             _, lines = service.end()
             self.assertEqual(lines, [f"request {n}: showHideLocation, 200" for n in (1, 2, 3, 4)])
+
+    def test_only_a_question_with_the_token_changes_anything(self):
+        with Service(PROGRAM) as service:
+            wish = json.dumps({"question": "Hide my location"})
+            good = {"Authorization": service.credentials, "Content-Type": "application/json"}
+            for method, path, body, fields, status in (
+                    ("GET", "/assistant?q=hide%20my%20location", None, {}, 405),
+                    ("GET", "/assistant?q=hide%20my%20location", None, good, 405),
+                    ("HEAD", "/assistant?q=hide%20my%20location", None, good, 405),
+                    ("PUT", "/assistant", wish, good, 404),
+                    ("POST", "/assistant", wish, {**good, "Authorization": "Basic MTAwMDp4"}, 401),
+                    ("POST", "/assistant", wish, {"Content-Type": "application/json"}, 401),
+                    # What a page of another site can send without being asked whether it may.
+                    ("POST", "/assistant", wish, {**good, "Content-Type": "text/plain"}, 415),
+                    ("POST", "/assistant", "q=hide+my+location",
+                     {**good, "Content-Type": "application/x-www-form-urlencoded"}, 415),
+                    ("POST", "/assistant?q=hide%20my%20location", "{}", good, 400)):
+                connection = connect(service)
+                connection.request(method, path, body, fields)
+                self.assertEqual(connection.getresponse().status, status, (method, path, fields))
+            self.assertTrue(self.visible(service, "Can my friends see me?"))
+            self.assertFalse(self.visible(service, "Hide my location"))
 
     def test_state_ends_with_it(self):
         with Service(PROGRAM) as service:

@@ -2,7 +2,6 @@
 """The user's own sharing and fences: the real program against the real `ktr serve`, without a display."""
 
 import concurrent.futures
-import http.client
 import http.server
 import json
 import os
@@ -15,7 +14,6 @@ import tempfile
 import threading
 import time
 import unittest
-import urllib.parse
 
 from serve import Service
 
@@ -58,10 +56,7 @@ class SharingTest(unittest.TestCase):
         return result
 
     def is_visible(self, question="Can my friends see me?"):
-        context = ssl.create_default_context(cafile=self.service.authority)
-        connection = http.client.HTTPSConnection("localhost", self.service.port, context=context, timeout=20)
-        connection.request("GET", "/assistant?q=" + urllib.parse.quote(question))
-        return json.loads(connection.getresponse().read())["snippet"]["visible"]
+        return self.service.ask(question)["snippet"]["visible"]
 
     def commands(self):
         """What was sent to the service, in order; ends it."""
@@ -128,8 +123,8 @@ class SharingTest(unittest.TestCase):
         class Slow(http.server.BaseHTTPRequestHandler):
             """The sooner it is asked, the later it answers."""
 
-            def do_GET(self):
-                question = urllib.parse.parse_qs(urllib.parse.urlsplit(self.path).query)["q"][0]
+            def do_POST(self):
+                question = json.loads(self.rfile.read(int(self.headers["Content-Length"])))["question"]
                 seen.append("asked: " + question)
                 time.sleep(max(0.8 - 0.2 * len(seen), 0.1))
                 seen.append("answered: " + question)
