@@ -91,7 +91,8 @@ void addMaps(Platform& platform, const HostSettings& settings, LiveServices* liv
         return;
     }
     const auto maps = linux_::ConfiguredMaps::make(live ? live->configuration() : linux_::Configuration{},
-                                                   resourceFolder(), platform.mainLoop);
+                                                   resourceFolder(), platform.mainLoop,
+                                                   live ? live->network() : nullptr);
     platform.maps = maps;
     if (live) {
         live->drawConfiguredMaps(maps);

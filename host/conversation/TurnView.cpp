@@ -3,6 +3,7 @@
 #include <QPainter>
 #include <algorithm>
 
+#include "host/conversation/CutText.h"
 #include "host/conversation/Measures.h"
 #include "host/conversation/Shapes.h"
 #include "host/conversation/WideColumns.h"
@@ -79,14 +80,15 @@ void TurnView::renew() {
 
 void TurnView::setTexts(const TurnTexts& texts) {
     texts_ = texts;
-    bubble_->setText(texts.question);
+    texts_.question = cutText(texts.question, kLongestText);
+    bubble_->setText(texts_.question);
     bubble_->setHidden(texts.question.empty());
     setSentence(texts.sentence);
 }
 
 void TurnView::setSentence(const std::string& sentence) {
-    texts_.sentence = sentence;
-    sentence_->setText(sentence);
+    texts_.sentence = cutText(sentence, kLongestText);
+    sentence_->setText(texts_.sentence);
     sentence_->setHidden(sentence.empty());
 }
 

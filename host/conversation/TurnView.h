@@ -13,7 +13,7 @@
 
 namespace ktr::host {
 
-/// The words of a turn. Empty ones take no room.
+/// The words of a turn. Empty ones take no room; question and sentence are cut when they are longer than anybody reads.
 struct TurnTexts {
     std::string longTime;   ///< "Today, 17:42": above the conversation's first turn
     std::string shortTime;  ///< "17:42": beside a card
@@ -24,6 +24,9 @@ struct TurnTexts {
 /// A question, a sentence and a card: one under the other, or side by side where there is room. Main thread.
 class TurnView : public platform::View {
   public:
+    /// Bytes of a question or a sentence: whoever sends a megabyte must not hold up the window, which measures all of it.
+    static constexpr std::size_t kLongestText = 4000;
+
     bool initWithFrame(const platform::Rect& frame) override;
     void setTexts(const TurnTexts& texts);
     void setSentence(const std::string& sentence);

@@ -2,19 +2,18 @@
 
 #include <utility>
 
+#include "host/conversation/CutText.h"
 #include "host/scenario/ScenarioReader.h"
 #include "platform/base/Clock.h"
 #include "platform/base/MainLoop.h"
-#include "platform/base/Utf8.h"
 
 namespace ktr::host {
-
-using platform::HttpFailure;
 
 namespace {
 
 /// How long the status line says that a position is looked for, seconds.
 constexpr double kFindingPosition = 20.0;
+constexpr int kUnauthorized = 401;
 
 std::string trimmed(const std::string& text) {
     constexpr const char* kBlanks = " \t\r\n";
@@ -22,37 +21,8 @@ std::string trimmed(const std::string& text) {
     if (first == std::string::npos) {
         return "";
     }
-    std::string whole = text.substr(first, text.find_last_not_of(kBlanks) - first + 1);
-    if (whole.size() > LiveConversation::kLongestQuestion) {
-        std::size_t end = LiveConversation::kLongestQuestion;
-        while (end > 0 && (static_cast<unsigned char>(whole[end]) & 0xC0u) == 0x80u) {
-            --end;
-        }
-        whole.resize(end);
-    }
-    return whole;
-}
-
-std::string reasonOf(const linux_::AssistantClient::Answer& answer) {
-    switch (answer.failure) {
-        case HttpFailure::BadRequest:
-            return "the configuration names no host";
-        case HttpFailure::Tls:
-            return "its host could not prove who it is";
-        case HttpFailure::Timeout:
-            return "it took too long";
-        case HttpFailure::TooLarge:
-            return "its answer is too large";
-        case HttpFailure::RedirectRefused:
-            return "its answer is a redirect";
-        case HttpFailure::Cancelled:
-            return "cancelled";
-        case HttpFailure::Network:
-            return "no connection, or a broken one";
-        case HttpFailure::None:
-            break;
-    }
-    return "it answers with the status " + std::to_string(answer.status);
+    return beginningOf(text.substr(first, text.find_last_not_of(kBlanks) - first + 1),
+                       LiveConversation::kLongestQuestion);
 }
 
 }  // namespace
@@ -171,8 +141,9 @@ Scenario LiveConversation::read(const linux_::AssistantClient::Answer& answer) {
     Scenario scenario;
     assistantIsAway_ = !answer.hasBody();
     if (!answer.hasBody()) {
-        failure_ = Failure{ExitCode::Failure, "the assistant cannot be asked: " + reasonOf(answer)};
-        const char* sentence = host_.live()->isSignedIn()   ? "ANSWER_UNREACHABLE"
+        failure_ = Failure{ExitCode::Failure, "the assistant cannot be asked: " + answer.reason};
+        const bool isSignedIn = host_.live()->isSignedIn() && answer.status != kUnauthorized;
+        const char* sentence = isSignedIn                   ? "ANSWER_UNREACHABLE"
                                : host_.live()->isUnusable() ? "STATUS_UNREADABLE"
                                                             : "ANSWER_SIGN_IN";
         scenario.sentence = LocalizedText(host_.text(sentence));

@@ -65,13 +65,14 @@ void LiveServices::makeOnce(const platform::Platform& platform) {
     deviceLock_ = std::make_shared<linux_::LogindLock>();
     preferences_ = std::make_shared<linux_::FilePreferences>(linux_::XdgFolders::state() / "preferences");
     preferences_->load(kPreferences);
-    const auto lane = [accounts = accounts_, preferences = preferences_]() -> std::shared_ptr<platform::HttpTransport> {
-        const auto transport =
-            std::make_shared<linux_::QtHttpTransport>([accounts] { return transportSettings(*accounts); });
-        return std::make_shared<linux_::RememberedHostTransport>(transport, preferences, kPreferences);
+    const auto lane = [accounts = accounts_, network = network_]() -> std::shared_ptr<platform::HttpTransport> {
+        return std::make_shared<linux_::QtHttpTransport>([accounts] { return transportSettings(*accounts); }, network);
     };
     lanes_ = std::make_shared<ServiceLanes>(lane, mainLoop_);
-    service_ = std::make_shared<ServiceWatch>(lanes_, mainLoop_, evenClock_);
+    const auto remembering = std::make_shared<linux_::RememberedHostTransport>(
+        lanes_, preferences_, [accounts = accounts_] { return transportSettings(*accounts).serviceHost; },
+        kPreferences);
+    service_ = std::make_shared<ServiceWatch>(remembering, mainLoop_, evenClock_);
     service_->setChanged([this] {
         if (changed_) {
             changed_();
@@ -86,7 +87,7 @@ void LiveServices::makeOnce(const platform::Platform& platform) {
             token ? platform::basicAuthorization(account->personIdentifier().value_or(""), *token) : std::nullopt;
         return linux_::AssistantClient::Settings{settings.serviceHost, authorization, settings.certificateFiles,
                                                  language_};
-    });
+    }, network_);
 }
 
 void LiveServices::addTo(platform::Platform& platform, const std::string& language, bool ownPositions) {
@@ -144,7 +145,7 @@ void LiveServices::takeConfiguration() {
 void LiveServices::configurationChanged() {
     const auto now = accounts_->configuration();
     if (maps_ && (now.maps != configuration_.maps || now.certificates != configuration_.certificates)) {
-        maps_->setGrounds(linux_::ConfiguredMaps::grounds(now, resourceFolder()));
+        maps_->setGrounds(linux_::ConfiguredMaps::grounds(now, resourceFolder(), network_));
     }
     configuration_.maps = now.maps;
     configuration_.certificates = now.certificates;

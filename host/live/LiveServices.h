@@ -15,6 +15,7 @@
 #include "linux/device/EvenClock.h"
 #include "linux/maps/ThreadedMapSource.h"
 #include "linux/net/AssistantClient.h"
+#include "linux/net/NetworkThread.h"
 #include "platform/base/Platform.h"
 
 namespace ktr::host {
@@ -63,6 +64,7 @@ class LiveServices {
     bool isSignedIn() const;
     /// Whether somebody tells where the user is.
     bool looksForPosition() const { return looksForPosition_; }
+    const std::shared_ptr<linux_::NetworkThread>& network() const { return network_; }
     const ServiceWatch& service() const { return *service_; }
     /// What ages are counted by; the moments of `service` are its.
     const linux_::EvenClock& evenClock() const { return *evenClock_; }
@@ -87,6 +89,8 @@ class LiveServices {
     std::shared_ptr<platform::LocationManagerFactory> positions_;
     linux_::Configuration::Positions positionsMade_;
     std::shared_ptr<linux_::EvenClock> evenClock_;
+    /// Everything that is said over the network is said on it.
+    std::shared_ptr<linux_::NetworkThread> network_ = std::make_shared<linux_::NetworkThread>();
     std::shared_ptr<ServiceLanes> lanes_;
     std::shared_ptr<ServiceWatch> service_;
     std::string language_;

@@ -12,8 +12,8 @@ struct Configuration {
         std::string personId;  ///< never empty
         std::optional<std::string> userName;
         std::optional<std::string> host;  ///< with ":port" when the port is not 443
-        /// The domains that commands may be redirected to, besides the host's own; empty: the host's domain alone.
-        std::vector<std::string> domains;
+        /// Where commands may be redirected to besides the host; none: the host's own domain.
+        std::optional<std::vector<std::string>> domains;
         /// The file that holds the app token, as an absolute path; none: the Secret Service, then the file "token"
         /// beside the configuration file.
         std::optional<std::string> tokenFile;

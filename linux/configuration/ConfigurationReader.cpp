@@ -57,7 +57,9 @@ void readAccount(FieldReader& members, const std::filesystem::path& file, Config
         members.complain("host", "expected a host such as \"friends.example\" or \"localhost:8443\", found " +
                                      documents::inQuotes(*account.host));
     }
-    account.domains = members.texts("domains");
+    if (const auto* listed = members.member("domains"); listed != nullptr && !listed->isNull()) {
+        account.domains = members.texts("domains");
+    }
     if (auto token = members.text("tokenFile")) {
         account.tokenFile = resolved(*token, file);
     }

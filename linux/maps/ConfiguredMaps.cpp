@@ -15,7 +15,7 @@ namespace ktr::linux_ {
 namespace {
 
 void addSource(ThreadedMapSource::Grounds& grounds, const Configuration::Maps::Source& source,
-               const Configuration& configuration) {
+               const Configuration& configuration, const std::shared_ptr<NetworkThread>& network) {
     if (!source.url.empty()) {
         HttpsPictures::Settings settings;
         settings.url = source.url;
@@ -25,7 +25,8 @@ void addSource(ThreadedMapSource::Grounds& grounds, const Configuration::Maps::S
         settings.cacheFolder = XdgFolders::cache() / "tiles";
         settings.cacheBytes = static_cast<std::uint64_t>(configuration.maps.cacheMegabytes) << 20;
         settings.certificateFiles = configuration.certificates;
-        grounds.push_back(std::make_shared<PictureGround>(std::make_unique<HttpsPictures>(std::move(settings))));
+        grounds.push_back(
+            std::make_shared<PictureGround>(std::make_unique<HttpsPictures>(std::move(settings), network)));
         return;
     }
     // Only the file itself says which of the two it is: the other one finds nothing in it.
@@ -41,7 +42,8 @@ void addSource(ThreadedMapSource::Grounds& grounds, const Configuration::Maps::S
 
 std::shared_ptr<ThreadedMapSource> ConfiguredMaps::make(const Configuration& configuration,
                                                         const std::filesystem::path& resourceFolder,
-                                                        std::shared_ptr<platform::MainLoop> mainLoop) {
+                                                        std::shared_ptr<platform::MainLoop> mainLoop,
+                                                        const std::shared_ptr<NetworkThread>& network) {
     std::shared_ptr<const MainlandArea> gcj02;
     if (configuration.maps.datum == Configuration::Maps::Datum::Gcj02) {
         const auto file = resourceFolder / "maps" / "world.bin";
@@ -53,16 +55,17 @@ std::shared_ptr<ThreadedMapSource> ConfiguredMaps::make(const Configuration& con
                 .line("The built-in map %@ cannot be used: %@", file.string(), reason);
         }
     }
-    return std::make_shared<ThreadedMapSource>(std::move(mainLoop), grounds(configuration, resourceFolder),
+    return std::make_shared<ThreadedMapSource>(std::move(mainLoop), grounds(configuration, resourceFolder, network),
                                                std::move(gcj02));
 }
 
 ThreadedMapSource::Grounds ConfiguredMaps::grounds(const Configuration& configuration,
-                                                   const std::filesystem::path& resourceFolder) {
+                                                   const std::filesystem::path& resourceFolder,
+                                                   const std::shared_ptr<NetworkThread>& network) {
     const auto folder = resourceFolder / "maps";
     ThreadedMapSource::Grounds grounds = {std::make_shared<VectorGround>((folder / "brinmouth.mbtiles").string())};
     for (const Configuration::Maps::Source& source : configuration.maps.sources) {
-        addSource(grounds, source, configuration);
+        addSource(grounds, source, configuration, network);
     }
     grounds.push_back(std::make_shared<WorldGround>(folder / "world.bin"));
     return grounds;

@@ -5,6 +5,7 @@
 
 #include "linux/configuration/Configuration.h"
 #include "linux/maps/ThreadedMapSource.h"
+#include "linux/net/NetworkThread.h"
 
 namespace ktr::linux_ {
 
@@ -12,13 +13,16 @@ namespace ktr::linux_ {
 /// thread.
 class ConfiguredMaps {
   public:
-    /// `resourceFolder`: where "maps" with the built-in data stands.
+    /// `resourceFolder`: where "maps" with the built-in data stands. Pictures are fetched on `network`; none: each
+    /// source has a thread of its own.
     static std::shared_ptr<ThreadedMapSource> make(const Configuration& configuration,
                                                    const std::filesystem::path& resourceFolder,
-                                                   std::shared_ptr<platform::MainLoop> mainLoop);
+                                                   std::shared_ptr<platform::MainLoop> mainLoop,
+                                                   const std::shared_ptr<NetworkThread>& network = nullptr);
     /// The same as grounds, for `ThreadedMapSource::setGrounds` when the configuration has changed.
     static ThreadedMapSource::Grounds grounds(const Configuration& configuration,
-                                              const std::filesystem::path& resourceFolder);
+                                              const std::filesystem::path& resourceFolder,
+                                              const std::shared_ptr<NetworkThread>& network = nullptr);
 };
 
 }  // namespace ktr::linux_

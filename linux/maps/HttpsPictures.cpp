@@ -1,19 +1,15 @@
 #include "linux/maps/HttpsPictures.h"
 
-#include <QMetaObject>
-#include <QNetworkAccessManager>
-#include <QNetworkReply>
-#include <QNetworkRequest>
-#include <QPointer>
+#include <QObject>
 #include <QTimer>
 #include <QUrl>
 #include <algorithm>
 #include <deque>
-#include <set>
+#include <string_view>
+#include <utility>
 
 #include "linux/maps/TileFreshness.h"
-#include "linux/net/TlsTrust.h"
-#include "platform/base/LogArea.h"
+#include "linux/net/TroubleLine.h"
 
 #ifndef KTR_VERSION
 #error "KTR_VERSION is given by the build"
@@ -29,12 +25,15 @@ using std::chrono::seconds;
 constexpr std::size_t kMostAtOnce = 2;
 constexpr std::size_t kMostWaiting = 64;
 constexpr std::size_t kMostStates = 4096;
-constexpr int kDeadline = 20000;  // milliseconds
+constexpr double kDeadline = 20.0;  // seconds
 /// Tiles that arrive together are told of together; milliseconds.
 constexpr int kGathering = 120;
 /// No tile is asked for again within this, whatever the server says of its freshness.
 constexpr seconds kLeastPause{60};
 constexpr seconds kPauseWhenGone{3600};
+/// After the server could not be reached or broke off, it is left alone for so long, and each time for twice as long.
+constexpr seconds kFirstPauseWhenAway{2};
+constexpr seconds kLongestPauseWhenAway{300};
 constexpr int kOk = 200;
 constexpr int kNotModified = 304;
 constexpr int kNotFound = 404;
@@ -46,15 +45,15 @@ std::int64_t secondsNow() {
     return std::chrono::duration_cast<seconds>(std::chrono::system_clock::now().time_since_epoch()).count();
 }
 
-bool isPicture(const QByteArray& data) {
-    return data.startsWith("\x89PNG\r\n\x1a\n") || data.startsWith("\xff\xd8\xff");
+bool isPicture(std::string_view data) {
+    return data.starts_with("\x89PNG\r\n\x1a\n") || data.starts_with("\xff\xd8\xff");
 }
 
 /// How long a server wants to be left alone (RFC 9110, section 10.2.3); it need not say, and is not asked to say it
 /// well.
-seconds retryAfter(const QByteArray& field) {
+seconds retryAfter(const std::string& field) {
     bool isNumber = false;
-    const int wanted = field.trimmed().toInt(&isNumber);
+    const int wanted = QByteArray::fromStdString(field).trimmed().toInt(&isNumber);
     return isNumber ? std::clamp(seconds(wanted), kLeastPause, kPauseWhenGone) : kLeastPause;
 }
 
@@ -71,7 +70,8 @@ QUrl addressOf(const std::string& pattern, const tiles::TileKey& key) {
 /// What lives on the network thread.
 class HttpsPictures::Fetcher : public QObject {
   public:
-    explicit Fetcher(HttpsPictures& pictures) : pictures_(pictures), settings_(pictures.settings_) {}
+    explicit Fetcher(HttpsPictures& pictures)
+        : pictures_(pictures), settings_(pictures.settings_), client_(pictures.thread_) {}
 
     /// `known`: what is on disk already, to ask only for something newer.
     void want(const tiles::TileKey& key, std::optional<TileStore::Entry> known) {
@@ -83,15 +83,6 @@ class HttpsPictures::Fetcher : public QObject {
         startNext();
     }
 
-    /// Ends everything that is under way; nothing is told any more.
-    void stop() {
-        isStopped_ = true;
-        waiting_.clear();
-        for (const auto& reply : std::exchange(underWay_, {})) {
-            reply->abort();
-        }
-    }
-
   private:
     struct Wanted {
         tiles::TileKey key;
@@ -99,35 +90,28 @@ class HttpsPictures::Fetcher : public QObject {
     };
 
     void startNext() {
-        while (!isStopped_ && underWay_.size() < kMostAtOnce && !waiting_.empty()) {
+        while (underWay_ < kMostAtOnce && !waiting_.empty()) {
             Wanted wanted = std::move(waiting_.front());
             waiting_.pop_front();
             start(std::move(wanted));
         }
     }
 
-    QNetworkRequest requestFor(const Wanted& wanted) {
-        if (!manager_) {
-            manager_ = new QNetworkAccessManager(this);
-            tls_ = TlsTrust::configuration(settings_.certificateFiles);
-        }
-        QNetworkRequest request(addressOf(settings_.url, wanted.key));
-        request.setSslConfiguration(tls_);
-        request.setAttribute(QNetworkRequest::RedirectPolicyAttribute, QNetworkRequest::ManualRedirectPolicy);
-        request.setAttribute(QNetworkRequest::CookieLoadControlAttribute, QNetworkRequest::Manual);
-        request.setAttribute(QNetworkRequest::CookieSaveControlAttribute, QNetworkRequest::Manual);
-        request.setAttribute(QNetworkRequest::AuthenticationReuseAttribute, QNetworkRequest::Manual);
-        request.setRawHeader("User-Agent", "ktr/" KTR_VERSION);
-        request.setRawHeader("Accept", "image/png, image/jpeg");
-        request.setRawHeader("Accept-Encoding", "identity");
-        // Qt would name the system's language.
-        request.setRawHeader("Accept-Language", "*");
+    HttpsRequest requestFor(const Wanted& wanted) const {
+        HttpsRequest request;
+        request.url = addressOf(settings_.url, wanted.key);
+        request.fields = {{"User-Agent", "ktr/" KTR_VERSION},
+                          {"Accept", "image/png, image/jpeg"},
+                          {"Accept-Language", "*"}};
         if (wanted.known && !wanted.known->etag.empty()) {
-            request.setRawHeader("If-None-Match", QByteArray::fromStdString(wanted.known->etag));
+            request.fields.set("If-None-Match", wanted.known->etag);
         }
         if (wanted.known && !wanted.known->modified.empty()) {
-            request.setRawHeader("If-Modified-Since", QByteArray::fromStdString(wanted.known->modified));
+            request.fields.set("If-Modified-Since", wanted.known->modified);
         }
+        request.deadline = kDeadline;
+        request.inactivityLimit = kDeadline;
+        request.maximumBytes = TileStore::kLargestTile;
         return request;
     }
 
@@ -137,65 +121,74 @@ class HttpsPictures::Fetcher : public QObject {
             ended(wanted.key, std::chrono::ceil<seconds>(notBefore_ - now));
             return;
         }
-        const QNetworkRequest request = requestFor(wanted);
-        if (request.url().scheme() != QLatin1String("https")) {
-            ended(wanted.key, kPauseWhenGone);
-            return;
-        }
-        QNetworkReply* reply = manager_->get(request);
-        underWay_.insert(reply);
-        reply->setReadBufferSize(static_cast<qint64>(TileStore::kLargestTile) + 1);
-        auto* deadline = new QTimer(reply);
-        deadline->setSingleShot(true);
-        connect(deadline, &QTimer::timeout, reply, &QNetworkReply::abort);
-        deadline->start(kDeadline);
-        connect(reply, &QNetworkReply::readyRead, reply, [reply] {
-            if (reply->bytesAvailable() > static_cast<qint64>(TileStore::kLargestTile)) {
-                reply->abort();
-            }
-        });
-        connect(reply, &QNetworkReply::finished, this, [this, reply, wanted = std::move(wanted)] {
-            reply->deleteLater();
-            underWay_.erase(reply);
-            if (!isStopped_) {
-                finished(*reply, wanted);
-                startNext();
-            }
-        });
+        ++underWay_;
+        HttpsRequest request = requestFor(wanted);
+        client_.send(std::move(request), settings_.certificateFiles,
+                     [this, wanted = std::move(wanted)](const HttpsAnswer& answer) {
+                         --underWay_;
+                         if (answer.failure != platform::HttpFailure::Cancelled) {
+                             finished(answer, wanted);
+                             startNext();
+                         }
+                     });
     }
 
-    void finished(QNetworkReply& reply, const Wanted& wanted) {
-        const int status = reply.attribute(QNetworkRequest::HttpStatusCodeAttribute).toInt();
-        const auto field = [&](const char* name) { return reply.rawHeader(name).toStdString(); };
-        const auto freshness = TileFreshness::of(field("Cache-Control"), field("Age"), field("Expires"), secondsNow());
-        if (reply.error() == QNetworkReply::NoError && status == kNotModified && wanted.known) {
+    void finished(const HttpsAnswer& answer, const Wanted& wanted) {
+        const bool isAnswer = answer.failure == platform::HttpFailure::None;
+        pauseAfter(answer);
+        if (!isAnswer && answer.status == 0) {
+            trouble_.say(host(), answer.reason);
+            ended(wanted.key, std::max(kLeastPause, std::chrono::ceil<seconds>(awayFor_)));
+            return;
+        }
+        const auto freshness = TileFreshness::of(answer.field("Cache-Control"), answer.field("Age"),
+                                                 answer.field("Expires"), secondsNow());
+        if (answer.status == kNotModified && wanted.known) {
             TileStore::Entry entry = *wanted.known;
             entry.expires = freshness.expires;
             pictures_.store_->save(wanted.key, entry);
             ended(wanted.key, kLeastPause);
             return;
         }
-        if (status == kNotFound || status == kGone) {
+        if (answer.status == kNotFound || answer.status == kGone) {
             ended(wanted.key, kPauseWhenGone, true);
             gather();
             return;
         }
-        if (status == kTooMany || status == kUnavailable) {
-            notBefore_ = std::chrono::steady_clock::now() + retryAfter(reply.rawHeader("Retry-After"));
-        }
-        const QByteArray data = reply.error() == QNetworkReply::NoError ? reply.readAll() : QByteArray();
-        if (status != kOk || !isPicture(data)) {
-            report(status != 0 && status != kOk ? "the server answered " + std::to_string(status)
-                   : data.isEmpty()             ? reply.errorString().toStdString()
-                                                : "the answer is no picture");
+        if (answer.status != kOk || !isPicture(answer.body)) {
+            trouble_.say(host(), answer.status != kOk ? "the server answered " + std::to_string(answer.status)
+                                                      : "the answer is no picture");
             ended(wanted.key, kLeastPause);
             return;
         }
-        reported_.clear();
-        arrived(wanted, data, {{}, freshness.expires, field("ETag"), field("Last-Modified")}, freshness.isStored);
+        trouble_.clear(host());
+        arrived(wanted, answer.body, {{}, freshness.expires, answer.field("ETag"), answer.field("Last-Modified")},
+                freshness.isStored);
     }
 
-    void arrived(const Wanted& wanted, const QByteArray& data, TileStore::Entry entry, bool isStored) {
+    /// How long the server is left alone after this.
+    void pauseAfter(const HttpsAnswer& answer) {
+        const auto now = std::chrono::steady_clock::now();
+        if (answer.status == kTooMany || answer.status == kUnavailable) {
+            notBefore_ = now + retryAfter(answer.field("Retry-After"));
+        }
+        const bool isAway = answer.failure == platform::HttpFailure::Network ||
+                            answer.failure == platform::HttpFailure::Tls ||
+                            answer.failure == platform::HttpFailure::Timeout;
+        if (!isAway) {
+            awayFor_ = seconds(0);
+            return;
+        }
+        // Two that were under way together have met one trouble.
+        if (now >= notBefore_) {
+            awayFor_ = std::clamp(awayFor_ * 2, kFirstPauseWhenAway, kLongestPauseWhenAway);
+            notBefore_ = now + awayFor_;
+        }
+    }
+
+    std::string host() const { return addressOf(settings_.url, {}).host().toStdString(); }
+
+    void arrived(const Wanted& wanted, const std::string& data, TileStore::Entry entry, bool isStored) {
         entry.data.assign(data.begin(), data.end());
         const bool isNew = !wanted.known || wanted.known->data != entry.data;
         if (isStored) {
@@ -221,15 +214,6 @@ class HttpsPictures::Fetcher : public QObject {
         state.notBefore = std::chrono::steady_clock::now() + pause;
     }
 
-    /// Says so once, until a tile arrives again.
-    void report(const std::string& reason) {
-        if (reason != reported_) {
-            const std::string host = QUrl(addressOf(settings_.url, {})).host().toStdString();
-            platform::areaLog(platform::LogArea::Maps).line("Tiles from %@ cannot be fetched: %@", host, reason);
-            reported_ = reason;
-        }
-    }
-
     void gather() {
         if (isGathering_) {
             return;
@@ -242,7 +226,7 @@ class HttpsPictures::Fetcher : public QObject {
                 const std::lock_guard lock(pictures_.mutex_);
                 changed = pictures_.changed_;
             }
-            if (changed && !isStopped_) {
+            if (changed) {
                 changed();
             }
         });
@@ -250,36 +234,28 @@ class HttpsPictures::Fetcher : public QObject {
 
     HttpsPictures& pictures_;
     const Settings& settings_;
-    QNetworkAccessManager* manager_ = nullptr;
-    QSslConfiguration tls_;
     std::deque<Wanted> waiting_;  ///< the latest first
-    std::set<QNetworkReply*> underWay_;
-    std::string reported_;
-    /// The server has asked to be left alone until then.
+    std::size_t underWay_ = 0;
+    TroubleLine trouble_{"Tiles from %@ cannot be fetched: %@"};
+    /// The server is left alone until then.
     std::chrono::steady_clock::time_point notBefore_;
+    seconds awayFor_{0};
     bool isGathering_ = false;
-    bool isStopped_ = false;
+    /// Goes first: what it ends still looks at the others.
+    HttpsClient client_;
 };
 
-HttpsPictures::HttpsPictures(Settings settings)
+HttpsPictures::HttpsPictures(Settings settings, std::shared_ptr<NetworkThread> thread)
     : settings_(std::move(settings)),
       store_(std::make_shared<TileStore>(settings_.cacheFolder, settings_.url, settings_.cacheBytes)),
+      thread_(thread ? std::move(thread) : std::make_shared<NetworkThread>()),
       fetcher_(new Fetcher(*this)) {
-    fetcher_->moveToThread(&thread_);
-    thread_.setObjectName(QStringLiteral("ktr tiles"));
-    QObject::connect(&thread_, &QThread::finished, fetcher_, &QObject::deleteLater);
-    thread_.start();
+    thread_->take(*fetcher_);
 }
 
 HttpsPictures::~HttpsPictures() {
-    QMetaObject::invokeMethod(
-        fetcher_,
-        [fetcher = fetcher_, thread = &thread_] {
-            fetcher->stop();
-            thread->quit();
-        },
-        Qt::QueuedConnection);
-    thread_.wait();
+    // Behind what was asked for.
+    thread_->run([this] { delete fetcher_; });
 }
 
 void HttpsPictures::setChangeHandler(std::function<void()> changed) {
@@ -305,9 +281,7 @@ TilePictures::Answer HttpsPictures::tile(const tiles::TileKey& key, bool isWante
     if (isWanted && !state.isUnderWay && !isFresh) {
         state.isUnderWay = true;
         state.isGone = false;
-        QMetaObject::invokeMethod(
-            fetcher_, [fetcher = fetcher_, key, known = std::move(known)] { fetcher->want(key, known); },
-            Qt::QueuedConnection);
+        thread_->post([fetcher = fetcher_, key, known = std::move(known)] { fetcher->want(key, known); });
     }
     answer.isComing = isWanted && !answer.data && !state.isGone;
     return answer;

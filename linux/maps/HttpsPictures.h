@@ -9,16 +9,16 @@
 #include <string>
 #include <vector>
 
-#include <QThread>
-
 #include "linux/maps/TilePictures.h"
 #include "linux/maps/TileStore.h"
+#include "linux/net/HttpsClient.h"
 
 namespace ktr::linux_ {
 
 /// Pictures of tiles from a server, one at a time as maps show them, kept on disk by the server's word. A request says
-/// which tile and that this program asks; no cookie, no name, no referrer, and no redirect is followed. Made and ended
-/// on the main thread; `tile` in one thread at a time.
+/// which tile and that this program asks; no cookie, no name, no referrer, and no redirect is followed. A server that
+/// cannot be reached is left alone, the longer the more often. Made and ended on the main thread; `tile` in one thread
+/// at a time.
 class HttpsPictures final : public TilePictures {
   public:
     struct Settings {
@@ -32,7 +32,8 @@ class HttpsPictures final : public TilePictures {
         std::vector<std::string> certificateFiles;
     };
 
-    explicit HttpsPictures(Settings settings);
+    /// Without a thread it has one of its own.
+    explicit HttpsPictures(Settings settings, std::shared_ptr<NetworkThread> thread = nullptr);
     /// Requests under way are given up.
     ~HttpsPictures() override;
     HttpsPictures(const HttpsPictures&) = delete;
@@ -61,8 +62,8 @@ class HttpsPictures final : public TilePictures {
     std::mutex mutex_;
     std::map<tiles::TileKey, State> states_;
     std::function<void()> changed_;
-    QThread thread_;
-    /// Lives on the thread and is deleted there.
+    std::shared_ptr<NetworkThread> thread_;
+    /// Lives on the network thread and is deleted there.
     Fetcher* fetcher_;
 };
 

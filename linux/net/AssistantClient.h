@@ -1,18 +1,20 @@
 #pragma once
 
-#include <QThread>
 #include <functional>
+#include <memory>
 #include <optional>
 #include <string>
 #include <vector>
 
+#include "linux/net/HttpsClient.h"
+#include "linux/net/TroubleLine.h"
 #include "platform/client/HttpTransport.h"
 
 namespace ktr::linux_ {
 
-/// Asks the assistant's server a question (docs/service-protocol.md), over HTTPS with the trust of TlsTrust, on a
-/// thread of its own. A question may be a wish, such as to hide: it is one POST with the account's credentials, sent once
-/// whatever happens to it. Redirects are not followed.
+/// Asks the assistant's server a question (docs/service-protocol.md) as HttpsExchange does. A question may be a wish,
+/// such as to hide: it is one POST with the account's credentials. Redirects are not followed. Why a question has no
+/// answer is said in a line of the log.
 class AssistantClient {
   public:
     struct Settings {
@@ -30,6 +32,8 @@ class AssistantClient {
         platform::HttpFailure failure = platform::HttpFailure::None;
         int status = 0;    ///< of HTTP; 0 without an answer
         std::string body;  ///< of an answer of status 200 to 299
+        /// Of an answer without a body: what is wrong, in words for a log line, without anything private.
+        std::string reason = {};
         bool hasBody() const { return failure == platform::HttpFailure::None && status >= 200 && status < 300; }
     };
     using Completion = std::function<void(Answer)>;
@@ -39,8 +43,8 @@ class AssistantClient {
     /// Bytes of an answer; a longer one fails.
     static constexpr std::size_t kMaximumBytes = std::size_t{4} * 1024 * 1024;
 
-    /// `settings` is asked on the main thread at each question.
-    explicit AssistantClient(std::function<Settings()> settings);
+    /// `settings` is asked on the main thread at each question. Without a thread it has one of its own.
+    explicit AssistantClient(std::function<Settings()> settings, std::shared_ptr<NetworkThread> thread = nullptr);
     /// Questions under way end with `Cancelled`.
     ~AssistantClient();
     AssistantClient(const AssistantClient&) = delete;
@@ -50,13 +54,11 @@ class AssistantClient {
     void ask(const std::string& question, Completion completion);
 
   private:
-    class Worker;
-    class Exchange;
-
     std::function<Settings()> settings_;
-    QThread thread_;
-    /// Lives on the thread and is deleted there.
-    Worker* worker_;
+    /// Used on the network thread.
+    TroubleLine trouble_{"The assistant at %@ cannot be asked: %@"};
+    /// Goes first: what it ends still says why.
+    HttpsClient client_;
 };
 
 }  // namespace ktr::linux_

@@ -54,4 +54,11 @@ std::optional<std::string> Origin::registrableDomain() const {
     return domain != nullptr ? std::optional<std::string>(domain) : std::nullopt;
 }
 
+bool Origin::isPublicSuffix() const {
+    const psl_ctx_t* list = psl_builtin();
+    // By the list's last rule any name of one label would be one, and so would a machine of the local network.
+    return list != nullptr && !isAddress() &&
+           psl_is_public_suffix2(list, host.c_str(), PSL_TYPE_ANY | PSL_TYPE_NO_STAR_RULE) != 0;
+}
+
 }  // namespace ktr::linux_

@@ -27,6 +27,10 @@ struct Origin {
     /// for an address, a name of one label such as "localhost", and a public suffix itself.
     std::optional<std::string> registrableDomain() const;
 
+    /// Whether the host is a name below which anybody can have one (public suffix list), such as "org" or "co.uk"; a
+    /// name of one label that the list does not hold is none.
+    bool isPublicSuffix() const;
+
     bool operator==(const Origin&) const = default;
 };
 

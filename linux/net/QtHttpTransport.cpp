@@ -1,14 +1,10 @@
 #include "linux/net/QtHttpTransport.h"
 
-#include <QMetaObject>
-#include <QPointer>
-#include <QSslConfiguration>
-
+#include <QUrl>
 #include <utility>
-#include <vector>
+#include <variant>
 
-#include "linux/net/CommandExchange.h"
-#include "linux/net/TlsTrust.h"
+#include "documents/JsonReader.h"
 #include "platform/base/Log.h"
 
 namespace ktr::linux_ {
@@ -18,104 +14,113 @@ using platform::HttpFailure;
 
 namespace {
 
-const char* wordsFor(HttpFailure failure) {
-    switch (failure) {
-        case HttpFailure::None:
-            return "no failure";
-        case HttpFailure::BadRequest:
-            return "it cannot be sent, or not to this host";
-        case HttpFailure::Network:
-            return "no connection, or a broken one";
-        case HttpFailure::Tls:
-            return "the host could not prove who it is";
-        case HttpFailure::Timeout:
-            return "it took too long";
-        case HttpFailure::TooLarge:
-            return "the answer is too large";
-        case HttpFailure::RedirectRefused:
-            return "the answer is a redirect that is not followed";
-        case HttpFailure::Cancelled:
-            return "cancelled";
+constexpr int kFirstSuccess = 200;
+constexpr int kFirstRedirect = 300;
+
+bool isSuccess(int status) {
+    return status >= kFirstSuccess && status < kFirstRedirect;
+}
+
+/// Invalid for a path that cannot stand in an address.
+QUrl urlOf(const Origin& origin, const std::string& path) {
+    QUrl url(QStringLiteral("https://") + QString::fromStdString(origin.text()) + QString::fromStdString(path),
+             QUrl::StrictMode);
+    const bool isWhole = path.starts_with('/') && url.isValid() && Origin::fromUrl(url) == origin;
+    return isWhole ? url : QUrl();
+}
+
+HttpsRequest exchangeFor(const platform::HttpRequest& request, const ServicePolicy& policy) {
+    HttpsRequest made;
+    made.method = "POST";
+    made.fields = request.headers;
+    made.fields.set("Accept-Language", "*");
+    made.fields.set("User-Agent", "ktr");
+    made.body = request.body;
+    made.deadline = request.deadline;
+    made.inactivityLimit = request.inactivityLimit;
+    made.maximumBytes = request.maximumBytes;
+    made.mayFollow = [policy](const Origin& origin) { return policy.allows(origin); };
+    const auto allowed = [&policy](const std::string& host) {
+        auto origin = Origin::fromText(host);
+        return origin && policy.allows(*origin) ? origin : std::nullopt;
+    };
+    if (request.scheme != "https") {
+        return made;
     }
-    return "";
+    made.fallback = allowed(request.fallbackHost);
+    if (const auto origin = allowed(request.host)) {
+        made.url = urlOf(*origin, request.path);
+    } else if (made.fallback) {
+        made.url = urlOf(*made.fallback, request.path);
+    }
+    return made;
+}
+
+/// What is wrong with an answer, in words for a log line; empty when nothing is.
+std::string complaintAbout(const HttpAnswer& answer) {
+    if (answer.failure != HttpFailure::None) {
+        return answer.failure == HttpFailure::Cancelled ? "" : answer.reason;
+    }
+    if (!isSuccess(answer.status)) {
+        return "the answer has the status " + std::to_string(answer.status);
+    }
+    const bool isObject = answer.json && answer.json->dictionary() != nullptr;
+    return isObject ? "" : "the answer is no JSON object, its status " + std::to_string(answer.status);
 }
 
 }  // namespace
 
-/// What lives on the network thread.
-class QtHttpTransport::Worker : public QObject {
-  public:
-    void send(const Settings& settings, platform::HttpRequest request, Completion completion) {
-        prepare(settings);
-        auto logged = [host = request.host, completion = std::move(completion)](HttpAnswer answer) {
-            if (answer.failure != HttpFailure::None) {
-                platform::platformLog().line("A command to %@ failed: %@", host,
-                                             platform::FormatArgument(wordsFor(answer.failure)).shown());
-            }
-            completion(std::move(answer));
-        };
-        auto* exchange = new CommandExchange(tls_, policy_, std::move(request), std::move(logged));
-        exchange->setParent(this);
-        std::erase_if(underWay_, [](const auto& earlier) { return earlier.isNull(); });
-        underWay_.emplace_back(exchange);
-        exchange->start();
+QtHttpTransport::QtHttpTransport(std::function<Settings()> settings, std::shared_ptr<NetworkThread> thread)
+    : settings_(std::move(settings)), client_(std::move(thread)) {}
+
+QtHttpTransport::~QtHttpTransport() = default;
+
+void QtHttpTransport::prepare() {
+    Settings settings = settings_();
+    if (current_ == settings) {
+        return;
     }
-
-    /// Ends everything that is under way.
-    void stop() {
-        for (const auto& exchange : std::exchange(underWay_, {})) {
-            if (exchange) {
-                exchange->fail(HttpFailure::Cancelled);
-            }
-        }
+    policy_ = ServicePolicy(settings.serviceHost.value_or(""), settings.domains);
+    for (const std::string& entry : policy_.entriesForNobody()) {
+        platform::platformLog().write(
+            platform::LogLevel::Error,
+            "The entry \"%@\" of account.domains allows nobody: it is no host, or a domain in "
+            "which anybody can have a name",
+            entry);
     }
-
-  private:
-    void prepare(const Settings& settings) {
-        if (prepared_ && settings == current_) {
-            return;
-        }
-        prepared_ = true;
-        current_ = settings;
-        policy_ = ServicePolicy(settings.serviceHost.value_or(""), settings.domains);
-        tls_ = TlsTrust::configuration(settings.certificateFiles);
-    }
-
-    /// Those that are over are none.
-    std::vector<QPointer<CommandExchange>> underWay_;
-    bool prepared_ = false;
-    Settings current_;
-    ServicePolicy policy_{"", {}};
-    QSslConfiguration tls_;
-};
-
-QtHttpTransport::QtHttpTransport(std::function<Settings()> settings)
-    : settings_(std::move(settings)), worker_(new Worker) {
-    worker_->moveToThread(&thread_);
-    thread_.setObjectName(QStringLiteral("ktr network"));
-    QObject::connect(&thread_, &QThread::finished, worker_, &QObject::deleteLater);
-    thread_.start();
-}
-
-QtHttpTransport::~QtHttpTransport() {
-    // Queued behind the commands that were sent, so that none of them is forgotten.
-    QMetaObject::invokeMethod(
-        worker_,
-        [worker = worker_, thread = &thread_] {
-            worker->stop();
-            thread->quit();
-        },
-        Qt::QueuedConnection);
-    thread_.wait();
+    current_ = std::move(settings);
 }
 
 void QtHttpTransport::send(const platform::HttpRequest& request, Completion completion) {
-    QMetaObject::invokeMethod(
-        worker_,
-        [worker = worker_, settings = settings_(), request, completion = std::move(completion)] {
-            worker->send(settings, request, completion);
-        },
-        Qt::QueuedConnection);
+    prepare();
+    HttpsRequest exchange = exchangeFor(request, policy_);
+    const auto asked = Origin::fromText(request.host);
+    const bool isElsewhere = !asked || Origin::fromUrl(exchange.url) != asked;
+    const auto ended = [this, request, asked, isElsewhere, completion = std::move(completion)](HttpsAnswer heard) {
+        HttpAnswer answer;
+        answer.failure = heard.failure;
+        answer.reason = std::move(heard.reason);
+        answer.status = heard.failure == HttpFailure::None ? heard.status : 0;
+        answer.fromFallback = heard.fromFallback || (isElsewhere && !heard.origin.host.empty());
+        const auto first = answer.fromFallback ? Origin::fromText(request.fallbackHost) : asked;
+        if (!heard.origin.host.empty() && heard.origin != first) {
+            answer.redirectedHost = heard.origin.text();
+        }
+        if (answer.failure == HttpFailure::None && isSuccess(answer.status)) {
+            auto read = documents::JsonReader::read(heard.body);
+            if (auto* value = std::get_if<platform::Value>(&read)) {
+                answer.json = std::move(*value);
+            }
+        }
+        const std::string host = heard.origin.host.empty() ? request.host : heard.origin.text();
+        if (const std::string complaint = complaintAbout(answer); !complaint.empty()) {
+            trouble_.say(host, complaint);
+        } else if (answer.failure == HttpFailure::None) {
+            trouble_.clear(host);
+        }
+        completion(std::move(answer));
+    };
+    client_.send(std::move(exchange), current_->certificateFiles, ended);
 }
 
 }  // namespace ktr::linux_

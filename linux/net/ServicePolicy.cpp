@@ -18,29 +18,34 @@ bool namesPort(const std::string& text) {
 
 }  // namespace
 
-ServicePolicy::ServicePolicy(const std::string& serviceHost, const std::vector<std::string>& domains) {
+ServicePolicy::ServicePolicy(const std::string& serviceHost, const std::optional<std::vector<std::string>>& domains) {
     const auto service = Origin::fromText(serviceHost);
     if (!service) {
         return;
     }
     rules_.push_back({*service, false});
-    if (const auto domain = service->registrableDomain()) {
-        rules_.push_back({{*domain, service->port}, true});
+    if (!domains) {
+        if (const auto domain = service->registrableDomain()) {
+            rules_.push_back({{*domain, service->port}, true});
+        }
+        return;
     }
-    for (const std::string& text : domains) {
-        auto origin = Origin::fromText(text);
-        if (!origin) {
-            continue;
-        }
-        if (!namesPort(text)) {
-            origin->port = service->port;
-        }
-        const bool isDomain = origin->registrableDomain().has_value();
-        // A name of one label is a machine of the local network, or a whole country: the machine alone.
-        if (isDomain || origin->isAddress() || origin->host.find('.') == std::string::npos) {
-            rules_.push_back({*origin, isDomain});
-        }
+    for (const std::string& entry : *domains) {
+        allow(entry, service->port);
     }
+}
+
+void ServicePolicy::allow(const std::string& entry, int servicePort) {
+    auto origin = Origin::fromText(entry);
+    if (!origin || origin->isPublicSuffix()) {
+        entriesForNobody_.push_back(entry);
+        return;
+    }
+    if (!namesPort(entry)) {
+        origin->port = servicePort;
+    }
+    // A name of one label is a machine of the local network: it alone.
+    rules_.push_back({*origin, origin->registrableDomain().has_value()});
 }
 
 bool ServicePolicy::allows(const Origin& origin) const {

@@ -18,6 +18,9 @@ struct HttpRequest {
     std::string scheme;
     /// A name or an address (IPv6 in brackets), with ":port" when the port is not 443.
     std::string host;
+    /// Sent the request in place of `host`, when that one may not be asked, cannot be reached, or cannot prove who it
+    /// is, before a byte has left; in the same form. Empty: nobody.
+    std::string fallbackHost = {};
     /// Begins with "/".
     std::string path;
     HttpHeaders headers;
@@ -56,9 +59,13 @@ struct HttpAnswer {
     /// The body of an answer of status 200 to 299, when it is strict JSON: UTF-8, no member twice in one object,
     /// nothing nested more than 64 levels deep.
     std::optional<Value> json;
-    /// The host (with its port, if any) that was asked last, when redirects led to another than the request's; also
+    /// The host (with its port, if any) that was asked last, when redirects led to another than the first; also
     /// with a failure.
     std::optional<std::string> redirectedHost;
+    /// Of a failure: what is wrong, in words for a log line, without anything private.
+    std::string reason = {};
+    /// The fallback host was asked; redirects are counted from there.
+    bool fromFallback = false;
 };
 
 /// Sends requests, each exactly once: a request whose connection breaks fails rather than being sent again.

@@ -285,7 +285,7 @@ class SharingTest(unittest.TestCase):
                     ("GET", "/assistant?q=hide%20my%20location", None, {}, 405),
                     ("GET", "/assistant?q=hide%20my%20location", None, good, 405),
                     ("HEAD", "/assistant?q=hide%20my%20location", None, good, 405),
-                    ("PUT", "/assistant", wish, good, 404),
+                    ("PUT", "/assistant", wish, good, 405),
                     ("POST", "/assistant", wish, {**good, "Authorization": "Basic MTAwMDp4"}, 401),
                     ("POST", "/assistant", wish, {"Content-Type": "application/json"}, 401),
                     # What a page of another site can send without being asked whether it may.

@@ -102,7 +102,7 @@ TEST_F(RedirectTest, AllowedHost_GetsTheWholeCommandOnce) {
     for (const int kind : kKinds) {
         TestServer shard(tls(), answering(200, "", R"({"shard":true})"));
         const std::string host = "127.0.0.1:" + std::to_string(shard.port());
-        settings.domains = {host};
+        settings.domains = {{host}};
         serve(redirecting(kind, "https://" + host + "/elsewhere"));
         const HttpAnswer answer = ask();
         if (kind == 307 || kind == 308) {
@@ -152,7 +152,7 @@ TEST_F(RedirectTest, AllowedHostThatRedirectsAbroad_IsRefusedThere) {
     TestServer canary(tls(), gladly());
     TestServer shard(tls(), redirecting(307, canary.url("/")));
     const std::string host = "127.0.0.1:" + std::to_string(shard.port());
-    settings.domains = {host};
+    settings.domains = {{host}};
     serve(redirecting(307, "https://" + host + "/"));
     const HttpAnswer answer = ask();
     EXPECT_EQ(answer.failure, HttpFailure::RedirectRefused);
@@ -165,7 +165,7 @@ TEST_F(RedirectTest, ThereAndBack_IsNoNewHost) {
     TestServer shard(
         tls(), [&back](QSslSocket& socket, const auto&) { answerWith(socket, 307, "Location: " + back + "\r\n", ""); });
     const std::string host = "127.0.0.1:" + std::to_string(shard.port());
-    settings.domains = {host};
+    settings.domains = {{host}};
     const auto first = std::make_shared<bool>(true);
     serve([=](QSslSocket& socket, const auto&) {
         if (std::exchange(*first, false)) {
@@ -183,7 +183,7 @@ TEST_F(RedirectTest, ThereAndBack_IsNoNewHost) {
 TEST_F(RedirectTest, AllowedHostWithABadCertificate_HearsNothing) {
     TestServer shard(tls("foreign"), gladly());
     const std::string host = "127.0.0.1:" + std::to_string(shard.port());
-    settings.domains = {host};
+    settings.domains = {{host}};
     serve(redirecting(307, "https://" + host + "/"));
     const HttpAnswer answer = ask();
     EXPECT_EQ(answer.failure, HttpFailure::Tls);
@@ -195,7 +195,7 @@ TEST_F(RedirectTest, DeadlineCountsOverAllHops) {
     serve([](QSslSocket& socket, const auto&) { answerWith(socket, 308, "Location: /again\r\n", ""); });
     TestServer silent(tls(), nullptr);
     const std::string host = "127.0.0.1:" + std::to_string(silent.port());
-    settings.domains = {host};
+    settings.domains = {{host}};
     serve(redirecting(307, "https://" + host + "/"));
     auto one = request();
     one.deadline = 0.5;

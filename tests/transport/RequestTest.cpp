@@ -15,17 +15,6 @@ using platform::HttpFailure;
 
 using RequestTest = TransportTest;
 
-/// Writes the piece again and again, as fast as it is taken.
-void pour(QSslSocket& socket, const QByteArray& piece) {
-    const auto more = [&socket, piece] {
-        while (socket.isOpen() && socket.bytesToWrite() + socket.encryptedBytesToWrite() < 1'000'000) {
-            socket.write(piece);
-        }
-    };
-    QObject::connect(&socket, &QSslSocket::encryptedBytesWritten, &socket, more);
-    more();
-}
-
 TEST_F(RequestTest, Wire_HoldsWhatWasAskedAndNothingOfTheUser) {
     serve(answering(200, "", R"({"ok":true})"));
     const HttpAnswer answer = ask();
@@ -265,16 +254,6 @@ TEST_F(RequestTest, EndlessBody) {
     });
     EXPECT_EQ(ask().failure, HttpFailure::TooLarge);
     EXPECT_EQ(server->posts(), 1U);
-}
-
-TEST_F(RequestTest, EndlessHead) {
-    serve([](QSslSocket& socket, const auto&) {
-        socket.write("HTTP/1.1 200 OK\r\n");
-        pour(socket, QByteArray("X-More: ") + QByteArray(60000, 'x') + QByteArray("\r\n"));
-    });
-    auto one = request();
-    one.deadline = 2.0;
-    EXPECT_NE(ask(one).failure, HttpFailure::None);
 }
 
 TEST_F(RequestTest, MillionBrackets) {

@@ -25,6 +25,10 @@ TestCertificates::TestCertificates() {
     write(file("server.ext"), "subjectAltName=DNS:localhost,IP:127.0.0.1\nextendedKeyUsage=serverAuth\n");
     write(file("wrong.ext"), "subjectAltName=DNS:other.example\nextendedKeyUsage=serverAuth\n");
     write(file("client.ext"), "subjectAltName=DNS:localhost,IP:127.0.0.1\nextendedKeyUsage=clientAuth\n");
+    write(file("nonames.ext"), "extendedKeyUsage=serverAuth\n");
+    write(file("names.ext"), "subjectAltName=DNS:localhost\nextendedKeyUsage=serverAuth\n");
+    write(file("addresses.ext"), "subjectAltName=IP:127.0.0.1\nextendedKeyUsage=serverAuth\n");
+    write(file("text.ext"), "subjectAltName=DNS:127.0.0.1\nextendedKeyUsage=serverAuth\n");
     authorityNamed("ca");
     authorityNamed("other");
     openssl({text("ecparam"), text("-name"), text("prime256v1"), text("-genkey"), text("-noout"), text("-out"), key()});
@@ -38,6 +42,11 @@ TestCertificates::TestCertificates() {
     signedBy("ca", "expired", "server.ext", {text("-days"), text("-1")});
     signedBy("ca", "wrongname", "wrong.ext", month, "wrong.csr");
     signedBy("ca", "client", "client.ext", month);
+    signedBy("ca", "subject", "wrong.ext", month);
+    signedBy("ca", "nonames", "nonames.ext", month);
+    signedBy("ca", "names", "names.ext", month);
+    signedBy("ca", "addresses", "addresses.ext", month);
+    signedBy("ca", "text", "text.ext", month);
     signedBy("other", "foreign", "server.ext", month);
     openssl({text("req"), text("-x509"), text("-key"), key(), text("-subj"), text("/CN=localhost"), text("-days"),
              text("30"), text("-addext"), text("subjectAltName=DNS:localhost,IP:127.0.0.1"), text("-out"),

@@ -17,7 +17,9 @@ class TestCertificates {
     /// Another one, that signed "foreign".
     QString otherAuthority() const { return file("other.pem"); }
     /// "good", "expired", "wrongname" (other.example alone), "foreign", "selfsigned",
-    /// "client" (not for servers).
+    /// "client" (not for servers); "subject" (localhost in the subject, other.example as the alternative name),
+    /// "nonames" (localhost in the subject alone), "names" (localhost alone), "addresses" (127.0.0.1 alone), "text"
+    /// (127.0.0.1 as if it were a name).
     QString certificate(const char* kind) const { return file(QString::fromLatin1(kind) + QStringLiteral(".pem")); }
     QString key() const { return file("server.key"); }
 

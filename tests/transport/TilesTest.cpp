@@ -195,6 +195,26 @@ TEST_F(TilesTest, AServerThatIsBusy_IsLeftAlone) {
     EXPECT_EQ(server->requests().size(), 5U);
 }
 
+TEST_F(TilesTest, AServerThatBreaksOff_IsLeftAlone) {
+    auto options = tls();
+    options.refuses = true;
+    serve(options, gladly());
+    open();
+    for (int turn = 0; turn < 4; ++turn) {
+        for (int y = 0; y < 32; ++y) {
+            pictures->tile({6, turn, y}, true);
+        }
+        const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(30);
+        while (log->texts().empty() && std::chrono::steady_clock::now() < deadline) {
+            std::this_thread::yield();
+        }
+    }
+    pictures.reset();
+    // Two at a time, and then a pause that is longer than all of this, even where that takes a while.
+    EXPECT_LE(server->connections(), 8);
+    EXPECT_EQ(log->texts().size(), 1U);
+}
+
 TEST_F(TilesTest, Redirects_AreNotFollowed) {
     TestServer other(tls(), gladly());
     serve(answering(302, "Location: " + other.url("/5/10/11.png") + "\r\n", ""));

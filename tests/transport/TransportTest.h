@@ -31,6 +31,18 @@ class TransportTest : public PlatformTest {
     }
     static void TearDownTestSuite() { certificates.reset(); }
 
+    /// Why an exchange failed is an error line; TroubleTest looks at them.
+    void TearDown() override {
+        http.reset();
+        for (const auto& text : log->texts(platform::LogLevel::Error)) {
+            if (text.starts_with("A command to ") || text.starts_with("Tiles from ") ||
+                text.starts_with("The assistant at ")) {
+                expectErrorLine(text);
+            }
+        }
+        PlatformTest::TearDown();
+    }
+
     static TestServer::Options tls(const char* kind = "good") {
         TestServer::Options options;
         options.certificate = certificates->certificate(kind);
@@ -42,6 +54,17 @@ class TransportTest : public PlatformTest {
     }
     /// A server that hears everything and answers gladly; nobody may talk to it.
     static TestServer::Behaviour gladly() { return answering(200, "", R"({"canary":true})"); }
+
+    /// Writes the piece again and again, as fast as it is taken.
+    static void pour(QSslSocket& socket, const QByteArray& piece) {
+        const auto more = [&socket, piece] {
+            while (socket.isOpen() && socket.bytesToWrite() + socket.encryptedBytesToWrite() < 1'000'000) {
+                socket.write(piece);
+            }
+        };
+        QObject::connect(&socket, &QSslSocket::encryptedBytesWritten, &socket, more);
+        more();
+    }
 
     void serve(TestServer::Behaviour behaviour) { serve(tls(), std::move(behaviour)); }
     void serve(TestServer::Options options, TestServer::Behaviour behaviour) {

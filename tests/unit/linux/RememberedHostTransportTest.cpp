@@ -10,58 +10,148 @@ using platform::HttpFailure;
 
 class RememberedHostTransportTest : public PlatformTest {
   protected:
+    RememberedHostTransportTest() { remember("shard.example.org"); }
+
+    void remember(const std::optional<std::string>& host) {
+        preferences->setValue("RedirectedHostKey", host, "org.ktr.snippets");
+    }
     std::string remembered() const {
         return preferences->value("RedirectedHostKey", "org.ktr.snippets").value_or("none");
     }
-    /// Asks the host, and tells what is remembered afterwards.
-    std::string after(const std::string& host, HttpAnswer answer) {
-        preferences->setValue("RedirectedHostKey", "shard.example.org", "org.ktr.snippets");
+    /// Sends a command as the plugin does; "host" or "host, else fallback": who is asked.
+    std::string send() {
         platform::HttpRequest request;
-        request.host = host;
-        remembering.send(request, [this](HttpAnswer) { ++completions; });
-        transport->answer(std::move(answer));
-        return remembered();
+        request.host = remembered() == "none" ? "service.example.org" : remembered();
+        remembering.send(request, [this](const HttpAnswer&) { ++completions; });
+        const auto& asked = transport->requests.back();
+        return asked.host + (asked.fallbackHost.empty() ? "" : ", else " + asked.fallbackHost);
     }
+    void answer(HttpAnswer answer, bool fromFallback = false) {
+        answer.fromFallback = fromFallback;
+        transport->answer(std::move(answer));
+    }
+    static HttpAnswer good() { return {HttpFailure::None, 200, platform::Value(platform::Dictionary{{"a", 1}}), {}}; }
+    static HttpAnswer of(int status) { return {HttpFailure::None, status, {}, {}}; }
+    static HttpAnswer failed(HttpFailure failure) { return {failure, 0, {}, {}}; }
 
-    linux_::RememberedHostTransport remembering{transport, preferences};
+    std::optional<std::string> account = "service.example.org";
+    linux_::RememberedHostTransport remembering{transport, preferences, [this] { return account; }};
     int completions = 0;
 };
 
-TEST_F(RememberedHostTransportTest, HostThatCannotServeIsForgotten) {
-    EXPECT_EQ(after("shard.example.org", {HttpFailure::Tls, 0, {}, {}}), "none");
-    EXPECT_EQ(preferences->synchronized, std::vector<std::string>{"org.ktr.snippets"});
-    EXPECT_EQ(after("shard.example.org", {HttpFailure::None, 401, {}, {}}), "none");
-    EXPECT_EQ(after("shard.example.org", {HttpFailure::BadRequest, 0, {}, {}}), "none");
+constexpr const char* kShardElseOwn = "shard.example.org, else service.example.org";
+constexpr const char* kOwn = "service.example.org";
+
+TEST_F(RememberedHostTransportTest, HostThatServesIsAskedAgain) {
+    for (int i = 0; i < 3; ++i) {
+        EXPECT_EQ(send(), kShardElseOwn);
+        answer(good());
+    }
+    EXPECT_EQ(remembered(), "shard.example.org");
+    EXPECT_TRUE(preferences->synchronized.empty());
     EXPECT_EQ(completions, 3);
 }
 
-TEST_F(RememberedHostTransportTest, OtherOutcomesAreNotItsFault) {
-    for (const auto failure : {HttpFailure::Network, HttpFailure::Timeout, HttpFailure::TooLarge,
-                               HttpFailure::RedirectRefused, HttpFailure::Cancelled}) {
-        EXPECT_EQ(after("shard.example.org", {failure, 401, {}, {}}), "shard.example.org");
+TEST_F(RememberedHostTransportTest, HostThatCannotServe_NextCommandGoesToTheOwn_WhichForgetsItOnceItAnswers) {
+    std::vector<HttpAnswer> bad;
+    for (const int status : {401, 403, 404, 410, 421, 500, 502, 503, 599, 200, 204}) {
+        bad.push_back(of(status));
     }
-    for (const int status : {200, 400, 403, 404, 500}) {
-        EXPECT_EQ(after("shard.example.org", {HttpFailure::None, status, {}, {}}), "shard.example.org");
+    bad.push_back({HttpFailure::None, 200, platform::Value(platform::Value::Array{}), {}});
+    for (const auto failure : {HttpFailure::Network, HttpFailure::Tls, HttpFailure::Timeout, HttpFailure::TooLarge,
+                               HttpFailure::RedirectRefused, HttpFailure::BadRequest}) {
+        bad.push_back(failed(failure));
+    }
+    for (const HttpAnswer& outcome : bad) {
+        remember("shard.example.org");
+        preferences->synchronized.clear();
+        EXPECT_EQ(send(), kShardElseOwn);
+        answer(outcome);
+        EXPECT_EQ(remembered(), "shard.example.org") << "its own host has not answered yet";
+        EXPECT_EQ(send(), kOwn) << outcome.status;
+        EXPECT_EQ(remembered(), "shard.example.org");
+        answer(good());
+        EXPECT_EQ(remembered(), "none") << outcome.status;
+        EXPECT_EQ(preferences->synchronized, std::vector<std::string>{"org.ktr.snippets"});
+        EXPECT_EQ(send(), kOwn);
+        answer(good());
+    }
+}
+
+TEST_F(RememberedHostTransportTest, FallbackThatAnswered_ForgetsTheOther) {
+    EXPECT_EQ(send(), kShardElseOwn);
+    answer(good(), true);
+    EXPECT_EQ(remembered(), "none");
+    remember("shard.example.org");
+    send();
+    answer(of(401), true);
+    EXPECT_EQ(remembered(), "none") << "it is an answer";
+    remember("shard.example.org");
+    send();
+    answer({HttpFailure::Network, 0, {}, "third.example.org"}, true);
+    EXPECT_EQ(remembered(), "none") << "it has answered where to ask";
+}
+
+TEST_F(RememberedHostTransportTest, BeingOffline_ForgetsNothing) {
+    for (const auto failure : {HttpFailure::Network, HttpFailure::Tls, HttpFailure::Timeout}) {
+        // Neither could be reached with the same command.
+        EXPECT_EQ(send(), kShardElseOwn);
+        answer(failed(failure), true);
+        EXPECT_EQ(remembered(), "shard.example.org");
+        // Nor with two.
+        EXPECT_EQ(send(), kShardElseOwn);
+        answer(failed(failure));
+        EXPECT_EQ(send(), kOwn);
+        answer(failed(failure));
+        EXPECT_EQ(remembered(), "shard.example.org");
     }
     EXPECT_TRUE(preferences->synchronized.empty());
-    EXPECT_EQ(completions, 10);
+    // Back online.
+    EXPECT_EQ(send(), kShardElseOwn);
+    answer(good());
+    EXPECT_EQ(remembered(), "shard.example.org");
+}
+
+TEST_F(RememberedHostTransportTest, WhatIsTheCommandsFaultIsNotTheHosts) {
+    for (const int status : {400, 409, 411, 416, 429}) {
+        EXPECT_EQ(send(), kShardElseOwn);
+        answer(of(status));
+        EXPECT_EQ(send(), kShardElseOwn) << status;
+        answer(failed(HttpFailure::Cancelled));
+    }
+    EXPECT_EQ(remembered(), "shard.example.org");
 }
 
 TEST_F(RememberedHostTransportTest, WhatAnotherHostDidDoesNotCount) {
-    EXPECT_EQ(after("service.example.org", {HttpFailure::Tls, 0, {}, {}}), "shard.example.org");
-    EXPECT_EQ(after("service.example.org", {HttpFailure::None, 401, {}, {}}), "shard.example.org");
-    EXPECT_EQ(after("shard.example.org", {HttpFailure::None, 401, {}, "third.example.org"}), "shard.example.org");
-    EXPECT_EQ(after("shard.example.org", {HttpFailure::Tls, 0, {}, "third.example.org"}), "shard.example.org");
+    send();
+    answer({HttpFailure::None, 503, {}, "third.example.org"});
+    EXPECT_EQ(send(), kShardElseOwn);
+    answer({HttpFailure::Tls, 0, {}, "third.example.org"});
+    EXPECT_EQ(send(), kShardElseOwn);
+    EXPECT_EQ(remembered(), "shard.example.org");
 }
 
 TEST_F(RememberedHostTransportTest, HostRememberedMeanwhileStays) {
-    preferences->setValue("RedirectedHostKey", "shard.example.org", "org.ktr.snippets");
-    platform::HttpRequest request;
-    request.host = "shard.example.org";
-    remembering.send(request, [this](HttpAnswer) { ++completions; });
-    preferences->setValue("RedirectedHostKey", "other.example.org", "org.ktr.snippets");
-    transport->answer({HttpFailure::Tls, 0, {}, {}});
+    send();
+    answer(of(503));
+    send();
+    remember("other.example.org");
+    answer(good());
     EXPECT_EQ(remembered(), "other.example.org");
+    EXPECT_EQ(send(), "other.example.org, else service.example.org");
+}
+
+TEST_F(RememberedHostTransportTest, WithoutARememberedHostOrAnAccount_CommandsGoAsTheyAre) {
+    remember(std::nullopt);
+    EXPECT_EQ(send(), kOwn);
+    answer(of(503));
+    EXPECT_EQ(send(), kOwn);
+    answer(good());
+    remember("shard.example.org");
+    account = std::nullopt;
+    EXPECT_EQ(send(), "shard.example.org");
+    account = "shard.example.org";
+    EXPECT_EQ(send(), "shard.example.org");
 }
 
 }  // namespace

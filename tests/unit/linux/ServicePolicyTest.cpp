@@ -69,7 +69,7 @@ bool allows(const ServicePolicy& policy, const char* host) {
 }
 
 TEST(ServicePolicyTest, ServiceDomainAndItsSubdomainsAtItsPort) {
-    const ServicePolicy policy("service.example.org:8443", {});
+    const ServicePolicy policy("service.example.org:8443", std::nullopt);
     EXPECT_TRUE(allows(policy, "service.example.org:8443"));
     EXPECT_TRUE(allows(policy, "p12-service.example.org:8443"));
     EXPECT_TRUE(allows(policy, "deep.below.example.org:8443"));
@@ -83,7 +83,7 @@ TEST(ServicePolicyTest, ServiceDomainAndItsSubdomainsAtItsPort) {
 }
 
 TEST(ServicePolicyTest, NeighboursUnderAPublicSuffixAreForeign) {
-    const ServicePolicy policy("mine.github.io", {});
+    const ServicePolicy policy("mine.github.io", std::nullopt);
     EXPECT_TRUE(allows(policy, "mine.github.io"));
     EXPECT_TRUE(allows(policy, "a.mine.github.io"));
     EXPECT_FALSE(allows(policy, "theirs.github.io"));
@@ -91,21 +91,27 @@ TEST(ServicePolicyTest, NeighboursUnderAPublicSuffixAreForeign) {
 }
 
 TEST(ServicePolicyTest, AddressesAndLocalNames_ExactlyThatOrigin) {
-    const ServicePolicy address("127.0.0.1:8443", {});
+    const ServicePolicy address("127.0.0.1:8443", std::nullopt);
     EXPECT_TRUE(allows(address, "127.0.0.1:8443"));
     EXPECT_FALSE(allows(address, "127.0.0.1"));
     EXPECT_FALSE(allows(address, "1.127.0.0.1.example:8443"));
     EXPECT_FALSE(allows(address, "126.0.0.1:8443"));
-    const ServicePolicy local("localhost:8443", {});
+    const ServicePolicy local("localhost:8443", std::nullopt);
     EXPECT_TRUE(allows(local, "localhost:8443"));
     EXPECT_FALSE(allows(local, "a.localhost:8443"));
     EXPECT_FALSE(allows(local, "127.0.0.1:8443"));
 }
 
-TEST(ServicePolicyTest, ListedDomainsAreAllowedBesides) {
+using Domains = std::vector<std::string>;
+
+TEST(ServicePolicyTest, WithAList_TheHostAndTheListAlone) {
     const ServicePolicy policy("service.example.org:8443",
-                               {"example.net", "example.com:443", "127.0.0.1:9443", "host"});
+                               Domains{"example.net", "example.com:443", "127.0.0.1:9443", "host"});
     EXPECT_TRUE(allows(policy, "service.example.org:8443"));
+    EXPECT_FALSE(allows(policy, "example.org:8443"));
+    EXPECT_FALSE(allows(policy, "a.example.org:8443"));
+    EXPECT_FALSE(allows(policy, "a.service.example.org:8443"));
+    EXPECT_FALSE(allows(policy, "service.example.org"));
     EXPECT_TRUE(allows(policy, "a.example.net:8443"));
     EXPECT_FALSE(allows(policy, "a.example.net"));
     EXPECT_TRUE(allows(policy, "a.example.com"));
@@ -113,19 +119,33 @@ TEST(ServicePolicyTest, ListedDomainsAreAllowedBesides) {
     EXPECT_TRUE(allows(policy, "127.0.0.1:9443"));
     EXPECT_TRUE(allows(policy, "host:8443"));
     EXPECT_FALSE(allows(policy, "a.host:8443"));
+    EXPECT_TRUE(policy.entriesForNobody().empty());
 }
 
-TEST(ServicePolicyTest, PublicSuffixInTheListAllowsNobody) {
-    const ServicePolicy policy("service.example.org", {"co.uk", "org", "com", "not a domain", ""});
+TEST(ServicePolicyTest, AnEmptyListIsTheHostAlone) {
+    const ServicePolicy policy("service.example.org", Domains{});
+    EXPECT_TRUE(allows(policy, "service.example.org"));
+    EXPECT_FALSE(allows(policy, "other.example.org"));
+    EXPECT_FALSE(allows(policy, "example.org"));
+    EXPECT_TRUE(policy.entriesForNobody().empty());
+}
+
+TEST(ServicePolicyTest, WhatAllowsNobodyIsTold) {
+    const Domains nobody = {"co.uk", "org", "com", "github.io", "not a domain", ""};
+    const ServicePolicy policy("service.example.org", nobody);
     EXPECT_FALSE(allows(policy, "evil.co.uk"));
     EXPECT_FALSE(allows(policy, "evil.org"));
+    EXPECT_FALSE(allows(policy, "org"));
     EXPECT_FALSE(allows(policy, "evil.com"));
+    EXPECT_FALSE(allows(policy, "evil.github.io"));
+    EXPECT_FALSE(allows(policy, "github.io"));
     EXPECT_TRUE(allows(policy, "service.example.org"));
+    EXPECT_EQ(policy.entriesForNobody(), nobody);
 }
 
 TEST(ServicePolicyTest, WithoutAService_NobodyIsAllowed) {
-    EXPECT_FALSE(allows(ServicePolicy("", {"example.org"}), "example.org"));
-    EXPECT_FALSE(allows(ServicePolicy("user@example.org", {}), "example.org"));
+    EXPECT_FALSE(allows(ServicePolicy("", {{"example.org"}}), "example.org"));
+    EXPECT_FALSE(allows(ServicePolicy("user@example.org", std::nullopt), "example.org"));
 }
 
 }  // namespace
