@@ -90,9 +90,9 @@ void addMaps(Platform& platform, const HostSettings& settings, LiveServices* liv
         platform.maps = earlier->maps;
         return;
     }
-    const auto maps = linux_::ConfiguredMaps::make(live ? live->configuration() : linux_::Configuration{},
-                                                   resourceFolder(), platform.mainLoop,
-                                                   live ? live->network() : nullptr);
+    const auto maps =
+        linux_::ConfiguredMaps::make(live ? live->configuration() : linux_::Configuration{}, resourceFolder(),
+                                     platform.mainLoop, live ? live->network() : nullptr);
     platform.maps = maps;
     if (live) {
         live->drawConfiguredMaps(maps);

@@ -24,7 +24,8 @@ struct TurnTexts {
 /// A question, a sentence and a card: one under the other, or side by side where there is room. Main thread.
 class TurnView : public platform::View {
   public:
-    /// Bytes of a question or a sentence: whoever sends a megabyte must not hold up the window, which measures all of it.
+    /// Bytes of a question or a sentence: whoever sends a megabyte must not hold up the window, which measures all of
+    /// it.
     static constexpr std::size_t kLongestText = 4000;
 
     bool initWithFrame(const platform::Rect& frame) override;

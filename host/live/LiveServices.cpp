@@ -79,15 +79,17 @@ void LiveServices::makeOnce(const platform::Platform& platform) {
         }
     });
     // Asked on the main thread, at each question.
-    assistant_ = std::make_unique<linux_::AssistantClient>([this] {
-        const auto settings = transportSettings(*accounts_);
-        const auto account = accounts_->deviceOwnerAccount();
-        const auto token = account ? account->tokenOfType(platform::kFriendLocationService) : std::nullopt;
-        const auto authorization =
-            token ? platform::basicAuthorization(account->personIdentifier().value_or(""), *token) : std::nullopt;
-        return linux_::AssistantClient::Settings{settings.serviceHost, authorization, settings.certificateFiles,
-                                                 language_};
-    }, network_);
+    assistant_ = std::make_unique<linux_::AssistantClient>(
+        [this] {
+            const auto settings = transportSettings(*accounts_);
+            const auto account = accounts_->deviceOwnerAccount();
+            const auto token = account ? account->tokenOfType(platform::kFriendLocationService) : std::nullopt;
+            const auto authorization =
+                token ? platform::basicAuthorization(account->personIdentifier().value_or(""), *token) : std::nullopt;
+            return linux_::AssistantClient::Settings{settings.serviceHost, authorization, settings.certificateFiles,
+                                                     language_};
+        },
+        network_);
 }
 
 void LiveServices::addTo(platform::Platform& platform, const std::string& language, bool ownPositions) {

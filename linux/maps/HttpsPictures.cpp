@@ -100,9 +100,8 @@ class HttpsPictures::Fetcher : public QObject {
     HttpsRequest requestFor(const Wanted& wanted) const {
         HttpsRequest request;
         request.url = addressOf(settings_.url, wanted.key);
-        request.fields = {{"User-Agent", "ktr/" KTR_VERSION},
-                          {"Accept", "image/png, image/jpeg"},
-                          {"Accept-Language", "*"}};
+        request.fields = {
+            {"User-Agent", "ktr/" KTR_VERSION}, {"Accept", "image/png, image/jpeg"}, {"Accept-Language", "*"}};
         if (wanted.known && !wanted.known->etag.empty()) {
             request.fields.set("If-None-Match", wanted.known->etag);
         }

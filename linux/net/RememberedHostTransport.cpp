@@ -1,6 +1,5 @@
 #include "linux/net/RememberedHostTransport.h"
 
-#include <mutex>
 #include <utility>
 
 namespace ktr::linux_ {
@@ -41,23 +40,19 @@ bool hasAnswered(const HttpAnswer& answer) {
 
 }  // namespace
 
-/// What is remembered, and what is known of it. Any thread.
+/// What is remembered, and whether it is doubted: kept beside it, since the next command may be the next program's. Any
+/// thread.
 class RememberedHostTransport::Memory {
   public:
     Memory(std::shared_ptr<platform::Preferences> preferences, std::string domain, std::string key)
         : preferences_(std::move(preferences)), domain_(std::move(domain)), key_(std::move(key)) {}
 
     bool holds(const std::string& host) const { return preferences_->value(key_, domain_) == host; }
-    bool isDoubted(const std::string& host) const {
-        const std::lock_guard lock(mutex_);
-        return doubted_ == host;
-    }
+    bool isDoubted(const std::string& host) const { return preferences_->value(kDoubtedKey, domain_) == host; }
     void doubt(const std::string& host, bool isDoubted) {
-        const std::lock_guard lock(mutex_);
-        if (isDoubted) {
-            doubted_ = host;
-        } else if (doubted_ == host) {
-            doubted_.reset();
+        if (isDoubted != this->isDoubted(host)) {
+            preferences_->setValue(kDoubtedKey, isDoubted ? std::optional(host) : std::nullopt, domain_);
+            preferences_->synchronize(domain_);
         }
     }
     /// Unless another one was remembered meanwhile.
@@ -70,11 +65,11 @@ class RememberedHostTransport::Memory {
     }
 
   private:
+    static constexpr const char* kDoubtedKey = "DoubtedHost";
+
     const std::shared_ptr<platform::Preferences> preferences_;
     const std::string domain_;
     const std::string key_;
-    mutable std::mutex mutex_;
-    std::optional<std::string> doubted_;  ///< the next command does not go there
 };
 
 RememberedHostTransport::RememberedHostTransport(std::shared_ptr<platform::HttpTransport> next,

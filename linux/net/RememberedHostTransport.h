@@ -15,7 +15,9 @@ namespace ktr::linux_ {
 /// A command for the remembered host goes on to the account's own when no byte of it could be sent there. When it was
 /// sent, and the answer is none that the service gives (silence, a refusal, a server's error, a portal's page), the
 /// command has failed and the next one goes to the account's own host. Once that one has answered, the other is
-/// forgotten; when it cannot be reached either, nothing is: whoever is offline keeps what is remembered.
+/// forgotten; when it cannot be reached either, nothing is: whoever is offline keeps what is remembered. That a host is
+/// passed over is kept too
+/// ("DoubtedHost"), for the next program.
 class RememberedHostTransport : public platform::HttpTransport {
   public:
     /// `accountHost` is asked on the main thread at each command. `domain` and `key`: where the plugin remembers the

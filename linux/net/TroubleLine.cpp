@@ -16,7 +16,8 @@ void TroubleLine::say(const std::string& host, const std::string& reason) {
         said_.erase(said_.begin());
     }
     said_.emplace_back(host, reason);
-    platform::platformLog().write(platform::LogLevel::Error, format_, host, platform::FormatArgument(reason).shown());
+    const platform::Log log("org.ktr.linux", "network");
+    log.write(platform::LogLevel::Error, format_, host, platform::FormatArgument(reason).shown());
 }
 
 void TroubleLine::clear(const std::string& host) {

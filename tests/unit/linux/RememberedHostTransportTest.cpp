@@ -8,6 +8,9 @@ namespace {
 using platform::HttpAnswer;
 using platform::HttpFailure;
 
+constexpr const char* kShardElseOwn = "shard.example.org, else service.example.org";
+constexpr const char* kOwn = "service.example.org";
+
 class RememberedHostTransportTest : public PlatformTest {
   protected:
     RememberedHostTransportTest() { remember("shard.example.org"); }
@@ -39,9 +42,6 @@ class RememberedHostTransportTest : public PlatformTest {
     int completions = 0;
 };
 
-constexpr const char* kShardElseOwn = "shard.example.org, else service.example.org";
-constexpr const char* kOwn = "service.example.org";
-
 TEST_F(RememberedHostTransportTest, HostThatServesIsAskedAgain) {
     for (int i = 0; i < 3; ++i) {
         EXPECT_EQ(send(), kShardElseOwn);
@@ -72,10 +72,23 @@ TEST_F(RememberedHostTransportTest, HostThatCannotServe_NextCommandGoesToTheOwn_
         EXPECT_EQ(remembered(), "shard.example.org");
         answer(good());
         EXPECT_EQ(remembered(), "none") << outcome.status;
-        EXPECT_EQ(preferences->synchronized, std::vector<std::string>{"org.ktr.snippets"});
+        EXPECT_FALSE(preferences->synchronized.empty());
+        EXPECT_TRUE(preferences->values.empty()) << "nothing of it is left";
         EXPECT_EQ(send(), kOwn);
         answer(good());
     }
+}
+
+TEST_F(RememberedHostTransportTest, TheNextCommandMayBeTheNextPrograms) {
+    send();
+    answer(of(503));
+    linux_::RememberedHostTransport next(transport, preferences, [this] { return account; });
+    platform::HttpRequest request;
+    request.host = remembered();
+    next.send(request, [](const HttpAnswer&) {});
+    EXPECT_EQ(transport->requests.back().host, kOwn);
+    answer(good());
+    EXPECT_EQ(remembered(), "none");
 }
 
 TEST_F(RememberedHostTransportTest, FallbackThatAnswered_ForgetsTheOther) {
@@ -105,7 +118,6 @@ TEST_F(RememberedHostTransportTest, BeingOffline_ForgetsNothing) {
         answer(failed(failure));
         EXPECT_EQ(remembered(), "shard.example.org");
     }
-    EXPECT_TRUE(preferences->synchronized.empty());
     // Back online.
     EXPECT_EQ(send(), kShardElseOwn);
     answer(good());

@@ -106,7 +106,7 @@ using Domains = std::vector<std::string>;
 
 TEST(ServicePolicyTest, WithAList_TheHostAndTheListAlone) {
     const ServicePolicy policy("service.example.org:8443",
-                               Domains{"example.net", "example.com:443", "127.0.0.1:9443", "host"});
+                               Domains{"example.net", "example.com:443", "127.0.0.1:9443", "nas"});
     EXPECT_TRUE(allows(policy, "service.example.org:8443"));
     EXPECT_FALSE(allows(policy, "example.org:8443"));
     EXPECT_FALSE(allows(policy, "a.example.org:8443"));
@@ -117,8 +117,8 @@ TEST(ServicePolicyTest, WithAList_TheHostAndTheListAlone) {
     EXPECT_TRUE(allows(policy, "a.example.com"));
     EXPECT_FALSE(allows(policy, "a.example.com:8443"));
     EXPECT_TRUE(allows(policy, "127.0.0.1:9443"));
-    EXPECT_TRUE(allows(policy, "host:8443"));
-    EXPECT_FALSE(allows(policy, "a.host:8443"));
+    EXPECT_TRUE(allows(policy, "nas:8443"));
+    EXPECT_FALSE(allows(policy, "a.nas:8443"));
     EXPECT_TRUE(policy.entriesForNobody().empty());
 }
 
