@@ -235,7 +235,7 @@ class HttpsPictures::Fetcher : public QObject {
     const Settings& settings_;
     std::deque<Wanted> waiting_;  ///< the latest first
     std::size_t underWay_ = 0;
-    TroubleLine trouble_{"Tiles from %@ cannot be fetched: %@"};
+    TroubleLine trouble_{platform::LogArea::Maps, "Tiles from %@ cannot be fetched: %@"};
     /// The server is left alone until then.
     std::chrono::steady_clock::time_point notBefore_;
     seconds awayFor_{0};

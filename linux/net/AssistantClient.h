@@ -56,7 +56,7 @@ class AssistantClient {
   private:
     std::function<Settings()> settings_;
     /// Used on the network thread.
-    TroubleLine trouble_{"The assistant at %@ cannot be asked: %@"};
+    TroubleLine trouble_{platform::LogArea::Net, "The assistant at %@ cannot be asked: %@"};
     /// Goes first: what it ends still says why.
     HttpsClient client_;
 };

@@ -5,7 +5,7 @@
 #include <variant>
 
 #include "documents/JsonReader.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -82,11 +82,11 @@ void QtHttpTransport::prepare() {
     }
     policy_ = ServicePolicy(settings.serviceHost.value_or(""), settings.domains);
     for (const std::string& entry : policy_.entriesForNobody()) {
-        platform::platformLog().write(
-            platform::LogLevel::Error,
-            "The entry \"%@\" of account.domains allows nobody: it is no host, or a domain in "
-            "which anybody can have a name",
-            entry);
+        platform::areaLog(platform::LogArea::Net)
+            .write(platform::LogLevel::Error,
+                   "The entry \"%@\" of account.domains allows nobody: it is no host, or a domain in "
+                   "which anybody can have a name",
+                   entry);
     }
     current_ = std::move(settings);
 }

@@ -45,7 +45,7 @@ class QtHttpTransport : public platform::HttpTransport {
     std::optional<Settings> current_;
     ServicePolicy policy_{"", std::nullopt};
     /// Used on the network thread.
-    TroubleLine trouble_{"A command to %@ failed: %@"};
+    TroubleLine trouble_{platform::LogArea::Net, "A command to %@ failed: %@"};
     /// Goes first: what it ends still says why.
     HttpsClient client_;
 };

@@ -2,8 +2,6 @@
 
 #include <algorithm>
 
-#include "platform/base/Log.h"
-
 namespace ktr::linux_ {
 
 void TroubleLine::say(const std::string& host, const std::string& reason) {
@@ -16,8 +14,7 @@ void TroubleLine::say(const std::string& host, const std::string& reason) {
         said_.erase(said_.begin());
     }
     said_.emplace_back(host, reason);
-    const platform::Log log("org.ktr.linux", "network");
-    log.write(platform::LogLevel::Error, format_, host, platform::FormatArgument(reason).shown());
+    platform::areaLog(area_).write(platform::LogLevel::Error, format_, host, platform::FormatArgument(reason).shown());
 }
 
 void TroubleLine::clear(const std::string& host) {

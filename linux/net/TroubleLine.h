@@ -4,6 +4,8 @@
 #include <utility>
 #include <vector>
 
+#include "platform/base/LogArea.h"
+
 namespace ktr::linux_ {
 
 /// Says what is wrong with a host once, in a line that is written at every level: not again until another thing is
@@ -11,13 +13,14 @@ namespace ktr::linux_ {
 class TroubleLine {
   public:
     /// `format` takes the host, which is private, and the reason.
-    explicit TroubleLine(std::string format) : format_(std::move(format)) {}
+    TroubleLine(platform::LogArea area, std::string format) : area_(area), format_(std::move(format)) {}
 
     void say(const std::string& host, const std::string& reason);
     /// Nothing is wrong with the host now.
     void clear(const std::string& host);
 
   private:
+    platform::LogArea area_;
     std::string format_;
     /// Hosts and what was said of them; few.
     std::vector<std::pair<std::string, std::string>> said_;
