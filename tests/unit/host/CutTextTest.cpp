@@ -1,7 +1,6 @@
 #include "host/conversation/CutText.h"
 
 #include "host/conversation/TurnView.h"
-#include "platform/base/Create.h"
 #include "tests/support/PlatformTest.h"
 
 namespace ktr::test {
