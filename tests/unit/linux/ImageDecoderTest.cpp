@@ -155,7 +155,11 @@ TEST(ImageDecoderTest, DecodingTheLargest_StaysWithinItsMemory) {
     const Bytes progressive = encoded(pixels, "JPG", true);
     const long before = peak();
     EXPECT_TRUE(isRead(progressive));
+#ifndef __SANITIZE_ADDRESS__  // which keeps what is freed for a while
     EXPECT_LT(peak() - before, 256L << 20);
+#else
+    static_cast<void>(before);
+#endif
 }
 
 TEST(ImageDecoderTest, APictureThatEndsEarly_IsRefused) {
