@@ -1,15 +1,12 @@
 #pragma once
 
-#include <openssl/evp.h>
-#include <openssl/x509.h>
-
 #include <filesystem>
-#include <memory>
 #include <optional>
 #include <string>
 #include <variant>
 
 #include "serve/CertificateKind.h"
+#include "server/http/CertificateAuthority.h"
 
 namespace ktr::serve {
 
@@ -18,12 +15,7 @@ namespace ktr::serve {
 /// the development account. Made when missing or about to expire. Any thread; it reads and writes the disk.
 class DevelopmentCertificates {
   public:
-    using Certificate = std::shared_ptr<X509>;
-    using Key = std::shared_ptr<EVP_PKEY>;
-    struct Pair {
-        Certificate certificate;
-        Key key;
-    };
+    using Pair = server::CertificateAuthority::Pair;
 
     /// The authority of this folder, or one line that says what failed.
     static std::variant<DevelopmentCertificates, std::string> prepare(const std::filesystem::path& folder);
@@ -38,7 +30,7 @@ class DevelopmentCertificates {
     DevelopmentCertificates() = default;
 
     std::filesystem::path folder_;
-    Pair authority_;
+    std::optional<server::CertificateAuthority> authority_;
     std::string token_;
 };
 

@@ -1,0 +1,260 @@
+#include "server/admin/Administration.h"
+
+#include <algorithm>
+#include <ctime>
+#include <filesystem>
+
+#include "documents/AtomicFile.h"
+#include "documents/Words.h"
+#include "platform/base/Json.h"
+#include "server/admin/LocalTime.h"
+#include "server/admin/ServiceSettings.h"
+#include "server/http/CertificateAuthority.h"
+#include "server/ingest/SealedText.h"
+#include "server/store/Secret.h"
+
+namespace ktr::server {
+
+using platform::Dictionary;
+using platform::Value;
+
+namespace {
+
+constexpr long kAuthorityDays = 3650;
+constexpr std::size_t kLongestName = 40;
+
+/// A name goes into user names, answers and tables: one line, without the colon that ends a user name.
+bool isName(const std::string& name) {
+    return !name.empty() && name.size() <= kLongestName && name.front() != ' ' && name.back() != ' ' &&
+           std::all_of(name.begin(), name.end(), [](char c) {
+               const auto byte = static_cast<unsigned char>(c);
+               return byte >= 0x20 && byte < 0x7F && c != ':';
+           });
+}
+
+std::string faceOf(std::int64_t time) {
+    const std::time_t seconds = time;
+    std::tm face{};
+    ::localtime_r(&seconds, &face);
+    char text[32];
+    std::strftime(text, sizeof text, "%Y-%m-%d %H:%M", &face);
+    return text;
+}
+
+std::string wordsOf(const Grant& grant) {
+    return wordOf(grant.precision) + (grant.until ? " until " + faceOf(*grant.until) : std::string());
+}
+
+}  // namespace
+
+std::string Administration::open() {
+    std::string complaint;
+    store_ = Store::open(folder_, false, complaint);
+    return store_ ? "" : complaint + " (is there a service? ktr-service init makes one)";
+}
+
+std::optional<Person> Administration::person(const std::string& name, std::string& complaint) {
+    auto found = store_->personNamed(name);
+    if (!found) {
+        complaint = "there is nobody called " + documents::inQuotes(name) + "; ktr-service people lists all";
+    }
+    return found;
+}
+
+std::string Administration::init(const std::string& host, int port) {
+    if (!ServiceSettings::isHost(host)) {
+        return "--host: expected a host name or an address, found " + documents::inQuotes(host);
+    }
+    std::string complaint;
+    if (std::filesystem::exists(folder_ + "/settings.json")) {
+        return folder_ + ": there is a service already";
+    }
+    store_ = Store::open(folder_, true, complaint);
+    if (!store_) {
+        return complaint;
+    }
+    const ServiceSettings settings{host, port};
+    const auto authority = CertificateAuthority::make("ktr-service", settings.constraint(), kAuthorityDays);
+    complaint = authority ? authority->write(folder_) : "the certificate authority cannot be made";
+    if (complaint.empty()) {
+        complaint = settings.write(folder_);
+    }
+    if (complaint.empty()) {
+        out_ << "service made in " << folder_ << "\nphones and readers reach it at " << settings.origin()
+             << "\nand trust it by the certificate " << folder_ << "/ca.pem\n";
+    }
+    return complaint;
+}
+
+std::string Administration::add(const std::string& name, const std::vector<std::string>& handles,
+                                const std::string& key) {
+    std::string complaint = open();
+    if (!complaint.empty()) {
+        return complaint;
+    }
+    const auto settings = ServiceSettings::read(folder_, complaint);
+    if (!settings) {
+        return complaint;
+    }
+    if (!isName(name)) {
+        return "expected a name of 1 to 40 plain letters without a colon, found " + documents::inQuotes(name);
+    }
+    for (const std::string& handle : handles) {
+        const std::string plain = Store::normalisedHandle(handle);
+        if (plain.size() < 3 || handle.size() > 254) {
+            return "--handle: expected an e-mail address or a phone number, found " + documents::inQuotes(handle);
+        }
+        if (store_->personOf(handle)) {
+            return "--handle: " + documents::inQuotes(handle) + " belongs to somebody else";
+        }
+    }
+    if (!key.empty() && !SealedText::seal("", key)) {
+        return "--key: expected at most 32 letters";
+    }
+    if (store_->personNamed(name)) {
+        return documents::inQuotes(name) + " is there already";
+    }
+    const auto secret = Secret::make();
+    if (!secret || !store_->addPerson(name, handles, now_)) {
+        return "the person could not be written";
+    }
+    if (!store_->addDevice(store_->personNamed(name)->id, DeviceKind::Phone, *secret, key, now_)) {
+        return "the phone's secret could not be written";
+    }
+    out_ << name << " is added. In the phone's tracker choose the mode HTTP and type:\n  URL       "
+         << settings->origin() << "/pub\n  User name " << name << "\n  Password  " << *secret
+         << "\nThe password is not shown again. Trackers that know only a URL:\n  " << settings->origin()
+         << "/?id=" << *secret << "\n";
+    return "";
+}
+
+std::string Administration::reader(const std::string& name, const std::string& tokenFile) {
+    std::string complaint = open();
+    const auto settings = complaint.empty() ? ServiceSettings::read(folder_, complaint) : std::nullopt;
+    const auto who = settings ? person(name, complaint) : std::nullopt;
+    if (!who) {
+        return complaint;
+    }
+    const auto secret = Secret::make();
+    if (!secret || !store_->addDevice(who->id, DeviceKind::Reader, *secret, "", now_)) {
+        return "the reader's secret could not be written";
+    }
+    complaint = documents::AtomicFile::write(tokenFile, *secret + "\n", 0600);
+    if (!complaint.empty()) {
+        return complaint;
+    }
+    const std::string origin = settings->origin();
+    const Dictionary account{{"personId", name},
+                             {"userName", who->handles.empty() ? name : who->handles.front()},
+                             {"host", origin.substr(std::string("https://").size())},
+                             {"tokenFile", std::filesystem::absolute(tokenFile).lexically_normal().string()}};
+    const auto authority = std::filesystem::absolute(folder_ + "/ca.pem").lexically_normal().string();
+    out_ << platform::writeJson(Dictionary{{"account", account}, {"certificates", Value::Array{authority}}}) << "\n";
+    return "";
+}
+
+std::string Administration::befriend(const std::string& one, const std::string& other) {
+    const std::string complaint = share(one, other, "exact", "");
+    return complaint.empty() ? share(other, one, "exact", "") : complaint;
+}
+
+std::string Administration::share(const std::string& owner, const std::string& viewer, const std::string& precision,
+                                  const std::string& until) {
+    std::string complaint = open();
+    const auto from = complaint.empty() ? person(owner, complaint) : std::nullopt;
+    const auto to = from ? person(viewer, complaint) : std::nullopt;
+    if (!to) {
+        return complaint;
+    }
+    if (from->id == to->id) {
+        return "nobody shares with themselves";
+    }
+    const auto exactness = precisionOf(precision);
+    if (!exactness) {
+        return "--precision: expected exact, 1km or town, found " + documents::inQuotes(precision);
+    }
+    Grant grant{*exactness, now_, std::nullopt};
+    if (!until.empty()) {
+        grant.until = endingOf(until, now_);
+        if (!grant.until) {
+            return "--until: expected midnight, a time such as 18:30 or a date to come, found " +
+                   documents::inQuotes(until);
+        }
+    }
+    if (!store_->grant(from->id, to->id, grant)) {
+        return "the grant could not be written";
+    }
+    out_ << viewer << " sees " << owner << ": " << wordsOf(grant) << "\n";
+    return "";
+}
+
+std::string Administration::revoke(const std::string& owner, const std::string& viewer) {
+    std::string complaint = open();
+    const auto from = complaint.empty() ? person(owner, complaint) : std::nullopt;
+    if (!from) {
+        return complaint;
+    }
+    if (viewer.empty()) {
+        out_ << store_->revokeDevices(from->id, now_) << " secrets of " << owner << " ended\n";
+        return "";
+    }
+    const auto to = person(viewer, complaint);
+    if (!to) {
+        return complaint;
+    }
+    if (!store_->revokeGrant(from->id, to->id)) {
+        return viewer + " does not see " + owner;
+    }
+    out_ << viewer << " sees " << owner << " no more\n";
+    return "";
+}
+
+std::string Administration::setHidden(const std::string& name, bool hidden) {
+    std::string complaint = open();
+    const auto who = complaint.empty() ? person(name, complaint) : std::nullopt;
+    if (!who) {
+        return complaint;
+    }
+    if (!store_->setHidden(who->id, hidden, now_)) {
+        return "it could not be written";
+    }
+    out_ << name << (hidden ? " is hidden from everybody\n" : " is shown to those with a grant\n");
+    return "";
+}
+
+std::string Administration::people() {
+    if (const std::string complaint = open(); !complaint.empty()) {
+        return complaint;
+    }
+    for (const Person& person : store_->people()) {
+        const auto heard = store_->lastHeard(person.id);
+        out_ << person.name << (person.hidden ? ", hidden" : "")
+             << (heard ? ", last heard " + faceOf(*heard) : std::string(", never heard")) << "\n";
+        for (const auto& [viewer, grant] : store_->grantsOf(person.id)) {
+            const bool over = grant.until && *grant.until <= now_;
+            out_ << "  seen by " << viewer << ": " << wordsOf(grant) << (over ? " (over)" : "") << "\n";
+        }
+    }
+    return "";
+}
+
+std::string Administration::check() {
+    std::string complaint = open();
+    if (!complaint.empty()) {
+        return complaint;
+    }
+    if (const std::string broken = store_->check(); !broken.empty()) {
+        return folder_ + "/service.db: is damaged: " + broken;
+    }
+    const auto settings = ServiceSettings::read(folder_, complaint);
+    if (!settings) {
+        return complaint;
+    }
+    if (!CertificateAuthority::read(folder_, complaint)) {
+        return complaint.empty() ? folder_ + "/ca.pem: is missing, damaged or about to expire" : complaint;
+    }
+    out_ << "the store is whole; the service is " << settings->origin() << "\n";
+    return "";
+}
+
+}  // namespace ktr::server

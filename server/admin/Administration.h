@@ -1,0 +1,48 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <ostream>
+#include <string>
+#include <vector>
+
+#include "server/store/Store.h"
+
+namespace ktr::server {
+
+/// The commands of `ktr-service`. Each writes what it did to `out`, never a position, and gives a sentence when it
+/// could not be done, else an empty text. One thread.
+class Administration {
+  public:
+    Administration(std::string folder, std::int64_t now, std::ostream& out)
+        : folder_(std::move(folder)), now_(now), out_(out) {}
+
+    std::string init(const std::string& host, int port);
+    /// A person with a phone: what to type into its app, with the secret that is shown once.
+    std::string add(const std::string& name, const std::vector<std::string>& handles, const std::string& key);
+    /// A configuration with which ktr asks for this person, with the secret that is shown once.
+    std::string reader(const std::string& name, const std::string& tokenFile);
+    /// The two see each other exactly until one of them ends it.
+    std::string befriend(const std::string& one, const std::string& other);
+    std::string share(const std::string& owner, const std::string& viewer, const std::string& precision,
+                      const std::string& until);
+    /// Without a viewer: all secrets of a person.
+    std::string revoke(const std::string& owner, const std::string& viewer);
+    std::string setHidden(const std::string& name, bool hidden);
+    std::string people();
+    std::string check();
+    /// Serves until SIGINT or SIGTERM.
+    std::string serve(const std::string& address);
+
+  private:
+    /// Opens the store; an empty text when it is open.
+    std::string open();
+    std::optional<Person> person(const std::string& name, std::string& complaint);
+
+    const std::string folder_;
+    const std::int64_t now_;
+    std::ostream& out_;
+    std::unique_ptr<Store> store_;
+};
+
+}  // namespace ktr::server

@@ -1,0 +1,80 @@
+#include <CLI/CLI.hpp>
+#include <chrono>
+#include <cstdlib>
+#include <iostream>
+#include <string>
+#include <vector>
+
+#include "server/admin/Administration.h"
+
+namespace {
+
+std::string defaultFolder() {
+    const char* data = std::getenv("XDG_DATA_HOME");
+    if (data != nullptr && data[0] == '/') {
+        return std::string(data) + "/ktr-service";
+    }
+    const char* home = std::getenv("HOME");
+    return (home == nullptr ? std::string() : std::string(home)) + "/.local/share/ktr-service";
+}
+
+}  // namespace
+
+int main(int count, char** words) {
+    CLI::App program("A location service for a family or a club: phones in, friends back.");
+    program.require_subcommand(1);
+    std::string folder = defaultFolder();
+    program.add_option("--data", folder, "Folder of the service (" + folder + ")")->type_name("FOLDER");
+    std::string name, other, host, precision = "exact", until, key, token = "ktr-token", address = "127.0.0.1";
+    std::vector<std::string> handles;
+    int port = 8443;
+    const auto named = [&](CLI::App* command) {
+        command->add_option("name", name, "The person's name")->required();
+        return command;
+    };
+    CLI::App* init = program.add_subcommand("init", "Makes a service");
+    init->add_option("--host", host, "Name or address under which phones reach it")->required();
+    init->add_option("--port", port, "Its port (8443)")->check(CLI::Range(0, 65535));
+    CLI::App* add = named(program.add_subcommand("add", "Adds a person with a phone"));
+    add->add_option("--handle", handles, "E-mail address or phone number by which friends ask")
+        ->allow_extra_args(false);
+    add->add_option("--key", key, "With which the phone seals its messages");
+    CLI::App* reader = named(program.add_subcommand("reader", "Prints a configuration for ktr"));
+    reader->add_option("--token-file", token, "Where its secret is written (ktr-token)");
+    CLI::App* friend_ = named(program.add_subcommand("friend", "Two people see each other exactly"));
+    friend_->add_option("other", other, "The other one")->required();
+    CLI::App* share = named(program.add_subcommand("share", "Lets somebody see a person"));
+    share->add_option("viewer", other, "Who may see")->required();
+    share->add_option("--precision", precision, "exact, 1km or town (exact)");
+    share->add_option("--until", until, "midnight, a time such as 18:30, or a date");
+    CLI::App* revoke = named(program.add_subcommand("revoke", "Ends a grant, or all secrets of a person"));
+    revoke->add_option("viewer", other, "Who no longer sees the person");
+    CLI::App* hide = named(program.add_subcommand("hide", "Hides a person from everybody"));
+    CLI::App* show = named(program.add_subcommand("show", "Shows a person again"));
+    CLI::App* people = program.add_subcommand("people", "Lists people and who sees them");
+    CLI::App* check = program.add_subcommand("check", "Looks whether all is whole");
+    CLI::App* serve = program.add_subcommand("serve", "Serves until it is told to end");
+    serve->add_option("--address", address, "Address to listen on (127.0.0.1)");
+    CLI11_PARSE(program, count, words);
+
+    const auto now =
+        std::chrono::duration_cast<std::chrono::seconds>(std::chrono::system_clock::now().time_since_epoch()).count();
+    ktr::server::Administration administration(folder, now, std::cout);
+    const std::string complaint = *init      ? administration.init(host, port)
+                                  : *add     ? administration.add(name, handles, key)
+                                  : *reader  ? administration.reader(name, token)
+                                  : *friend_ ? administration.befriend(name, other)
+                                  : *share   ? administration.share(name, other, precision, until)
+                                  : *revoke  ? administration.revoke(name, other)
+                                  : *hide    ? administration.setHidden(name, true)
+                                  : *show    ? administration.setHidden(name, false)
+                                  : *people  ? administration.people()
+                                  : *check   ? administration.check()
+                                  : *serve   ? administration.serve(address)
+                                             : std::string();
+    if (!complaint.empty()) {
+        std::cerr << "ktr-service: " << complaint << std::endl;
+        return EXIT_FAILURE;
+    }
+    return EXIT_SUCCESS;
+}

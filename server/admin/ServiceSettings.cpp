@@ -1,0 +1,85 @@
+#include "server/admin/ServiceSettings.h"
+
+#include <arpa/inet.h>
+#include <sys/stat.h>
+
+#include <algorithm>
+#include <array>
+
+#include "documents/AtomicFile.h"
+#include "documents/DocumentReader.h"
+#include "documents/FileTrust.h"
+#include "platform/base/Json.h"
+
+namespace ktr::server {
+
+namespace {
+
+constexpr std::size_t kLargest = 65536;
+
+bool isAddress(const std::string& host, int family) {
+    std::array<unsigned char, 16> bytes{};
+    return ::inet_pton(family, host.c_str(), bytes.data()) == 1;
+}
+
+std::string fileOf(const std::string& folder) {
+    return folder + "/settings.json";
+}
+
+}  // namespace
+
+bool ServiceSettings::isHost(const std::string& text) {
+    if (isAddress(text, AF_INET) || isAddress(text, AF_INET6)) {
+        return true;
+    }
+    return !text.empty() && text.size() <= 253 && text.front() != '-' && text.front() != '.' &&
+           std::all_of(text.begin(), text.end(), [](char c) {
+               return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9') || c == '-' ||
+                      c == '.';
+           });
+}
+
+std::optional<ServiceSettings> ServiceSettings::read(const std::string& folder, std::string& complaint) {
+    ServiceSettings settings;
+    const auto refusal = [&](const struct stat& facts) {
+        return documents::FileTrust::problemOf(fileOf(folder), facts);
+    };
+    const auto read = [&](documents::FieldReader& fields) {
+        settings.host = fields.text("host").value_or("");
+        settings.port = fields.whole("port", 0, 65535).value_or(settings.port);
+        if (!isHost(settings.host)) {
+            fields.complain("host", "expected a host name or an address");
+        }
+    };
+    const auto error = documents::DocumentReader::readFile(fileOf(folder), {kLargest, refusal}, read, nullptr);
+    if (error) {
+        complaint = error->text();
+        return std::nullopt;
+    }
+    return settings;
+}
+
+std::string ServiceSettings::write(const std::string& folder) const {
+    return documents::AtomicFile::write(
+        fileOf(folder), platform::writeJson(platform::Dictionary{{"host", host}, {"port", port}}) + "\n", 0600);
+}
+
+std::string ServiceSettings::origin() const {
+    return "https://" + (isAddress(host, AF_INET6) ? "[" + host + "]" : host) + ":" + std::to_string(port);
+}
+
+std::string ServiceSettings::alternativeName() const {
+    return (isAddress(host, AF_INET) || isAddress(host, AF_INET6) ? "IP:" : "DNS:") + host;
+}
+
+std::string ServiceSettings::constraint() const {
+    if (isAddress(host, AF_INET)) {
+        return "critical,permitted;IP:" + host + "/255.255.255.255";
+    }
+    if (isAddress(host, AF_INET6)) {
+        return "critical,permitted;IP:" + host + "/FFFF:FFFF:FFFF:FFFF:FFFF:FFFF:FFFF:FFFF";
+    }
+    return "critical,permitted;DNS:" + host;
+}
+
+}  // namespace ktr::server

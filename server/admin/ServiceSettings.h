@@ -1,0 +1,25 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+namespace ktr::server {
+
+/// Under which name and port phones reach the service: "settings.json" in its folder. A value.
+struct ServiceSettings {
+    std::string host;
+    int port = 8443;
+
+    /// None, with a sentence in `complaint`, when there is none or it is wrong.
+    static std::optional<ServiceSettings> read(const std::string& folder, std::string& complaint);
+    /// Empty when done.
+    std::string write(const std::string& folder) const;
+    /// A host name or an address, of letters that a certificate takes.
+    static bool isHost(const std::string& text);
+    std::string origin() const;
+    /// How a certificate names the host, and how an authority is bound to it.
+    std::string alternativeName() const;
+    std::string constraint() const;
+};
+
+}  // namespace ktr::server
