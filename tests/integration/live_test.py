@@ -95,12 +95,12 @@ class LiveTest(unittest.TestCase):
         result = self.describe(walk, 3, "--interval", "0.4", "--positions", SOURCE / "resources/scenarios/single.json",
                                question="where is ann")
         self.assertEqual(result.returncode, 0, result.stderr)
-        self.assertRegex(result.stdout, r"\nMap: Ann Marsh, at Fish Market\. Accurate to (30 metres|33 yards)\. .+ of you \(link\)")
+        self.assertRegex(result.stdout, r"\nMap: Ann Marsh, Fish Market\. Accurate to (30 metres|33 yards)\. .+ of you \(link\)")
 
     def test_scenario_is_asked_about_at_the_service(self):
         result = self.run_live(self.serve(MOVING), "describe", 2, self.snippet_of_ann(), question=None)
         self.assertEqual(result.returncode, 0, result.stderr)
-        self.assertRegex(result.stdout, r"At (Home|Fish Market), Ann Marsh, .*Located now")
+        self.assertRegex(result.stdout, r"Place: (Home|Fish Market), Ann Marsh, .*Located now")
 
     def test_question_that_is_not_understood_gets_its_sentence(self):
         result = self.describe(MOVING, 0.2, question="Tell me a joke")
