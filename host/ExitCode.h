@@ -2,7 +2,7 @@
 
 namespace ktr::host {
 
-/// What the program's exit status says; `ktr --help` lists them.
+/// What an attempt came to; a program may take it for its exit status.
 enum class ExitCode {
     Ok = 0,
     Failure = 1,      ///< something could not be done: a file not written, no display, contacts not read

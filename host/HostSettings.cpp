@@ -66,7 +66,8 @@ std::variant<HostSettings, Failure> HostSettings::decide(const HostOptions& opti
     } else if (options.at) {
         settings.runSeconds = options.at->date.secondsSinceReferenceDate - start.date.secondsSinceReferenceDate;
         if (settings.runSeconds < 0.0 || settings.runSeconds > kLongestRun) {
-            return Failure{ExitCode::Usage, "--at: expected a time from the scenario's start to a week after it"};
+            return Failure{ExitCode::Usage,
+                           "the moment of the picture: expected a time from the scenario's start to a week after it"};
         }
     }
     for (const Scenario& scenario : scenarios) {

@@ -100,6 +100,21 @@ class TroubleTest(unittest.TestCase):
         self.assertIn("the system's message bus does not answer", result.stderr)
         self.assertNotIn("Sign in", result.stdout + result.stderr)
 
+    def start(self, *command, **environment):
+        process = subprocess.Popen(command, env={**os.environ, **environment}, stdout=subprocess.PIPE, text=True)
+        self.addCleanup(lambda: (process.kill(), process.wait(), process.stdout.close()))
+        return process, process.stdout.readline().strip()
+
+    def test_silent_secret_service_beside_a_token_file(self):
+        _, bus = self.start("dbus-daemon", "--session", "--print-address", "--nofork")
+        silent = ('import dbus, time; bus = dbus.SessionBus(); name = dbus.service.BusName("org.freedesktop.secrets", bus); '
+                  'print("there", flush=True); time.sleep(300)')
+        _, there = self.start("/usr/bin/python3", "-c", "import dbus.service; " + silent, DBUS_SESSION_BUS_ADDRESS=bus)
+        self.assertEqual(there, "there")
+        result = self.run_live(before=["env", f"DBUS_SESSION_BUS_ADDRESS={bus}"])
+        self.assertLess(result.seconds, 20, result.stderr)
+        self.assertNotIn("Sign in", result.stdout + result.stderr)
+
     def test_few_files_is_a_failure_that_says_so(self):
         for files in (6, 8, 10, 12, 15, 16, 24, 32):
             with self.subTest(files):
