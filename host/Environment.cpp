@@ -59,7 +59,7 @@ std::vector<linux_::TimedPosition> walkOf(const std::vector<ScenarioPosition>& p
 std::shared_ptr<linux_::QtLocalization> readTexts(const HostSettings& settings, std::string& error) {
     auto texts = std::make_shared<linux_::QtLocalization>(settings.language);
     const auto folder = resourceFolder() / "localization";
-    if (!texts->addBundle(linux_::QtLocalization::kSnippetsBundle, folder, "snippets") ||
+    if (!texts->addBundle(platform::kSnippetsBundle, folder, "snippets") ||
         !texts->addBundle(linux_::QtLocalization::kHostBundle, folder, "host")) {
         error = "the program's texts cannot be read: " + folder.string();
     }

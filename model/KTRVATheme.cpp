@@ -74,7 +74,7 @@ Color KTRVATheme::ktrOrangeColor() {
 
 std::shared_ptr<Image> KTRVATheme::themeImageNamed(const std::string& name) {
     KTR_ASSERT_MAIN_THREAD();
-    return platform::Platform::installed()->images->imageNamed(name, PluginBundle::kIdentifier);
+    return platform::Platform::installed()->images->imageNamed(name, platform::kSnippetsBundle);
 }
 
 std::shared_ptr<Image> KTRVATheme::locationIndicator() {

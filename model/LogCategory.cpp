@@ -9,7 +9,7 @@ namespace {
 
 class LogCategory : public platform::Log {
   public:
-    LogCategory() : platform::Log(PluginBundle::kIdentifier, "_") {}
+    LogCategory() : platform::Log(platform::kSnippetsBundle, "_") {}
     static std::shared_ptr<LogCategory> makeShared() { return std::make_shared<LogCategory>(); }
 };
 

@@ -10,7 +10,7 @@ std::shared_ptr<platform::Bundle> PluginBundle::bundle() {
 }
 
 std::string AssistantLocalizedString(const std::string& key) {
-    return platform::Platform::installed()->localization->text(key, PluginBundle::kIdentifier);
+    return platform::Platform::installed()->localization->text(key, platform::kSnippetsBundle);
 }
 
 }  // namespace ktr

@@ -10,10 +10,7 @@ namespace ktr {
 /// The plugin's own bundle: its texts, its images and its log carry this identifier. One per installed platform.
 class PluginBundle : public platform::Bundle {
   public:
-    /// The identifier that the plugin's manifest declares.
-    static constexpr const char* kIdentifier = "org.ktr.snippets";
-
-    PluginBundle() : platform::Bundle(kIdentifier) {}
+    PluginBundle() : platform::Bundle(platform::kSnippetsBundle) {}
     static std::shared_ptr<PluginBundle> makeShared() { return std::make_shared<PluginBundle>(); }
     /// None without a platform. Any thread.
     static std::shared_ptr<platform::Bundle> bundle();

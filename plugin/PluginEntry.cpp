@@ -3,6 +3,7 @@
 #include <unordered_map>
 
 #include "platform/base/Api.h"
+#include "platform/base/Bundle.h"
 #include "platform/host/PluginInterface.h"
 #include "plugin/KTRSnippetControllerFactory.h"
 
@@ -11,7 +12,7 @@ namespace {
 using ktr::platform::Platform;
 using ktr::platform::SnippetControllerFactory;
 
-constexpr ktr_plugin_manifest kManifest = {KTR_PLUGIN_ABI, sizeof(ktr_plugin_manifest), "org.ktr.snippets",
+constexpr ktr_plugin_manifest kManifest = {KTR_PLUGIN_ABI, sizeof(ktr_plugin_manifest), ktr::platform::kSnippetsBundle,
                                            KTR_PLUGIN_VERSION, "KTRSnippetControllerFactory"};
 
 /// The principal objects that hosts hold; they go with the platform at the latest.

@@ -6,13 +6,14 @@
 #include <vector>
 
 #include "platform/assistant/VAPerson.h"
+#include "platform/base/Bundle.h"
 #include "platform/base/NotificationCenter.h"
 #include "platform/base/Object.h"
 
 namespace ktr {
 
 /// The plugin's domain of the preferences.
-inline constexpr const char* PreferencesBundleID = "org.ktr.snippets";
+inline constexpr const char* PreferencesBundleID = platform::kSnippetsBundle;
 /// The preference that holds the host (with its port, if any) to which the service last redirected a command.
 inline constexpr const char* RedirectedHostKey = "RedirectedHostKey";
 

@@ -62,6 +62,8 @@ bool KTRBaseCmd::init() {
             setHost(common->ktrHost());
         }
     }
+    // What it is made of belongs to the main thread: from here on any thread finds it made.
+    staticClientContext();
     return true;
 }
 

@@ -28,7 +28,8 @@ class KTRBaseCmd : public platform::KTJSONCommand {
 
     /// What the commands say of the device: "deviceUDID", "productType", "osVersion", "buildVersion", "locale",
     /// "countryCode", "regionCode"; what is not known is left out. Read once for each installed platform: a change of
-    /// language or region while it is installed is not seen. Never none. Any thread.
+    /// language or region while it is installed is not seen. Never none. Any thread once a command has been made, which
+    /// makes this too; until then the main thread.
     static std::shared_ptr<const platform::Dictionary> staticClientContext();
 
     /// Seconds until the service wants to be asked again, from "minCallbackIntervalInMS" of the answer's

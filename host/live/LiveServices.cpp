@@ -15,6 +15,7 @@
 #include "linux/net/QtHttpTransport.h"
 #include "linux/net/RememberedHostTransport.h"
 #include "linux/positions/ConfiguredPositions.h"
+#include "platform/base/Bundle.h"
 #include "platform/base/MainLoop.h"
 #include "platform/client/DeviceOwnerAccount.h"
 #include "platform/client/KTJSONCommand.h"
@@ -24,7 +25,7 @@ namespace ktr::host {
 namespace {
 
 /// Where the plugin keeps its preferences.
-constexpr const char* kPreferences = "org.ktr.snippets";
+constexpr const char* kPreferences = platform::kSnippetsBundle;
 
 linux_::QtHttpTransport::Settings transportSettings(const linux_::ConfiguredAccountStore& accounts) {
     const auto configuration = accounts.configuration();

@@ -20,8 +20,6 @@ class QtLocalization : public platform::Localization {
     static constexpr const char* kDefaultTable = "Localizable";
     /// The bundle of the host's own texts.
     static constexpr const char* kHostBundle = "org.ktr.host";
-    /// The bundle of the plugin that comes with this project.
-    static constexpr const char* kSnippetsBundle = "org.ktr.snippets";
 
     /// BCP 47, such as "de-AT": looked for as it is, then as its language and script ("zh-Hant" for "zh-TW"), then as
     /// its language, then in English. Old names of languages ("iw") are understood.

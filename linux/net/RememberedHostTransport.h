@@ -5,6 +5,7 @@
 #include <optional>
 #include <string>
 
+#include "platform/base/Bundle.h"
 #include "platform/base/Preferences.h"
 #include "platform/client/HttpTransport.h"
 
@@ -25,7 +26,7 @@ class RememberedHostTransport : public platform::HttpTransport {
     RememberedHostTransport(std::shared_ptr<platform::HttpTransport> next,
                             std::shared_ptr<platform::Preferences> preferences,
                             std::function<std::optional<std::string>()> accountHost,
-                            std::string domain = "org.ktr.snippets", std::string key = "RedirectedHostKey");
+                            std::string domain = platform::kSnippetsBundle, std::string key = "RedirectedHostKey");
     ~RememberedHostTransport() override;
 
     void send(const platform::HttpRequest& request, Completion completion) override;

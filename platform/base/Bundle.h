@@ -6,6 +6,10 @@
 
 namespace ktr::platform {
 
+/// The identifier of the plugin that comes with this project: of its manifest, its texts and images, its log and its
+/// preferences.
+inline constexpr const char* kSnippetsBundle = "org.ktr.snippets";
+
 /// Who a resource or an authorisation belongs to: the plugin, or the host.
 class KTR_API Bundle : public Object {
   public:

@@ -156,15 +156,14 @@ bool VisualFormatParser::readOperand(Syntax::Operand& operand, const char* expec
     const std::size_t begin = at_;
     const bool isSigned = maySign && isNext('-');
     const std::size_t first = begin + (isSigned ? 1 : 0);
-    if (first < text_.size() && isDigit(text_[first])) {
+    if (const std::size_t end = endOfNumber(first); end > first) {
         Syntax::Number number{0.0, begin};
-        // Digits and a fraction; no exponent, so that "8e-" stays a number and what follows it.
         const auto result =
-            std::from_chars(text_.data() + begin, text_.data() + text_.size(), number.value, std::chars_format::fixed);
+            std::from_chars(text_.data() + begin, text_.data() + end, number.value, std::chars_format::fixed);
         if (result.ec != std::errc()) {
             return fail("a number within range");
         }
-        at_ = static_cast<std::size_t>(result.ptr - text_.data());
+        at_ = end;
         operand = number;
         return true;
     }
@@ -178,6 +177,23 @@ bool VisualFormatParser::readOperand(Syntax::Operand& operand, const char* expec
     }
     operand = *found;
     return true;
+}
+
+/// One past the number that begins at `first`, or `first`: digits, and a fraction where digits follow its point. No
+/// exponent, so that "8e-" stays a number and what follows it.
+std::size_t VisualFormatParser::endOfNumber(std::size_t first) const {
+    const auto pastDigits = [this](std::size_t at) {
+        while (at < text_.size() && isDigit(text_[at])) {
+            ++at;
+        }
+        return at;
+    };
+    const std::size_t whole = pastDigits(first);
+    if (whole >= text_.size() || text_[whole] != '.') {
+        return whole;
+    }
+    const std::size_t end = pastDigits(whole + 1);
+    return end > whole + 1 ? end : whole;
 }
 
 bool VisualFormatParser::readView(Syntax::Item& item) {

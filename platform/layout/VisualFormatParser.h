@@ -67,6 +67,7 @@ class VisualFormatParser {
     bool readPredicates(std::vector<Syntax::Predicate>& predicates, const char* object);
     bool readPredicate(Syntax::Predicate& predicate, const char* object);
     bool readOperand(Syntax::Operand& operand, const char* expected, bool maySign);
+    std::size_t endOfNumber(std::size_t first) const;
     bool readView(Syntax::Item& item);
     std::optional<Syntax::Name> name();
 

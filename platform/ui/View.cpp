@@ -11,7 +11,7 @@
 
 namespace ktr::platform {
 
-View::View() : contentPriorities_(&sharedPriorities({})) {}
+View::View() = default;
 
 View::~View() {
     if (self_.link_) {

@@ -95,7 +95,7 @@ class KTR_API View : public Object {
     LayoutAnchor firstBaselineAnchor() { return anchor(LayoutAttribute::FirstBaseline); }
     LayoutAnchor lastBaselineAnchor() { return anchor(LayoutAttribute::LastBaseline); }
     /// Defaults: hugging 250, compression resistance 750.
-    const ContentPriorities& contentPriorities() const { return *contentPriorities_; }
+    const ContentPriorities& contentPriorities() const { return contentPriorities_; }
     double contentHuggingPriority(LayoutAxis axis) const;
     void setContentHuggingPriority(double priority, LayoutAxis axis);
     double contentCompressionResistancePriority(LayoutAxis axis) const;
@@ -181,7 +181,6 @@ class KTR_API View : public Object {
     Extras& madeExtras();
     Children& madeChildren();
     LayoutScope& madeScope();
-    static const ContentPriorities& sharedPriorities(const ContentPriorities& priorities);
     void setContentPriorities(const ContentPriorities& priorities);
     /// Whether this view's layout counts the rule.
     bool holds(const ConstraintRule& rule) const;
@@ -199,8 +198,7 @@ class KTR_API View : public Object {
     std::unique_ptr<Children> children_;
     std::unique_ptr<Extras> extras_;
     std::unique_ptr<LayoutScope> scope_;
-    /// One of a few that all views share.
-    const ContentPriorities* contentPriorities_;
+    ContentPriorities contentPriorities_;
     mutable ViewReference self_;
     bool hidden_ = false;
     bool translatesAutoresizingMask_ = true;

@@ -1,7 +1,4 @@
 // The layout half of View: constraints, content sizes, and when what is placed again.
-#include <algorithm>
-#include <deque>
-
 #include "platform/base/Assert.h"
 #include "platform/layout/LayoutConstraint.h"
 #include "platform/layout/LayoutScope.h"
@@ -97,37 +94,30 @@ LayoutAnchor View::anchor(LayoutAttribute attribute) {
     return {ViewReference(*this), attribute};
 }
 
-const ContentPriorities& View::sharedPriorities(const ContentPriorities& priorities) {
-    // A program has a handful of them.
-    static std::deque<ContentPriorities> known;
-    const auto found = std::find(known.begin(), known.end(), priorities);
-    return found != known.end() ? *found : known.emplace_back(priorities);
-}
-
 void View::setContentPriorities(const ContentPriorities& priorities) {
-    if (!(priorities == *contentPriorities_)) {
-        contentPriorities_ = &sharedPriorities(priorities);
+    if (!(priorities == contentPriorities_)) {
+        contentPriorities_ = priorities;
         LayoutScope::inputChanged(*this);
     }
 }
 
 double View::contentHuggingPriority(LayoutAxis axis) const {
-    return axis == LayoutAxis::Horizontal ? contentPriorities_->horizontalHugging : contentPriorities_->verticalHugging;
+    return axis == LayoutAxis::Horizontal ? contentPriorities_.horizontalHugging : contentPriorities_.verticalHugging;
 }
 
 void View::setContentHuggingPriority(double priority, LayoutAxis axis) {
-    ContentPriorities changed = *contentPriorities_;
+    ContentPriorities changed = contentPriorities_;
     (axis == LayoutAxis::Horizontal ? changed.horizontalHugging : changed.verticalHugging) = priority;
     setContentPriorities(changed);
 }
 
 double View::contentCompressionResistancePriority(LayoutAxis axis) const {
-    return axis == LayoutAxis::Horizontal ? contentPriorities_->horizontalCompressionResistance
-                                          : contentPriorities_->verticalCompressionResistance;
+    return axis == LayoutAxis::Horizontal ? contentPriorities_.horizontalCompressionResistance
+                                          : contentPriorities_.verticalCompressionResistance;
 }
 
 void View::setContentCompressionResistancePriority(double priority, LayoutAxis axis) {
-    ContentPriorities changed = *contentPriorities_;
+    ContentPriorities changed = contentPriorities_;
     (axis == LayoutAxis::Horizontal ? changed.horizontalCompressionResistance : changed.verticalCompressionResistance) =
         priority;
     setContentPriorities(changed);

@@ -98,6 +98,8 @@ TEST_F(VisualFormatTest, BareConnection_IsTheStandardSpace) {
 
 TEST_F(VisualFormatTest, Connection_NumberOrMetric) {
     EXPECT_EQ(parse("[a]-0.5-[b]"), Texts{"b.leading = a.trailing + 0.5"});
+    EXPECT_EQ(parse("[a]-.5-[b]"), Texts{"b.leading = a.trailing + 0.5"});
+    EXPECT_EQ(parse("[a]-(-.5)-[b]"), Texts{"b.leading = a.trailing - 0.5"});
     EXPECT_EQ(parse("[a]-m-[b]"), Texts{"b.leading = a.trailing + 12"});
     EXPECT_EQ(parse("[a]-b2-[b]"), Texts{"b.leading = a.trailing + 4"});
     EXPECT_EQ(parse("[a]-größe-[b]"), Texts{"b.leading = a.trailing + 7"});
@@ -242,6 +244,8 @@ INSTANTIATE_TEST_SUITE_P(
         FormatError{"[a(8@)]", "column 6: expected a priority: a number or a metric"},
         FormatError{"[a(8@-1)]", "column 6: expected a priority: a number or a metric"},
         FormatError{"[a(8@0)]", "column 6: expected a priority from 1 to 1000"},
+        FormatError{"H:[a]-5.-[b]", "column 8: expected '-'"},
+        FormatError{"[a(.)]", "column 4: expected a number, a metric or a view's name"},
         FormatError{"[a(8@1000.5)]", "column 6: expected a priority from 1 to 1000"},
         FormatError{"[a(8@zero)]", "column 6: expected a priority from 1 to 1000"},
         FormatError{"[a(8@b)]", "column 6: no metric is named 'b'"},

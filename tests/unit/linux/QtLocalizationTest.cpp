@@ -17,6 +17,7 @@
 #include <unicode/plurrule.h>
 #include <unicode/strenum.h>
 
+#include "platform/base/Bundle.h"
 #include "platform/base/Format.h"
 #include "platform/base/PluralText.h"
 
@@ -122,7 +123,7 @@ class QtLocalizationTest : public ::testing::TestWithParam<const char*> {
 class ProjectsTexts : public QtLocalization {
   public:
     explicit ProjectsTexts(const std::string& language) : QtLocalization(language) {
-        EXPECT_TRUE(addBundle(kSnippetsBundle, kCompiled, "snippets"));
+        EXPECT_TRUE(addBundle(platform::kSnippetsBundle, kCompiled, "snippets"));
         EXPECT_TRUE(addBundle(kHostBundle, kCompiled, "host"));
     }
 };
@@ -201,7 +202,7 @@ TEST(QtLocalizationTextsTest, TheBuiltInLabels_StandInBothTables) {
     for (const char* language : kLanguages) {
         const ProjectsTexts texts(language);
         for (const char* label : {"_$!<home>!$_", "_$!<work>!$_", "_$!<school>!$_", "_$!<gym>!$_", "_$!<other>!$_"}) {
-            const auto shown = texts.text(label, QtLocalization::kSnippetsBundle);
+            const auto shown = texts.text(label, platform::kSnippetsBundle);
             EXPECT_NE(shown, label) << language;
             EXPECT_EQ(texts.text(label, QtLocalization::kHostBundle, std::nullopt, ""), shown) << language;
         }
@@ -211,7 +212,7 @@ TEST(QtLocalizationTextsTest, TheBuiltInLabels_StandInBothTables) {
 TEST(QtLocalizationTextsTest, TheWordsReadAsTheyShould) {
     const ProjectsTexts english("en-GB");
     const auto filled = [&](const char* key, platform::FormatArguments arguments) {
-        return platform::formatted(english.text(key, QtLocalization::kSnippetsBundle), arguments);
+        return platform::formatted(english.text(key, platform::kSnippetsBundle), arguments);
     };
     EXPECT_EQ(filled("APPLICATION_NAME", {}), "Friends");
     EXPECT_EQ(filled("CITY_STATE_LABEL", {"Brinmouth", "HB"}), "Brinmouth, HB");
@@ -219,18 +220,17 @@ TEST(QtLocalizationTextsTest, TheWordsReadAsTheyShould) {
     EXPECT_EQ(filled("LOCATED_LESS_THAN_30SECONDS", {"30"}), "Over 30\u00a0s ago");
     EXPECT_EQ(filled("ARRIVING_LABEL", {"Work"}), "You’ll hear when they reach Work");
     const ProjectsTexts arabic("ar-EG");
-    EXPECT_EQ(platform::formatted(arabic.text("CITY_STATE_LABEL", QtLocalization::kSnippetsBundle), {"برينماوث", "HB"}),
+    EXPECT_EQ(platform::formatted(arabic.text("CITY_STATE_LABEL", platform::kSnippetsBundle), {"برينماوث", "HB"}),
               "برينماوث، HB");
     const ProjectsTexts japanese("ja");
-    EXPECT_EQ(
-        platform::formatted(japanese.text("CITY_STATE_LABEL", QtLocalization::kSnippetsBundle), {"Brinmouth", "HB"}),
-        "HB Brinmouth");
+    EXPECT_EQ(platform::formatted(japanese.text("CITY_STATE_LABEL", platform::kSnippetsBundle), {"Brinmouth", "HB"}),
+              "HB Brinmouth");
 }
 
 TEST(QtLocalizationTextsTest, ALanguageWithoutTexts_ReadsEnglish) {
     for (const char* language : {"nb-NO", "", "en-AU", "en_US", "no such language", "cs", "sr-Latn"}) {
         const ProjectsTexts texts(language);
-        EXPECT_EQ(texts.text("APPLICATION_NAME", QtLocalization::kSnippetsBundle), "Friends") << language;
+        EXPECT_EQ(texts.text("APPLICATION_NAME", platform::kSnippetsBundle), "Friends") << language;
         EXPECT_EQ(texts.languageOfTexts(), "en") << language;
     }
 }
@@ -260,7 +260,7 @@ TEST(QtLocalizationTextsTest, ARegionOrAScript_FindsTheLanguagesTexts) {
 }
 
 TEST(QtLocalizationTextsTest, PosixNames_AreRead) {
-    EXPECT_EQ(ProjectsTexts("de_AT").text("APPLICATION_NAME", QtLocalization::kSnippetsBundle), "Freunde");
+    EXPECT_EQ(ProjectsTexts("de_AT").text("APPLICATION_NAME", platform::kSnippetsBundle), "Freunde");
 }
 
 TEST(QtLocalizationTextsTest, AFolderWithoutTexts_IsNoBundle) {

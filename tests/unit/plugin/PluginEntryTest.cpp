@@ -89,11 +89,19 @@ TEST_F(PluginEntryTest, Destroy_EndsThePrincipalObject) {
 
 TEST_F(PluginEntryTest, Destroy_OfNoneOrTwice_IsIgnored) {
     SnippetControllerFactory* factory = create_(platform.get());
+    SnippetControllerFactory* other = create_(platform.get());
+    const std::weak_ptr<Object> principal = other->weak_from_this();
     destroy_(nullptr);
     destroy_(factory);
     destroy_(factory);
+    // The other principal object is as it was: alive, and of use.
+    ASSERT_FALSE(principal.expired());
+    EXPECT_NE(other->viewControllerForSnippet(proximitySnippet({})), nullptr);
+    EXPECT_NE(create_(platform.get()), nullptr);
     Platform::install(nullptr);
+    EXPECT_TRUE(principal.expired());
     destroy_(factory);
+    destroy_(other);
 }
 
 TEST_F(PluginEntryTest, EachCreate_MakesAPrincipalObjectOfItsOwn) {

@@ -1,6 +1,7 @@
 #include "service/KTRBaseCmd.h"
 
 #include <algorithm>
+#include <thread>
 
 #include "platform/base/Json.h"
 #include "platform/client/KTServerInteractionController.h"
@@ -100,6 +101,18 @@ TEST_F(KTRBaseCmdTest, ClientContext_IsReadAndLoggedOnce) {
     EXPECT_EQ(KTRBaseCmd::staticClientContext(), context);
     make()->jsonBodyDictionary();
     EXPECT_EQ(lines(), 1);
+}
+
+TEST_F(KTRBaseCmdTest, ClientContext_OfACommandsBodyOnAnotherThread_IsTheOneOfTheMainThread) {
+    const auto command = make();
+    std::shared_ptr<const Dictionary> context;
+    std::string body;
+    std::thread([&] {
+        context = KTRBaseCmd::staticClientContext();
+        body = platform::writeJson(command->jsonBodyDictionary());
+    }).join();
+    EXPECT_EQ(context, KTRBaseCmd::staticClientContext());
+    EXPECT_NE(body.find("device-1"), std::string::npos);
 }
 
 TEST_F(KTRBaseCmdTest, ClientContext_BelongsToThePlatform) {
