@@ -89,8 +89,11 @@ ShapeRecipe LineBreaker::recipe(qsizetype from, qsizetype to, const QString& tai
     made.text = text_.text.mid(from, to - from) + tail;
     made.wrap = wrap;
     made.wrapAnywhere = wrap && hasEndlessWord(made.text);
-    made.direction = text_.isRightToLeft(from, to, container_.rightToLeft) ? Qt::RightToLeft : Qt::LeftToRight;
     const auto& first = text_.runAt(from);
+    const bool isNatural = first.paragraph.writingDirection == platform::WritingDirection::Natural;
+    const bool isRightToLeft = isNatural ? text_.isRightToLeft(from, to, container_.rightToLeft)
+                                         : first.paragraph.writingDirection == platform::WritingDirection::RightToLeft;
+    made.direction = isRightToLeft ? Qt::RightToLeft : Qt::LeftToRight;
     made.font = FontChoice::spec(first.font, pixelSize(first.font), FontChoice::baseFamily());
     // Each run is set in the families of its scripts; what the layout's own font sets needs no range.
     auto stretch = std::partition_point(stretches_.begin(), stretches_.end(),
@@ -153,6 +156,8 @@ BrokenText::Piece LineBreaker::piece(Shaped shaped, qsizetype from, int lines) c
 }
 
 LineBreaker::Metrics LineBreaker::metricsOf(qsizetype from, qsizetype to) const {
+    // The empty line behind a line end is the last run's.
+    from = std::min(from, text_.text.size() - 1);
     Metrics metrics;
     for (const auto& run : text_.runs) {
         const bool touches = run.start < std::max(to, from + 1) && run.start + run.length > from;
@@ -226,6 +231,20 @@ std::pair<double, double> LineBreaker::overhang(const QTextLine& line, const Met
     return {std::ceil(above - kFit), std::ceil(below - kFit)};
 }
 
+bool LineBreaker::breaksAWordThatFits(QTextLine& line, const Span& span) const {
+    const qsizetype end = line.textStart() + line.textLength();
+    QTextBoundaryFinder words(QTextBoundaryFinder::Line, text_.text);
+    words.setPosition(end);
+    if (end >= text_.text.size() || words.isAtBoundary()) {
+        return false;
+    }
+    const qsizetype next = words.toNextBoundary();
+    line.setLineWidth((width_ - 2.0 * container_.lineFragmentPadding + kFit) / scale_);
+    const bool fits = line.textStart() + line.textLength() >= (next < 0 ? text_.text.size() : next);
+    line.setLineWidth((span.width + kFit) / scale_);
+    return fits;
+}
+
 void LineBreaker::placeLine(QTextLine& line, double& y, bool grow, Placed& placed) const {
     Metrics metrics = metricsOf(line.textStart(), line.textStart() + 1);
     // Each round either keeps the line or moves it below an exclusion or makes it higher, so that few are needed.
@@ -234,7 +253,7 @@ void LineBreaker::placeLine(QTextLine& line, double& y, bool grow, Placed& place
         line.setLineWidth((span.width + kFit) / scale_);
         const double width = line.naturalTextWidth() * scale_;
         placed = {span, width, y, metrics, line.textStart(), line.textLength()};
-        if (width > span.width + kFit && span.below) {
+        if (span.below && (width > span.width + kFit || breaksAWordThatFits(line, span))) {
             y = *span.below;
             continue;
         }

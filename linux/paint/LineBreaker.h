@@ -78,6 +78,8 @@ class LineBreaker {
     QString ellipsisAfter(qsizetype from, qsizetype end) const;
 
     Span spanAt(double y, double height) const;
+    /// The line, set in this span, ends within a word that a line without exclusions would hold.
+    bool breaksAWordThatFits(QTextLine& line, const Span& span) const;
     Metrics metricsOf(qsizetype from, qsizetype to) const;
     /// What the glyphs of a line need beyond its box, above and below, in whole points.
     std::pair<double, double> overhang(const QTextLine& line, const Metrics& metrics) const;

@@ -20,6 +20,8 @@ bool isIsolateStart(char16_t c) {
 constexpr char16_t kPopEmbedding = 0x202C;
 constexpr char16_t kPopIsolate = 0x2069;
 
+constexpr char16_t kFirstStrongIsolate = 0x2068;
+
 bool isLineEnd(char16_t c) {
     return c == u'\n' || c == u'\r' || c == 0x0B || c == 0x0C || c == 0x85 || c == 0x2028 || c == 0x2029;
 }
@@ -50,6 +52,11 @@ QString closers(const QString& text) {
     return open;
 }
 
+/// Whether anything but blanks and line ends stands in the text.
+bool hasWords(const QString& text) {
+    return std::any_of(text.begin(), text.end(), [](QChar c) { return !c.isSpace(); });
+}
+
 QString cleaned(const std::string& utf8) {
     QString text = QString::fromStdString(platform::sanitizedUtf8(utf8));
     text.replace(QStringLiteral("\r\n"), QStringLiteral("\n"));
@@ -68,14 +75,20 @@ QString cleaned(const std::string& utf8) {
 
 }  // namespace
 
-PreparedText::PreparedText(const platform::AttributedString& source) {
+PreparedText::PreparedText(const platform::AttributedString& source, Options options) {
     for (const auto& run : source.runs()) {
         QString piece = JapanesePhrases::joined(cleaned(run.text));
+        if (!options.keepsSoftHyphens) {
+            piece.remove(QChar(QChar::SoftHyphen));
+        }
         piece.append(closers(piece));
+        if (run.paragraph.writingDirection != platform::WritingDirection::Natural && hasWords(piece)) {
+            piece = QChar(kFirstStrongIsolate) + piece + QChar(kPopIsolate);
+        }
         runs.push_back({text.size(), piece.size(), run.font, run.color, run.paragraph});
         text.append(piece);
     }
-    while (text.endsWith(QChar(QChar::LineSeparator))) {
+    while (!options.keepsLineEnds && text.endsWith(QChar(QChar::LineSeparator))) {
         text.chop(1);
     }
     while (!runs.empty() && runs.back().start >= text.size()) {

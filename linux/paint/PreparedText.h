@@ -3,14 +3,15 @@
 #include <QString>
 #include <vector>
 
+#include "platform/text/TextEngine.h"
 #include "platform/ui/AttributedString.h"
 
 namespace ktr::linux_ {
 
 /// An attributed text as the shaper takes it: UTF-16, without anything that could harm the line. Malformed UTF-8,
-/// control characters and object marks are shown as U+FFFD, a tab as a space, every kind of line end is U+2028; line
-/// ends at the very end are dropped. Bidirectional controls that a run leaves open are closed at its end, so that a
-/// name cannot turn round what stands beside it. A value.
+/// control characters and object marks are shown as U+FFFD, a tab as a space, every kind of line end is U+2028.
+/// Bidirectional controls that a run leaves open are closed at its end, so that a name cannot turn round what stands
+/// beside it; where the direction is given, each run with words in it is an isolate. A value.
 struct PreparedText {
     struct Run {
         qsizetype start = 0;
@@ -20,7 +21,17 @@ struct PreparedText {
         platform::ParagraphStyle paragraph;
     };
 
-    explicit PreparedText(const platform::AttributedString& source);
+    /// What the container's limits change: without one on the lines, line ends at the very end count; without
+    /// hyphenation soft hyphens are left out.
+    struct Options {
+        bool keepsLineEnds = false;
+        bool keepsSoftHyphens = true;
+        static Options of(const platform::TextContainer& container) {
+            return {container.maximumLines <= 0, container.hyphenationFactor > 0.0};
+        }
+    };
+
+    PreparedText(const platform::AttributedString& source, Options options);
 
     /// The run that a position belongs to; the last one at the text's end. The text must not be empty.
     const Run& runAt(qsizetype position) const;

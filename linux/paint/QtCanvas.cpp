@@ -1,5 +1,6 @@
 #include "linux/paint/QtCanvas.h"
 
+#include <QPaintEngine>
 #include <QPainter>
 #include <QPainterPath>
 #include <QPen>
@@ -8,6 +9,7 @@
 #include <cmath>
 
 #include "linux/paint/QtImage.h"
+#include "linux/paint/QtTextImage.h"
 #include "linux/paint/QtTextLayout.h"
 
 namespace ktr::linux_ {
@@ -146,7 +148,23 @@ void QtCanvas::drawHalo(const platform::TextLayout& text, platform::Point origin
     painter_.strokePath(layout->outline().translated(onBaseline(*layout, origin)), pen);
 }
 
+/// At its own size, whatever the rectangle's: texts are not stretched.
+void QtCanvas::drawText(const platform::TextImage& image, const platform::Rect& rect) {
+    const QRectF place = snapped(rect);
+    const auto* engine = painter_.paintEngine();
+    const bool isRaster = engine == nullptr || engine->type() == QPaintEngine::Raster;
+    const auto* text = dynamic_cast<const QtTextImage*>(&image);
+    if (isRaster && text != nullptr && text->drawPixels(painter_, place.topLeft(), grid().scaleY, palette_)) {
+        return;
+    }
+    draw(image.layout(), {place.x(), place.y()}, platform::Color::ofRole(platform::ColorRole::StandardText));
+}
+
 void QtCanvas::draw(const platform::Image& image, const platform::Rect& rect) {
+    if (const auto* text = dynamic_cast<const platform::TextImage*>(&image)) {
+        drawText(*text, rect);
+        return;
+    }
     if (const auto* picture = dynamic_cast<const QtImage*>(&image); picture != nullptr && rect.width > 0.0) {
         picture->draw(painter_, snapped(rect), palette_);
     }

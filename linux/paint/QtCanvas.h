@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "linux/paint/Palette.h"
+#include "platform/text/TextImage.h"
 #include "platform/ui/Canvas.h"
 
 class QPainter;
@@ -53,6 +54,7 @@ class QtCanvas final : public platform::Canvas {
         double dy = 0.0;
     };
     Grid grid() const;
+    void drawText(const platform::TextImage& image, const platform::Rect& rect);
     /// A text's origin, moved so that its first baseline stands on a whole pixel.
     QPointF onBaseline(const QtTextLayout& text, platform::Point origin) const;
     void savePainter();

@@ -38,6 +38,12 @@ TextContainer natural(TextContainer container) {
     return container;
 }
 
+/// Whether the text's last character may be a line end: any but the first of these is the last byte of others too.
+bool endsInALineEnd(const platform::AttributedString& text) {
+    const auto last = text.empty() ? 0 : static_cast<unsigned char>(text.runs().back().text.back());
+    return (last >= 0x0A && last <= 0x0D) || last == 0x85 || last == 0xA8 || last == 0xA9;
+}
+
 /// Where a line that fits begins, aligned.
 double alignedX(const platform::AttributedString& text, const TextContainer& container, double used) {
     TextAlignment alignment = text.runs().front().paragraph.alignment;
@@ -75,6 +81,11 @@ std::shared_ptr<const platform::TextLayout> QtTextEngine::layOut(const platform:
         return layOutOnce(text, natural(container));
     }
     return layOutOnce(text, container);
+}
+
+std::shared_ptr<platform::TextImage> QtTextEngine::image(std::shared_ptr<const platform::TextLayout> layout,
+                                                         const platform::Size& size, double scale) {
+    return std::make_shared<QtTextImage>(std::move(layout), size, scale, lastPalette_);
 }
 
 QtTextEngine::Entries::iterator QtTextEngine::entry(std::size_t hash, const TextKey& key) {
@@ -134,7 +145,10 @@ std::shared_ptr<const QtTextLayout> QtTextEngine::layOutOnce(const platform::Att
 std::shared_ptr<const QtTextLayout> QtTextEngine::aligned(const platform::AttributedString& text,
                                                           const TextContainer& container) {
     const TextContainer one = natural(container);
-    if (one == container || !container.exclusionPaths.empty() || costOf(text) >= kShortText || text.empty()) {
+    // A line end at the end of an unlimited text is a line of its own.
+    const bool mayEndInALine = container.maximumLines <= 0 && endsInALineEnd(text);
+    if (one == container || !container.exclusionPaths.empty() || costOf(text) >= kShortText || text.empty() ||
+        mayEndInALine) {
         return nullptr;
     }
     const auto measured = layOutOnce(text, one);
@@ -157,7 +171,7 @@ std::shared_ptr<const QtTextLayout> QtTextEngine::shape(const TextKey& key, cons
         ++shaped_;
         fonts = fonts_;
     }
-    const PreparedText prepared(text);
+    const PreparedText prepared(text, PreparedText::Options::of(container));
     if (prepared.runs.empty()) {
         return std::make_shared<QtTextLayout>(nullptr, 0.0, std::vector<platform::TextLayout::Line>(), 0.0, false);
     }

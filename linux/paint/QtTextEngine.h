@@ -7,6 +7,7 @@
 #include <unordered_map>
 
 #include "linux/paint/FontChoice.h"
+#include "linux/paint/QtTextImage.h"
 #include "linux/paint/QtTextLayout.h"
 #include "linux/paint/TextKey.h"
 #include "platform/text/TextEngine.h"
@@ -14,7 +15,7 @@
 namespace ktr::linux_ {
 
 /// Shapes text with Qt. See platform::TextEngine. Notes beyond it:
-/// - A paragraph's direction is its first strong character's, the interface's without one.
+/// - A text's direction is its first strong character's, the interface's without one, unless its style says it.
 /// - With a limit of lines only as much text is shaped as can fit, however long it is. No line is measured wider than
 ///   32,000 points: a longer one counts as cut.
 /// - Words are hyphenated at soft hyphens alone: a hyphenation factor above 0 has no dictionary to use.
@@ -27,6 +28,9 @@ class QtTextEngine final : public platform::TextEngine {
 
     std::shared_ptr<const platform::TextLayout> layOut(const platform::AttributedString& text,
                                                        const platform::TextContainer& container) override;
+    /// Of what this engine laid out, in the colours that text images were painted in last.
+    std::shared_ptr<platform::TextImage> image(std::shared_ptr<const platform::TextLayout> layout,
+                                               const platform::Size& size, double scale) override;
     /// Drops what was kept: fonts depend on the language.
     void setLanguage(const QString& language);
     /// How many texts were shaped: what is asked for again is not.
@@ -52,6 +56,8 @@ class QtTextEngine final : public platform::TextEngine {
     std::shared_ptr<const QtTextLayout> find(std::size_t hash, const TextKey& key);
     void keep(Entry entry);
 
+    std::shared_ptr<QtTextImage::LastPalette> lastPalette_ =
+        std::make_shared<QtTextImage::LastPalette>(&Palette::of(ColorScheme::Light));
     mutable std::mutex mutex_;
     FontChoice fonts_;
     /// Most recently used first.

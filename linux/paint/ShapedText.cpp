@@ -136,8 +136,8 @@ ShapedText::Glyphs ShapedText::glyphsOf(const BrokenText& broken) {
 }
 
 BrokenText ShapedText::shapedAgain() const {
-    const PreparedText prepared(key_.text());
     const platform::TextContainer container = key_.container();
+    const PreparedText prepared(key_.text(), PreparedText::Options::of(container));
     return LineBreaker(prepared, container, fonts_).run();
 }
 

@@ -120,6 +120,7 @@ void putRun(Writer& writer, const AttributedString::Run& run) {
     if (isStyled) {
         writer.put(static_cast<unsigned char>(run.paragraph.alignment));
         writer.put(static_cast<unsigned char>(run.paragraph.lineBreakMode));
+        writer.put(static_cast<unsigned char>(run.paragraph.writingDirection));
     }
     writer.put(run.text);
 }
@@ -141,6 +142,7 @@ AttributedString::Run readRun(Reader& reader) {
     if ((flags & kStyled) != 0) {
         run.paragraph.alignment = static_cast<platform::TextAlignment>(reader.get<unsigned char>());
         run.paragraph.lineBreakMode = static_cast<platform::LineBreakMode>(reader.get<unsigned char>());
+        run.paragraph.writingDirection = static_cast<platform::WritingDirection>(reader.get<unsigned char>());
     }
     run.text = reader.getText();
     return run;

@@ -10,6 +10,8 @@
 
 namespace ktr::platform {
 
+class TextImage;
+
 /// Where text is laid out. Points.
 struct TextContainer {
     /// May be infinite: one line a paragraph, each beginning at the left edge whatever its alignment.
@@ -18,7 +20,7 @@ struct TextContainer {
     std::vector<Rect> exclusionPaths;
     /// Left free at either end of a line; part of the used size.
     double lineFragmentPadding = 0.0;
-    /// 0 never hyphenates.
+    /// 0 never hyphenates, not even at a soft hyphen. Above it a word may be hyphenated.
     double hyphenationFactor = 0.0;
     /// 0 is no limit. With a limit the last line ends in an ellipsis when the text goes on (tail truncation).
     int maximumLines = 0;
@@ -51,10 +53,16 @@ class KTR_API TextLayout {
 class KTR_API TextEngine {
   public:
     virtual ~TextEngine();
-    /// Never none. An empty text has no lines. Line boxes are as high as `Font::lineHeight` says; of several fonts in a
-    /// line the highest; a line of wrapped text may be higher when its glyphs need it. A width that falls short of what
-    /// was measured by less than 0.01 points still fits.
+    /// Never none. An empty text has no lines. A line end at the very end of a text without a limit of lines is
+    /// followed by an empty line, as high as the last run's font; with a limit it counts for nothing. A word that is
+    /// wider than the room beside an exclusion stands below it when it fits there, and else breaks between graphemes.
+    /// Line boxes are as high as `Font::lineHeight` says; of several fonts in a line the highest; a line of wrapped
+    /// text may be higher when its glyphs need it. A width that falls short of what was measured by less than 0.01
+    /// points still fits.
     virtual std::shared_ptr<const TextLayout> layOut(const AttributedString& text, const TextContainer& container) = 0;
+    /// A picture of a text that this engine laid out, of a size in points. An engine that rasters does so here, at
+    /// `scale` pixels a point, so that painting the picture at that scale costs little; the base keeps the text alone.
+    virtual std::shared_ptr<TextImage> image(std::shared_ptr<const TextLayout> layout, const Size& size, double scale);
 };
 
 }  // namespace ktr::platform

@@ -15,9 +15,14 @@ enum class TextAlignment { Natural, Left, Center, Right };
 /// Values as the platform's visual language counts them.
 enum class LineBreakMode { WordWrapping = 0, TruncatingTail = 4 };
 
+/// Which way a text is set. Natural: the direction of its first strong character, the interface's without one.
+enum class WritingDirection { Natural, LeftToRight, RightToLeft };
+
 struct ParagraphStyle {
     TextAlignment alignment = TextAlignment::Natural;
     LineBreakMode lineBreakMode = LineBreakMode::WordWrapping;
+    /// Other than Natural each run is set as an isolate: its words cannot turn round what stands beside it.
+    WritingDirection writingDirection = WritingDirection::Natural;
     bool operator==(const ParagraphStyle&) const = default;
 };
 

@@ -20,6 +20,13 @@ void ImageView::setImage(std::shared_ptr<Image> image) {
     setNeedsDisplay();
 }
 
+void ImageView::setContentMode(ContentMode mode) {
+    if (mode != contentMode_) {
+        contentMode_ = mode;
+        setNeedsDisplay();
+    }
+}
+
 IntrinsicSize ImageView::intrinsicContentSize(double /*widthLimit*/) const {
     if (!image_) {
         return {};
@@ -28,9 +35,16 @@ IntrinsicSize ImageView::intrinsicContentSize(double /*widthLimit*/) const {
 }
 
 void ImageView::draw(Canvas& canvas) const {
-    if (image_) {
-        canvas.draw(*image_, bounds());
+    if (!image_) {
+        return;
     }
+    if (contentMode_ == ContentMode::ScaleToFill) {
+        canvas.draw(*image_, bounds());
+        return;
+    }
+    const Size size = image_->size();
+    const double x = contentMode_ == ContentMode::TopRight ? bounds().width - size.width : 0.0;
+    canvas.draw(*image_, {x, 0.0, size.width, size.height});
 }
 
 }  // namespace ktr::platform

@@ -7,12 +7,17 @@
 
 namespace ktr::platform {
 
-/// Shows an image, scaled to fill the view. Its content's size is the image's. Takes no touches. Main thread.
+/// How an image fills its view: scaled, or at its own size in a corner.
+enum class ContentMode { ScaleToFill, TopLeft, TopRight };
+
+/// Shows an image. Its content's size is the image's. Takes no touches. Main thread.
 class KTR_API ImageView : public View {
   public:
     ImageView();
     std::shared_ptr<Image> image() const { return image_; }
     void setImage(std::shared_ptr<Image> image);
+    ContentMode contentMode() const { return contentMode_; }
+    void setContentMode(ContentMode mode);
     IntrinsicSize intrinsicContentSize(double widthLimit) const override;
 
   protected:
@@ -20,6 +25,7 @@ class KTR_API ImageView : public View {
 
   private:
     std::shared_ptr<Image> image_;
+    ContentMode contentMode_ = ContentMode::ScaleToFill;
 };
 
 }  // namespace ktr::platform

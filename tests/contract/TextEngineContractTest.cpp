@@ -1,5 +1,6 @@
 #include <gmock/gmock.h>
 
+#include "platform/text/TextImage.h"
 #include "tests/contract/TextEngineContract.h"
 #include "tests/support/FixedTextEngine.h"
 
@@ -136,6 +137,82 @@ TEST_P(TextEngineContract, LineFeed_BeginsALine) {
     const auto layout = layOut("a\nb", wrapped(300));
     ASSERT_EQ(layout->lines().size(), 2U);
     EXPECT_DOUBLE_EQ(layout->usedSize().height, 2.0 * body().lineHeight());
+}
+
+TEST_P(TextEngineContract, LineEndAtTheEnd_IsAnEmptyLineOfItsFont) {
+    for (const std::string& end : std::vector<std::string>{"\n", "\r\n"}) {
+        if (end != "\n" && GetParam().name == "FixedTextEngine") {
+            continue;  // the double knows one kind of line end
+        }
+        const auto layout = layOut("Ann" + end, wrapped(300));
+        ASSERT_EQ(layout->lines().size(), 2U);
+        EXPECT_DOUBLE_EQ(layout->usedSize().height, 2.0 * body().lineHeight());
+        EXPECT_DOUBLE_EQ(layout->usedSize().width, naturalWidth("Ann"));
+        EXPECT_DOUBLE_EQ(layout->lines()[1].box.width, 0.0);
+    }
+    EXPECT_DOUBLE_EQ(layOut("\n", wrapped(300))->usedSize().height, 2.0 * body().lineHeight());
+    EXPECT_DOUBLE_EQ(layOut("Ann\n\n", wrapped(300))->usedSize().height, 3.0 * body().lineHeight());
+    AttributedString text("Ann", body());
+    text.append({"\n", headline(), std::nullopt, {}});
+    EXPECT_DOUBLE_EQ(engine_->layOut(text, wrapped(300))->lines().at(1).box.height, headline().lineHeight());
+    EXPECT_FALSE(layOut("Ann\n", oneLine(300))->isTruncated());
+    EXPECT_EQ(layOut("Ann\n", oneLine(300))->lines().size(), 1U);
+}
+
+TEST_P(TextEngineContract, SoftHyphen_BreaksAWordWhereThereIsHyphenationOnly) {
+    const std::string text = "Ann au\u00ADto";
+    auto container = wrapped(naturalWidth("Ann au-") + 0.5);
+    const auto whole = layOut(text, container);
+    ASSERT_EQ(whole->lines().size(), 2U);
+    EXPECT_NEAR(whole->lines()[0].box.width, naturalWidth("Ann"), 0.1);
+    EXPECT_NEAR(whole->lines()[1].box.width, naturalWidth("auto"), 0.1);
+    container.hyphenationFactor = 1.0;
+    const auto hyphenated = layOut(text, container);
+    ASSERT_EQ(hyphenated->lines().size(), 2U);
+    EXPECT_NEAR(hyphenated->lines()[0].box.width, naturalWidth("Ann au-"), 0.6);
+}
+
+TEST_P(TextEngineContract, WordTooLongBesideAnExclusion_StandsBelowItWhenItFitsThere) {
+    const double size = body().size;
+    auto container = wrapped(12 * size);
+    container.exclusionPaths = {{0.0, 0.0, 9 * size, 30.0}};
+    const std::string word = "WWWWWWW";
+    ASSERT_GT(naturalWidth(word), 3 * size);
+    ASSERT_LT(naturalWidth(word), 12 * size);
+    const auto below = layOut(word, container);
+    ASSERT_EQ(below->lines().size(), 1U);
+    EXPECT_DOUBLE_EQ(below->lines()[0].box.y, 30.0);
+    EXPECT_DOUBLE_EQ(below->lines()[0].box.x, 0.0);
+    EXPECT_NEAR(below->lines()[0].box.width, naturalWidth(word), kFit);
+    // What no line holds breaks where it stands.
+    EXPECT_DOUBLE_EQ(layOut(std::string(40, 'W'), container)->lines()[0].box.y, 0.0);
+    // What fits beside stays there.
+    EXPECT_DOUBLE_EQ(layOut("W " + word, container)->lines()[0].box.x, 9 * size);
+    EXPECT_DOUBLE_EQ(layOut("W " + word, container)->lines()[1].box.y, 30.0);
+}
+
+TEST_P(TextEngineContract, WritingDirection_LeavesTheRoomOfATextAsItIs) {
+    for (const auto& name : kNames) {
+        for (const auto direction : {WritingDirection::LeftToRight, WritingDirection::RightToLeft}) {
+            AttributedString text;
+            const ParagraphStyle style = {TextAlignment::Left, LineBreakMode::WordWrapping, direction};
+            text.append({name, body(), std::nullopt, style});
+            text.append({"\n", body(), std::nullopt, style});
+            text.append({name, body(), std::nullopt, style});
+            const auto layout = engine_->layOut(text, wrapped(300));
+            ASSERT_EQ(layout->lines().size(), 2U) << name;
+            EXPECT_NEAR(layout->usedSize().width, naturalWidth(name), 0.1) << name;
+            EXPECT_DOUBLE_EQ(layout->lines()[0].box.x, 0.0) << name;
+        }
+    }
+}
+
+TEST_P(TextEngineContract, ImageOfALayout_IsOfTheSizeThatWasAsked) {
+    const std::shared_ptr<const TextLayout> layout = layOut(kSentence, wrapped(150));
+    const auto image = engine_->image(layout, {150.0, 200.0}, 2.0);
+    ASSERT_NE(image, nullptr);
+    EXPECT_EQ(image->size(), (Size{150.0, 200.0}));
+    EXPECT_EQ(&image->layout(), layout.get());
 }
 
 TEST_P(TextEngineContract, LimitOfLines_CutsWhatGoesOn) {

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <optional>
 
 #include "platform/base/Utf8.h"
 
@@ -30,14 +31,21 @@ class FixedLayout : public TextLayout {
     bool truncated = false;
 };
 
-std::vector<Glyph> glyphsOf(const AttributedString& text) {
+constexpr char32_t kSoftHyphen = 0xAD;
+
+std::vector<Glyph> glyphsOf(const AttributedString& text, const TextContainer& container) {
     std::vector<Glyph> glyphs;
     for (const auto& run : text.runs()) {
         for (std::size_t at = 0; at < run.text.size();) {
             const Utf8Step step = decodeUtf8(run.text, at);
-            glyphs.push_back({step.codePoint, run.font, run.paragraph});
+            if (step.codePoint != kSoftHyphen || container.hyphenationFactor > 0.0) {
+                glyphs.push_back({step.codePoint, run.font, run.paragraph});
+            }
             at += step.length;
         }
+    }
+    while (container.maximumLines > 0 && !glyphs.empty() && glyphs.back().code == '\n') {
+        glyphs.pop_back();
     }
     return glyphs;
 }
@@ -46,11 +54,14 @@ std::vector<Glyph> glyphsOf(const AttributedString& text) {
 struct Stretch {
     double x = 0.0;
     double width = 0.0;
+    /// Where the first of the exclusions ends; none without one.
+    std::optional<double> below;
 };
 
 Stretch stretchAt(const TextContainer& container, double y, double height) {
     double left = 0.0;
     double right = container.width;
+    std::optional<double> below;
     for (const Rect& hole : container.exclusionPaths) {
         if (hole.y >= y + height || hole.maxY() <= y) {
             continue;
@@ -60,16 +71,17 @@ Stretch stretchAt(const TextContainer& container, double y, double height) {
         } else {
             right = std::min(right, hole.x);
         }
+        below = std::min(below.value_or(hole.maxY()), hole.maxY());
     }
     left += container.lineFragmentPadding;
     right -= container.lineFragmentPadding;
-    return {left, std::max(0.0, right - left)};
+    return {left, std::max(0.0, right - left), below};
 }
 
 double widthOf(const std::vector<Glyph>& glyphs, std::size_t begin, std::size_t end) {
     double width = 0.0;
     for (std::size_t i = begin; i < end; ++i) {
-        width += glyphs[i].font.size;
+        width += glyphs[i].code == kSoftHyphen ? 0.0 : glyphs[i].font.size;
     }
     return width;
 }
@@ -78,27 +90,43 @@ double widthOf(const std::vector<Glyph>& glyphs, std::size_t begin, std::size_t 
 struct Break {
     std::size_t end = 0;
     std::size_t next = 0;
+    bool hyphenated = false;
+    /// Within a word, for want of room.
+    bool forced = false;
 };
 
 Break breakAt(const std::vector<Glyph>& glyphs, std::size_t begin, double room) {
     double width = 0.0;
     std::size_t lastBlank = begin;
+    std::size_t lastHyphen = begin;
     for (std::size_t i = begin; i < glyphs.size(); ++i) {
         if (glyphs[i].code == '\n') {
-            return {i, i + 1};
+            return {i, i + 1, false, false};
+        }
+        if (glyphs[i].code == kSoftHyphen) {
+            lastHyphen = width + glyphs[i].font.size <= room + kFit ? i : lastHyphen;
+            continue;
         }
         if (glyphs[i].code == ' ') {
             lastBlank = i;
         }
         width += glyphs[i].font.size;
         if (width > room + kFit && glyphs[i].code != ' ') {
-            if (lastBlank > begin) {
-                return {lastBlank, lastBlank + 1};
+            if (lastHyphen > std::max(begin, lastBlank)) {
+                return {lastHyphen, lastHyphen + 1, true, false};
             }
-            return {std::max(i, begin + 1), std::max(i, begin + 1)};
+            if (lastBlank > begin) {
+                return {lastBlank, lastBlank + 1, false, false};
+            }
+            return {std::max(i, begin + 1), std::max(i, begin + 1), false, true};
         }
     }
-    return {glyphs.size(), glyphs.size()};
+    return {glyphs.size(), glyphs.size(), false, false};
+}
+
+/// Whether the word that begins here would be whole on a line without exclusions.
+bool fitsFullLine(const std::vector<Glyph>& glyphs, std::size_t begin, const TextContainer& container) {
+    return !breakAt(glyphs, begin, container.width - 2.0 * container.lineFragmentPadding).forced;
 }
 
 double alignedX(const TextContainer& container, const Glyph& glyph, const Stretch& stretch, double width) {
@@ -122,7 +150,7 @@ std::shared_ptr<const TextLayout> FixedTextEngine::layOut(const AttributedString
                                                           const TextContainer& container) {
     ++count_;
     auto layout = std::make_shared<FixedLayout>();
-    const auto glyphs = glyphsOf(text);
+    const auto glyphs = glyphsOf(text, container);
     double y = 0.0;
     for (std::size_t begin = 0; begin < glyphs.size();) {
         const Font& font = glyphs[begin].font;
@@ -131,7 +159,11 @@ std::shared_ptr<const TextLayout> FixedTextEngine::layOut(const AttributedString
             container.maximumLines > 0 && static_cast<int>(layout->placed.size()) + 1 == container.maximumLines;
         const bool oneLine = last && container.lineBreakMode == LineBreakMode::TruncatingTail;
         Break line = breakAt(glyphs, begin, oneLine ? 1e300 : stretch.width);
-        double width = widthOf(glyphs, begin, line.end);
+        if (line.forced && stretch.below && fitsFullLine(glyphs, begin, container)) {
+            y = *stretch.below;
+            continue;
+        }
+        double width = widthOf(glyphs, begin, line.end) + (line.hyphenated ? font.size : 0.0);
         if (oneLine && (width > stretch.width + kFit || line.next < glyphs.size())) {
             layout->truncated = true;
             const double ellipsis = font.size;
@@ -153,6 +185,13 @@ std::shared_ptr<const TextLayout> FixedTextEngine::layOut(const AttributedString
             break;
         }
         begin = line.next;
+    }
+    if (container.maximumLines <= 0 && !glyphs.empty() && glyphs.back().code == '\n') {
+        const Glyph& end = glyphs.back();
+        const Stretch stretch = stretchAt(container, y, end.font.lineHeight());
+        layout->placed.push_back(
+            {{alignedX(container, end, stretch, 0.0), y, 0.0, end.font.lineHeight()}, y + end.font.ascent()});
+        y += end.font.lineHeight();
     }
     double left = 1e300;
     double right = 0.0;

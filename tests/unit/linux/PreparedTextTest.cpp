@@ -10,7 +10,7 @@ using platform::Font;
 namespace {
 
 QString prepared(const std::string& text) {
-    return PreparedText(AttributedString(text, Font())).text;
+    return PreparedText(AttributedString(text, Font()), {}).text;
 }
 
 }  // namespace
@@ -33,7 +33,27 @@ TEST(PreparedTextTest, JapanesePhrases_AreHeldTogether) {
 
 TEST(PreparedTextTest, LineEndsAtTheEnd_AreDropped) {
     EXPECT_EQ(prepared("a\n\n"), QStringLiteral("a"));
-    EXPECT_TRUE(PreparedText(AttributedString("\n", Font())).runs.empty());
+    EXPECT_TRUE(PreparedText(AttributedString("\n", Font()), {}).runs.empty());
+}
+
+TEST(PreparedTextTest, LineEndsAtTheEndOfAnUnlimitedText_AreKept) {
+    const QChar end(QChar::LineSeparator);
+    EXPECT_EQ(PreparedText(AttributedString("a\n\n", Font()), {true, true}).text, QStringLiteral("a") + end + end);
+}
+
+TEST(PreparedTextTest, SoftHyphens_AreLeftOutWithoutHyphenation) {
+    EXPECT_EQ(prepared("a\u00ADb"), QStringLiteral("a\u00ADb"));
+    EXPECT_EQ(PreparedText(AttributedString("a\u00ADb", Font()), {false, false}).text, QStringLiteral("ab"));
+}
+
+TEST(PreparedTextTest, RunsOfAGivenDirection_AreIsolatesWhereTheyHaveWords) {
+    AttributedString text;
+    const platform::ParagraphStyle style = {platform::TextAlignment::Left, platform::LineBreakMode::WordWrapping,
+                                            platform::WritingDirection::LeftToRight};
+    text.append({"a", Font(), std::nullopt, style});
+    text.append({"\n", Font(), std::nullopt, style});
+    text.append({" b", Font(), std::nullopt, style});
+    EXPECT_EQ(PreparedText(text, {}).text, QStringLiteral("\u2068a\u2069\u2028\u2068 b\u2069"));
 }
 
 TEST(PreparedTextTest, Controls_AreShownAsReplacements) {
@@ -59,7 +79,7 @@ TEST(PreparedTextTest, OpenDirectionalControls_AreClosedAtTheRunsEnd) {
 
 TEST(PreparedTextTest, Direction_IsTheFirstStrongCharactersOutsideIsolates) {
     const auto rightToLeft = [](const std::string& text, bool otherwise) {
-        const PreparedText prepared(AttributedString(text, Font()));
+        const PreparedText prepared(AttributedString(text, Font()), {});
         return prepared.isRightToLeft(0, prepared.text.size(), otherwise);
     };
     EXPECT_FALSE(rightToLeft("12 Ann ليلى", true));
@@ -76,7 +96,7 @@ TEST(PreparedTextTest, RunAt_FindsTheRun) {
     AttributedString text;
     text.append({"ab", Font{.size = 10}, std::nullopt, {}});
     text.append({"cd", Font{.size = 20}, std::nullopt, {}});
-    const PreparedText prepared(text);
+    const PreparedText prepared(text, {});
     EXPECT_EQ(prepared.runAt(0).font.size, 10);
     EXPECT_EQ(prepared.runAt(1).font.size, 10);
     EXPECT_EQ(prepared.runAt(2).font.size, 20);
