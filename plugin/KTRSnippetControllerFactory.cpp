@@ -2,8 +2,6 @@
 
 #include "model/LogCategory.h"
 #include "platform/assistant/VASnippet.h"
-#include "platform/base/Platform.h"
-#include "platform/ui/Device.h"
 #include "plugin/VAKTRGeoFenceSnippetController.h"
 #include "plugin/VAKTRLocationSnippetController.h"
 #include "plugin/VAKTRMultipleLocationsSnippetController.h"
@@ -14,12 +12,6 @@ namespace ktr {
 using platform::FormatArgument;
 
 namespace {
-
-bool accessibilitySizeIsActive() {
-    const auto installed = platform::Platform::installed();
-    return installed && installed->device &&
-           platform::isAccessibilityCategory(installed->device->contentSizeCategory());
-}
 
 template <class Controller>
 std::shared_ptr<platform::HostSnippetViewController> make(const std::shared_ptr<platform::VASnippet>& snippet) {
@@ -38,20 +30,16 @@ std::shared_ptr<platform::HostSnippetViewController> KTRSnippetControllerFactory
                                         FormatArgument("KTRSnippetControllerFactory").shown(), snippet);
         return nullptr;
     }
-    if (accessibilitySizeIsActive()) {
-        LogCategory_Unspecified()->line("There are no rows for accessibility text sizes yet; nothing is drawn for: %@",
-                                        snippet);
-        return nullptr;
+    // In this order: an object of two kinds is the first of them.
+    if (located) {
+        // The presence of a proximity counts, not its text.
+        return located->proximity ? make<VAKTRMultipleLocationsSnippetController>(located)
+                                  : make<VAKTRLocationSnippetController>(located);
     }
     if (visibility) {
         return make<VAKTRVisibilityController>(visibility);
     }
-    if (fenced) {
-        return make<VAKTRGeoFenceSnippetController>(fenced);
-    }
-    // The presence of a proximity counts, not its text.
-    return located->proximity ? make<VAKTRMultipleLocationsSnippetController>(located)
-                              : make<VAKTRLocationSnippetController>(located);
+    return make<VAKTRGeoFenceSnippetController>(fenced);
 }
 
 std::shared_ptr<platform::Object> KTRSnippetControllerFactory::speakableNamespaceProviderForCueObject(

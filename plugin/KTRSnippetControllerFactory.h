@@ -8,8 +8,7 @@ namespace ktr {
 class KTRSnippetControllerFactory : public platform::SnippetControllerFactory {
   public:
     /// The controller that draws the snippet, owned by the caller. None, and a line in the log, for an object of a kind
-    /// that the plugin does not draw, and while the user's text size is an accessibility size, for which there are no
-    /// rows yet.
+    /// that the plugin does not draw.
     std::shared_ptr<platform::HostSnippetViewController> viewControllerForSnippet(
         const std::shared_ptr<platform::AssistantObject>& snippet) override;
     /// Always none: the plugin has no texts for speaking about an object.

@@ -11,6 +11,7 @@
 #include "platform/map/MapLocationManager.h"
 #include "service/ContextValues.h"
 #include "service/KTRVAUtils.h"
+#include "views/accessibility/KTRAXVelaFriendView.h"
 
 namespace ktr {
 
@@ -172,6 +173,19 @@ void VAKTRBaseSnippetController::locationsUpdated(const std::shared_ptr<const Se
     setLocations(objects);
     reloadData();
     viewNeedsResize();
+}
+
+std::shared_ptr<KTRVelaFriendView> VAKTRBaseSnippetController::makeFriendRow(bool axSize) const {
+    using platform::create;
+    const platform::Rect frame{0.0, 0.0, currentWidth_, 0.0};
+    std::shared_ptr<KTRVelaFriendView> row;
+    if (axSize) {
+        row = create<KTRAXVelaFriendView>(&KTRAXVelaFriendView::initWithFrame, frame);
+    } else {
+        row = create<KTRVelaFriendView>(&KTRVelaFriendView::initWithFrame, frame);
+    }
+    row->setTranslatesAutoresizingMaskIntoConstraints(false);
+    return row;
 }
 
 void VAKTRBaseSnippetController::refreshCancelled() {

@@ -13,6 +13,7 @@
 #include "platform/ui/StackView.h"
 #include "service/RefreshController.h"
 #include "views/FriendViewDelegate.h"
+#include "views/KTRVelaFriendView.h"
 #include "views/ViewURLHandler.h"
 
 namespace ktr {
@@ -101,6 +102,11 @@ class VAKTRBaseSnippetController : public platform::HostSnippetViewController,
     /// Seconds that refreshing goes on.
     double timeoutInterval() const { return timeoutInterval_; }
     void setTimeoutInterval(double seconds) { timeoutInterval_ = seconds; }
+
+  protected:
+    /// A friend's row, the accessibility row when `axSize`, as wide as the controller and 0 high, placed by
+    /// constraints.
+    std::shared_ptr<KTRVelaFriendView> makeFriendRow(bool axSize) const;
 
   private:
     void startReloadTimer();

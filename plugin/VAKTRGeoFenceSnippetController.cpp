@@ -1,6 +1,7 @@
 #include "plugin/VAKTRGeoFenceSnippetController.h"
 
 #include "service/ContextValues.h"
+#include "views/accessibility/KTRAXVelaFenceView.h"
 
 namespace ktr {
 
@@ -35,7 +36,13 @@ bool VAKTRGeoFenceSnippetController::initWithCueObject(const std::shared_ptr<pla
 
 void VAKTRGeoFenceSnippetController::loadView() {
     VAKTRBaseSnippetController::loadView();
-    fenceView_ = create<KTRVelaFenceView>(&KTRVelaFenceView::initWithFrame, Rect{0.0, 0.0, currentWidth(), kRowHeight});
+    if (KTRVelaBaseView::accessibilitySizeIsActive()) {
+        fenceView_ =
+            create<KTRAXVelaFenceView>(&KTRAXVelaFenceView::initWithFrame, Rect{0.0, 0.0, currentWidth(), 0.0});
+    } else {
+        const Rect frame{0.0, 0.0, currentWidth(), kRowHeight};
+        fenceView_ = create<KTRVelaFenceView>(&KTRVelaFenceView::initWithFrame, frame);
+    }
     fenceView_->setViewDelegate(platform::weak(this));
     fenceView_->setUrlHandler(platform::weak(this));
     fenceView_->setCurrentLocationDelegate(refreshController());

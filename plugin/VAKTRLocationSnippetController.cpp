@@ -3,8 +3,6 @@
 #include <algorithm>
 #include <iterator>
 
-#include "platform/base/Platform.h"
-#include "platform/ui/Device.h"
 #include "service/ContextValues.h"
 #include "service/KTRVAUtils.h"
 
@@ -19,12 +17,6 @@ namespace {
 constexpr double kUsualZoom = 0.05f;
 /// Beside the map, while there is no row to measure; points.
 constexpr double kHeightOfNoRow = 90.0;
-
-bool accessibilitySizeIsActive() {
-    const auto installed = platform::Platform::installed();
-    return installed && installed->device &&
-           platform::isAccessibilityCategory(installed->device->contentSizeCategory());
-}
 
 bool hasCoordinate(const std::shared_ptr<KTRVALocation>& record) {
     return record->hasCoordinate();
@@ -47,8 +39,8 @@ bool VAKTRLocationSnippetController::initWithCueObject(const std::shared_ptr<pla
 
 void VAKTRLocationSnippetController::loadView() {
     VAKTRBaseSnippetController::loadView();
-    axSize_ = accessibilitySizeIsActive();
-    friendView_ = create<KTRVelaFriendView>(&KTRVelaFriendView::initWithFrame, Rect{0.0, 0.0, currentWidth(), 0.0});
+    axSize_ = KTRVelaBaseView::accessibilitySizeIsActive();
+    friendView_ = makeFriendRow(axSize_);
     friendView_->setViewDelegate(platform::weak(this));
     friendView_->setUrlHandler(platform::weak(this));
     friendView_->setCurrentLocationDelegate(refreshController());
@@ -61,7 +53,6 @@ void VAKTRLocationSnippetController::loadView() {
     mapView_->setLocation(disambiguatedLocation());
     mapView_->setZoomLevel(zoomLevel_);
 
-    friendView_->setTranslatesAutoresizingMaskIntoConstraints(false);
     mapView_->setTranslatesAutoresizingMaskIntoConstraints(false);
     containerView()->addArrangedSubview(friendView_);
     containerView()->addArrangedSubview(mapView_);

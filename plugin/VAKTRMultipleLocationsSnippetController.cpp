@@ -1,6 +1,7 @@
 #include "plugin/VAKTRMultipleLocationsSnippetController.h"
 
-#include <algorithm>
+#include <string>
+#include <unordered_map>
 #include <unordered_set>
 #include <utility>
 
@@ -22,16 +23,6 @@ constexpr double kHeightOfNothing = 90.0;
 /// No handle begins with a NUL character.
 std::string keyWithoutHandle(std::size_t ordinal) {
     return std::string(1, '\0') + std::to_string(ordinal);
-}
-
-/// What inserting row i at index i, one after the other, makes of an arrangement when a row comes twice: it moves to
-/// its later place, and what stood behind it moves up.
-Views insertedOneByOne(const Views& rows, Views arranged) {
-    for (std::size_t i = 0; i < rows.size(); ++i) {
-        std::erase(arranged, rows[i]);
-        arranged.insert(arranged.begin() + static_cast<std::ptrdiff_t>(std::min(i, arranged.size())), rows[i]);
-    }
-    return arranged;
 }
 
 }  // namespace
@@ -91,12 +82,10 @@ VAKTRBaseSnippetController::Locations VAKTRMultipleLocationsSnippetController::p
 }
 
 std::shared_ptr<KTRVelaFriendView> VAKTRMultipleLocationsSnippetController::makeFriendView() {
-    auto row =
-        create<KTRVelaFriendView>(&KTRVelaFriendView::initWithFrame, platform::Rect{0.0, 0.0, currentWidth(), 0.0});
+    auto row = makeFriendRow(KTRVelaBaseView::accessibilitySizeIsActive());
     row->setViewDelegate(platform::weak(this));
     row->setUrlHandler(platform::weak(this));
     row->setCurrentLocationDelegate(refreshController());
-    row->setTranslatesAutoresizingMaskIntoConstraints(false);
     return row;
 }
 
@@ -106,18 +95,29 @@ void VAKTRMultipleLocationsSnippetController::createFriendViews() {
         showMessage();
         return;
     }
-    FriendViews views;
-    views.reserve(known.size());
-    Views rows;
-    rows.reserve(known.size());
+    // A handle that comes again has one row, which stands, and is filled, at its last place: what the earlier places
+    // would show of it is never seen.
+    std::unordered_map<std::string, std::size_t> lastPlaces;
+    std::vector<std::string> keys;
+    keys.reserve(known.size());
     std::size_t withoutHandle = 0;
     for (std::size_t i = 0; i < known.size(); ++i) {
         const auto handle = known[i]->friendHandle();
-        const std::string key = handle ? *handle : keyWithoutHandle(withoutHandle++);
-        auto row = rowForKey(key, views);
+        keys.push_back(handle ? *handle : keyWithoutHandle(withoutHandle++));
+        lastPlaces[keys.back()] = i;
+    }
+    FriendViews views;
+    views.reserve(lastPlaces.size());
+    Views rows;
+    rows.reserve(lastPlaces.size());
+    for (std::size_t i = 0; i < known.size(); ++i) {
+        if (lastPlaces[keys[i]] != i) {
+            continue;
+        }
+        auto row = rowForKey(keys[i]);
         row->setLocation(known[i]);
         row->setSeparatorEnabled(i + 1 < known.size() || displayShowAllRow_);
-        views[key] = row;
+        views[keys[i]] = row;
         rows.push_back(std::move(row));
     }
     const FriendViews earlier = std::exchange(friendViews_, std::move(views));
@@ -125,7 +125,7 @@ void VAKTRMultipleLocationsSnippetController::createFriendViews() {
         singleLabelView_->setLabelText(AssistantLocalizedString("SHOW_ALL"));
         singleLabelView_->setIsShowAll(true);
     }
-    arrange(rows, earlier);
+    arrange(std::move(rows), earlier);
 }
 
 void VAKTRMultipleLocationsSnippetController::showMessage() {
@@ -139,46 +139,29 @@ void VAKTRMultipleLocationsSnippetController::showMessage() {
     containerView()->setArrangedSubviews({singleLabelView_});
 }
 
-std::shared_ptr<KTRVelaFriendView> VAKTRMultipleLocationsSnippetController::rowForKey(const std::string& key,
-                                                                                      const FriendViews& views) {
-    for (const FriendViews* rows : {static_cast<const FriendViews*>(&friendViews_), &views}) {
-        if (const auto found = rows->find(key); found != rows->end()) {
-            return found->second;
-        }
-    }
-    return makeFriendView();
+std::shared_ptr<KTRVelaFriendView> VAKTRMultipleLocationsSnippetController::rowForKey(const std::string& key) {
+    const auto found = friendViews_.find(key);
+    return found == friendViews_.end() ? makeFriendView() : found->second;
 }
 
-void VAKTRMultipleLocationsSnippetController::arrange(const Views& rows, const FriendViews& earlier) {
+void VAKTRMultipleLocationsSnippetController::arrange(Views rows, const FriendViews& earlier) {
     const auto container = containerView();
     if (!container) {
         return;
     }
-    const Views before = container->arrangedSubviews();
-    // As many handles as rows: the rows stand one after the other, whatever stood there before.
-    Views after = friendViews_.size() == rows.size() ? rows : insertedOneByOne(rows, before);
-    const std::size_t wanted = rows.size() + (displayShowAllRow_ ? 1 : 0);
-    if (displayShowAllRow_ && singleLabelView_) {
-        std::erase(after, singleLabelView_);
-        after.insert(after.begin() + static_cast<std::ptrdiff_t>(std::min(rows.size(), after.size())),
-                     singleLabelView_);
-    }
-    after.resize(std::min(after.size(), wanted));
-
-    // Rows whose friends are gone leave the tree, wherever they wait, and so does what is left over.
-    std::unordered_set<std::shared_ptr<View>> surplus;
-    const std::unordered_set<std::shared_ptr<View>> current(rows.begin(), rows.end());
+    // Rows whose friends are gone leave the tree, wherever they wait; so does whatever else stands in the arrangement.
+    std::unordered_set<std::shared_ptr<View>> surplus(container->arrangedSubviews().begin(),
+                                                      container->arrangedSubviews().end());
     for (const auto& [key, row] : earlier) {
-        if (!current.contains(row)) {
-            surplus.insert(row);
-        }
+        surplus.insert(row);
     }
-    std::erase_if(after, [&](const auto& view) { return surplus.contains(view); });
-    surplus.insert(before.begin(), before.end());
-    for (const auto& view : after) {
+    if (displayShowAllRow_ && singleLabelView_) {
+        rows.push_back(singleLabelView_);
+    }
+    for (const auto& view : rows) {
         surplus.erase(view);
     }
-    container->setArrangedSubviews(after);
+    container->setArrangedSubviews(rows);
     container->removeSubviews({surplus.begin(), surplus.end()});
 }
 

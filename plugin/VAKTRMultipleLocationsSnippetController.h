@@ -46,11 +46,12 @@ class VAKTRMultipleLocationsSnippetController : public VAKTRBaseSnippetControlle
     using Views = std::vector<std::shared_ptr<platform::View>>;
 
     std::shared_ptr<KTRVelaFriendView> makeFriendView();
-    /// The row of an earlier pass, or of this one, or a new one.
-    std::shared_ptr<KTRVelaFriendView> rowForKey(const std::string& key, const FriendViews& views);
+    /// The row of the earlier pass, or a new one.
+    std::shared_ptr<KTRVelaFriendView> rowForKey(const std::string& key);
     void showMessage();
-    /// Puts the rows into the container in one step: a row at a time would cost the square of their number.
-    void arrange(const Views& rows, const FriendViews& earlier);
+    /// Puts the rows, and a wanted label after them, into the container in one step: a row at a time would cost the
+    /// square of their number.
+    void arrange(Views rows, const FriendViews& earlier);
 
     bool displayShowAllRow_ = false;
     FriendViews friendViews_;

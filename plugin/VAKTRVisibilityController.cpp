@@ -53,11 +53,10 @@ void VAKTRVisibilityController::setDelegate(const std::shared_ptr<platform::Snip
 void VAKTRVisibilityController::loadView() {
     VAKTRBaseSnippetController::loadView();
     // No view delegate: whatever this row says of its size does not reach the host.
-    friendView_ = create<KTRVelaFriendView>(&KTRVelaFriendView::initWithFrame, Rect{0.0, 0.0, currentWidth(), 0.0});
+    friendView_ = makeFriendRow(KTRVelaBaseView::accessibilitySizeIsActive());
     friendView_->setIsVisibility(true);
     friendView_->setUrlHandler(platform::weak(this));
     friendView_->setCurrentLocationDelegate(refreshController());
-    friendView_->setTranslatesAutoresizingMaskIntoConstraints(false);
     friendView_->setLocation(myLocation_);
     containerView()->addArrangedSubview(friendView_);
     if (!isVisible_) {

@@ -2,16 +2,22 @@
 
 #include "model/LogCategory.h"
 #include "platform/assistant/AssistantSettings.h"
+#include "platform/base/MainLoop.h"
 #include "platform/base/Platform.h"
+#include "platform/layout/ConstraintRule.h"
 #include "platform/text/TextEngine.h"
 #include "platform/ui/Device.h"
 
 namespace ktr {
 
 using platform::Color;
+using platform::create;
+using platform::Label;
 using platform::Platform;
+using platform::Rect;
 using platform::Touches;
 using platform::TouchEvent;
+using platform::View;
 
 namespace {
 
@@ -19,6 +25,8 @@ constexpr double kTabletMapHeight = 389.0;
 constexpr double kMapHeight = 219.0;
 /// Heights of text depend on it: narrower than a text container's usual padding.
 constexpr double kLineFragmentPadding = 0.5;
+constexpr double kAvatarDelay = 0.1;  // seconds
+constexpr double kAvatarDiameter = 54.0;
 
 }  // namespace
 
@@ -26,10 +34,8 @@ bool KTRVelaBaseView::initWithFrame(const platform::Rect& frame) {
     if (!View::initWithFrame(frame)) {
         return false;
     }
+    axSize_ = accessibilitySizeIsActive();
     const auto installed = Platform::installed();
-    if (installed && installed->device) {
-        axSize_ = platform::isAccessibilityCategory(installed->device->contentSizeCategory());
-    }
     if (installed && installed->assistant) {
         isRTLUI_ = installed->assistant->languageIsRightToLeft();
     }
@@ -90,6 +96,80 @@ void KTRVelaBaseView::touchesEnded(const Touches& touches, const TouchEvent& eve
 void KTRVelaBaseView::touchesCancelled(const Touches& touches, const TouchEvent& event) {
     View::touchesCancelled(touches, event);
     setBackgroundColor(Color::clear());
+}
+
+void KTRVelaBaseView::setSeparatorEnabled(bool enabled) {
+    separatorEnabled_ = enabled;
+    if (separatorView_) {
+        separatorView_->setHidden(!enabled);
+    }
+}
+
+void KTRVelaBaseView::setupAvatar() {
+    using platform::LayoutAttribute;
+    const auto avatar = avatarViewController_->view();
+    avatar->setTranslatesAutoresizingMaskIntoConstraints(false);
+    friendIconView_ = create<View>(&View::initWithFrame, Rect{0.0, 0.0, kAvatarDiameter, kAvatarDiameter});
+    friendIconView_->setTranslatesAutoresizingMaskIntoConstraints(false);
+    friendIconView_->addSubview(avatar);
+    const platform::ViewReference image(*avatar);
+    const platform::ViewReference icon(*friendIconView_);
+    std::vector<platform::ConstraintRule> edges;
+    edges.reserve(4);
+    for (const auto edge :
+         {LayoutAttribute::Top, LayoutAttribute::Bottom, LayoutAttribute::Leading, LayoutAttribute::Trailing}) {
+        edges.push_back({image, icon, {edge, edge}});
+    }
+    friendIconView_->addRules(edges);
+    addSubview(friendIconView_);
+}
+
+void KTRVelaBaseView::setupSeparator() {
+    separatorView_ = create<View>(&View::initWithFrame, Rect{});
+    separatorView_->setLayerBackgroundColor(Color::rgb(151.0 / 255.0, 158.0 / 255.0, 149.0 / 255.0));
+    separatorView_->setTranslatesAutoresizingMaskIntoConstraints(false);
+    addSubview(separatorView_);
+}
+
+std::shared_ptr<Label> KTRVelaBaseView::makeLabel(platform::TextStyle style, const Color& color) {
+    auto label = create<Label>(&Label::initWithFrame, Rect{});
+    label->setFont(platform::preferredFont(style));
+    label->setTextColor(color);
+    label->setBackgroundColor(Color::clear());
+    label->setNumberOfLines(1);
+    label->setLineBreakMode(platform::LineBreakMode::TruncatingTail);
+    label->setTranslatesAutoresizingMaskIntoConstraints(false);
+    return label;
+}
+
+platform::VisualFormatMetrics KTRVelaBaseView::layoutMetrics() {
+    const auto installed = Platform::installed();
+    const double scale = installed && installed->device ? installed->device->mainScreenScale() : 1.0;
+    return {{"margin", 15.0},        {"vmargin", 10.0}, {"hs", 13.0}, {"vs", 0.0},
+            {"pd", kAvatarDiameter}, {"ld", 16.0},      {"lm", 82.0}, {"st", 1.0 / scale}};
+}
+
+void KTRVelaBaseView::assignContactLater(std::shared_ptr<platform::Contact> contact) {
+    const auto installed = Platform::installed();
+    if (!installed || !installed->mainLoop) {
+        return;
+    }
+    installed->mainLoop->schedule(kAvatarDelay, false, [self = platform::strong(this), shown = std::move(contact)] {
+        if (self->avatarViewController_) {
+            self->avatarViewController_->setContacts({shown ? shown : std::make_shared<platform::Contact>()});
+        }
+    });
+}
+
+double KTRVelaBaseView::fittingHeight() {
+    constexpr double priority = 750.0;
+    return systemLayoutSizeFitting({frame().width, platform::kCompressedFittingExtent}, priority, priority).height;
+}
+
+bool KTRVelaBaseView::accessibilitySizeIsActive() {
+    const auto installed = Platform::installed();
+    return installed && installed->device &&
+           platform::isAccessibilityCategory(installed->device->contentSizeCategory());
 }
 
 double KTRVelaBaseView::mapHeight() {

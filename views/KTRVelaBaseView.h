@@ -6,15 +6,17 @@
 
 #include "platform/base/Geometry.h"
 #include "platform/base/Url.h"
+#include "platform/contacts/ContactAvatarController.h"
+#include "platform/layout/VisualFormat.h"
 #include "platform/ui/AttributedString.h"
-#include "platform/ui/View.h"
+#include "platform/ui/Label.h"
 #include "views/FriendViewDelegate.h"
 #include "views/ViewURLHandler.h"
 
 namespace ktr {
 
 /// Base of everything that a controller stacks in a snippet: a tap opens the URL that the subclass names, a press dims
-/// the row. Main thread.
+/// the row. It also holds the parts that the rows of a friend share; other views leave them none. Main thread.
 class KTRVelaBaseView : public platform::View {
   public:
     /// Points. Reads the text size and the language's direction once: a row made before they change keeps its layout.
@@ -37,6 +39,8 @@ class KTRVelaBaseView : public platform::View {
     void touchesEnded(const platform::Touches& touches, const platform::TouchEvent& event) override;
     void touchesCancelled(const platform::Touches& touches, const platform::TouchEvent& event) override;
 
+    /// The user's text size is an accessibility size now.
+    static bool accessibilitySizeIsActive();
     /// The height of a snippet's map in points: 389 on a tablet, 219 on every other device and one that does not know.
     static double mapHeight();
 
@@ -52,11 +56,44 @@ class KTRVelaBaseView : public platform::View {
     std::shared_ptr<FriendViewDelegate> viewDelegate() const { return viewDelegate_.lock(); }
     void setViewDelegate(std::weak_ptr<FriendViewDelegate> delegate) { viewDelegate_ = std::move(delegate); }
 
+    // The parts of a friend's row
+    std::shared_ptr<platform::ContactAvatarController> avatarViewController() const { return avatarViewController_; }
+    void setAvatarViewController(std::shared_ptr<platform::ContactAvatarController> controller) {
+        avatarViewController_ = std::move(controller);
+    }
+    /// Holds the avatar's view.
+    std::shared_ptr<platform::View> friendIconView() const { return friendIconView_; }
+    void setFriendIconView(std::shared_ptr<platform::View> view) { friendIconView_ = std::move(view); }
+    std::shared_ptr<platform::View> separatorView() const { return separatorView_; }
+    void setSeparatorView(std::shared_ptr<platform::View> view) { separatorView_ = std::move(view); }
+    bool separatorEnabled() const { return separatorEnabled_; }
+    /// Shows or hides the hairline. It is shown until this is first called, though the flag reads false.
+    void setSeparatorEnabled(bool enabled);
+
+  protected:
+    /// Makes the holder, 54 by 54 points, with the avatar's view in it, and adds it to the row.
+    void setupAvatar();
+    /// Makes the hairline and adds it to the row.
+    void setupSeparator();
+    /// A text of one line, cut at its end; not added yet.
+    static std::shared_ptr<platform::Label> makeLabel(platform::TextStyle style, const platform::Color& color);
+    /// What the rows' layout formats name: margins, the avatar's size, a hairline of one pixel of the main screen.
+    static platform::VisualFormatMetrics layoutMetrics();
+    /// Gives the avatar this contact, or an empty one, 0.1 seconds later. The row is held until then: it is the row
+    /// that was filled that gets the avatar, whoever drops it.
+    void assignContactLater(std::shared_ptr<platform::Contact> contact);
+    /// The least height that the row's constraints allow at its present width, points.
+    double fittingHeight();
+
   private:
     bool axSize_ = false;
     bool isRTLUI_ = false;
+    bool separatorEnabled_ = false;
     std::weak_ptr<ViewURLHandler> urlHandler_;
     std::weak_ptr<FriendViewDelegate> viewDelegate_;
+    std::shared_ptr<platform::ContactAvatarController> avatarViewController_;
+    std::shared_ptr<platform::View> friendIconView_;
+    std::shared_ptr<platform::View> separatorView_;
 };
 
 }  // namespace ktr

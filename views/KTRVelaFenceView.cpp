@@ -8,11 +8,8 @@
 #include "model/LogCategory.h"
 #include "model/PluginBundle.h"
 #include "platform/base/Format.h"
-#include "platform/base/MainLoop.h"
 #include "platform/base/Platform.h"
 #include "platform/base/Utf8.h"
-#include "platform/layout/VisualFormat.h"
-#include "platform/ui/Device.h"
 #include "service/Common.h"
 
 namespace ktr {
@@ -22,23 +19,8 @@ using platform::Label;
 using platform::LayoutAxis;
 using platform::Platform;
 using platform::Rect;
-using platform::View;
 
 namespace {
-
-constexpr double kAvatarDelay = 0.1;  // seconds
-constexpr double kAvatarDiameter = 54.0;
-
-std::shared_ptr<Label> makeLabel(platform::TextStyle style, const platform::Color& color) {
-    auto label = create<Label>(&Label::initWithFrame, Rect{});
-    label->setFont(platform::preferredFont(style));
-    label->setTextColor(color);
-    label->setBackgroundColor(platform::Color::clear());
-    label->setNumberOfLines(1);
-    label->setLineBreakMode(platform::LineBreakMode::TruncatingTail);
-    label->setTranslatesAutoresizingMaskIntoConstraints(false);
-    return label;
-}
 
 /// An absent label is passed over.
 void hideWhenEmpty(const std::shared_ptr<Label>& label) {
@@ -53,7 +35,7 @@ bool KTRVelaFenceView::initWithFrame(const Rect& frame) {
     if (!KTRVelaBaseView::initWithFrame(frame)) {
         return false;
     }
-    avatarViewController_ = std::make_shared<platform::ContactAvatarController>();
+    setAvatarViewController(std::make_shared<platform::ContactAvatarController>());
     if (!axSize()) {
         setupView();
     }
@@ -67,18 +49,11 @@ void KTRVelaFenceView::setupView() {
     setupConstraints();
 }
 
-void KTRVelaFenceView::setupAvatar() {
-    const auto avatar = avatarViewController_->view();
-    avatar->setTranslatesAutoresizingMaskIntoConstraints(false);
-    friendIconView_ = create<View>(&View::initWithFrame, Rect{0.0, 0.0, kAvatarDiameter, kAvatarDiameter});
-    friendIconView_->setTranslatesAutoresizingMaskIntoConstraints(false);
-    friendIconView_->addSubview(avatar);
-    using platform::LayoutAttribute;
-    for (const auto edge :
-         {LayoutAttribute::Top, LayoutAttribute::Bottom, LayoutAttribute::Leading, LayoutAttribute::Trailing}) {
-        avatar->anchor(edge).constraintEqualTo(friendIconView_->anchor(edge))->setActive(true);
-    }
-    addSubview(friendIconView_);
+void KTRVelaFenceView::setupIcon() {
+    geoFenceIconImageView_ = create<platform::ImageView>(&platform::ImageView::initWithFrame, Rect{});
+    geoFenceIconImageView_->setImage(KTRVATheme::locationIndicator());
+    geoFenceIconImageView_->setTranslatesAutoresizingMaskIntoConstraints(false);
+    addSubview(geoFenceIconImageView_);
 }
 
 void KTRVelaFenceView::setupLabels() {
@@ -90,18 +65,12 @@ void KTRVelaFenceView::setupLabels() {
     nameLabel_ = makeLabel(TextStyle::Body, KTRVATheme::friendNameTextColor());
     addSubview(nameLabel_);
 
-    geoFenceIconImageView_ = create<platform::ImageView>(&platform::ImageView::initWithFrame, Rect{});
-    geoFenceIconImageView_->setImage(KTRVATheme::locationIndicator());
-    geoFenceIconImageView_->setTranslatesAutoresizingMaskIntoConstraints(false);
-    addSubview(geoFenceIconImageView_);
+    setupIcon();
 
     fenceLabel_ = makeLabel(TextStyle::Footnote, KTRVATheme::friendLocationTextColor());
     addSubview(fenceLabel_);
 
-    separatorView_ = create<View>(&View::initWithFrame, Rect{});
-    separatorView_->setLayerBackgroundColor(platform::Color::rgb(151.0 / 255.0, 158.0 / 255.0, 149.0 / 255.0));
-    separatorView_->setTranslatesAutoresizingMaskIntoConstraints(false);
-    addSubview(separatorView_);
+    setupSeparator();
 
     nameLabel_->setContentCompressionResistancePriority(givesWay, LayoutAxis::Horizontal);
     nameLabel_->setContentCompressionResistancePriority(required, LayoutAxis::Vertical);
@@ -110,37 +79,25 @@ void KTRVelaFenceView::setupLabels() {
 }
 
 void KTRVelaFenceView::setupConstraints() {
-    const auto installed = Platform::installed();
-    const double scale = installed && installed->device ? installed->device->mainScreenScale() : 1.0;
-    const platform::VisualFormatMetrics metrics = {{"margin", 15.0}, {"vmargin", 10.0},       {"hs", 13.0},
-                                                   {"vs", 0.0},      {"pd", kAvatarDiameter}, {"ld", 16.0},
-                                                   {"lm", 82.0},     {"st", 1.0 / scale}};
     const platform::VisualFormatViews views = {{"nameLabel", nameLabel_},
                                                {"fenceLabel", fenceLabel_},
-                                               {"friendIconView", friendIconView_},
+                                               {"friendIconView", friendIconView()},
                                                {"geoFenceIconImageView", geoFenceIconImageView_},
-                                               {"separatorView", separatorView_}};
-    const auto add = [&](const char* format, const platform::VisualFormatOptions& options = {}) {
-        addConstraints(platform::VisualFormat::constraintsWithVisualFormat(format, options, metrics, views));
+                                               {"separatorView", separatorView()}};
+    const platform::VisualFormat::Picture pictures[] = {
+        {"H:|-margin-[friendIconView(pd)]", {}},
+        {"H:|-lm-[nameLabel]-hs-[geoFenceIconImageView(ld)]-margin-|", {platform::VisualFormatAlignment::Bottom}},
+        {"H:|-lm-[fenceLabel]-margin-|", {}},
+        {"H:|-0-[separatorView]-0-|", {}},
+        {"V:|-vmargin-[friendIconView(pd)]-(>=vmargin)-|", {}},
+        {"V:|-vmargin-[nameLabel]-vs-[fenceLabel]-(>=vmargin)-[separatorView(st)]-0-|", {}},
     };
-    add("H:|-margin-[friendIconView(pd)]");
-    add("H:|-lm-[nameLabel]-hs-[geoFenceIconImageView(ld)]-margin-|", {platform::VisualFormatAlignment::Bottom});
-    add("H:|-lm-[fenceLabel]-margin-|");
-    add("H:|-0-[separatorView]-0-|");
-    add("V:|-vmargin-[friendIconView(pd)]-(>=vmargin)-|");
-    add("V:|-vmargin-[nameLabel]-vs-[fenceLabel]-(>=vmargin)-[separatorView(st)]-0-|");
+    platform::VisualFormat::addConstraints(*this, pictures, layoutMetrics(), views);
 }
 
 void KTRVelaFenceView::setGeoFence(std::shared_ptr<platform::VAKtrGeoFence> geoFence) {
     geoFence_ = std::move(geoFence);
     updateFenceView();
-}
-
-void KTRVelaFenceView::setSeparatorEnabled(bool enabled) {
-    separatorEnabled_ = enabled;
-    if (separatorView_) {
-        separatorView_->setHidden(!enabled);
-    }
 }
 
 void KTRVelaFenceView::updateFenceView() {
@@ -190,16 +147,7 @@ void KTRVelaFenceView::updateAvatar() {
                       ? ContactsUtilities::contactForEmail(friendEmail())
                       : ContactsUtilities::contactForPhone(friendPhone());
     }
-    const auto loop = Platform::installed()->mainLoop;
-    if (!loop) {
-        return;
-    }
-    // The row is held until the step has run: it is the row that was filled that gets the avatar, whoever drops it.
-    loop->schedule(kAvatarDelay, false, [self = platform::strong(this), contact] {
-        if (self->avatarViewController_) {
-            self->avatarViewController_->setContacts({contact ? contact : std::make_shared<platform::Contact>()});
-        }
-    });
+    assignContactLater(std::move(contact));
 }
 
 void KTRVelaFenceView::updateViewVisibility() {
@@ -259,8 +207,7 @@ platform::AccessibilityRole KTRVelaFenceView::accessibilityRole() const {
 }
 
 double KTRVelaFenceView::estimagedHeightForView() {
-    constexpr double priority = 750.0;
-    return systemLayoutSizeFitting({frame().width, platform::kCompressedFittingExtent}, priority, priority).height;
+    return fittingHeight();
 }
 
 }  // namespace ktr

@@ -5,10 +5,8 @@
 #include <string>
 
 #include "platform/assistant/VAKtrGeoFence.h"
-#include "platform/contacts/ContactAvatarController.h"
 #include "platform/layout/LayoutConstraint.h"
 #include "platform/ui/ImageView.h"
-#include "platform/ui/Label.h"
 #include "views/CurrentLocationDelegate.h"
 #include "views/KTRVelaBaseView.h"
 
@@ -55,14 +53,7 @@ class KTRVelaFenceView : public KTRVelaBaseView {
     /// True from the start; nothing reads it.
     bool isRefreshingLocation() const { return isRefreshingLocation_; }
     void setIsRefreshingLocation(bool isRefreshing) { isRefreshingLocation_ = isRefreshing; }
-    bool separatorEnabled() const { return separatorEnabled_; }
-    /// Shows or hides the hairline. It is shown until this is first called, though the flag reads false.
-    void setSeparatorEnabled(bool enabled);
 
-    std::shared_ptr<platform::ContactAvatarController> avatarViewController() const { return avatarViewController_; }
-    void setAvatarViewController(std::shared_ptr<platform::ContactAvatarController> controller) {
-        avatarViewController_ = std::move(controller);
-    }
     std::shared_ptr<platform::Label> nameLabel() const { return nameLabel_; }
     void setNameLabel(std::shared_ptr<platform::Label> label) { nameLabel_ = std::move(label); }
     std::shared_ptr<platform::Label> fenceLabel() const { return fenceLabel_; }
@@ -70,14 +61,10 @@ class KTRVelaFenceView : public KTRVelaBaseView {
     /// Never made by this row: a fence has no distance. Whoever sets one has it shown and hidden with its text.
     std::shared_ptr<platform::Label> distanceLabel() const { return distanceLabel_; }
     void setDistanceLabel(std::shared_ptr<platform::Label> label) { distanceLabel_ = std::move(label); }
-    std::shared_ptr<platform::View> friendIconView() const { return friendIconView_; }
-    void setFriendIconView(std::shared_ptr<platform::View> view) { friendIconView_ = std::move(view); }
     std::shared_ptr<platform::ImageView> geoFenceIconImageView() const { return geoFenceIconImageView_; }
     void setGeoFenceIconImageView(std::shared_ptr<platform::ImageView> view) {
         geoFenceIconImageView_ = std::move(view);
     }
-    std::shared_ptr<platform::View> separatorView() const { return separatorView_; }
-    void setSeparatorView(std::shared_ptr<platform::View> view) { separatorView_ = std::move(view); }
     /// Both kept for subclasses; this row neither sets nor consults them.
     std::shared_ptr<platform::LayoutConstraint> nameLabelLeadingConstraint() const {
         return nameLabelLeadingConstraint_;
@@ -88,12 +75,17 @@ class KTRVelaFenceView : public KTRVelaBaseView {
     bool constraintSetupCompleted() const { return constraintSetupCompleted_; }
     void setConstraintSetupCompleted(bool completed) { constraintSetupCompleted_ = completed; }
 
+  protected:
+    /// Makes the location indicator and adds it to the row.
+    void setupIcon();
+    /// Looks the friend's contact up and hands it to the avatar 0.1 seconds later.
+    void updateAvatar();
+    /// When the user will hear of the friend.
+    std::string fenceSentence() const;
+
   private:
-    void setupAvatar();
     void setupLabels();
     void setupConstraints();
-    void updateAvatar();
-    std::string fenceSentence() const;
     std::shared_ptr<platform::VAPerson> person() const;
     /// The handle by which the service knows the friend, or none.
     std::optional<std::string> serviceHandle() const;
@@ -101,14 +93,10 @@ class KTRVelaFenceView : public KTRVelaBaseView {
     std::weak_ptr<CurrentLocationDelegate> currentLocationDelegate_;
     std::shared_ptr<platform::VAKtrGeoFence> geoFence_;
     bool isRefreshingLocation_ = false;
-    bool separatorEnabled_ = false;
-    std::shared_ptr<platform::ContactAvatarController> avatarViewController_;
     std::shared_ptr<platform::Label> nameLabel_;
     std::shared_ptr<platform::Label> fenceLabel_;
     std::shared_ptr<platform::Label> distanceLabel_;
-    std::shared_ptr<platform::View> friendIconView_;
     std::shared_ptr<platform::ImageView> geoFenceIconImageView_;
-    std::shared_ptr<platform::View> separatorView_;
     std::shared_ptr<platform::LayoutConstraint> nameLabelLeadingConstraint_;
     bool constraintSetupCompleted_ = false;
 };

@@ -1,7 +1,6 @@
 #include "views/KTRVelaFriendView.h"
 
 #include <utility>
-#include <vector>
 
 #include "model/ContactsUtilities.h"
 #include "model/KTRVATheme.h"
@@ -9,41 +8,23 @@
 #include "model/LabelUtil.h"
 #include "model/LogCategory.h"
 #include "model/PluginBundle.h"
-#include "platform/base/MainLoop.h"
 #include "platform/base/Platform.h"
-#include "platform/layout/ConstraintRule.h"
-#include "platform/layout/VisualFormat.h"
-#include "platform/ui/Device.h"
 #include "service/Common.h"
 
 namespace ktr {
 
-using platform::create;
 using platform::Label;
 using platform::LayoutAxis;
 using platform::Platform;
 using platform::Rect;
-using platform::View;
 
 namespace {
 
-constexpr double kAvatarDelay = 0.1;  // seconds
-constexpr double kAvatarDiameter = 54.0;
-
-/// A one-line label that cannot be squeezed in height nor stretched.
-std::shared_ptr<Label> makeLabel(platform::TextStyle style, const platform::Color& color,
-                                 double horizontalCompressionResistance) {
-    auto label = create<Label>(&Label::initWithFrame, Rect{});
-    label->setFont(platform::preferredFont(style));
-    label->setTextColor(color);
-    label->setBackgroundColor(platform::Color::clear());
-    label->setNumberOfLines(1);
-    label->setLineBreakMode(platform::LineBreakMode::TruncatingTail);
-    label->setContentCompressionResistancePriority(platform::kRequiredPriority, LayoutAxis::Vertical);
-    label->setContentCompressionResistancePriority(horizontalCompressionResistance, LayoutAxis::Horizontal);
-    label->setContentHuggingPriority(platform::kRequiredPriority, LayoutAxis::Vertical);
-    label->setTranslatesAutoresizingMaskIntoConstraints(false);
-    return label;
+/// A label that cannot be squeezed in height nor stretched.
+void makeFirm(Label& label, double horizontalCompressionResistance) {
+    label.setContentCompressionResistancePriority(platform::kRequiredPriority, LayoutAxis::Vertical);
+    label.setContentCompressionResistancePriority(horizontalCompressionResistance, LayoutAxis::Horizontal);
+    label.setContentHuggingPriority(platform::kRequiredPriority, LayoutAxis::Vertical);
 }
 
 /// With an accessibility text size there are no labels: what is set on one goes nowhere.
@@ -78,7 +59,7 @@ bool KTRVelaFriendView::initWithFrame(const Rect& frame) {
                 }
             });
     }
-    avatarViewController_ = std::make_shared<platform::ContactAvatarController>();
+    setAvatarViewController(std::make_shared<platform::ContactAvatarController>());
     if (!axSize()) {
         setupView();
     }
@@ -92,62 +73,37 @@ void KTRVelaFriendView::setupView() {
     setupConstraints();
 }
 
-void KTRVelaFriendView::setupAvatar() {
-    const auto avatar = avatarViewController_->view();
-    avatar->setTranslatesAutoresizingMaskIntoConstraints(false);
-    friendIconView_ = create<View>(&View::initWithFrame, Rect{0.0, 0.0, kAvatarDiameter, kAvatarDiameter});
-    friendIconView_->setTranslatesAutoresizingMaskIntoConstraints(false);
-    friendIconView_->addSubview(avatar);
-    using platform::LayoutAttribute;
-    const platform::ViewReference image(*avatar);
-    const platform::ViewReference icon(*friendIconView_);
-    std::vector<platform::ConstraintRule> edges;
-    edges.reserve(4);
-    for (const auto edge :
-         {LayoutAttribute::Top, LayoutAttribute::Bottom, LayoutAttribute::Leading, LayoutAttribute::Trailing}) {
-        edges.push_back({image, icon, {edge, edge}});
-    }
-    friendIconView_->addRules(edges);
-    addSubview(friendIconView_);
-}
-
 void KTRVelaFriendView::setupLabels() {
     using platform::TextStyle;
     constexpr double required = platform::kRequiredPriority;
     // Between a long name and the distance beside it, the name gives way.
     constexpr double givesWay = platform::kDefaultHuggingPriority;
 
-    nameLabel_ = makeLabel(TextStyle::Headline, KTRVATheme::friendNameTextColor(), givesWay);
+    nameLabel_ = makeLabel(TextStyle::Headline, KTRVATheme::friendNameTextColor());
+    makeFirm(*nameLabel_, givesWay);
     addSubview(nameLabel_);
-    bringSubviewToFront(friendIconView_);
+    bringSubviewToFront(friendIconView());
 
-    timeLabel_ = makeLabel(TextStyle::Subheadline, KTRVATheme::friendLocationTextColor(), required);
+    timeLabel_ = makeLabel(TextStyle::Subheadline, KTRVATheme::friendLocationTextColor());
+    makeFirm(*timeLabel_, required);
     addSubview(timeLabel_);
 
-    separatorView_ = create<View>(&View::initWithFrame, Rect{});
-    separatorView_->setLayerBackgroundColor(platform::Color::rgb(151.0 / 255.0, 158.0 / 255.0, 149.0 / 255.0));
-    separatorView_->setTranslatesAutoresizingMaskIntoConstraints(false);
-    addSubview(separatorView_);
+    setupSeparator();
 
-    locationLabel_ = makeLabel(TextStyle::Subheadline, KTRVATheme::friendLocationTextColor(), required);
+    locationLabel_ = makeLabel(TextStyle::Subheadline, KTRVATheme::friendLocationTextColor());
+    makeFirm(*locationLabel_, required);
     addSubview(locationLabel_);
 
-    distanceLabel_ = makeLabel(TextStyle::Body, KTRVATheme::distanceTextColor(), required);
+    distanceLabel_ = makeLabel(TextStyle::Body, KTRVATheme::distanceTextColor());
+    makeFirm(*distanceLabel_, required);
     distanceLabel_->setContentHuggingPriority(required, LayoutAxis::Horizontal);
     addSubview(distanceLabel_);
 }
 
 void KTRVelaFriendView::setupConstraints() {
-    const auto installed = Platform::installed();
-    const double scale = installed && installed->device ? installed->device->mainScreenScale() : 1.0;
-    // The same for all rows but for the scale.
-    static platform::VisualFormatMetrics metrics = {
-        {"margin", 15.0},        {"vmargin", 10.0}, {"hs", 13.0}, {"vs", 0.0},
-        {"pd", kAvatarDiameter}, {"ld", 16.0},      {"lm", 82.0}, {"st", 1.0}};
-    metrics["st"] = 1.0 / scale;
-    const platform::VisualFormatViews views = {{"nameLabel", nameLabel_},           {"locationLabel", locationLabel_},
-                                               {"timeLabel", timeLabel_},           {"distanceLabel", distanceLabel_},
-                                               {"friendIconView", friendIconView_}, {"separatorView", separatorView_}};
+    const platform::VisualFormatViews views = {
+        {"nameLabel", nameLabel_},         {"locationLabel", locationLabel_},    {"timeLabel", timeLabel_},
+        {"distanceLabel", distanceLabel_}, {"friendIconView", friendIconView()}, {"separatorView", separatorView()}};
     const platform::VisualFormat::Picture pictures[] = {
         {"H:|-margin-[friendIconView(pd)]", {}},
         {"H:|-lm-[locationLabel]-margin-|", {}},
@@ -157,7 +113,7 @@ void KTRVelaFriendView::setupConstraints() {
         {"V:|-vmargin-[friendIconView(pd)]-(>=vmargin)-|", {}},
         {"V:|-vmargin-[locationLabel]-vs-[nameLabel]-vs-[timeLabel]-(>=vmargin)-[separatorView(st)]-0-|", {}},
     };
-    platform::VisualFormat::addConstraints(*this, pictures, metrics, views);
+    platform::VisualFormat::addConstraints(*this, pictures, layoutMetrics(), views);
 }
 
 void KTRVelaFriendView::setLocation(std::shared_ptr<KTRVALocation> location) {
@@ -167,13 +123,6 @@ void KTRVelaFriendView::setLocation(std::shared_ptr<KTRVALocation> location) {
     updateView();
 }
 
-void KTRVelaFriendView::setSeparatorEnabled(bool enabled) {
-    separatorEnabled_ = enabled;
-    if (separatorView_) {
-        separatorView_->setHidden(!enabled);
-    }
-}
-
 void KTRVelaFriendView::updateView() {
     // A position may still arrive when the host has already gone: nothing can be worded then, and what is shown stays.
     if (!Platform::installed()) {
@@ -181,7 +130,7 @@ void KTRVelaFriendView::updateView() {
     }
     updateAvatar();
     updatePlace();
-    setText(nameLabel_, location_ ? location_->friendName() : "");
+    setText(nameLabel_, nameText());
     updateAge();
     updateDistance();
 }
@@ -195,25 +144,21 @@ void KTRVelaFriendView::updateAvatar() {
                       ? ContactsUtilities::contactForEmail(location_->friendEmail())
                       : ContactsUtilities::contactForPhone(location_->friendPhone());
     }
-    const auto installed = Platform::installed();
-    if (!installed || !installed->mainLoop) {
-        return;
-    }
-    // The row is held until the step has run: it is the row that was filled that gets the avatar, whoever drops it.
-    installed->mainLoop->schedule(kAvatarDelay, false, [self = platform::strong(this), contact] {
-        if (self->avatarViewController_) {
-            self->avatarViewController_->setContacts({contact ? contact : std::make_shared<platform::Contact>()});
-        }
-    });
+    assignContactLater(std::move(contact));
+}
+
+std::string KTRVelaFriendView::nameText() const {
+    return location_ ? location_->friendName() : "";
+}
+
+std::string KTRVelaFriendView::placeText() const {
+    const std::string text = location_ ? location_->friendLocation(!isRefreshingLocation_) : "";
+    // Looked up as it stands: a default label in other letters has no text of its own and shows raw.
+    return LabelUtil::isDefaultLabel(text) ? AssistantLocalizedString(text) : text;
 }
 
 void KTRVelaFriendView::updatePlace() {
-    std::string text = location_ ? location_->friendLocation(!isRefreshingLocation_) : "";
-    if (LabelUtil::isDefaultLabel(text)) {
-        // Looked up as it stands: a default label in other letters has no text of its own and shows raw.
-        text = AssistantLocalizedString(text);
-    }
-    setText(locationLabel_, text);
+    setText(locationLabel_, placeText());
     // Without a coordinate nothing is said but the text itself, lest an earlier place be spoken.
     std::optional<std::string> spoken;
     if (location_ && location_->hasCoordinate() && locationLabel_) {
@@ -222,29 +167,36 @@ void KTRVelaFriendView::updatePlace() {
     setSpokenText(locationLabel_, std::move(spoken));
 }
 
-void KTRVelaFriendView::updateAge() {
+platform::Dictionary KTRVelaFriendView::ageTexts() const {
     const auto object = location_ ? location_->velaLocation() : nullptr;
     const double date = object ? object->locationDate.value_or(0.0) : 0.0;
-    std::string text;
-    std::string spoken;
-    if (date > 0.0) {
-        const auto ages = KTRVAUIUtils::dictionaryWithAgeStringsForDate({date});
-        text = entry(ages, LabelStringKey);
-        spoken = entry(ages, LabelAccessibilityStringKey);
-    }
-    setText(timeLabel_, text);
-    setSpokenText(timeLabel_, std::move(spoken));
+    return date > 0.0 ? KTRVAUIUtils::dictionaryWithAgeStringsForDate({date}) : platform::Dictionary();
 }
 
-void KTRVelaFriendView::updateDistance() {
+std::string KTRVelaFriendView::ageText(const char* key) const {
+    return entry(ageTexts(), key);
+}
+
+void KTRVelaFriendView::updateAge() {
+    const auto ages = ageTexts();
+    setText(timeLabel_, entry(ages, LabelStringKey));
+    setSpokenText(timeLabel_, entry(ages, LabelAccessibilityStringKey));
+}
+
+std::string KTRVelaFriendView::distanceText() const {
     const auto source = currentLocationDelegate();
     const auto userLocation = source ? source->currentLocation() : nullptr;
     const auto distance = location_ ? location_->distanceFromLocation(userLocation) : std::nullopt;
+    return distance.value_or("");
+}
+
+void KTRVelaFriendView::updateDistance() {
+    const std::string distance = distanceText();
     std::string text;
     std::string spoken;
-    if (distance && !isVisibility_ && !distance->empty()) {
-        text = *distance;
-        spoken = platform::formatted(AssistantLocalizedString("ACCESSIBILITY_DISTANCE"), {*distance});
+    if (!isVisibility_ && !distance.empty()) {
+        text = distance;
+        spoken = platform::formatted(AssistantLocalizedString("ACCESSIBILITY_DISTANCE"), {distance});
     }
     setText(distanceLabel_, text);
     setSpokenText(distanceLabel_, std::move(spoken));
@@ -258,8 +210,7 @@ std::optional<platform::Url> KTRVelaFriendView::urlForTouch() {
 }
 
 double KTRVelaFriendView::estimagedHeightForView() {
-    constexpr double priority = 750.0;
-    return systemLayoutSizeFitting({frame().width, platform::kCompressedFittingExtent}, priority, priority).height;
+    return fittingHeight();
 }
 
 }  // namespace ktr

@@ -2,11 +2,10 @@
 
 #include <memory>
 #include <optional>
+#include <string>
 
 #include "model/KTRVALocation.h"
 #include "platform/base/NotificationCenter.h"
-#include "platform/contacts/ContactAvatarController.h"
-#include "platform/ui/Label.h"
 #include "views/CurrentLocationDelegate.h"
 #include "views/KTRVelaBaseView.h"
 
@@ -40,17 +39,10 @@ class KTRVelaFriendView : public KTRVelaBaseView {
     /// A fresh position is awaited (true from the start): words the place text only, at the next filling.
     bool isRefreshingLocation() const { return isRefreshingLocation_; }
     void setIsRefreshingLocation(bool isRefreshing) { isRefreshingLocation_ = isRefreshing; }
-    bool separatorEnabled() const { return separatorEnabled_; }
-    /// Shows or hides the hairline. It is shown until this is first called, though the flag reads false.
-    void setSeparatorEnabled(bool enabled);
     /// The row is the user's own in the show/hide-my-location snippet: no distance is shown.
     bool isVisibility() const { return isVisibility_; }
     void setIsVisibility(bool isVisibility) { isVisibility_ = isVisibility; }
 
-    std::shared_ptr<platform::ContactAvatarController> avatarViewController() const { return avatarViewController_; }
-    void setAvatarViewController(std::shared_ptr<platform::ContactAvatarController> controller) {
-        avatarViewController_ = std::move(controller);
-    }
     std::shared_ptr<platform::Label> nameLabel() const { return nameLabel_; }
     void setNameLabel(std::shared_ptr<platform::Label> label) { nameLabel_ = std::move(label); }
     std::shared_ptr<platform::Label> locationLabel() const { return locationLabel_; }
@@ -59,19 +51,25 @@ class KTRVelaFriendView : public KTRVelaBaseView {
     void setTimeLabel(std::shared_ptr<platform::Label> label) { timeLabel_ = std::move(label); }
     std::shared_ptr<platform::Label> distanceLabel() const { return distanceLabel_; }
     void setDistanceLabel(std::shared_ptr<platform::Label> label) { distanceLabel_ = std::move(label); }
-    std::shared_ptr<platform::View> friendIconView() const { return friendIconView_; }
-    void setFriendIconView(std::shared_ptr<platform::View> view) { friendIconView_ = std::move(view); }
-    std::shared_ptr<platform::View> separatorView() const { return separatorView_; }
-    void setSeparatorView(std::shared_ptr<platform::View> view) { separatorView_ = std::move(view); }
     /// Kept for subclasses; this row does not consult it.
     bool constraintSetupCompleted() const { return constraintSetupCompleted_; }
     void setConstraintSetupCompleted(bool completed) { constraintSetupCompleted_ = completed; }
 
+  protected:
+    /// Looks the friend's contact up and hands it to the avatar 0.1 seconds later.
+    void updateAvatar();
+    /// The texts of the row as they stand now; "" for what is not known.
+    std::string nameText() const;
+    std::string placeText() const;
+    std::string distanceText() const;
+    /// An entry of the texts for the fix's age; "" without a date.
+    std::string ageText(const char* key) const;
+
   private:
-    void setupAvatar();
+    /// Shown and spoken; empty without a date.
+    platform::Dictionary ageTexts() const;
     void setupLabels();
     void setupConstraints();
-    void updateAvatar();
     void updatePlace();
     void updateAge();
     void updateDistance();
@@ -79,15 +77,11 @@ class KTRVelaFriendView : public KTRVelaBaseView {
     std::weak_ptr<CurrentLocationDelegate> currentLocationDelegate_;
     std::shared_ptr<KTRVALocation> location_;
     bool isRefreshingLocation_ = false;
-    bool separatorEnabled_ = false;
     bool isVisibility_ = false;
-    std::shared_ptr<platform::ContactAvatarController> avatarViewController_;
     std::shared_ptr<platform::Label> nameLabel_;
     std::shared_ptr<platform::Label> locationLabel_;
     std::shared_ptr<platform::Label> timeLabel_;
     std::shared_ptr<platform::Label> distanceLabel_;
-    std::shared_ptr<platform::View> friendIconView_;
-    std::shared_ptr<platform::View> separatorView_;
     bool constraintSetupCompleted_ = false;
     platform::NotificationCenter::Token currentLocationUpdated_;
 };

@@ -34,9 +34,9 @@ bool KTRVelaSingleLabelView::initWithFrame(const platform::Rect& frame) {
 
     const platform::VisualFormatMetrics metrics = {{"margin", kMargin}};
     const platform::VisualFormatViews views = {{"label", label_}};
-    for (const char* format : {"H:|-margin-[label]-margin-|", "V:|-margin-[label]-margin-|"}) {
-        addConstraints(platform::VisualFormat::constraintsWithVisualFormat(format, {}, metrics, views));
-    }
+    const platform::VisualFormat::Picture pictures[] = {{"H:|-margin-[label]-margin-|", {}},
+                                                        {"V:|-margin-[label]-margin-|", {}}};
+    platform::VisualFormat::addConstraints(*this, pictures, metrics, views);
     return true;
 }
 

@@ -91,20 +91,26 @@ TEST_F(KTRSnippetControllerFactoryTest, GeofenceAndVisibility_HaveControllersOfT
     EXPECT_NE(factory_->viewControllerForSnippet(std::make_shared<DerivedFence>()), nullptr);
 }
 
-TEST_F(KTRSnippetControllerFactoryTest, AccessibilityTextSize_IsRefusedWithOneLine) {
-    device->category = ContentSizeCategory::AX1;
-    EXPECT_EQ(factory_->viewControllerForSnippet(proximitySnippet({})), nullptr);
-    ASSERT_EQ(log->lines().size(), 1u);
-    EXPECT_EQ(log->lines()[0].level, LogLevel::Default);
-    EXPECT_EQ(log->lines()[0].format, "There are no rows for accessibility text sizes yet; nothing is drawn for: %@");
-    EXPECT_EQ(factory_->viewControllerForSnippet(std::make_shared<VAKtrGeoFenceSnippet>()), nullptr);
-    EXPECT_EQ(factory_->viewControllerForSnippet(std::make_shared<VAKtrVisibilityView>()), nullptr);
-    EXPECT_EQ(log->lines().size(), 3u);
+TEST_F(KTRSnippetControllerFactoryTest, ObjectOfTwoKinds_IsLocationsBeforeVisibilityBeforeGeofence) {
+    struct LocatedAndVisible : VAKtrVisibilityView, VAKtrLocationSnippet {};
+    struct FencedAndVisible : VAKtrGeoFenceSnippet, VAKtrVisibilityView {};
+    const auto both = std::make_shared<LocatedAndVisible>();
+    const auto located = std::shared_ptr<AssistantObject>(both, static_cast<VAKtrVisibilityView*>(both.get()));
+    EXPECT_NE(std::dynamic_pointer_cast<VAKTRLocationSnippetController>(factory_->viewControllerForSnippet(located)),
+              nullptr);
+    const auto other = std::make_shared<FencedAndVisible>();
+    const auto fenced = std::shared_ptr<AssistantObject>(other, static_cast<VAKtrGeoFenceSnippet*>(other.get()));
+    EXPECT_NE(std::dynamic_pointer_cast<VAKTRVisibilityController>(factory_->viewControllerForSnippet(fenced)),
+              nullptr);
 }
 
-TEST_F(KTRSnippetControllerFactoryTest, LargestOrdinaryTextSize_IsDrawn) {
-    device->category = ContentSizeCategory::XXXL;
-    EXPECT_NE(factory_->viewControllerForSnippet(proximitySnippet({})), nullptr);
+TEST_F(KTRSnippetControllerFactoryTest, EveryTextSize_IsDrawnWithoutALine) {
+    for (int size = 0; size <= static_cast<int>(ContentSizeCategory::AX5); ++size) {
+        device->category = static_cast<ContentSizeCategory>(size);
+        EXPECT_NE(factory_->viewControllerForSnippet(proximitySnippet({})), nullptr) << size;
+        EXPECT_NE(factory_->viewControllerForSnippet(std::make_shared<VAKtrGeoFenceSnippet>()), nullptr) << size;
+    }
+    EXPECT_TRUE(log->lines().empty());
 }
 
 TEST_F(KTRSnippetControllerFactoryTest, SpeakableNamespace_IsNoneForEverything) {

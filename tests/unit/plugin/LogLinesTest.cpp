@@ -6,6 +6,7 @@
 #include "tests/support/FakeHost.h"
 #include "tests/support/Friends.h"
 #include "tests/support/PlatformTest.h"
+#include "views/accessibility/KTRAXVelaFriendView.h"
 
 namespace ktr {
 
@@ -42,9 +43,12 @@ void fillRowWithDistance() {
     controller->desiredHeightForWidth(320.0);
 }
 
-void askAtAccessibilitySize() {
+std::shared_ptr<KTRAXVelaFriendView> largeRow() {
     std::dynamic_pointer_cast<test::FakeDevice>(Platform::installed()->device)->category = ContentSizeCategory::AX1;
-    KTRSnippetControllerFactory().viewControllerForSnippet(proximitySnippet({}));
+    auto row = create<KTRAXVelaFriendView>(&KTRAXVelaFriendView::initWithFrame, Rect{0.0, 0.0, 320.0, 0.0});
+    row->updateView();
+    std::dynamic_pointer_cast<VirtualTime>(Platform::installed()->mainLoop)->runPosted();
+    return row;
 }
 
 struct LineCase {
@@ -104,10 +108,11 @@ INSTANTIATE_TEST_SUITE_P(
         LineCase{"ContactNotFound", LogLevel::Error, "Could not find contact for assistant ID %@ : %@",
                  "Could not find contact for assistant ID assistant:nobody : no contact with this identifier",
                  [] { ContactsUtilities::contactForAssistantId("assistant:nobody"); }},
-        LineCase{"AccessibilitySize", LogLevel::Default,
-                 "There are no rows for accessibility text sizes yet; nothing is drawn for: %@",
-                 "There are no rows for accessibility text sizes yet; nothing is drawn for: <VAKtrLocationSnippet>",
-                 askAtAccessibilitySize}),
+        LineCase{"GeneratingImage", LogLevel::Debug, "Generating image for AX view.", "Generating image for AX view.",
+                 [] { largeRow(); }},
+        LineCase{"ImageGenerated", LogLevel::Debug, "Image generated - %i", "Image generated - 1", [] { largeRow(); }},
+        LineCase{"EstimatedHeight", LogLevel::Debug, "Calculating estimated height", "Calculating estimated height",
+                 [] { largeRow()->estimagedHeightForView(); }}),
     [](const auto& tested) { return std::string(tested.param.name); });
 
 }  // namespace ktr

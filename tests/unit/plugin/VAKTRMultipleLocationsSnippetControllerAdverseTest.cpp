@@ -362,9 +362,9 @@ class Insertions {
             insert("label", count++);
         }
         arranged.resize(std::min(arranged.size(), count));
-        // Rows of friends that are gone leave the tree.
+        // What is neither the row of a friend nor a wanted label leaves the tree.
         std::erase_if(arranged, [&](const std::string& name) {
-            return name != "label" && std::find(handles.begin(), handles.end(), name) == handles.end();
+            return name == "label" ? !showAll_ : std::find(handles.begin(), handles.end(), name) == handles.end();
         });
     }
 

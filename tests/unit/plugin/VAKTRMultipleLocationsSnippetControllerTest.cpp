@@ -270,12 +270,35 @@ TEST_F(VAKTRMultipleLocationsSnippetControllerTest, SameHandleTwice_IsOneRowAtTh
     EXPECT_EQ(texts(controller), all);
 }
 
-TEST_F(VAKTRMultipleLocationsSnippetControllerTest, SameHandleTwice_LabelFillsTheGapAboveTheRow_IsKept) {
-    // The row is inserted at 0, then moved to 1, past the label; two entries leave room for both.
-    const auto controller = makeController({ann(), ann()});
-    controller->desiredHeightForWidth(320.0);
-    EXPECT_EQ(shown(controller), (Views{controller->singleLabelView(), rowAt(controller, 1)}));
+TEST_F(VAKTRMultipleLocationsSnippetControllerTest, SameHandleTwice_TheLabelLeavesAndTheHeightHoldsTheRows) {
+    const auto controller = makeController({ann(), bo(), ann()});
+    const double height = controller->desiredHeightForWidth(320.0);
+    EXPECT_EQ(height, 2 * 78.5);
+    EXPECT_EQ(texts(controller), (Strings{"Bo", "Ann"}));
+    EXPECT_EQ(controller->singleLabelView()->superview(), nullptr);
+    EXPECT_TRUE(rowAt(controller, 0)->separatorEnabled());
     EXPECT_FALSE(rowAt(controller, 1)->separatorEnabled());
+    controller->view()->setFrame({0.0, 0.0, 320.0, height});
+    controller->view()->layoutIfNeeded();
+    EXPECT_EQ(rowAt(controller, 1)->frame().maxY(), height) << "the last friend is cut off";
+}
+
+TEST_F(VAKTRMultipleLocationsSnippetControllerTest, SameHandleTwice_ShowsItsLastRecord) {
+    const auto controller = makeController({ann(), placedFriend("Ann M.", "ann@example.org")});
+    controller->desiredHeightForWidth(320.0);
+    EXPECT_EQ(texts(controller), Strings{"Ann M."});
+    EXPECT_FALSE(rowAt(controller, 0)->separatorEnabled());
+}
+
+TEST_F(VAKTRMultipleLocationsSnippetControllerTest, SameHandleAThousandTimes_IsFilledOnceAndHasOneAvatarStep) {
+    const auto controller = makeController({ann()});
+    controller->desiredHeightForWidth(320.0);
+    time->runUntilIdle(1.0);
+    const std::size_t timers = time->pendingTimers();
+    const int lookups = contacts->fetches;
+    update(controller, LocationList(1000, ann()));
+    EXPECT_EQ(time->pendingTimers(), timers + 1);
+    EXPECT_EQ(contacts->fetches, lookups + 1);
 }
 
 TEST_F(VAKTRMultipleLocationsSnippetControllerTest, SameHandleTwice_RowsOfOthersLeaveTheTree) {
