@@ -35,9 +35,9 @@ std::optional<DocumentError> DocumentReader::readText(std::string_view text, con
             warnings->push_back(placed(unknown));
         }
         if (complaints.moreUnknown > 0) {
-            warnings->push_back({file, std::nullopt, "",
-                                 "members that there are not, passed over: " + std::to_string(complaints.moreUnknown) +
-                                     " more"});
+            warnings->push_back(
+                {file, std::nullopt, "",
+                 "members that there are not, passed over: " + std::to_string(complaints.moreUnknown) + " more"});
         }
     }
     return std::nullopt;

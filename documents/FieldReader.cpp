@@ -52,7 +52,8 @@ bool FieldReader::isText(const JsonPath& path, const std::string& text) {
     const bool control =
         std::any_of(text.begin(), text.end(), [](char c) { return static_cast<unsigned char>(c) < 0x20 || c == 0x7F; });
     if (text.empty() || control) {
-        complainAt(path, control ? "expected a string without control characters" : "expected a string, found an empty one");
+        complainAt(path,
+                   control ? "expected a string without control characters" : "expected a string, found an empty one");
     }
     return !text.empty() && !control;
 }
@@ -92,9 +93,9 @@ std::optional<int> FieldReader::whole(const std::string& name, int least, int mo
     }
     const double found = value->number().value_or(std::nan(""));
     if (!(found >= least && found <= most) || std::floor(found) != found) {
-        const std::string expected =
-            "a whole number from " + std::to_string(least) + " to " + std::to_string(most);
-        value->isNumber() ? complain(name, "expected " + expected) : complainAboutType(path_.member(name), expected, *value);
+        const std::string expected = "a whole number from " + std::to_string(least) + " to " + std::to_string(most);
+        value->isNumber() ? complain(name, "expected " + expected)
+                          : complainAboutType(path_.member(name), expected, *value);
         return std::nullopt;
     }
     return static_cast<int>(found);

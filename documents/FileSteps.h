@@ -8,7 +8,8 @@
 
 namespace ktr::documents {
 
-/// The steps of replacing a file, each of which gives 0 or the errno of its failure. Any thread; they wait for the disk.
+/// The steps of replacing a file, each of which gives 0 or the errno of its failure. Any thread; they wait for the
+/// disk.
 class FileSteps {
   public:
     /// Makes a file that was not there, writes all bytes and brings them to the disk. What a failure leaves is removed.

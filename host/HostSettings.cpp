@@ -49,10 +49,6 @@ std::variant<HostSettings, Failure> HostSettings::decide(const HostOptions& opti
     const auto usualSize = settings.idiom == platform::UserInterfaceIdiom::Display ? platform::ContentSizeCategory::XL
                                                                                    : platform::ContentSizeCategory::L;
     settings.textSize = either(options.textSize, firstOf(scenarios, &Scenario::textSize)).value_or(usualSize);
-    if (platform::isAccessibilityCategory(settings.textSize)) {
-        return Failure{ExitCode::NotDrawn,
-                       "the text sizes AX1 to AX5 cannot be drawn by this version; the largest is XXXL"};
-    }
     settings.scale = options.scale;
     settings.width = options.width > 0.0 ? options.width : usualWidth(settings.idiom);
     settings.dark = either(options.dark, firstOf(scenarios, &Scenario::dark));

@@ -77,6 +77,10 @@ void VAKTRBaseSnippetController::loadView() {
     containerView_ = platform::create<StackView>(&StackView::initWithFrame, platform::Rect{});
     containerView_->setTranslatesAutoresizingMaskIntoConstraints(false);
     containerView_->setAxis(StackView::Axis::Vertical);
+    if (KTRVelaBaseView::accessibilitySizeIsActive()) {
+        // These rows are measured larger than their images are: what is left is each row's own, not the last one's.
+        containerView_->setDistribution(StackView::Distribution::FillEvenly);
+    }
     setView(containerView_);
 }
 

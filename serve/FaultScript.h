@@ -14,10 +14,10 @@ namespace ktr::serve {
 /// describes the file and the words. Any thread.
 class FaultScript {
   public:
-    static std::variant<FaultScript, documents::DocumentError> readFile(const std::string& file,
-                                                                        documents::DocumentWarnings* warnings = nullptr);
-    static std::variant<FaultScript, documents::DocumentError> readText(std::string_view text, const std::string& file,
-                                                                        documents::DocumentWarnings* warnings = nullptr);
+    static std::variant<FaultScript, documents::DocumentError> readFile(
+        const std::string& file, documents::DocumentWarnings* warnings = nullptr);
+    static std::variant<FaultScript, documents::DocumentError> readText(
+        std::string_view text, const std::string& file, documents::DocumentWarnings* warnings = nullptr);
     /// One fault in words, such as "status=503,at=2,count=1". A comma in a value is written twice. None, with the
     /// reason in `complaint`, for what is no fault.
     static std::optional<Fault> readWords(const std::string& words, std::string& complaint);

@@ -124,6 +124,7 @@ void ConversationWidget::choosePalette() {
 
 void ConversationWidget::layOut() {
     layoutRequested_ = false;
+    heightsChanged_ = false;
     layingOut_ = true;
     const auto turn = anchor();
     const double before = turn ? host_.conversation()->topOf(*turn) : 0.0;
@@ -137,6 +138,9 @@ void ConversationWidget::layOut() {
     rings_.update();
     update();
     AccessibleConversation::changed(*this);
+    if (heightsChanged_) {
+        requestLayout();
+    }
 }
 
 bool ConversationWidget::standsStill() const {
@@ -211,13 +215,25 @@ void ConversationWidget::requestLayout() {
         Qt::QueuedConnection);
 }
 
-/// What has changed within its card, such as a distance when the user moves: heights change by the controllers' word
-/// alone.
-void ConversationWidget::layOutMarked() {
-    layoutRequested_ = false;
+void ConversationWidget::layOutWindow() {
     layingOut_ = true;
     host_.window()->layoutIfNeeded();
     layingOut_ = false;
+}
+
+/// What has changed within its card, such as a distance when the user moves. Where a card is of another height now, by
+/// its controller's word or without it, everything is laid out.
+void ConversationWidget::layOutMarked() {
+    layoutRequested_ = false;
+    const auto& turns = host_.conversation()->turns();
+    if (heightsChanged_) {
+        layOut();
+        return;
+    }
+    layOutWindow();
+    if (std::any_of(turns.begin(), turns.end(), [](const auto& turn) { return turn->card()->isOutdated(); })) {
+        layOut();
+    }
 }
 
 void ConversationWidget::updateBar() {
@@ -238,7 +254,9 @@ void ConversationWidget::resizeCard(platform::HostSnippetViewController& control
         return;
     }
     if (pinTop) {
-        layOut();
+        // At the next turn, once for all rows that tell.
+        heightsChanged_ = true;
+        requestLayout();
         return;
     }
     // At once: a bottom that stays while its card grows would push everything else about.
@@ -299,7 +317,8 @@ void ConversationWidget::scrollBy(const QKeyEvent& key) {
 
 void ConversationWidget::paintEvent(QPaintEvent* event) {
     if (layoutRequested_) {
-        layOutMarked();
+        // What is painted is in place; heights follow with the turn that was asked for.
+        layOutWindow();
     }
     lastPainted_ = event->region();
     QPainter painter(this);

@@ -71,6 +71,7 @@ class ConversationWidget : public QWidget {
 
     void layOut();
     void requestLayout();
+    void layOutWindow();
     void layOutMarked();
     /// The next picture of what moves.
     void move();
@@ -117,6 +118,7 @@ class ConversationWidget : public QWidget {
     double wheelRest_ = 0.0;
     bool layingOut_ = false;
     bool layoutRequested_ = false;
+    bool heightsChanged_ = false;
     QRegion lastPainted_;
 };
 

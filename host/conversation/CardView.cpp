@@ -7,7 +7,10 @@
 #include "host/conversation/Measures.h"
 #include "host/conversation/Shapes.h"
 #include "platform/assistant/AssistantSettings.h"
+#include "platform/base/MainLoop.h"
 #include "platform/base/Platform.h"
+#include "platform/layout/LayoutTypes.h"
+#include "platform/ui/Device.h"
 #include "platform/ui/Window.h"
 
 namespace ktr::host {
@@ -16,8 +19,20 @@ using namespace platform;
 
 namespace {
 
+/// What rows have to get their images before their card unfolds, seconds.
+constexpr double kFolded = 0.25;
+
 bool rightToLeft() {
     return Platform::installed()->assistant->languageIsRightToLeft();
+}
+
+bool awaitsImages(const View& view) {
+    const auto* image = dynamic_cast<const ImageView*>(&view);
+    if (image != nullptr && image->isAwaitingImage()) {
+        return true;
+    }
+    const auto& views = view.presentedSubviews();
+    return std::any_of(views.begin(), views.end(), [](const auto& subview) { return awaitsImages(*subview); });
 }
 
 }  // namespace
@@ -72,16 +87,35 @@ void CardView::setController(const std::shared_ptr<HostSnippetViewController>& c
     content_->addSubview(controller->view());
     controller->updateViewConstraints();
     controller->viewWillAppear(false);
+    isFolded_ = awaitsImages(*content_);
+    if (isFolded_) {
+        unfolding_ = Platform::installed()->mainLoop->schedule(kFolded, false, [weakSelf = weak(this)] {
+            if (const auto self = weakSelf.lock()) {
+                self->unfold();
+            }
+        });
+    }
+}
+
+void CardView::unfold() {
+    isFolded_ = false;
+    unfolding_.reset();
+    setNeedsLayout();
 }
 
 void CardView::chooseFont() {
     title_->setFont(preferredFont(TextStyle::Headline));
+    isLarge_ = isAccessibilityCategory(Platform::installed()->device->contentSizeCategory());
 }
 
 void CardView::letGo() {
     if (!controller_) {
         return;
     }
+    if (unfolding_) {
+        unfolding_->invalidate();
+    }
+    unfold();
     controller_->viewWillDisappear(false);
     if (const auto view = controller_->viewIfLoaded()) {
         view->removeFromSuperview();
@@ -98,19 +132,48 @@ void CardView::setStill(const std::shared_ptr<StillView>& still) {
 double CardView::heightForWidth(double width) {
     if (still_) {
         contentHeight_ = still_->heightForWidth(width);
-        content_->setFrame({0.0, measures::kHeaderHeight, width, contentHeight_});
+        content_->setFrame({0.0, headerHeight(), width, contentHeight_});
         still_->setFrame(content_->bounds());
         content_->layoutIfNeeded();
     } else if (controller_) {
         // Rows measure themselves at the width that they have: it is given first, the height follows.
-        content_->setFrame({0.0, measures::kHeaderHeight, width, contentHeight_});
-        content_->layoutIfNeeded();
-        contentHeight_ = std::max(controller_->desiredHeightForWidth(width), 0.0);
-        content_->setFrame({0.0, measures::kHeaderHeight, width, contentHeight_});
-        content_->layoutIfNeeded();
+        layOutContent(width, contentHeight_);
+        const double desired = controller_->desiredHeightForWidth(width);
+        knownEdge_ = lowerEdge();
+        layOutContent(width, std::max({desired, knownEdge_, 0.0}));
+        isFolded_ = isFolded_ && awaitsImages(*content_);
     }
     updateRing();
-    return measures::kHeaderHeight + contentHeight_;
+    return headerHeight() + (isFolded_ ? 0.0 : contentHeight_);
+}
+
+void CardView::layOutContent(double width, double height) {
+    contentHeight_ = height;
+    content_->setFrame({0.0, headerHeight(), width, height});
+    content_->layoutIfNeeded();
+}
+
+double CardView::headerHeight() const {
+    return isLarge_ ? measures::kLargeHeaderHeight : measures::kHeaderHeight;
+}
+
+double CardView::lowerEdge() const {
+    const auto view = controller_ ? controller_->viewIfLoaded() : nullptr;
+    constexpr double kCompressed = 1.0;
+    return view ? view->systemLayoutSizeFitting({content_->bounds().width, kCompressedFittingExtent}, kRequiredPriority,
+                                                kCompressed)
+                      .height
+                : 0.0;
+}
+
+bool CardView::isOutdated() const {
+    constexpr double kSameHeight = 1e-6;
+    if (!controller_ || content_->bounds().width <= 0.0) {
+        return false;
+    }
+    const bool isUnfolding = !isFolded_ || !awaitsImages(*content_);
+    return std::abs(lowerEdge() - knownEdge_) > kSameHeight ||
+           (isUnfolding && frame().height <= headerHeight() && contentHeight_ > 0.0);
 }
 
 void CardView::updateRing() {
@@ -119,7 +182,7 @@ void CardView::updateRing() {
 
 void CardView::layoutSubviews() {
     layOutHeader();
-    content_->setFrame({0.0, measures::kHeaderHeight, bounds().width, contentHeight_});
+    content_->setFrame({0.0, headerHeight(), bounds().width, contentHeight_});
     overlay_->setFrame(bounds());
 }
 
@@ -127,14 +190,15 @@ void CardView::layOutHeader() {
     const double width = bounds().width;
     const bool rtl = rightToLeft();
     const auto place = [&](View& view, const Rect& rect) { view.setFrame(mirrored(rect, width, rtl)); };
-    place(*icon_, {measures::kAxisAvatar - measures::kHeaderIcon / 2.0, measures::kHeaderIconTop, measures::kHeaderIcon,
-                   measures::kHeaderIcon});
+    const double icon = isLarge_ ? measures::kLargeHeaderIcon : measures::kHeaderIcon;
+    const double iconTop = isLarge_ ? measures::kLargeHeaderIconTop : measures::kHeaderIconTop;
+    place(*icon_, {measures::kAxisAvatar - icon / 2.0, iconTop, icon, icon});
     const double ringStart = width - measures::kRingToEnd - measures::kRing;
     const double titleEnd = ring_->hidden() ? width - measures::kCardInset : ringStart - measures::kCardInset;
     const double titleHeight = title_->font().lineHeight();
-    place(*title_, {measures::kAxisText, std::floor((measures::kHeaderHeight - titleHeight) / 2.0),
+    place(*title_, {measures::kAxisText, std::floor((headerHeight() - titleHeight) / 2.0),
                     std::max(titleEnd - measures::kAxisText, 0.0), titleHeight});
-    place(*ring_, {ringStart, (measures::kHeaderHeight - measures::kRing) / 2.0, measures::kRing, measures::kRing});
+    place(*ring_, {ringStart, (headerHeight() - measures::kRing) / 2.0, measures::kRing, measures::kRing});
 }
 
 void CardView::redraw(const std::optional<Rect>& rect) const {

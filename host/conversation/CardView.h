@@ -5,6 +5,7 @@
 
 #include "host/conversation/RingView.h"
 #include "host/conversation/StillView.h"
+#include "platform/base/Timer.h"
 #include "platform/host/HostSnippetViewController.h"
 #include "platform/ui/ImageView.h"
 #include "platform/ui/Label.h"
@@ -29,8 +30,15 @@ class CardView : public platform::View {
     const std::shared_ptr<StillView>& still() const { return still_; }
     /// Takes the font that fits the text size of now.
     void chooseFont();
-    /// Asks the controller for its height at this width and lays everything out; the card's height, points.
+    /// Asks the controller for its height at this width and lays everything out; the card's height, points. The content
+    /// has the height that the controller wants, or the one that its rows have, if that is larger. A card whose rows
+    /// still wait for their images is folded: it is its header alone until they have them, for 0.25 seconds at most.
     double heightForWidth(double width);
+    /// Something has changed without the controller's word: the card would be of another height now. The content has to
+    /// be laid out.
+    bool isOutdated() const;
+    /// What changes in very large text takes its new place at once.
+    bool growsAtOnce() const { return isLarge_; }
     void layoutSubviews() override;
     platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Group; }
 
@@ -54,6 +62,11 @@ class CardView : public platform::View {
     class Overlay;
 
     void layOutHeader();
+    void layOutContent(double width, double height);
+    double headerHeight() const;
+    /// The lower edge of what stands in the content, points.
+    double lowerEdge() const;
+    void unfold();
     void redraw(const std::optional<platform::Rect>& rect) const;
 
     std::shared_ptr<platform::HostSnippetViewController> controller_;
@@ -65,6 +78,12 @@ class CardView : public platform::View {
     std::shared_ptr<Overlay> overlay_;
     std::optional<platform::Rect> highlight_;
     double contentHeight_ = 0.0;
+    /// Of `lowerEdge` when the height was asked for.
+    double knownEdge_ = 0.0;
+    bool isFolded_ = false;
+    /// The text size of now is an accessibility size.
+    bool isLarge_ = false;
+    std::shared_ptr<platform::Timer> unfolding_;
     double opacity_ = 1.0;
 };
 

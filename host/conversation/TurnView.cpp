@@ -123,7 +123,7 @@ void TurnView::layOutNarrow(double width, bool first) {
 }
 
 void TurnView::setCardHeight(double height, double width) {
-    const bool moves = style_ == MotionStyle::Full && laidOutCard_ == width;
+    const bool moves = style_ == MotionStyle::Full && laidOutCard_ == width && !card_->growsAtOnce();
     laidOutCard_ = width;
     if (!moves) {
         growth_ = Motion(height);

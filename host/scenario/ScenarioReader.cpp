@@ -112,8 +112,9 @@ void readScenario(documents::FieldReader& fields, platform::Date now, bool withC
 
 }  // namespace
 
-std::variant<Scenario, documents::DocumentError> ScenarioReader::readText(
-    std::string_view text, const std::string& file, documents::DocumentWarnings* warnings) const {
+std::variant<Scenario, documents::DocumentError> ScenarioReader::readText(std::string_view text,
+                                                                          const std::string& file,
+                                                                          documents::DocumentWarnings* warnings) const {
     Scenario scenario;
     scenario.file = file;
     const auto read = [&](documents::FieldReader& fields) {

@@ -42,7 +42,8 @@ class ConfiguredAccountStore : public platform::AccountStore {
     Configuration configuration() const;
     /// What was wrong at the last `load`, in one line; empty when nothing was. Any thread.
     std::string problem() const;
-    /// Whether the configuration itself could not be used at the last `load`, so that an earlier one counts. Any thread.
+    /// Whether the configuration itself could not be used at the last `load`, so that an earlier one counts. Any
+    /// thread.
     bool isBroken() const;
     std::filesystem::path configurationFile() const { return file_; }
     /// The file that a change of the token changes; empty when no file is asked.

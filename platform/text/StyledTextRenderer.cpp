@@ -1,5 +1,6 @@
 #include "platform/text/StyledTextRenderer.h"
 
+#include <algorithm>
 #include <cmath>
 
 #include "platform/base/Platform.h"
@@ -13,6 +14,15 @@ constexpr double kRoundingSlack = 1e-6;
 
 double roundedUp(double points, double scale) {
     return scale > 0.0 ? std::ceil(points * scale - kRoundingSlack) / scale : points;
+}
+
+/// The lower edge of the used rectangle: it may begin below an exclusion that is too wide for the first word.
+double lowerEdge(const TextLayout& layout) {
+    double edge = 0.0;
+    for (const TextLayout::Line& line : layout.lines()) {
+        edge = std::max(edge, line.box.maxY());
+    }
+    return edge;
 }
 
 }  // namespace
@@ -36,7 +46,7 @@ std::shared_ptr<TextImage> StyledTextRenderer::image(const AttributedString& tex
     container.lineBreakMode = options.lineBreakMode;
     container.rightToLeft = options.rightToLeft;
     auto layout = engine_->layOut(text, container);
-    const Size size = {width, roundedUp(layout->usedSize().height, options.scale)};
+    const Size size = {width, roundedUp(lowerEdge(*layout), options.scale)};
     return engine_->image(std::move(layout), size, options.scale);
 }
 

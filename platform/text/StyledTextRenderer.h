@@ -35,8 +35,8 @@ class KTR_API StyledTextRenderer {
     static std::shared_ptr<StyledTextRenderer> make();
     explicit StyledTextRenderer(std::shared_ptr<TextEngine> engine) : engine_(std::move(engine)) {}
 
-    /// As wide as asked, and as high as the text's used rectangle, rounded up to a pixel. None for an empty text and
-    /// for a width that is not greater than 0 or has no end.
+    /// As wide as asked, and down to the lower edge of the text's used rectangle, rounded up to a pixel. None for an
+    /// empty text and for a width that is not greater than 0 or has no end.
     std::shared_ptr<TextImage> image(const AttributedString& text, double width,
                                      const StyledTextOptions& options) const;
 

@@ -9,6 +9,7 @@ ImageView::ImageView() {
 }
 
 void ImageView::setImage(std::shared_ptr<Image> image) {
+    isAwaitingImage_ = false;
     if (image == image_) {
         return;
     }

@@ -16,6 +16,9 @@ class KTR_API ImageView : public View {
     ImageView();
     std::shared_ptr<Image> image() const { return image_; }
     void setImage(std::shared_ptr<Image> image);
+    /// An image is being made for the view: what stands around it may wait for it. Ends with the next `setImage`.
+    bool isAwaitingImage() const { return isAwaitingImage_; }
+    void awaitImage() { isAwaitingImage_ = true; }
     ContentMode contentMode() const { return contentMode_; }
     void setContentMode(ContentMode mode);
     IntrinsicSize intrinsicContentSize(double widthLimit) const override;
@@ -26,6 +29,7 @@ class KTR_API ImageView : public View {
   private:
     std::shared_ptr<Image> image_;
     ContentMode contentMode_ = ContentMode::ScaleToFill;
+    bool isAwaitingImage_ = false;
 };
 
 }  // namespace ktr::platform

@@ -20,6 +20,15 @@ constexpr std::size_t kMostChanges = 32;
 
 }  // namespace
 
+void StackView::setDistribution(Distribution distribution) {
+    KTR_ASSERT_MAIN_THREAD();
+    if (distribution != distribution_) {
+        distribution_ = distribution;
+        misplaced_ = 0;
+        setNeedsLayout();
+    }
+}
+
 void StackView::addArrangedSubview(const std::shared_ptr<View>& view) {
     insertArrangedSubview(view, arranged_.size());
 }
@@ -164,6 +173,17 @@ void StackView::readHeights(double width) {
     }
 }
 
+double StackView::evenShare(double height) const {
+    // Sums of the same heights differ in their last bits: that is no room.
+    constexpr double kNoRoom = 1e-6;
+    const double left = height - used_;
+    if (distribution_ == Distribution::FillLast || left < kNoRoom) {
+        return 0.0;
+    }
+    const auto hidden = std::count(heights_.begin(), heights_.end(), kHidden);
+    return left / static_cast<double>(std::max<std::ptrdiff_t>(std::ssize(heights_) - hidden, 1));
+}
+
 void StackView::layoutSubviews() {
     View::layoutSubviews();
     const Rect room = bounds();
@@ -176,6 +196,11 @@ void StackView::layoutSubviews() {
         // What room is left changes, and with it the one that has it or had it.
         misplaced_ = std::min({misplaced_, stretched, last_});
     }
+    const double share = evenShare(room.height);
+    if (share != placedShare_) {
+        misplaced_ = 0;
+        placedShare_ = share;
+    }
     placedFor_ = room.size();
     const std::size_t begin = std::exchange(misplaced_, arranged_.size());
     if (begin >= arranged_.size()) {
@@ -186,7 +211,8 @@ void StackView::layoutSubviews() {
         if (heights_[i] == kHidden) {
             continue;
         }
-        const double height = i == last_ ? heights_[i] + std::max(0.0, room.height - used_) : heights_[i];
+        const bool takesTheRest = i == last_ && distribution_ == Distribution::FillLast;
+        const double height = heights_[i] + (takesTheRest ? std::max(0.0, room.height - used_) : share);
         if (i >= begin) {
             arranged_[i]->setFrame({0.0, y, room.width, height});
         }

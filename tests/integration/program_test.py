@@ -178,11 +178,18 @@ class ProgramTest(unittest.TestCase):
         wide = run("render", SCENARIOS / "dinner.json", "-o", picture, "--width", "8000", "--scale", "8")
         self.assert_refused(wide, 4, "32000")
 
-    def test_kinds_and_sizes_that_are_not_drawn_are_told(self):
+    def test_kinds_that_are_not_drawn_are_told(self):
         unknown = self.folder / "fence.json"
         unknown.write_text('{"snippet": {"kind": "VAWeatherSnippet"}}')
         self.assert_refused(run("describe", unknown), 4, "VAWeatherSnippet")
-        self.assert_refused(run("describe", SCENARIOS / "dinner.json", "--text-size", "AX3"), 4, "AX1 to AX5")
+
+    def test_every_text_size_is_drawn(self):
+        said = run("describe", SCENARIOS / "dinner.json").stdout
+        for size in ["AX1", "AX2", "AX3", "AX4", "AX5"]:
+            large = run("describe", SCENARIOS / "dinner.json", "--text-size", size)
+            self.assertEqual((large.returncode, large.stderr), (0, ""), size)
+            for word in ["Ann", "min"]:
+                self.assertEqual(large.stdout.count(word), said.count(word), size)
 
     def test_broken_scenarios_are_one_line(self):
         bad = {

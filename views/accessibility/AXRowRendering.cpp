@@ -39,6 +39,7 @@ bool AXRowRendering::initForRow(const KTRVelaBaseView& row) {
     // Until a new width has its image, the old one stands where the text begins.
     imageView_->setContentMode(row.isRTLUI() ? platform::ContentMode::TopRight : platform::ContentMode::TopLeft);
     imageView_->setTranslatesAutoresizingMaskIntoConstraints(false);
+    imageView_->awaitImage();
     renderer_ = platform::StyledTextRenderer::make();
     return true;
 }

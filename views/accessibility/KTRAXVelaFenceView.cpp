@@ -86,4 +86,8 @@ void KTRAXVelaFenceView::layoutSubviews() {
     }
 }
 
+std::string KTRAXVelaFenceView::accessibilityText() const {
+    return Platform::installed() ? AXRowTexts::spoken({friendName().value_or(""), fenceSentence()}) : "";
+}
+
 }  // namespace ktr

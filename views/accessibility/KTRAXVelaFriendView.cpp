@@ -2,6 +2,7 @@
 
 #include "model/KTRVAUIUtils.h"
 #include "model/LogCategory.h"
+#include "model/PluginBundle.h"
 #include "platform/base/Format.h"
 #include "platform/base/Platform.h"
 
@@ -81,6 +82,20 @@ void KTRAXVelaFriendView::layoutSubviews() {
     if (rendering_->isDue(*this) && Platform::installed()) {
         generateImageForView();
     }
+}
+
+std::string KTRAXVelaFriendView::accessibilityText() const {
+    if (!Platform::installed()) {
+        return "";
+    }
+    const auto filled = [](const char* key, const std::string& text) {
+        return text.empty() ? "" : platform::formatted(AssistantLocalizedString(key), {text});
+    };
+    const std::string place = placeText();
+    const bool isPlaced = location() && location()->hasCoordinate();
+    return AXRowTexts::spoken({nameText(), isPlaced ? filled("ACCESSIBILITY_AT_LABEL", place) : place,
+                               isVisibility() ? "" : filled("ACCESSIBILITY_DISTANCE", distanceText()),
+                               ageText(LabelAccessibilityStringKey)});
 }
 
 }  // namespace ktr

@@ -262,6 +262,7 @@ TEST_F(KTRConversationWidgetTest, HeightChange_KeepsTheCardsTopOrItsBottom) {
     const double topBefore = top();
     controller->height += 300.0;
     host->delegate().heightDidChange(*controller, true);
+    QApplication::processEvents();
     EXPECT_NEAR(top(), topBefore, 1.0);
     const double bottomBefore = bottom();
     controller->height += 300.0;

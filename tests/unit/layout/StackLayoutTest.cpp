@@ -43,6 +43,29 @@ TEST_F(StackLayoutTest, OneUnderTheOther_AsWideAsTheStack_TheLastTakesTheRest) {
     EXPECT_EQ(b->frame(), (Rect{0, 20, 200, 80}));
 }
 
+TEST_F(StackLayoutTest, FillEvenly_AllHaveTheSameOfWhatIsLeft) {
+    stack->setDistribution(StackView::Distribution::FillEvenly);
+    const auto a = box(20);
+    const auto b = box(30);
+    const auto c = box(10);
+    for (const auto& view : {a, b, c}) {
+        stack->addArrangedSubview(view);
+    }
+    c->setHidden(true);
+    stack->layoutIfNeeded();
+    EXPECT_EQ(a->frame(), (Rect{0, 0, 200, 45}));
+    EXPECT_EQ(b->frame(), (Rect{0, 45, 200, 55}));
+    c->setHidden(false);
+    stack->setFrame({5, 5, 200, 120});
+    stack->layoutIfNeeded();
+    EXPECT_EQ(a->frame(), (Rect{0, 0, 200, 40}));
+    EXPECT_EQ(c->frame(), (Rect{0, 90, 200, 30}));
+    stack->setFrame({5, 5, 200, 50});
+    stack->layoutIfNeeded();
+    EXPECT_EQ(a->frame(), (Rect{0, 0, 200, 20}));
+    EXPECT_EQ(c->frame(), (Rect{0, 50, 200, 10}));
+}
+
 TEST_F(StackLayoutTest, HigherThanTheStack_GoesBeyondIt) {
     const auto a = box(70);
     const auto b = box(60);

@@ -224,7 +224,7 @@ TEST_F(KTRAXVelaFriendViewTest, Height_IsMeasuredWiderThanTheImage_IsKept) {
     const auto row = rowFor(ann());
     const double measured = row->sizeForText(row->attributedStringForView(), 620.0, row->exclusionPaths()).height;
     EXPECT_EQ(row->estimagedHeightForView(), measured + 30.5);
-    EXPECT_EQ(log->texts(LogLevel::Debug).back(), "Calculating estimated height");
+    EXPECT_TRUE(log->has(LogLevel::Debug, "Calculating estimated height"));
     time->runPosted();
     row->setFrame({0.0, 0.0, 320.0, 0.0});
     EXPECT_EQ(row->estimagedHeightForView(),
@@ -430,11 +430,15 @@ TEST_F(KTRAXVelaFriendViewTest, ScreenReader_HearsOneLinkAndNoImage) {
     time->advance(0.2);
     window->addSubview(row);
     layOut(row, 640.0);
+    localization->set(kBundle, "ACCESSIBILITY_AT_LABEL", "At %@");
+    localization->set(kBundle, "ACCESSIBILITY_DISTANCE", "%@ away");
+    localization->set(kBundle, "ACCESSIBILITY_LOCATED_MINUTES", "%@ minutes ago");
     const auto tree = accessibilityTree(window, false);
-    for (const auto& node : tree.children) {
-        EXPECT_NE(node.role, AccessibilityRole::Image);
-        EXPECT_EQ(node.view.lock(), row);
-    }
+    ASSERT_EQ(tree.children.size(), 1u);
+    EXPECT_EQ(tree.children[0].role, AccessibilityRole::Link);
+    EXPECT_EQ(tree.children[0].view.lock(), row);
+    EXPECT_TRUE(tree.children[0].children.empty());
+    EXPECT_EQ(tree.children[0].text, "Ann, At Springfield, 111 m away, 5 minutes ago");
 }
 
 }  // namespace ktr
