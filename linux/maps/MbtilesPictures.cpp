@@ -44,6 +44,10 @@ bool MbtilesPictures::read(std::string& error) {
     if (facts_.format.empty() || facts_.format == "pbf" || facts_.format == "mvt") {
         return false;  // vector tiles: another ground's
     }
+    if (facts_.format == "webp" || facts_.format == "image/webp") {
+        error = "its pictures are WebP; PNG and JPEG are read";
+        return false;
+    }
     const auto coarsest = facts_.coarsest ? facts_.coarsest : file_->coarsestLevel();
     const auto finest = facts_.finest ? facts_.finest : file_->finestLevel();
     if (!coarsest || !finest || *coarsest > *finest) {

@@ -129,6 +129,13 @@ TEST_F(ConfiguredMapsTest, NothingConfigured_IsTheBuiltInWorld) {
     EXPECT_NE(drawn.pixels.pixelColor(5, 110), drawn.pixels.pixelColor(395, 110));
 }
 
+TEST_F(ConfiguredMapsTest, AFileOfPicturesThatAreNotRead_IsSaid) {
+    write("webp", "RIFF\x1a\0\0\0WEBPVP8L");
+    EXPECT_EQ(drawFile().attribution, "Natural Earth");
+    EXPECT_TRUE(log->has(platform::LogLevel::Default,
+                         "The map " + path() + " cannot be read: its pictures are WebP; PNG and JPEG are read"));
+}
+
 TEST_F(ConfiguredMapsTest, AFile_ComesBeforeTheWorld) {
     write("png", pngOf(256));
     EXPECT_EQ(drawFile().attribution, "Offline map");
