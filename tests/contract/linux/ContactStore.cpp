@@ -1,9 +1,9 @@
 #include <QFile>
 #include <QTemporaryDir>
 
-#include "linux/contacts/VCardContactStore.h"
+#include "linux/contacts/ContactFiles.h"
+#include "linux/contacts/MemoryContactStore.h"
 #include "tests/contract/ContactStoreContract.h"
-#include "tests/support/RecordingLogSink.h"
 
 namespace ktr::test {
 
@@ -32,19 +32,17 @@ std::shared_ptr<ContactStore> fromVCards(const ContactStore::Contacts& contacts)
         file.write(QByteArray::fromStdString(card + "\r\nEND:VCARD\r\n"));
     }
     file.close();
-    RecordingLogSink log;
-    const auto loaded = linux_::VCardContactStore::load(file.fileName().toStdString(),
-                                                        std::make_shared<linux_::PhonenumberLibrary>(), "gb", log);
-    EXPECT_EQ(loaded.error, std::nullopt);
-    EXPECT_TRUE(log.texts().empty());
-    return loaded.result;
+    std::string error;
+    const auto read = linux_::ContactFiles::read({file.fileName().toStdString()}, error);
+    EXPECT_TRUE(read) << error;
+    return inMemory(read.value_or(ContactStore::Contacts()));
 }
 
 }  // namespace
 
 INSTANTIATE_TEST_SUITE_P(Linux, ContactStoreContract,
                          ::testing::Values(ContactStoreCase{"MemoryContactStore", inMemory},
-                                           ContactStoreCase{"VCardContactStore", fromVCards}),
+                                           ContactStoreCase{"VCards", fromVCards}),
                          [](const auto& tested) { return tested.param.name; });
 
 }  // namespace ktr::test
