@@ -16,6 +16,7 @@ namespace {
 
 constexpr unsigned kHttp10 = 10;
 constexpr unsigned kHttp11 = 11;
+constexpr int kFirstStatus = 100;
 constexpr int kSwitchingProtocols = 101;
 constexpr int kFirstFinalStatus = 200;
 constexpr int kNoContent = 204;
@@ -52,6 +53,8 @@ void AnswerParser::headArrived() {
         give(State::Broken, "the answer is of another version of HTTP");
     } else if (static_cast<std::size_t>(std::distance(answer.begin(), answer.end())) > kMostFields) {
         give(State::TooLarge, "the answer's header is too large");
+    } else if (status() < kFirstStatus) {
+        give(State::Broken, "the answer is no proper HTTP");
     } else if (hasBody && parser_->beast.content_length().value_or(0) > maximumBytes_) {
         // The parser sees it too, but passes over it where a part of the body has come with the header.
         give(State::TooLarge, "the answer is too large");

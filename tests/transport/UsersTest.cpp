@@ -216,6 +216,27 @@ TEST_P(UsersTest, ResetsAtAccept_AreMetWithOneConnection) {
     EXPECT_EQ(server->connections(), 1);
 }
 
+using QuestionTest = TransportTest;
+
+TEST_F(QuestionTest, WithoutCredentials_NobodyIsAsked) {
+    serve(gladly());
+    for (const bool isWithHost : {true, false}) {
+        linux_::AssistantClient client([&] {
+            linux_::AssistantClient::Settings made;
+            made.host = isWithHost ? std::optional(server->host()) : std::nullopt;
+            made.certificateFiles = settings.certificateFiles;
+            return made;
+        });
+        std::promise<linux_::AssistantClient::Answer> done;
+        client.ask("Hide me", [&done](const auto& answer) { done.set_value(answer); });
+        const auto answer = done.get_future().get();
+        EXPECT_EQ(answer.failure, platform::HttpFailure::BadRequest);
+        EXPECT_EQ(answer.reason, "there is no account with a token");
+    }
+    EXPECT_EQ(server->connections(), 0);
+    EXPECT_TRUE(log->texts(platform::LogLevel::Error).empty());
+}
+
 std::string nameOf(const ::testing::TestParamInfo<User>& info) {
     return info.param == User::Command ? "Command" : info.param == User::Question ? "Question" : "Tile";
 }

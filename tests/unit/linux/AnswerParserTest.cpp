@@ -76,6 +76,7 @@ TEST(AnswerParserTest, WhatIsNoAnswer) {
         {"HTTP/1.1 200 OK\r\nContent-Length: 5\r\nTransfer-Encoding: chunked\r\n\r\n0\r\n\r\n", kNone},
         {"HTTP/1.1 200 OK\r\nX Y: z\r\n\r\n", kNone},
         {"HTTP/1.1 200 OK\nContent-Length: 0\n\n", kNone},
+        {"HTTP/1.1 013 Odd\r\n\r\nx", kNone},
         {"HTTP/1.1 2000 OK\r\n\r\n", kNone},
         {"HTTP/1.1 200 OK\r\nTransfer-Encoding: gzip\r\n\r\nx", "the answer is coded in an unknown way"},
         {"HTTP/1.1 101 Switching\r\nUpgrade: h2c\r\n\r\n", "the answer changes the protocol"},
