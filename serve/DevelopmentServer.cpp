@@ -8,6 +8,7 @@
 #include "documents/JsonReader.h"
 #include "platform/base/Json.h"
 #include "serve/AssistantAnswers.h"
+#include "server/answers/CommandRequest.h"
 #include "server/http/BasicCredentials.h"
 #include "server/http/HttpServer.h"
 #include "server/http/TlsContext.h"
@@ -22,7 +23,6 @@ using server::HttpResponse;
 
 namespace {
 
-constexpr const char* kJson = "application/json";
 constexpr const char* kCommands = "/qloxservice/friends/va/";
 /// All clients share one address.
 constexpr std::size_t kMostClients = 1000;
@@ -40,10 +40,6 @@ struct Command {
 
 constexpr Command kAllCommands[] = {{"getlocations", &LocationService::getLocations},
                                     {"showHideLocation", &LocationService::showHideLocation}};
-
-HttpResponse refusalOf(int status, const std::string& message) {
-    return HttpResponse::json(status, platform::writeJson(Dictionary{{"statusCode", status}, {"message", message}}));
-}
 
 std::string replaced(std::string text, const std::string& what, const std::string& with) {
     for (std::size_t at = text.find(what); at != std::string::npos; at = text.find(what, at + with.size())) {
@@ -102,7 +98,7 @@ class DevelopmentServer::Server {
 
     void route(HttpRequest request, const HttpReply& reply) {
         if (!isForUs(request)) {
-            return reply.send(refusalOf(421, "this service is for localhost alone"));
+            return reply.send(server::refusal(421, "this service is for localhost alone"));
         }
         if (request.path == "/assistant") {
             return reply.send(ask(request));
@@ -112,7 +108,7 @@ class DevelopmentServer::Server {
                 return run(command, std::move(request), reply);
             }
         }
-        reply.send(refusalOf(404, "there is no such path"));
+        reply.send(server::refusal(404, "there is no such path"));
     }
 
     /// A web page that resolves its own name to loopback must not read the answers.
@@ -143,7 +139,7 @@ class DevelopmentServer::Server {
     HttpResponse ask(const HttpRequest& request) const {
         if (request.method != "POST") {
             // A question may be a wish, and a page of another site, a link or a look ahead can make a GET.
-            HttpResponse response = refusalOf(405, "a question is a POST");
+            HttpResponse response = server::refusal(405, "a question is a POST");
             response.headers.emplace_back("Allow", "POST");
             return response;
         }
@@ -151,7 +147,7 @@ class DevelopmentServer::Server {
             return *refused;
         }
         // Nor can it send this type without asking whether it may.
-        if (const auto refused = refusalOfType(request)) {
+        if (const auto refused = server::refusalOfType(request)) {
             return *refused;
         }
         const auto document = documents::JsonReader::read(request.body);
@@ -159,7 +155,7 @@ class DevelopmentServer::Server {
         const auto* members = value != nullptr ? value->dictionary() : nullptr;
         const auto* question = members != nullptr ? members->find("question") : nullptr;
         if (question == nullptr || question->string() == nullptr) {
-            return refusalOf(400, "expected a question: {\"question\": \"Where is Ann?\"}");
+            return server::refusal(400, "expected a question: {\"question\": \"Where is Ann?\"}");
         }
         return HttpResponse::json(200, platform::writeJson(assistant_.answer(*question->string(), now())));
     }
@@ -168,30 +164,15 @@ class DevelopmentServer::Server {
         if (server::sameSecret(request.headerText("Authorization"), authorization_)) {
             return std::nullopt;
         }
-        HttpResponse response = refusalOf(401, "the credentials are missing or wrong");
+        HttpResponse response = server::refusal(401, "the credentials are missing or wrong");
         response.headers.emplace_back("WWW-Authenticate", "Basic realm=\"ktr serve\"");
         return response;
     }
 
-    static std::optional<HttpResponse> refusalOfType(const HttpRequest& request) {
-        if (request.headerText("Content-Type").rfind(kJson, 0) == 0) {
-            return std::nullopt;
-        }
-        return refusalOf(415, "expected the header Content-Type: application/json");
-    }
-
     /// What is wrong with a command's request around its body.
     std::optional<HttpResponse> refusal(const HttpRequest& request) const {
-        if (auto refused = refusalOfCredentials(request)) {
-            return refused;
-        }
-        if (request.headerText("X-Orcha-Seek-API-Ver") != "4.0") {
-            return refusalOf(400, "expected the header X-Orcha-Seek-API-Ver: 4.0");
-        }
-        if (request.headerText("X-Orcha-AuthScheme") != "Forever") {
-            return refusalOf(400, "expected the header X-Orcha-AuthScheme: Forever");
-        }
-        return refusalOfType(request);
+        const auto refused = refusalOfCredentials(request);
+        return refused ? refused : server::refusalOfCommand(request);
     }
 
     void run(const Command& command, HttpRequest request, const HttpReply& reply) {
@@ -236,10 +217,10 @@ class DevelopmentServer::Server {
             if (auto given = (service_.*command.answer)(*value->dictionary(), now(), fault, complaint)) {
                 const int status = fault.status == 0 ? 200 : fault.status;
                 return status < 300 ? HttpResponse::json(status, platform::writeJson(*given))
-                                    : refusalOf(status, "a fault that was asked for");
+                                    : server::refusal(status, "a fault that was asked for");
             }
         }
-        return refusalOf(400, complaint);
+        return server::refusal(400, complaint);
     }
 
     std::string locationOf(const std::string& redirect, const Command& command) const {

@@ -4,7 +4,7 @@
 #include <algorithm>
 #include <cmath>
 
-#include "documents/FieldReader.h"
+#include "server/answers/CommandRequest.h"
 
 namespace ktr::serve {
 
@@ -21,24 +21,6 @@ constexpr double kAtPlace = 150.0;
 /// How near to a street's waypoint an address has that street, and to a town's that town, metres.
 constexpr double kInStreet = 75.0;
 constexpr double kInTown = 10000.0;
-
-using Position = SharingState::Position;
-
-/// None without a position; 0/0 is what a client sends that knows none.
-std::optional<Position> readPosition(documents::FieldReader& request, const std::string& name) {
-    std::optional<Position> position;
-    request.object(name, [&](documents::FieldReader& fields) {
-        const auto latitude = fields.number("latitude");
-        const auto longitude = fields.number("longitude");
-        if (!latitude || !longitude || std::abs(*latitude) > 90.0 || std::abs(*longitude) > 180.0) {
-            fields.complain("", "expected a latitude and a longitude in degrees");
-        } else if (*latitude != 0.0 || *longitude != 0.0) {
-            position = Position{*latitude, *longitude};
-            position->accuracy = fields.number("horizontalAccuracy").value_or(position->accuracy);
-        }
-    });
-    return position;
-}
 
 void setWhenPresent(Dictionary& dictionary, const char* name, const std::optional<std::string>& text) {
     if (text) {
@@ -73,23 +55,21 @@ double LocationService::distance(double latitude, double longitude, const Waypoi
     return metres;
 }
 
-std::vector<LocationService::Asked> LocationService::friendsAskedFor(const Value::Array& handles) const {
+std::vector<LocationService::Asked> LocationService::friendsAskedFor(const std::vector<std::string>& handles) const {
     std::vector<Asked> asked;
-    for (const Value& value : handles) {
-        const std::string* handle = value.string();
-        const auto person = handle == nullptr ? file_.friends.end()
-                                              : std::find_if(file_.friends.begin(), file_.friends.end(),
-                                                             [&](const auto& one) { return one.answersTo(*handle); });
+    for (const std::string& handle : handles) {
+        const auto person = std::find_if(file_.friends.begin(), file_.friends.end(),
+                                         [&](const auto& one) { return one.answersTo(handle); });
         if (person == file_.friends.end()) {
             continue;
         }
         const auto before =
             std::find_if(asked.begin(), asked.end(), [&](const Asked& one) { return one.person == &*person; });
         if (before == asked.end()) {
-            asked.push_back({*handle, &*person});
-        } else if (before->handle.find('@') == std::string::npos && handle->find('@') != std::string::npos) {
+            asked.push_back({handle, &*person});
+        } else if (before->handle.find('@') == std::string::npos && handle.find('@') != std::string::npos) {
             // One entry a friend; an e-mail address comes back as it was asked for, a phone number may not.
-            before->handle = *handle;
+            before->handle = handle;
         }
     }
     return asked;
@@ -97,23 +77,11 @@ std::vector<LocationService::Asked> LocationService::friendsAskedFor(const Value
 
 std::optional<Dictionary> LocationService::getLocations(const Dictionary& request, const ServiceMoment& moment,
                                                         const Fault& fault, std::string& complaint) const {
-    documents::Complaints complaints;
-    documents::FieldReader fields(request, {}, complaints);
-    if (!fields.object("clientContext", [](documents::FieldReader&) {})) {
-        fields.complain("clientContext", "expected an object, found nothing");
-    }
-    fields.stringOrStrings("handles");
-    const auto mine = readPosition(fields, "myLocation");
-    const auto wanted = readPosition(fields, "requestedLocation");
-    std::optional<std::string> clientId;
-    fields.object("serverContext", [&](documents::FieldReader& context) { clientId = context.string("clientId"); });
-    if (complaints) {
-        complaint = complaints->path.text() + ": " + complaints->message;
+    const auto asks = server::LocationsRequest::read(request, complaint);
+    if (!asks) {
         return std::nullopt;
     }
-    const Value* handles = request.find("handles");
-    const bool listed = handles != nullptr && handles->array() != nullptr;
-    std::vector<Asked> asked = friendsAskedFor(listed ? *handles->array() : Value::Array());
+    std::vector<Asked> asked = friendsAskedFor(asks->handles);
     const int statusCode = fault.statusCode.value_or(200);
     if (statusCode == kPartial) {
         asked.resize((asked.size() + 1) / 2);
@@ -126,17 +94,17 @@ std::optional<Dictionary> LocationService::getLocations(const Dictionary& reques
         const bool faulty = fault.entryStatus && (fault.entry.empty() || person->answersTo(fault.entry));
         Dictionary entry{{"status", faulty ? *fault.entryStatus : person->hidden ? kNotReported : 200}};
         entry.set("location", place ? locationOf(*place, moment.millisecondsSince1970) : Value());
-        if (place && mine) {
-            entry.set("distanceInMeters", metresText(distance(mine->latitude, mine->longitude, *place)));
+        if (place && asks->mine) {
+            entry.set("distanceInMeters", metresText(distance(asks->mine->latitude, asks->mine->longitude, *place)));
         }
-        if (place && wanted) {
-            entry.set("match", distance(wanted->latitude, wanted->longitude, *place) <= kAtPlace);
+        if (place && asks->wanted) {
+            entry.set("match", distance(asks->wanted->latitude, asks->wanted->longitude, *place) <= kAtPlace);
         }
         locations.set(handle, entry);
         order.emplace_back(handle);
     }
     Dictionary context = serverContext(fault);
-    setWhenPresent(context, "clientId", clientId);
+    setWhenPresent(context, "clientId", asks->clientId);
     return Dictionary{
         {"statusCode", statusCode}, {"serverContext", context}, {"locations", locations}, {"emails", order}};
 }
@@ -173,25 +141,17 @@ Waypoint LocationService::placeAt(double latitude, double longitude) const {
 
 std::optional<Dictionary> LocationService::showHideLocation(const Dictionary& request, const ServiceMoment& moment,
                                                             const Fault& fault, std::string& complaint) const {
-    documents::Complaints complaints;
-    documents::FieldReader fields(request, {}, complaints);
-    std::optional<Position> position;
-    const bool hasContext = fields.object(
-        "clientContext", [&](documents::FieldReader& context) { position = readPosition(context, "location"); });
-    if (!hasContext) {
-        fields.complain("clientContext", "expected an object, found nothing");
-    }
-    std::optional<std::string> hide;
-    fields.object("prefs", [&](documents::FieldReader& preferences) { hide = preferences.string("hideLocation"); });
-    if (!complaints && hide != "Yes" && hide != "No") {
-        fields.complain("prefs", R"(expected "hideLocation" to be "Yes" or "No")");
-    }
-    if (complaints) {
-        complaint = complaints->path.text() + ": " + complaints->message;
+    const auto asks = server::SharingRequest::read(request, complaint);
+    if (!asks) {
         return std::nullopt;
     }
     if (fault.status < 300) {
-        sharing_->command(hide == "Yes", position);
+        std::optional<SharingState::Position> position;
+        if (asks->place) {
+            position = SharingState::Position{asks->place->latitude, asks->place->longitude};
+            position->accuracy = asks->place->accuracy.value_or(position->accuracy);
+        }
+        sharing_->command(asks->hides, position);
     }
     const auto known = sharing_->now();
     Dictionary myInfo;

@@ -45,7 +45,7 @@ class LocationService {
         std::string handle;  ///< as it was asked for
         const ServedFriend* person;
     };
-    std::vector<Asked> friendsAskedFor(const platform::Value::Array& handles) const;
+    std::vector<Asked> friendsAskedFor(const std::vector<std::string>& handles) const;
     platform::Dictionary serverContext(const Fault& fault) const;
 
     FriendsFile file_;

@@ -89,10 +89,14 @@ std::optional<HttpResponse> refusalOfCommand(const HttpRequest& request) {
     if (request.headerText("X-Orcha-AuthScheme") != "Forever") {
         return refusal(400, "expected the header X-Orcha-AuthScheme: Forever");
     }
-    if (request.headerText("Content-Type").rfind("application/json", 0) != 0) {
-        return refusal(415, "expected the header Content-Type: application/json");
+    return refusalOfType(request);
+}
+
+std::optional<HttpResponse> refusalOfType(const HttpRequest& request) {
+    if (request.headerText("Content-Type").rfind("application/json", 0) == 0) {
+        return std::nullopt;
     }
-    return std::nullopt;
+    return refusal(415, "expected the header Content-Type: application/json");
 }
 
 }  // namespace ktr::server

@@ -38,6 +38,8 @@ struct SharingRequest {
 
 /// What is wrong with the headers of a command beside its credentials; none when nothing is.
 std::optional<HttpResponse> refusalOfCommand(const HttpRequest& request);
+/// The part of it that concerns the type of the body.
+std::optional<HttpResponse> refusalOfType(const HttpRequest& request);
 /// A status with a sentence, as the protocol words it.
 HttpResponse refusal(int status, const std::string& message);
 
