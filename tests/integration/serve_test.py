@@ -3,6 +3,7 @@
 
   serve_test.py PROGRAM [unittest options]
 """
+import base64
 import concurrent.futures
 import gzip
 import http.client
