@@ -6,6 +6,7 @@
 #include <cmath>
 
 #include "app/ServeArguments.h"
+#include "documents/NearestName.h"
 #include "documents/Words.h"
 #include "host/scenario/Scenario.h"
 #include "linux/device/LinuxDevice.h"
@@ -237,6 +238,35 @@ std::string readLive(const Words& words, Options& options) {
     return "";
 }
 
+/// What is wrong with the first word, when it is no command, and with an option that there is not.
+std::string unknownWord(const CLI::App& app, const std::vector<std::string>& arguments) {
+    std::vector<std::string> names;
+    for (const CLI::App* command : app.get_subcommands({})) {
+        names.push_back(command->get_name());
+    }
+    if (arguments.empty() || arguments.front().starts_with('-')) {
+        return "";
+    }
+    const std::string& word = arguments.front();
+    const auto command = std::find(names.begin(), names.end(), word);
+    if (command == names.end()) {
+        return "there is no command " + documents::inQuotes(word) + documents::didYouMean(word, names);
+    }
+    names.clear();
+    for (const CLI::Option* option : app.get_subcommand(word)->get_options()) {
+        for (const std::string& name : option->get_lnames()) {
+            names.push_back("--" + name);
+        }
+    }
+    for (auto argument = arguments.begin() + 1; argument != arguments.end() && *argument != "--"; ++argument) {
+        const std::string name = argument->substr(0, argument->find('='));
+        if (name.starts_with("--") && std::find(names.begin(), names.end(), name) == names.end()) {
+            return "there is no option " + documents::inQuotes(name) + documents::didYouMean(name, names);
+        }
+    }
+    return "";
+}
+
 bool endsWith(const std::string& text, const std::string& end) {
     return text.size() > end.size() && text.compare(text.size() - end.size(), end.size(), end) == 0;
 }
@@ -245,6 +275,7 @@ bool endsWith(const std::string& text, const std::string& end) {
 
 std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::string> arguments) {
     Parser parser;
+    const std::vector<std::string> given = arguments;
     // The parser takes the arguments from the back.
     std::reverse(arguments.begin(), arguments.end());
     const auto misuse = [](const std::string& line) {
@@ -258,7 +289,9 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
         const auto asked = parser.app.get_subcommands();
         return Ending{host::ExitCode::Ok, (asked.empty() ? parser.app.help() : asked.front()->help("ktr")) + "\n"};
     } catch (const CLI::ParseError& error) {
-        return misuse(error.what());
+        // The library's own words name neither the slip nor what was meant.
+        const std::string unknown = unknownWord(parser.app, given);
+        return misuse(unknown.empty() ? error.what() : unknown);
     }
     if (parser.serve->parsed()) {
         parser.options.command = Options::Command::Serve;

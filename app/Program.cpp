@@ -1,7 +1,10 @@
 #include "app/Program.h"
 
+#include <sys/resource.h>
+
 #include <QApplication>
 #include <QDateTime>
+#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 #include <memory>
@@ -14,13 +17,17 @@
 #include "app/RenderCommand.h"
 #include "app/ServeCommand.h"
 #include "app/window/ShowCommand.h"
+#include "documents/Words.h"
 #include "host/Host.h"
+#include "host/Resources.h"
 #include "host/scenario/ScenarioReader.h"
 #include "linux/configuration/ConfigurationReader.h"
 #include "linux/configuration/XdgFolders.h"
 #include "linux/device/Buses.h"
 #include "linux/device/Descriptors.h"
 #include "linux/device/SystemClock.h"
+#include "linux/locale/LocaleRegion.h"
+#include "linux/locale/QtLocalization.h"
 #include "linux/paint/FontSetup.h"
 
 namespace ktr::app {
@@ -151,6 +158,30 @@ std::optional<host::Failure> loadFonts() {
     return std::nullopt;
 }
 
+/// Libraries end the process with a signal when they get no descriptors: say it before they do.
+std::optional<host::Failure> wantDescriptors() {
+    constexpr rlim_t kFewest = 32;
+    rlimit limit{};
+    if (::getrlimit(RLIMIT_NOFILE, &limit) != 0 || limit.rlim_cur >= kFewest) {
+        return std::nullopt;
+    }
+    limit.rlim_cur = std::min(limit.rlim_max, kFewest);
+    if (limit.rlim_cur >= kFewest && ::setrlimit(RLIMIT_NOFILE, &limit) == 0) {
+        return std::nullopt;
+    }
+    return host::Failure{host::ExitCode::Failure, "at most " + std::to_string(limit.rlim_cur) +
+                                                      " files may be open here, and " + std::to_string(kFewest) +
+                                                      " are needed; raise the limit with: ulimit -n 1024"};
+}
+
+/// A language that somebody asked for is not passed over in silence.
+void tellOfLanguage(const std::string& language) {
+    const bool isAsked = language != linux_::LocaleRegion::sessionLanguage();
+    if (isAsked && !linux_::QtLocalization::hasTexts(language, host::resourceFolder() / "localization", "host")) {
+        tell("warning: there are no texts in the language " + documents::inQuotes(language) + "; they are English");
+    }
+}
+
 host::ExitCode run(const Options& options, int argc, char** argv) {
     if ((options.live || options.command == Options::Command::Show) && !linux_::Descriptors::areEnough()) {
         return fail({host::ExitCode::Failure, "too few files may be open at a time: at least " +
@@ -170,6 +201,7 @@ host::ExitCode run(const Options& options, int argc, char** argv) {
         return fail(*failure);
     }
     auto& settings = std::get<host::HostSettings>(decided);
+    tellOfLanguage(settings.language);
     if (options.live) {
         settings.liveConfiguration = configuration;
     }
@@ -208,6 +240,9 @@ host::ExitCode runProgram(int argc, char** argv) {
         return ending->code;
     }
     const auto& options = std::get<Options>(parsed);
+    if (const auto failure = wantDescriptors()) {
+        return fail(*failure);
+    }
     return options.command == Options::Command::Serve ? ServeCommand::run(options.serve) : run(options, argc, argv);
 }
 

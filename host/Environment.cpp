@@ -168,8 +168,9 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
     Environment environment;
     environment.isVirtual_ = isVirtual;
     const auto foundation = std::make_shared<Platform>();
+    const auto secrets = std::make_shared<linux_::KnownSecrets>();
     foundation->logSink = std::make_shared<linux_::FilteredLogSink>(
-        std::make_shared<linux_::StderrLogSink>(linux_::StderrLogSink::environmentShowsPrivate()),
+        std::make_shared<linux_::StderrLogSink>(linux_::StderrLogSink::environmentShowsPrivate(), stderr, secrets),
         linux_::FilteredLogSink::environmentLevel());
     const bool isLive = settings.liveConfiguration.has_value();
     if (isVirtual && !isLive) {
@@ -187,7 +188,7 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
     environment.platform->mainLoop = foundation->mainLoop;
     environment.platform->clock = foundation->clock;
     if (isLive) {
-        environment.live = std::make_unique<LiveServices>(*settings.liveConfiguration);
+        environment.live = std::make_unique<LiveServices>(*settings.liveConfiguration, secrets);
     }
     std::string error;
     auto contacts = linux_::ContactFiles::read(settings.contacts, error);

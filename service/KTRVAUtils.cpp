@@ -48,6 +48,27 @@ std::string percentEscaped(std::string_view text) {
     return out;
 }
 
+/// The same without any member of the token's name, however deep.
+Value withoutToken(const Value& value) {
+    if (const Dictionary* dictionary = value.dictionary()) {
+        Dictionary out;
+        for (const auto& [key, member] : *dictionary) {
+            if (key != kTokenKey) {
+                out.set(key, withoutToken(member));
+            }
+        }
+        return out;
+    }
+    if (const Value::Array* array = value.array()) {
+        Value::Array out;
+        for (const Value& element : *array) {
+            out.push_back(withoutToken(element));
+        }
+        return out;
+    }
+    return value;
+}
+
 int hexDigit(char c) {
     if (c >= '0' && c <= '9') {
         return c - '0';
@@ -154,7 +175,7 @@ std::optional<Url> KTRVAUtils::contextIdentifierURLForDictionary(const std::opti
     std::string text(kContextPrefix);
     for (const auto& [key, value] : *dictionary) {
         if (key != kTokenKey) {
-            text += percentEscaped(key) + "=" + percentEscaped(value.description()) + "&";
+            text += percentEscaped(key) + "=" + percentEscaped(withoutToken(value).description()) + "&";
         }
     }
     return Url::fromText(std::move(text));

@@ -29,7 +29,7 @@ class KTRVAUtils {
 
     /// "ktrServerContext://serverContext?" and one "key=value&" a member, in the dictionary's order. Values that are no
     /// strings are written as `Value::description` says; everything but letters, digits and "-._~" is percent-escaped
-    /// (RFC 3986). The member "authToken" is never written. None for none. Any thread.
+    /// (RFC 3986). A member "authToken", at whatever depth, is never written. None for none. Any thread.
     static std::optional<platform::Url> contextIdentifierURLForDictionary(
         const std::optional<platform::Dictionary>& dictionary);
     /// The members of a context URL; empty when nothing is usable. As many characters as the prefix has are dropped,

@@ -25,8 +25,8 @@ namespace ktr::host {
 class LiveServices {
   public:
     /// Reads the configuration; the app token, which may have to wait for a keyring, is read in the background once the
-    /// platform is installed (`start`).
-    explicit LiveServices(std::filesystem::path configurationFile);
+    /// platform is installed (`start`), and is told to `secrets`.
+    LiveServices(std::filesystem::path configurationFile, std::shared_ptr<linux_::KnownSecrets> secrets);
     ~LiveServices();
     LiveServices(const LiveServices&) = delete;
     LiveServices& operator=(const LiveServices&) = delete;

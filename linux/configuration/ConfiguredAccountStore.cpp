@@ -8,6 +8,7 @@
 #include "linux/device/Buses.h"
 #include "linux/device/LoadableModule.h"
 #include "platform/base/LogArea.h"
+#include "platform/client/KTJSONCommand.h"
 
 namespace ktr::linux_ {
 
@@ -86,7 +87,14 @@ bool ConfiguredAccountStore::load() {
     if (configuration == nullptr) {
         problem = std::get<ConfigurationReader::Error>(read).text;
     } else if (configuration->account) {
-        account = std::make_shared<OwnerAccount>(*configuration->account, readToken(*configuration->account, problem));
+        auto token = readToken(*configuration->account, problem);
+        if (token && knownSecrets_) {
+            knownSecrets_->add(*token);
+            if (const auto header = platform::basicAuthorization(configuration->account->personId, *token)) {
+                knownSecrets_->add(header->substr(header->find(' ') + 1));
+            }
+        }
+        account = std::make_shared<OwnerAccount>(*configuration->account, std::move(token));
     }
     if (!problem.empty()) {
         platform::areaLog(platform::LogArea::Account)

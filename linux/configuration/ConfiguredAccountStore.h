@@ -8,6 +8,7 @@
 #include <string>
 
 #include "linux/configuration/Configuration.h"
+#include "linux/device/KnownSecrets.h"
 #include "platform/client/DeviceOwnerAccount.h"
 
 namespace ktr::linux_ {
@@ -31,6 +32,9 @@ class ConfiguredAccountStore : public platform::AccountStore {
     explicit ConfiguredAccountStore(const std::filesystem::path& configurationFile);
     ConfiguredAccountStore(const std::filesystem::path& configurationFile, Secrets secrets);
     ~ConfiguredAccountStore() override;
+
+    /// Who is told of each token that is read, before anybody gets it. Set before the first `load`.
+    void setKnownSecrets(std::shared_ptr<KnownSecrets> secrets) { knownSecrets_ = std::move(secrets); }
 
     /// Reads configuration and token; true when anything differs from before. A file with an error leaves everything as
     /// it was. Logs what is wrong, and keeps it for `problem`. Any thread, but for a keyring's sake not the main thread
@@ -59,6 +63,7 @@ class ConfiguredAccountStore : public platform::AccountStore {
     const std::filesystem::path file_;
     const Secrets secrets_;
     std::atomic<bool> givesUp_ = false;
+    std::shared_ptr<KnownSecrets> knownSecrets_;
     mutable std::mutex mutex_;
     Configuration configuration_;
     std::shared_ptr<OwnerAccount> account_;

@@ -36,11 +36,10 @@ bool StderrLogSink::environmentShowsPrivate() {
 }
 
 void StderrLogSink::write(const platform::LogLine& line) {
-    std::string record(nameOf(line.level));
-    record += ' ';
-    record += documents::forLine(line.subsystem) + ' ' + documents::forLine(line.category) + ": " +
-              documents::forLine(platform::formatted(line.format, line.arguments, !showPrivate_));
-    record += '\n';
+    std::string text = line.subsystem + " " + line.category + ": ";
+    text += platform::formatted(line.format, line.arguments, !showPrivate_);
+    const std::string record =
+        std::string(nameOf(line.level)) + " " + documents::forLine(secrets_->without(std::move(text))) + "\n";
     const std::lock_guard lock(mutex_);
     // One write a record, so that lines of other writers to the same stream do not cut in.
     std::fwrite(record.data(), 1, record.size(), stream_);

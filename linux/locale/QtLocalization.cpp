@@ -38,7 +38,25 @@ std::vector<std::string> candidates(const std::string& language) {
     return out;
 }
 
+std::filesystem::path fileOf(const std::filesystem::path& folder, const std::string& prefix,
+                             const std::string& language) {
+    return folder / std::string(prefix).append("_").append(language).append(".qm");
+}
+
 }  // namespace
+
+bool QtLocalization::hasTexts(const std::string& language, const std::filesystem::path& folder,
+                              const std::string& prefix) {
+    const bool isEnglish = language.substr(0, language.find('-')) == kFallbackLanguage;
+    for (const std::string& candidate : candidates(language)) {
+        std::error_code ignored;
+        if ((candidate != kFallbackLanguage || isEnglish) &&
+            std::filesystem::is_regular_file(fileOf(folder, prefix, candidate), ignored)) {
+            return true;
+        }
+    }
+    return false;
+}
 
 QtLocalization::QtLocalization(std::string language)
     : language_(std::move(language)), languageOfTexts_(kFallbackLanguage) {
@@ -52,7 +70,7 @@ bool QtLocalization::addBundle(const std::string& bundleIdentifier, const std::f
     Translators translators;
     bool english = false;
     for (const std::string& language : candidates(language_)) {
-        const auto file = folder / std::string(prefix).append("_").append(language).append(".qm");
+        const auto file = fileOf(folder, prefix, language);
         auto translator = std::make_unique<QTranslator>();
         std::error_code ignored;
         if (std::filesystem::is_regular_file(file, ignored) &&

@@ -32,6 +32,10 @@ class QtLocalization : public platform::Localization {
     /// replaces it.
     bool addBundle(const std::string& bundleIdentifier, const std::filesystem::path& folder, const std::string& prefix);
 
+    /// Whether there are texts in a language, or in one that it is a kind of, before English has to stand in. Any
+    /// thread.
+    static bool hasTexts(const std::string& language, const std::filesystem::path& folder, const std::string& prefix);
+
     std::string text(const std::string& key, const std::string& bundleIdentifier,
                      const std::optional<std::string>& table = std::nullopt,
                      const std::optional<std::string>& defaultValue = std::nullopt) const override;

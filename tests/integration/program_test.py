@@ -240,7 +240,97 @@ class ProgramTest(unittest.TestCase):
         self.assert_refused(run("show", SCENARIOS / "dinner.json"), 1, "display")
         self.assert_refused(run("show", SCENARIOS / "dinner.json", DISPLAY=":987"), 1, "ktr: ")
         self.assert_refused(run("describe", SCENARIOS / "dinner.json", "--at", "2020-01-01T00:00Z"), 2, "--at")
-        self.assertEqual(run("frobnicate").returncode, 2)
+        self.assert_refused_word("rendr", 'did you mean "render"?')
+        self.assert_refused_word("frobnicate", "there is no command")
+
+    def assert_refused_word(self, word, expected):
+        result = run(word)
+        self.assertEqual(result.returncode, 2)
+        self.assertIn(expected, result.stderr)
+
+    def test_a_slip_is_told_and_the_rest_is_done(self):
+        told = run("describe", self.scenario([], langauge="de"))
+        self.assertEqual(told.returncode, 0)
+        self.assertEqual(told.stderr.count("\n"), 1, told.stderr)
+        self.assertIn('$.langauge: there is no such member, it is passed over; did you mean "language"?', told.stderr)
+        told = run("describe", self.scenario([]), "--language", "klingon")
+        self.assertEqual(told.returncode, 0)
+        self.assertIn('there are no texts in the language "klingon"; they are English', told.stderr)
+        self.assert_done(run("describe", self.scenario([]), "--language", "de-AT"))
+
+    def test_nothing_in_an_error_steers_the_terminal(self):
+        for bad in ("\x1b[31m", "\u009b2J", "\x7f", "\u202e", "\r", "\u2067"):
+            scenario = self.folder / f"a{bad}.json"
+            scenario.write_text(json.dumps({"snippet": {"kind": f"VA{bad}View"}}), encoding="utf-8")
+            for arguments in (("describe", scenario), ("describe", self.folder / f"b{bad}"), (f"describ{bad}",),
+                              ("describe", "a.json", f"--{bad}"), ("render", scenario, "-o", f"{bad}.gif"),
+                              ("describe", SCENARIOS / "dinner.json", "--plugin", self.folder / f"c{bad}"),
+                              ("serve", "--friends", self.folder / f"d{bad}"), ("serve", "--fault", f"{bad}=1")):
+                with self.subTest(repr(arguments)):
+                    result = run(*arguments)
+                    self.assertNotEqual(result.returncode, 0)
+                    self.assertTrue(result.stderr.startswith("ktr: "), result.stderr)
+                    self.assertNotIn(bad, result.stdout + result.stderr)
+
+    def test_a_full_disk_leaves_the_good_picture(self):
+        scenario = SCENARIOS / "forty-friends.json"
+        for name in ("a.png", "a.svg", "a.pdf"):
+            with self.subTest(name):
+                picture = self.folder / name
+                picture.write_bytes(b"the good old one")
+                limited = subprocess.run(["bash", "-c", 'trap "" XFSZ; ulimit -f 4; exec "$@"', "-", PROGRAM, "render",
+                                          scenario, "-o", picture], capture_output=True, text=True, timeout=120)
+                self.assertEqual(limited.returncode, 1, limited.stderr)
+                self.assertIn(f"{picture}: cannot be written: File too large", limited.stderr)
+                self.assertEqual(picture.read_bytes(), b"the good old one")
+                self.assertEqual([entry.name for entry in self.folder.iterdir()], [name])
+                picture.unlink()
+
+    def test_pieces_are_all_there_or_none(self):
+        scenario = SCENARIOS / "forty-friends.json"
+        third = self.folder / "a-3.png"
+        os.mkfifo(third)
+        self.assert_refused(run("render", scenario, "-o", self.folder / "a.png", "--width", "8000", "--scale", "8"), 4)
+        tall = self.scenario([{"latitude": 50.0, "longitude": -3.0, "friend": person(str(i))} for i in range(200)])
+        refused = run("render", tall, "-o", self.folder / "a.png", "--scale", "6", "--width", "200")
+        self.assert_refused(refused, 1, f"{third}: cannot be written: this is a pipe, not a file")
+        self.assertEqual(sorted(entry.name for entry in self.folder.iterdir()), ["a-3.png", "scenario.json"])
+        third.unlink()
+        self.assert_done(run("render", tall, "-o", self.folder / "a.png", "--scale", "6", "--width", "200"))
+        self.assertTrue(third.exists())
+
+    def test_a_pipe_or_a_device_is_never_replaced(self):
+        pipe, device = self.folder / "pipe.png", self.folder / "device.png"
+        os.mkfifo(pipe)
+        device.symlink_to("/dev/null")
+        for place, what in ((pipe, "a pipe"), (device, "a device")):
+            self.assert_refused(run("render", SCENARIOS / "single.json", "-o", place), 1, f"this is {what}, not a file")
+        self.assertTrue(pipe.is_fifo())
+        self.assertTrue(pathlib.Path("/dev/null").is_char_device())
+
+    def test_few_descriptors_are_no_signal(self):
+        for count in (6, 10, 16, 31):
+            for command in (("describe", SCENARIOS / "single.json"), ("serve", "--ca-dir", self.folder / "ca"),
+                            ("render", SCENARIOS / "single.json", "-o", self.folder / "a.png")):
+                with self.subTest(count=count, command=command[0]):
+                    few = subprocess.run(["bash", "-c", f'ulimit -n {count}; exec "$@"', "-", PROGRAM, *command],
+                                         capture_output=True, text=True, timeout=120)
+                    self.assert_refused(few, 1, f"at most {count} files may be open here")
+
+    def test_what_others_may_change_is_not_served_from(self):
+        open_folder = self.folder / "open"
+        open_folder.mkdir()
+        open_folder.chmod(0o777)
+        self.assert_refused(run("serve", "--ca-dir", open_folder), 1, "others may write its folder", "chmod go-w")
+        self.assert_refused(run("serve", "--ca-dir", open_folder / "below"), 1, "others may write its folder")
+        own = self.folder / "own"
+        own.mkdir(mode=0o700)
+        (own / "ca.pem").mkdir()
+        self.assert_refused(run("serve", "--ca-dir", own), 1, "ca.pem: this is a folder, not a file")
+        (own / "ca.pem").rmdir()
+        (own / "ca-key.pem").write_text("x")
+        (own / "ca-key.pem").chmod(0o666)
+        self.assert_refused(run("serve", "--ca-dir", own), 1, "ca-key.pem: others may write it (mode 0666)")
 
     def test_names_stay_out_of_the_log(self):
         quiet = run("describe", SCENARIOS / "dinner.json", KTR_LOG="debug")

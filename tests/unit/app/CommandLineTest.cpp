@@ -49,6 +49,36 @@ TEST(KTRCommandLineTest, Render_TakesEveryOption) {
     EXPECT_EQ(options.plugin, "p");
 }
 
+TEST(KTRCommandLineTest, Misspelt_IsNamedWithWhatWasProbablyMeant) {
+    const auto misuse = [](const std::vector<std::string>& arguments) {
+        const auto found = ending(arguments);
+        EXPECT_EQ(found.code, host::ExitCode::Usage);
+        return found.text.substr(0, found.text.find('\n'));
+    };
+    EXPECT_EQ(misuse({"rendr", "a.json"}), "ktr: there is no command \"rendr\"; did you mean \"render\"?");
+    EXPECT_EQ(misuse({"frobnicate"}), "ktr: there is no command \"frobnicate\"");
+    EXPECT_EQ(misuse({"render", "a.json", "-o", "a.png", "--langauge=de"}),
+              "ktr: there is no option \"--langauge\"; did you mean \"--language\"?");
+    EXPECT_EQ(misuse({"show", "--frobnicate"}), "ktr: there is no option \"--frobnicate\"");
+    EXPECT_EQ(misuse({}), "ktr: A subcommand is required");
+}
+
+TEST(KTRCommandLineTest, ArgumentsInAnError_DoNotSteerTheTerminal) {
+    for (const std::string bad : {"a\x1b[31mb", "a\u009b2Jb", "a\u202eb", "a\x7f\nb"}) {
+        for (const auto& arguments : {std::vector<std::string>{bad},
+                                      {"show", "--" + bad},
+                                      {"describe", "a", bad},
+                                      {"render", "a", "-o", bad},
+                                      {"describe", "a", "--at", bad}}) {
+            const std::string text = ending(arguments).text;
+            const std::string line = text.substr(0, text.find("\nSee ktr --help."));
+            EXPECT_EQ(line.find_first_of("\n\x1b\x7f"), std::string::npos) << line;
+            EXPECT_EQ(line.find("\u009b"), std::string::npos) << line;
+            EXPECT_EQ(line.find("\u202e"), std::string::npos) << line;
+        }
+    }
+}
+
 TEST(KTRCommandLineTest, Describe_LeavesOpenWhatIsNotSaid) {
     const Options options = parsed({"describe", "a.json"});
     EXPECT_EQ(options.command, Options::Command::Describe);

@@ -1,6 +1,7 @@
 #include "linux/configuration/ConfiguredAccountStore.h"
 
 #include "linux/device/Buses.h"
+#include "platform/client/KTJSONCommand.h"
 #include "tests/support/PlatformTest.h"
 #include "tests/support/TemporaryFolder.h"
 
@@ -73,6 +74,29 @@ TEST_F(ConfiguredAccountStoreTest, SecretService_IsWaitedForShortly_WhereAFileHa
     store().load();
     EXPECT_EQ(seconds, linux_::Buses::kSecretBesideAFile);
     EXPECT_LT(seconds, 5.0);
+}
+
+TEST_F(ConfiguredAccountStoreTest, TokenAndWhatIsSentOfIt_AreKnownAsSecrets) {
+    folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example"}})");
+    secret = "first-t0ken";
+    const auto known = std::make_shared<linux_::KnownSecrets>();
+    auto signedIn = store();
+    signedIn.setKnownSecrets(known);
+    EXPECT_TRUE(signedIn.load());
+    secret = "second-t0ken";
+    EXPECT_TRUE(signedIn.load());
+    const auto header = *platform::basicAuthorization("7", "second-t0ken");
+    EXPECT_EQ(known->without("first-t0ken second-t0ken " + header), "<hidden> <hidden> Basic <hidden>");
+}
+
+TEST_F(ConfiguredAccountStoreTest, ConfigurationThatOthersMayWrite_IsRefusedWithTheRemedy) {
+    folder.write("config.json", R"({"account": {"personId": "7", "host": "thief.example"}})", 0666);
+    folder.write("token", "s3cret\n");
+    auto signedIn = store();
+    EXPECT_FALSE(signedIn.load());
+    EXPECT_EQ(signedIn.deviceOwnerAccount(), nullptr);
+    EXPECT_NE(onlyError().find("config.json: others may write it (mode 0666); forbid it with: chmod go-w"),
+              std::string::npos);
 }
 
 TEST_F(ConfiguredAccountStoreTest, SecretWithItsLineEnd_IsTheTokenWithout) {

@@ -62,6 +62,31 @@ TEST_F(StderrLogSinkTest, ATokenIsNeverShown) {
     EXPECT_EQ(written().find("secret"), std::string::npos);
 }
 
+/// What describes itself as an answer of the service does.
+struct DescribedAnswer : platform::Object {
+    std::string description() const override { return R"(({"authToken":"secret","city":"Port"}))"; }
+};
+
+TEST_F(StderrLogSinkTest, ATokenInsideAnObjectsDescription_IsNotShown) {
+    StderrLogSink sink(true, file.get());
+    sink.write(
+        {LogLevel::Error, "s", "c", "visibility_response: %@", {FormatArgument(std::make_shared<DescribedAnswer>())}});
+    EXPECT_EQ(written(), "error s c: visibility_response: ({\"authToken\":\"<hidden>\",\"city\":\"Port\"})\n");
+}
+
+TEST_F(StderrLogSinkTest, AKnownToken_IsNotShownWhateverEchoesIt) {
+    const auto secrets = std::make_shared<linux_::KnownSecrets>();
+    StderrLogSink sink(true, file.get(), secrets);
+    secrets->add("t0ken/value");
+    const platform::Url url("ktrServerContext://serverContext?a=t0ken%2Fvalue&");
+    sink.write({LogLevel::Error,
+                "s",
+                "t0ken/value",
+                "t0ken/value %@ %@",
+                {FormatArgument("a t0ken/value b"), FormatArgument(url)}});
+    EXPECT_EQ(written(), "error s <hidden>: <hidden> a <hidden> b ktrServerContext://serverContext?a=<hidden>&\n");
+}
+
 TEST_F(StderrLogSinkTest, LineEndsAndControlCharacters_AreEscaped) {
     StderrLogSink sink(true, file.get());
     sink.write({LogLevel::Error, "s", "c", "%@", {FormatArgument(std::string("a\nb\r\tc\x1b[31m\u0085\u2028é"))}});

@@ -85,6 +85,9 @@ TEST_F(KTRVAUtilsTest, EncodingWritesEveryMemberInOrderAndEndsInAnAmpersand) {
 
 TEST_F(KTRVAUtilsTest, EncodingNeverWritesTheToken) {
     EXPECT_EQ(encoded({{"authToken", "secret"}, {"a", "b"}}), kPrefix + "a=b&");
+    const Dictionary nested{{"authToken", "secret"}, {"c", 1}};
+    EXPECT_EQ(encoded({{"a", nested}, {"b", platform::Value::Array{nested}}}),
+              kPrefix + "a=%7B%22c%22%3A1%7D&b=%5B%7B%22c%22%3A1%7D%5D&");
     EXPECT_TRUE(decoded("a=b&").find("authToken") == nullptr);
 }
 
