@@ -20,21 +20,6 @@ using Texts = PreferencesFile::Texts;
 /// A few texts a domain; more is nothing that this program wrote.
 constexpr std::size_t kLargestFile = std::size_t{1} << 20;
 
-std::variant<Texts, documents::DocumentError> parse(const std::string& text, const fs::path& file) {
-    Texts texts;
-    const auto error = documents::DocumentReader::readText(text, file.string(), [&](documents::FieldReader& members) {
-        members.leaveOthers();
-        for (const auto& [key, value] : members.dictionary()) {
-            if (auto string = members.string(key)) {
-                texts[key] = *std::move(string);
-            } else if (value.isNull()) {
-                members.complain(key, "expected a string, found null");
-            }
-        }
-    });
-    return error ? std::variant<Texts, documents::DocumentError>(*error) : std::move(texts);
-}
-
 std::string written(const Texts& texts) {
     platform::Dictionary object;
     for (const auto& [key, value] : texts) {
@@ -49,12 +34,27 @@ std::variant<std::string, documents::DocumentError> bytesOf(const fs::path& file
 
 }  // namespace
 
+std::variant<Texts, documents::DocumentError> PreferencesFile::readText(const std::string& text, const fs::path& file) {
+    Texts texts;
+    const auto error = documents::DocumentReader::readText(text, file.string(), [&](documents::FieldReader& members) {
+        members.leaveOthers();
+        for (const auto& [key, value] : members.dictionary()) {
+            if (auto string = members.string(key)) {
+                texts[key] = *std::move(string);
+            } else if (value.isNull()) {
+                members.complain(key, "expected a string, found null");
+            }
+        }
+    });
+    return error ? std::variant<Texts, documents::DocumentError>(*error) : std::move(texts);
+}
+
 std::variant<Texts, PreferencesFile::Error> PreferencesFile::read(const fs::path& file) {
     const auto bytes = bytesOf(file);
     if (const auto* error = std::get_if<documents::DocumentError>(&bytes)) {
         return error->isMissing ? std::variant<Texts, Error>(Texts()) : Error{error->text()};
     }
-    auto texts = parse(std::get<std::string>(bytes), file);
+    auto texts = readText(std::get<std::string>(bytes), file);
     if (const auto* error = std::get_if<documents::DocumentError>(&texts)) {
         return Error{error->text()};
     }
@@ -74,7 +74,7 @@ std::variant<Texts, PreferencesFile::Error> PreferencesFile::merge(const fs::pat
     const auto bytes = bytesOf(file);
     Texts stored;
     if (const auto* text = std::get_if<std::string>(&bytes)) {
-        auto parsed = parse(*text, file);
+        auto parsed = readText(*text, file);
         if (auto* texts = std::get_if<Texts>(&parsed)) {
             stored = std::move(*texts);
         } else {
