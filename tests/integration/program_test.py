@@ -289,8 +289,10 @@ class ProgramTest(unittest.TestCase):
     def test_pieces_are_all_there_or_none(self):
         last = self.folder / "a-2.png"
         os.mkfifo(last)
-        tall = self.scenario([{"latitude": 50.0, "longitude": -3.0, "friend": person(str(i))} for i in range(100)])
-        arguments = ("render", tall, "-o", self.folder / "a.png", "--scale", "6", "--width", "200")
+        many = [{"latitude": 50.0, "longitude": -3.0, "friend":
+                 {"object": {"fullName": f"Friend {i}", "emails": [{"emailAddress": f"f{i}@harbour.example"}]}}}
+                for i in range(420)]
+        arguments = ("render", self.scenario(many), "-o", self.folder / "a.png")
         self.assert_refused(run(*arguments), 1, f"{last}: cannot be written: this is a pipe, not a file")
         self.assertEqual(sorted(entry.name for entry in self.folder.iterdir()), ["a-2.png", "scenario.json"])
         last.unlink()
