@@ -9,6 +9,8 @@
 #include <system_error>
 #include <vector>
 
+#include "documents/FileReader.h"
+
 namespace ktr::linux_ {
 
 namespace {
@@ -80,23 +82,17 @@ fs::path TileStore::fileOf(const tiles::TileKey& key) const {
 std::optional<TileStore::Entry> TileStore::load(const tiles::TileKey& key) {
     const std::lock_guard lock(mutex_);
     const fs::path file = fileOf(key);
-    std::ifstream stream(file, std::ios::binary);
-    if (!stream.is_open()) {
+    const auto read = documents::FileReader::read(file, {kLargestTile + kLongestHead, {}});
+    const auto* text = std::get_if<std::string>(&read);
+    if (text == nullptr) {
         return std::nullopt;
     }
     std::error_code ignored;
-    const auto size = fs::file_size(file, ignored);
-    if (ignored || size > kLargestTile + kLongestHead) {
-        return std::nullopt;
-    }
-    std::string text(static_cast<std::size_t>(size), '\0');
-    stream.read(text.data(), static_cast<std::streamsize>(text.size()));
-    text.resize(static_cast<std::size_t>(stream.gcount()));
     const auto now = fs::file_time_type::clock::now();
     if (now - fs::last_write_time(file, ignored) > kTouch) {
         fs::last_write_time(file, now, ignored);
     }
-    return parsed(text);
+    return parsed(*text);
 }
 
 void TileStore::save(const tiles::TileKey& key, const Entry& entry) {

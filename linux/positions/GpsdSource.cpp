@@ -1,12 +1,14 @@
 #include "linux/positions/GpsdSource.h"
 
-#include <QDateTime>
 #include <QJsonDocument>
 #include <QJsonObject>
 #include <QTcpSocket>
 #include <algorithm>
 #include <cmath>
 #include <limits>
+
+#include "documents/IsoTime.h"
+#include "linux/device/SystemClock.h"
 
 namespace ktr::linux_ {
 
@@ -64,10 +66,8 @@ std::optional<platform::PlatformLocation::Fix> GpsdSource::fixOf(const QByteArra
     }
     fix.course = firstNumber(report, {"track"}, -1.0);
     fix.speed = firstNumber(report, {"speed"}, -1.0);
-    const QDateTime time = QDateTime::fromString(report.value(QLatin1String("time")).toString(), Qt::ISODateWithMs);
-    fix.timestamp = platform::Date{
-        static_cast<double>((time.isValid() ? time : QDateTime::currentDateTimeUtc()).toMSecsSinceEpoch()) / 1000.0 -
-        platform::kSecondsFrom1970ToReferenceDate};
+    const auto time = documents::parseIsoTime(report.value(QLatin1String("time")).toString().toStdString());
+    fix.timestamp = time ? time->date : SystemClock().now();
     return fix;
 }
 

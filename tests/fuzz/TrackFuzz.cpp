@@ -7,7 +7,8 @@
 #include "platform/base/Utf8.h"
 #include "tests/fuzz/Require.h"
 
-// Any bytes as a track, in both of its forms: positions in the order of their time, or one line that says what is wrong.
+// Any bytes as a track, in both of its forms: positions in the order of their time, or one line that says what is
+// wrong.
 
 namespace {
 
