@@ -12,6 +12,7 @@
 #include <stdarg.h>
 #include <sys/mman.h>
 #include <sys/socket.h>
+#include <sys/stat.h>
 #include <sys/syscall.h>
 #include <sys/types.h>
 #include <unistd.h>
@@ -87,10 +88,17 @@ Function real(Function, const char* name) {
     return reinterpret_cast<Function>(::dlsym(RTLD_NEXT, name));
 }
 
+/// Whether a descriptor is a file, a pipe or a socket. Counters that the kernel keeps for events are none of them: they
+/// know neither input/output errors nor half a number.
+bool carriesBytes(int descriptor) {
+    struct stat facts {};
+    return ::fstat(descriptor, &facts) == 0 && (facts.st_mode & S_IFMT) != 0;
+}
+
 /// What is asked of a transfer: all of it, one byte of it, or an error.
 template <class Transfer>
 ssize_t transferred(const char* call, int descriptor, size_t size, Transfer transfer) {
-    if (descriptor <= STDERR_FILENO || size == 0 || !isHit(call)) {
+    if (descriptor <= STDERR_FILENO || size == 0 || !carriesBytes(descriptor) || !isHit(call)) {
         return transfer(size);
     }
     if (isShort()) {
