@@ -145,7 +145,7 @@
     </message>
     <message>
         <source>MAP_NOT_AVAILABLE</source>
-        <extracomment>In place of a map that nobody can draw. English: “Map not available”. English: “Map not available”</extracomment>
+        <extracomment>In place of a map that nobody can draw. English: “Map not available”</extracomment>
         <translation>Keine Karte verfügbar</translation>
     </message>
     <message>
