@@ -145,7 +145,9 @@ class HttpServer::Listener {
         std::promise<void> closed;
         asio::post(strand_, [this, &closed] {
             stopping_ = true;
-            socket_.close();
+            // What is said of it changes nothing: the descriptor is gone.
+            boost::system::error_code ignored;
+            socket_.close(ignored);
             rest_.cancel();
             for (const auto& [timer, kept] : timers_) {
                 kept->cancel();
