@@ -10,15 +10,6 @@ using platform::AccessibilityRole;
 
 namespace {
 
-void collectTexts(const AccessibilityNode& node, std::string& line) {
-    if (!node.text.empty()) {
-        line += (line.empty() ? "" : ", ") + node.text;
-    }
-    for (const AccessibilityNode& child : node.children) {
-        collectTexts(child, line);
-    }
-}
-
 void writeLine(const std::string& line, AccessibilityRole role, const DescriptionWords& words, std::string& out) {
     const std::string shown = documents::withoutControls(line);
     out += role == AccessibilityRole::Link    ? platform::formatted(words.link, {shown})
@@ -28,13 +19,8 @@ void writeLine(const std::string& line, AccessibilityRole role, const Descriptio
 }
 
 void writeNode(const AccessibilityNode& node, const DescriptionWords& words, std::string& out) {
-    if (node.role == AccessibilityRole::Link) {
-        std::string line;
-        collectTexts(node, line);
-        writeLine(line, node.role, words, out);
-        return;
-    }
-    if (!node.text.empty()) {
+    // A group's name only says what the group is.
+    if (!node.text.empty() && node.role != AccessibilityRole::Group) {
         writeLine(node.text, node.role, words, out);
     }
     for (const AccessibilityNode& child : node.children) {

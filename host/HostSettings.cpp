@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "linux/device/LinuxDevice.h"
 #include "linux/locale/LocaleRegion.h"
 
 namespace ktr::host {
@@ -46,9 +47,7 @@ std::variant<HostSettings, Failure> HostSettings::decide(const HostOptions& opti
     settings.said.country = firstOf(scenarios, &Scenario::country);
     settings.idiom =
         either(options.idiom, firstOf(scenarios, &Scenario::idiom)).value_or(platform::UserInterfaceIdiom::Phone);
-    const auto usualSize = settings.idiom == platform::UserInterfaceIdiom::Display ? platform::ContentSizeCategory::XL
-                                                                                   : platform::ContentSizeCategory::L;
-    settings.textSize = either(options.textSize, firstOf(scenarios, &Scenario::textSize)).value_or(usualSize);
+    settings.said.textSize = either(options.textSize, firstOf(scenarios, &Scenario::textSize));
     settings.scale = options.scale;
     settings.width = options.width > 0.0 ? options.width : usualWidth(settings.idiom);
     settings.dark = either(options.dark, firstOf(scenarios, &Scenario::dark));
@@ -81,10 +80,23 @@ std::variant<HostSettings, Failure> HostSettings::decide(const HostOptions& opti
     return settings;
 }
 
+void HostSettings::decideTextSize() {
+    using platform::ContentSizeCategory;
+    const bool isDisplay = idiom == platform::UserInterfaceIdiom::Display;
+    // Who leaves the desktop at its usual size has not asked for the usual size on a kitchen's wall.
+    const auto desktop = desktopTextScale && *desktopTextScale != 1.0
+                             ? std::optional(linux_::LinuxDevice::categoryForTextScale(*desktopTextScale))
+                             : std::nullopt;
+    textSize = either(either(said.textSize, configuredTextSize), desktop)
+                   .value_or(isDisplay ? ContentSizeCategory::XL : ContentSizeCategory::L);
+}
+
 void HostSettings::follow(const linux_::Configuration& configuration) {
     language = either(said.language, configuration.language).value_or(linux_::LocaleRegion::sessionLanguage());
     region = said.region.value_or(countryOf(language) ? language : linux_::LocaleRegion::sessionLocale());
     country = either(said.country, countryOf(region));
+    configuredTextSize = configuration.textSize;
+    decideTextSize();
     contacts = said.contacts;
     contacts.insert(contacts.end(), configuration.contacts.begin(), configuration.contacts.end());
 }

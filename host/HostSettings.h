@@ -42,12 +42,19 @@ struct HostSettings {
         std::optional<std::string> language;
         std::optional<std::string> region;
         std::optional<std::string> country;
+        std::optional<platform::ContentSizeCategory> textSize;
         std::vector<std::string> contacts;
     };
     Said said;
+    /// The configuration's.
+    std::optional<platform::ContentSizeCategory> configuredTextSize;
+    /// The desktop's: 1 is its usual size. None where nobody was asked or said anything.
+    std::optional<double> desktopTextScale;
 
-    /// Decides again what a configuration has a word in: language, region, country and contacts.
+    /// Decides again what a configuration has a word in: language, region, country, text size and contacts.
     void follow(const linux_::Configuration& configuration);
+    /// Decides the text size again: as said, else configured, else the desktop's, else the idiom's usual one.
+    void decideTextSize();
 
     /// `now` and its local offset serve where no scenario has a clock. A failure for what cannot be drawn: text sizes
     /// for accessibility, and a moment too far from the start. What `configuration` says counts after the scenarios; it

@@ -20,6 +20,7 @@ namespace {
 
 /// An age as it is said: the texts' keys, and the number put into both.
 struct Band {
+    int rank;  ///< from 0, the newest
     const char* rowKey;
     const char* spokenKey;
     std::optional<std::int64_t> number;
@@ -41,20 +42,21 @@ std::int64_t ageInSeconds(const platform::Date& date) {
 Band bandOf(std::int64_t seconds) {
     const double minutes = static_cast<double>(seconds) / 60.0;
     if (minutes <= 0.5) {
-        return {"LOCATED_NOW", "ACCESSIBILITY_LOCATED_NOW", std::nullopt};
+        return {0, "LOCATED_NOW", "ACCESSIBILITY_LOCATED_NOW", std::nullopt};
     }
     if (minutes < 1.0) {
-        return {"LOCATED_LESS_THAN_30SECONDS", "ACCESSIBILITY_LOCATED_LESS_THAN_30SECONDS", 30};
+        return {1, "LOCATED_LESS_THAN_30SECONDS", "ACCESSIBILITY_LOCATED_LESS_THAN_30SECONDS", 30};
     }
     if (minutes < 60.0) {
         const auto whole = static_cast<std::int64_t>(minutes);
-        return {"LOCATED_MINUTES", whole == 1 ? "ACCESSIBILITY_LOCATED_MINUTE" : "ACCESSIBILITY_LOCATED_MINUTES",
+        return {2, "LOCATED_MINUTES", whole == 1 ? "ACCESSIBILITY_LOCATED_MINUTE" : "ACCESSIBILITY_LOCATED_MINUTES",
                 whole};
     }
     if (minutes < 120.0) {
-        return {"LOCATED_LESS_THAN_1HR", "ACCESSIBILITY_LOCATED_LESS_THAN_1HR", 1};
+        return {3, "LOCATED_LESS_THAN_1HR", "ACCESSIBILITY_LOCATED_LESS_THAN_1HR", 1};
     }
-    return {"LOCATED_MORE_THAN_1HR", "ACCESSIBILITY_LOCATED_MORE_THAN_1HR", static_cast<std::int64_t>(minutes / 60.0)};
+    return {4, "LOCATED_MORE_THAN_1HR", "ACCESSIBILITY_LOCATED_MORE_THAN_1HR",
+            static_cast<std::int64_t>(minutes / 60.0)};
 }
 
 }  // namespace
@@ -70,6 +72,11 @@ platform::Dictionary KTRVAUIUtils::dictionaryWithAgeStringsForDate(const platfor
         spoken = platform::formatted(spoken, {number});
     }
     return {{LabelStringKey, row}, {LabelAccessibilityStringKey, spoken}};
+}
+
+int KTRVAUIUtils::ageBandForDate(const platform::Date& date) {
+    KTR_ASSERT_MAIN_THREAD();
+    return bandOf(ageInSeconds(date)).rank;
 }
 
 }  // namespace ktr

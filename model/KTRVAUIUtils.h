@@ -17,6 +17,8 @@ class KTRVAUIUtils {
     /// date in the future reads like one as far in the past. Up to 30 s "now"; up to 59 s the fixed number 30; then
     /// minutes; from 60 to 119 minutes the fixed number 1; then hours.
     static platform::Dictionary dictionaryWithAgeStringsForDate(const platform::Date& date);
+    /// Which of these five kinds of age the date has, from 0, the newest.
+    static int ageBandForDate(const platform::Date& date);
 };
 
 }  // namespace ktr

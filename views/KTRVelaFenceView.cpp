@@ -11,6 +11,7 @@
 #include "platform/base/Platform.h"
 #include "platform/base/Utf8.h"
 #include "service/Common.h"
+#include "views/SpokenRow.h"
 
 namespace ktr {
 
@@ -203,7 +204,15 @@ std::optional<platform::Url> KTRVelaFenceView::urlForTouch() {
 }
 
 platform::AccessibilityRole KTRVelaFenceView::accessibilityRole() const {
-    return serviceHandle() ? platform::AccessibilityRole::Link : platform::AccessibilityRole::Group;
+    return serviceHandle() ? platform::AccessibilityRole::Link : platform::AccessibilityRole::Text;
+}
+
+std::string KTRVelaFenceView::accessibilityText() const {
+    // Whoever listens may come when the host has already gone: then nothing can be worded.
+    if (!Platform::installed()) {
+        return "";
+    }
+    return SpokenRow::line({friendName().value_or(""), accessibilityLabel().value_or(""), fenceSentence()});
 }
 
 double KTRVelaFenceView::estimagedHeightForView() {

@@ -39,8 +39,10 @@ class KTRVelaFenceView : public KTRVelaBaseView {
     std::optional<platform::Url> urlForTouch() override;
     /// The least height that the row's constraints allow at its present width, points.
     double estimagedHeightForView() override;
-    /// A link as long as there is a friend to open.
+    /// A link as long as there is a friend to open; else a text.
     platform::AccessibilityRole accessibilityRole() const override;
+    /// The whole row in one line that begins with the person; the same at every text size.
+    std::string accessibilityText() const override;
 
     /// Kept for subclasses; this row does not ask for the user's position.
     std::shared_ptr<CurrentLocationDelegate> currentLocationDelegate() const { return currentLocationDelegate_.lock(); }

@@ -1,6 +1,8 @@
 #include "views/KTRVelaFriendView.h"
 
+#include <cmath>
 #include <utility>
+#include <vector>
 
 #include "model/ContactsUtilities.h"
 #include "model/KTRVATheme.h"
@@ -9,7 +11,10 @@
 #include "model/LogCategory.h"
 #include "model/PluginBundle.h"
 #include "platform/base/Platform.h"
+#include "platform/location/Geodesy.h"
 #include "service/Common.h"
+#include "service/KTRVAUtils.h"
+#include "views/SpokenRow.h"
 
 namespace ktr {
 
@@ -183,10 +188,13 @@ void KTRVelaFriendView::updateAge() {
     setSpokenText(timeLabel_, entry(ages, LabelAccessibilityStringKey));
 }
 
-std::string KTRVelaFriendView::distanceText() const {
+std::shared_ptr<platform::PlatformLocation> KTRVelaFriendView::userLocation() const {
     const auto source = currentLocationDelegate();
-    const auto userLocation = source ? source->currentLocation() : nullptr;
-    const auto distance = location_ ? location_->distanceFromLocation(userLocation) : std::nullopt;
+    return source ? source->currentLocation() : nullptr;
+}
+
+std::string KTRVelaFriendView::distanceText() const {
+    const auto distance = location_ ? location_->distanceFromLocation(userLocation()) : std::nullopt;
     return distance.value_or("");
 }
 
@@ -207,6 +215,58 @@ std::optional<platform::Url> KTRVelaFriendView::urlForTouch() {
     const platform::Url url("wayloc://friend/" + handle);
     LogCategory_Unspecified()->line("Opening URL: %@ for friend handle: %@", url, handle);
     return url;
+}
+
+std::string KTRVelaFriendView::accessibilityText() const {
+    // Whoever listens may come when the host has already gone: then nothing can be worded.
+    if (!Platform::installed()) {
+        return "";
+    }
+    std::vector<std::string> parts = {nameText(), accessibilityLabel().value_or("")};
+    if (nameLabel_) {
+        for (const auto& label : {locationLabel_, distanceLabel_, timeLabel_}) {
+            parts.push_back(label ? label->accessibilityText() : "");
+        }
+    } else {
+        const auto filled = [](const char* key, const std::string& text) {
+            return text.empty() ? "" : platform::formatted(AssistantLocalizedString(key), {text});
+        };
+        const bool isPlaced = location_ && location_->hasCoordinate();
+        parts.push_back(isPlaced ? filled("ACCESSIBILITY_AT_LABEL", placeText()) : placeText());
+        parts.push_back(isVisibility_ ? "" : filled("ACCESSIBILITY_DISTANCE", distanceText()));
+        parts.push_back(ageText(LabelAccessibilityStringKey));
+    }
+    return SpokenRow::line(parts);
+}
+
+std::optional<platform::AccessibilitySubject> KTRVelaFriendView::accessibilitySubject() const {
+    const auto installed = Platform::installed();
+    const auto object = location_ ? location_->velaLocation() : nullptr;
+    if (isVisibility_ || !object || !installed) {
+        return std::nullopt;
+    }
+    using Subject = platform::AccessibilitySubject;
+    Subject subject;
+    subject.person = location_->friendName();
+    subject.handle = location_->unformattedHandle();
+    const bool hasName = object->label || object->city || object->stateCode;
+    if (hasName || location_->hasCoordinate()) {
+        subject.whereabouts = Subject::Whereabouts::Known;
+        subject.place = hasName ? placeText() : "";
+    } else {
+        subject.whereabouts = isRefreshingLocation_ ? Subject::Whereabouts::Sought : Subject::Whereabouts::Unknown;
+    }
+    if (const double date = object->locationDate.value_or(0.0); date > 0.0) {
+        subject.ageBand = KTRVAUIUtils::ageBandForDate({date});
+    }
+    const auto user = userLocation();
+    const auto place = KTRVAUtils::geoLocationForVALocation(object);
+    if (user && place && installed->geodesy) {
+        const double metres = installed->geodesy->distance(user->coordinate(), place->coordinate());
+        subject.metres = std::isfinite(metres) ? std::optional(metres) : std::nullopt;
+        subject.distance = distanceLabel_ ? distanceLabel_->accessibilityText() : distanceText();
+    }
+    return subject;
 }
 
 double KTRVelaFriendView::estimagedHeightForView() {

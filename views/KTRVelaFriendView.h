@@ -6,6 +6,7 @@
 
 #include "model/KTRVALocation.h"
 #include "platform/base/NotificationCenter.h"
+#include "platform/ui/AccessibilitySubject.h"
 #include "views/CurrentLocationDelegate.h"
 #include "views/KTRVelaBaseView.h"
 
@@ -14,7 +15,7 @@ namespace ktr {
 /// One friend: the avatar on the leading side; beside it the place, the name with the distance, and the age of the fix;
 /// a hairline at the bottom. A tap opens the friend. With an accessibility text size the row has no subviews, its
 /// labels are none and texts set on them go nowhere. Main thread.
-class KTRVelaFriendView : public KTRVelaBaseView {
+class KTRVelaFriendView : public KTRVelaBaseView, public platform::AccessibilitySubjectView {
   public:
     bool initWithFrame(const platform::Rect& frame) override;
     /// Builds the subviews and their constraints.
@@ -27,6 +28,10 @@ class KTRVelaFriendView : public KTRVelaBaseView {
     /// The least height that the row's constraints allow at its present width, points.
     double estimagedHeightForView() override;
     platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Link; }
+    /// The whole row in one line that begins with the person; the same at every text size.
+    std::string accessibilityText() const override;
+    /// None for the user's own row.
+    std::optional<platform::AccessibilitySubject> accessibilitySubject() const override;
 
     /// The source of the user's own position, for the distance; held weakly.
     std::shared_ptr<CurrentLocationDelegate> currentLocationDelegate() const { return currentLocationDelegate_.lock(); }
@@ -66,6 +71,7 @@ class KTRVelaFriendView : public KTRVelaBaseView {
     std::string ageText(const char* key) const;
 
   private:
+    std::shared_ptr<platform::PlatformLocation> userLocation() const;
     /// Shown and spoken; empty without a date.
     platform::Dictionary ageTexts() const;
     void setupLabels();

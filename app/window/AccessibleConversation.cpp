@@ -5,11 +5,11 @@
 #include "app/window/AccessibleNode.h"
 #include "app/window/AccessibleWidget.h"
 #include "app/window/ConversationWidget.h"
+#include "platform/ui/AccessibilitySubject.h"
 
 namespace ktr::app {
 
 using platform::AccessibilityNode;
-using platform::AccessibilityRole;
 using platform::View;
 
 namespace {
@@ -17,15 +17,6 @@ namespace {
 QAccessibleInterface* interfaceOf(const QString& /*className*/, QObject* object) {
     auto* widget = dynamic_cast<ConversationWidget*>(object);
     return widget == nullptr ? nullptr : new AccessibleWidget(*widget, widget->accessible());
-}
-
-void collectTexts(const AccessibilityNode& node, std::string& name) {
-    if (!node.text.empty()) {
-        name += (name.empty() ? "" : ", ") + node.text;
-    }
-    for (const AccessibilityNode& child : node.children) {
-        collectTexts(child, name);
-    }
 }
 
 }  // namespace
@@ -90,11 +81,7 @@ void AccessibleConversation::add(const AccessibilityNode& node, const View* pare
     entry.parent = parent;
     entry.node = node;
     entry.node.children.clear();
-    if (node.role == AccessibilityRole::Link) {
-        collectTexts(node, entry.name);
-    } else {
-        entry.name = node.text;
-    }
+    entry.node.text.clear();
     entries_[view.get()] = std::move(entry);
     (parent == nullptr ? topLevel_ : entries_[parent].children).push_back(view.get());
     for (const AccessibilityNode& child : node.children) {
@@ -117,12 +104,13 @@ void AccessibleConversation::update() {
         const bool same = now != nullptr && old != before.end() && old->second.view.lock() == now->view.lock();
         auto* node = QAccessible::accessibleInterface(it->second);
         if (!same || node == nullptr) {
+            changes_.forget(it->first);
             QAccessible::deleteAccessibleInterface(it->second);
             it = interfaces_.erase(it);
             reordered = true;
             continue;
         }
-        if (old->second.name != now->name) {
+        if (isNews(*now->view.lock())) {
             QAccessibleEvent event(node, QAccessible::NameChanged);
             QAccessible::updateAccessibility(&event);
         }
@@ -133,6 +121,18 @@ void AccessibleConversation::update() {
         QAccessibleEvent event(&widget_, QAccessible::ObjectReorder);
         QAccessible::updateAccessibility(&event);
     }
+}
+
+bool AccessibleConversation::isNews(const View& view) {
+    const auto* about = dynamic_cast<const platform::AccessibilitySubjectView*>(&view);
+    return changes_.isNews(&view, nameOf(&view), about != nullptr ? about->accessibilitySubject() : std::nullopt,
+                           static_cast<double>(clock_.nsecsElapsed()) * 1e-9);
+}
+
+std::string AccessibleConversation::nameOf(const View* view) {
+    const Entry* entry = find(view);
+    const auto there = entry == nullptr ? nullptr : entry->view.lock();
+    return there ? platform::accessibilityName(there, widget_.host().rightToLeft()) : "";
 }
 
 const AccessibleConversation::Entry* AccessibleConversation::find(const View* view) {
@@ -160,6 +160,7 @@ QAccessibleInterface* AccessibleConversation::interfaceFor(const View* view) {
     }
     auto* node = new AccessibleNode(*this, view);
     interfaces_[view] = QAccessible::registerAccessibleInterface(node);
+    isNews(*view);
     return node;
 }
 

@@ -1,11 +1,13 @@
 #pragma once
 
 #include <QAccessible>
+#include <QElapsedTimer>
 #include <memory>
 #include <string>
 #include <unordered_map>
 #include <vector>
 
+#include "host/heard/NameChanges.h"
 #include "platform/ui/Accessibility.h"
 
 namespace ktr::app {
@@ -25,7 +27,7 @@ class AccessibleConversation {
     /// The keyboard's focus came to a row.
     static void focused(ConversationWidget& widget);
 
-    explicit AccessibleConversation(ConversationWidget& widget) : widget_(widget) {}
+    explicit AccessibleConversation(ConversationWidget& widget) : widget_(widget) { clock_.start(); }
     ~AccessibleConversation();
     AccessibleConversation(const AccessibleConversation&) = delete;
     AccessibleConversation& operator=(const AccessibleConversation&) = delete;
@@ -35,14 +37,15 @@ class AccessibleConversation {
         std::weak_ptr<platform::View> view;
         const platform::View* parent = nullptr;  ///< null: the widget itself
         std::vector<const platform::View*> children;
-        platform::AccessibilityNode node;  ///< without its children
-        std::string name;                  ///< what is said of it: of a link, all its texts
+        platform::AccessibilityNode node;  ///< without its children and without what it says: that is read when asked
     };
 
     ConversationWidget& widget() const { return widget_; }
     /// None for a view that is not in the tree (any more).
     const Entry* find(const platform::View* view);
     const std::vector<const platform::View*>& topLevel();
+    /// What is said of it now; empty for a view that is not in the tree.
+    std::string nameOf(const platform::View* view);
     /// Made on first use; null for a view that is not in the tree.
     QAccessibleInterface* interfaceFor(const platform::View* view);
 
@@ -50,12 +53,16 @@ class AccessibleConversation {
     void rebuild();
     void add(const platform::AccessibilityNode& node, const platform::View* parent);
     void update();
+    /// Whether a listener wants to hear that the element's name has changed; the first time it is only taken note of.
+    bool isNews(const platform::View& view);
 
     ConversationWidget& widget_;
     bool built_ = false;
     std::unordered_map<const platform::View*, Entry> entries_;
     std::vector<const platform::View*> topLevel_;
     std::unordered_map<const platform::View*, QAccessible::Id> interfaces_;
+    host::NameChanges changes_;
+    QElapsedTimer clock_;
 };
 
 }  // namespace ktr::app

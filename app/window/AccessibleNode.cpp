@@ -52,8 +52,7 @@ QAccessibleInterface* AccessibleNode::childAt(int x, int y) const {
 }
 
 QString AccessibleNode::text(QAccessible::Text kind) const {
-    const auto* self = entry();
-    return self != nullptr && kind == QAccessible::Name ? QString::fromStdString(self->name) : QString();
+    return kind == QAccessible::Name ? QString::fromStdString(conversation_.nameOf(view_)) : QString();
 }
 
 QRect AccessibleNode::rect() const {
@@ -109,13 +108,18 @@ void* AccessibleNode::interface_cast(QAccessible::InterfaceType type) {
 
 QStringList AccessibleNode::actionNames() const {
     const auto* self = entry();
-    return self != nullptr && self->node.pressable ? QStringList{pressAction()} : QStringList{};
+    return self != nullptr && self->node.pressable ? QStringList{pressAction(), setFocusAction()} : QStringList{};
 }
 
 void AccessibleNode::doAction(const QString& name) {
     const auto* self = entry();
-    if (self != nullptr && self->node.pressable && name == pressAction()) {
+    if (self == nullptr || !self->node.pressable) {
+        return;
+    }
+    if (name == pressAction()) {
         platform::accessibilityPress(self->node);
+    } else if (name == setFocusAction()) {
+        conversation_.widget().focusRow(view_);
     }
 }
 

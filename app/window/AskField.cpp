@@ -4,12 +4,16 @@
 #include <QPainter>
 
 #include "linux/paint/FontChoice.h"
+#include "platform/base/Platform.h"
+#include "platform/ui/Device.h"
 #include "platform/ui/Font.h"
 
 namespace ktr::app {
 
 namespace {
 
+constexpr int kHeight = 48;
+constexpr int kLargeHeight = 80;
 constexpr int kStart = 14;
 constexpr int kEnd = 5;  ///< so that the button's circle and the field's end have one centre
 constexpr int kRingOutside = 4;
@@ -27,6 +31,17 @@ void strokeRound(QPainter& painter, const QRectF& rect, const QColor& color, dou
 }
 
 }  // namespace
+
+int AskField::shapeHeight() {
+    const auto installed = platform::Platform::installed();
+    const bool large = installed && platform::isAccessibilityCategory(installed->device->contentSizeCategory());
+    return large ? kLargeHeight : kHeight;
+}
+
+void AskField::refreshFont() {
+    edit_->setFont(fieldFont());
+    update();
+}
 
 AskField::AskField(const Texts& texts, QWidget* parent)
     : QWidget(parent),
@@ -95,7 +110,7 @@ void AskField::mousePressEvent(QMouseEvent*) {
 void AskField::resizeEvent(QResizeEvent*) {
     const int buttonSize = button_->sizeHint().width();
     const int editWidth = width() - 2 * kAround - kStart - kEnd - SendButton::kDiameter - kStart / 2;
-    const int editHeight = kHeight - 8;
+    const int editHeight = shapeHeight() - 8;
     const bool mirrored = layoutDirection() == Qt::RightToLeft;
     const int buttonX = kAround + kEnd - SendButton::kAround;
     button_->setGeometry(mirrored ? buttonX : width() - buttonX - buttonSize, (height() - buttonSize) / 2, buttonSize,

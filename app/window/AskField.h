@@ -13,8 +13,10 @@ namespace ktr::app {
 /// stands. Main thread.
 class AskField : public QWidget {
   public:
-    static constexpr int kHeight = 48;
     static constexpr int kAround = 7;
+
+    /// Of its shape, at the present text size.
+    static int shapeHeight();
 
     struct Texts {
         std::string placeholder;
@@ -24,6 +26,8 @@ class AskField : public QWidget {
     explicit AskField(const Texts& texts, QWidget* parent = nullptr);
     /// Where the language has become another.
     void setTexts(const Texts& texts);
+    /// Where the text size has become another.
+    void refreshFont();
 
     /// Called with what was typed, which is not blank; the field is empty then.
     void setAsked(std::function<void(const std::string&)> asked) { asked_ = std::move(asked); }

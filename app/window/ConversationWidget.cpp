@@ -1,11 +1,8 @@
 #include "app/window/ConversationWidget.h"
 
 #include <QApplication>
-#include <QKeyEvent>
-#include <QMouseEvent>
 #include <QPainter>
 #include <QStyle>
-#include <QTouchEvent>
 #include <algorithm>
 #include <cmath>
 
@@ -22,10 +19,6 @@ using linux_::Palette;
 namespace {
 
 constexpr int kBarWidth = 8;
-constexpr double kArrowStep = 40.0;
-/// A wheel's notch, in the eighths of a degree that Qt counts, and how far it goes in points.
-constexpr double kNotch = 120.0;
-constexpr double kNotchStep = 60.0;
 constexpr int kFrame = 16;  // milliseconds
 
 }  // namespace
@@ -51,6 +44,7 @@ ConversationWidget::ConversationWidget(host::Host& host, QWidget* parent)
       touches_(std::make_shared<platform::TouchDispatcher>(host.window())),
       rows_(host.window(), host.conversation(), host.rightToLeft()),
       palette_(&Palette::of(ColorScheme::Light)),
+      voice_(std::make_unique<Voice>(host, *this)),
       bar_(new QScrollBar(Qt::Vertical, this)),
       rings_(host.conversation(), [this] { return standsStill(); }) {
     setAttribute(Qt::WA_OpaquePaintEvent);
@@ -94,6 +88,8 @@ AccessibleConversation& ConversationWidget::accessible() {
 void ConversationWidget::remade() {
     setLayoutDirection(host_.rightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
     rows_.setRightToLeft(host_.rightToLeft());
+    // What it waits with has gone with the platform.
+    voice_ = std::make_unique<Voice>(host_, *this);
     layOut();
 }
 
@@ -104,11 +100,12 @@ double ConversationWidget::seconds() const {
 void ConversationWidget::choosePalette() {
     const bool systemIsDark = QApplication::palette().color(QPalette::Window).lightness() < 128;
     const host::HostSettings& settings = host_.settings();
+    const bool highContrast = settings.highContrast || highContrast_;
     palette_ = &Palette::of(settings.dark.value_or(systemIsDark) ? ColorScheme::Dark : ColorScheme::Light,
-                            settings.highContrast ? Contrast::High : Contrast::Normal);
+                            highContrast ? Contrast::High : Contrast::Normal);
     host_.conversation()->setPalette(*palette_);
     QColor handle = palette_->inkSoft;
-    handle.setAlphaF(settings.highContrast ? 1.0F : 0.45F);
+    handle.setAlphaF(highContrast ? 1.0F : 0.45F);
     bar_->setStyleSheet(QStringLiteral("QScrollBar:vertical { background: transparent; width: %1px; border: none; }"
                                        "QScrollBar::handle:vertical { background: %2; border-radius: 3px; margin: 1px; "
                                        "min-height: 32px; }"
@@ -137,10 +134,15 @@ void ConversationWidget::layOut() {
     rows_.refresh();
     rings_.update();
     update();
-    AccessibleConversation::changed(*this);
+    rowsChanged();
     if (heightsChanged_) {
         requestLayout();
     }
+}
+
+void ConversationWidget::rowsChanged() {
+    AccessibleConversation::changed(*this);
+    voice_->changed();
 }
 
 bool ConversationWidget::standsStill() const {
@@ -219,6 +221,7 @@ void ConversationWidget::layOutWindow() {
     layingOut_ = true;
     host_.window()->layoutIfNeeded();
     layingOut_ = false;
+    rowsChanged();
 }
 
 /// What has changed within its card, such as a distance when the user moves. Where a card is of another height now, by
@@ -303,6 +306,14 @@ void ConversationWidget::turnCame(host::TurnView& turn) {
 void ConversationWidget::answerCame(host::TurnView& turn) {
     turn.answerArrives(seconds());
     layOut();
+    voice_->answerCame(turn);
+}
+
+void ConversationWidget::setHighContrast(bool high) {
+    if (high != highContrast_) {
+        highContrast_ = high;
+        choosePalette();
+    }
 }
 
 void ConversationWidget::setReducedMotion(bool reduced) {
@@ -340,181 +351,6 @@ void ConversationWidget::changeEvent(QEvent* event) {
         choosePalette();
     }
     QWidget::changeEvent(event);
-}
-
-// Pointers
-
-void ConversationWidget::wheelEvent(QWheelEvent* event) {
-    stopScrolling();
-    kinetic_.stop();
-    const double pixels = event->pixelDelta().isNull() ? event->angleDelta().y() / kNotch * kNotchStep
-                                                       : static_cast<double>(event->pixelDelta().y());
-    // A fine wheel turns by less than a pixel at a time.
-    wheelRest_ -= pixels;
-    const double whole = std::trunc(wheelRest_);
-    wheelRest_ -= whole;
-    scrollTo(scrolled() + whole);
-    rows_.hover(inTree(event->position()));
-    event->accept();
-}
-
-void ConversationWidget::mousePressEvent(QMouseEvent* event) {
-    rows_.clear();
-    if (event->button() == Qt::LeftButton) {
-        touches_->press(inTree(event->position()), seconds());
-    }
-}
-
-void ConversationWidget::mouseMoveEvent(QMouseEvent* event) {
-    touches_->move(inTree(event->position()), seconds());
-    rows_.hover(inTree(event->position()));
-}
-
-void ConversationWidget::mouseReleaseEvent(QMouseEvent* event) {
-    if (event->button() == Qt::LeftButton) {
-        touches_->release(inTree(event->position()), seconds());
-    }
-}
-
-void ConversationWidget::leaveEvent(QEvent*) {
-    rows_.hover(std::nullopt);
-}
-
-bool ConversationWidget::event(QEvent* event) {
-    switch (event->type()) {
-        case QEvent::TouchBegin:
-        case QEvent::TouchUpdate:
-        case QEvent::TouchEnd:
-        case QEvent::TouchCancel:
-            return touch(*static_cast<QTouchEvent*>(event));
-        default:
-            return QWidget::event(event);
-    }
-}
-
-bool ConversationWidget::touch(QTouchEvent& event) {
-    if (event.points().isEmpty()) {
-        return false;
-    }
-    // One finger scrolls and taps; further ones do nothing.
-    const QPointF at = mapFromGlobal(event.points().first().globalPosition());
-    event.accept();
-    switch (event.type()) {
-        case QEvent::TouchBegin:
-            stopScrolling();
-            rows_.clear();
-            rows_.hover(std::nullopt);
-            // A finger that stops a fling taps nothing.
-            tap_ = kinetic_.isFlinging() ? std::nullopt : std::optional(at);
-            kinetic_.press(at.y(), seconds());
-            if (tap_) {
-                touches_->press(inTree(at), seconds());
-            }
-            break;
-        case QEvent::TouchUpdate: {
-            const double moved = kinetic_.drag(at.y(), seconds());
-            if (tap_ && std::hypot(at.x() - tap_->x(), at.y() - tap_->y()) > platform::TouchDispatcher::kSlop) {
-                touches_->cancel(seconds());
-                tap_.reset();
-            }
-            if (!tap_) {
-                scrollTo(scrolled() + moved);
-            }
-            break;
-        }
-        case QEvent::TouchEnd:
-            if (tap_) {
-                kinetic_.stop();
-                touches_->release(inTree(at), seconds());
-            } else {
-                kinetic_.release(seconds());
-                if (kinetic_.isFlinging()) {
-                    flingTimer_.start();
-                }
-            }
-            tap_.reset();
-            break;
-        default:
-            touches_->cancel(seconds());
-            tap_.reset();
-            break;
-    }
-    return true;
-}
-
-void ConversationWidget::fling() {
-    const int before = bar_->value();
-    wheelRest_ += kinetic_.step(seconds());
-    const double whole = std::trunc(wheelRest_);
-    wheelRest_ -= whole;
-    scrollTo(before + whole);
-    const bool atEnd = std::abs(whole) >= 1.0 && bar_->value() == before;
-    if (atEnd) {
-        kinetic_.stop();
-    }
-    if (!kinetic_.isFlinging()) {
-        wheelRest_ = 0.0;
-        flingTimer_.stop();
-    }
-}
-
-// Keyboard
-
-void ConversationWidget::showFocus() {
-    stopScrolling();
-    constexpr double kAround = 12.0;
-    if (const auto rect = rows_.focusedRect()) {
-        if (rect->y - kAround < scrolled()) {
-            scrollTo(rect->y - kAround);
-        } else if (rect->maxY() + kAround > scrolled() + height()) {
-            scrollTo(rect->maxY() + kAround - height());
-        }
-        AccessibleConversation::focused(*this);
-    }
-}
-
-bool ConversationWidget::focusNextPrevChild(bool next) {
-    if (rows_.step(next)) {
-        showFocus();
-        return true;
-    }
-    return QWidget::focusNextPrevChild(next);
-}
-
-void ConversationWidget::keyPressEvent(QKeyEvent* event) {
-    stopScrolling();
-    const double page = height() - kArrowStep;
-    // Taken here and not as shortcuts: those need a window manager that says which window is active.
-    if (event->modifiers() == Qt::ControlModifier && (event->key() == Qt::Key_Q || event->key() == Qt::Key_W)) {
-        window()->close();
-        return;
-    }
-    switch (event->key()) {
-        case Qt::Key_Return:
-        case Qt::Key_Enter:
-        case Qt::Key_Space:
-            if (!rows_.press() && event->key() == Qt::Key_Space) {
-                scrollTo(scrolled() + (event->modifiers().testFlag(Qt::ShiftModifier) ? -page : page));
-            }
-            return;
-        case Qt::Key_Escape:
-            rows_.clear();
-            return;
-        case Qt::Key_Down:
-            return scrollTo(scrolled() + kArrowStep);
-        case Qt::Key_Up:
-            return scrollTo(scrolled() - kArrowStep);
-        case Qt::Key_PageDown:
-            return scrollTo(scrolled() + page);
-        case Qt::Key_PageUp:
-            return scrollTo(scrolled() - page);
-        case Qt::Key_Home:
-            return scrollTo(0.0);
-        case Qt::Key_End:
-            return scrollTo(bar_->maximum());
-        default:
-            QWidget::keyPressEvent(event);
-    }
 }
 
 }  // namespace ktr::app

@@ -12,6 +12,7 @@
 #include "app/window/KineticScroll.h"
 #include "app/window/RingTurner.h"
 #include "app/window/RowFocus.h"
+#include "app/window/Voice.h"
 #include "host/Host.h"
 #include "linux/paint/Palette.h"
 #include "platform/ui/TouchDispatcher.h"
@@ -41,6 +42,8 @@ class ConversationWidget : public QWidget {
     void turnCame(host::TurnView& turn);
     void answerCame(host::TurnView& turn);
     void setReducedMotion(bool reduced);
+    /// Besides the settings' own wish.
+    void setHighContrast(bool high);
     const linux_::Palette& colors() const { return *palette_; }
     /// Called after the colours have become others.
     void setPaletteChanged(std::function<void()> changed) { paletteChanged_ = std::move(changed); }
@@ -50,6 +53,10 @@ class ConversationWidget : public QWidget {
     /// Made once somebody asks for it; from then on it hears what changes.
     AccessibleConversation& accessible();
     bool isAccessed() const { return accessible_ != nullptr; }
+    /// Gives a row the keyboard's focus; false when it is none.
+    bool focusRow(const platform::View* row);
+    /// Something besides the rows may have changed that a listener wants to hear of.
+    void tellListeners() { voice_->changed(); }
     /// How often something was painted: what a test asks to see that only what changed is.
     const QRegion& lastPainted() const { return lastPainted_; }
 
@@ -62,6 +69,8 @@ class ConversationWidget : public QWidget {
     void mouseMoveEvent(QMouseEvent* event) override;
     void mouseReleaseEvent(QMouseEvent* event) override;
     void leaveEvent(QEvent* event) override;
+    void focusInEvent(QFocusEvent* event) override;
+    void focusOutEvent(QFocusEvent* event) override;
     void keyPressEvent(QKeyEvent* event) override;
     void changeEvent(QEvent* event) override;
     bool focusNextPrevChild(bool next) override;
@@ -73,6 +82,8 @@ class ConversationWidget : public QWidget {
     void requestLayout();
     void layOutWindow();
     void layOutMarked();
+    /// Tells assistive technology.
+    void rowsChanged();
     /// The next picture of what moves.
     void move();
     void startMoving();
@@ -92,6 +103,8 @@ class ConversationWidget : public QWidget {
     bool touch(QTouchEvent& event);
     void fling();
     void showFocus();
+    /// False for a key that means nothing to rows, as all do while none has the focus.
+    bool moveAmongRows(int key);
     platform::Point inTree(QPointF point) const { return {point.x(), point.y() + scrolled()}; }
     double seconds() const;
 
@@ -102,7 +115,9 @@ class ConversationWidget : public QWidget {
     RowFocus rows_;
     const linux_::Palette* palette_;
     std::function<void()> paletteChanged_;
+    std::unique_ptr<Voice> voice_;
     bool reducedMotion_ = false;
+    bool highContrast_ = false;
     QScrollBar* bar_;
     RingTurner rings_;
     QTimer flingTimer_;

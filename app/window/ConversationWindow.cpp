@@ -1,9 +1,12 @@
 #include "app/window/ConversationWindow.h"
 
+#include <QGuiApplication>
 #include <QKeyEvent>
 #include <QPainter>
+#include <algorithm>
 
 #include "host/conversation/WideColumns.h"
+#include "platform/base/Log.h"
 
 namespace ktr::app {
 
@@ -17,7 +20,7 @@ constexpr int kStatusEvery = 1000;  // milliseconds
 }  // namespace
 
 ConversationWindow::ConversationWindow(host::Host& host)
-    : host_(host), conversation_(new ConversationWidget(host, this)) {
+    : host_(host), conversation_(new ConversationWidget(host, this)), saidTextSize_(host.settings().said.textSize) {
     setAttribute(Qt::WA_OpaquePaintEvent);
     setLayoutDirection(host.rightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
     setMinimumSize(conversation_->minimumSize());
@@ -35,6 +38,9 @@ ConversationWindow::ConversationWindow(host::Host& host)
 ConversationWindow::~ConversationWindow() {
     conversation_->setPaletteChanged(nullptr);
     host_.setRemade(nullptr);
+    if (desktop_ != nullptr) {
+        desktop_->setChanged(nullptr);
+    }
     if (live_) {
         live_->setHandlers({});
     }
@@ -46,10 +52,17 @@ void ConversationWindow::addField() {
     field_->setAsked([this](const std::string& question) { live_->ask(question); });
     field_->edit().installEventFilter(this);
     status_ = new StatusLine(this);
+    // From the field to the newest answer, and on to the button.
+    setTabOrder(&field_->edit(), conversation_);
+    setTabOrder(conversation_, &field_->button());
     setFocusProxy(&field_->edit());
     field_->edit().setFocus();
     live_->setHandlers({[this](host::TurnView& turn) { conversation_->turnCame(turn); },
-                        [this](host::TurnView& turn) { conversation_->answerCame(turn); }, [this] { showStatus(); }});
+                        [this](host::TurnView& turn) { conversation_->answerCame(turn); },
+                        [this] {
+                            showStatus();
+                            conversation_->tellListeners();
+                        }});
     statusTimer_.setInterval(kStatusEvery);
     connect(&statusTimer_, &QTimer::timeout, this, [this] { showStatus(); });
 }
@@ -63,6 +76,8 @@ void ConversationWindow::remade() {
     conversation_->remade();
     if (field_ != nullptr) {
         field_->setTexts(fieldTexts());
+        field_->refreshFont();
+        status_->refreshFont();
         showStatus();
     }
     place();
@@ -82,6 +97,9 @@ void ConversationWindow::start(const std::vector<host::Scenario>& scenarios,
 
 void ConversationWindow::showStatus() {
     status_->setStatus(live_->status());
+    if (status_->height() != status_->heightForWidth(status_->width())) {
+        place();
+    }
 }
 
 void ConversationWindow::choosePalette() {
@@ -92,9 +110,15 @@ void ConversationWindow::choosePalette() {
     update();
 }
 
+int ConversationWindow::fieldWidth() const {
+    const bool wide = width() >= host::measures::kWideFrom;
+    return static_cast<int>(wide ? host::WideColumns::of(width()).cardWidth : width() - 2.0 * host::measures::kGutter);
+}
+
 int ConversationWindow::barHeight() const {
     return field_ == nullptr ? 0
-                             : kAboveField + AskField::kHeight + kFieldToStatus + status_->lineHeight() + kBelowStatus;
+                             : kAboveField + AskField::shapeHeight() + kFieldToStatus +
+                                   status_->heightForWidth(fieldWidth()) + kBelowStatus;
 }
 
 void ConversationWindow::resizeEvent(QResizeEvent*) {
@@ -109,13 +133,14 @@ void ConversationWindow::place() {
     }
     const bool wide = width() >= host::measures::kWideFrom;
     const auto columns = host::WideColumns::of(width());
-    const int fieldWidth = static_cast<int>(wide ? columns.cardWidth : width() - 2.0 * host::measures::kGutter);
     const int start = static_cast<int>(wide ? columns.cardStart : host::measures::kGutter);
-    const int x = host_.rightToLeft() ? width() - start - fieldWidth : start;
+    const int across = fieldWidth();
+    const int x = host_.rightToLeft() ? width() - start - across : start;
     const int y = height() - bar + kAboveField;
     constexpr int kAround = AskField::kAround;
-    field_->setGeometry(x - kAround, y - kAround, fieldWidth + 2 * kAround, AskField::kHeight + 2 * kAround);
-    status_->setGeometry(x, y + AskField::kHeight + kFieldToStatus, fieldWidth, status_->lineHeight());
+    const int fieldHeight = AskField::shapeHeight();
+    field_->setGeometry(x - kAround, y - kAround, across + 2 * kAround, fieldHeight + 2 * kAround);
+    status_->setGeometry(x, y + fieldHeight + kFieldToStatus, across, status_->heightForWidth(across));
     field_->raise();
 }
 
@@ -130,7 +155,75 @@ void ConversationWindow::keyPressEvent(QKeyEvent* event) {
         close();
         return;
     }
+    if (changeTextSize(*event)) {
+        return;
+    }
+    if (event->key() == Qt::Key_Escape && field_ != nullptr) {
+        field_->edit().setFocus(Qt::ShortcutFocusReason);
+        return;
+    }
     QWidget::keyPressEvent(event);
+}
+
+void ConversationWindow::follow(linux_::DesktopSettings& desktop, bool reducedMotion) {
+    desktop_ = &desktop;
+    reducedMotion_ = reducedMotion;
+    desktop.setChanged([this] { desktopChanged(); });
+    connect(qApp, &QGuiApplication::applicationStateChanged, this, [this](Qt::ApplicationState state) {
+        if (state == Qt::ApplicationActive) {
+            desktop_->refresh();
+        }
+    });
+    desktopChanged();
+}
+
+void ConversationWindow::desktopChanged() {
+    const auto& values = desktop_->values();
+    conversation_->setReducedMotion(reducedMotion_ || values.reducedMotion.value_or(false));
+    conversation_->setHighContrast(values.highContrast.value_or(false));
+    decideTextSize();
+}
+
+void ConversationWindow::decideTextSize() {
+    host::HostSettings settings = host_.settings();
+    settings.said.textSize = chosenTextSize_ ? chosenTextSize_ : saidTextSize_;
+    settings.desktopTextScale = desktop_ != nullptr ? desktop_->values().textScale : std::nullopt;
+    settings.decideTextSize();
+    if (settings.textSize == host_.settings().textSize) {
+        return;
+    }
+    if (const auto failure = host_.remake(settings)) {
+        platform::platformLog().write(platform::LogLevel::Error, "the text size stays as it is: %@",
+                                      platform::FormatArgument(failure->line).shown());
+    }
+}
+
+bool ConversationWindow::changeTextSize(const QKeyEvent& key) {
+    using platform::ContentSizeCategory;
+    // On some keyboards the plus is above another sign, or on the number pad.
+    if ((key.modifiers() & ~(Qt::ShiftModifier | Qt::KeypadModifier)) != Qt::ControlModifier) {
+        return false;
+    }
+    const auto now = static_cast<int>(host_.settings().textSize);
+    const auto step = [now](int by) {
+        return static_cast<ContentSizeCategory>(std::clamp(now + by, 0, static_cast<int>(ContentSizeCategory::AX5)));
+    };
+    switch (key.key()) {
+        case Qt::Key_Plus:
+        case Qt::Key_Equal:
+            chosenTextSize_ = step(1);
+            break;
+        case Qt::Key_Minus:
+            chosenTextSize_ = step(-1);
+            break;
+        case Qt::Key_0:
+            chosenTextSize_.reset();
+            break;
+        default:
+            return false;
+    }
+    decideTextSize();
+    return true;
 }
 
 bool ConversationWindow::eventFilter(QObject* object, QEvent* event) {

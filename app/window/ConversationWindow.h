@@ -10,6 +10,7 @@
 #include "app/window/ConversationWidget.h"
 #include "app/window/StatusLine.h"
 #include "host/live/LiveConversation.h"
+#include "linux/device/DesktopSettings.h"
 
 namespace ktr::app {
 
@@ -20,7 +21,9 @@ class ConversationWindow : public QWidget {
     explicit ConversationWindow(host::Host& host);
     ~ConversationWindow() override;
 
-    void setReducedMotion(bool reduced) { conversation_->setReducedMotion(reduced); }
+    /// Motion, contrast and text size are the desktop's from now on, where nothing else says more; it outlives the
+    /// window. With `reducedMotion` nothing moves whatever the desktop says.
+    void follow(linux_::DesktopSettings& desktop, bool reducedMotion);
     /// Where the window is live: shows the scenarios and asks the questions once the account is read.
     void start(const std::vector<host::Scenario>& scenarios, const std::vector<std::string>& questions);
 
@@ -44,6 +47,11 @@ class ConversationWindow : public QWidget {
     void place();
     AskField::Texts fieldTexts() const;
     int barHeight() const;
+    int fieldWidth() const;
+    void desktopChanged();
+    /// One size larger, one smaller, or with none back to what it is without the window's user.
+    bool changeTextSize(const QKeyEvent& key);
+    void decideTextSize();
 
     host::Host& host_;
     ConversationWidget* conversation_;
@@ -51,6 +59,11 @@ class ConversationWindow : public QWidget {
     AskField* field_ = nullptr;
     StatusLine* status_ = nullptr;
     QTimer statusTimer_;
+    linux_::DesktopSettings* desktop_ = nullptr;
+    bool reducedMotion_ = false;
+    /// What options and scenarios said of the text size, and what the window's user has chosen since.
+    const std::optional<platform::ContentSizeCategory> saidTextSize_;
+    std::optional<platform::ContentSizeCategory> chosenTextSize_;
 };
 
 }  // namespace ktr::app

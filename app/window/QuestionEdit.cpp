@@ -1,6 +1,7 @@
 #include "app/window/QuestionEdit.h"
 
 #include <QEvent>
+#include <QFocusEvent>
 #include <QGuiApplication>
 #include <QPainter>
 #include <QProxyStyle>
@@ -91,7 +92,13 @@ void QuestionEdit::paintEvent(QPaintEvent* event) {
 }
 
 void QuestionEdit::focusInEvent(QFocusEvent* event) {
+    const int cursor = cursorPosition();
     QLineEdit::focusInEvent(event);
+    // By itself a key that comes here selects everything, and the next letter would replace what was typed.
+    if (event->reason() == Qt::TabFocusReason || event->reason() == Qt::BacktabFocusReason ||
+        event->reason() == Qt::ShortcutFocusReason) {
+        setCursorPosition(cursor);
+    }
     showCaret();
 }
 

@@ -40,7 +40,7 @@ std::vector<AccessibilityNode> RowFocus::rows() const {
 /// moves many times a second, and there may be thousands of rows.
 bool RowFocus::isRow(const std::shared_ptr<View>& view) const {
     return view->accessibilityRole() == platform::AccessibilityRole::Link &&
-           (!view->accessibilityText().empty() || !platform::accessibilityTree(view, rightToLeft_).children.empty());
+           !platform::accessibilityName(view, rightToLeft_).empty();
 }
 
 void RowFocus::hover(const std::optional<platform::Point>& point) {
@@ -54,21 +54,34 @@ void RowFocus::hover(const std::optional<platform::Point>& point) {
     }
 }
 
-bool RowFocus::step(bool forward) {
-    const auto all = rows();
+std::optional<std::size_t> RowFocus::placeAmong(const std::vector<AccessibilityNode>& rows) const {
     const auto current = focused_.lock();
     const auto found =
-        std::find_if(all.begin(), all.end(), [&](const auto& row) { return current && row.view.lock() == current; });
+        std::find_if(rows.begin(), rows.end(), [&](const auto& row) { return current && row.view.lock() == current; });
+    return found == rows.end() ? std::nullopt : std::optional(static_cast<std::size_t>(found - rows.begin()));
+}
+
+std::optional<std::size_t> RowFocus::firstOfNewest(const std::vector<AccessibilityNode>& rows) const {
+    const auto& turns = conversation_->turns();
+    for (auto turn = turns.rbegin(); turn != turns.rend(); ++turn) {
+        for (std::size_t i = 0; i < rows.size(); ++i) {
+            const auto view = rows[i].view.lock();
+            if (view && view->isDescendantOf(**turn)) {
+                return i;
+            }
+        }
+    }
+    return std::nullopt;
+}
+
+bool RowFocus::step(bool forward) {
+    const auto all = rows();
+    const auto at = placeAmong(all);
     std::optional<std::size_t> next;
-    if (found == all.end()) {
-        if (!all.empty()) {
-            next = forward ? 0 : all.size() - 1;
-        }
-    } else {
-        const auto at = static_cast<std::size_t>(found - all.begin());
-        if (forward ? at + 1 < all.size() : at > 0) {
-            next = forward ? at + 1 : at - 1;
-        }
+    if (!at) {
+        next = forward || all.empty() ? firstOfNewest(all) : std::optional(all.size() - 1);
+    } else if (forward ? *at + 1 < all.size() : *at > 0) {
+        next = forward ? *at + 1 : *at - 1;
     }
     if (next) {
         focused_ = all[*next].view;
@@ -77,6 +90,38 @@ bool RowFocus::step(bool forward) {
     }
     markFocus();
     return next.has_value();
+}
+
+bool RowFocus::stepWithin(bool forward) {
+    const auto all = rows();
+    const auto at = placeAmong(all);
+    if (!at || (forward ? *at + 1 >= all.size() : *at == 0)) {
+        return false;
+    }
+    focused_ = all[forward ? *at + 1 : *at - 1].view;
+    markFocus();
+    return true;
+}
+
+bool RowFocus::goToEnd(bool last) {
+    const auto all = rows();
+    if (all.empty()) {
+        return false;
+    }
+    focused_ = last ? all.back().view : all.front().view;
+    markFocus();
+    return true;
+}
+
+bool RowFocus::focus(const View* view) {
+    for (const AccessibilityNode& row : rows()) {
+        if (row.view.lock().get() == view) {
+            focused_ = row.view;
+            markFocus();
+            return true;
+        }
+    }
+    return false;
 }
 
 void RowFocus::clear() {

@@ -22,8 +22,15 @@ class RowFocus {
     /// A point in the root's coordinates; none: the pointer has left, or is a finger.
     void hover(const std::optional<platform::Point>& point);
     bool isHovering() const { return !hovered_.expired(); }
-    /// Moves the keyboard's focus by one row; false at either end, where the focus leaves.
+    /// Moves the keyboard's focus by one row; false at either end, where the focus leaves. Without a focus it begins
+    /// with the first row of the newest answer that has one, or backwards with the last row of all.
     bool step(bool forward);
+    /// The same, but at either end the focus stays; false there, and without a focus.
+    bool stepWithin(bool forward);
+    /// Gives the focus to the first row or the last; false without any.
+    bool goToEnd(bool last);
+    /// Gives the focus to this row; false when it is none.
+    bool focus(const platform::View* view);
     /// Takes the focus away, as any use of the pointer does.
     void clear();
     bool hasFocus() const { return !focused_.expired(); }
@@ -40,6 +47,9 @@ class RowFocus {
     /// What can be opened, in reading order.
     std::vector<platform::AccessibilityNode> rows() const;
     bool isRow(const std::shared_ptr<platform::View>& view) const;
+    /// Where the focused row is among the rows; none: nowhere.
+    std::optional<std::size_t> placeAmong(const std::vector<platform::AccessibilityNode>& rows) const;
+    std::optional<std::size_t> firstOfNewest(const std::vector<platform::AccessibilityNode>& rows) const;
     void markFocus();
     void markHover();
 

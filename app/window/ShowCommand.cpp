@@ -29,8 +29,9 @@ bool openOnDesktop(const platform::Url& url) {
 host::ExitCode ShowCommand::run(const std::vector<host::Scenario>& scenarios) {
     QGuiApplication::setApplicationName(QStringLiteral("ktr"));
     host_.delegate().open = options_.printUrls ? printUrl : openOnDesktop;
+    linux_::DesktopSettings desktop(linux_::DesktopSettings::Places::ofSession());
     ConversationWindow window(host_);
-    window.setReducedMotion(options_.reducedMotion);
+    window.follow(desktop, options_.reducedMotion);
     window.setWindowTitle(QStringLiteral("ktr"));
     const int width = static_cast<int>(host_.settings().width);
     window.resize(width, width < 900 ? kTallWindow : kWideWindow);

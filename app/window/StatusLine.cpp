@@ -2,9 +2,12 @@
 
 #include <QPainter>
 #include <QPainterPath>
+#include <algorithm>
 #include <cmath>
 
 #include "linux/paint/FontChoice.h"
+#include "platform/base/Platform.h"
+#include "platform/ui/Device.h"
 #include "platform/ui/Font.h"
 
 namespace ktr::app {
@@ -50,11 +53,22 @@ QPainterPath hiddenPath() {
 
 StatusLine::StatusLine(QWidget* parent)
     : QWidget(parent), words_(new QLabel(this)), palette_(&linux_::Palette::of(linux_::ColorScheme::Light)) {
+    words_->setTextFormat(Qt::PlainText);
+    refreshFont();
+}
+
+void StatusLine::refreshFont() {
     const auto font = platform::preferredFont(platform::TextStyle::Footnote);
     lineHeight_ = static_cast<int>(std::ceil(font.lineHeight()));
     words_->setFont(
         linux_::FontChoice::spec(font, static_cast<int>(font.size), linux_::FontChoice::baseFamily()).font());
-    words_->setTextFormat(Qt::PlainText);
+    const auto installed = platform::Platform::installed();
+    words_->setWordWrap(installed && platform::isAccessibilityCategory(installed->device->contentSizeCategory()));
+}
+
+int StatusLine::heightForWidth(int width) const {
+    return words_->wordWrap() ? std::max(lineHeight_, words_->heightForWidth(std::max(width - kWords, 1)))
+                              : lineHeight_;
 }
 
 void StatusLine::setStatus(const host::LiveStatus& status) {
@@ -85,7 +99,8 @@ void StatusLine::paintEvent(QPaintEvent*) {
     QPainter painter(this);
     painter.setRenderHint(QPainter::Antialiasing);
     const bool mirrored = layoutDirection() == Qt::RightToLeft;
-    const QPointF centre(mirrored ? width() - kMarkCentre : kMarkCentre, height() / 2.0 + 0.5);
+    // Beside the first line.
+    const QPointF centre(mirrored ? width() - kMarkCentre : kMarkCentre, std::min(lineHeight_, height()) / 2.0 + 0.5);
     switch (mark_) {
         case host::LiveStatus::Mark::Live:
             painter.setPen(Qt::NoPen);

@@ -20,7 +20,10 @@ class StatusLine : public QWidget {
     void setStatus(const host::LiveStatus& status);
     void setColors(const linux_::Palette& palette);
     QString words() const { return words_->text(); }
-    int lineHeight() const { return lineHeight_; }
+    /// Where the text size has become another.
+    void refreshFont();
+    /// Large words take as many lines as they need.
+    int heightForWidth(int width) const override;
 
   protected:
     void paintEvent(QPaintEvent* event) override;

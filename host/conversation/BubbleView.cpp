@@ -7,6 +7,7 @@
 #include "host/conversation/Measures.h"
 #include "host/conversation/Shapes.h"
 #include "platform/assistant/AssistantSettings.h"
+#include "platform/assistant/Localization.h"
 #include "platform/base/Platform.h"
 #include "platform/text/TextEngine.h"
 
@@ -67,6 +68,11 @@ platform::Size BubbleView::sizeForWidth(double mostWidth) const {
     const double textWidth = balancedWidth(label_->text(), label_->font(), mostWidth - 2.0 * measures::kBubbleSide);
     const platform::Size text = wrappedSize(label_->text(), label_->font(), textWidth).size;
     return {textWidth + 2.0 * measures::kBubbleSide, text.height + measures::kBubbleTop + measures::kBubbleBottom};
+}
+
+std::string BubbleView::accessibilityText() const {
+    const auto& localization = *Platform::installed()->localization;
+    return localization.text("ANNOUNCE_QUESTION", localization.hostBundleIdentifier());
 }
 
 void BubbleView::layoutSubviews() {

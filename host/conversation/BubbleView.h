@@ -19,6 +19,8 @@ class BubbleView : public platform::View {
     /// The bubble's own size when it may be `mostWidth` wide; zero without a text.
     platform::Size sizeForWidth(double mostWidth) const;
     void layoutSubviews() override;
+    platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Group; }
+    std::string accessibilityText() const override;
 
   protected:
     void draw(platform::Canvas& canvas) const override;

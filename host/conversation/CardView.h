@@ -41,6 +41,7 @@ class CardView : public platform::View {
     bool growsAtOnce() const { return isLarge_; }
     void layoutSubviews() override;
     platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Group; }
+    std::string accessibilityText() const override { return title_->text(); }
 
     /// The plugin's part of the card.
     const std::shared_ptr<platform::View>& content() const { return content_; }

@@ -16,15 +16,6 @@ using platform::Rect;
 
 namespace {
 
-void collectTexts(const AccessibilityNode& node, std::string& words) {
-    if (!node.text.empty()) {
-        words += (words.empty() ? "" : ", ") + node.text;
-    }
-    for (const AccessibilityNode& child : node.children) {
-        collectTexts(child, words);
-    }
-}
-
 QImage pictureOf(const platform::View& view, double scale, const Palette& palette) {
     const Rect bounds = view.bounds();
     const double longest = std::max({bounds.width, bounds.height, 1.0});
@@ -82,9 +73,7 @@ void StillView::addPart(const AccessibilityNode& node, const std::function<void(
     // A link that leads nowhere any more is a text.
     const auto role = opens || node.role != AccessibilityRole::Link ? node.role : AccessibilityRole::Text;
     auto part = std::make_shared<Part>(role, node.frame);
-    std::string words;
-    collectTexts(node, words);
-    part->setAccessibilityLabel(std::move(words));
+    part->setAccessibilityLabel(node.text);
     if (opens) {
         part->addGestureRecognizer(std::make_shared<platform::TapGestureRecognizer>(tapped));
     }

@@ -8,6 +8,7 @@
 #include "host/conversation/Shapes.h"
 #include "host/conversation/WideColumns.h"
 #include "platform/assistant/AssistantSettings.h"
+#include "platform/assistant/Localization.h"
 #include "platform/base/Platform.h"
 
 namespace ktr::host {
@@ -20,6 +21,16 @@ namespace {
 class SpeechView : public View {
   public:
     AccessibilityRole accessibilityRole() const override { return AccessibilityRole::Group; }
+};
+
+/// The sentence that answers, named for who listens.
+class AnswerView : public FadeView {
+  public:
+    AccessibilityRole accessibilityRole() const override { return AccessibilityRole::Group; }
+    std::string accessibilityText() const override {
+        const auto& localization = *Platform::installed()->localization;
+        return localization.text("ANNOUNCE_ANSWER", localization.hostBundleIdentifier());
+    }
 };
 
 bool rightToLeft() {
@@ -52,7 +63,9 @@ bool TurnView::initWithFrame(const Rect& frame) {
     chooseFonts();
     speech_->addSubview(time_);
     speech_->addSubview(bubble_);
-    speech_->addSubview(sentence_);
+    sentenceFade_ = create<AnswerView>(&AnswerView::initWithFrame, Rect{});
+    sentenceFade_->addSubview(sentence_);
+    speech_->addSubview(sentenceFade_);
     addSubview(speech_);
     addSubview(card_);
     return true;
@@ -90,6 +103,7 @@ void TurnView::setSentence(const std::string& sentence) {
     texts_.sentence = cutText(sentence, kLongestText);
     sentence_->setText(texts_.sentence);
     sentence_->setHidden(sentence.empty());
+    sentenceFade_->setHidden(sentence.empty());
 }
 
 void TurnView::setController(const std::shared_ptr<HostSnippetViewController>& controller) {
@@ -134,12 +148,8 @@ void TurnView::setCardHeight(double height, double width) {
 
 void TurnView::placeAnswer() {
     const double rise = riseOf(answerArrival_);
-    if (sentenceFade_) {
-        place(*sentenceFade_, places_.sentence.offsetBy(0.0, rise), places_.sentenceParent);
-        sentence_->setFrame(sentenceFade_->bounds());
-    } else {
-        place(*sentence_, places_.sentence, places_.sentenceParent);
-    }
+    place(*sentenceFade_, places_.sentence.offsetBy(0.0, rise), places_.sentenceParent);
+    sentence_->setFrame(sentenceFade_->bounds());
     height_ = places_.least;
     if (!card_->hidden()) {
         Rect card = places_.card.offsetBy(0.0, rise);
@@ -165,11 +175,6 @@ void TurnView::arrive(double now) {
 
 void TurnView::answerArrives(double now) {
     if (style_ != MotionStyle::None) {
-        if (!sentenceFade_) {
-            sentenceFade_ = create<FadeView>(&FadeView::initWithFrame, Rect{});
-            speech_->addSubview(sentenceFade_);
-            sentenceFade_->addSubview(sentence_);
-        }
         answerArrival_ = Motion(0.0, 1.0, now, style_ == MotionStyle::Full ? motions::kArrival : motions::kFade);
     }
 }
@@ -182,9 +187,7 @@ bool TurnView::advance(double now) {
     now_ = now;
     const bool moves = !isOver(now);
     if (moved || moves) {
-        if (sentenceFade_) {
-            sentenceFade_->setOpacity(answerArrival_.at(now));
-        }
+        sentenceFade_->setOpacity(answerArrival_.at(now));
         card_->setOpacity(answerArrival_.at(now));
         placeAnswer();
         setNeedsDisplay();

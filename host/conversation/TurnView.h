@@ -39,7 +39,12 @@ class TurnView : public platform::View {
     /// Of the time.
     void setSoftColor(const platform::Color& color) { time_->setTextColor(color); }
     const std::shared_ptr<CardView>& card() const { return card_; }
+    const std::string& sentence() const { return texts_.sentence; }
     platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Group; }
+    /// The question, else the sentence.
+    std::string accessibilityText() const override {
+        return texts_.question.empty() ? texts_.sentence : texts_.question;
+    }
 
     /// Lays the turn out in a conversation of this width; its height, points. Only the first turn of a narrow
     /// conversation shows its time, above. A card that was laid out before grows or shrinks to its new height where
@@ -97,7 +102,7 @@ class TurnView : public platform::View {
     std::shared_ptr<platform::View> speech_;
     std::shared_ptr<platform::Label> time_;
     std::shared_ptr<BubbleView> bubble_;
-    /// Around the sentence once it has come on its own; else none.
+    /// Around the sentence, which may come on its own.
     std::shared_ptr<FadeView> sentenceFade_;
     std::shared_ptr<platform::Label> sentence_;
     std::shared_ptr<CardView> card_;

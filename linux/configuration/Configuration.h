@@ -4,6 +4,8 @@
 #include <string>
 #include <vector>
 
+#include "platform/ui/Font.h"
+
 namespace ktr::linux_ {
 
 /// What the configuration file says (docs/configuration.md). A value; the app token is not part of it.
@@ -54,6 +56,8 @@ struct Configuration {
     /// vCard files, or folders of them: the user's contacts; absolute paths.
     std::vector<std::string> contacts;
     std::optional<std::string> language;  ///< the assistant's, BCP 47
+    /// Instead of the desktop's.
+    std::optional<platform::ContentSizeCategory> textSize;
     /// The country of the geographic services: two letters in upper case.
     std::optional<std::string> geographicCountry;
     bool friendLocationRestricted = false;

@@ -7,6 +7,7 @@
 #include "documents/DocumentReader.h"
 #include "documents/FileTrust.h"
 #include "documents/Words.h"
+#include "linux/device/LinuxDevice.h"
 
 namespace ktr::linux_ {
 
@@ -167,6 +168,13 @@ void readAll(FieldReader& members, const std::filesystem::path& file, Configurat
         configuration.contacts.push_back(resolved(contacts, file));
     }
     configuration.language = members.text("language");
+    if (const auto size = members.text("textSize")) {
+        configuration.textSize = LinuxDevice::categoryNamed(*size);
+        if (!configuration.textSize) {
+            members.complain("textSize",
+                             "expected XS, S, M, L, XL, XXL, XXXL or AX1 to AX5, found " + documents::inQuotes(*size));
+        }
+    }
     configuration.geographicCountry = members.text("geographicCountry");
     if (configuration.geographicCountry) {
         const std::string& country = *configuration.geographicCountry;

@@ -2,9 +2,12 @@
 
 #include <algorithm>
 
+#include "platform/ui/AccessibilitySubject.h"
 #include "platform/ui/View.h"
 
 namespace ktr::platform {
+
+AccessibilitySubjectView::~AccessibilitySubjectView() = default;
 
 namespace {
 
@@ -40,10 +43,32 @@ std::vector<AccessibilityNode> childrenOf(const View& view, Point origin, bool r
     return children;
 }
 
+/// All that the nodes say, in their order.
+void collectTexts(const std::vector<AccessibilityNode>& nodes, std::string& line) {
+    for (const AccessibilityNode& node : nodes) {
+        if (!node.text.empty()) {
+            line += (line.empty() ? "" : ", ") + node.text;
+        }
+        collectTexts(node.children, line);
+    }
+}
+
+/// A listener walks from element to element: what is opened as a whole is one, and so is a text.
+bool isOneElement(AccessibilityRole role) {
+    return role == AccessibilityRole::Link || role == AccessibilityRole::Text;
+}
+
 void collect(const std::shared_ptr<View>& view, Point origin, bool rightToLeft, std::vector<AccessibilityNode>& out) {
-    auto children = childrenOf(*view, origin, rightToLeft);
     const AccessibilityRole role = view->accessibilityRole();
     std::string text = view->accessibilityText();
+    std::vector<AccessibilityNode> children;
+    if (!isOneElement(role) || text.empty()) {
+        children = childrenOf(*view, origin, rightToLeft);
+    }
+    if (isOneElement(role)) {
+        collectTexts(children, text);
+        children.clear();
+    }
     if (role == AccessibilityRole::None || (text.empty() && children.empty())) {
         std::move(children.begin(), children.end(), std::back_inserter(out));
         return;
@@ -67,6 +92,14 @@ AccessibilityNode accessibilityTree(const std::shared_ptr<View>& root, bool righ
     node.frame = root->bounds();
     node.children = childrenOf(*root, {0.0, 0.0}, rightToLeft);
     return node;
+}
+
+std::string accessibilityName(const std::shared_ptr<View>& view, bool rightToLeft) {
+    std::string text = view->accessibilityText();
+    if (text.empty() && isOneElement(view->accessibilityRole())) {
+        collectTexts(childrenOf(*view, {0.0, 0.0}, rightToLeft), text);
+    }
+    return text;
 }
 
 bool accessibilityPress(const AccessibilityNode& node) {

@@ -27,8 +27,12 @@ struct KTR_API AccessibilityNode {
 };
 
 /// The tree below a view: hidden views and views that are not presented are left out, as are texts with nothing to say.
+/// A link and a text are one element each, which says its own text or, without one, all that stands in it.
 /// Reading order: from top to bottom, then from the leading to the trailing edge. Main thread.
 KTR_API AccessibilityNode accessibilityTree(const std::shared_ptr<View>& root, bool rightToLeft);
+
+/// What is said of one view now: what its node of the tree would say.
+KTR_API std::string accessibilityName(const std::shared_ptr<View>& view, bool rightToLeft);
 
 /// Presses the node's view: its tap recognisers fire. False when the view is gone or takes no taps.
 KTR_API bool accessibilityPress(const AccessibilityNode& node);

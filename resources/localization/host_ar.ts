@@ -158,5 +158,55 @@
         <extracomment>The same: %@ describes a picture. English: “%@ (image)”</extracomment>
         <translation>%@ (صورة)</translation>
     </message>
+    <message>
+        <source>ANNOUNCE_QUESTION</source>
+        <extracomment>A screen reader’s name for what the user asked</extracomment>
+        <translation>سؤال</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_ANSWER</source>
+        <extracomment>A screen reader’s name for the sentence that answers</extracomment>
+        <translation>إجابة</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_PEOPLE</source>
+        <extracomment>Said after the sentence of an answer that has come: %@ is how many people are on it</extracomment>
+        <translation>عدد الأشخاص: %@.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_PLACE</source>
+        <extracomment>Said when a friend (%1$@) has come to another place (%2$@, such as “Fish Market”, “Home” or “Brinmouth, HB”)</extracomment>
+        <translation>%1$@: %2$@.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_UNSEEN</source>
+        <extracomment>Said when the place of a friend (%@) is not told any more</extracomment>
+        <translation>لم يعد موقع %@ ظاهرًا.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_SEEN</source>
+        <extracomment>Said when the place (%2$@) of a friend (%1$@) is known again</extracomment>
+        <translation>موقع %1$@ ظاهر من جديد: %2$@.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_SEEN_SOMEWHERE</source>
+        <extracomment>The same for a place without a name</extracomment>
+        <translation>موقع %@ ظاهر من جديد.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_UNREACHABLE</source>
+        <extracomment>Said when the friends’ service cannot be reached any more</extracomment>
+        <translation>يتعذّر الوصول إلى أصدقائك. قد تكون المعلومات المعروضة قديمة.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_REACHABLE</source>
+        <extracomment>Said when it can be reached again</extracomment>
+        <translation>أصبح الوصول إلى أصدقائك ممكنًا من جديد.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_NEXT</source>
+        <extracomment>Two sentences that are said one after the other, as the language parts them; each has its full stop</extracomment>
+        <translation>%1$@ %2$@</translation>
+    </message>
 </context>
 </TS>

@@ -158,5 +158,55 @@
         <extracomment>The same: %@ describes a picture. English: “%@ (image)”</extracomment>
         <translation>%@（画像）</translation>
     </message>
+    <message>
+        <source>ANNOUNCE_QUESTION</source>
+        <extracomment>A screen reader’s name for what the user asked</extracomment>
+        <translation>質問</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_ANSWER</source>
+        <extracomment>A screen reader’s name for the sentence that answers</extracomment>
+        <translation>回答</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_PEOPLE</source>
+        <extracomment>Said after the sentence of an answer that has come: %@ is how many people are on it</extracomment>
+        <translation>人数：%@。</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_PLACE</source>
+        <extracomment>Said when a friend (%1$@) has come to another place (%2$@, such as “Fish Market”, “Home” or “Brinmouth, HB”)</extracomment>
+        <translation>%1$@：%2$@。</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_UNSEEN</source>
+        <extracomment>Said when the place of a friend (%@) is not told any more</extracomment>
+        <translation>%@さんの位置情報は表示されなくなりました。</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_SEEN</source>
+        <extracomment>Said when the place (%2$@) of a friend (%1$@) is known again</extracomment>
+        <translation>%1$@さんの位置情報が再び表示されました：%2$@。</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_SEEN_SOMEWHERE</source>
+        <extracomment>The same for a place without a name</extracomment>
+        <translation>%@さんの位置情報が再び表示されました。</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_UNREACHABLE</source>
+        <extracomment>Said when the friends’ service cannot be reached any more</extracomment>
+        <translation>友だちの情報を取得できません。表示は古い可能性があります。</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_REACHABLE</source>
+        <extracomment>Said when it can be reached again</extracomment>
+        <translation>友だちの情報を再び取得できるようになりました。</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_NEXT</source>
+        <extracomment>Two sentences that are said one after the other, as the language parts them; each has its full stop</extracomment>
+        <translation>%1$@%2$@</translation>
+    </message>
 </context>
 </TS>

@@ -158,5 +158,55 @@
         <extracomment>The same: %@ describes a picture. English: “%@ (image)”</extracomment>
         <translation>%@ (зображення)</translation>
     </message>
+    <message>
+        <source>ANNOUNCE_QUESTION</source>
+        <extracomment>A screen reader’s name for what the user asked. English: “Question”</extracomment>
+        <translation>Запитання</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_ANSWER</source>
+        <extracomment>A screen reader’s name for the sentence that answers. English: “Answer”</extracomment>
+        <translation>Відповідь</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_PEOPLE</source>
+        <extracomment>Said after the sentence of an answer that has come: %@ is how many people are on it. English: “People: %@.”</extracomment>
+        <translation>Людей: %@.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_PLACE</source>
+        <extracomment>Said when a friend (%1$@) has come to another place (%2$@, such as “Fish Market”, “Home” or “Brinmouth, HB”). English: “%1$@: %2$@.”</extracomment>
+        <translation>%1$@: %2$@.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_UNSEEN</source>
+        <extracomment>Said when the place of a friend (%@) is not told any more. English: “%@ is no longer visible.”</extracomment>
+        <translation>%@: місце більше не видно.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_SEEN</source>
+        <extracomment>Said when the place (%2$@) of a friend (%1$@) is known again. English: “%1$@ is visible again: %2$@.”</extracomment>
+        <translation>%1$@: місце знову видно: %2$@.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_SEEN_SOMEWHERE</source>
+        <extracomment>The same for a place without a name. English: “%@ is visible again.”</extracomment>
+        <translation>%@: місце знову видно.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_UNREACHABLE</source>
+        <extracomment>Said when the friends’ service cannot be reached any more. English: “Your friends are out of reach. What is shown may be old.”</extracomment>
+        <translation>Друзі недоступні. Показані дані можуть бути застарілими.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_REACHABLE</source>
+        <extracomment>Said when it can be reached again. English: “Your friends are within reach again.”</extracomment>
+        <translation>Друзі знову доступні.</translation>
+    </message>
+    <message>
+        <source>ANNOUNCE_NEXT</source>
+        <extracomment>Two sentences that are said one after the other, as the language parts them; each has its full stop. English: “%1$@ %2$@”</extracomment>
+        <translation>%1$@ %2$@</translation>
+    </message>
 </context>
 </TS>

@@ -109,6 +109,11 @@
         <translation>Відстань: %@</translation>
     </message>
     <message>
+        <source>ACCESSIBILITY_ROW_PARTS</source>
+        <extracomment>Read aloud: %1$@ is what was said of a friend so far, %2$@ what comes next, as the language lists things. English: “%1$@, %2$@”</extracomment>
+        <translation>%1$@, %2$@</translation>
+    </message>
+    <message>
         <source>ACCESSIBILITY_AT_LABEL</source>
         <extracomment>Read aloud: %@ is a town (“Brinmouth, HB”), a place with a name (“Fish Market”, “Home”) or “Locating…”: word it so that each of them fits. English: “Place: %@”</extracomment>
         <translation>Місце: %@</translation>

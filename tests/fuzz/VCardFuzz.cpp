@@ -20,11 +20,11 @@ using ktr::linux_::VCardText;
 using ktr::platform::Contact;
 
 void check(const Contact& contact) {
-    for (const auto* text : {&contact.identifier, &contact.namePrefix, &contact.givenName, &contact.middleName,
-                             &contact.familyName, &contact.previousFamilyName, &contact.nameSuffix, &contact.nickname,
-                             &contact.phoneticGivenName, &contact.phoneticMiddleName, &contact.phoneticFamilyName,
-                             &contact.organizationName, &contact.departmentName, &contact.jobTitle,
-                             &contact.storedFullName}) {
+    for (const auto* text :
+         {&contact.identifier, &contact.namePrefix, &contact.givenName, &contact.middleName, &contact.familyName,
+          &contact.previousFamilyName, &contact.nameSuffix, &contact.nickname, &contact.phoneticGivenName,
+          &contact.phoneticMiddleName, &contact.phoneticFamilyName, &contact.organizationName, &contact.departmentName,
+          &contact.jobTitle, &contact.storedFullName}) {
         require(ktr::platform::isValidUtf8(*text), "names are text");
     }
     for (const auto* values : {&contact.emailAddresses, &contact.phoneNumbers}) {

@@ -67,8 +67,8 @@ class LiveTest(unittest.TestCase):
     def test_friends_move(self):
         result = self.describe(MOVING, 3, "--interval", "0.4")
         self.assertEqual(result.returncode, 0, result.stderr)
-        self.assertIn("Place: Fish Market, Ann Marsh", result.stdout)
-        self.assertIn("Place: Work, Otto Brandt", result.stdout)
+        self.assertIn("Ann Marsh, Place: Fish Market", result.stdout)
+        self.assertIn("Otto Brandt, Place: Work", result.stdout)
         self.assertIn("Here is where they are.", result.stdout)
         self.assertIn("Live · updated just now", result.stderr)
         self.assertRegex(result.stderr, r"the service was asked: [2-9]\d* answers, 0 failures")
@@ -118,10 +118,10 @@ class LiveTest(unittest.TestCase):
     def test_friend_appears_once_found(self):
         late = [person("Kwame", "Asare", [place(0, "Home")], locatedAfter=1.5), person("Zofia", "Wrona", [])]
         result = self.describe(late, 3, "--interval", "0.3")
-        self.assertIn("Place: Home, Kwame Asare", result.stdout)
+        self.assertIn("Kwame Asare, Place: Home", result.stdout)
 
     # Faults: words of the fault, what the status line says at the end, what is on screen at the end.
-    WAS, IS = "Place: Home, Ann Marsh", "Place: Fish Market, Ann Marsh"
+    WAS, IS = "Ann Marsh, Place: Home", "Ann Marsh, Place: Fish Market"
     OFFLINE = r"Offline\. Showing what was known at \d?\d:\d\d"
     LIVE = "Live · updated just now"
     FAULTS = {
@@ -148,7 +148,7 @@ class LiveTest(unittest.TestCase):
         "an object of nothing": ("text={}", None, "Finding your friends…"),
         "half of the friends": ("statusCode=416", LIVE, IS),
         "nobody is reported": ("entryStatus=411", LIVE, "Finding your friends…"),
-        "one is not reported": ("entryStatus=411,entry=ann@harbour.example", LIVE, "Place: Work, Otto Brandt"),
+        "one is not reported": ("entryStatus=411,entry=ann@harbour.example", LIVE, "Otto Brandt, Place: Work"),
         "asking ends": ("interval=0", "Paused · updated just now", None),
         "asking goes on in an hour": ("interval=3600", LIVE, None),
     }

@@ -157,6 +157,60 @@ class LiveWindowTest(unittest.TestCase):
         self.assertEqual(program.wait(timeout=20), 0)
         self.assertEqual(program.stderr.read(), "")
 
+    def test_keys_alone_reach_the_newest_answer_and_come_back_to_what_was_typed(self):
+        self.serve()
+        program = self.open("--reduced-motion", "--ask", "where are my friends")
+        self.assertEqual(self.url_of(FIRST_ROW), "wayloc://friend/ann@harbour.example")
+        self.click(FIELD)
+        already = len(self.output.read_text().split())
+        self.xdotool("type", "--delay", 5, "where is ")
+        self.xdotool("key", "Tab", "Return", "Down", "Return", "Up", "Return")
+
+        def pressed():
+            return self.output.read_text().split()[already:]
+
+        ann, otto = "wayloc://friend/ann@harbour.example", "wayloc://friend/otto@mail.example"
+        wait_for("three rows opened", lambda: len(pressed()) >= 3)
+        self.assertEqual(pressed(), [ann, otto, ann])
+        # Back, on with the sentence, and sent: nothing of it was lost.
+        self.xdotool("key", "Escape")
+        self.xdotool("type", "--delay", 5, "otto")
+        self.xdotool("key", "Return")
+        self.assertEqual(self.url_of(ON_MAP), otto)
+        # Beyond the newest answer's row and map stands the button, and beyond that the field.
+        self.click(FIELD)
+        self.xdotool("type", "--delay", 5, "where is ")
+        self.xdotool("key", "Tab", "Tab", "Tab", "Tab")
+        self.xdotool("type", "--delay", 5, "ann")
+        self.xdotool("key", "Tab", "Tab", "Tab", "space")
+        wait_for("the third answer", lambda: self.url_of(ON_MAP) == ann)
+        self.xdotool("key", "ctrl+q")
+        self.assertEqual(program.wait(timeout=20), 0)
+        self.assertEqual(program.stderr.read(), "")
+
+    def test_text_grows_and_shrinks_by_keys(self):
+        self.serve()
+        program = self.open("--reduced-motion", "--ask", "where are my friends")
+        self.assertEqual(self.url_of(FIRST_ROW), "wayloc://friend/ann@harbour.example")
+        self.click(FIELD)
+        everything = (0, 60, 390, 640)
+        # What changes by itself stands still for the comparison.
+        time.sleep(9)
+        usual = self.picture(everything)
+        self.xdotool("key", "ctrl+plus")
+        larger = wait_for("larger text", lambda: (now := self.picture(everything)) != usual and now)
+        self.xdotool("key", "ctrl+plus", "ctrl+minus", "ctrl+minus")
+        wait_for("the usual size again", lambda: self.picture(everything) == usual)
+        self.xdotool("key", "ctrl+minus")
+        wait_for("smaller text", lambda: self.picture(everything) not in (usual, larger))
+        self.xdotool("key", "ctrl+0")
+        wait_for("what it was at first", lambda: self.picture(everything) == usual)
+        # The window goes on: rows can be pressed, and questions asked.
+        self.assertEqual(self.url_of(FIRST_ROW), "wayloc://friend/ann@harbour.example")
+        self.xdotool("key", "ctrl+q")
+        self.assertEqual(program.wait(timeout=20), 0)
+        self.assertEqual(program.stderr.read(), "")
+
     def test_send_button_asks_and_a_second_question_comes_to_the_top(self):
         self.serve()
         self.open("--reduced-motion")

@@ -84,19 +84,19 @@ class PositionsTest(unittest.TestCase):
         while not re.search(r"[2-9] answers", line := program.stderr.readline()):
             self.assertNotEqual(line, "")
         gpsd.stop()
-        self.assertIn(f"Place: Home, Ann Marsh, {DISTANCE} away", self.told(program))
+        self.assertIn(f"Ann Marsh, Place: Home, {DISTANCE} away", self.told(program))
         self.assertEqual(gpsd.asked, [b'?WATCH={"enable":true,"json":true};\n'])
 
     def test_gpsd_that_is_not_there(self):
         with socket.create_server(("127.0.0.1", 0)) as free:
             port = free.getsockname()[1]
         told = self.told(self.start({"source": "gpsd", "host": "127.0.0.1", "port": port}))
-        self.assertIn("Place: Home, Ann Marsh, Located now", told)
+        self.assertIn("Ann Marsh, Place: Home, Located now", told)
 
     def test_gpsd_that_says_nothing(self):
         with socket.create_server(("127.0.0.1", 0)) as silent:
             told = self.told(self.start({"source": "gpsd", "host": "127.0.0.1", "port": silent.getsockname()[1]}))
-        self.assertIn("Place: Home, Ann Marsh, Located now", told)
+        self.assertIn("Ann Marsh, Place: Home, Located now", told)
 
     def test_gpx_track(self):
         track = self.folder / "walk.gpx"
@@ -104,18 +104,18 @@ class PositionsTest(unittest.TestCase):
                          f'<trkpt lat="{HERE[0]}" lon="{HERE[1]}"><time>2026-05-16T16:00:00Z</time></trkpt>'
                          "</trkseg></trk></gpx>")
         told = self.told(self.start({"source": "track", "file": str(track)}))
-        self.assertIn(f"Place: Home, Ann Marsh, {DISTANCE} away", told)
+        self.assertIn(f"Ann Marsh, Place: Home, {DISTANCE} away", told)
 
     def test_no_track_there(self):
         told = self.told(self.start({"source": "track", "file": "nowhere.gpx"}), complains_of="nowhere.gpx: there is no such file")
-        self.assertIn("Place: Home, Ann Marsh, Located now", told)
+        self.assertIn("Ann Marsh, Place: Home, Located now", told)
 
     def test_geoclue_without_a_bus(self):
         told = self.told(self.start(None, DBUS_SYSTEM_BUS_ADDRESS="unix:path=/nonexistent"))
-        self.assertIn("Place: Home, Ann Marsh, Located now", told)
+        self.assertIn("Ann Marsh, Place: Home, Located now", told)
 
     def test_none(self):
-        self.assertIn("Place: Home, Ann Marsh, Located now", self.told(self.start({"source": "none"})))
+        self.assertIn("Ann Marsh, Place: Home, Located now", self.told(self.start({"source": "none"})))
 
 
 if __name__ == "__main__":

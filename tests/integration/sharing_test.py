@@ -66,7 +66,7 @@ class SharingTest(unittest.TestCase):
     def test_resting_user_one_command_then_quiet(self):
         self.serve(track(1, 1))
         result = self.live(3, "Share my location")
-        self.assertIn("Friends can see where you are, Place: Brinmouth, HB, Mara Lind", result.stdout)
+        self.assertIn("Mara Lind, Friends can see where you are, Place: Brinmouth, HB", result.stdout)
         self.assertNotIn("Locating", result.stdout)
         self.assertEqual(self.commands(), [("showHideLocation", "200")])
 
@@ -83,7 +83,7 @@ class SharingTest(unittest.TestCase):
     def test_hidden_user_is_shown_to_nobody(self):
         self.serve(track(8, 0.25))
         result = self.live(2, "Hide my location")
-        self.assertIn("Hidden from friends, Mara Lind", result.stdout)
+        self.assertIn("Mara Lind, Hidden from friends", result.stdout)
         self.assertIn("Done. Friends can’t see where you are.", result.stdout)
         self.assertIn("Your location is hidden", result.stderr)
         self.assertFalse(self.is_visible())
@@ -196,7 +196,7 @@ class SharingTest(unittest.TestCase):
         self.live(0.5, "Hide my location")
         self.assertFalse(self.is_visible())
         result = self.live(2, "Share my location")
-        self.assertIn("Place: Brinmouth, HB, Mara Lind", result.stdout)
+        self.assertIn("Friends can see where you are, Place: Brinmouth, HB", result.stdout)
         self.assertTrue(self.is_visible())
 
     def test_answers_that_say_little(self):

@@ -9,16 +9,6 @@ AXRowTexts AXRowTexts::make(std::string name, std::vector<std::string> pieces, b
             platform::preferredFont(platform::TextStyle::Subheadline), rightToLeft};
 }
 
-std::string AXRowTexts::spoken(const std::vector<std::string>& parts) {
-    std::string line;
-    for (const std::string& part : parts) {
-        if (!part.empty()) {
-            line += (line.empty() ? "" : ", ") + part;
-        }
-    }
-    return line;
-}
-
 platform::AttributedString AXRowTexts::composed() const {
     using platform::TextAlignment;
     using platform::WritingDirection;

@@ -20,8 +20,6 @@ struct AXRowTexts {
 
     /// At the user's text size. Main thread.
     static AXRowTexts make(std::string name, std::vector<std::string> pieces, bool rightToLeft);
-    /// Several texts in one line for whoever hears them; empty ones are left out.
-    static std::string spoken(const std::vector<std::string>& parts);
     /// The name and a line break, then the pieces one after the other: wrapped at words, at the interface's leading
     /// edge and in its direction.
     platform::AttributedString composed() const;

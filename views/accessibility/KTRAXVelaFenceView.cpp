@@ -86,8 +86,4 @@ void KTRAXVelaFenceView::layoutSubviews() {
     }
 }
 
-std::string KTRAXVelaFenceView::accessibilityText() const {
-    return Platform::installed() ? AXRowTexts::spoken({friendName().value_or(""), fenceSentence()}) : "";
-}
-
 }  // namespace ktr

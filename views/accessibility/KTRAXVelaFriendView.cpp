@@ -84,18 +84,4 @@ void KTRAXVelaFriendView::layoutSubviews() {
     }
 }
 
-std::string KTRAXVelaFriendView::accessibilityText() const {
-    if (!Platform::installed()) {
-        return "";
-    }
-    const auto filled = [](const char* key, const std::string& text) {
-        return text.empty() ? "" : platform::formatted(AssistantLocalizedString(key), {text});
-    };
-    const std::string place = placeText();
-    const bool isPlaced = location() && location()->hasCoordinate();
-    return AXRowTexts::spoken({nameText(), isPlaced ? filled("ACCESSIBILITY_AT_LABEL", place) : place,
-                               isVisibility() ? "" : filled("ACCESSIBILITY_DISTANCE", distanceText()),
-                               ageText(LabelAccessibilityStringKey)});
-}
-
 }  // namespace ktr

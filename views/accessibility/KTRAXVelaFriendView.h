@@ -30,8 +30,6 @@ class KTRAXVelaFriendView : public KTRVelaFriendView {
     double estimagedHeightForView() override;
     /// Renders again when the width has changed.
     void layoutSubviews() override;
-    /// What the labels of the plain row say, the name first.
-    std::string accessibilityText() const override;
 
     /// As wide as the row without its margins; 0 high until it has its image.
     std::shared_ptr<platform::ImageView> imageView() const { return rendering_->imageView(); }

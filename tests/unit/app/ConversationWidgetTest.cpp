@@ -174,6 +174,70 @@ TEST_F(KTRConversationWidgetTest, Keyboard_ReachesShowAllLast) {
     EXPECT_FALSE(widget->rows().hasFocus()) << "beyond the last row the focus leaves";
 }
 
+TEST_F(KTRConversationWidgetTest, Keyboard_BeginsWithTheNewestAnswerAndReachesTheEarlier) {
+    open({"dinner", "show-all"});
+    key(Qt::Key_Tab);
+    const auto& turns = host->conversation()->turns();
+    ASSERT_TRUE(widget->rows().focused());
+    EXPECT_TRUE(widget->rows().focused()->isDescendantOf(*turns[1]));
+    key(Qt::Key_Up);
+    ASSERT_TRUE(widget->rows().focused());
+    EXPECT_TRUE(widget->rows().focused()->isDescendantOf(*turns[0]));
+    key(Qt::Key_Down);
+    key(Qt::Key_Backtab, Qt::ShiftModifier);
+    EXPECT_TRUE(widget->rows().focused()->isDescendantOf(*turns[0]));
+}
+
+TEST_F(KTRConversationWidgetTest, Keyboard_NewestAnswerWithoutRowsIsPassedOver) {
+    open({"dinner", "locating"});
+    key(Qt::Key_Tab);
+    ASSERT_TRUE(widget->rows().focused());
+    EXPECT_TRUE(widget->rows().focused()->isDescendantOf(*host->conversation()->turns()[0]));
+}
+
+TEST_F(KTRConversationWidgetTest, ArrowsHomeAndEnd_MoveAmongRowsAndStayAtTheEnds) {
+    open({"dinner"});
+    key(Qt::Key_Down);
+    EXPECT_FALSE(widget->rows().hasFocus()) << "without a focus they scroll";
+    key(Qt::Key_Tab);
+    const auto first = widget->rows().focused();
+    key(Qt::Key_Up);
+    EXPECT_EQ(widget->rows().focused(), first);
+    key(Qt::Key_Down);
+    EXPECT_NE(widget->rows().focused(), first);
+    key(Qt::Key_End);
+    const auto last = widget->rows().focused();
+    key(Qt::Key_Down);
+    EXPECT_EQ(widget->rows().focused(), last);
+    key(Qt::Key_Return);
+    EXPECT_EQ(opened, std::vector<std::string>{"wayloc://friends/"});
+    key(Qt::Key_Home);
+    EXPECT_EQ(widget->rows().focused(), first);
+}
+
+TEST_F(KTRConversationWidgetTest, FocusByKey_StopsAtARowAndByMouseAtNone) {
+    open({"dinner"});
+    const auto focus = [&](Qt::FocusReason reason) {
+        QFocusEvent in(QEvent::FocusIn, reason);
+        QApplication::sendEvent(widget.get(), &in);
+    };
+    const auto leave = [&](Qt::FocusReason reason) {
+        QFocusEvent out(QEvent::FocusOut, reason);
+        QApplication::sendEvent(widget.get(), &out);
+    };
+    focus(Qt::MouseFocusReason);
+    EXPECT_FALSE(widget->rows().hasFocus());
+    focus(Qt::TabFocusReason);
+    EXPECT_TRUE(widget->rows().hasFocus());
+    leave(Qt::ActiveWindowFocusReason);
+    EXPECT_TRUE(widget->rows().hasFocus()) << "who comes back to the window goes on there";
+    leave(Qt::MouseFocusReason);
+    EXPECT_FALSE(widget->rows().hasFocus());
+    focus(Qt::BacktabFocusReason);
+    key(Qt::Key_Return);
+    EXPECT_EQ(opened, std::vector<std::string>{"wayloc://friends/"}) << "backwards it comes to the last row";
+}
+
 TEST_F(KTRConversationWidgetTest, Focus_BringsItsRowIntoView) {
     open({"forty-friends"});
     for (int i = 0; i < 40; ++i) {

@@ -18,15 +18,18 @@ AccessibilityNode node(AccessibilityRole role, std::string text, std::vector<Acc
 }
 
 TEST(KTRDescriptionTest, Describe_WritesALineAnElementInOrder) {
-    const auto tree = node(AccessibilityRole::Group, "",
-                           {node(AccessibilityRole::Text, "Where is Ann?"),
-                            node(AccessibilityRole::Group, "",
-                                 {node(AccessibilityRole::Text, "Friends"),
-                                  node(AccessibilityRole::Link, "",
-                                       {node(AccessibilityRole::Text, "At Work"), node(AccessibilityRole::Image, "Ann"),
-                                        node(AccessibilityRole::Text, "Located now")})}),
-                            node(AccessibilityRole::Image, "Map")});
-    EXPECT_EQ(describe(tree), "Where is Ann?\nFriends\nAt Work, Ann, Located now (link)\nMap (image)\n");
+    const auto tree = node(
+        AccessibilityRole::Group, "",
+        {node(AccessibilityRole::Text, "Where is Ann?"),
+         node(AccessibilityRole::Group, "",
+              {node(AccessibilityRole::Text, "Friends"), node(AccessibilityRole::Link, "Ann, At Work, Located now")}),
+         node(AccessibilityRole::Image, "Map")});
+    EXPECT_EQ(describe(tree), "Where is Ann?\nFriends\nAnn, At Work, Located now (link)\nMap (image)\n");
+}
+
+TEST(KTRDescriptionTest, Describe_LeavesOutWhatAGroupIsCalled) {
+    const auto tree = node(AccessibilityRole::Group, "Question", {node(AccessibilityRole::Text, "Where is Ann?")});
+    EXPECT_EQ(describe(tree), "Where is Ann?\n");
 }
 
 TEST(KTRDescriptionTest, Describe_KeepsLineEndsOutOfALine) {

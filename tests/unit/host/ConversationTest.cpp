@@ -196,10 +196,26 @@ TEST_F(KTRConversationTest, ReadingOrder_IsQuestionSentenceThenCardAlsoSideBySid
         ASSERT_EQ(tree.children.size(), 1u);
         const auto& parts = tree.children[0].children;
         ASSERT_EQ(parts.size(), 2u);
-        EXPECT_EQ(parts[0].children[0].text, "where is ann");
-        EXPECT_EQ(parts[0].children[1].text, "here");
+        EXPECT_EQ(tree.children[0].text, "where is ann");
+        ASSERT_GE(parts[0].children.size(), 2u);
+        EXPECT_EQ(parts[0].children[0].text, "ANNOUNCE_QUESTION");
+        EXPECT_EQ(parts[0].children[0].children.at(0).text, "where is ann");
+        EXPECT_EQ(parts[0].children[1].text, "ANNOUNCE_ANSWER");
+        EXPECT_EQ(parts[0].children[1].children.at(0).text, "here");
+        EXPECT_EQ(parts[1].text, "Friends");
         EXPECT_EQ(parts[1].children[0].text, "Friends");
         EXPECT_EQ(parts[1].children[1].text, "row");
+    }
+}
+
+TEST_F(KTRConversationTest, ReadAloud_QuestionWithoutASentenceHasNoAnswer) {
+    const auto turn = addTurn();
+    turn->setSentence("");
+    conversation->layOut(400.0);
+    const auto tree = platform::accessibilityTree(conversation, false);
+    const auto& speech = tree.children.at(0).children.at(0);
+    for (const auto& part : speech.children) {
+        EXPECT_NE(part.text, "ANNOUNCE_ANSWER");
     }
 }
 

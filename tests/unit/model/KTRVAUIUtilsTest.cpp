@@ -71,6 +71,19 @@ TEST_F(KTRVAUIUtilsTest, EveryBandAtItsBounds_IsKept) {
     }
 }
 
+TEST_F(KTRVAUIUtilsTest, AgeBands_AreThoseOfTheTexts) {
+    const auto band = [](double age) { return KTRVAUIUtils::ageBandForDate({kNoon - age}); };
+    EXPECT_EQ(band(30.0), 0);
+    EXPECT_EQ(band(31.0), 1);
+    EXPECT_EQ(band(59.0), 1);
+    EXPECT_EQ(band(60.0), 2);
+    EXPECT_EQ(band(3599.0), 2);
+    EXPECT_EQ(band(3600.0), 3);
+    EXPECT_EQ(band(7199.0), 3);
+    EXPECT_EQ(band(7200.0), 4);
+    EXPECT_EQ(band(-45.0), band(45.0));
+}
+
 TEST_F(KTRVAUIUtilsTest, NowIsNoFormat) {
     for (const double age : {0.0, 30.0, 30.9}) {
         EXPECT_EQ(row(age), "100 %@ now") << age;

@@ -431,6 +431,7 @@ TEST_F(KTRAXVelaFriendViewTest, ScreenReader_HearsOneLinkAndNoImage) {
     window->addSubview(row);
     layOut(row, 640.0);
     localization->set(kBundle, "ACCESSIBILITY_AT_LABEL", "At %@");
+    localization->set(kBundle, "ACCESSIBILITY_ROW_PARTS", "%1$@, %2$@");
     localization->set(kBundle, "ACCESSIBILITY_DISTANCE", "%@ away");
     localization->set(kBundle, "ACCESSIBILITY_LOCATED_MINUTES", "%@ minutes ago");
     const auto tree = accessibilityTree(window, false);

@@ -290,7 +290,18 @@ TEST_F(KTRVelaFenceViewTest, AccessibilityTextSize_HasNoSubviews) {
     EXPECT_EQ(row->friendName(), "Ann");
 }
 
+TEST_F(KTRVelaFenceViewTest, ReadAloud_LargeRowSaysWhatThePlainOneSays) {
+    localization->set("org.ktr.snippets", "ACCESSIBILITY_ROW_PARTS", "%1$@; %2$@");
+    const auto plain = rowFor(annsFence(kLeaving, "_$!<home>!$_"));
+    device->category = ContentSizeCategory::AX3;
+    const auto large = rowFor(annsFence(kLeaving, "_$!<home>!$_"));
+    ASSERT_EQ(large->nameLabel(), nullptr);
+    EXPECT_EQ(large->accessibilityText(), plain->accessibilityText());
+    EXPECT_EQ(large->accessibilityText(), "Ann; When leaving Home");
+}
+
 TEST_F(KTRVelaFenceViewTest, ReadAloud_IsALinkOfNameAndSentence) {
+    localization->set("org.ktr.snippets", "ACCESSIBILITY_ROW_PARTS", "%1$@; %2$@");
     const auto window = create<Window>(&Window::initWithFrame, Rect{0.0, 0.0, 320.0, 500.0});
     const auto fence = annsFence(kLeaving, "_$!<home>!$_");
     const auto row = rowFor(fence);
@@ -298,11 +309,10 @@ TEST_F(KTRVelaFenceViewTest, ReadAloud_IsALinkOfNameAndSentence) {
     window->layoutIfNeeded();
     const auto node = accessibilityTree(window, false).children.at(0);
     EXPECT_EQ(node.role, AccessibilityRole::Link);
-    ASSERT_EQ(node.children.size(), 2U);
-    EXPECT_EQ(node.children[0].text, "Ann");
-    EXPECT_EQ(node.children[1].text, "When leaving Home");
+    EXPECT_EQ(node.text, "Ann; When leaving Home");
+    EXPECT_TRUE(node.children.empty()) << "the row is one element";
     fence->friend_->data = std::nullopt;
-    EXPECT_EQ(row->accessibilityRole(), AccessibilityRole::Group) << "nothing to open";
+    EXPECT_EQ(row->accessibilityRole(), AccessibilityRole::Text) << "nothing to open";
 }
 
 TEST_F(KTRVelaFenceViewTest, PlatformGone_KeepsWhatIsShown) {

@@ -33,6 +33,7 @@ class KTRVelaFriendViewTest : public test::PlatformTest {
         localization->set(kBundle, "NO_LOCATION", "Not found");
         localization->set(kBundle, "ACCESSIBILITY_AT_LABEL", "At %@");
         localization->set(kBundle, "ACCESSIBILITY_DISTANCE", "%@ away");
+        localization->set(kBundle, "ACCESSIBILITY_ROW_PARTS", "%1$@; %2$@");
         localization->set(kBundle, "LOCATED_NOW", "Now");
         localization->set(kBundle, "ACCESSIBILITY_LOCATED_NOW", "Located now");
         localization->set(kBundle, "LOCATED_MINUTES", "%@ min ago");
@@ -353,7 +354,7 @@ TEST_F(KTRVelaFriendViewTest, Tap_LogsTheRowsLineFirst) {
 
 // Screen readers
 
-TEST_F(KTRVelaFriendViewTest, Accessibility_RowIsLinkOfItsLabels) {
+TEST_F(KTRVelaFriendViewTest, Accessibility_RowIsOneLinkThatBeginsWithThePerson) {
     const auto window = create<Window>(&Window::initWithFrame, Rect{0.0, 0.0, 320.0, 500.0});
     auto object = placedFriend("Ann", "ann@example.org");
     object->locationDate = kNoon;
@@ -366,11 +367,56 @@ TEST_F(KTRVelaFriendViewTest, Accessibility_RowIsLinkOfItsLabels) {
     const auto& link = tree.children[0];
     EXPECT_EQ(link.role, AccessibilityRole::Link);
     EXPECT_TRUE(link.pressable);
-    std::vector<std::string> spoken;
-    for (const auto& child : link.children) {
-        spoken.push_back(child.text);
+    EXPECT_EQ(link.text, "Ann; At Springfield; 111 m away; Located now");
+    EXPECT_TRUE(link.children.empty());
+    row->setAccessibilityLabel("Friends can see where you are");
+    EXPECT_EQ(row->accessibilityText(), "Ann; Friends can see where you are; At Springfield; 111 m away; Located now");
+}
+
+TEST_F(KTRVelaFriendViewTest, Accessibility_LargeRowSaysWhatThePlainOneSays) {
+    auto object = placedFriend("Ann", "ann@example.org");
+    object->locationDate = kNoon - 300.0;
+    const auto unplaced = friendByEmail("Ann", "ann@example.org");
+    for (const auto& shown : {object, unplaced}) {
+        device->category = ContentSizeCategory::L;
+        const auto plain = rowFor(shown);
+        device->category = ContentSizeCategory::AX3;
+        const auto large = rowFor(shown);
+        ASSERT_EQ(large->nameLabel(), nullptr);
+        EXPECT_EQ(large->accessibilityText(), plain->accessibilityText());
+        EXPECT_TRUE(large->accessibilityText().starts_with("Ann; "));
+        for (const auto& row : {plain, large}) {
+            row->setIsVisibility(true);
+            row->updateView();
+        }
+        EXPECT_EQ(large->accessibilityText(), plain->accessibilityText());
+        EXPECT_EQ(large->accessibilityText().find("111 m"), std::string::npos);
     }
-    EXPECT_EQ(spoken, (std::vector<std::string>{"At Springfield", "Ann", "111 m away", "Located now"}));
+}
+
+TEST_F(KTRVelaFriendViewTest, Accessibility_SubjectSaysWhatCanBeNews) {
+    using Whereabouts = AccessibilitySubject::Whereabouts;
+    auto object = placedFriend("Ann", "ann@example.org");
+    object->locationDate = kNoon - 300.0;
+    const auto row = rowFor(object);
+    const auto subject = row->accessibilitySubject();
+    ASSERT_TRUE(subject);
+    EXPECT_EQ(subject->person, "Ann");
+    EXPECT_EQ(subject->whereabouts, Whereabouts::Known);
+    EXPECT_EQ(subject->place, "Springfield");
+    EXPECT_EQ(subject->ageBand, 2);
+    ASSERT_TRUE(subject->metres);
+    EXPECT_NEAR(*subject->metres, 111.0, 1.0);
+    EXPECT_EQ(subject->distance, "111 m away");
+
+    const auto unplaced = rowFor(friendByEmail("Ann", "ann@example.org"));
+    EXPECT_EQ(unplaced->accessibilitySubject()->whereabouts, Whereabouts::Sought);
+    EXPECT_EQ(unplaced->accessibilitySubject()->place, "");
+    EXPECT_FALSE(unplaced->accessibilitySubject()->metres);
+    unplaced->setIsRefreshingLocation(false);
+    EXPECT_EQ(unplaced->accessibilitySubject()->whereabouts, Whereabouts::Unknown);
+    row->setIsVisibility(true);
+    EXPECT_FALSE(row->accessibilitySubject()) << "the user hears no news of themselves";
 }
 
 }  // namespace ktr

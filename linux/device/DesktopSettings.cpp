@@ -1,0 +1,219 @@
+#include "linux/device/DesktopSettings.h"
+
+#include <QDBusMessage>
+#include <QDBusPendingCallWatcher>
+#include <QDBusPendingReply>
+#include <QFileInfo>
+#include <QProcess>
+#include <QStandardPaths>
+#include <QStringList>
+#include <cmath>
+#include <mutex>
+#include <thread>
+#include <utility>
+
+#include "linux/device/KdeFonts.h"
+
+namespace ktr::linux_ {
+
+namespace {
+
+const QString kPortal = QStringLiteral("org.freedesktop.portal.Desktop");
+const QString kPath = QStringLiteral("/org/freedesktop/portal/desktop");
+const QString kInterface = QStringLiteral("org.freedesktop.portal.Settings");
+const QString kAppearance = QStringLiteral("org.freedesktop.appearance");
+const QString kContrast = QStringLiteral("contrast");
+const QString kMotion = QStringLiteral("reduced-motion");
+const QString kGnome = QStringLiteral("org.gnome.desktop.interface");
+const QString kTextScale = QStringLiteral("text-scaling-factor");
+
+/// A portal answers with a variant in a variant.
+QVariant unwrapped(QVariant value) {
+    while (value.userType() == qMetaTypeId<QDBusVariant>()) {
+        value = value.value<QDBusVariant>().variant();
+    }
+    return value;
+}
+
+/// None for what is no sensible size.
+std::optional<double> scaleOf(const QVariant& value) {
+    bool isNumber = false;
+    const double scale = value.toDouble(&isNumber);
+    return isNumber && std::isfinite(scale) && scale >= 0.25 && scale <= 8.0 ? std::optional(scale) : std::nullopt;
+}
+
+/// 1: the user wishes it; 0 and whatever a later day brings: not.
+std::optional<bool> wishOf(const QVariant& value) {
+    bool isNumber = false;
+    const uint wish = value.toUInt(&isNumber);
+    return isNumber ? std::optional(wish == 1) : std::nullopt;
+}
+
+}  // namespace
+
+DesktopSettings::Places DesktopSettings::Places::ofSession() {
+    return {qEnvironmentVariable("XDG_CURRENT_DESKTOP"),
+            QStandardPaths::writableLocation(QStandardPaths::GenericConfigLocation).toStdString(),
+            qEnvironmentVariable("DBUS_SESSION_BUS_ADDRESS"), QStringLiteral("gsettings")};
+}
+
+struct DesktopSettings::Return {
+    std::mutex mutex;
+    DesktopSettings* owner = nullptr;  ///< none once it has gone
+};
+
+DesktopSettings::DesktopSettings(Places places)
+    : places_(std::move(places)),
+      desktop_([this] {
+          const QStringList names = places_.desktop.split(QLatin1Char(':'));
+          if (names.contains(QLatin1String("KDE"), Qt::CaseInsensitive)) {
+              return Desktop::Kde;
+          }
+          const bool gnome = names.contains(QLatin1String("GNOME"), Qt::CaseInsensitive) ||
+                             names.contains(QLatin1String("Phosh"), Qt::CaseInsensitive);
+          return gnome ? Desktop::Gnome : Desktop::Other;
+      }()),
+      return_(std::make_shared<Return>()) {
+    return_->owner = this;
+    if (desktop_ == Desktop::Kde) {
+        // The folder too: files there are replaced, not written.
+        files_.addPath(QString::fromStdString(places_.configuration.string()));
+        connect(&files_, &QFileSystemWatcher::directoryChanged, this, [this] { readKdeFonts(); });
+        connect(&files_, &QFileSystemWatcher::fileChanged, this, [this] { readKdeFonts(); });
+        readKdeFonts();
+    }
+    joinBus();
+}
+
+DesktopSettings::~DesktopSettings() {
+    {
+        const std::lock_guard lock(return_->mutex);
+        return_->owner = nullptr;
+    }
+    if (bus_) {
+        QDBusConnection::disconnectFromBus(bus_->name());
+    }
+}
+
+void DesktopSettings::runAside(std::function<std::function<void()>()> work) {
+    std::thread([back = return_, work = std::move(work)] {
+        auto done = work();
+        const std::lock_guard lock(back->mutex);
+        if (back->owner != nullptr) {
+            QMetaObject::invokeMethod(back->owner, std::move(done), Qt::QueuedConnection);
+        }
+    }).detach();
+}
+
+void DesktopSettings::joinBus() {
+    if (places_.busAddress.isEmpty()) {
+        return;
+    }
+    const QString name =
+        QStringLiteral("ktr-desktop-settings-") + QString::number(reinterpret_cast<quintptr>(this), 16);
+    runAside([this, name, address = places_.busAddress] {
+        const QDBusConnection bus = QDBusConnection::connectToBus(address, name);
+        return [this, bus] {
+            if (bus.isConnected()) {
+                useBus(bus);
+            }
+        };
+    });
+}
+
+void DesktopSettings::useBus(const QDBusConnection& bus) {
+    bus_ = bus;
+    // From whomever: who owns the portal's name is learnt in the background, and what it says until then would be lost.
+    bus_->connect(QString(), kPath, kInterface, QStringLiteral("SettingChanged"), this,
+                  SLOT(settingChanged(QString, QString, QDBusVariant)));
+    askAll();
+}
+
+void DesktopSettings::askAll() {
+    ask(kAppearance, kContrast);
+    ask(kAppearance, kMotion);
+    if (desktop_ == Desktop::Gnome) {
+        ask(kGnome, kTextScale);
+    }
+}
+
+void DesktopSettings::ask(const QString& group, const QString& key) {
+    QDBusMessage message = QDBusMessage::createMethodCall(kPortal, kPath, kInterface, QStringLiteral("Read"));
+    message << group << key;
+    auto* watcher = new QDBusPendingCallWatcher(bus_->asyncCall(message), this);
+    connect(watcher, &QDBusPendingCallWatcher::finished, this, [this, group, key](QDBusPendingCallWatcher* finished) {
+        finished->deleteLater();
+        const QDBusPendingReply<QDBusVariant> reply = *finished;
+        if (reply.isValid()) {
+            take(group, key, reply.value().variant());
+        } else if (group == kGnome) {
+            askGsettings();
+        }
+    });
+}
+
+void DesktopSettings::settingChanged(const QString& group, const QString& key, const QDBusVariant& value) {
+    take(group, key, value.variant());
+}
+
+void DesktopSettings::take(const QString& group, const QString& key, const QVariant& wrapped) {
+    const QVariant value = unwrapped(wrapped);
+    Values values = values_;
+    if (group == kAppearance && key == kContrast) {
+        values.highContrast = wishOf(value);
+    } else if (group == kAppearance && key == kMotion) {
+        values.reducedMotion = wishOf(value);
+    } else if (group == kGnome && key == kTextScale && desktop_ == Desktop::Gnome) {
+        portalKnowsTextScale_ = true;
+        values.textScale = scaleOf(value);
+    }
+    set(values);
+}
+
+void DesktopSettings::readKdeFonts() {
+    for (const char* name : KdeFonts::kFiles) {
+        const auto file = QString::fromStdString((places_.configuration / name).string());
+        // One that was replaced is not watched any more, and one that is not there cannot be.
+        if (!files_.files().contains(file) && QFileInfo::exists(file)) {
+            files_.addPath(file);
+        }
+    }
+    runAside([this, folder = places_.configuration] {
+        return [this, scale = KdeFonts::textScale(folder)] {
+            Values values = values_;
+            values.textScale = scale;
+            set(values);
+        };
+    });
+}
+
+void DesktopSettings::askGsettings() {
+    auto* process = new QProcess(this);
+    connect(process, &QProcess::errorOccurred, process, &QObject::deleteLater);
+    connect(process, &QProcess::finished, this, [this, process](int status) {
+        process->deleteLater();
+        if (status == 0 && !portalKnowsTextScale_) {
+            Values values = values_;
+            values.textScale = scaleOf(QString::fromUtf8(process->readAllStandardOutput()).trimmed());
+            set(values);
+        }
+    });
+    process->start(places_.gsettings, {QStringLiteral("get"), kGnome, kTextScale}, QIODevice::ReadOnly);
+}
+
+void DesktopSettings::refresh() {
+    if (bus_) {
+        askAll();
+    }
+}
+
+void DesktopSettings::set(const Values& values) {
+    if (values != values_) {
+        values_ = values;
+        if (changed_) {
+            changed_();
+        }
+    }
+}
+
+}  // namespace ktr::linux_

@@ -1,0 +1,79 @@
+#pragma once
+
+#include <QDBusConnection>
+#include <QDBusVariant>
+#include <QFileSystemWatcher>
+#include <QObject>
+#include <QString>
+#include <filesystem>
+#include <functional>
+#include <memory>
+#include <optional>
+
+namespace ktr::linux_ {
+
+/// What the desktop's user has set for all programs: the size of texts, high contrast and less motion. The text size is
+/// KDE's, or else that of GNOME and Phosh, and each is asked for only on its own desktop: elsewhere its answer is a
+/// stale one. Contrast and motion are those of the desktop portal (org.freedesktop.portal.Settings). Nothing waits: the
+/// bus is joined and files are read in the background, and values are none until somebody has said them, for good where
+/// nobody does. Main thread.
+class DesktopSettings : public QObject {
+    Q_OBJECT
+
+  public:
+    struct Values {
+        std::optional<double> textScale;  ///< 1 is the desktop's usual size
+        std::optional<bool> highContrast;
+        std::optional<bool> reducedMotion;
+        bool operator==(const Values&) const = default;
+    };
+    /// Where everything is found; a test has its own.
+    struct Places {
+        QString desktop;                      ///< as XDG_CURRENT_DESKTOP says: names with colons between them
+        std::filesystem::path configuration;  ///< the folder of the user's configuration files
+        QString busAddress;                   ///< of the session's bus; empty: none
+        QString gsettings;                    ///< the program that is asked where no portal answers
+        static Places ofSession();
+    };
+
+    explicit DesktopSettings(Places places);
+    ~DesktopSettings() override;
+
+    const Values& values() const { return values_; }
+    /// Called after a value has become another one.
+    void setChanged(std::function<void()> changed) { changed_ = std::move(changed); }
+    /// The program's windows are used again: what may have changed without a word is asked for anew.
+    void refresh();
+
+  private Q_SLOTS:
+    void settingChanged(const QString& group, const QString& key, const QDBusVariant& value);
+
+  private:
+    enum class Desktop { Kde, Gnome, Other };
+    struct Return;
+
+    /// Runs `work` on a thread of its own, and what it gives on the main thread unless this has gone by then. Nobody
+    /// waits for that thread: a bus may never answer.
+    void runAside(std::function<std::function<void()>()> work);
+
+    void joinBus();
+    void useBus(const QDBusConnection& bus);
+    void ask(const QString& group, const QString& key);
+    void askAll();
+    void take(const QString& group, const QString& key, const QVariant& value);
+    void readKdeFonts();
+    void askGsettings();
+    void set(const Values& values);
+
+    const Places places_;
+    const Desktop desktop_;
+    Values values_;
+    std::function<void()> changed_;
+    std::optional<QDBusConnection> bus_;
+    QFileSystemWatcher files_;
+    bool portalKnowsTextScale_ = false;
+    /// The way back for work in the background.
+    std::shared_ptr<Return> return_;
+};
+
+}  // namespace ktr::linux_

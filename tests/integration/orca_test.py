@@ -1,0 +1,119 @@
+#!/usr/bin/python3
+"""What a screen reader really says of a live window: each announcement is spoken once. Speech goes through speech-dispatcher to
+a module that writes it down. Long, and skipped without Xvfb, a session bus, the reader and speech-dispatcher."""
+
+import json
+import os
+import pathlib
+import shutil
+import subprocess
+import sys
+import tempfile
+import time
+import unittest
+
+from serve import Service
+from virtual_display import VirtualDisplay
+
+PROGRAM = os.environ["KTR_PROGRAM"]
+
+SPEECH = """LogLevel 1
+LogDir "{folder}"
+CommunicationMethod "unix_socket"
+SocketPath "default"
+AudioOutputMethod "alsa"
+AudioALSADevice "default"
+AddModule "writes" "sd_generic" "writes.conf"
+DefaultModule writes
+"""
+# No module starts without a sound device.
+SOUND = "pcm.!default { type null }\nctl.!default { type null }\n"
+MODULE = """GenericExecuteSynth "printf '%s\\\\n' \\'$DATA\\' >> {folder}/said"
+GenericLanguage "en" "en" "utf-8"
+AddVoice "en" "MALE1" "en"
+DefaultVoice "en"
+"""
+
+
+class OrcaTest(unittest.TestCase):
+    def setUp(self):
+        folder = tempfile.TemporaryDirectory(ignore_cleanup_errors=True)
+        self.addCleanup(folder.cleanup)
+        self.folder = pathlib.Path(folder.name)
+        config = self.folder / "config" / "speech-dispatcher"
+        (config / "modules").mkdir(parents=True)
+        (config / "speechd.conf").write_text(SPEECH.format(folder=self.folder))
+        (self.folder / ".asoundrc").write_text(SOUND)
+        (config / "modules" / "writes.conf").write_text(MODULE.format(folder=self.folder))
+        self.environment = {**os.environ, "HOME": str(self.folder), "XDG_CONFIG_HOME": str(self.folder / "config"),
+                            "XDG_STATE_HOME": str(self.folder / "state"), "XDG_DATA_HOME": str(self.folder / "data"),
+                            "QT_LINUX_ACCESSIBILITY_ALWAYS_ON": "1", "QT_QPA_PLATFORM": "xcb", "LC_ALL": "C.UTF-8",
+                            "KTR_CONFIG": str(self.folder / "config.json")}
+
+    def start(self, *command):
+        process = subprocess.Popen([*map(str, command)], env=self.environment, stdout=subprocess.DEVNULL,
+                                   stderr=subprocess.DEVNULL)
+        self.addCleanup(process.wait)
+        self.addCleanup(process.kill)
+        return process
+
+    def said(self):
+        written = self.folder / "said"
+        return written.read_text() if written.exists() else ""
+
+    def wait_for(self, what, condition, seconds=60):
+        deadline = time.monotonic() + seconds
+        while time.monotonic() < deadline:
+            result = condition()
+            if result:
+                return result
+            time.sleep(0.2)
+        raise AssertionError(f"{what} did not come; said: {self.said()}")
+
+    def test_answer_and_another_place_are_spoken_once_each(self):
+        def point(at, label):
+            return {"at": at, "label": label, "latitude": 50.2114, "longitude": -3.115}
+
+        ann = {"fullName": "Ann Marsh", "firstName": "Ann", "emails": ["ann@harbour.example"], "repeats": False,
+               "track": [point(0, "Home"), point(40, "Ferry Pier")]}
+        (self.folder / "friends.json").write_text(json.dumps({"friends": [ann]}))
+        service = Service(PROGRAM, "--friends", self.folder / "friends.json", "--write-config",
+                          self.folder / "config.json", "--interval", "0.5")
+        self.addCleanup(service.__exit__)
+        speech = self.start("speech-dispatcher", "--run-single", "--timeout", "0", "-C",
+                            self.folder / "config" / "speech-dispatcher")
+        self.start("orca", "--replace", "--disable=braille", "--enable=speech")
+        self.wait_for("the reader's first words", self.said)
+        self.assertIsNone(speech.poll())
+        program = self.start(PROGRAM, "show", "--print-urls", "--language", "en-GB", "--ask", "where are my friends")
+        window = self.wait_for("the window", lambda: subprocess.run(
+            ["xdotool", "search", "--onlyvisible", "--pid", str(program.pid), "--name", "^ktr$"], env=self.environment,
+            capture_output=True, text=True, check=False).stdout.split()[:1])[0]
+        subprocess.run(["xdotool", "windowfocus", "--sync", window], env=self.environment, check=True)
+        self.wait_for("the answer", lambda: "People: 1" in self.said())
+        self.wait_for("the other place", lambda: "Ferry Pier" in self.said())
+        time.sleep(5)
+        self.assertEqual(self.said().count("notification Ann Marsh is here: Home"), 1, self.said())
+        self.assertEqual(self.said().count("People: 1"), 1, self.said())
+        self.assertEqual(self.said().count("Ferry Pier"), 1, self.said())
+
+
+def outside():
+    """Starts a display and a session bus, and this file again inside them."""
+    if os.environ.get("KTR_LONG_TESTS") != "1":
+        print("only with KTR_LONG_TESTS=1")
+        return 77
+    for needed in ("Xvfb", "xdotool", "dbus-run-session", "orca", "speech-dispatcher"):
+        if not shutil.which(needed):
+            print(needed, "is not installed")
+            return 77
+    with tempfile.TemporaryDirectory(ignore_cleanup_errors=True) as runtime, VirtualDisplay("900x900") as display:
+        environment = {**os.environ, "DISPLAY": display.name, "XDG_RUNTIME_DIR": runtime, "KTR_INSIDE": "yes"}
+        return subprocess.run(["dbus-run-session", "--", sys.executable, __file__, *sys.argv[1:]], env=environment,
+                              timeout=300, check=False).returncode
+
+
+if __name__ == "__main__":
+    if "KTR_INSIDE" not in os.environ:
+        sys.exit(outside())
+    unittest.main()

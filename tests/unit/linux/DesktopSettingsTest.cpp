@@ -1,0 +1,180 @@
+#include "linux/device/DesktopSettings.h"
+
+#include <sys/socket.h>
+#include <sys/un.h>
+#include <unistd.h>
+
+#include <QDBusVariant>
+#include <chrono>
+#include <fstream>
+#include <map>
+#include <memory>
+
+#include "tests/support/TemporaryFolder.h"
+#include "tests/support/qt/PrivateBus.h"
+
+namespace ktr::test {
+
+using linux_::DesktopSettings;
+
+class DesktopSettingsTest : public ::testing::Test {
+  protected:
+    DesktopSettingsTest() : service(bus.connect(QStringLiteral("portal"))) {}
+    ~DesktopSettingsTest() override { PrivateBus::disconnect(QStringLiteral("portal")); }
+
+    void startPortal() {
+        fake = std::make_unique<FakeService>([this](const QDBusMessage& message, const QDBusConnection& connection) {
+            const auto arguments = message.arguments();
+            if (message.member() != QLatin1String("Read") || arguments.size() != 2) {
+                return false;
+            }
+            asked.push_back(arguments[0].toString() + u' ' + arguments[1].toString());
+            const auto found = settings.find(asked.back());
+            if (found == settings.end()) {
+                return connection.send(message.createErrorReply(QStringLiteral("org.freedesktop.portal.Error.NotFound"),
+                                                                QStringLiteral("not found")));
+            }
+            // As the portal has always answered: a variant in a variant.
+            const QDBusVariant inner(found->second);
+            return connection.send(message.createReply(QVariant::fromValue(QDBusVariant(QVariant::fromValue(inner)))));
+        });
+        ASSERT_TRUE(service.registerVirtualObject(QStringLiteral("/org/freedesktop/portal/desktop"), fake.get()));
+        ASSERT_TRUE(service.registerService(QStringLiteral("org.freedesktop.portal.Desktop")));
+    }
+    void change(const char* group, const char* key, const QVariant& value) {
+        QDBusMessage signal = QDBusMessage::createSignal(QStringLiteral("/org/freedesktop/portal/desktop"),
+                                                         QStringLiteral("org.freedesktop.portal.Settings"),
+                                                         QStringLiteral("SettingChanged"));
+        signal << QString::fromLatin1(group) << QString::fromLatin1(key) << QVariant::fromValue(QDBusVariant(value));
+        ASSERT_TRUE(service.send(signal));
+    }
+    std::unique_ptr<DesktopSettings> start(const char* desktop) {
+        places.desktop = QString::fromLatin1(desktop);
+        places.configuration = folder.path();
+        places.gsettings = QString::fromStdString((folder.path() / "gsettings").string());
+        auto made = std::make_unique<DesktopSettings>(places);
+        made->setChanged([this] { ++changes; });
+        return made;
+    }
+    /// A program in gsettings' place that prints this.
+    void writeGsettings(const std::string& line) {
+        const auto file = folder.path() / "gsettings";
+        std::ofstream(file) << "#!/bin/sh\n[ \"$*\" = 'get org.gnome.desktop.interface text-scaling-factor' ] && echo '"
+                            << line << "'\n";
+        std::filesystem::permissions(file, std::filesystem::perms::owner_all);
+    }
+    static void pass(int milliseconds) {
+        const QDeadlineTimer deadline(milliseconds);
+        while (!deadline.hasExpired()) {
+            QCoreApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents, 20);
+        }
+    }
+
+    const QString kScale = QStringLiteral("org.gnome.desktop.interface text-scaling-factor");
+    const QString kContrast = QStringLiteral("org.freedesktop.appearance contrast");
+    const QString kMotion = QStringLiteral("org.freedesktop.appearance reduced-motion");
+    PrivateBus bus;
+    QDBusConnection service;
+    std::unique_ptr<FakeService> fake;
+    std::map<QString, QVariant> settings;
+    std::vector<QString> asked;
+    TemporaryFolder folder;
+    DesktopSettings::Places places{{}, {}, bus.address(), {}};
+    int changes = 0;
+};
+
+TEST_F(DesktopSettingsTest, Portal_IsReadOnGnomeAndPhoshAndAgainWhenTheWindowIsUsed) {
+    settings = {{kScale, 1.5}, {kContrast, 1u}, {kMotion, 1u}};
+    startPortal();
+    for (const char* desktop : {"ubuntu:GNOME", "Phosh:GNOME", "phosh"}) {
+        const auto read = start(desktop);
+        EXPECT_FALSE(read->values().textScale) << "it does not wait for the bus";
+        EXPECT_TRUE(eventually([&] { return read->values() == DesktopSettings::Values{1.5, true, true}; })) << desktop;
+        settings = {{kScale, 2.0}, {kContrast, 0u}, {kMotion, 0u}};
+        read->refresh();
+        EXPECT_TRUE(eventually([&] {
+            return read->values() == DesktopSettings::Values{2.0, false, false};
+        })) << desktop;
+        settings = {{kScale, 1.5}, {kContrast, 1u}, {kMotion, 1u}};
+    }
+    EXPECT_GT(changes, 0);
+}
+
+TEST_F(DesktopSettingsTest, GnomesTextSize_CountsOnNoOtherDesktop) {
+    settings = {{kScale, 1.5}, {kContrast, 1u}};
+    startPortal();
+    for (const char* desktop : {"KDE", "sway", ""}) {
+        const auto read = start(desktop);
+        EXPECT_TRUE(eventually([&] { return read->values().highContrast == true; })) << desktop;
+        change("org.gnome.desktop.interface", "text-scaling-factor", 2.0);
+        change("org.freedesktop.appearance", "contrast", 0u);
+        EXPECT_TRUE(eventually([&] { return read->values().highContrast == false; })) << desktop;
+        EXPECT_FALSE(read->values().textScale) << desktop;
+    }
+    EXPECT_EQ(std::count(asked.begin(), asked.end(), kScale), 0);
+}
+
+TEST_F(DesktopSettingsTest, PortalWithoutTheKeys_LeavesDefaults) {
+    startPortal();
+    const auto read = start("GNOME");
+    EXPECT_TRUE(eventually([&] { return asked.size() == 3; }));
+    pass(100);
+    EXPECT_EQ(read->values(), DesktopSettings::Values{});
+    EXPECT_EQ(changes, 0);
+}
+
+TEST_F(DesktopSettingsTest, NoPortal_AsksGsettingsAndAgainWhenTheWindowIsUsed) {
+    writeGsettings("1.25");
+    const auto read = start("GNOME");
+    EXPECT_TRUE(eventually([&] { return read->values().textScale == 1.25; }));
+    writeGsettings("1.75");
+    read->refresh();
+    EXPECT_TRUE(eventually([&] { return read->values().textScale == 1.75; }));
+}
+
+TEST_F(DesktopSettingsTest, Nonsense_IsNone) {
+    settings = {{kScale, QStringLiteral("large")}, {kContrast, QStringLiteral("yes")}, {kMotion, 7u}};
+    startPortal();
+    const auto read = start("GNOME");
+    EXPECT_TRUE(eventually([&] { return read->values().reducedMotion.has_value(); }));
+    EXPECT_EQ(read->values(), (DesktopSettings::Values{std::nullopt, std::nullopt, false}));
+    for (const double scale : {0.0, -1.0, 1e9}) {
+        change("org.gnome.desktop.interface", "text-scaling-factor", scale);
+    }
+    change("org.freedesktop.appearance", "contrast", 1u);
+    EXPECT_TRUE(eventually([&] { return read->values().highContrast == true; }));
+    EXPECT_FALSE(read->values().textScale);
+}
+
+TEST_F(DesktopSettingsTest, KdesFont_IsReadAndFollowed) {
+    const auto write = [&](const char* points) {
+        const auto file = folder.path() / "new";
+        std::ofstream(file) << "[General]\nfont=Noto Sans," << points << ",-1,5\n";
+        std::filesystem::rename(file, folder.path() / "kdeglobals");
+    };
+    write("13");
+    const auto read = start("KDE");
+    EXPECT_TRUE(eventually([&] { return read->values().textScale == 1.3; }));
+    write("20");
+    EXPECT_TRUE(eventually([&] { return read->values().textScale == 2.0; }));
+    write("10");
+    EXPECT_TRUE(eventually([&] { return read->values().textScale == 1.0; }));
+}
+
+TEST_F(DesktopSettingsTest, BusThatNeverAnswers_DelaysNobody) {
+    const auto path = folder.path() / "silent";
+    const int silent = ::socket(AF_UNIX, SOCK_STREAM, 0);
+    sockaddr_un address{};
+    address.sun_family = AF_UNIX;
+    path.string().copy(address.sun_path, sizeof(address.sun_path) - 1);
+    ASSERT_EQ(::bind(silent, reinterpret_cast<const sockaddr*>(&address), sizeof(address)), 0);
+    ASSERT_EQ(::listen(silent, 1), 0);
+    places.busAddress = QStringLiteral("unix:path=") + QString::fromStdString(path.string());
+    const auto begin = std::chrono::steady_clock::now();
+    start("GNOME").reset();
+    EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::seconds(1));
+    // Lets the one who waits go.
+    ::close(silent);
+}
+
+}  // namespace ktr::test
