@@ -30,7 +30,7 @@ const char* const kFooter = R"(Exit status:
   4  an answer cannot be drawn: its kind, the text size, or a picture too large
   5  the plugin cannot be loaded
 
-host::Environment:
+Environment:
   KTR_PLUGIN       the plugin's library, when --plugin is not given
   KTR_LOG          debug, info, default, error (as it comes) or off: which log lines are written
   KTR_FONTS        pinned: only the Noto fonts, from their packaged files, for pictures that are compared

@@ -58,15 +58,25 @@ std::string configuration(const serve::ServeOptions& options, const serve::Devel
                                           {"positions", positions}});
 }
 
+/// Why the configuration cannot name what an option gave; empty when it can, or when nothing was given.
+std::string complaintAbout(const char* option, const std::string& given, bool folderToo) {
+    std::error_code failed;
+    const fs::file_status found = fs::status(given, failed);
+    if (given.empty() || fs::is_regular_file(found) || (folderToo && fs::is_directory(found))) {
+        return "";
+    }
+    const char* what = !fs::exists(found) ? " is not there"
+                       : folderToo        ? " is neither a file nor a folder"
+                                          : " is not a file";
+    return std::string(option) + ": " + documents::inQuotes(given) + what;
+}
+
 /// The contacts that the configuration names; writes them where none are given. Empty, and the reason in `failure`,
 /// when that fails.
 std::string contactsFor(const serve::ServeOptions& options, const fs::path& folder, const serve::FriendsFile& friends,
                         std::string& failure) {
     if (!options.contacts.empty()) {
-        std::error_code failed;
-        if (!fs::exists(options.contacts, failed)) {
-            failure = "--contacts: " + documents::inQuotes(options.contacts) + " is not there";
-        }
+        failure = complaintAbout("--contacts", options.contacts, true);
         return fs::absolute(options.contacts).lexically_normal().string();
     }
     const fs::path file = fs::absolute(folder / "contacts.vcf").lexically_normal();
@@ -159,7 +169,10 @@ host::ExitCode ServeCommand::run(const serve::ServeOptions& options) {
     }
     auto& setup = std::get<serve::DevelopmentServer::Setup>(read);
     const std::string userName = setup.friends.user.handle();
-    std::string failure;
+    std::string failure = complaintAbout("--positions", options.positions, false);
+    if (!failure.empty()) {
+        return complain(failure);
+    }
     const std::string contacts = contactsFor(options, folder, setup.friends, failure);
     if (!failure.empty()) {
         return complain(failure);

@@ -7,10 +7,18 @@
 #include <cstdio>
 
 #include "documents/FileSteps.h"
+#include "documents/StagedFiles.h"
 
 namespace ktr::documents {
 
 std::string AtomicFile::write(const std::filesystem::path& file, std::string_view bytes, mode_t mode) {
+    // Only a link itself is replaced, wherever it leads.
+    std::error_code unknown;
+    if (!std::filesystem::is_symlink(file, unknown)) {
+        if (auto problem = StagedFiles::refusal(file); !problem.empty()) {
+            return problem;
+        }
+    }
     std::filesystem::path fresh = file;
     fresh += ".new";
     // What a process that was killed left there is not ours to continue: begin anew.

@@ -13,8 +13,10 @@ import pathlib
 import signal
 import socket
 import ssl
+import stat
 import subprocess
 import sys
+import tempfile
 import time
 import unittest
 
@@ -247,6 +249,23 @@ class StartTest(unittest.TestCase):
 
     def test_contacts_are_there(self):
         self.assertIn("/not/there.vcf", self.refused("--contacts", "/not/there.vcf"))
+
+    def test_what_the_configuration_names_can_be_read(self):
+        self.assertIn("/not/there.gpx", self.refused("--positions", "/not/there.gpx"))
+        with tempfile.TemporaryDirectory() as folder:
+            pipe = os.path.join(folder, "pipe")
+            os.mkfifo(pipe)
+            self.assertIn("pipe", self.refused("--contacts", pipe))
+            self.assertIn("pipe", self.refused("--positions", pipe))
+            self.assertIn("not a file", self.refused("--positions", folder))
+
+    def test_a_configuration_never_replaces_a_pipe(self):
+        with tempfile.TemporaryDirectory() as folder:
+            pipe = os.path.join(folder, "pipe")
+            os.mkfifo(pipe)
+            self.assertIn("this is a pipe", self.refused("--write-config", pipe))
+            self.assertTrue(stat.S_ISFIFO(os.stat(pipe).st_mode))
+            self.assertEqual(os.listdir(folder), ["pipe"])
 
 
 class SharingTest(unittest.TestCase):

@@ -95,6 +95,7 @@ TEST(KTRCommandLineTest, Help_HasExamplesAndTheExitStatus) {
     const auto all = ending({"--help"});
     EXPECT_EQ(all.code, host::ExitCode::Ok);
     EXPECT_NE(all.text.find("Exit status:"), std::string::npos);
+    EXPECT_NE(all.text.find("\nEnvironment:\n"), std::string::npos) << all.text;
     for (const char* command : {"show", "render", "describe"}) {
         const auto help = ending({command, "--help"});
         EXPECT_EQ(help.code, host::ExitCode::Ok);
