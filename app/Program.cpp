@@ -1,7 +1,5 @@
 #include "app/Program.h"
 
-#include <sys/resource.h>
-
 #include <QApplication>
 #include <QDateTime>
 #include <algorithm>
@@ -159,19 +157,13 @@ std::optional<host::Failure> loadFonts() {
 }
 
 /// Libraries end the process with a signal when they get no descriptors: say it before they do.
-std::optional<host::Failure> wantDescriptors() {
-    constexpr rlim_t kFewest = 32;
-    rlimit limit{};
-    if (::getrlimit(RLIMIT_NOFILE, &limit) != 0 || limit.rlim_cur >= kFewest) {
+std::optional<host::Failure> wantDescriptors(int wanted) {
+    if (linux_::Descriptors::areEnough(wanted)) {
         return std::nullopt;
     }
-    limit.rlim_cur = std::min(limit.rlim_max, kFewest);
-    if (limit.rlim_cur >= kFewest && ::setrlimit(RLIMIT_NOFILE, &limit) == 0) {
-        return std::nullopt;
-    }
-    return host::Failure{host::ExitCode::Failure, "at most " + std::to_string(limit.rlim_cur) +
-                                                      " files may be open here, and " + std::to_string(kFewest) +
-                                                      " are needed; raise the limit with: ulimit -n 1024"};
+    return host::Failure{host::ExitCode::Failure,
+                         "too few files may be open at a time: " + std::to_string(wanted) +
+                             " more than now are needed; raise the limit with: ulimit -n 1024"};
 }
 
 /// A language that somebody asked for is not passed over in silence.
@@ -183,11 +175,6 @@ void tellOfLanguage(const std::string& language) {
 }
 
 host::ExitCode run(const Options& options, int argc, char** argv) {
-    if ((options.live || options.command == Options::Command::Show) && !linux_::Descriptors::areEnough()) {
-        return fail({host::ExitCode::Failure, "too few files may be open at a time: at least " +
-                                                  std::to_string(linux_::Descriptors::kNeeded) +
-                                                  " more are needed (`ulimit -n`)"});
-    }
     const documents::IsoTime now = sessionNow();
     const auto read = readScenarios(options, options.at ? options.at->date : now.date);
     if (const auto* failure = std::get_if<host::Failure>(&read)) {
@@ -198,7 +185,9 @@ host::ExitCode run(const Options& options, int argc, char** argv) {
     auto decided = host::HostSettings::decide(options, scenarios, now,
                                               options.live ? configurationOf(configuration) : linux_::Configuration());
     if (const auto* failure = std::get_if<host::Failure>(&decided)) {
-        return fail(*failure);
+        // Of what a host can be asked for wrongly, the command line has this one.
+        const bool isUsage = failure->code == host::ExitCode::Usage;
+        return isUsage ? fail({failure->code, "--at: " + failure->line}) : fail(*failure);
     }
     auto& settings = std::get<host::HostSettings>(decided);
     tellOfLanguage(settings.language);
@@ -240,7 +229,9 @@ host::ExitCode runProgram(int argc, char** argv) {
         return ending->code;
     }
     const auto& options = std::get<Options>(parsed);
-    if (const auto failure = wantDescriptors()) {
+    const bool isLive = options.live || options.command == Options::Command::Show;
+    using linux_::Descriptors;
+    if (const auto failure = wantDescriptors(isLive ? Descriptors::kForLive : Descriptors::kForOthers)) {
         return fail(*failure);
     }
     return options.command == Options::Command::Serve ? ServeCommand::run(options.serve) : run(options, argc, argv);

@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include "app/window/StatusWords.h"
 #include "linux/paint/FontChoice.h"
 #include "platform/base/Platform.h"
 #include "platform/ui/Device.h"
@@ -52,7 +53,7 @@ QPainterPath hiddenPath() {
 }  // namespace
 
 StatusLine::StatusLine(QWidget* parent)
-    : QWidget(parent), words_(new QLabel(this)), palette_(&linux_::Palette::of(linux_::ColorScheme::Light)) {
+    : QWidget(parent), words_(new StatusWords(this)), palette_(&linux_::Palette::of(linux_::ColorScheme::Light)) {
     words_->setTextFormat(Qt::PlainText);
     refreshFont();
 }

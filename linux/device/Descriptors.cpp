@@ -9,7 +9,7 @@
 
 namespace ktr::linux_ {
 
-bool Descriptors::areEnough() {
+bool Descriptors::areEnough(int wanted) {
     rlimit limit{};
     // Beyond a usual limit there is nothing to gain, and a huge one costs programs that walk through it.
     constexpr rlim_t kUsual = 1024;
@@ -18,7 +18,7 @@ bool Descriptors::areEnough() {
         ::setrlimit(RLIMIT_NOFILE, &limit);
     }
     std::vector<int> opened;
-    while (opened.size() < static_cast<std::size_t>(kNeeded)) {
+    while (opened.size() < static_cast<std::size_t>(wanted)) {
         const int descriptor = ::open("/dev/null", O_RDONLY | O_CLOEXEC);
         if (descriptor < 0) {
             break;
@@ -28,7 +28,7 @@ bool Descriptors::areEnough() {
     for (const int descriptor : opened) {
         ::close(descriptor);
     }
-    return opened.size() == static_cast<std::size_t>(kNeeded);
+    return opened.size() == static_cast<std::size_t>(wanted);
 }
 
 }  // namespace ktr::linux_

@@ -166,6 +166,7 @@ TEST_F(VAKTRVisibilityControllerTest, RowHasNoViewDelegate_IsKept) {
 
 TEST_F(VAKTRVisibilityControllerTest, SharingIsSaidWithoutSeeing) {
     localization->set("org.ktr.snippets", "ACCESSIBILITY_SHARED_LOCATION", "Friends see you");
+    localization->set("org.ktr.snippets", "ACCESSIBILITY_ROW_PARTS", "%1$@; %2$@");
     const auto spoken = [](Controller& controller) {
         const auto tree = accessibilityTree(controller.view(), false);
         return tree.children.empty() ? "nothing" : tree.children.front().text;
@@ -173,11 +174,11 @@ TEST_F(VAKTRVisibilityControllerTest, SharingIsSaidWithoutSeeing) {
     const auto visible = shown(true);
     visible->view()->setFrame({0.0, 0.0, kWidth, 300.0});
     visible->view()->layoutIfNeeded();
-    EXPECT_EQ(spoken(*visible), "Friends see you");
+    EXPECT_EQ(spoken(*visible), "ann@example.org; Friends see you; Locating");
     const auto hidden = shown(false);
     hidden->view()->setFrame({0.0, 0.0, kWidth, 80.0});
     hidden->view()->layoutIfNeeded();
-    EXPECT_EQ(spoken(*hidden), "") << "the place text says it";
+    EXPECT_EQ(spoken(*hidden), "ann@example.org; Hidden") << "the place text says it";
     EXPECT_EQ(hidden->friendView()->locationLabel()->accessibilityText(), "Hidden");
 }
 
