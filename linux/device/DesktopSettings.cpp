@@ -10,9 +10,9 @@
 #include <cmath>
 #include <mutex>
 #include <thread>
-#include <utility>
 
 #include "linux/device/KdeFonts.h"
+#include "platform/base/Log.h"
 
 namespace ktr::linux_ {
 
@@ -123,9 +123,16 @@ void DesktopSettings::joinBus() {
 
 void DesktopSettings::useBus(const QDBusConnection& bus) {
     bus_ = bus;
-    // From whomever: who owns the portal's name is learnt in the background, and what it says until then would be lost.
-    bus_->connect(QString(), kPath, kInterface, QStringLiteral("SettingChanged"), this,
-                  SLOT(settingChanged(QString, QString, QDBusVariant)));
+    // A slot can be found only when the types that it takes are known by their names, and this one is not before the
+    // first variant has come in: too late.
+    qRegisterMetaType<QDBusVariant>();
+    // Before anything is asked, so that no change falls between an answer and this. From whomever: who owns the
+    // portal's name is learnt in the background, and what it says until then would be lost.
+    if (!bus_->connect(QString(), kPath, kInterface, QStringLiteral("SettingChanged"), this,
+                       SLOT(settingChanged(QString, QString, QDBusVariant)))) {
+        platform::platformLog().write(platform::LogLevel::Error,
+                                      "the desktop's settings are not followed: no connection to SettingChanged");
+    }
     askAll();
 }
 
@@ -140,19 +147,26 @@ void DesktopSettings::askAll() {
 void DesktopSettings::ask(const QString& group, const QString& key) {
     QDBusMessage message = QDBusMessage::createMethodCall(kPortal, kPath, kInterface, QStringLiteral("Read"));
     message << group << key;
+    const unsigned heard = heard_[{group, key}];
     auto* watcher = new QDBusPendingCallWatcher(bus_->asyncCall(message), this);
-    connect(watcher, &QDBusPendingCallWatcher::finished, this, [this, group, key](QDBusPendingCallWatcher* finished) {
-        finished->deleteLater();
-        const QDBusPendingReply<QDBusVariant> reply = *finished;
-        if (reply.isValid()) {
-            take(group, key, reply.value().variant());
-        } else if (group == kGnome) {
-            askGsettings();
-        }
-    });
+    connect(watcher, &QDBusPendingCallWatcher::finished, this,
+            [this, group, key, heard](QDBusPendingCallWatcher* finished) {
+                finished->deleteLater();
+                const QDBusPendingReply<QDBusVariant> reply = *finished;
+                if (!reply.isValid()) {
+                    if (group == kGnome) {
+                        askGsettings();
+                    }
+                } else if (heard == heard_[{group, key}]) {
+                    take(group, key, reply.value().variant());
+                }
+            });
 }
 
 void DesktopSettings::settingChanged(const QString& group, const QString& key, const QDBusVariant& value) {
+    if (const auto asked = heard_.find({group, key}); asked != heard_.end()) {
+        ++asked->second;
+    }
     take(group, key, value.variant());
 }
 

@@ -7,8 +7,10 @@
 #include <QString>
 #include <filesystem>
 #include <functional>
+#include <map>
 #include <memory>
 #include <optional>
+#include <utility>
 
 namespace ktr::linux_ {
 
@@ -72,6 +74,8 @@ class DesktopSettings : public QObject {
     std::optional<QDBusConnection> bus_;
     QFileSystemWatcher files_;
     bool portalKnowsTextScale_ = false;
+    /// Changes that were told, by group and key of what is asked for: an answer that one of them overtook is older.
+    std::map<std::pair<QString, QString>, unsigned> heard_;
     /// The way back for work in the background.
     std::shared_ptr<Return> return_;
 };

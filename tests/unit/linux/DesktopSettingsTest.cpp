@@ -7,6 +7,7 @@
 #include <QDBusVariant>
 #include <chrono>
 #include <fstream>
+#include <functional>
 #include <map>
 #include <memory>
 
@@ -34,9 +35,18 @@ class DesktopSettingsTest : public ::testing::Test {
                 return connection.send(message.createErrorReply(QStringLiteral("org.freedesktop.portal.Error.NotFound"),
                                                                 QStringLiteral("not found")));
             }
+            const QVariant answer = found->second;
+            if (beforeAnswer) {
+                beforeAnswer(asked.back());
+            }
             // As the portal has always answered: a variant in a variant.
-            const QDBusVariant inner(found->second);
-            return connection.send(message.createReply(QVariant::fromValue(QDBusVariant(QVariant::fromValue(inner)))));
+            const QDBusVariant inner(answer);
+            const bool sent =
+                connection.send(message.createReply(QVariant::fromValue(QDBusVariant(QVariant::fromValue(inner)))));
+            if (afterAnswer) {
+                afterAnswer(asked.back());
+            }
+            return sent;
         });
         ASSERT_TRUE(service.registerVirtualObject(QStringLiteral("/org/freedesktop/portal/desktop"), fake.get()));
         ASSERT_TRUE(service.registerService(QStringLiteral("org.freedesktop.portal.Desktop")));
@@ -47,6 +57,11 @@ class DesktopSettingsTest : public ::testing::Test {
                                                          QStringLiteral("SettingChanged"));
         signal << QString::fromLatin1(group) << QString::fromLatin1(key) << QVariant::fromValue(QDBusVariant(value));
         ASSERT_TRUE(service.send(signal));
+    }
+    /// Says that what was asked for has become less.
+    void lower(const QString& what) {
+        change(qPrintable(what.section(u' ', 0, 0)), qPrintable(what.section(u' ', 1)),
+               what == kScale ? QVariant(1.25) : QVariant(0u));
     }
     std::unique_ptr<DesktopSettings> start(const char* desktop) {
         places.desktop = QString::fromLatin1(desktop);
@@ -78,6 +93,9 @@ class DesktopSettingsTest : public ::testing::Test {
     std::unique_ptr<FakeService> fake;
     std::map<QString, QVariant> settings;
     std::vector<QString> asked;
+    /// Called with what was asked.
+    std::function<void(const QString&)> beforeAnswer;
+    std::function<void(const QString&)> afterAnswer;
     TemporaryFolder folder;
     DesktopSettings::Places places{{}, {}, bus.address(), {}};
     int changes = 0;
@@ -112,6 +130,25 @@ TEST_F(DesktopSettingsTest, GnomesTextSize_CountsOnNoOtherDesktop) {
         EXPECT_FALSE(read->values().textScale) << desktop;
     }
     EXPECT_EQ(std::count(asked.begin(), asked.end(), kScale), 0);
+}
+
+TEST_F(DesktopSettingsTest, ChangeRightBehindTheFirstAnswer_IsHeard) {
+    settings = {{kScale, 1.5}, {kContrast, 1u}, {kMotion, 1u}};
+    afterAnswer = [this](const QString& what) { lower(what); };
+    startPortal();
+    const auto read = start("GNOME");
+    EXPECT_TRUE(eventually([&] { return read->values() == DesktopSettings::Values{1.25, false, false}; }));
+    EXPECT_EQ(asked.size(), 3U) << "nothing was asked twice";
+}
+
+TEST_F(DesktopSettingsTest, AnswerThatAChangeOvertook_IsDropped) {
+    settings = {{kScale, 1.5}, {kContrast, 1u}, {kMotion, 1u}};
+    beforeAnswer = [this](const QString& what) { lower(what); };
+    startPortal();
+    const auto read = start("GNOME");
+    EXPECT_TRUE(eventually([&] { return asked.size() == 3; }));
+    pass(100);
+    EXPECT_EQ(read->values(), (DesktopSettings::Values{1.25, false, false}));
 }
 
 TEST_F(DesktopSettingsTest, PortalWithoutTheKeys_LeavesDefaults) {
