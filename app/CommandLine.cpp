@@ -47,7 +47,7 @@ const char* const kShowExamples = R"(Examples:
 
 Without a scenario the window is live: it asks the configured assistant what is typed, and the friends in its answers move.
 In the window: Tab and Shift+Tab walk the rows, Enter opens one, the arrow keys, Page Up, Page Down, Home and End scroll,
-Ctrl+Q closes.)";
+Ctrl+Plus and Ctrl+Minus make the text larger and smaller, Ctrl+0 makes it as it was, Ctrl+Q closes.)";
 
 const char* const kRenderExamples = R"(Examples:
   ktr render dinner.json -o dinner.png
