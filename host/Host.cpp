@@ -24,6 +24,7 @@ namespace {
 
 /// Deferred work that is due within this time belongs to the picture; later steps of a scenario do not. Seconds.
 constexpr double kIdleHorizon = 1.0;
+constexpr int kMostRounds = 3;
 
 }  // namespace
 
@@ -327,7 +328,11 @@ double Host::settle(double width) {
     layOut(width);
     if (environment_.virtualTime) {
         environment_.virtualTime->advance(settings_.runSeconds);
-        environment_.virtualTime->runUntilIdle(kIdleHorizon);
+        // What a layout leads to, such as a map's picture at its new size, is waited for too, and may lead to another.
+        for (int round = 0; round < kMostRounds; ++round) {
+            environment_.virtualTime->runUntilIdle(kIdleHorizon);
+            layOut(width);
+        }
     }
     return layOut(width);
 }
