@@ -6,7 +6,9 @@
 namespace ktr::linux_ {
 
 /// The thread on which this program speaks HTTPS: commands, questions and tiles share one. Whoever uses it is gone
-/// before it ends.
+/// before it ends. The QCoreApplication ends after it and before the process's statics do: a look-up of a name, once
+/// handed on, is past calling back, and the application's end waits for those that are left. One that begins later
+/// finds the library's statics gone, and ends the process with a signal.
 class NetworkThread {
   public:
     NetworkThread();

@@ -32,12 +32,10 @@ struct HoldingServer {
     TestServer server;
 };
 
-/// Certificates, and an application, for tests that are no fixtures of this suite.
+/// What tests need that are no fixtures of this suite.
 class ContractSetting : public TransportTest {
   public:
-    static void prepare() { SetUpTestSuite(); }
     static HttpTransportUnderTest make() {
-        prepare();
         const auto holding = std::make_shared<HoldingServer>(tls());
         linux_::QtHttpTransport::Settings settings;
         settings.serviceHost = holding->server.host();

@@ -20,16 +20,7 @@ namespace ktr::test {
 /// The real transport against servers of this process.
 class TransportTest : public PlatformTest {
   protected:
-    static void SetUpTestSuite() {
-        static int count = 1;
-        static char name[] = "transport";
-        static char* arguments[] = {name, nullptr};
-        static QCoreApplication application(count, arguments);
-        if (!certificates) {
-            certificates = std::make_unique<TestCertificates>();
-        }
-    }
-    static void TearDownTestSuite() { certificates.reset(); }
+    class Setting;
 
     /// Why an exchange failed is an error line; TroubleTest looks at them.
     void TearDown() override {
@@ -101,6 +92,7 @@ class TransportTest : public PlatformTest {
     }
     platform::HttpAnswer ask() { return ask(request()); }
 
+    /// As long as tests run.
     static inline std::unique_ptr<TestCertificates> certificates;
     linux_::QtHttpTransport::Settings settings;
     std::unique_ptr<TestServer> server;
