@@ -35,7 +35,7 @@ std::string RenderCommand::pieceName(const std::string& output, int number) {
 std::optional<host::Failure> RenderCommand::write(const std::string& output) const {
     const host::HostSettings& settings = host_.settings();
     const Palette& palette = Palette::of(settings.dark.value_or(false) ? ColorScheme::Dark : ColorScheme::Light,
-                                         settings.highContrast ? Contrast::High : Contrast::Normal);
+                                         settings.drawsHighContrast() ? Contrast::High : Contrast::Normal);
     host_.conversation()->setPalette(palette);
     const double height = host_.settle(settings.width);
     const bool splits = output.ends_with(".png") && height * settings.scale > kMostPixels;

@@ -22,10 +22,10 @@ struct HostSettings {
     std::optional<std::string> country;  ///< of the phone numbers
     platform::ContentSizeCategory textSize = platform::ContentSizeCategory::L;
     platform::UserInterfaceIdiom idiom = platform::UserInterfaceIdiom::Phone;
-    double scale = 1.0;        ///< pixels a point
-    double width = 400.0;      ///< points
-    std::optional<bool> dark;  ///< none: as the session has it
-    bool highContrast = false;
+    double scale = 1.0;                 ///< pixels a point
+    double width = 400.0;               ///< points
+    std::optional<bool> dark;           ///< none: as the session has it
+    bool highContrast = false;          ///< as options say
     platform::Date start;               ///< the conversation's first moment
     int offsetSeconds = 0;              ///< of the clock face that is shown, east of UTC
     double runSeconds = 0.0;            ///< from the start to the moment of the picture
@@ -50,6 +50,10 @@ struct HostSettings {
     std::optional<platform::ContentSizeCategory> configuredTextSize;
     /// The desktop's: 1 is its usual size. None where nobody was asked or said anything.
     std::optional<double> desktopTextScale;
+    bool desktopHighContrast = false;  ///< the desktop's wish
+
+    /// Where anybody wishes it.
+    bool drawsHighContrast() const { return highContrast || desktopHighContrast; }
 
     /// Decides again what a configuration has a word in: language, region, country, text size and contacts.
     void follow(const linux_::Configuration& configuration);

@@ -100,7 +100,7 @@ double ConversationWidget::seconds() const {
 void ConversationWidget::choosePalette() {
     const bool systemIsDark = QApplication::palette().color(QPalette::Window).lightness() < 128;
     const host::HostSettings& settings = host_.settings();
-    const bool highContrast = settings.highContrast || highContrast_;
+    const bool highContrast = settings.drawsHighContrast();
     palette_ = &Palette::of(settings.dark.value_or(systemIsDark) ? ColorScheme::Dark : ColorScheme::Light,
                             highContrast ? Contrast::High : Contrast::Normal);
     host_.conversation()->setPalette(*palette_);
@@ -310,8 +310,8 @@ void ConversationWidget::answerCame(host::TurnView& turn) {
 }
 
 void ConversationWidget::setHighContrast(bool high) {
-    if (high != highContrast_) {
-        highContrast_ = high;
+    if (high != host_.settings().desktopHighContrast) {
+        host_.setDesktopHighContrast(high);
         choosePalette();
     }
 }

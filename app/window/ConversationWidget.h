@@ -42,7 +42,7 @@ class ConversationWidget : public QWidget {
     void turnCame(host::TurnView& turn);
     void answerCame(host::TurnView& turn);
     void setReducedMotion(bool reduced);
-    /// Besides the settings' own wish.
+    /// The desktop's wish, besides that of the options; the host has it too, for its stills.
     void setHighContrast(bool high);
     const linux_::Palette& colors() const { return *palette_; }
     /// Called after the colours have become others.
@@ -117,7 +117,6 @@ class ConversationWidget : public QWidget {
     std::function<void()> paletteChanged_;
     std::unique_ptr<Voice> voice_;
     bool reducedMotion_ = false;
-    bool highContrast_ = false;
     QScrollBar* bar_;
     RingTurner rings_;
     QTimer flingTimer_;

@@ -192,9 +192,15 @@ TEST_F(KTRPaintedContrastTest, WishForContrast_IsHonouredWhileTheWindowIsOpen) {
     EXPECT_EQ(widget->colors().contrast, Contrast::Normal);
     widget->setHighContrast(true);
     EXPECT_EQ(widget->colors().contrast, Contrast::High);
+    EXPECT_TRUE(host->settings().drawsHighContrast()) << "what stays of cards is drawn so too";
     EXPECT_EQ(widget->grab().toImage().pixelColor(2, 2), QColor(255, 255, 255));
     widget->setHighContrast(false);
     EXPECT_EQ(widget->colors().contrast, Contrast::Normal);
+    // Who asked for it on the command line has it, whatever the desktop says.
+    open("dinner", false, true);
+    widget->setHighContrast(true);
+    widget->setHighContrast(false);
+    EXPECT_EQ(widget->colors().contrast, Contrast::High);
 }
 
 }  // namespace ktr::app

@@ -2,6 +2,8 @@
 #include <gtest/gtest.h>
 
 #include <QEventLoop>
+#include <QImage>
+#include <QPainter>
 #include <QTemporaryDir>
 #include <QTimer>
 #include <algorithm>
@@ -11,6 +13,7 @@
 #include "host/Host.h"
 #include "host/scenario/ScenarioReader.h"
 #include "linux/configuration/ConfigurationReader.h"
+#include "linux/paint/QtCanvas.h"
 #include "tests/support/EnvironmentVariable.h"
 #include "tests/support/ServiceDoubles.h"
 
@@ -160,6 +163,30 @@ TEST_F(LiveHostTest, Still_KeepsPictureWordsAndAWayToOnesOwnPage) {
     ASSERT_EQ(opened.size(), 2U) << "the row and the map";
     EXPECT_EQ(opened[0], opened[1]);
     EXPECT_EQ(opened[0].rfind("wayloc://friend/", 0), 0U) << opened[0];
+}
+
+TEST_F(LiveHostTest, Still_HasTheContrastThatTheDesktopWishes) {
+    const auto look = [&](bool high) {
+        host->setDesktopHighContrast(high);
+        const auto turn = add(kSharing);
+        host->endSharing();
+        host->layOut(400.0);
+        const auto still = turn->card()->still();
+        QImage picture(400, 200, QImage::Format_RGB32);
+        picture.fill(Qt::white);
+        if (still == nullptr) {
+            ADD_FAILURE() << "no still";
+            return picture;
+        }
+        QPainter painter(&picture);
+        // In the same colours each time: only what the still brings differs.
+        linux_::QtCanvas canvas(painter, linux_::Palette::of(linux_::ColorScheme::Light));
+        still->paint(canvas, {0.0, 0.0, 400.0, 200.0});
+        return picture;
+    };
+    const QImage usual = look(false);
+    EXPECT_NE(look(true), usual);
+    EXPECT_EQ(look(false), usual);
 }
 
 TEST_F(LiveHostTest, Still_GivesWayInANarrowConversation) {
