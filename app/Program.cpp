@@ -225,7 +225,11 @@ host::ExitCode run(const Options& options, int argc, char** argv) {
 host::ExitCode runProgram(int argc, char** argv) {
     const auto parsed = CommandLine::parse(std::vector<std::string>(argv + (argc > 0 ? 1 : 0), argv + argc));
     if (const auto* ending = std::get_if<CommandLine::Ending>(&parsed)) {
-        std::fputs(ending->text.c_str(), ending->code == host::ExitCode::Ok ? stdout : stderr);
+        const bool isAnswer = ending->code == host::ExitCode::Ok;
+        std::FILE* const stream = isAnswer ? stdout : stderr;
+        if ((std::fputs(ending->text.c_str(), stream) == EOF || std::fflush(stream) != 0) && isAnswer) {
+            return fail({host::ExitCode::Failure, "the answer cannot be written"});
+        }
         return ending->code;
     }
     const auto& options = std::get<Options>(parsed);

@@ -6,7 +6,7 @@
 #include <algorithm>
 
 #include "host/conversation/WideColumns.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::app {
 
@@ -193,8 +193,9 @@ void ConversationWindow::decideTextSize() {
         return;
     }
     if (const auto failure = host_.remake(settings)) {
-        platform::platformLog().write(platform::LogLevel::Error, "the text size stays as it is: %@",
-                                      platform::FormatArgument(failure->line).shown());
+        platform::areaLog(platform::LogArea::Host)
+            .write(platform::LogLevel::Error, "the text size stays as it is: %@",
+                   platform::FormatArgument(failure->line).shown());
     }
 }
 

@@ -29,7 +29,9 @@ bool MbtilesPictures::open() {
         file_.reset();
     }
     if (!error.empty() && error != reported_) {
-        platform::areaLog(platform::LogArea::Maps).line("The map %@ cannot be read: %@", path_, error);
+        platform::areaLog(platform::LogArea::Maps)
+            .write(platform::LogLevel::Error, "The map %@ cannot be read: %@", platform::FormatArgument(path_).shown(),
+                   platform::FormatArgument(error).shown());
     }
     reported_ = error;
     return file_ != nullptr;
@@ -38,6 +40,8 @@ bool MbtilesPictures::open() {
 bool MbtilesPictures::read(std::string& error) {
     file_ = MbtilesLoader::open(path_, error);
     if (!file_) {
+        // Why is said once, by the ground that looks for vector tiles in the same file.
+        error.clear();
         return false;
     }
     facts_ = tiles::TilesetFacts::of(file_->metadata());

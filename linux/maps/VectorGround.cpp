@@ -60,7 +60,9 @@ bool VectorGround::open() {
         }
     }
     if (!error.empty() && error != reported_) {
-        platform::areaLog(platform::LogArea::Maps).line("The map %@ cannot be read: %@", path_, error);
+        platform::areaLog(platform::LogArea::Maps)
+            .write(platform::LogLevel::Error, "The map %@ cannot be read: %@", platform::FormatArgument(path_).shown(),
+                   platform::FormatArgument(error).shown());
     }
     reported_ = error;
     return file_ != nullptr;

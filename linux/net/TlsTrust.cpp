@@ -7,7 +7,7 @@
 
 #include "documents/FileReader.h"
 #include "documents/FileTrust.h"
-#include "platform/base/Log.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -85,9 +85,9 @@ QSslConfiguration TlsTrust::configuration(const std::vector<std::string>& certif
         if (certificates.isEmpty()) {
             const std::string reason =
                 text != nullptr ? "it holds none in PEM" : std::get<documents::FileReader::Error>(read).reason;
-            platform::platformLog().write(platform::LogLevel::Error, "certificates: %@: %@",
-                                          platform::FormatArgument(file).shown(),
-                                          platform::FormatArgument(reason).shown());
+            platform::areaLog(platform::LogArea::Net)
+                .write(platform::LogLevel::Error, "certificates: %@: %@", platform::FormatArgument(file).shown(),
+                       platform::FormatArgument(reason).shown());
         }
         tls.addCaCertificates(certificates);
     }

@@ -243,6 +243,14 @@ class ProgramTest(unittest.TestCase):
         self.assert_refused_word("rendr", 'did you mean "render"?')
         self.assert_refused_word("frobnicate", "there is no command")
 
+    def test_help_that_cannot_be_written_is_a_failure(self):
+        for arguments in (["--help"], ["--version"], ["render", "--help"]):
+            with open("/dev/full", "w", encoding="utf-8") as full:
+                ended = subprocess.run([PROGRAM, *arguments], stdout=full, stderr=subprocess.PIPE, text=True, timeout=60,
+                                       check=False)
+            self.assertEqual(ended.returncode, 1, arguments)
+            self.assertEqual(ended.stderr, "ktr: the answer cannot be written\n")
+
     def assert_refused_word(self, word, expected):
         result = run(word)
         self.assertEqual(result.returncode, 2)

@@ -34,6 +34,9 @@ TEST_F(TlsTest, AuthorityThatCannotBeReadIsAnErrorLine) {
     expectErrorLine(kLine);
     EXPECT_EQ(ask().failure, HttpFailure::Tls);
     EXPECT_TRUE(log->has(platform::LogLevel::Error, kLine));
+    for (const auto& line : log->lines()) {
+        EXPECT_TRUE(line.text != kLine || line.category == "net") << line.category;
+    }
 }
 
 TEST_F(TlsTest, Tls12And13AreSpoken) {

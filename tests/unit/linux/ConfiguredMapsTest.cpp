@@ -6,6 +6,7 @@
 #include <QBuffer>
 #include <QFile>
 #include <QTemporaryDir>
+#include <algorithm>
 #include <fstream>
 #include <functional>
 
@@ -119,6 +120,9 @@ class ConfiguredMapsTest : public test::PlatformTest {
         return 0;
     }
 
+    /// An error line is due that says why the map is not read.
+    void expectUnreadable(const std::string& why) { expectErrorLine("The map " + path() + " cannot be read: " + why); }
+
     QTemporaryDir folder;
 };
 
@@ -132,8 +136,22 @@ TEST_F(ConfiguredMapsTest, NothingConfigured_IsTheBuiltInWorld) {
 TEST_F(ConfiguredMapsTest, AFileOfPicturesThatAreNotRead_IsSaid) {
     write("webp", "RIFF\x1a\0\0\0WEBPVP8L");
     EXPECT_EQ(drawFile().attribution, "Natural Earth");
-    EXPECT_TRUE(log->has(platform::LogLevel::Default,
-                         "The map " + path() + " cannot be read: its pictures are WebP; PNG and JPEG are read"));
+    const std::string line = "The map " + path() + " cannot be read: its pictures are WebP; PNG and JPEG are read";
+    EXPECT_TRUE(log->has(platform::LogLevel::Error, line));
+    expectErrorLine(line);
+}
+
+TEST_F(ConfiguredMapsTest, AFileThatCannotBeRead_IsOneErrorLineWithItsReason) {
+    std::ofstream(path()) << "no map";
+    EXPECT_EQ(drawFile().attribution, "Natural Earth");
+    const auto lines = log->lines();
+    EXPECT_EQ(std::count_if(lines.begin(), lines.end(),
+                            [&](const auto& line) { return line.text.find(path()) != std::string::npos; }),
+              1);
+    const auto errors = log->texts(platform::LogLevel::Error);
+    ASSERT_EQ(errors.size(), 1U);
+    EXPECT_EQ(errors[0].find("The map " + path() + " cannot be read: "), 0U);
+    expectErrorLine(errors[0]);
 }
 
 TEST_F(ConfiguredMapsTest, AFile_ComesBeforeTheWorld) {
@@ -171,6 +189,9 @@ TEST_F(ConfiguredMapsTest, CrowdedTiles_AreDrawnWithinBounds) {
 }
 
 TEST_F(ConfiguredMapsTest, FilesThatAreNone_LeaveTheBuiltInWorld) {
+    for (const char* why : {"No such file or directory", "not a file", "file is not a database"}) {
+        expectUnreadable(why);
+    }
     const auto world = draw({});
     EXPECT_EQ(drawFile().pixels, world.pixels);
     // A pipe that nobody writes to would be waited for.
@@ -185,6 +206,7 @@ TEST_F(ConfiguredMapsTest, FilesThatAreNone_LeaveTheBuiltInWorld) {
 }
 
 TEST_F(ConfiguredMapsTest, ALockedFile_LeavesTheBuiltInWorld) {
+    expectUnreadable("database is locked");
     write("png", pngOf(256));
     MbtilesWriter writer(path());
     writer.run("BEGIN EXCLUSIVE");

@@ -52,6 +52,8 @@ std::string lakeTile() {
 class VectorGroundTest : public test::PlatformTest {
   protected:
     std::string path() const { return folder.filePath(QStringLiteral("map.mbtiles")).toStdString(); }
+    /// An error line is due that says why the map is not read.
+    void expectUnreadable(const std::string& why) { expectErrorLine("The map " + path() + " cannot be read: " + why); }
     /// The tile fills 256 × 256 points.
     static platform::MapPictureRequest request(const tiles::TileKey& key = kMiddle, double scale = 1.0) {
         platform::MapPictureRequest made;
@@ -210,6 +212,8 @@ TEST_F(VectorGroundTest, OutsideItsBounds_OthersDraw) {
 }
 
 TEST_F(VectorGroundTest, NothingToRead_DrawsNothing) {
+    expectUnreadable("No such file or directory");
+    expectUnreadable("file is not a database");
     EXPECT_EQ(draw(request()).pixels.pixelColor(5, 5), QColor(Qt::magenta));
     EXPECT_EQ(draw(request()).attribution, "Plain");
     QFile file(QString::fromStdString(path()));
@@ -225,6 +229,7 @@ TEST_F(VectorGroundTest, Pictures_AreAnothersGround) {
 }
 
 TEST_F(VectorGroundTest, Level99_AndNonsenseInTheMetadata_AreSurvived) {
+    expectUnreadable("no tiles");
     for (const auto& [lowest, highest] : {std::pair("99", "99"), std::pair("-5", "x"), std::pair("14", "3")}) {
         QFile::remove(QString::fromStdString(path()));
         makeFile({{"format", "pbf"}, {"minzoom", lowest}, {"maxzoom", highest}, {"bounds", "nan,1e400,,"}},
@@ -238,6 +243,7 @@ TEST_F(VectorGroundTest, Level99_AndNonsenseInTheMetadata_AreSurvived) {
 }
 
 TEST_F(VectorGroundTest, NewFile_IsReadAgain) {
+    expectUnreadable("No such file or directory");
     EXPECT_EQ(draw(request()).pixels.pixelColor(64, 128), QColor(Qt::magenta));
     makeFile({{"format", "pbf"}}, {{kMiddle, lakeTile()}});
     EXPECT_EQ(draw(request()).pixels.pixelColor(64, 128), style.water);
