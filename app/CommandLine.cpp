@@ -143,7 +143,8 @@ struct Parser {
             ->type_name("POINTS")
             ->check(range(200.0, 8000.0));
         command.add_option("--language", words.language, "Language of the texts, such as en, de, ar")->type_name("TAG");
-        command.add_option("--text-size", words.textSize, "XS, S, M, L, XL, XXL or XXXL")->type_name("SIZE");
+        command.add_option("--text-size", words.textSize, "XS, S, M, L, XL, XXL, XXXL or AX1 to AX5")
+            ->type_name("SIZE");
         command.add_option("--idiom", words.idiom, "phone, tablet, desktop or display")->type_name("IDIOM");
         auto* dark = command.add_flag("--dark", words.dark, "Dark colours");
         command.add_flag("--light", words.light, "Light colours")->excludes(dark);
@@ -192,7 +193,7 @@ std::string readWords(const Words& words, Options& options) {
     if (!words.textSize.empty()) {
         options.textSize = linux_::LinuxDevice::categoryNamed(words.textSize);
         if (!options.textSize) {
-            return wrong("--text-size", "one of XS, S, M, L, XL, XXL, XXXL", words.textSize);
+            return wrong("--text-size", "one of XS, S, M, L, XL, XXL, XXXL, AX1, AX2, AX3, AX4, AX5", words.textSize);
         }
     }
     if (!words.idiom.empty()) {
