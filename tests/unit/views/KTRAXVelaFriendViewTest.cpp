@@ -144,7 +144,8 @@ TEST_F(KTRAXVelaFriendViewTest, Text_OfADefaultLabel_IsItsLocalizedText) {
 TEST_F(KTRAXVelaFriendViewTest, RightToLeft_AlignsRightInTheInterfacesDirection) {
     assistant->rightToLeft = true;
     const auto row = rowFor(ann());
-    for (const auto& run : row->attributedStringForView().runs()) {
+    const auto text = row->attributedStringForView();
+    for (const auto& run : text.runs()) {
         EXPECT_EQ(run.paragraph.alignment, TextAlignment::Right);
         EXPECT_EQ(run.paragraph.writingDirection, WritingDirection::RightToLeft);
     }
