@@ -1,28 +1,12 @@
 #include "linux/paint/PersonColors.h"
 
 #include <QChar>
-#include <array>
 
 #include "platform/base/Utf8.h"
 
 namespace ktr::linux_ {
 
 namespace {
-
-constexpr std::array<QRgb, PersonColors::kCount> kColors = {
-    0xffB15966,  // rosewood
-    0xffAF5D4D,  // brick
-    0xff9D692E,  // bronze
-    0xff7D762C,  // olive
-    0xff597E40,  // moss
-    0xff34825A,  // fern
-    0xff13817E,  // lagoon
-    0xff247CA3,  // ocean
-    0xff4A75B4,  // denim
-    0xff706BBA,  // iris
-    0xff9560A6,  // plum
-    0xffAD5786,  // mulberry
-};
 
 /// Digits of every script count as the digits they are: a number is one person's, however it is written.
 std::string reducedNumber(const std::string& number) {
@@ -43,21 +27,15 @@ std::string reducedNumber(const std::string& number) {
 }  // namespace
 
 std::uint32_t PersonColors::hash(std::string_view bytes) {
-    std::uint32_t h = 0x811c9dc5U;
-    for (const char byte : bytes) {
-        h ^= static_cast<unsigned char>(byte);
-        h *= 0x01000193U;
-    }
-    return h;
+    return platform::PersonColor::hash(bytes);
 }
 
 std::size_t PersonColors::number(std::string_view handle) {
-    const std::uint32_t h = hash(handle);
-    return (h ^ (h >> 16U)) % kCount;
+    return platform::PersonColor::number(handle);
 }
 
 QColor PersonColors::color(std::size_t number) {
-    return QColor::fromRgb(kColors[number % kCount]);
+    return QColor::fromRgb(platform::PersonColor::rgb(number));
 }
 
 QColor PersonColors::stone() {

@@ -7,13 +7,14 @@
 #include <string_view>
 
 #include "platform/contacts/Contact.h"
+#include "platform/contacts/PersonColor.h"
 
 namespace ktr::linux_ {
 
 /// The colour that stands for a person, the same on every device without being stored anywhere. Any thread.
 class PersonColors {
   public:
-    static constexpr std::size_t kCount = 12;
+    static constexpr std::size_t kCount = platform::PersonColor::kCount;
 
     /// 32-bit FNV-1a of the bytes (draft-eastlake-fnv: offset basis 811c9dc5, prime 01000193).
     static std::uint32_t hash(std::string_view bytes);
