@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include "server/http/ListeningSocket.h"
 #include "server/store/Store.h"
 
 namespace ktr::server {
@@ -31,8 +32,13 @@ class Administration {
     std::string setHidden(const std::string& name, bool hidden);
     std::string people();
     std::string check();
-    /// Serves until SIGINT or SIGTERM.
-    std::string serve(const std::string& address);
+    /// Where it serves. A value.
+    struct Serving {
+        std::string address;             ///< for its own certificate; empty: 127.0.0.1, or none beside a socket
+        ListeningSocket::Place place{};  ///< a socket for a proxy; without a path: none
+    };
+    /// Serves until SIGINT or SIGTERM. Where the service manager made sockets, it serves on these.
+    std::string serve(const Serving& where);
 
   private:
     /// Opens the store; an empty text when it is open.

@@ -25,7 +25,7 @@ int main(int count, char** words) {
     program.require_subcommand(1);
     std::string folder = defaultFolder();
     program.add_option("--data", folder, "Folder of the service (" + folder + ")")->type_name("FOLDER");
-    std::string name, other, host, precision = "exact", until, key, token = "ktr-token", address = "127.0.0.1";
+    std::string name, other, host, precision = "exact", until, key, token = "ktr-token";
     std::vector<std::string> handles;
     int port = 8443;
     const auto named = [&](CLI::App* command) {
@@ -54,7 +54,12 @@ int main(int count, char** words) {
     CLI::App* people = program.add_subcommand("people", "Lists people and who sees them");
     CLI::App* check = program.add_subcommand("check", "Looks whether all is whole");
     CLI::App* serve = program.add_subcommand("serve", "Serves until it is told to end");
-    serve->add_option("--address", address, "Address to listen on (127.0.0.1)");
+    ktr::server::Administration::Serving where;
+    serve->add_option("--address", where.address, "Address to serve with the own certificate (127.0.0.1)");
+    CLI::Option* socket =
+        serve->add_option("--socket", where.place.path, "Socket for a proxy such as caddy or nginx")->type_name("PATH");
+    serve->add_option("--socket-group", where.place.group, "Group of the proxy's user, which may connect")
+        ->needs(socket);
     CLI11_PARSE(program, count, words);
 
     const auto now =
@@ -70,7 +75,7 @@ int main(int count, char** words) {
                                   : *show    ? administration.setHidden(name, false)
                                   : *people  ? administration.people()
                                   : *check   ? administration.check()
-                                  : *serve   ? administration.serve(address)
+                                  : *serve   ? administration.serve(where)
                                              : std::string();
     if (!complaint.empty()) {
         std::cerr << "ktr-service: " << complaint << std::endl;

@@ -1,4 +1,5 @@
 // `ktr-service serve`.
+#include <sys/resource.h>
 #include <sys/signalfd.h>
 #include <unistd.h>
 
@@ -8,6 +9,7 @@
 #include <csignal>
 
 #include "server/admin/Administration.h"
+#include "server/admin/ServiceManager.h"
 #include "server/admin/ServiceSettings.h"
 #include "server/http/CertificateAuthority.h"
 #include "server/http/TlsContext.h"
@@ -36,35 +38,66 @@ int endingSignals() {
     return ::signalfd(-1, &set, SFD_CLOEXEC);
 }
 
+/// A session's bound of 1,024 descriptors is below the edge's bound of connections.
+void allowDescriptors() {
+    rlimit limit{};
+    if (::getrlimit(RLIMIT_NOFILE, &limit) == 0) {
+        limit.rlim_cur = limit.rlim_max;
+        ::setrlimit(RLIMIT_NOFILE, &limit);
+    }
+}
+
+/// A context with a certificate made now. None, with a sentence, when there is no authority to sign it.
+std::shared_ptr<SSL_CTX> certified(const std::string& folder, const ServiceSettings& settings, std::string& complaint) {
+    const auto authority = CertificateAuthority::read(folder, complaint);
+    if (!authority) {
+        complaint = complaint.empty() ? folder + "/ca.pem: is missing, damaged or about to expire" : complaint;
+        return nullptr;
+    }
+    const auto pair = authority->issue({"ktr-service", settings.alternativeName(), -1, kCertificateDays});
+    auto context = pair ? TlsContext::make(pair->certificate.get(), pair->key.get()) : nullptr;
+    complaint = context ? "" : "the certificate cannot be made";
+    return context;
+}
+
 }  // namespace
 
-std::string Administration::serve(const std::string& address) {
+std::string Administration::serve(const Serving& where) {
     const int signals = endingSignals();
+    allowDescriptors();
     std::string complaint = open();
     const auto settings = complaint.empty() ? ServiceSettings::read(folder_, complaint) : std::nullopt;
-    const auto authority = settings ? CertificateAuthority::read(folder_, complaint) : std::nullopt;
-    if (!authority) {
-        return complaint.empty() ? folder_ + "/ca.pem: is missing, damaged or about to expire" : complaint;
+    if (!settings) {
+        return complaint;
     }
-    const auto pair = authority->issue({"ktr-service", settings->alternativeName(), -1, kCertificateDays});
     Service::Setup setup;
-    setup.http.address = address;
+    setup.http.inherited = ServiceManager::takeSockets();
+    setup.http.place = where.place;
+    const bool hasSocket = !setup.http.inherited.empty() || !where.place.path.empty();
+    setup.http.address = where.address.empty() && !hasSocket ? "127.0.0.1" : where.address;
     setup.http.port = settings->port;
-    setup.http.tls = pair ? TlsContext::make(pair->certificate.get(), pair->key.get()) : nullptr;
-    if (!setup.http.tls || signals < 0) {
-        return "the certificate cannot be made";
+    setup.http.tls = setup.http.address.empty() ? nullptr : certified(folder_, *settings, complaint);
+    if (!complaint.empty()) {
+        return complaint;
     }
     setup.store = std::move(store_);
     const bool isSix = settings->host.find(':') != std::string::npos;
     setup.hosts = {isSix ? "[" + settings->host + "]" : settings->host};
     setup.now = presentTime;
+    setup.alive = ServiceManager::tellAlive;
+    const std::string place = !setup.http.address.empty() ? setup.http.address
+                              : !where.place.path.empty() ? where.place.path
+                                                          : "a socket of the service manager";
     Service service(std::move(setup));
     complaint = service.start();
     if (complaint.empty()) {
-        out_ << "ready " << settings->origin() << " on " << address << ":" << service.port() << std::endl;
+        const std::string port = service.port() == 0 ? "" : ":" + std::to_string(service.port());
+        out_ << "ready " << settings->origin() << " on " << place << port << std::endl;
+        ServiceManager::tellReady();
         signalfd_siginfo ending{};
         while (::read(signals, &ending, sizeof ending) < 0 && errno == EINTR) {
         }
+        ServiceManager::tellStopping();
         service.stop();
     }
     ::close(signals);

@@ -4,6 +4,7 @@
 #include <array>
 
 #include "platform/base/Json.h"
+#include "server/http/ClientAddress.h"
 #include "server/http/ConnectionTable.h"
 
 namespace ktr::server {
@@ -30,9 +31,9 @@ std::string chunk(const std::string& bytes) {
 
 }  // namespace
 
-HttpConnection::HttpConnection(std::shared_ptr<const Setup> setup, int descriptor, std::string peer)
+HttpConnection::HttpConnection(std::shared_ptr<const Setup> setup, int descriptor, Client client)
     : setup_(std::move(setup)),
-      peer_(std::move(peer)),
+      client_(std::move(client)),
       descriptor_(asio::make_strand(*setup_->loop), descriptor),
       deadline_(descriptor_.get_executor()),
       pace_(descriptor_.get_executor()),
@@ -139,7 +140,7 @@ void HttpConnection::answerRequest() {
     answering_ = true;
     setup_->table->setAnswering(*this, true);
     HttpRequest request = reader_.take();
-    request.peer = peer_;
+    tellClient(request);
     const bool isHead = request.method == "HEAD";
     if (isHead) {
         request.method = "GET";
@@ -161,6 +162,13 @@ void HttpConnection::answerRequest() {
         });
     });
     setup_->handler(std::move(request), std::move(reply));
+}
+
+void HttpConnection::tellClient(HttpRequest& request) const {
+    const bool isForwarded = ClientAddress::isForwarded(request);
+    // Only a proxy on this machine is believed: over the network anybody could write these headers.
+    request.peer = client_.address.empty() && isForwarded ? ClientAddress::forwardedFor(request) : client_.address;
+    request.isLocal = client_.isLocal && !isForwarded;
 }
 
 void HttpConnection::refuse() {

@@ -38,13 +38,18 @@ class HttpConnection : public std::enable_shared_from_this<HttpConnection> {
         HttpHandler handler;
     };
 
+    struct Client {
+        std::string address;   ///< empty: it came through a socket in the file system
+        bool isLocal = false;  ///< it is on this machine
+    };
+
     /// Takes the descriptor, which does not block.
-    HttpConnection(std::shared_ptr<const Setup> setup, int descriptor, std::string peer);
+    HttpConnection(std::shared_ptr<const Setup> setup, int descriptor, Client client);
     ~HttpConnection();
 
     void start();
     void close();
-    const std::string& peer() const { return peer_; }
+    const std::string& peer() const { return client_.address; }
     /// Whether it is answering, or waits to.
     bool isAnswering() const { return answering_; }
 
@@ -54,6 +59,7 @@ class HttpConnection : public std::enable_shared_from_this<HttpConnection> {
     void receive();
     void act(RequestReader::State state);
     void answerRequest();
+    void tellClient(HttpRequest& request) const;
     void refuse();
     void send(HttpResponse response);
     void sendMore();
@@ -65,7 +71,7 @@ class HttpConnection : public std::enable_shared_from_this<HttpConnection> {
     void closeNow();
 
     const std::shared_ptr<const Setup> setup_;
-    const std::string peer_;
+    const Client client_;
     boost::asio::posix::basic_stream_descriptor<Strand> descriptor_;
     boost::asio::basic_waitable_timer<std::chrono::steady_clock, boost::asio::wait_traits<std::chrono::steady_clock>,
                                       Strand>

@@ -15,7 +15,10 @@ struct HttpRequest {
     std::string query;  ///< what follows the first "?", as it was sent
     std::vector<std::pair<std::string, std::string>> headers;
     std::string body;
-    std::string peer;  ///< the client's address without its port; empty for one on a socket in the file system
+    /// The client's address without its port, as the proxy names it where there is one; empty for a client at the
+    /// proxy's socket itself.
+    std::string peer;
+    bool isLocal = false;  ///< the client is on this machine, and asks for itself: no proxy forwards it
 
     /// The first header of this name, in any case; none when there is none.
     const std::string* header(std::string_view name) const;

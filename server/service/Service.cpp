@@ -23,10 +23,6 @@ constexpr const char* kCommands = "/qloxservice/friends/va/";
 /// Between two steps of deleting what is too old, seconds.
 constexpr double kSweepPause = 1.0;
 
-bool isLoopback(const std::string& peer) {
-    return peer.rfind("127.", 0) == 0 || peer.empty() || peer == "::";
-}
-
 /// The host of a Host header, without its port.
 std::string hostOf(const std::string& header) {
     const std::size_t colon = header.rfind(':');
@@ -39,6 +35,7 @@ std::string hostOf(const std::string& header) {
 Service::Service(Setup setup)
     : hosts_(std::move(setup.hosts)),
       now_(std::move(setup.now)),
+      alive_(std::move(setup.alive)),
       store_(std::move(setup.store)),
       http_(httpSetup(setup)) {}
 
@@ -67,7 +64,12 @@ void Service::stop() {
 }
 
 void Service::sweep() {
-    store_->deleteOld(now_(), nullptr);
+    // Through the edge's threads and the store's: whichever stands still, nobody hears of life.
+    store_->deleteOld(now_(), [this](bool) {
+        if (alive_) {
+            alive_();
+        }
+    });
     http_.later(kSweepPause, [this] { sweep(); });
 }
 
@@ -80,10 +82,10 @@ bool Service::isForUs(const HttpRequest& request) const {
 void Service::route(const HttpRequest& request, const HttpReply& reply) {
     const bool reads = request.method == "GET";
     const bool posts = request.method == "POST";
-    if (reads && request.path == "/health" && isLoopback(request.peer)) {
+    if (reads && request.path == "/health" && request.isLocal) {
         return reply.send(HttpResponse::json(200, "{}"));
     }
-    if (reads && request.path == "/metrics" && isLoopback(request.peer)) {
+    if (reads && request.path == "/metrics" && request.isLocal) {
         HttpResponse response;
         response.headers.emplace_back("Content-Type", "text/plain; version=0.0.4");
         response.body = counters_.text();

@@ -26,6 +26,8 @@ class Service {
         /// The host names of its address, without a port; empty: any.
         std::vector<std::string> hosts;
         std::function<std::int64_t()> now;  ///< seconds since 1970
+        /// Called about once a second, for as long as requests can be answered and the store answers; may be empty.
+        std::function<void()> alive = {};
     };
 
     explicit Service(Setup setup);
@@ -60,6 +62,7 @@ class Service {
 
     const std::vector<std::string> hosts_;
     const std::function<std::int64_t()> now_;
+    const std::function<void()> alive_;
     ServiceCounters counters_;
     FailureDelays delays_;
     std::unique_ptr<Store> store_;

@@ -1,20 +1,18 @@
 #include "server/http/HttpServer.h"
 
-#include <arpa/inet.h>
 #include <gtest/gtest.h>
-#include <netinet/in.h>
-#include <poll.h>
-#include <sys/socket.h>
-#include <unistd.h>
 
 #include <atomic>
 #include <chrono>
-#include <cstdint>
+#include <filesystem>
 #include <memory>
 #include <mutex>
 #include <string>
 #include <thread>
 #include <vector>
+
+#include "tests/support/RawClient.h"
+#include "tests/support/TemporaryFolder.h"
 
 namespace ktr::test {
 
@@ -23,55 +21,6 @@ using server::HttpRequest;
 using server::HttpResponse;
 using server::HttpServer;
 using std::chrono::milliseconds;
-
-namespace {
-
-/// A client that sends and reads exactly what it is told.
-class RawClient {
-  public:
-    explicit RawClient(int port) : descriptor_(::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
-        sockaddr_in address{};
-        address.sin_family = AF_INET;
-        address.sin_port = htons(static_cast<std::uint16_t>(port));
-        address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
-        connected_ = ::connect(descriptor_, reinterpret_cast<sockaddr*>(&address), sizeof address) == 0;
-    }
-    ~RawClient() { ::close(descriptor_); }
-    RawClient(const RawClient&) = delete;
-    RawClient& operator=(const RawClient&) = delete;
-
-    bool connected() const { return connected_; }
-    void send(const std::string& bytes) const { ::send(descriptor_, bytes.data(), bytes.size(), MSG_NOSIGNAL); }
-    /// What comes until `end` stands in it, the other side ends, or the time is over.
-    std::string read(const std::string& end, milliseconds time = milliseconds(5000)) const {
-        const auto until = std::chrono::steady_clock::now() + time;
-        std::string text;
-        while (text.find(end) == std::string::npos || end.empty()) {
-            const auto left = std::chrono::duration_cast<milliseconds>(until - std::chrono::steady_clock::now());
-            pollfd wait{descriptor_, POLLIN, 0};
-            char block[4096];
-            if (left.count() <= 0 || ::poll(&wait, 1, static_cast<int>(left.count())) <= 0) {
-                return text + "(nothing more in time)";
-            }
-            const ssize_t count = ::recv(descriptor_, block, sizeof block, 0);
-            if (count <= 0) {
-                return text + "(end)";
-            }
-            text.append(block, static_cast<std::size_t>(count));
-        }
-        return text;
-    }
-    std::string get(const std::string& path = "/") const {
-        send("GET " + path + " HTTP/1.1\r\nHost: localhost\r\n\r\n");
-        return read("ok:" + path);
-    }
-
-  private:
-    int descriptor_;
-    bool connected_ = false;
-};
-
-}  // namespace
 
 class HttpServerTest : public ::testing::Test {
   protected:
@@ -271,6 +220,97 @@ TEST_F(HttpServerTest, AddressThatIsNone_IsSaid) {
     auto wrong = setup();
     wrong.address = "localhost";
     EXPECT_EQ(HttpServer(std::move(wrong)).start(), "localhost: is no address");
+}
+
+TEST_F(HttpServerTest, PlainHttp_NeverLeavesTheMachine) {
+    for (const char* address : {"0.0.0.0", "::"}) {
+        auto open = setup();
+        open.address = address;
+        EXPECT_NE(HttpServer(std::move(open)).start().find("without a certificate"), std::string::npos) << address;
+    }
+}
+
+TEST_F(HttpServerTest, ProxysSocket_IsServedBesideAnAddress_AndItsClientIsWhoItForwards) {
+    const TemporaryFolder folder;
+    auto both = setup();
+    both.place.path = (folder.path() / "http.sock").string();
+    both.handler = [](const HttpRequest& request, const HttpReply& reply) {
+        reply.send(HttpResponse::json(200, "ok:" + request.peer + (request.isLocal ? ",local" : ",far")));
+    };
+    HttpServer server(both);
+    ASSERT_EQ(server.start(), "");
+    const RawClient proxy(both.place.path);
+    const RawClient direct(server.port());
+    const std::string asked = "GET / HTTP/1.1\r\nHost: a\r\n";
+    proxy.send(asked + "\r\n");
+    EXPECT_NE(proxy.read("local").find("ok:,local"), std::string::npos);
+    proxy.send(asked + "X-Forwarded-For: 127.0.0.1\r\n\r\n");
+    EXPECT_NE(proxy.read("far").find("ok:127.0.0.1,far"), std::string::npos)
+        << "its own neighbours are not local either";
+    direct.send(asked + "\r\n");
+    EXPECT_NE(direct.read("local").find("ok:127.0.0.1,local"), std::string::npos);
+    direct.send(asked + "X-Forwarded-For: 192.0.2.1\r\n\r\n");
+    EXPECT_NE(direct.read("far").find("ok:127.0.0.1,far"), std::string::npos) << "nobody is believed over the network";
+    server.stop();
+    EXPECT_FALSE(std::filesystem::exists(both.place.path));
+}
+
+TEST_F(HttpServerTest, ProxysConnections_AreNotBoundedByAddress) {
+    const TemporaryFolder folder;
+    auto narrow = setup();
+    narrow.address.clear();
+    narrow.place.path = (folder.path() / "http.sock").string();
+    narrow.limits.connectionsPerAddress = 2;
+    HttpServer server(narrow);
+    ASSERT_EQ(server.start(), "");
+    EXPECT_EQ(server.port(), 0);
+    std::vector<std::unique_ptr<RawClient>> connections;
+    for (int i = 0; i < 20; ++i) {
+        connections.push_back(std::make_unique<RawClient>(narrow.place.path));
+        EXPECT_NE(connections.back()->get().find("ok:/"), std::string::npos);
+    }
+    for (const auto& connection : connections) {
+        EXPECT_NE(connection->get("/again").find("ok:/again"), std::string::npos);
+    }
+}
+
+TEST_F(HttpServerTest, ThousandPipelinedRequests_AreAnsweredOneByOne_AndASmuggledOneEndsThem) {
+    HttpServer server(setup());
+    ASSERT_EQ(server.start(), "");
+    const RawClient client(server.port());
+    std::string all;
+    for (int i = 0; i < 1000; ++i) {
+        all += "POST /" + std::to_string(i) + " HTTP/1.1\r\nHost: a\r\nContent-Length: 1\r\n\r\n.";
+    }
+    all += "POST /two HTTP/1.1\r\nHost: a\r\nContent-Length: 1\r\nContent-Length: 30\r\n\r\n.";
+    all += "GET /smuggled HTTP/1.1\r\nHost: a\r\n\r\n";
+    std::thread sending([&] { client.send(all); });
+    const std::string answers = client.read("(never)");
+    sending.join();
+    std::size_t from = 0;
+    for (int i = 0; i < 1000; ++i) {
+        from = answers.find("ok:/" + std::to_string(i) + ".", from);
+        ASSERT_NE(from, std::string::npos) << i;
+    }
+    EXPECT_NE(answers.find("HTTP/1.1 400 ", from), std::string::npos);
+    EXPECT_EQ(answers.find("smuggled"), std::string::npos);
+    EXPECT_TRUE(answers.ends_with("(end)"));
+}
+
+TEST_F(HttpServerTest, FloodOfOneAddress_LeavesRoomForAnother) {
+    auto narrow = setup();
+    narrow.limits.connections = 40;
+    narrow.limits.connectionsPerAddress = 20;
+    HttpServer server(std::move(narrow));
+    ASSERT_EQ(server.start(), "");
+    const RawClient kept(server.port(), "127.0.0.2");
+    EXPECT_NE(kept.get().find("ok:/"), std::string::npos);
+    std::vector<std::unique_ptr<RawClient>> flood;
+    for (int i = 0; i < 300; ++i) {
+        flood.push_back(std::make_unique<RawClient>(server.port(), "127.0.0.3"));
+        flood.back()->send("GET /flood HTTP/1.1\r\nHost: a\r\n");
+    }
+    EXPECT_NE(kept.get("/still").find("ok:/still"), std::string::npos) << "nobody else's connection gave way";
 }
 
 }  // namespace ktr::test
