@@ -1,16 +1,15 @@
 #include "server/admin/Administration.h"
 
 #include <algorithm>
-#include <ctime>
 #include <filesystem>
 
 #include "documents/AtomicFile.h"
 #include "documents/Words.h"
 #include "platform/base/Json.h"
-#include "server/admin/LocalTime.h"
 #include "server/admin/ServiceSettings.h"
 #include "server/http/CertificateAuthority.h"
 #include "server/ingest/SealedText.h"
+#include "server/rules/WallClock.h"
 #include "server/store/Secret.h"
 
 namespace ktr::server {
@@ -33,12 +32,7 @@ bool isName(const std::string& name) {
 }
 
 std::string faceOf(std::int64_t time) {
-    const std::time_t seconds = time;
-    std::tm face{};
-    ::localtime_r(&seconds, &face);
-    char text[32];
-    std::strftime(text, sizeof text, "%Y-%m-%d %H:%M", &face);
-    return text;
+    return WallClock({}).face(time);
 }
 
 std::string wordsOf(const Grant& grant) {
@@ -171,11 +165,11 @@ std::string Administration::share(const std::string& owner, const std::string& v
     }
     const auto exactness = precisionOf(precision);
     if (!exactness) {
-        return "--precision: expected exact, 1km or town, found " + documents::inQuotes(precision);
+        return "--precision: expected exact, 1km, town or places, found " + documents::inQuotes(precision);
     }
     Grant grant{*exactness, now_, std::nullopt};
     if (!until.empty()) {
-        grant.until = endingOf(until, now_);
+        grant.until = WallClock({}).endingOf(until, now_);
         if (!grant.until) {
             return "--until: expected midnight, a time such as 18:30 or a date to come, found " +
                    documents::inQuotes(until);

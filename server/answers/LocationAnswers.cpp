@@ -26,6 +26,15 @@ Dictionary locationOf(const Seen& seen) {
         location.set("horizontalAccuracy", *seen.accuracy);
     }
     location.set("timestamp", seen.time * 1000);
+    if (!seen.place.empty()) {
+        // Clients word the sorts of places that they know, and take the first label.
+        Value::Array labels;
+        if (!seen.label.empty()) {
+            labels.emplace_back(Dictionary{{"label", "_$!<" + seen.label + ">!$_"}});
+        }
+        labels.emplace_back(Dictionary{{"label", seen.place}});
+        location.set("labels", std::move(labels));
+    }
     return location;
 }
 
@@ -53,6 +62,7 @@ bool isEmail(const std::string& handle) {
 }  // namespace
 
 Dictionary LocationAnswers::locations(const LocationsRequest& request, std::vector<AskedFriend> friends) {
+    const bool partly = request.handles.size() > kMostHandles;
     std::vector<AskedFriend> found;
     Value::Array rest;
     for (AskedFriend& one : friends) {
@@ -80,7 +90,8 @@ Dictionary LocationAnswers::locations(const LocationsRequest& request, std::vect
     if (request.clientId) {
         context.set("clientId", *request.clientId);
     }
-    return {{"statusCode", 200}, {"serverContext", context}, {"locations", locations}, {"emails", order}};
+    return {
+        {"statusCode", partly ? 416 : 200}, {"serverContext", context}, {"locations", locations}, {"emails", order}};
 }
 
 Dictionary LocationAnswers::sharing(bool hidden, const std::string& preferredHandle,

@@ -25,11 +25,13 @@ class LocationAnswers {
     /// Seconds between two answers, and after which a client stops asking.
     static constexpr double kInterval = 30.0;
     static constexpr double kTimeout = 600.0;
-    /// How many handles one command may name.
+    /// How many handles of one command are looked up; with more the answer says that it is a part (416), whoever they
+    /// are.
     static constexpr std::size_t kMostHandles = 1000;
 
     /// The answer to a get-locations command. Friends who are seen come first, one handle each, the e-mail address if
     /// one was asked for. All others are listed as they were asked for, without an entry, whatever the reason.
+    /// `friends` are as many as were asked for.
     static platform::Dictionary locations(const LocationsRequest& request, std::vector<AskedFriend> friends);
 
     /// The answer to a command about the user's own sharing. `place` serves the answer and is kept nowhere.

@@ -8,6 +8,8 @@ std::string wordOf(Precision precision) {
             return "1km";
         case Precision::Town:
             return "town";
+        case Precision::Places:
+            return "places";
         case Precision::Exact:
             break;
     }
@@ -15,12 +17,20 @@ std::string wordOf(Precision precision) {
 }
 
 std::optional<Precision> precisionOf(std::string_view word) {
-    for (const Precision precision : {Precision::Exact, Precision::Kilometre, Precision::Town}) {
+    for (const Precision precision : {Precision::Exact, Precision::Kilometre, Precision::Town, Precision::Places}) {
         if (word == wordOf(precision)) {
             return precision;
         }
     }
     return std::nullopt;
+}
+
+std::int64_t Grant::end() const {
+    return until.value_or(confirmed.value_or(from) + kQuestion + kPatience);
+}
+
+bool Grant::asks(std::int64_t now) const {
+    return !until && now >= end() - kPatience && now < end();
 }
 
 }  // namespace ktr::server

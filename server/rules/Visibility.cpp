@@ -12,51 +12,63 @@ std::int64_t slotOf(std::int64_t time, std::int64_t length) {
     return time >= 0 ? time / length : -((-time + length - 1) / length);
 }
 
-/// The cell that is shown at the beginning of slot `present`, of fixes by ascending time.
-Cell shownCell(const std::vector<Fix>& fixes, std::int64_t present, std::int64_t length, double side) {
-    const auto cellOf = [side](const Fix& fix) { return Cell::of(fix.latitude, fix.longitude, side); };
-    Cell shown = cellOf(fixes.front());
-    Cell before = shown;
-    std::size_t next = 0;
-    Cell here = shown;
-    for (std::int64_t slot = slotOf(fixes.front().time, length); slot < present; ++slot) {
-        // Where the person was when the slot ended.
-        for (; next < fixes.size() && slotOf(fixes[next].time, length) <= slot; ++next) {
-            here = cellOf(fixes[next]);
+/// What is shown at the beginning of slot `present`: what the person was in (`keyOf` a fix) at the ends of two slots in
+/// a row, the latest such two; `initial` stands before the first fix. Fixes come by ascending time.
+template <class KeyOf, class Key>
+Key shownAt(const std::vector<Fix>& fixes, std::int64_t present, std::int64_t length, const KeyOf& keyOf, Key initial) {
+    const std::int64_t begin = slotOf(fixes.front().time, length);
+    // The last fix of each slot, going back.
+    std::size_t count = fixes.size();
+    const auto keyAtEndOf = [&](std::int64_t slot) -> Key {
+        while (count > 0 && slotOf(fixes[count - 1].time, length) > slot) {
+            --count;
         }
-        if (here == before) {
-            shown = here;
+        return count == 0 ? initial : keyOf(fixes[count - 1]);
+    };
+    Key later = keyAtEndOf(present - 1);
+    for (std::int64_t slot = present - 2; slot >= begin - 1; --slot) {
+        Key earlier = keyAtEndOf(slot);
+        if (earlier == later) {
+            return later;
         }
-        before = here;
+        later = std::move(earlier);
     }
-    return shown;
+    return initial;
 }
 
 }  // namespace
 
 double Visibility::cellSide(Precision precision) {
-    return precision == Precision::Exact ? 0.0 : precision == Precision::Kilometre ? 1000.0 : 4000.0;
+    return precision == Precision::Kilometre ? 1000.0 : precision == Precision::Town ? 4000.0 : 0.0;
 }
 
 std::int64_t Visibility::slotLength(Precision precision) {
-    return precision == Precision::Exact ? 1 : precision == Precision::Kilometre ? 300 : 900;
+    return precision == Precision::Exact ? 1 : precision == Precision::Town ? 900 : 300;
+}
+
+bool Visibility::isOpen(const Sharing& sharing, std::int64_t now) {
+    return !sharing.hidden && sharing.grant && now >= sharing.grant->from &&
+           std::max(now, sharing.latest) < sharing.grant->end();
 }
 
 std::optional<Seen> Visibility::visible(const Sharing& sharing, std::int64_t now) {
-    if (sharing.hidden || !sharing.grant || now < sharing.grant->from ||
-        (sharing.grant->until && std::max(now, sharing.latest) >= *sharing.grant->until)) {
+    if (!isOpen(sharing, now)) {
         return std::nullopt;
     }
     const Precision precision = sharing.grant->precision;
     const bool exact = precision == Precision::Exact;
     const std::int64_t length = slotLength(precision);
     const std::int64_t present = slotOf(now, length);
-    const std::int64_t first = std::max({sharing.grant->from, sharing.shownSince, now - sharing.retention});
-    // Below exact precision nothing is used that came in this slot: it would tell when it came.
+    // Below exact precision nothing is used that came in this slot: it would tell when it came; nor what becomes too
+    // old in this slot, for the same reason.
     const std::int64_t end = exact ? now + 1 : present * length;
+    const std::int64_t oldest = (exact ? now : end + length) - sharing.retention;
+    const std::int64_t shared = std::max(sharing.grant->from, sharing.shownSince);
     std::vector<Fix> usable;
     for (const Fix& fix : sharing.fixes) {
-        if (fix.time >= first && fix.heard < end && (exact || fix.time < end)) {
+        // A phone's clock may be ahead: what was heard before the grant is from before it.
+        if (std::min(fix.time, fix.heard) >= shared && fix.time >= oldest && fix.heard < end &&
+            (exact || fix.time < end)) {
             usable.push_back(fix);
         }
     }
@@ -64,12 +76,27 @@ std::optional<Seen> Visibility::visible(const Sharing& sharing, std::int64_t now
         return std::nullopt;
     }
     const Fix& last = usable.back();
+    const auto placeOf = [&](const Fix& fix) { return NamedPlace::saidAt(sharing.places, fix); };
     if (exact) {
-        return Seen{last.latitude, last.longitude, last.accuracy, last.time};
+        Seen seen{last.latitude, last.longitude, last.accuracy, last.time};
+        if (const NamedPlace* place = placeOf(last)) {
+            seen.place = place->name;
+            seen.label = place->label;
+        }
+        return seen;
+    }
+    const std::int64_t time = slotOf(last.time, length) * length;
+    if (precision == Precision::Places) {
+        const NamedPlace* place =
+            shownAt<decltype(placeOf), const NamedPlace*>(usable, present, length, placeOf, nullptr);
+        return place == nullptr ? std::nullopt
+                                : std::optional(Seen{place->latitude, place->longitude, place->radius, time,
+                                                     place->name, place->label});
     }
     const double side = cellSide(precision);
-    const Cell::Place place = shownCell(usable, present, length, side).place(side);
-    return Seen{place.latitude, place.longitude, place.radius, slotOf(last.time, length) * length};
+    const auto cellOf = [side](const Fix& fix) { return Cell::of(fix.latitude, fix.longitude, side); };
+    const Cell::Place place = shownAt(usable, present, length, cellOf, cellOf(usable.front())).place(side);
+    return Seen{place.latitude, place.longitude, place.radius, time};
 }
 
 }  // namespace ktr::server

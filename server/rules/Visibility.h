@@ -2,21 +2,24 @@
 
 #include <cstdint>
 #include <optional>
+#include <string>
 #include <vector>
 
 #include "server/ingest/Fix.h"
 #include "server/rules/Grant.h"
+#include "server/rules/NamedPlace.h"
 
 namespace ktr::server {
 
 /// All that decides what one person sees of another.
 struct Sharing {
-    bool hidden = false;          ///< the owner hides from everybody
-    std::int64_t shownSince = 0;  ///< the last time the owner stopped hiding: nothing from before is seen again
-    std::int64_t retention = 0;   ///< seconds: nothing older is seen
-    std::int64_t latest = 0;      ///< the latest time the service has seen: a clock set back ends nothing later
-    std::optional<Grant> grant;   ///< none: a stranger
-    std::vector<Fix> fixes;       ///< the owner's, by ascending time
+    bool hidden = false;             ///< the owner hides from everybody
+    std::int64_t shownSince = 0;     ///< the last time the owner stopped hiding: nothing from before is seen again
+    std::int64_t retention = 0;      ///< seconds: nothing older is seen
+    std::int64_t latest = 0;         ///< the latest time the service has seen: a clock set back ends nothing later
+    std::optional<Grant> grant;      ///< none: a stranger
+    std::vector<Fix> fixes;          ///< the owner's, by ascending time
+    std::vector<NamedPlace> places;  ///< the owner's
 };
 
 /// What is seen of somebody. Everything that leaves the service is made of this and of nothing else.
@@ -25,6 +28,8 @@ struct Seen {
     double longitude = 0.0;
     std::optional<double> accuracy;  ///< metres; none when not known
     std::int64_t time = 0;           ///< seconds since 1970
+    std::string place = {};          ///< the owner's name for where that is, if it may be said; else empty
+    std::string label = {};          ///< what sort of place it is, as `NamedPlace::label`
 
     bool operator==(const Seen&) const = default;
 };
@@ -39,9 +44,16 @@ class Visibility {
     /// follows the person only on a grid of time (town 15 minutes, 1 km 5 minutes), by what was heard before the
     /// present slot began, and after two slots in the new cell: whoever crosses an edge to and fro is not seen to. The
     /// time is that of the last fix, rounded down to the grid.
+    ///
+    /// Names of places are said at exact precision, and at "only named places": there the place stands for the person,
+    /// by the same grid of time (5 minutes) and the same two slots, and outside of such places nothing is seen.
     static std::optional<Seen> visible(const Sharing& sharing, std::int64_t now);
 
-    /// Metres; 0 for exact.
+    /// Whether there is a grant that has begun and is not over, of somebody who does not hide: what `visible` begins
+    /// with.
+    static bool isOpen(const Sharing& sharing, std::int64_t now);
+
+    /// Metres; 0 where no cells are shown.
     static double cellSide(Precision precision);
     /// Seconds; 1 for exact.
     static std::int64_t slotLength(Precision precision);

@@ -236,13 +236,14 @@ HttpResponse Service::locations(const Device& device, const Dictionary& body) {
     if (!request) {
         return refusal(400, complaint);
     }
-    if (request->handles.size() > LocationAnswers::kMostHandles) {
-        return refusal(400, "$.handles: expected at most " + std::to_string(LocationAnswers::kMostHandles));
-    }
     store_->present(now_());
     std::vector<AskedFriend> asked;
     std::vector<std::int64_t> seen;
     for (const std::string& handle : request->handles) {
+        if (asked.size() >= LocationAnswers::kMostHandles) {
+            asked.push_back({handle, 0, std::nullopt});
+            continue;
+        }
         const auto owner = store_->personOf(handle);
         const auto sharing = owner ? store_->sharing(device.person, *owner) : std::nullopt;
         asked.push_back({handle, owner.value_or(0), sharing ? Visibility::visible(*sharing, now_()) : std::nullopt});

@@ -300,7 +300,7 @@ class OwnServiceTest(unittest.TestCase):
                             (("add", "Zoe", "--handle", "ANN@x.example"), "belongs to somebody else"),
                             (("share", "Ann", "Nobody"), "there is nobody called"),
                             (("share", "Ann", "Ann"), "nobody shares with themselves"),
-                            (("share", "Ann", "Otto", "--precision", "street"), "expected exact, 1km or town"),
+                            (("share", "Ann", "Otto", "--precision", "street"), "expected exact, 1km, town or places"),
                             (("share", "Ann", "Otto", "--until", "yesterday"), "--until: expected"),
                             (("revoke", "Ann", "Otto"), "does not see"), (("init", "--host", "b"), "already"),
                             (("hide", "Nobody"), "there is nobody called")):

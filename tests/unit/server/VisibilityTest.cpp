@@ -8,21 +8,14 @@
 #include <random>
 #include <set>
 
-#include "platform/base/Json.h"
-#include "server/answers/LocationAnswers.h"
-#include "server/answers/PhoneAnswer.h"
 #include "server/rules/Cell.h"
 
 namespace ktr::test {
 
-using server::AskedFriend;
 using server::Cell;
-using server::CommandPlace;
 using server::Fix;
 using server::Grant;
-using server::LocationAnswers;
-using server::LocationsRequest;
-using server::PhoneAnswer;
+using server::NamedPlace;
 using server::Precision;
 using server::Seen;
 using server::Sharing;
@@ -153,147 +146,89 @@ TEST_F(VisibilityTest, Town_DoesNotFollowToAndFroOverAnEdge) {
     EXPECT_EQ(latitudes.size(), 1U);
 }
 
-/// What decides who sees what, drawn by lot.
-class VisibilityPropertyTest : public VisibilityTest {
-  protected:
-    static constexpr int kRounds = 10000;
-
-    std::int64_t between(std::int64_t least, std::int64_t most) {
-        return std::uniform_int_distribution<std::int64_t>(least, most)(random_);
-    }
-    double real(double least, double most) { return std::uniform_real_distribution<double>(least, most)(random_); }
-
-    Sharing drawn() {
-        Sharing sharing = shared(static_cast<Precision>(between(0, 2)));
-        sharing.grant->from = kNow - between(0, 2 * kDay);
-        if (between(0, 3) == 0) {
-            sharing.grant->until = kNow + between(-3600, 3600);
-        }
-        sharing.hidden = between(0, 9) == 0;
-        sharing.shownSince = between(0, 4) == 0 ? kNow - between(0, kDay) : 0;
-        sharing.latest = kNow + between(-3600, 1800);
-        double latitude = real(-80.0, 80.0);
-        double longitude = real(-179.0, 179.0);
-        const auto count = between(0, 12);
-        for (std::int64_t i = 0; i < count; ++i) {
-            latitude += real(-0.05, 0.05);
-            longitude += real(-0.05, 0.05);
-            Fix one = fix(kNow - between(-300, 2 * kDay), latitude, longitude);
-            one.heard = between(0, 3) == 0 ? kNow - between(0, 4000) : one.time;
-            sharing.fixes.push_back(one);
-        }
-        sort(sharing);
-        return sharing;
-    }
-    static void sort(Sharing& sharing) {
-        std::sort(sharing.fixes.begin(), sharing.fixes.end(),
-                  [](const Fix& a, const Fix& b) { return a.time < b.time; });
-    }
-    /// Everything that leaves the service about somebody, as bytes.
-    static std::string bytes(const std::optional<Seen>& seen) {
-        LocationsRequest request;
-        request.handles = {"ann@x.example"};
-        request.mine = CommandPlace{50.0, -3.0, std::nullopt};
-        request.wanted = CommandPlace{50.1, -3.0, std::nullopt};
-        std::string text = platform::writeJson(LocationAnswers::locations(request, {{"ann@x.example", 1, seen}}));
-        if (seen) {
-            text += platform::writeJson(PhoneAnswer::messages({{"Ann", *seen}}, true));
-        }
-        return text;
-    }
-
-    std::mt19937_64 random_{20261122};
-};
-
-TEST_F(VisibilityPropertyTest, WhatMayNotCount_ChangesNothing) {
-    int visible = 0;
-    for (int round = 0; round < kRounds; ++round) {
-        const Sharing sharing = drawn();
-        const auto seen = Visibility::visible(sharing, kNow);
-        visible += seen ? 1 : 0;
-        const bool over = sharing.grant->until && std::max(kNow, sharing.latest) >= *sharing.grant->until;
-        if (sharing.hidden || over || kNow < sharing.grant->from) {
-            EXPECT_EQ(seen, std::nullopt);
-        }
-        // Another past before the grant or the last showing, another present below exact precision.
-        Sharing other = sharing;
-        const std::int64_t first = std::max({sharing.grant->from, sharing.shownSince, kNow - sharing.retention});
-        const std::int64_t length = Visibility::slotLength(sharing.grant->precision);
-        const std::int64_t slot = kNow / length * length;
-        for (Fix& one : other.fixes) {
-            const bool early = one.time < first;
-            const bool late = length > 1 && (one.heard >= slot || one.time >= slot);
-            if (early || late) {
-                one.latitude = real(-80.0, 80.0);
-                one.longitude = real(-179.0, 179.0);
-                one.accuracy = real(1.0, 1000.0);
-            }
-        }
-        for (int i = 0; i < 3; ++i) {
-            other.fixes.push_back(fix(first - 1 - between(0, kDay), real(-80.0, 80.0), 0.0));
-            if (length > 1) {
-                other.fixes.push_back(fix(slot + between(0, 300), real(-80.0, 80.0), 0.0));
-            }
-        }
-        sort(other);
-        EXPECT_EQ(bytes(Visibility::visible(other, kNow)), bytes(seen));
-        if (sharing.hidden || over) {
-            EXPECT_EQ(bytes(seen), bytes(std::nullopt));
-        }
-    }
-    EXPECT_GT(visible, kRounds / 10) << "else nothing was tried";
+TEST_F(VisibilityTest, WhatWasHeardBeforeTheGrantOrTheShowing_IsFromBeforeIt_WhateverThePhonesClockSays) {
+    Sharing sharing = shared(Precision::Exact);
+    sharing.fixes = {fix(kNow + 200, 50.2, -3.1)};
+    sharing.fixes[0].heard = kNow - 20;
+    ASSERT_TRUE(Visibility::visible(sharing, kNow));
+    sharing.shownSince = kNow - 10;
+    EXPECT_EQ(Visibility::visible(sharing, kNow), std::nullopt);
+    sharing.shownSince = 0;
+    sharing.grant->from = kNow - 10;
+    EXPECT_EQ(Visibility::visible(sharing, kNow), std::nullopt);
 }
 
-TEST_F(VisibilityPropertyTest, MovesWithinACell_AreNotSeenBelowExactPrecision) {
-    int visible = 0;
-    for (int round = 0; round < kRounds; ++round) {
-        Sharing sharing = drawn();
-        if (sharing.grant->precision == Precision::Exact) {
-            sharing.grant->precision = Precision::Town;
-        }
-        const double side = Visibility::cellSide(sharing.grant->precision);
-        const std::int64_t length = Visibility::slotLength(sharing.grant->precision);
-        const auto seen = Visibility::visible(sharing, kNow);
-        visible += seen ? 1 : 0;
-        Sharing other = sharing;
-        const std::int64_t first = std::max({sharing.grant->from, sharing.shownSince, kNow - sharing.retention});
-        for (Fix& one : other.fixes) {
-            const Cell cell = Cell::of(one.latitude, one.longitude, side);
-            const double latitude = one.latitude + real(-0.02, 0.02);
-            const double longitude = one.longitude + real(-0.02, 0.02);
-            if (Cell::of(latitude, longitude, side) == cell) {
-                one.latitude = latitude;
-                one.longitude = longitude;
-            }
-            one.accuracy = real(1.0, 500.0);
-            // Within its slot, on the same side of what is too early.
-            const std::int64_t time = one.time / length * length + between(0, length - 1);
-            const bool alone = std::count_if(other.fixes.begin(), other.fixes.end(), [&](const Fix& fix) {
-                                   return fix.time / length == one.time / length;
-                               }) == 1;
-            if (alone && (time < first) == (one.time < first)) {
-                one.time = time;
-            }
-        }
-        EXPECT_EQ(bytes(Visibility::visible(other, kNow)), bytes(seen));
-    }
-    EXPECT_GT(visible, kRounds / 10);
+TEST_F(VisibilityTest, GrantWithoutEnd_AsksAfter90Days_AndEndsAfter7More) {
+    Sharing sharing = shared(Precision::Exact);
+    sharing.fixes = {fix(kNow - 60, 50.2, -3.1)};
+    sharing.grant->from = kNow - 97 * kDay + 1;
+    EXPECT_TRUE(sharing.grant->asks(kNow));
+    EXPECT_TRUE(Visibility::visible(sharing, kNow));
+    sharing.latest = kNow + 1;
+    EXPECT_EQ(Visibility::visible(sharing, kNow), std::nullopt) << "by the latest time of all";
+    sharing.grant->confirmed = kNow - 8 * kDay;
+    EXPECT_FALSE(sharing.grant->asks(kNow));
+    EXPECT_TRUE(Visibility::visible(sharing, kNow));
+    EXPECT_FALSE(sharing.grant->asks(kNow + 82 * kDay - 1));
+    EXPECT_TRUE(sharing.grant->asks(kNow + 82 * kDay));
+    EXPECT_FALSE(sharing.grant->asks(kNow + 89 * kDay)) << "then it is over";
+    sharing.grant->until = kNow + 500 * kDay;
+    EXPECT_FALSE(sharing.grant->asks(kNow + 82 * kDay)) << "who said until when is not asked";
 }
 
-TEST_F(VisibilityPropertyTest, ProbingPositions_DoNotNarrowATown) {
-    Sharing one = shared(Precision::Town);
-    Sharing other = one;
-    const auto place = Cell::of(50.2, -3.1, 4000.0).place(4000.0);
-    one.fixes = {fix(kNow - 7200, place.latitude + 0.01, place.longitude + 0.01)};
-    other.fixes = {fix(kNow - 7200, place.latitude - 0.01, place.longitude - 0.015)};
-    const auto seen = Visibility::visible(one, kNow);
-    const auto same = Visibility::visible(other, kNow);
-    for (int probe = 0; probe < 10000; ++probe) {
-        LocationsRequest request;
-        request.mine = CommandPlace{50.2 + real(-0.1, 0.1), -3.1 + real(-0.1, 0.1), std::nullopt};
-        request.wanted = CommandPlace{50.2 + real(-0.05, 0.05), -3.1 + real(-0.05, 0.05), std::nullopt};
-        ASSERT_EQ(LocationAnswers::locations(request, {{"a", 1, seen}}),
-                  LocationAnswers::locations(request, {{"a", 1, same}}));
+TEST_F(VisibilityTest, Exact_SaysTheOwnersPlace_OnlyIfThatMayBeSaid) {
+    Sharing sharing = shared(Precision::Exact);
+    sharing.fixes = {fix(kNow - 60, 50.2, -3.1)};
+    sharing.places = {{1, "Work", "work", 50.2, -3.1, 150.0, true}, {2, "Clinic", "", 50.2, -3.1, 100.0, false}};
+    EXPECT_EQ(Visibility::visible(sharing, kNow), (Seen{50.2, -3.1, 12.0, kNow - 60, "Work", "work"}));
+    sharing.places.push_back({3, "Canteen", "", 50.2, -3.1, 110.0, true});
+    EXPECT_EQ(Visibility::visible(sharing, kNow)->place, "Canteen") << "the smaller one";
+    sharing.fixes[0].accuracy = 201.0;
+    EXPECT_EQ(Visibility::visible(sharing, kNow)->place, "") << "nobody knows whether it is there";
+    for (const Precision coarse : {Precision::Kilometre, Precision::Town}) {
+        sharing.fixes = {fix(kNow - 3600, 50.2, -3.1)};
+        sharing.grant->precision = coarse;
+        EXPECT_EQ(Visibility::visible(sharing, kNow)->place, "");
+        EXPECT_EQ(Visibility::visible(sharing, kNow)->label, "");
+    }
+}
+
+TEST_F(VisibilityTest, OnlyNamedPlaces_SayNothingBetween_AndNothingOfPlacesPassed) {
+    Sharing sharing = shared(Precision::Places);
+    sharing.places = {{1, "Work", "work", 50.2, -3.1, 150.0, true}, {2, "Clinic", "", 50.3, -3.1, 150.0, false}};
+    const std::int64_t slot = kNow - kNow % 300;
+    sharing.fixes = {fix(slot - 900, 50.2004, -3.1)};
+    EXPECT_EQ(Visibility::visible(sharing, slot), (Seen{50.2, -3.1, 150.0, slot - 900, "Work", "work"}))
+        << "the place stands for the person";
+    sharing.fixes.push_back(fix(slot - 299, 50.25, -3.1));
+    EXPECT_TRUE(Visibility::visible(sharing, slot)) << "not yet two slots away";
+    EXPECT_TRUE(Visibility::visible(sharing, slot + 299));
+    EXPECT_EQ(Visibility::visible(sharing, slot + 300), std::nullopt);
+    sharing.fixes.push_back(fix(slot + 1, 50.3, -3.1));
+    EXPECT_EQ(Visibility::visible(sharing, slot + 3000), std::nullopt) << "a place that may not be said";
+    sharing.places[1].said = true;
+    EXPECT_TRUE(Visibility::visible(sharing, slot + 3000));
+    sharing.fixes = {fix(slot - 900, 50.25, -3.1), fix(slot - 500, 50.2, -3.1), fix(slot - 250, 50.25, -3.1)};
+    for (std::int64_t now = slot - 900; now < slot + 2000; now += 50) {
+        EXPECT_EQ(Visibility::visible(sharing, now), std::nullopt) << "only passed through";
+    }
+}
+
+TEST_F(VisibilityTest, CoarsePlaces_DisappearOnTheGridOfTimeToo_AndBeforeTheyAreDeleted) {
+    for (const Precision precision : {Precision::Town, Precision::Kilometre, Precision::Places}) {
+        Sharing sharing = shared(precision);
+        sharing.retention = kDay;
+        sharing.places = {{1, "Work", "work", 50.2, -3.1, 150.0, true}};
+        sharing.fixes = {fix(kNow - kDay / 2 + 77, 50.2, -3.1)};
+        const std::int64_t length = Visibility::slotLength(precision);
+        bool before = true;
+        for (std::int64_t now = kNow; now < kNow + kDay; ++now) {
+            const bool seen = Visibility::visible(sharing, now).has_value();
+            ASSERT_TRUE(seen == before || now % length == 0) << now;
+            ASSERT_FALSE(seen && sharing.fixes[0].time < now - sharing.retention) << "the store has deleted it";
+            before = seen;
+        }
+        EXPECT_FALSE(before);
     }
 }
 

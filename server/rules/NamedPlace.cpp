@@ -1,0 +1,43 @@
+#include "server/rules/NamedPlace.h"
+
+#include <GeographicLib/Geodesic.hpp>
+#include <algorithm>
+#include <array>
+#include <cmath>
+
+namespace ktr::server {
+
+namespace {
+
+/// A degree of latitude is nowhere shorter, metres.
+constexpr double kShortestDegree = 110000.0;
+constexpr double kEnoughAccuracy = 200.0;
+
+}  // namespace
+
+bool NamedPlace::holds(const Fix& fix) const {
+    if ((fix.accuracy && *fix.accuracy > std::max(radius, kEnoughAccuracy)) ||
+        std::abs(fix.latitude - latitude) * kShortestDegree > radius) {
+        return false;
+    }
+    double metres = 0.0;
+    GeographicLib::Geodesic::WGS84().Inverse(latitude, longitude, fix.latitude, fix.longitude, metres);
+    return metres <= radius;
+}
+
+const NamedPlace* NamedPlace::saidAt(const std::vector<NamedPlace>& places, const Fix& fix) {
+    const NamedPlace* best = nullptr;
+    for (const NamedPlace& place : places) {
+        if (place.said && (best == nullptr || place.radius < best->radius) && place.holds(fix)) {
+            best = &place;
+        }
+    }
+    return best;
+}
+
+bool NamedPlace::isLabel(std::string_view word) {
+    constexpr std::array<std::string_view, 5> kLabels = {"home", "work", "school", "gym", "other"};
+    return std::find(kLabels.begin(), kLabels.end(), word) != kLabels.end();
+}
+
+}  // namespace ktr::server
