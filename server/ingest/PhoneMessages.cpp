@@ -8,6 +8,7 @@
 #include "documents/JsonReader.h"
 #include "platform/base/Date.h"
 #include "server/http/UrlQuery.h"
+#include "server/ingest/Base64.h"
 #include "server/ingest/SealedText.h"
 
 namespace ktr::server {
@@ -48,7 +49,7 @@ std::optional<double> numberIn(const UrlQuery& query, std::initializer_list<cons
 }
 
 Report withPosition(const RawFix& fix) {
-    return {Report::Kind::Position, {fix}, {}, false};
+    return {Report::Kind::Position, {fix}, {}, false, {}};
 }
 
 Report readOwnTracks(const Dictionary& message, std::string_view key, bool maySeal) {
@@ -66,6 +67,12 @@ Report readOwnTracks(const Dictionary& message, std::string_view key, bool maySe
         }
         Report report = readOwnTracks(*value->dictionary(), {}, false);
         report.sealed = true;
+        return report;
+    }
+    if (*type == "card") {
+        Report report = Report::alive();
+        const std::string* face = textIn(message, "face");
+        report.face = face == nullptr ? std::nullopt : Base64::decode(*face);
         return report;
     }
     if (*type != "location") {

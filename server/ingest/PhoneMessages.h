@@ -11,8 +11,10 @@ namespace ktr::server {
 class PhoneMessages {
   public:
     /// The body of an OwnTracks post: one JSON object with a "_type". A "location" is a position, but for a ping ("t":
-    /// "p"), which repeats an old place with the present time; every other type says only that the phone lives.
-    /// "encrypted" is opened with the phone's key; without one, or with a wrong one, it is junk.
+    /// "p"), which repeats an old place with the present time. A "card" may bring its owner's face; what it calls them
+    /// is not read. Every other type says only that the phone lives: places of a person's own ("waypoint",
+    /// "transition") are none of a phone's business. "encrypted" is opened with the phone's key; without one, or with a
+    /// wrong one, it is junk.
     static Report ownTracks(std::string_view body, std::string_view key = {});
 
     /// The parameters of a query or a form, as OsmAnd, Traccar Client before 9 and GPSLogger send them: "id", "lat",

@@ -17,7 +17,8 @@ struct RawFix {
     bool operator==(const RawFix&) const = default;
 };
 
-/// What a phone's message says. Whatever else is in it (networks, regions, motion, tags, topics, battery) is not read.
+/// What a phone's message says. Whatever else is in it (networks, regions, motion, tags, topics, waypoints, battery) is
+/// not read.
 struct Report {
     enum class Kind {
         Position,  ///< `fixes` has some
@@ -29,8 +30,10 @@ struct Report {
     std::vector<RawFix> fixes;
     std::string device;   ///< the secret in a message that carries its own; else empty
     bool sealed = false;  ///< it came encrypted, and wants its answer so
+    /// The bytes of the picture that its owner's card brings, before the rules of `Face`; none: it brings none.
+    std::optional<std::string> face;
 
-    static Report alive() { return {Kind::Alive, {}, {}, false}; }
+    static Report alive() { return {Kind::Alive, {}, {}, false, {}}; }
     bool operator==(const Report&) const = default;
 };
 

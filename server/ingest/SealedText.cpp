@@ -6,6 +6,8 @@
 #include <array>
 #include <vector>
 
+#include "server/ingest/Base64.h"
+
 namespace ktr::server {
 
 namespace {
@@ -21,25 +23,19 @@ std::optional<Key> keyOf(std::string_view text) {
     return key;
 }
 
-constexpr int kBase64 = sodium_base64_VARIANT_ORIGINAL;
-
 }  // namespace
 
 std::optional<std::string> SealedText::open(std::string_view sealed, std::string_view key) {
     const auto secret = keyOf(key);
-    std::vector<unsigned char> bytes(sealed.size());
-    std::size_t size = 0;
-    if (!secret || ::sodium_base642bin(bytes.data(), bytes.size(), sealed.data(), sealed.size(), nullptr, &size,
-                                       nullptr, kBase64) != 0) {
+    const auto decoded = Base64::decode(sealed);
+    if (!secret || !decoded || decoded->size() < crypto_secretbox_NONCEBYTES + crypto_secretbox_MACBYTES) {
         return std::nullopt;
     }
-    if (size < crypto_secretbox_NONCEBYTES + crypto_secretbox_MACBYTES) {
-        return std::nullopt;
-    }
-    std::string plain(size - crypto_secretbox_NONCEBYTES - crypto_secretbox_MACBYTES, '\0');
+    const auto* bytes = reinterpret_cast<const unsigned char*>(decoded->data());
+    std::string plain(decoded->size() - crypto_secretbox_NONCEBYTES - crypto_secretbox_MACBYTES, '\0');
     if (::crypto_secretbox_open_easy(reinterpret_cast<unsigned char*>(plain.data()),
-                                     bytes.data() + crypto_secretbox_NONCEBYTES, size - crypto_secretbox_NONCEBYTES,
-                                     bytes.data(), secret->data()) != 0) {
+                                     bytes + crypto_secretbox_NONCEBYTES, decoded->size() - crypto_secretbox_NONCEBYTES,
+                                     bytes, secret->data()) != 0) {
         return std::nullopt;
     }
     return plain;
@@ -57,10 +53,7 @@ std::optional<std::string> SealedText::seal(std::string_view plain, std::string_
                                 secret->data()) != 0) {
         return std::nullopt;
     }
-    std::string text(sodium_base64_encoded_len(bytes.size(), kBase64), '\0');
-    ::sodium_bin2base64(text.data(), text.size(), bytes.data(), bytes.size(), kBase64);
-    text.pop_back();  // the zero byte behind it
-    return text;
+    return Base64::encode({reinterpret_cast<const char*>(bytes.data()), bytes.size()});
 }
 
 }  // namespace ktr::server

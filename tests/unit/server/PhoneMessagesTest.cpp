@@ -52,6 +52,18 @@ TEST_F(PhoneMessagesTest, OwnTracksOtherTypes_SayThatThePhoneLives) {
     EXPECT_EQ(PhoneMessages::ownTracks(""), Report::alive()) << "a friend was deleted in the app";
 }
 
+TEST_F(PhoneMessagesTest, OwnTracksCard_BringsAFaceAndNoName) {
+    const Report report =
+        PhoneMessages::ownTracks(R"({"_type":"card","tid":"an","name":"Somebody else","face":"QUJD"})");
+    EXPECT_EQ(report.kind, Kind::Alive);
+    EXPECT_EQ(report.face, "ABC");
+    for (const char* face : {"null", "7", R"("QUJ")", R"("QU JD")"}) {
+        EXPECT_EQ(PhoneMessages::ownTracks(std::string(R"({"_type":"card","face":)") + face + "}"), Report::alive());
+    }
+    EXPECT_EQ(PhoneMessages::ownTracks(R"({"_type":"location","lat":1,"lon":2,"tst":3,"face":"QUJD"})").face,
+              std::nullopt);
+}
+
 TEST_F(PhoneMessagesTest, WhatIsNoMessage_IsJunk) {
     for (const char* body : {"[]", "null", "{", "{}", R"({"_type":7})", R"({"_type":"location"})",
                              R"({"_type":"location","lat":"50","lon":1,"tst":2})", "\xFF", R"({"_type":"encrypted"})",
