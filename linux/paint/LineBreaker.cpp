@@ -7,6 +7,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include "linux/paint/JapanesePhrases.h"
+
 // The shaper's unit is a 64th of a pixel, so that lengths beyond some hundred thousand points would overflow when they
 // are added up; no line is wider than kWidest, and no picture either.
 
@@ -47,6 +49,7 @@ double finite(double value) {
 
 LineBreaker::LineBreaker(const PreparedText& text, const platform::TextContainer& container, const FontChoice& fonts)
     : text_(text),
+      letters_(text.text),
       container_(container),
       stretches_(fonts.stretches(text.text)),
       endless_(!(container.width < kWidest)),
@@ -64,10 +67,10 @@ BrokenText LineBreaker::run() {
 }
 
 qsizetype LineBreaker::wholeCharacter(qsizetype position) const {
-    if (position >= text_.text.size()) {
-        return text_.text.size();
+    if (position >= letters_.size()) {
+        return letters_.size();
     }
-    return position > 0 && text_.text[position].isLowSurrogate() ? position + 1 : position;
+    return position > 0 && letters_[position].isLowSurrogate() ? position + 1 : position;
 }
 
 qsizetype LineBreaker::unitsFor(double points) const {
@@ -80,13 +83,13 @@ qsizetype LineBreaker::unitsFor(double points) const {
 }
 
 qsizetype LineBreaker::lineEndFrom(qsizetype from) const {
-    const qsizetype end = text_.text.indexOf(QChar(QChar::LineSeparator), from);
-    return end < 0 ? text_.text.size() : end;
+    const qsizetype end = letters_.indexOf(QChar(QChar::LineSeparator), from);
+    return end < 0 ? letters_.size() : end;
 }
 
 ShapeRecipe LineBreaker::recipe(qsizetype from, qsizetype to, const QString& tail, bool wrap) const {
     ShapeRecipe made;
-    made.text = text_.text.mid(from, to - from) + tail;
+    made.text = letters_.mid(from, to - from) + tail;
     made.wrap = wrap;
     made.wrapAnywhere = wrap && hasEndlessWord(made.text);
     const auto& first = text_.runAt(from);
@@ -157,7 +160,7 @@ BrokenText::Piece LineBreaker::piece(Shaped shaped, qsizetype from, int lines) c
 
 LineBreaker::Metrics LineBreaker::metricsOf(qsizetype from, qsizetype to) const {
     // The empty line behind a line end is the last run's.
-    from = std::min(from, text_.text.size() - 1);
+    from = std::min(from, letters_.size() - 1);
     Metrics metrics;
     for (const auto& run : text_.runs) {
         const bool touches = run.start < std::max(to, from + 1) && run.start + run.length > from;
@@ -233,16 +236,31 @@ std::pair<double, double> LineBreaker::overhang(const QTextLine& line, const Met
 
 bool LineBreaker::breaksAWordThatFits(QTextLine& line, const Span& span) const {
     const qsizetype end = line.textStart() + line.textLength();
-    QTextBoundaryFinder words(QTextBoundaryFinder::Line, text_.text);
+    QTextBoundaryFinder words(QTextBoundaryFinder::Line, letters_);
     words.setPosition(end);
-    if (end >= text_.text.size() || words.isAtBoundary()) {
+    if (end >= letters_.size() || words.isAtBoundary()) {
         return false;
     }
     const qsizetype next = words.toNextBoundary();
-    line.setLineWidth((width_ - 2.0 * container_.lineFragmentPadding + kFit) / scale_);
-    const bool fits = line.textStart() + line.textLength() >= (next < 0 ? text_.text.size() : next);
-    line.setLineWidth((span.width + kFit) / scale_);
+    fill(line, width_ - 2.0 * container_.lineFragmentPadding);
+    const bool fits = line.textStart() + line.textLength() >= (next < 0 ? letters_.size() : next);
+    fill(line, span.width);
     return fits;
+}
+
+void LineBreaker::fill(QTextLine& line, double room) const {
+    // What may not begin a line takes the letter before it along; a line of nothing else is left as it is.
+    constexpr int kMost = 8;
+    const double whole = (room + kFit) / scale_;
+    line.setLineWidth(whole);
+    for (int round = 0; JapanesePhrases::isBoundToBefore(letters_, line.textStart() + line.textLength()); ++round) {
+        const int length = line.textLength();
+        line.setLineWidth(line.naturalTextWidth() - kFit / scale_);
+        if (line.textLength() >= length || round == kMost) {
+            line.setLineWidth(whole);
+            return;
+        }
+    }
 }
 
 void LineBreaker::placeLine(QTextLine& line, double& y, bool grow, Placed& placed) const {
@@ -250,7 +268,7 @@ void LineBreaker::placeLine(QTextLine& line, double& y, bool grow, Placed& place
     // Each round either keeps the line or moves it below an exclusion or makes it higher, so that few are needed.
     for (std::size_t round = 0; round <= container_.exclusionPaths.size() * 2 + 2; ++round) {
         const Span span = spanAt(y, metrics.height);
-        line.setLineWidth((span.width + kFit) / scale_);
+        fill(line, span.width);
         const double width = line.naturalTextWidth() * scale_;
         placed = {span, width, y, metrics, line.textStart(), line.textLength()};
         if (span.below && (width > span.width + kFit || breaksAWordThatFits(line, span))) {
@@ -303,8 +321,20 @@ LineBreaker::Broken LineBreaker::breakLines(qsizetype shaped, bool grow) const {
     return broken;
 }
 
+bool LineBreaker::loosen(const Broken& broken) {
+    constexpr QChar kWordJoiner(0x2060);
+    bool loosened = false;
+    for (const Placed& line : broken.lines) {
+        const qsizetype end = line.start + line.length;
+        if (end > 0 && end < letters_.size() && (letters_[end] == kWordJoiner || letters_[end - 1] == kWordJoiner)) {
+            loosened = JapanesePhrases::loosen(letters_, end) || loosened;
+        }
+    }
+    return loosened;
+}
+
 BrokenText LineBreaker::runLines() {
-    const qsizetype whole = text_.text.size();
+    const qsizetype whole = letters_.size();
     qsizetype shaped = whole;
     if (container_.maximumLines > 0) {
         shaped = std::min(whole, unitsFor(width_ * (container_.maximumLines + 1)));
@@ -313,6 +343,9 @@ BrokenText LineBreaker::runLines() {
         Broken broken = breakLines(shaped, false);
         if (!broken.overflows && shaped < whole) {
             shaped = wholeCharacter(std::min(whole, shaped * 2));
+            continue;
+        }
+        if (loosen(broken)) {
             continue;
         }
         if (broken.lines.size() > 1 && broken.tall) {
@@ -356,7 +389,7 @@ BrokenText LineBreaker::finish(Broken broken) {
 }
 
 BrokenText LineBreaker::runOneLine() {
-    const qsizetype whole = text_.text.size();
+    const qsizetype whole = letters_.size();
     const qsizetype end = lineEndFrom(0);
     double y = 0.0;
     Metrics metrics = metricsOf(0, end);
@@ -398,32 +431,11 @@ LineBreaker::Shaped LineBreaker::shapeLine(qsizetype from, qsizetype to, const Q
     return shaped;
 }
 
-QString LineBreaker::ellipsisAfter(qsizetype from, qsizetype end) const {
-    QString tail(QChar(0x2026));
-    // At the end of right-to-left text the ellipsis goes to the left of it, whatever the line's own direction is, and
-    // the other way round: a mark of that direction behind it takes it there.
-    for (qsizetype i = end; i-- > from;) {
-        char32_t c = text_.text[i].unicode();
-        if (text_.text[i].isLowSurrogate() && i > from) {
-            --i;
-            c = QChar::surrogateToUcs4(text_.text[i], text_.text[i + 1]);
-        }
-        const QChar::Direction direction = QChar::direction(c);
-        if (direction == QChar::DirR || direction == QChar::DirAL) {
-            return tail + QChar(0x200F);
-        }
-        if (direction == QChar::DirL || direction == QChar::DirEN || direction == QChar::DirAN) {
-            return tail + QChar(0x200E);
-        }
-    }
-    return tail;
-}
-
 LineBreaker::Shaped LineBreaker::cutLine(qsizetype from, qsizetype to, double room) const {
     const qsizetype ahead = std::min(to, wholeCharacter(from + unitsFor(room)));
     // Where the text may be cut: between graphemes, longest first piece last.
     std::vector<qsizetype> cuts = {from};
-    const QString piece = text_.text.mid(from, ahead - from);
+    const QString piece = letters_.mid(from, ahead - from);
     QTextBoundaryFinder finder(QTextBoundaryFinder::Grapheme, piece);
     for (qsizetype at = finder.toNextBoundary(); at > 0; at = finder.toNextBoundary()) {
         cuts.push_back(from + at);
@@ -431,10 +443,10 @@ LineBreaker::Shaped LineBreaker::cutLine(qsizetype from, qsizetype to, double ro
     Shaped best;
     const auto fits = [&](std::size_t index) {
         qsizetype end = cuts[index];
-        while (end > from && text_.text[end - 1].isSpace()) {
+        while (end > from && letters_[end - 1].isSpace()) {
             --end;
         }
-        Shaped cut = shapeLine(from, end, ellipsisAfter(from, end));
+        Shaped cut = shapeLine(from, end, text_.ellipsisAfter(from, end));
         if (cut.width > room + kFit) {
             return false;
         }

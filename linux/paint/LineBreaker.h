@@ -63,6 +63,10 @@ class LineBreaker {
     BrokenText runLines();
     Broken breakLines(qsizetype shaped, bool grow) const;
     void placeLine(QTextLine& line, double& y, bool grow, Placed& placed) const;
+    /// Whether a phrase that no line holds may be broken between its words now, so that it is worth breaking again.
+    bool loosen(const Broken& broken);
+    /// Sets the line in this room, points.
+    void fill(QTextLine& line, double room) const;
     BrokenText finish(Broken broken);
 
     /// How [from, to) with `tail` after it is shaped.
@@ -75,7 +79,6 @@ class LineBreaker {
     Shaped cutLine(qsizetype from, qsizetype to, double room) const;
     /// The cut that is likely to fit, from one shaping of the uncut text.
     std::size_t estimateCut(const std::vector<qsizetype>& cuts, qsizetype from, qsizetype to, double room) const;
-    QString ellipsisAfter(qsizetype from, qsizetype end) const;
 
     Span spanAt(double y, double height) const;
     /// The line, set in this span, ends within a word that a line without exclusions would hold.
@@ -91,6 +94,8 @@ class LineBreaker {
     int pixelSize(const platform::Font& font) const;
 
     const PreparedText& text_;
+    /// The text; phrases that no line holds have their words parted in it.
+    QString letters_;
     const platform::TextContainer& container_;
     std::vector<FontChoice::Stretch> stretches_;
     bool endless_;

@@ -130,4 +130,25 @@ bool PreparedText::isRightToLeft(qsizetype from, qsizetype to, bool otherwise) c
     return otherwise;
 }
 
+QString PreparedText::ellipsisAfter(qsizetype from, qsizetype end) const {
+    QString tail(QChar(0x2026));
+    // At the end of right-to-left text the ellipsis goes to the left of it, whatever the line's own direction is, and
+    // the other way round: a mark of that direction behind it takes it there.
+    for (qsizetype i = end; i-- > from;) {
+        char32_t c = text[i].unicode();
+        if (text[i].isLowSurrogate() && i > from) {
+            --i;
+            c = QChar::surrogateToUcs4(text[i], text[i + 1]);
+        }
+        const QChar::Direction direction = QChar::direction(c);
+        if (direction == QChar::DirR || direction == QChar::DirAL) {
+            return tail + QChar(0x200F);
+        }
+        if (direction == QChar::DirL || direction == QChar::DirEN || direction == QChar::DirAN) {
+            return tail + QChar(0x200E);
+        }
+    }
+    return tail;
+}
+
 }  // namespace ktr::linux_

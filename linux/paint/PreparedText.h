@@ -37,6 +37,8 @@ struct PreparedText {
     const Run& runAt(qsizetype position) const;
     /// The direction of the first strong character in [from, to) outside isolates, or the given one without any.
     bool isRightToLeft(qsizetype from, qsizetype to, bool otherwise) const;
+    /// The ellipsis for a text that is cut to [from, end), with what takes it to the side where its last letters end.
+    QString ellipsisAfter(qsizetype from, qsizetype end) const;
 
     QString text;
     std::vector<Run> runs;

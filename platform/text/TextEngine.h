@@ -58,7 +58,7 @@ class KTR_API TextEngine {
     /// wider than the room beside an exclusion stands below it when it fits there, and else breaks between graphemes.
     /// Line boxes are as high as `Font::lineHeight` says; of several fonts in a line the highest; a line of wrapped
     /// text may be higher when its glyphs need it. A width that falls short of what was measured by less than 0.01
-    /// points still fits.
+    /// points still fits. A mark that begins no line of Chinese or Japanese takes the letter before it along.
     virtual std::shared_ptr<const TextLayout> layOut(const AttributedString& text, const TextContainer& container) = 0;
     /// A picture of a text that this engine laid out, of a size in points. An engine that rasters does so here, at
     /// `scale` pixels a point, so that painting the picture at that scale costs little; the base keeps the text alone.

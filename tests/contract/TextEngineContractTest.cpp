@@ -1,5 +1,7 @@
 #include <gmock/gmock.h>
 
+#include <cmath>
+
 #include "platform/text/TextImage.h"
 #include "tests/contract/TextEngineContract.h"
 #include "tests/support/FixedTextEngine.h"
@@ -131,6 +133,30 @@ TEST_P(TextEngineContract, WordWiderThanTheLine_BreaksAnywhere) {
     for (const auto& line : layout->lines()) {
         EXPECT_LE(line.box.width, 100 + kFit);
     }
+}
+
+TEST_P(TextEngineContract, NoLineBeginsWithAMarkOfJapanese) {
+    // Each letter is an em wide, so that the lines' widths say where they begin.
+    const std::u32string letters = U"見守っています。コーヒーショップの「ピアー」にちょっと寄りました、待って！";
+    const std::string text = "見守っています。コーヒーショップの「ピアー」にちょっと寄りました、待って！";
+    const double em = body().size;
+    for (double room = 3.0; room < 16.0; room += 0.5) {
+        const auto layout = layOut(text, wrapped(room * em));
+        std::size_t begin = 0;
+        for (const auto& line : layout->lines()) {
+            ASSERT_LT(begin, letters.size()) << room;
+            EXPECT_EQ(std::u32string(U"、。！」ーっゃょッョ").find(letters[begin]), std::u32string::npos)
+                << "at " << begin << ", " << room << " wide";
+            EXPECT_LE(line.box.width, room * em + kFit);
+            begin += static_cast<std::size_t>(std::lround(line.box.width / em));
+        }
+        EXPECT_EQ(begin, letters.size()) << room;
+    }
+}
+
+TEST_P(TextEngineContract, LineOfMarksAlone_IsFilled) {
+    const auto layout = layOut("あーーーーーーーーーーーーーーーーーーー", wrapped(10.0 * body().size));
+    EXPECT_EQ(layout->lines().size(), 2U);
 }
 
 TEST_P(TextEngineContract, LineFeed_BeginsALine) {

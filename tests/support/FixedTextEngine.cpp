@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <optional>
+#include <string_view>
 
 #include "platform/base/Utf8.h"
 
@@ -32,6 +33,13 @@ class FixedLayout : public TextLayout {
 };
 
 constexpr char32_t kSoftHyphen = 0xAD;
+
+/// What begins no line of Chinese or Japanese.
+bool isBoundToBefore(char32_t code) {
+    return code != 0 &&
+           std::u32string_view(U"、。，．！？：」』）〕】ー々ぁぃぅぇぉっゃゅょァィゥェォッャュョ").find(code) !=
+               std::u32string_view::npos;
+}
 
 std::vector<Glyph> glyphsOf(const AttributedString& text, const TextContainer& container) {
     std::vector<Glyph> glyphs;
@@ -118,7 +126,14 @@ Break breakAt(const std::vector<Glyph>& glyphs, std::size_t begin, double room) 
             if (lastBlank > begin) {
                 return {lastBlank, lastBlank + 1, false, false};
             }
-            return {std::max(i, begin + 1), std::max(i, begin + 1), false, true};
+            const std::size_t whole = std::max(i, begin + 1);
+            std::size_t end = whole;
+            while (end > begin + 1 && isBoundToBefore(glyphs[end].code)) {
+                --end;
+            }
+            // A line of such marks alone is filled.
+            end = isBoundToBefore(glyphs[end].code) ? whole : end;
+            return {end, end, false, true};
         }
     }
     return {glyphs.size(), glyphs.size(), false, false};
