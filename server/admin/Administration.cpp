@@ -43,7 +43,8 @@ std::string wordsOf(const Grant& grant) {
 
 std::string Administration::open() {
     std::string complaint;
-    store_ = Store::open(folder_, false, complaint);
+    const auto settings = ServiceSettings::read(folder_, complaint);
+    store_ = settings ? Store::open(settings->storeAddress(folder_), false, complaint) : nullptr;
     return store_ ? "" : complaint + " (is there a service? ktr-service init makes one)";
 }
 
@@ -55,19 +56,25 @@ std::optional<Person> Administration::person(const std::string& name, std::strin
     return found;
 }
 
-std::string Administration::init(const std::string& host, int port) {
+std::string Administration::init(const std::string& host, int port, const std::string& store) {
     if (!ServiceSettings::isHost(host)) {
         return "--host: expected a host name or an address, found " + documents::inQuotes(host);
     }
-    std::string complaint;
+    if (!store.empty() && !StoreAddress::isServer(store)) {
+        return "--store: expected an address such as postgresql:///ktr, found " + documents::inQuotes(store);
+    }
     if (std::filesystem::exists(folder_ + "/settings.json")) {
         return folder_ + ": there is a service already";
     }
-    store_ = Store::open(folder_, true, complaint);
+    std::string complaint = documents::AtomicFile::makeFolder(folder_);
+    if (!complaint.empty()) {
+        return complaint;
+    }
+    const ServiceSettings settings{host, port, store};
+    store_ = Store::open(settings.storeAddress(folder_), true, complaint);
     if (!store_) {
         return complaint;
     }
-    const ServiceSettings settings{host, port};
     const auto authority = CertificateAuthority::make("ktr-service", settings.constraint(), kAuthorityDays);
     complaint = authority ? authority->write(folder_) : "the certificate authority cannot be made";
     if (complaint.empty()) {
@@ -238,7 +245,7 @@ std::string Administration::check() {
         return complaint;
     }
     if (const std::string broken = store_->check(); !broken.empty()) {
-        return folder_ + "/service.db: is damaged: " + broken;
+        return "the store is damaged: " + broken;
     }
     const auto settings = ServiceSettings::read(folder_, complaint);
     if (!settings) {

@@ -18,7 +18,8 @@ class Administration {
     Administration(std::string folder, std::int64_t now, std::ostream& out)
         : folder_(std::move(folder)), now_(now), out_(out) {}
 
-    std::string init(const std::string& host, int port);
+    /// `store`: the address of a PostgreSQL server; empty: a file in the folder.
+    std::string init(const std::string& host, int port, const std::string& store);
     /// A person with a phone: what to type into its app, with the secret that is shown once.
     std::string add(const std::string& name, const std::vector<std::string>& handles, const std::string& key);
     /// A configuration with which ktr asks for this person, with the secret that is shown once.

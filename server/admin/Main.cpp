@@ -25,7 +25,7 @@ int main(int count, char** words) {
     program.require_subcommand(1);
     std::string folder = defaultFolder();
     program.add_option("--data", folder, "Folder of the service (" + folder + ")")->type_name("FOLDER");
-    std::string name, other, host, precision = "exact", until, key, token = "ktr-token";
+    std::string name, other, host, store, precision = "exact", until, key, token = "ktr-token";
     std::vector<std::string> handles;
     int port = 8443;
     const auto named = [&](CLI::App* command) {
@@ -35,6 +35,7 @@ int main(int count, char** words) {
     CLI::App* init = program.add_subcommand("init", "Makes a service");
     init->add_option("--host", host, "Name or address under which phones reach it")->required();
     init->add_option("--port", port, "Its port (8443)")->check(CLI::Range(0, 65535));
+    init->add_option("--store", store, "Keep all on a PostgreSQL server (postgresql:///ktr) instead of in a file");
     CLI::App* add = named(program.add_subcommand("add", "Adds a person with a phone"));
     add->add_option("--handle", handles, "E-mail address or phone number by which friends ask")
         ->allow_extra_args(false);
@@ -65,7 +66,7 @@ int main(int count, char** words) {
     const auto now =
         std::chrono::duration_cast<std::chrono::seconds>(std::chrono::system_clock::now().time_since_epoch()).count();
     ktr::server::Administration administration(folder, now, std::cout);
-    const std::string complaint = *init      ? administration.init(host, port)
+    const std::string complaint = *init      ? administration.init(host, port, store)
                                   : *add     ? administration.add(name, handles, key)
                                   : *reader  ? administration.reader(name, token)
                                   : *friend_ ? administration.befriend(name, other)

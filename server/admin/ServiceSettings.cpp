@@ -50,6 +50,10 @@ std::optional<ServiceSettings> ServiceSettings::read(const std::string& folder, 
         if (!isHost(settings.host)) {
             fields.complain("host", "expected a host name or an address");
         }
+        settings.store = fields.text("store").value_or("");
+        if (!settings.store.empty() && !StoreAddress::isServer(settings.store)) {
+            fields.complain("store", "expected an address such as postgresql:///ktr");
+        }
     };
     const auto error = documents::DocumentReader::readFile(fileOf(folder), {kLargest, refusal}, read, nullptr);
     if (error) {
@@ -60,8 +64,15 @@ std::optional<ServiceSettings> ServiceSettings::read(const std::string& folder, 
 }
 
 std::string ServiceSettings::write(const std::string& folder) const {
-    return documents::AtomicFile::write(
-        fileOf(folder), platform::writeJson(platform::Dictionary{{"host", host}, {"port", port}}) + "\n", 0600);
+    platform::Dictionary fields{{"host", host}, {"port", port}};
+    if (!store.empty()) {
+        fields.set("store", store);
+    }
+    return documents::AtomicFile::write(fileOf(folder), platform::writeJson(fields) + "\n", 0600);
+}
+
+StoreAddress ServiceSettings::storeAddress(const std::string& folder) const {
+    return {store.empty() ? folder : store};
 }
 
 std::string ServiceSettings::origin() const {

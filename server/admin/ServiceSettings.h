@@ -3,12 +3,15 @@
 #include <optional>
 #include <string>
 
+#include "server/store/StoreAddress.h"
+
 namespace ktr::server {
 
-/// Under which name and port phones reach the service: "settings.json" in its folder. A value.
+/// Under which name and port phones reach the service, and where its store is: "settings.json" in its folder. A value.
 struct ServiceSettings {
     std::string host;
     int port = 8443;
+    std::string store;  ///< "postgresql://…"; empty: a file in the folder
 
     /// None, with a sentence in `complaint`, when there is none or it is wrong.
     static std::optional<ServiceSettings> read(const std::string& folder, std::string& complaint);
@@ -16,6 +19,7 @@ struct ServiceSettings {
     std::string write(const std::string& folder) const;
     /// A host name or an address, of letters that a certificate takes.
     static bool isHost(const std::string& text);
+    StoreAddress storeAddress(const std::string& folder) const;
     std::string origin() const;
     /// How a certificate names the host, and how an authority is bound to it.
     std::string alternativeName() const;

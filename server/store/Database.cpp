@@ -1,163 +1,88 @@
 #include "server/store/Database.h"
 
-#include <fcntl.h>
-#include <sqlite3.h>
-#include <unistd.h>
-
-#include <cerrno>
-#include <cstring>
+#include "platform/base/Utf8.h"
 
 namespace ktr::server {
 
-namespace {
+using Type = DatabaseValue::Type;
 
-/// How long another process that writes is waited for, milliseconds.
-constexpr int kPatience = 5000;
-
-}  // namespace
-
-std::unique_ptr<Database> Database::open(const std::string& file, std::string& complaint) {
-    // Made here, so that nobody else can read it from its first moment on.
-    const int descriptor = ::open(file.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NONBLOCK, 0600);
-    if (descriptor < 0) {
-        complaint = file + ": " + std::strerror(errno);
-        return nullptr;
-    }
-    ::close(descriptor);
-    sqlite3* handle = nullptr;
-    const int result = ::sqlite3_open_v2(file.c_str(), &handle, SQLITE_OPEN_READWRITE | SQLITE_OPEN_NOMUTEX, nullptr);
-    std::unique_ptr<Database> database(new Database(handle));
-    if (result != SQLITE_OK) {
-        complaint = file + ": " + ::sqlite3_errstr(result);
-        return nullptr;
-    }
-    ::sqlite3_busy_timeout(handle, kPatience);
-    // An answer follows its commit, and the commit is on the disk. What is deleted is overwritten.
-    if (!database->execute("PRAGMA journal_mode=WAL; PRAGMA synchronous=FULL; PRAGMA foreign_keys=ON;"
-                           "PRAGMA secure_delete=ON; PRAGMA journal_size_limit=67108864; PRAGMA trusted_schema=OFF;")) {
-        complaint = file + ": " + database->complaint();
-        return nullptr;
-    }
-    return database;
-}
-
-Database::~Database() {
-    for (const auto& [sql, statement] : statements_) {
-        ::sqlite3_finalize(statement);
-    }
-    ::sqlite3_close(handle_);
-}
-
-void Database::note() {
+void Database::note(std::string complaint) {
     if (complaint_.empty()) {
-        complaint_ = ::sqlite3_errmsg(handle_);
+        complaint_ = complaint.empty() ? "failed for an unknown reason" : std::move(complaint);
     }
 }
 
-bool Database::execute(const char* sql) {
-    if (::sqlite3_exec(handle_, sql, nullptr, nullptr, nullptr) != SQLITE_OK) {
-        note();
+std::string Database::translated(std::string_view sql) const {
+    std::string text;
+    for (std::size_t at = 0; at < sql.size();) {
+        const std::size_t open = sql.find('{', at);
+        const std::size_t close = open == std::string_view::npos ? open : sql.find('}', open);
+        if (close == std::string_view::npos) {
+            return text.append(sql.substr(at));
+        }
+        text.append(sql.substr(at, open - at)).append(inDialect(sql.substr(open + 1, close - open - 1)));
+        at = close + 1;
     }
-    return !failed();
+    return text;
 }
 
-int Database::changes() const {
-    return ::sqlite3_changes(handle_);
-}
-
-Database::Run Database::statement(const char* sql) {
-    sqlite3_stmt*& statement = statements_[sql];
-    if (statement == nullptr &&
-        ::sqlite3_prepare_v3(handle_, sql, -1, SQLITE_PREPARE_PERSISTENT, &statement, nullptr) != SQLITE_OK) {
-        note();
-    }
-    return Run(statement, *this);
-}
-
-Database::Run::~Run() {
-    if (statement_ != nullptr) {
-        ::sqlite3_reset(statement_);
-        ::sqlite3_clear_bindings(statement_);
-    }
+Database::Run& Database::Run::bind(DatabaseValue value) {
+    values_.push_back(std::move(value));
+    return *this;
 }
 
 Database::Run& Database::Run::bind(std::int64_t value) {
-    ::sqlite3_bind_int64(statement_, ++bound_, value);
-    return *this;
+    return bind(DatabaseValue::of(value));
 }
 
 Database::Run& Database::Run::bind(double value) {
-    ::sqlite3_bind_double(statement_, ++bound_, value);
-    return *this;
+    return bind(DatabaseValue::of(value));
 }
 
 Database::Run& Database::Run::bind(std::string_view text) {
-    ::sqlite3_bind_text(statement_, ++bound_, text.data(), static_cast<int>(text.size()), SQLITE_TRANSIENT);
-    return *this;
+    if (text.find('\0') != std::string_view::npos || !platform::isValidUtf8(text)) {
+        database_.note("a text is no UTF-8");
+    }
+    return bind(DatabaseValue::of(Type::Text, std::string(text)));
 }
 
 Database::Run& Database::Run::bindBytes(std::string_view bytes) {
-    ::sqlite3_bind_blob(statement_, ++bound_, bytes.data(), static_cast<int>(bytes.size()), SQLITE_TRANSIENT);
-    return *this;
+    return bind(DatabaseValue::of(Type::Bytes, std::string(bytes)));
 }
 
 Database::Run& Database::Run::bind(const std::optional<std::int64_t>& value) {
-    if (value) {
-        return bind(*value);
-    }
-    ::sqlite3_bind_null(statement_, ++bound_);
-    return *this;
+    return bind(value ? DatabaseValue::of(*value) : DatabaseValue::none(Type::Integer));
 }
 
 Database::Run& Database::Run::bind(const std::optional<double>& value) {
-    if (value) {
-        return bind(*value);
-    }
-    ::sqlite3_bind_null(statement_, ++bound_);
-    return *this;
+    return bind(value ? DatabaseValue::of(*value) : DatabaseValue::none(Type::Real));
 }
 
 bool Database::Run::next() {
-    if (statement_ == nullptr || database_.failed()) {
-        return false;
+    if (!rows_ && !database_.failed()) {
+        rows_ = database_.query(sql_, values_);
     }
-    const int result = ::sqlite3_step(statement_);
-    if (result != SQLITE_ROW && result != SQLITE_DONE) {
-        database_.note();
-    }
-    return result == SQLITE_ROW;
+    return rows_ && !database_.failed() && rows_->next();
 }
 
 bool Database::Run::run() {
-    while (next()) {
+    if (rows_) {
+        while (next()) {
+        }
+    } else if (!database_.failed()) {
+        database_.perform(sql_, values_);
     }
     return !database_.failed();
 }
 
-bool Database::Run::isNull(int column) const {
-    return ::sqlite3_column_type(statement_, column) == SQLITE_NULL;
-}
-
-std::int64_t Database::Run::integer(int column) const {
-    return ::sqlite3_column_int64(statement_, column);
-}
-
-double Database::Run::real(int column) const {
-    return ::sqlite3_column_double(statement_, column);
-}
-
-std::string Database::Run::text(int column) const {
-    const auto* bytes = static_cast<const char*>(::sqlite3_column_blob(statement_, column));
-    const int size = ::sqlite3_column_bytes(statement_, column);
-    return bytes == nullptr ? std::string() : std::string(bytes, static_cast<std::size_t>(size));
-}
-
 std::optional<std::int64_t> Database::Run::maybeInteger(int column) const {
-    return isNull(column) ? std::nullopt : std::optional(integer(column));
+    const DatabaseValue found = value(column);
+    return found.isNone ? std::nullopt : std::optional(found.integer);
 }
 
 std::optional<double> Database::Run::maybeReal(int column) const {
-    return isNull(column) ? std::nullopt : std::optional(real(column));
+    const DatabaseValue found = value(column);
+    return found.isNone ? std::nullopt : std::optional(found.real);
 }
 
 }  // namespace ktr::server

@@ -5,74 +5,118 @@
 #include <optional>
 #include <string>
 #include <string_view>
-#include <unordered_map>
+#include <vector>
 
-struct sqlite3;
-struct sqlite3_stmt;
+#include "server/store/DatabaseValue.h"
 
 namespace ktr::server {
 
-/// A connection to an SQLite database. Its statements are prepared once. Errors stay: after the first one, `failed` is
-/// true and everything fails, until `clear`. One thread at a time.
+/// A connection to a database: SQLite or PostgreSQL. Errors stay: after the first one, `failed` is true and everything
+/// fails, until `clear`. One thread at a time.
+///
+/// Statements are written once for both. Parameters are "$1", "$2", …, bound in that order. What the two call
+/// differently stands in braces: {integer} {real} {text} {bytes} for types of columns, {no bytes} for none of
+/// them, {strict} and {strict by key} at
+/// the end of a table (the second: kept in the order of its primary key), {random bytes} for 16 of them, {shared lock}
+/// at the end of a query that decides what a write in the same transaction may do. Beyond that: no reserved words of
+/// either ("grant"), no scalar max(a, b), no booleans, a conflict target before DO UPDATE, WHERE before ON CONFLICT in
+/// INSERT … SELECT.
 class Database {
   public:
+    /// Rows that a statement gives, and its values.
+    class Rows {
+      public:
+        virtual ~Rows() = default;
+        /// True for as long as there is a row.
+        virtual bool next() = 0;
+        virtual int columns() const = 0;
+        virtual std::string nameOf(int column) const = 0;
+        virtual DatabaseValue value(int column) const = 0;
+    };
+
     /// One run of a statement. Values are bound in their order; columns are read by their index.
     class Run {
       public:
-        explicit Run(sqlite3_stmt* statement, Database& database) : statement_(statement), database_(database) {}
-        ~Run();
+        Run(const char* sql, Database& database) : sql_(sql), database_(database) {}
         Run(const Run&) = delete;
         Run& operator=(const Run&) = delete;
 
         Run& bind(std::int64_t value);
         Run& bind(double value);
+        /// Text is UTF-8 without zeros: anything else fails here, since one of the databases would refuse it.
         Run& bind(std::string_view text);
         Run& bindBytes(std::string_view bytes);
         Run& bind(const std::optional<std::int64_t>& value);
         Run& bind(const std::optional<double>& value);
+        Run& bind(DatabaseValue value);
         /// True for as long as there is a row.
         bool next();
-        /// Runs it to its end; false when that failed.
+        /// Runs it to its end; false when that failed. In a transaction the failure may be known later only: with the
+        /// next row that is read, `changes`, or `commit`.
         bool run();
 
-        std::int64_t integer(int column) const;
-        double real(int column) const;
-        std::string text(int column) const;
+        std::int64_t integer(int column) const { return value(column).integer; }
+        double real(int column) const { return value(column).real; }
+        std::string text(int column) const { return value(column).text; }
         std::optional<std::int64_t> maybeInteger(int column) const;
         std::optional<double> maybeReal(int column) const;
+        DatabaseValue value(int column) const { return rows_->value(column); }
+        int columns() const { return rows_->columns(); }
+        std::string nameOf(int column) const { return rows_->nameOf(column); }
 
       private:
-        bool isNull(int column) const;
-
-        sqlite3_stmt* statement_;
+        const char* sql_;
         Database& database_;
-        int bound_ = 0;
+        std::vector<DatabaseValue> values_;
+        std::unique_ptr<Rows> rows_;
     };
 
-    /// Opens the file, and makes it (mode 0600) when it is missing. None, with the reason in `complaint`, when that
-    /// fails.
-    static std::unique_ptr<Database> open(const std::string& file, std::string& complaint);
-    ~Database();
+    virtual ~Database() = default;
     Database(const Database&) = delete;
     Database& operator=(const Database&) = delete;
 
-    /// `sql` is a text that does not change: it is known by its address afterwards.
-    Run statement(const char* sql);
+    /// `sql` outlives the run.
+    Run statement(const char* sql) { return Run(sql, *this); }
     /// Several statements without values; false when one failed.
-    bool execute(const char* sql);
+    virtual bool execute(const std::string& sql) = 0;
+
+    /// Begins a transaction that will write. False: nothing can be written now, and no transaction is open.
+    virtual bool begin() = 0;
+    /// Waits until it is known what all statements did; false when one failed.
+    virtual bool settle() = 0;
+    /// False: nothing of the transaction was kept, unless the connection broke in that very moment. `rollback` follows.
+    virtual bool commit() = 0;
+    /// Also ends a failed transaction, and clears what failed.
+    virtual void rollback() = 0;
     /// Rows changed by the last statement.
-    int changes() const;
+    virtual int changes() = 0;
+    /// Before a read: clears what failed, and connects again where that is needed.
+    virtual void refresh() { clear(); }
+
+    /// The number of the last migration; 0 in an empty database; none, with a complaint, when it holds something else.
+    virtual std::optional<int> schema() = 0;
+    virtual void setSchema(int number) = 0;
+    /// In a transaction: lets no other process migrate at the same time.
+    virtual void lockSchema() = 0;
+    /// Whether what is kept is whole and safe: empty, or what is wrong with it.
+    virtual std::string check() = 0;
 
     bool failed() const { return !complaint_.empty(); }
     const std::string& complaint() const { return complaint_; }
     void clear() { complaint_.clear(); }
+    /// The first failure stays.
+    void note(std::string complaint);
+
+  protected:
+    Database() = default;
+    virtual std::unique_ptr<Rows> query(const char* sql, const std::vector<DatabaseValue>& values) = 0;
+    virtual void perform(const char* sql, const std::vector<DatabaseValue>& values) = 0;
+    /// What stands for a word in braces; empty for an unknown one.
+    virtual std::string_view inDialect(std::string_view word) const = 0;
+    /// With all words in braces replaced.
+    std::string translated(std::string_view sql) const;
 
   private:
-    explicit Database(sqlite3* handle) : handle_(handle) {}
-    void note();
-
-    sqlite3* handle_;
-    std::unordered_map<const char*, sqlite3_stmt*> statements_;
     std::string complaint_;
 };
 

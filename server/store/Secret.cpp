@@ -23,6 +23,14 @@ std::optional<std::string> Secret::make() {
     return secret;
 }
 
+std::int64_t Secret::number() {
+    std::uint64_t bits = 0;
+    if (RAND_bytes(reinterpret_cast<unsigned char*>(&bits), static_cast<int>(sizeof bits)) != 1) {
+        return 0;
+    }
+    return static_cast<std::int64_t>(bits >> 2) | 1;
+}
+
 std::string Secret::hash(std::string_view secret) {
     std::string hash(SHA256_DIGEST_LENGTH, '\0');
     SHA256(reinterpret_cast<const unsigned char*>(secret.data()), secret.size(),

@@ -16,21 +16,22 @@
 #include "server/ingest/Fix.h"
 #include "server/store/Database.h"
 #include "server/store/Records.h"
+#include "server/store/StoreAddress.h"
 
 namespace ktr::server {
 
-/// What the service remembers, in one SQLite file ("service.db" in its folder). One thread writes: it takes all that
-/// waits into one commit, and says so to those who wait when that commit is on the disk. Reads go beside it. Other
-/// processes (the administration) may use the same file at the same time. Any thread.
+/// What the service remembers, in one SQLite file ("service.db" in its folder) or on a PostgreSQL server. One thread
+/// writes: it takes all that waits into one commit, and says so to those who wait when that commit is on the disk; what
+/// one of them cannot do is not done, and refuses none of the others. Reads go beside it. Other processes (the
+/// administration; with a server, more of the same service) may use the same store at the same time. Any thread.
 class Store {
   public:
-    static constexpr int kSchema = 1;
     /// Whether what was written is on the disk. Called on the writing thread: it must not wait.
     using Done = std::function<void(bool)>;
 
-    /// None, with a sentence in `complaint`, when the file cannot be used, or a newer program has written it. `make`:
-    /// the store may be new.
-    static std::unique_ptr<Store> open(const std::string& folder, bool make, std::string& complaint);
+    /// None, with a sentence in `complaint`, when it cannot be used, or a newer program has written it. What an older
+    /// program has written is brought to today's form. `make`: the store may be new.
+    static std::unique_ptr<Store> open(const StoreAddress& address, bool make, std::string& complaint);
     /// Writes what waits.
     ~Store();
     Store(const Store&) = delete;
@@ -78,25 +79,43 @@ class Store {
     std::vector<std::pair<std::string, Grant>> grantsOf(std::int64_t owner);
     /// When one of a person's devices was last heard; none: never.
     std::optional<std::int64_t> lastHeard(std::int64_t person);
-    /// Whether the file is whole: empty, or what SQLite says of it.
+    /// Whether the store is whole: empty, or what is wrong with it.
     std::string check();
 
     static std::string normalisedHandle(std::string_view handle);
 
   private:
+    /// The connection that reads, for as long as this lives.
+    class Reading {
+      public:
+        explicit Reading(Store& store) : lock_(store.readMutex_), database_(*store.reading_) { database_.refresh(); }
+        Database* operator->() const { return &database_; }
+        Database& operator*() const { return database_; }
+
+      private:
+        const std::lock_guard<std::mutex> lock_;
+        Database& database_;
+    };
+    enum class Outcome {
+        Kept,
+        Refused,  ///< a statement failed
+        Broken,   ///< nothing can be written now
+    };
     struct Work {
         std::function<void(Database&)> write;
         Done done;
     };
 
     Store(std::unique_ptr<Database> reading, std::unique_ptr<Database> writing);
+    /// `work` runs on the writing thread, and once more, alone, when what was written together with it failed.
     void write(std::function<void(Database&)> work, Done done);
     /// Waits for the commit.
     bool writeNow(const std::function<void(Database&)>& work);
     void writeAll();
-    bool commit(const std::deque<Work>& batch);
+    Outcome commit(std::deque<Work>::const_iterator begin, std::deque<Work>::const_iterator end);
+    /// Of seven columns: hidden, shown_since, retention, exactness, since, until, the clock's latest.
     Sharing sharingOf(Database::Run& row, int firstColumn);
-    void readFixes(std::int64_t owner, Sharing& sharing);
+    void readFixes(Database& database, std::int64_t owner, Sharing& sharing);
 
     std::mutex readMutex_;
     std::unique_ptr<Database> reading_;

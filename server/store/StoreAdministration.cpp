@@ -6,46 +6,50 @@
 namespace ktr::server {
 
 bool Store::addPerson(const std::string& name, const std::vector<std::string>& handles, std::int64_t now) {
-    return writeNow([&](Database& database) {
-        std::int64_t person = 0;
-        {
-            auto row = database.statement("INSERT INTO person (name, retention, made) VALUES (?, ?, ?) RETURNING id");
-            row.bind(std::string_view(name)).bind(FixRules::kRetention).bind(now);
-            if (!row.next()) {
-                return;
-            }
-            person = row.integer(0);
-            row.run();
-        }
-        std::int64_t place = 0;
-        for (const std::string& handle : handles) {
-            database.statement("INSERT INTO handle VALUES (?, ?, ?, ?)")
-                .bind(std::string_view(normalisedHandle(handle)))
-                .bind(std::string_view(handle))
-                .bind(++place)
-                .bind(person)
-                .run();
-        }
-    });
+    const std::int64_t person = Secret::number();
+    return person != 0 && writeNow([&](Database& database) {
+               database.statement("INSERT INTO person (id, name, retention, made) VALUES ($1, $2, $3, $4)")
+                   .bind(person)
+                   .bind(name)
+                   .bind(FixRules::kRetention)
+                   .bind(now)
+                   .run();
+               std::int64_t place = 0;
+               for (const std::string& handle : handles) {
+                   database.statement("INSERT INTO handle (text, shown, place, person) VALUES ($1, $2, $3, $4)")
+                       .bind(normalisedHandle(handle))
+                       .bind(handle)
+                       .bind(++place)
+                       .bind(person)
+                       .run();
+               }
+           });
 }
 
 bool Store::addDevice(std::int64_t person, DeviceKind kind, std::string_view secret, std::string_view key,
                       std::int64_t now) {
-    return writeNow([&](Database& database) {
-        database.statement("INSERT INTO device (person, kind, secret, key, made) VALUES (?, ?, ?, ?, ?)")
-            .bind(person)
-            .bind(static_cast<std::int64_t>(kind))
-            .bindBytes(Secret::hash(secret))
-            .bind(key)
-            .bind(now)
-            .run();
-    });
+    const std::int64_t device = Secret::number();
+    return device != 0 && writeNow([&](Database& database) {
+               database
+                   .statement(
+                       "INSERT INTO device (id, person, kind, secret, key, made) VALUES ($1, $2, $3, $4, $5, $6)")
+                   .bind(device)
+                   .bind(person)
+                   .bind(static_cast<std::int64_t>(kind))
+                   .bindBytes(Secret::hash(secret))
+                   .bind(key)
+                   .bind(now)
+                   .run();
+           });
 }
 
 bool Store::grant(std::int64_t owner, std::int64_t viewer, const Grant& grant) {
     return writeNow([&](Database& database) {
         database
-            .statement("INSERT OR REPLACE INTO share (viewer, owner, exactness, since, until) VALUES (?, ?, ?, ?, ?)")
+            .statement(
+                "INSERT INTO share (viewer, owner, exactness, since, until) VALUES ($1, $2, $3, $4, $5) "
+                "ON CONFLICT (viewer, owner) DO UPDATE SET exactness = excluded.exactness, since = excluded.since, "
+                "until = excluded.until")
             .bind(viewer)
             .bind(owner)
             .bind(static_cast<std::int64_t>(grant.precision))
@@ -58,7 +62,7 @@ bool Store::grant(std::int64_t owner, std::int64_t viewer, const Grant& grant) {
 bool Store::revokeGrant(std::int64_t owner, std::int64_t viewer) {
     int ended = 0;
     const bool good = writeNow([&](Database& database) {
-        database.statement("DELETE FROM share WHERE viewer = ? AND owner = ?").bind(viewer).bind(owner).run();
+        database.statement("DELETE FROM share WHERE viewer = $1 AND owner = $2").bind(viewer).bind(owner).run();
         ended = database.changes();
     });
     return good && ended > 0;
@@ -67,7 +71,7 @@ bool Store::revokeGrant(std::int64_t owner, std::int64_t viewer) {
 int Store::revokeDevices(std::int64_t person, std::int64_t now) {
     int ended = 0;
     const bool good = writeNow([&](Database& database) {
-        database.statement("UPDATE device SET revoked = ? WHERE person = ? AND revoked IS NULL")
+        database.statement("UPDATE device SET revoked = $1 WHERE person = $2 AND revoked IS NULL")
             .bind(now)
             .bind(person)
             .run();
@@ -81,8 +85,8 @@ bool Store::setHidden(std::int64_t person, bool hidden, std::int64_t now) {
         // Showing twice changes nothing: what was seen in between stays.
         database
             .statement(
-                "UPDATE person SET shown_since = CASE WHEN hidden AND NOT ?2 THEN ?3 ELSE shown_since END, "
-                "hidden = ?2 WHERE id = ?1")
+                "UPDATE person SET shown_since = CASE WHEN hidden = 1 AND $2 = 0 THEN $3 ELSE shown_since END, "
+                "hidden = $2 WHERE id = $1")
             .bind(person)
             .bind(std::int64_t{hidden})
             .bind(now)
@@ -91,11 +95,10 @@ bool Store::setHidden(std::int64_t person, bool hidden, std::int64_t now) {
 }
 
 std::vector<std::pair<std::string, Grant>> Store::grantsOf(std::int64_t owner) {
-    const std::lock_guard<std::mutex> lock(readMutex_);
-    reading_->clear();
+    const Reading reading(*this);
     std::vector<std::pair<std::string, Grant>> grants;
-    auto row = reading_->statement(
-        "SELECT name, exactness, since, until FROM share JOIN person ON person.id = viewer WHERE owner = ? ORDER BY "
+    auto row = reading->statement(
+        "SELECT name, exactness, since, until FROM share JOIN person ON person.id = viewer WHERE owner = $1 ORDER BY "
         "name");
     row.bind(owner);
     while (row.next()) {
@@ -106,22 +109,14 @@ std::vector<std::pair<std::string, Grant>> Store::grantsOf(std::int64_t owner) {
 }
 
 std::optional<std::int64_t> Store::lastHeard(std::int64_t person) {
-    const std::lock_guard<std::mutex> lock(readMutex_);
-    reading_->clear();
-    auto row = reading_->statement("SELECT max(heard) FROM device WHERE person = ?");
+    const Reading reading(*this);
+    auto row = reading->statement("SELECT max(heard) FROM device WHERE person = $1");
     return row.bind(person).next() ? row.maybeInteger(0) : std::nullopt;
 }
 
 std::string Store::check() {
-    const std::lock_guard<std::mutex> lock(readMutex_);
-    reading_->clear();
-    for (const char* question : {"PRAGMA integrity_check", "PRAGMA foreign_key_check"}) {
-        auto row = reading_->statement(question);
-        if (row.next() && row.text(0) != "ok") {
-            return row.text(0);
-        }
-    }
-    return reading_->complaint();
+    const Reading reading(*this);
+    return reading->check();
 }
 
 }  // namespace ktr::server

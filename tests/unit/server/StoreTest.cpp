@@ -1,17 +1,13 @@
 #include "server/store/Store.h"
 
 #include <gtest/gtest.h>
-#include <sqlite3.h>
-#include <sys/stat.h>
 
 #include <atomic>
-#include <fstream>
 #include <future>
-#include <iterator>
 #include <thread>
 
 #include "server/store/Secret.h"
-#include "tests/support/TemporaryFolder.h"
+#include "tests/unit/server/StoreContract.h"
 
 namespace ktr::test {
 
@@ -20,45 +16,11 @@ using server::Fix;
 using server::Grant;
 using server::Precision;
 using server::Secret;
-using server::Sharing;
 using server::Store;
 
-class StoreTest : public ::testing::Test {
-  protected:
-    static constexpr std::int64_t kNow = 1763760000;
+class StoreBasics : public StoreContract {};
 
-    void SetUp() override {
-        open();
-        for (const char* name : {"ann", "otto", "mara"}) {
-            ASSERT_TRUE(store_->addPerson(name, {std::string(name) + "@x.example"}, kNow));
-        }
-        ann_ = store_->personNamed("ann")->id;
-        otto_ = store_->personNamed("otto")->id;
-        ASSERT_TRUE(store_->addDevice(ann_, DeviceKind::Phone, "ann's", "", kNow));
-        ASSERT_TRUE(store_->grant(ann_, otto_, {Precision::Exact, kNow - 1000, std::nullopt}));
-    }
-    void open() {
-        std::string complaint;
-        store_.reset();
-        store_ = Store::open(folder(), true, complaint);
-        ASSERT_TRUE(store_) << complaint;
-    }
-    std::string folder() const { return (folder_.path() / "data").string(); }
-    bool keep(std::vector<Fix> fixes, std::int64_t now = kNow) {
-        std::promise<bool> done;
-        store_->keep(1, ann_, std::move(fixes), now, [&](bool good) { done.set_value(good); });
-        return done.get_future().get();
-    }
-    static Fix at(std::int64_t time, double latitude = 50.2) { return {time, kNow, latitude, -3.1, std::nullopt}; }
-    std::vector<Fix> seenByOtto() { return store_->sharing(otto_, ann_)->fixes; }
-
-    TemporaryFolder folder_;
-    std::unique_ptr<Store> store_;
-    std::int64_t ann_ = 0;
-    std::int64_t otto_ = 0;
-};
-
-TEST_F(StoreTest, Fixes_ComeBackInTheOrderOfTheirTimes_EachOnce_AfterAnotherStart) {
+TEST_P(StoreBasics, Fixes_ComeBackInTheOrderOfTheirTimes_EachOnce_AfterAnotherStart) {
     EXPECT_TRUE(keep({at(kNow - 10), at(kNow - 30)}));
     EXPECT_TRUE(keep({at(kNow - 20), at(kNow - 10, 51.0)}));
     const std::vector<Fix> expected = {at(kNow - 30), at(kNow - 20), at(kNow - 10)};
@@ -67,11 +29,9 @@ TEST_F(StoreTest, Fixes_ComeBackInTheOrderOfTheirTimes_EachOnce_AfterAnotherStar
     EXPECT_EQ(seenByOtto(), expected);
 }
 
-TEST_F(StoreTest, HiddenPerson_IsNotWrittenDown_AndNotSeenLater) {
+TEST_P(StoreBasics, HiddenPerson_IsNotWrittenDown_AndNotSeenLater) {
     EXPECT_TRUE(keep({at(kNow - 10)}));
-    std::promise<bool> hidden;
-    store_->hide(ann_, kNow, [&](bool good) { hidden.set_value(good); });
-    ASSERT_TRUE(hidden.get_future().get());
+    ASSERT_TRUE(finished([&](auto done) { store_->hide(ann_, kNow, done); }));
     EXPECT_TRUE(store_->sharing(otto_, ann_)->hidden);
     EXPECT_TRUE(keep({at(kNow + 5)}, kNow + 5));
     EXPECT_EQ(store_->lastHeard(ann_), kNow) << "not even that the phone lives";
@@ -83,21 +43,20 @@ TEST_F(StoreTest, HiddenPerson_IsNotWrittenDown_AndNotSeenLater) {
     EXPECT_EQ(store_->sharing(otto_, ann_)->shownSince, kNow + 100) << "showing twice changes nothing";
 }
 
-TEST_F(StoreTest, Grants_AreReplacedAndRevoked) {
-    const auto mara = store_->personNamed("mara")->id;
-    EXPECT_EQ(store_->sharing(mara, ann_)->grant, std::nullopt);
-    ASSERT_TRUE(store_->grant(ann_, mara, {Precision::Town, kNow, kNow + 60}));
-    EXPECT_EQ(store_->sharing(mara, ann_)->grant, (Grant{Precision::Town, kNow, kNow + 60}));
-    EXPECT_EQ(store_->sharing(ann_, mara)->grant, std::nullopt) << "one way only";
+TEST_P(StoreBasics, Grants_AreReplacedAndRevoked) {
+    EXPECT_EQ(store_->sharing(mara_, ann_)->grant, std::nullopt);
+    ASSERT_TRUE(store_->grant(ann_, mara_, {Precision::Town, kNow, kNow + 60}));
+    EXPECT_EQ(store_->sharing(mara_, ann_)->grant, (Grant{Precision::Town, kNow, kNow + 60}));
+    EXPECT_EQ(store_->sharing(ann_, mara_)->grant, std::nullopt) << "one way only";
     EXPECT_EQ(store_->grantsOf(ann_).size(), 2U);
-    EXPECT_EQ(store_->friendsOf(mara).size(), 1U);
-    EXPECT_TRUE(store_->revokeGrant(ann_, mara));
-    EXPECT_FALSE(store_->revokeGrant(ann_, mara));
-    EXPECT_EQ(store_->sharing(mara, ann_)->grant, std::nullopt);
-    EXPECT_TRUE(store_->friendsOf(mara).empty());
+    EXPECT_EQ(store_->friendsOf(mara_).size(), 1U);
+    EXPECT_TRUE(store_->revokeGrant(ann_, mara_));
+    EXPECT_FALSE(store_->revokeGrant(ann_, mara_));
+    EXPECT_EQ(store_->sharing(mara_, ann_)->grant, std::nullopt);
+    EXPECT_TRUE(store_->friendsOf(mara_).empty());
 }
 
-TEST_F(StoreTest, Secrets_AreKeptAsHashes_AndEndWhenRevoked) {
+TEST_P(StoreBasics, Secrets_AreKeptAsHashes_AndEndWhenRevoked) {
     bool failed = false;
     const auto device = store_->deviceOf("ann's", failed);
     ASSERT_TRUE(device);
@@ -108,22 +67,14 @@ TEST_F(StoreTest, Secrets_AreKeptAsHashes_AndEndWhenRevoked) {
     EXPECT_FALSE(failed);
     const std::string secret = Secret::make().value_or("");
     ASSERT_TRUE(store_->addDevice(otto_, DeviceKind::Reader, secret, "", kNow));
+    EXPECT_TRUE(store_->deviceOf(secret, failed));
     store_.reset();
     for (const char* name : {"service.db", "service.db-wal"}) {
-        std::ifstream file(folder() + "/" + name, std::ios::binary);
-        const std::string bytes{std::istreambuf_iterator<char>(file), {}};
-        EXPECT_EQ(bytes.find(secret), std::string::npos) << name;
+        EXPECT_EQ(TemporaryFolder::read(address_.text + "/" + name).find(secret), std::string::npos) << name;
     }
 }
 
-TEST_F(StoreTest, Secret_Has128RandomBits) {
-    const auto one = Secret::make();
-    ASSERT_TRUE(one);
-    EXPECT_EQ(one->size(), 26U);
-    EXPECT_NE(one, Secret::make());
-}
-
-TEST_F(StoreTest, Handles_AreFoundInAnyWriting_AndBelongToOnePerson) {
+TEST_P(StoreBasics, Handles_AreFoundInAnyWriting_AndBelongToOnePerson) {
     ASSERT_TRUE(store_->addPerson("zoe", {"Zoe@X.example", "+44 1632 960-001"}, kNow));
     const auto zoe = store_->personNamed("zoe")->id;
     EXPECT_EQ(store_->personOf("zoe@x.EXAMPLE"), zoe);
@@ -135,19 +86,17 @@ TEST_F(StoreTest, Handles_AreFoundInAnyWriting_AndBelongToOnePerson) {
     EXPECT_EQ(store_->personNamed("other"), std::nullopt) << "nothing is left of it";
 }
 
-TEST_F(StoreTest, OldFixes_AreDeletedInTurn) {
+TEST_P(StoreBasics, OldFixes_AreDeletedInTurn) {
     ASSERT_TRUE(keep({at(kNow - 10), at(kNow - 3 * 86400)}));
     ASSERT_TRUE(store_->grant(ann_, otto_, {Precision::Exact, 0, std::nullopt}));
     EXPECT_EQ(seenByOtto().size(), 2U);
     for (int i = 0; i < 3; ++i) {
-        std::promise<bool> done;
-        store_->deleteOld(kNow, [&](bool good) { done.set_value(good); });
-        EXPECT_TRUE(done.get_future().get());
+        EXPECT_TRUE(finished([&](auto done) { store_->deleteOld(kNow, done); }));
     }
     EXPECT_EQ(seenByOtto(), std::vector<Fix>{at(kNow - 10)});
 }
 
-TEST_F(StoreTest, Present_NeverGoesBack_NotByAnotherStart) {
+TEST_P(StoreBasics, Present_NeverGoesBack_NotByAnotherStart) {
     EXPECT_EQ(store_->present(kNow + 50), kNow + 50);
     EXPECT_EQ(store_->present(kNow), kNow + 50);
     EXPECT_TRUE(keep({}));
@@ -156,7 +105,7 @@ TEST_F(StoreTest, Present_NeverGoesBack_NotByAnotherStart) {
     EXPECT_EQ(store_->sharing(otto_, ann_)->latest, kNow + 50);
 }
 
-TEST_F(StoreTest, ManyPosters_AreAllWritten) {
+TEST_P(StoreBasics, ManyPosters_AreAllWritten) {
     std::vector<std::thread> threads;
     std::atomic<int> written = 0;
     for (int thread = 0; thread < 8; ++thread) {
@@ -173,41 +122,89 @@ TEST_F(StoreTest, ManyPosters_AreAllWritten) {
     EXPECT_EQ(seenByOtto().size(), 400U);
 }
 
-TEST_F(StoreTest, WhatWaits_IsWrittenBeforeTheEnd) {
+TEST_P(StoreBasics, WhatWaits_IsWrittenBeforeTheEnd) {
     std::atomic<int> written = 0;
     for (int i = 0; i < 200; ++i) {
-        store_->keep(1, ann_, {at(kNow - i)}, kNow, [&](bool good) { written += good ? 1 : 0; });
+        store_->keep(phone_, ann_, {at(kNow - i)}, kNow, [&](bool good) { written += good ? 1 : 0; });
     }
     open();
     EXPECT_EQ(written, 200);
     EXPECT_EQ(seenByOtto().size(), 200U);
 }
 
-TEST_F(StoreTest, NewerStore_AndForeignFiles_AreRefusedWithASentence) {
-    const std::string file = folder() + "/service.db";
-    struct stat facts {};
-    ASSERT_EQ(::stat(file.c_str(), &facts), 0);
-    EXPECT_EQ(facts.st_mode & 0777U, 0600U);
-    store_.reset();
-    sqlite3* handle = nullptr;
-    ASSERT_EQ(sqlite3_open(file.c_str(), &handle), SQLITE_OK);
-    sqlite3_exec(handle, "PRAGMA user_version=2", nullptr, nullptr, nullptr);
-    sqlite3_close(handle);
-    std::string complaint;
-    EXPECT_EQ(Store::open(folder(), true, complaint), nullptr);
-    EXPECT_NE(complaint.find("newer program"), std::string::npos) << complaint;
-
-    std::ofstream(file, std::ios::trunc) << std::string(5000, 'x');
-    complaint.clear();
-    EXPECT_EQ(Store::open(folder(), true, complaint), nullptr);
-    EXPECT_NE(complaint, "");
-    complaint.clear();
-    EXPECT_EQ(Store::open("/not/there", false, complaint), nullptr);
-    EXPECT_NE(complaint, "");
-}
-
-TEST_F(StoreTest, WholeFile_IsFoundWhole) {
+TEST_P(StoreBasics, WholeFile_IsFoundWhole) {
     EXPECT_EQ(store_->check(), "");
 }
+
+TEST_P(StoreBasics, WhatOneCannotWrite_RefusesNoneOfTheOthers) {
+    // In one batch: the writing thread is busy with the first of them.
+    std::promise<void> go;
+    std::vector<std::promise<bool>> written(6);
+    store_->keep(phone_, ann_, {}, kNow, [waiting = go.get_future().share()](bool) { waiting.wait(); });
+    const auto later = [&](std::size_t i) { return [&, i](bool good) { written[i].set_value(good); }; };
+    store_->keep(phone_, ann_, {at(kNow - 1)}, kNow, later(0));
+    store_->noteLooks(otto_, {std::int64_t{77}}, true, kNow, later(1));  // nobody has this number
+    store_->keep(phone_, ann_, {at(kNow - 2)}, kNow, later(2));
+    store_->noteLooks(std::int64_t{78}, {ann_}, true, kNow, later(3));
+    store_->hide(mara_, kNow, later(4));
+    store_->noteCards(phone_, "hash", later(5));
+    go.set_value();
+    const std::vector<bool> expected = {true, false, true, false, true, true};
+    for (std::size_t i = 0; i < written.size(); ++i) {
+        EXPECT_EQ(written[i].get_future().get(), expected[i]) << i;
+    }
+    EXPECT_EQ(seenByOtto().size(), 2U);
+    EXPECT_TRUE(store_->person(mara_)->hidden);
+    bool failed = false;
+    EXPECT_EQ(store_->deviceOf("ann's", failed)->cardsSent, "hash");
+}
+
+TEST_P(StoreBasics, Texts_AreUtf8WithoutZeros_Everywhere) {
+    using namespace std::string_literals;
+    for (const std::string& text : {"a\0b"s, "\xff\xfe"s, "\xed\xa0\x80"s}) {
+        EXPECT_FALSE(store_->addPerson(text, {}, kNow));
+        EXPECT_EQ(store_->personNamed(text), std::nullopt);
+        EXPECT_EQ(store_->personOf(text + "@x.example"), std::nullopt);
+    }
+    EXPECT_TRUE(store_->addPerson("Zo\xc3\xab", {}, kNow));
+    EXPECT_TRUE(store_->personNamed("Zo\xc3\xab")) << "what failed before does not stay";
+}
+
+TEST_P(StoreBasics, Numbers_ComeBackAsTheyWere) {
+    const Fix fix{kNow, kNow + 1, 1.0 / 3.0, -179.99999999999997, 1e-300};
+    const Fix whole{kNow + 1, kNow + 1, -90.0, 180.0, 25.0};
+    ASSERT_TRUE(keep({fix, whole}));
+    EXPECT_EQ(seenByOtto(), (std::vector<Fix>{fix, whole}));
+}
+
+TEST_P(StoreBasics, Names_AreInTheOrderOfTheirBytes) {
+    for (const char* name : {"Zoe", "anna-b", "anna a", "\xc3\x84nne"}) {
+        ASSERT_TRUE(store_->addPerson(name, {}, kNow));
+    }
+    std::vector<std::string> names;
+    for (const server::Person& person : store_->people()) {
+        names.push_back(person.name);
+    }
+    EXPECT_EQ(names, (std::vector<std::string>{"Zoe", "ann", "anna a", "anna-b", "mara", "otto", "\xc3\x84nne"}));
+}
+
+TEST_P(StoreBasics, SecondProcess_SeesWhatTheFirstWrites_AndTheLatestTime) {
+    std::string complaint;
+    const auto other = Store::open(address_, false, complaint);
+    ASSERT_TRUE(other) << complaint;
+    store_->present(kNow + 900);
+    ASSERT_TRUE(keep({at(kNow)}));
+    EXPECT_EQ(other->sharing(otto_, ann_)->fixes.size(), 1U);
+    EXPECT_EQ(other->sharing(otto_, ann_)->latest, kNow + 900) << "its own clock may be behind";
+    ASSERT_TRUE(finished([&](auto done) { other->hide(ann_, kNow, done); }));
+    EXPECT_TRUE(store_->sharing(otto_, ann_)->hidden);
+    ASSERT_TRUE(keep({at(kNow + 1)}));
+    EXPECT_EQ(other->revokeDevices(ann_, kNow), 1);
+    bool failed = false;
+    EXPECT_EQ(store_->deviceOf("ann's", failed), std::nullopt);
+}
+
+INSTANTIATE_TEST_SUITE_P(Sqlite, StoreBasics, ::testing::Values(false));
+INSTANTIATE_TEST_SUITE_P(Postgres, StoreBasics, ::testing::Values(true));
 
 }  // namespace ktr::test

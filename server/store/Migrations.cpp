@@ -1,0 +1,82 @@
+#include "server/store/Migrations.h"
+
+#include <array>
+
+namespace ktr::server {
+
+namespace {
+
+constexpr std::array kSteps = {
+    // 1: people with their handles, phones and readers; fixes; grants; who looked; the latest time seen.
+    R"(
+CREATE TABLE person (
+    id {integer} NOT NULL PRIMARY KEY, name {text} NOT NULL UNIQUE, hidden {integer} NOT NULL DEFAULT 0,
+    shown_since {integer} NOT NULL DEFAULT 0, retention {integer} NOT NULL, made {integer} NOT NULL) {strict};
+CREATE TABLE handle (
+    text {text} NOT NULL PRIMARY KEY, shown {text} NOT NULL, place {integer} NOT NULL,
+    person {integer} NOT NULL REFERENCES person ON DELETE CASCADE) {strict by key};
+CREATE INDEX handle_person ON handle (person, place);
+CREATE TABLE device (
+    id {integer} NOT NULL PRIMARY KEY, person {integer} NOT NULL REFERENCES person ON DELETE CASCADE,
+    kind {integer} NOT NULL, secret {bytes} NOT NULL UNIQUE, key {text} NOT NULL DEFAULT '', heard {integer},
+    revoked {integer}, made {integer} NOT NULL, cards_sent {bytes} NOT NULL DEFAULT {no bytes}) {strict};
+CREATE INDEX device_person ON device (person);
+CREATE TABLE fix (
+    person {integer} NOT NULL REFERENCES person ON DELETE CASCADE, time {integer} NOT NULL, heard {integer} NOT NULL,
+    latitude {real} NOT NULL, longitude {real} NOT NULL, accuracy {real}, PRIMARY KEY (person, time)) {strict by key};
+CREATE TABLE share (
+    viewer {integer} NOT NULL REFERENCES person ON DELETE CASCADE,
+    owner {integer} NOT NULL REFERENCES person ON DELETE CASCADE, exactness {integer} NOT NULL,
+    since {integer} NOT NULL, until {integer}, PRIMARY KEY (viewer, owner)) {strict by key};
+CREATE INDEX share_owner ON share (owner);
+CREATE TABLE viewed (
+    owner {integer} NOT NULL REFERENCES person ON DELETE CASCADE, hour {integer} NOT NULL,
+    viewer {integer} NOT NULL REFERENCES person ON DELETE CASCADE, asked {integer} NOT NULL,
+    PRIMARY KEY (owner, hour, viewer)) {strict by key};
+CREATE TABLE clock (id {integer} NOT NULL PRIMARY KEY CHECK (id = 1), latest {integer} NOT NULL) {strict};
+INSERT INTO clock VALUES (1, 0);
+)",
+};
+
+}  // namespace
+
+int Migrations::latest() {
+    return static_cast<int>(kSteps.size());
+}
+
+std::string Migrations::run(Database& database, bool make) {
+    const auto refusal = [&](const std::optional<int>& schema) -> std::string {
+        if (!schema) {
+            return database.complaint();
+        }
+        return *schema > latest()      ? "was written by a newer program: use that one"
+               : *schema == 0 && !make ? "is empty"
+                                       : "";
+    };
+    database.clear();
+    auto schema = database.schema();
+    if (const std::string refused = refusal(schema); !refused.empty() || *schema == latest()) {
+        return refused;
+    }
+    if (!database.begin()) {
+        return database.complaint();
+    }
+    database.lockSchema();
+    // Another process may have been here first.
+    schema = database.schema();
+    std::string complaint = refusal(schema);
+    for (int step = schema.value_or(latest()); complaint.empty() && step < latest(); ++step) {
+        database.execute(kSteps[static_cast<std::size_t>(step)]);
+        database.setSchema(step + 1);
+        complaint = database.complaint();
+    }
+    if (complaint.empty() && !database.commit()) {
+        complaint = database.complaint();
+    }
+    if (!complaint.empty()) {
+        database.rollback();
+    }
+    return complaint;
+}
+
+}  // namespace ktr::server

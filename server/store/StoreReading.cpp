@@ -1,0 +1,144 @@
+// The part of the store that only reads: beside what is written.
+#include <algorithm>
+
+#include "server/store/Secret.h"
+#include "server/store/Store.h"
+
+namespace ktr::server {
+
+std::string Store::normalisedHandle(std::string_view handle) {
+    std::string text;
+    if (handle.find('@') != std::string_view::npos) {
+        for (const char letter : handle) {
+            text += letter >= 'A' && letter <= 'Z' ? static_cast<char>(letter - 'A' + 'a') : letter;
+        }
+        return text;
+    }
+    std::copy_if(handle.begin(), handle.end(), std::back_inserter(text),
+                 [](char letter) { return letter == '+' || (letter >= '0' && letter <= '9'); });
+    return text;
+}
+
+std::optional<Device> Store::deviceOf(std::string_view secret, bool& failed) {
+    const Reading reading(*this);
+    auto row = reading->statement(
+        "SELECT device.id, kind, device.person, name, hidden, key, cards_sent FROM device JOIN person ON person.id = "
+        "device.person "
+        "WHERE secret = $1 AND revoked IS NULL");
+    if (!row.bindBytes(Secret::hash(secret)).next()) {
+        failed = reading->failed();
+        return std::nullopt;
+    }
+    return Device{row.integer(0),      static_cast<DeviceKind>(row.integer(1)),
+                  row.integer(2),      row.text(3),
+                  row.integer(4) != 0, row.text(5),
+                  row.text(6)};
+}
+
+std::optional<std::int64_t> Store::personOf(std::string_view handle) {
+    const Reading reading(*this);
+    auto row = reading->statement("SELECT person FROM handle WHERE text = $1");
+    return row.bind(std::string_view(normalisedHandle(handle))).next() ? std::optional(row.integer(0)) : std::nullopt;
+}
+
+std::vector<Person> Store::people() {
+    const Reading reading(*this);
+    std::vector<Person> people;
+    auto row = reading->statement("SELECT id, name, hidden FROM person ORDER BY name");
+    while (row.next()) {
+        Person person{row.integer(0), row.text(1), {}, row.integer(2) != 0};
+        auto handle = reading->statement("SELECT shown FROM handle WHERE person = $1 ORDER BY place");
+        handle.bind(person.id);
+        while (handle.next()) {
+            person.handles.push_back(handle.text(0));
+        }
+        people.push_back(std::move(person));
+    }
+    return people;
+}
+
+std::optional<Person> Store::person(std::int64_t id) {
+    const Reading reading(*this);
+    auto row = reading->statement("SELECT id, name, hidden FROM person WHERE id = $1");
+    if (!row.bind(id).next()) {
+        return std::nullopt;
+    }
+    Person person{row.integer(0), row.text(1), {}, row.integer(2) != 0};
+    auto handle = reading->statement("SELECT shown FROM handle WHERE person = $1 ORDER BY place");
+    handle.bind(id);
+    while (handle.next()) {
+        person.handles.push_back(handle.text(0));
+    }
+    return person;
+}
+
+std::optional<Person> Store::personNamed(std::string_view name) {
+    std::int64_t id = 0;
+    {
+        const Reading reading(*this);
+        auto row = reading->statement("SELECT id FROM person WHERE name = $1");
+        if (!row.bind(name).next()) {
+            return std::nullopt;
+        }
+        id = row.integer(0);
+    }
+    return person(id);
+}
+
+Sharing Store::sharingOf(Database::Run& row, int firstColumn) {
+    Sharing sharing;
+    sharing.hidden = row.integer(firstColumn) != 0;
+    sharing.shownSince = row.integer(firstColumn + 1);
+    sharing.retention = row.integer(firstColumn + 2);
+    if (row.maybeInteger(firstColumn + 3)) {
+        sharing.grant = Grant{static_cast<Precision>(row.integer(firstColumn + 3)), row.integer(firstColumn + 4),
+                              row.maybeInteger(firstColumn + 5)};
+    }
+    // Another process may have seen a later time.
+    sharing.latest = present(row.integer(firstColumn + 6));
+    return sharing;
+}
+
+void Store::readFixes(Database& database, std::int64_t owner, Sharing& sharing) {
+    auto row = database.statement(
+        "SELECT time, heard, latitude, longitude, accuracy FROM fix WHERE person = $1 AND time >= $2 ORDER BY time");
+    row.bind(owner).bind(std::max(sharing.grant->from, sharing.shownSince));
+    while (row.next()) {
+        sharing.fixes.push_back({row.integer(0), row.integer(1), row.real(2), row.real(3), row.maybeReal(4)});
+    }
+}
+
+std::optional<Sharing> Store::sharing(std::int64_t viewer, std::int64_t owner) {
+    const Reading reading(*this);
+    auto row = reading->statement(
+        "SELECT hidden, shown_since, retention, exactness, since, until, (SELECT latest FROM clock) FROM person "
+        "LEFT JOIN share ON share.owner = person.id AND share.viewer = $1 WHERE person.id = $2");
+    if (!row.bind(viewer).bind(owner).next()) {
+        return std::nullopt;
+    }
+    Sharing sharing = sharingOf(row, 0);
+    if (sharing.grant && !sharing.hidden) {
+        readFixes(*reading, owner, sharing);
+    }
+    return sharing;
+}
+
+std::vector<Friend> Store::friendsOf(std::int64_t viewer) {
+    const Reading reading(*this);
+    std::vector<Friend> friends;
+    auto row = reading->statement(
+        "SELECT person.id, name, hidden, shown_since, retention, exactness, since, until, (SELECT latest FROM clock) "
+        "FROM share "
+        "JOIN person ON person.id = share.owner WHERE share.viewer = $1 ORDER BY name");
+    row.bind(viewer);
+    while (row.next()) {
+        Friend one{row.integer(0), row.text(1), sharingOf(row, 2)};
+        if (!one.sharing.hidden) {
+            readFixes(*reading, one.person, one.sharing);
+        }
+        friends.push_back(std::move(one));
+    }
+    return friends;
+}
+
+}  // namespace ktr::server

@@ -1,0 +1,104 @@
+// The part of the store that the service writes while it runs: nobody waits for it.
+#include "server/store/Store.h"
+
+namespace ktr::server {
+
+namespace {
+
+/// More than this at a step makes those who post wait.
+constexpr std::int64_t kPeopleAStep = 10;
+constexpr std::int64_t kViewedRetention = std::int64_t{30} * 86400;
+
+}  // namespace
+
+void Store::keep(std::int64_t device, std::int64_t person, std::vector<Fix> fixes, std::int64_t now, Done done) {
+    write(
+        [=, all = std::move(fixes)](Database& database) {
+            // In the same commit as the question whether the person hides: nothing of that time comes in, then or
+            // later.
+            for (const Fix& fix : all) {
+                database
+                    .statement(
+                        "INSERT INTO fix (person, time, heard, latitude, longitude, accuracy) "
+                        "SELECT $1, $2, $3, $4, $5, $6 FROM person WHERE id = $1 AND hidden = 0 "
+                        "AND shown_since <= $2 {shared lock} ON CONFLICT DO NOTHING")
+                    .bind(person)
+                    .bind(fix.time)
+                    .bind(fix.heard)
+                    .bind(fix.latitude)
+                    .bind(fix.longitude)
+                    .bind(fix.accuracy)
+                    .run();
+            }
+            database
+                .statement(
+                    "UPDATE device SET heard = $2 WHERE id = $1 AND "
+                    "(SELECT hidden FROM person WHERE person.id = device.person) = 0")
+                .bind(device)
+                .bind(now)
+                .run();
+        },
+        std::move(done));
+}
+
+void Store::hide(std::int64_t person, std::int64_t, Done done) {
+    write(
+        [=](Database& database) {
+            database.statement("UPDATE person SET hidden = 1 WHERE id = $1").bind(person).run();
+        },
+        std::move(done));
+}
+
+void Store::noteLooks(std::int64_t viewer, std::vector<std::int64_t> owners, bool asked, std::int64_t now, Done done) {
+    write(
+        [=, all = std::move(owners)](Database& database) {
+            for (const std::int64_t owner : all) {
+                database
+                    .statement(
+                        "INSERT INTO viewed (owner, hour, viewer, asked) VALUES ($1, $2, $3, $4) "
+                        "ON CONFLICT (owner, hour, viewer) DO UPDATE SET asked = 1 WHERE excluded.asked = 1")
+                    .bind(owner)
+                    .bind(now / 3600)
+                    .bind(viewer)
+                    .bind(std::int64_t{asked})
+                    .run();
+            }
+        },
+        std::move(done));
+}
+
+void Store::noteCards(std::int64_t device, std::string hash, Done done) {
+    write(
+        [=, bytes = std::move(hash)](Database& database) {
+            database.statement("UPDATE device SET cards_sent = $2 WHERE id = $1").bind(device).bindBytes(bytes).run();
+        },
+        std::move(done));
+}
+
+void Store::deleteOld(std::int64_t now, Done done) {
+    write(
+        [this, now](Database& database) {
+            std::vector<std::pair<std::int64_t, std::int64_t>> people;
+            {
+                auto row = database.statement("SELECT id, retention FROM person WHERE id > $1 ORDER BY id LIMIT $2");
+                row.bind(lastSwept_).bind(kPeopleAStep);
+                while (row.next()) {
+                    people.emplace_back(row.integer(0), row.integer(1));
+                }
+            }
+            for (const auto& [person, retention] : people) {
+                database.statement("DELETE FROM fix WHERE person = $1 AND time < $2")
+                    .bind(person)
+                    .bind(now - retention)
+                    .run();
+                database.statement("DELETE FROM viewed WHERE owner = $1 AND hour < $2")
+                    .bind(person)
+                    .bind((now - kViewedRetention) / 3600)
+                    .run();
+            }
+            lastSwept_ = people.size() < static_cast<std::size_t>(kPeopleAStep) ? 0 : people.back().first;
+        },
+        std::move(done));
+}
+
+}  // namespace ktr::server
