@@ -187,11 +187,12 @@ std::string PageLanguage::text(std::string_view key, std::initializer_list<std::
     return platform::formatted(PageTexts::find(tag_, key), isolated);
 }
 
-std::string PageLanguage::plural(std::string_view key, std::int64_t number) const {
+std::string PageLanguage::plural(std::string_view key, std::int64_t number, const std::string& words) const {
     const std::string_view text = PageTexts::find(tag_, key);
     std::string category;
     formats_->plurals->select(static_cast<double>(number)).toUTF8String(category);
-    return platform::formatted(platform::PluralText::branch(text, category).value_or(text), {this->number(number)});
+    return platform::formatted(platform::PluralText::branch(text, category).value_or(text),
+                               {words.empty() ? this->number(number) : words});
 }
 
 std::string PageLanguage::number(std::int64_t value) const {
@@ -206,10 +207,13 @@ std::string PageLanguage::clock(std::int64_t time) const {
 
 std::string PageLanguage::day(std::int64_t time, std::int64_t now) const {
     const std::int64_t before = formats_->dayNumber(now) - formats_->dayNumber(time);
-    if (before == 0 || before == 1) {
+    if (before >= -1 && before <= 1) {
         UErrorCode status = U_ZERO_ERROR;
         icu::UnicodeString out;
-        formats_->ages->format(before == 0 ? UDAT_DIRECTION_THIS : UDAT_DIRECTION_LAST, UDAT_ABSOLUTE_DAY, out, status);
+        const auto direction = before == 0  ? UDAT_DIRECTION_THIS
+                               : before < 0 ? UDAT_DIRECTION_NEXT
+                                            : UDAT_DIRECTION_LAST;
+        formats_->ages->format(direction, UDAT_ABSOLUTE_DAY, out, status);
         return capitalised(out, formats_->locale);
     }
     return formats_->date("dMMM", time);
@@ -239,6 +243,18 @@ std::string PageLanguage::age(std::int64_t seconds) const {
 std::string PageLanguage::metres(double metres) const {
     return metres < 950.0 ? formats_->measure(std::ceil(metres), icu::MeasureUnit::getMeter(), UNUM_UNIT_WIDTH_SHORT)
                           : formats_->measure(metres / 1000.0, icu::MeasureUnit::getKilometer(), UNUM_UNIT_WIDTH_SHORT);
+}
+
+std::string PageLanguage::coordinates(double latitude, double longitude, bool exact) const {
+    UErrorCode status = U_ZERO_ERROR;
+    const auto degrees = [&](double value) {
+        return utf8(icu::number::NumberFormatter::withLocale(formats_->locale)
+                        .precision(icu::number::Precision::fixedFraction(exact ? 4 : 2))
+                        .formatDouble(value, status)
+                        .toString(status));
+    };
+    const std::string text = degrees(latitude) + " / " + degrees(longitude);
+    return U_FAILURE(status) ? "" : text;
 }
 
 std::string PageLanguage::hours(std::int64_t count) const {

@@ -34,13 +34,14 @@ class PageLanguage {
 
     /// A text with its arguments, each set apart from the text around it whatever direction it has.
     std::string text(std::string_view key, std::initializer_list<std::string> arguments = {}) const;
-    /// A text with a branch for each form of a number, which is its first argument.
-    std::string plural(std::string_view key, std::int64_t number) const;
+    /// A text with a branch for each form of a number, which is its first argument: in `words` if there are any, else
+    /// in digits.
+    std::string plural(std::string_view key, std::int64_t number, const std::string& words = {}) const;
 
     std::string number(std::int64_t value) const;
     /// "17:44" or "5:44 PM".
     std::string clock(std::int64_t time) const;
-    /// "Today, 17:44", "Yesterday, 20:31", "17 Nov, 20:31".
+    /// "Today, 17:44", "Yesterday, 20:31", "Tomorrow, 08:00", "17 Nov, 20:31".
     std::string moment(std::int64_t time, std::int64_t now) const;
     /// "Today", "17 Nov": without the time of day.
     std::string day(std::int64_t time, std::int64_t now) const;
@@ -48,6 +49,8 @@ class PageLanguage {
     std::string age(std::int64_t seconds) const;
     /// "20 m" or "2.8 km".
     std::string metres(double metres) const;
+    /// "50.22 / -3.11", to some ten metres if `exact`, else to a kilometre.
+    std::string coordinates(double latitude, double longitude, bool exact) const;
     /// "48 hours", "30 days".
     std::string hours(std::int64_t count) const;
     std::string days(std::int64_t count) const;

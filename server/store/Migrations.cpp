@@ -36,6 +36,18 @@ CREATE TABLE viewed (
 CREATE TABLE clock (id {integer} NOT NULL PRIMARY KEY CHECK (id = 1), latest {integer} NOT NULL) {strict};
 INSERT INTO clock VALUES (1, 0);
 )",
+    // 2: links that sign in, browsers that are signed in.
+    R"(
+CREATE TABLE sign_in (
+    link {bytes} NOT NULL PRIMARY KEY, person {integer} NOT NULL REFERENCES person ON DELETE CASCADE,
+    until {integer} NOT NULL) {strict by key};
+CREATE INDEX sign_in_person ON sign_in (person);
+CREATE TABLE browser (
+    id {integer} NOT NULL PRIMARY KEY, session {bytes} NOT NULL UNIQUE,
+    person {integer} NOT NULL REFERENCES person ON DELETE CASCADE, made {integer} NOT NULL,
+    until {integer} NOT NULL) {strict};
+CREATE INDEX browser_person ON browser (person);
+)",
 };
 
 }  // namespace

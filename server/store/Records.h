@@ -34,6 +34,21 @@ struct Device {
     std::string cardsSent;  ///< the hash of what it was last told of its friends' names
 };
 
+/// A browser that is signed in to somebody's own page. A value.
+struct Browser {
+    std::int64_t id = 0;
+    std::int64_t person = 0;
+    std::int64_t made = 0;
+    std::int64_t until = 0;  ///< when it has to sign in again
+};
+
+/// What became of a link that signs in.
+enum class SignIn {
+    Done,
+    Spent,   ///< it was used before, has ended, or never was
+    Failed,  ///< the store could not be written
+};
+
 /// Somebody whom a viewer may see, with what decides it. A value.
 struct Friend {
     std::int64_t person = 0;

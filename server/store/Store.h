@@ -73,7 +73,7 @@ class Store {
     bool grant(std::int64_t owner, std::int64_t viewer, const Grant& grant);
     /// Whether there was one.
     bool revokeGrant(std::int64_t owner, std::int64_t viewer);
-    /// How many secrets of a person ended.
+    /// How many secrets of a person ended. Their browsers are signed out, their unused links are void.
     int revokeDevices(std::int64_t person, std::int64_t now);
     bool setHidden(std::int64_t person, bool hidden, std::int64_t now);
     std::vector<std::pair<std::string, Grant>> grantsOf(std::int64_t owner);
@@ -81,6 +81,20 @@ class Store {
     std::optional<std::int64_t> lastHeard(std::int64_t person);
     /// Whether the store is whole: empty, or what is wrong with it.
     std::string check();
+
+    // Browsers: a link signs in once, within 15 minutes; a browser stays signed in for 30 days. Secrets are kept as
+    // hashes.
+
+    static constexpr std::int64_t kSignInLasts = 15 * 60;                    ///< seconds
+    static constexpr std::int64_t kBrowserLasts = std::int64_t{30} * 86400;  ///< seconds
+    bool addSignIn(std::int64_t person, std::string_view link, std::int64_t now);
+    /// Spends the link, and signs a browser in that holds this secret from then on.
+    SignIn signIn(std::string_view link, std::string_view session, std::int64_t now);
+    /// None with `failed` set: the store could not be read.
+    std::optional<Browser> browserOf(std::string_view session, std::int64_t now, bool& failed);
+    std::vector<Browser> browsersOf(std::int64_t person, std::int64_t now);
+    /// False when that could not be written; a browser that is gone is gone.
+    bool endBrowser(std::int64_t person, std::int64_t browser);
 
     static std::string normalisedHandle(std::string_view handle);
 
@@ -116,6 +130,7 @@ class Store {
     /// Of seven columns: hidden, shown_since, retention, exactness, since, until, the clock's latest.
     Sharing sharingOf(Database::Run& row, int firstColumn);
     void readFixes(Database& database, std::int64_t owner, Sharing& sharing);
+    static void endBrowsersIn(Database& database, std::int64_t person);
 
     std::mutex readMutex_;
     std::unique_ptr<Database> reading_;

@@ -76,6 +76,7 @@ int Store::revokeDevices(std::int64_t person, std::int64_t now) {
             .bind(person)
             .run();
         ended = database.changes();
+        endBrowsersIn(database, person);
     });
     return good ? ended : 0;
 }

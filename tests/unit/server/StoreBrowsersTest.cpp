@@ -1,0 +1,79 @@
+#include "tests/unit/server/StoreContract.h"
+
+namespace ktr::test {
+
+using server::Browser;
+using server::SignIn;
+using server::Store;
+
+class StoreBrowsers : public StoreContract {
+  protected:
+    std::optional<Browser> browser(const char* session, std::int64_t now = kNow) {
+        bool failed = false;
+        auto found = store_->browserOf(session, now, failed);
+        EXPECT_FALSE(failed);
+        return found;
+    }
+};
+
+TEST_P(StoreBrowsers, Link_SignsInOnce) {
+    ASSERT_TRUE(store_->addSignIn(ann_, "link", kNow));
+    EXPECT_EQ(store_->signIn("other", "session", kNow + 1), SignIn::Spent);
+    EXPECT_EQ(store_->signIn("link", "session", kNow + 1), SignIn::Done);
+    EXPECT_EQ(store_->signIn("link", "second", kNow + 2), SignIn::Spent);
+    ASSERT_TRUE(browser("session"));
+    EXPECT_EQ(browser("session")->person, ann_);
+    EXPECT_EQ(browser("session")->made, kNow + 1);
+    EXPECT_FALSE(browser("second"));
+    EXPECT_FALSE(browser("link")) << "a link is no session";
+}
+
+TEST_P(StoreBrowsers, Link_EndsAfterItsQuarterOfAnHour_WhateverTheClockSaysThen) {
+    ASSERT_TRUE(store_->addSignIn(ann_, "link", kNow));
+    EXPECT_EQ(store_->present(kNow + Store::kSignInLasts), kNow + Store::kSignInLasts);
+    EXPECT_EQ(store_->signIn("link", "session", kNow + 5), SignIn::Spent) << "the clock was set back";
+    ASSERT_TRUE(store_->addSignIn(ann_, "second", kNow));
+    EXPECT_EQ(store_->signIn("second", "session", kNow + Store::kSignInLasts + 899), SignIn::Done);
+}
+
+TEST_P(StoreBrowsers, Browser_EndsAfterItsTime_AndWhenItIsEnded) {
+    for (const char* name : {"first", "second"}) {
+        ASSERT_TRUE(store_->addSignIn(ann_, name, kNow));
+        ASSERT_EQ(store_->signIn(name, name, kNow), SignIn::Done);
+    }
+    ASSERT_EQ(store_->browsersOf(ann_, kNow).size(), 2U);
+    EXPECT_TRUE(store_->browsersOf(otto_, kNow).empty());
+    EXPECT_TRUE(store_->endBrowser(otto_, browser("first")->id));
+    EXPECT_TRUE(browser("first")) << "it is not otto's to end";
+    EXPECT_TRUE(store_->endBrowser(ann_, browser("first")->id));
+    EXPECT_FALSE(browser("first"));
+    EXPECT_TRUE(browser("second", kNow + Store::kBrowserLasts - 1));
+    EXPECT_FALSE(browser("second", kNow + Store::kBrowserLasts));
+    EXPECT_TRUE(store_->browsersOf(ann_, kNow + Store::kBrowserLasts).empty());
+}
+
+TEST_P(StoreBrowsers, RevokingAllSecretsOfAPerson_SignsOut_AndVoidsLinks) {
+    ASSERT_TRUE(store_->addSignIn(ann_, "used", kNow));
+    ASSERT_EQ(store_->signIn("used", "session", kNow), SignIn::Done);
+    ASSERT_TRUE(store_->addSignIn(ann_, "unused", kNow));
+    ASSERT_TRUE(store_->addSignIn(otto_, "otto's", kNow));
+    store_->revokeDevices(ann_, kNow);
+    EXPECT_FALSE(browser("session"));
+    EXPECT_EQ(store_->signIn("unused", "later", kNow), SignIn::Spent);
+    EXPECT_EQ(store_->signIn("otto's", "later", kNow), SignIn::Done);
+}
+
+TEST_P(StoreBrowsers, PhonesSecret_IsNoSession_AndASessionNoPhones) {
+    EXPECT_FALSE(browser("ann's"));
+    EXPECT_EQ(store_->signIn("ann's", "session", kNow), SignIn::Spent);
+    ASSERT_TRUE(store_->addSignIn(ann_, "link", kNow));
+    ASSERT_EQ(store_->signIn("link", "session", kNow), SignIn::Done);
+    bool failed = false;
+    EXPECT_FALSE(store_->deviceOf("session", failed));
+    EXPECT_FALSE(failed);
+}
+
+INSTANTIATE_TEST_SUITE_P(Sqlite, StoreBrowsers, ::testing::Values(false));
+INSTANTIATE_TEST_SUITE_P(Postgres, StoreBrowsers, ::testing::Values(true));
+
+}  // namespace ktr::test
