@@ -87,8 +87,8 @@ std::string Administration::init(const std::string& host, int port, const std::s
     return complaint;
 }
 
-std::string Administration::add(const std::string& name, const std::vector<std::string>& handles,
-                                const std::string& key) {
+std::string Administration::addWithPhone(const std::string& name, const std::vector<std::string>& handles,
+                                         const std::string& key) {
     std::string complaint = open();
     if (!complaint.empty()) {
         return complaint;
@@ -130,6 +130,16 @@ std::string Administration::add(const std::string& name, const std::vector<std::
 }
 
 std::string Administration::reader(const std::string& name, const std::string& tokenFile) {
+    std::string configuration;
+    const std::string complaint = makeReader(name, tokenFile, configuration);
+    if (complaint.empty()) {
+        out_ << configuration << "\n";
+    }
+    return complaint;
+}
+
+std::string Administration::makeReader(const std::string& name, const std::string& tokenFile,
+                                       std::string& configuration) {
     std::string complaint = open();
     const auto settings = complaint.empty() ? ServiceSettings::read(folder_, complaint) : std::nullopt;
     const auto who = settings ? person(name, complaint) : std::nullopt;
@@ -150,7 +160,7 @@ std::string Administration::reader(const std::string& name, const std::string& t
                              {"host", origin.substr(std::string("https://").size())},
                              {"tokenFile", std::filesystem::absolute(tokenFile).lexically_normal().string()}};
     const auto authority = std::filesystem::absolute(folder_ + "/ca.pem").lexically_normal().string();
-    out_ << platform::writeJson(Dictionary{{"account", account}, {"certificates", Value::Array{authority}}}) << "\n";
+    configuration = platform::writeJson(Dictionary{{"account", account}, {"certificates", Value::Array{authority}}});
     return "";
 }
 

@@ -11,6 +11,15 @@
 
 namespace ktr::server {
 
+/// Somebody who is added, and what is wanted with it at once. A value.
+struct Newcomer {
+    std::string name;
+    std::vector<std::string> handles;  ///< by which friends ask
+    std::string key;                   ///< with which the phone seals its messages; empty: it does not
+    std::vector<std::string> friends;  ///< whom the newcomer sees, and who see the newcomer, exactly
+    std::string ktr;                   ///< the folder of a configuration with which ktr asks; empty: none
+};
+
 /// The commands of `ktr-service`. Each writes what it did to `out`, never a position, and gives a sentence when it
 /// could not be done, else an empty text. One thread.
 class Administration {
@@ -21,7 +30,7 @@ class Administration {
     /// `store`: the address of a PostgreSQL server; empty: a file in the folder.
     std::string init(const std::string& host, int port, const std::string& store);
     /// A person with a phone: what to type into its app, with the secret that is shown once.
-    std::string add(const std::string& name, const std::vector<std::string>& handles, const std::string& key);
+    std::string add(const Newcomer& who);
     /// A configuration with which ktr asks for this person, with the secret that is shown once.
     std::string reader(const std::string& name, const std::string& tokenFile);
     /// The two see each other exactly until one of them ends it.
@@ -42,6 +51,9 @@ class Administration {
     std::string serve(const Serving& where);
 
   private:
+    std::string addWithPhone(const std::string& name, const std::vector<std::string>& handles, const std::string& key);
+    /// A new secret for ktr in that file, and the configuration that uses it.
+    std::string makeReader(const std::string& name, const std::string& tokenFile, std::string& configuration);
     /// Opens the store; an empty text when it is open.
     std::string open();
     std::optional<Person> person(const std::string& name, std::string& complaint);

@@ -25,8 +25,8 @@ int main(int count, char** words) {
     program.require_subcommand(1);
     std::string folder = defaultFolder();
     program.add_option("--data", folder, "Folder of the service (" + folder + ")")->type_name("FOLDER");
-    std::string name, other, host, store, precision = "exact", until, key, token = "ktr-token";
-    std::vector<std::string> handles;
+    std::string name, other, host, store, precision = "exact", until, token = "ktr-token";
+    ktr::server::Newcomer newcomer;
     int port = 8443;
     const auto named = [&](CLI::App* command) {
         command->add_option("name", name, "The person's name")->required();
@@ -37,9 +37,13 @@ int main(int count, char** words) {
     init->add_option("--port", port, "Its port (8443)")->check(CLI::Range(0, 65535));
     init->add_option("--store", store, "Keep all on a PostgreSQL server (postgresql:///ktr) instead of in a file");
     CLI::App* add = named(program.add_subcommand("add", "Adds a person with a phone"));
-    add->add_option("--handle", handles, "E-mail address or phone number by which friends ask")
+    add->add_option("--handle", newcomer.handles, "E-mail address or phone number by which friends ask")
         ->allow_extra_args(false);
-    add->add_option("--key", key, "With which the phone seals its messages");
+    add->add_option("--key", newcomer.key, "With which the phone seals its messages");
+    add->add_option("--friend", newcomer.friends, "Somebody there: the two see each other exactly")
+        ->allow_extra_args(false);
+    add->add_option("--ktr", newcomer.ktr, "Folder of a configuration to write, with which ktr asks for this person")
+        ->type_name("FOLDER");
     CLI::App* reader = named(program.add_subcommand("reader", "Prints a configuration for ktr"));
     reader->add_option("--token-file", token, "Where its secret is written (ktr-token)");
     CLI::App* friend_ = named(program.add_subcommand("friend", "Two people see each other exactly"));
@@ -62,12 +66,13 @@ int main(int count, char** words) {
     serve->add_option("--socket-group", where.place.group, "Group of the proxy's user, which may connect")
         ->needs(socket);
     CLI11_PARSE(program, count, words);
+    newcomer.name = name;
 
     const auto now =
         std::chrono::duration_cast<std::chrono::seconds>(std::chrono::system_clock::now().time_since_epoch()).count();
     ktr::server::Administration administration(folder, now, std::cout);
     const std::string complaint = *init      ? administration.init(host, port, store)
-                                  : *add     ? administration.add(name, handles, key)
+                                  : *add     ? administration.add(newcomer)
                                   : *reader  ? administration.reader(name, token)
                                   : *friend_ ? administration.befriend(name, other)
                                   : *share   ? administration.share(name, other, precision, until)
