@@ -19,16 +19,21 @@ constexpr int kPatience = 5000;
 /// Told by SQLite's `file` magic: this store and no other database.
 constexpr std::int64_t kApplication = 0x6b747273;
 
-/// Made here, so that nobody else can read it from its first moment on. Empty when it is there.
+/// Made here, so that nobody else can read it from its first moment on. What is there already is not opened: to close
+/// any descriptor of a file gives up all locks that this process has on it, those of another connection as well.
+/// Another process would then take itself for the last one, and delete the log into which this one goes on writing.
+/// Empty when the file is there.
 std::string makeFile(const std::string& file) {
-    const int descriptor = ::open(file.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NONBLOCK, 0600);
-    if (descriptor < 0) {
+    const int descriptor = ::open(file.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0600);
+    if (descriptor >= 0) {
+        ::close(descriptor);
+        return "";
+    }
+    if (errno != EEXIST) {
         return std::strerror(errno);
     }
     struct stat facts {};
-    const bool isFile = ::fstat(descriptor, &facts) == 0 && S_ISREG(facts.st_mode);
-    ::close(descriptor);
-    return isFile ? "" : "is not a file";
+    return ::stat(file.c_str(), &facts) == 0 && S_ISREG(facts.st_mode) ? "" : "is not a file";
 }
 
 void bindValue(sqlite3_stmt* statement, int place, const DatabaseValue& value) {

@@ -293,6 +293,26 @@ class OwnServiceTest(unittest.TestCase):
             self.process.send_signal(signal.SIGTERM)
             self.assertEqual(self.process.wait(timeout=20), 0)
 
+    def test_commands_beside_the_running_service_lose_nothing(self):
+        ann = self.add("Ann")
+        self.add("Mara")
+        _, mara = self.reader("Mara")
+        self.command("share", "Ann", "Mara")
+        self.earlier()
+        self.start()
+        for number in range(3):
+            self.assertEqual(self.locate("Ann", ann, 50 + number, ago=60 - number)[0], 200)
+            # Another process opens the store, and is through with it.
+            self.command("people")
+        self.process.send_signal(signal.SIGKILL)
+        self.process.wait()
+        database = sqlite3.connect(self.folder / "data" / "service.db")
+        self.addCleanup(database.close)
+        self.assertEqual(database.execute("SELECT count(*) FROM fix").fetchone(), (3,))
+        self.start()
+        seen = self.ask("Mara", mara, "ann@x.example")[1]["locations"]["ann@x.example"]["location"]["latitude"]
+        self.assertEqual(seen, 52)
+
     def test_mistakes_get_a_sentence(self):
         self.add("Ann")
         self.add("Otto")
