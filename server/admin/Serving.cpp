@@ -85,6 +85,8 @@ std::string Administration::serve(const Serving& where) {
     setup.hosts = {isSix ? "[" + settings->host + "]" : settings->host};
     setup.now = presentTime;
     setup.alive = ServiceManager::tellAlive;
+    const auto log = std::make_shared<ServiceLog>(STDERR_FILENO);
+    setup.log = log;
     const std::string place = !setup.http.address.empty() ? setup.http.address
                               : !where.place.path.empty() ? where.place.path
                                                           : "a socket of the service manager";
@@ -94,10 +96,12 @@ std::string Administration::serve(const Serving& where) {
         const std::string port = service.port() == 0 ? "" : ":" + std::to_string(service.port());
         out_ << "ready " << settings->origin() << " on " << place << port << std::endl;
         ServiceManager::tellReady();
+        log->write(ServiceLog::Level::Info, "ready", {{"schema", std::int64_t{Store::kSchema}}});
         signalfd_siginfo ending{};
         while (::read(signals, &ending, sizeof ending) < 0 && errno == EINTR) {
         }
         ServiceManager::tellStopping();
+        log->write(ServiceLog::Level::Info, "stopping");
         service.stop();
     }
     ::close(signals);

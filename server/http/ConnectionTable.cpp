@@ -27,8 +27,10 @@ bool ConnectionTable::add(const std::shared_ptr<HttpConnection>& connection) {
             ++perAddress_[address];
         }
     }
+    ++(fits ? counters_->accepted : counters_->turnedAway);
     for (const auto& other : leaving) {
         if (other) {
+            ++counters_->gaveWay;
             other->close();
         }
     }

@@ -5,8 +5,10 @@
 #include <memory>
 #include <mutex>
 #include <string>
+#include <utility>
 #include <vector>
 
+#include "server/http/EdgeCounters.h"
 #include "server/http/HttpLimits.h"
 
 namespace ktr::server {
@@ -18,7 +20,8 @@ class HttpConnection;
 /// Any thread.
 class ConnectionTable {
   public:
-    explicit ConnectionTable(const HttpLimits& limits) : limits_(limits) {}
+    ConnectionTable(const HttpLimits& limits, std::shared_ptr<EdgeCounters> counters)
+        : limits_(limits), counters_(std::move(counters)) {}
 
     /// False when there is no room, since every connection in the way is being answered. May close another one.
     bool add(const std::shared_ptr<HttpConnection>& connection);
@@ -39,6 +42,7 @@ class ConnectionTable {
     std::shared_ptr<HttpConnection> takeLongestWaiting(const std::string* address);
 
     const HttpLimits limits_;
+    const std::shared_ptr<EdgeCounters> counters_;
     mutable std::mutex mutex_;
     std::map<const HttpConnection*, Entry> entries_;
     std::map<std::string, std::size_t> perAddress_;

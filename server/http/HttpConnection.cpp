@@ -72,6 +72,7 @@ void HttpConnection::setDeadline(std::chrono::milliseconds time) {
     deadline_.async_wait([self = shared_from_this()](const boost::system::error_code& failure) {
         // A timer that was set anew may have run out before.
         if (!failure && self->deadline_.expiry() <= std::chrono::steady_clock::now()) {
+            ++self->setup_->counters->outOfTime;
             self->closeNow();
         }
     });
@@ -172,6 +173,7 @@ void HttpConnection::tellClient(HttpRequest& request) const {
 }
 
 void HttpConnection::refuse() {
+    ++setup_->counters->refusedRequests;
     keepsAlive_ = false;
     const platform::Dictionary body{{"statusCode", reader_.status()}, {"message", reader_.complaint()}};
     send(HttpResponse::json(reader_.status(), platform::writeJson(body)));

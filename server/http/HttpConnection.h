@@ -17,6 +17,7 @@
 #include <string>
 
 #include "server/http/ByteSocket.h"
+#include "server/http/EdgeCounters.h"
 #include "server/http/HttpHandler.h"
 #include "server/http/HttpLimits.h"
 #include "server/http/RequestReader.h"
@@ -36,6 +37,7 @@ class HttpConnection : public std::enable_shared_from_this<HttpConnection> {
         std::shared_ptr<SSL_CTX> tls;  ///< none: without TLS
         HttpLimits limits;
         HttpHandler handler;
+        std::shared_ptr<EdgeCounters> counters;
     };
 
     struct Client {

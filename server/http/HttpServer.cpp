@@ -29,7 +29,8 @@ class HttpServer::Listener {
     explicit Listener(Setup setup)
         : setup_(std::move(setup)),
           loop_(std::make_shared<asio::io_context>(setup_.threads)),
-          table_(std::make_shared<ConnectionTable>(setup_.limits)),
+          counters_(std::make_shared<EdgeCounters>()),
+          table_(std::make_shared<ConnectionTable>(setup_.limits, counters_)),
           strand_(asio::make_strand(*loop_)) {}
 
     std::string start() {
@@ -111,6 +112,11 @@ class HttpServer::Listener {
 
     int port() const { return port_; }
 
+    std::string numbers() const {
+        return counters_->text() + "# TYPE ktr_service_connections gauge\nktr_service_connections " +
+               std::to_string(table_->size()) + "\n";
+    }
+
     void later(double seconds, std::function<void()> what) {
         asio::post(strand_, [this, seconds, what = std::move(what)]() mutable {
             if (stopping_) {
@@ -157,12 +163,14 @@ class HttpServer::Listener {
         shared->tls = isFile ? nullptr : setup_.tls;
         shared->limits = setup_.limits;
         shared->handler = setup_.handler;
+        shared->counters = counters_;
         return shared;
     }
 
     const Setup setup_;
     int port_ = 0;
     const std::shared_ptr<asio::io_context> loop_;
+    const std::shared_ptr<EdgeCounters> counters_;
     const std::shared_ptr<ConnectionTable> table_;
     Strand strand_;
     std::vector<std::unique_ptr<Acceptor>> acceptors_;
@@ -188,6 +196,10 @@ void HttpServer::stop(std::chrono::milliseconds grace) {
 
 int HttpServer::port() const {
     return listener_->port();
+}
+
+std::string HttpServer::numbers() const {
+    return listener_->numbers();
 }
 
 void HttpServer::later(double seconds, std::function<void()> what) {

@@ -15,7 +15,8 @@
 namespace ktr::server {
 
 /// A strict HTTP/1.1 edge: an address, a socket for a proxy, or both; a few threads, as many connections as its limits
-/// say. Plain HTTP never leaves the machine. What is public belongs to the thread that made it, but for `later`.
+/// say. Plain HTTP never leaves the machine. What is public belongs to the thread that made it, but for `later` and
+/// `numbers`.
 class HttpServer {
   public:
     struct Setup {
@@ -42,6 +43,8 @@ class HttpServer {
     void stop(std::chrono::milliseconds grace = std::chrono::milliseconds(2000));
     /// After `start`; 0 without an address.
     int port() const;
+    /// What became of connections, in the text format of Prometheus. Any thread.
+    std::string numbers() const;
     /// Calls `what` after so many seconds on one of the threads; drops it when the server stops before. Any thread.
     void later(double seconds, std::function<void()> what);
 

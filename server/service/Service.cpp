@@ -36,6 +36,8 @@ Service::Service(Setup setup)
     : hosts_(std::move(setup.hosts)),
       now_(std::move(setup.now)),
       alive_(std::move(setup.alive)),
+      log_(std::move(setup.log)),
+      traffic_(log_),
       store_(std::move(setup.store)),
       http_(httpSetup(setup)) {}
 
@@ -45,7 +47,9 @@ Service::~Service() {
 
 HttpServer::Setup Service::httpSetup(Setup& setup) {
     HttpServer::Setup http = std::move(setup.http);
-    http.handler = [this](const HttpRequest& request, const HttpReply& reply) { route(request, reply); };
+    http.handler = [this](const HttpRequest& request, const HttpReply& reply) {
+        route(request, traffic_.watched(request, reply));
+    };
     return http;
 }
 
@@ -65,7 +69,8 @@ void Service::stop() {
 
 void Service::sweep() {
     // Through the edge's threads and the store's: whichever stands still, nobody hears of life.
-    store_->deleteOld(now_(), [this](bool) {
+    store_->deleteOld(now_(), [this](bool isWell) {
+        noteStore(isWell);
         if (alive_) {
             alive_();
         }
@@ -82,14 +87,8 @@ bool Service::isForUs(const HttpRequest& request) const {
 void Service::route(const HttpRequest& request, const HttpReply& reply) {
     const bool reads = request.method == "GET";
     const bool posts = request.method == "POST";
-    if (reads && request.path == "/health" && request.isLocal) {
-        return reply.send(HttpResponse::json(200, "{}"));
-    }
-    if (reads && request.path == "/metrics" && request.isLocal) {
-        HttpResponse response;
-        response.headers.emplace_back("Content-Type", "text/plain; version=0.0.4");
-        response.body = counters_.text();
-        return reply.send(response);
+    if (reads && request.isLocal && (request.path == "/health" || request.path == "/metrics")) {
+        return answerOperator(request, reply);
     }
     if (!isForUs(request)) {
         return reply.send(refusal(421, "this service has another name"));
@@ -104,6 +103,25 @@ void Service::route(const HttpRequest& request, const HttpReply& reply) {
         return answerCommand(request, reply);
     }
     reply.send(refusal(404, "there is no such path"));
+}
+
+void Service::answerOperator(const HttpRequest& request, const HttpReply& reply) {
+    if (request.path == "/health") {
+        return reply.send(HttpResponse::json(storeIsWell_ ? 200 : 503,
+                                             storeIsWell_ ? R"({"store":"ok"})" : R"({"store":"failing"})"));
+    }
+    HttpResponse response;
+    response.headers.emplace_back("Content-Type", "text/plain; version=0.0.4");
+    response.body = counters_.text() + traffic_.text() + http_.numbers() +
+                    "# TYPE ktr_service_store_ok gauge\nktr_service_store_ok " + (storeIsWell_ ? "1" : "0") + "\n";
+    reply.send(response);
+}
+
+void Service::noteStore(bool isWell) {
+    if (storeIsWell_.exchange(isWell) != isWell && log_) {
+        log_->write(isWell ? ServiceLog::Level::Info : ServiceLog::Level::Error,
+                    isWell ? ServiceLog::Word("store-mended") : ServiceLog::Word("store-failing"));
+    }
 }
 
 void Service::refuseCredentials(const HttpRequest& request, const HttpReply& reply) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <atomic>
 #include <cstdint>
 #include <functional>
 #include <memory>
@@ -12,6 +13,8 @@
 #include "server/ingest/Report.h"
 #include "server/service/FailureDelays.h"
 #include "server/service/ServiceCounters.h"
+#include "server/service/ServiceLog.h"
+#include "server/service/Traffic.h"
 #include "server/store/Store.h"
 
 namespace ktr::server {
@@ -28,6 +31,7 @@ class Service {
         std::function<std::int64_t()> now;  ///< seconds since 1970
         /// Called about once a second, for as long as requests can be answered and the store answers; may be empty.
         std::function<void()> alive = {};
+        std::shared_ptr<ServiceLog> log = {};  ///< none: nothing is written
     };
 
     explicit Service(Setup setup);
@@ -45,6 +49,9 @@ class Service {
   private:
     HttpServer::Setup httpSetup(Setup& setup);
     void route(const HttpRequest& request, const HttpReply& reply);
+    /// For whoever runs the service: whether it is well, and numbers.
+    void answerOperator(const HttpRequest& request, const HttpReply& reply);
+    void noteStore(bool isWell);
     bool isForUs(const HttpRequest& request) const;
     /// The device behind the credentials, of this kind; else it has answered.
     std::optional<Device> authenticated(const HttpRequest& request, const std::string& ownSecret, DeviceKind kind,
@@ -63,6 +70,9 @@ class Service {
     const std::vector<std::string> hosts_;
     const std::function<std::int64_t()> now_;
     const std::function<void()> alive_;
+    const std::shared_ptr<ServiceLog> log_;
+    Traffic traffic_;
+    std::atomic<bool> storeIsWell_ = true;  ///< as the last sweep found it
     ServiceCounters counters_;
     FailureDelays delays_;
     std::unique_ptr<Store> store_;
