@@ -16,6 +16,8 @@ namespace ktr::server {
 namespace {
 
 constexpr std::size_t kLargest = 65536;
+/// Of HTTPS: nobody writes it.
+constexpr int kStandardPort = 443;
 
 bool isAddress(const std::string& host, int family) {
     std::array<unsigned char, 16> bytes{};
@@ -76,7 +78,8 @@ StoreAddress ServiceSettings::storeAddress(const std::string& folder) const {
 }
 
 std::string ServiceSettings::origin() const {
-    return "https://" + (isAddress(host, AF_INET6) ? "[" + host + "]" : host) + ":" + std::to_string(port);
+    const std::string name = isAddress(host, AF_INET6) ? "[" + host + "]" : host;
+    return "https://" + name + (port == kStandardPort ? std::string() : ":" + std::to_string(port));
 }
 
 std::string ServiceSettings::alternativeName() const {

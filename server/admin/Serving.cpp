@@ -96,7 +96,7 @@ std::string Administration::serve(const Serving& where) {
         const std::string port = service.port() == 0 ? "" : ":" + std::to_string(service.port());
         out_ << "ready " << settings->origin() << " on " << place << port << std::endl;
         ServiceManager::tellReady();
-        log->write(ServiceLog::Level::Info, "ready", {{"schema", std::int64_t{Store::kSchema}}});
+        log->write(ServiceLog::Level::Info, "ready");
         signalfd_siginfo ending{};
         while (::read(signals, &ending, sizeof ending) < 0 && errno == EINTR) {
         }

@@ -49,8 +49,7 @@ TEST_F(ServiceLogTest, Journal_GetsTheLevelInItsOwnWay) {
     struct stat facts {};
     ASSERT_EQ(::fstat(pipe_[1], &facts), 0);
     const std::string name = std::to_string(facts.st_dev) + ":" + std::to_string(facts.st_ino);
-    const EnvironmentVariable stream("JOURNAL_STREAM",
-                                     name.c_str());
+    const EnvironmentVariable stream("JOURNAL_STREAM", name.c_str());
     ServiceLog log(pipe_[1]);
     log.write(Level::Error, "store-failing");
     EXPECT_EQ(written(), "<3>level=error event=store-failing\n");
