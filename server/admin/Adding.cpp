@@ -27,7 +27,7 @@ std::string Administration::add(const Newcomer& who) {
                         : documents::AtomicFile::makeFolder(folder);
     }
     if (complaint.empty()) {
-        complaint = addWithPhone(who.name, who.handles, who.key);
+        complaint = addWithPhone(who.name, who.handles, who.key, who.shared);
     }
     for (const std::string& name : who.friends) {
         complaint = complaint.empty() ? befriend(who.name, name) : complaint;

@@ -31,14 +31,6 @@ bool isName(const std::string& name) {
            });
 }
 
-std::string faceOf(std::int64_t time) {
-    return WallClock({}).face(time);
-}
-
-std::string wordsOf(const Grant& grant) {
-    return wordOf(grant.precision) + (grant.until ? " until " + faceOf(*grant.until) : std::string());
-}
-
 }  // namespace
 
 std::string Administration::open() {
@@ -88,7 +80,7 @@ std::string Administration::init(const std::string& host, int port, const std::s
 }
 
 std::string Administration::addWithPhone(const std::string& name, const std::vector<std::string>& handles,
-                                         const std::string& key) {
+                                         const std::string& key, bool shared) {
     std::string complaint = open();
     if (!complaint.empty()) {
         return complaint;
@@ -119,7 +111,7 @@ std::string Administration::addWithPhone(const std::string& name, const std::vec
     if (!secret || !store_->addPerson(name, handles, now_)) {
         return "the person could not be written";
     }
-    if (!store_->addDevice(store_->personNamed(name)->id, DeviceKind::Phone, *secret, key, now_)) {
+    if (!store_->addDevice(store_->personNamed(name)->id, DeviceKind::Phone, *secret, key, now_, shared)) {
         return "the phone's secret could not be written";
     }
     out_ << name << " is added. In the phone's tracker choose the mode HTTP and type:\n  URL       "
@@ -165,12 +157,11 @@ std::string Administration::makeReader(const std::string& name, const std::strin
 }
 
 std::string Administration::befriend(const std::string& one, const std::string& other) {
-    const std::string complaint = share(one, other, "exact", "");
-    return complaint.empty() ? share(other, one, "exact", "") : complaint;
+    const std::string complaint = share(one, other, {});
+    return complaint.empty() ? share(other, one, {}) : complaint;
 }
 
-std::string Administration::share(const std::string& owner, const std::string& viewer, const std::string& precision,
-                                  const std::string& until) {
+std::string Administration::share(const std::string& owner, const std::string& viewer, const GrantWords& words) {
     std::string complaint = open();
     const auto from = complaint.empty() ? person(owner, complaint) : std::nullopt;
     const auto to = from ? person(viewer, complaint) : std::nullopt;
@@ -180,22 +171,32 @@ std::string Administration::share(const std::string& owner, const std::string& v
     if (from->id == to->id) {
         return "nobody shares with themselves";
     }
-    const auto exactness = precisionOf(precision);
+    const auto exactness = precisionOf(words.precision);
     if (!exactness) {
-        return "--precision: expected exact, 1km, town or places, found " + documents::inQuotes(precision);
+        return "--precision: expected exact, 1km, town or places, found " + documents::inQuotes(words.precision);
     }
-    Grant grant{*exactness, now_, std::nullopt};
-    if (!until.empty()) {
-        grant.until = WallClock({}).endingOf(until, now_);
+    Grant grant;
+    grant.precision = *exactness;
+    grant.from = store_->present(now_);
+    grant.aloud = words.aloud;
+    if (!words.until.empty()) {
+        grant.until = WallClock(from->zone).endingOf(words.until, now_);
         if (!grant.until) {
             return "--until: expected midnight, a time such as 18:30 or a date to come, found " +
-                   documents::inQuotes(until);
+                   documents::inQuotes(words.until);
         }
+    }
+    if (!words.arrival.empty()) {
+        const auto place = placeNamed(*from, words.arrival, complaint);
+        if (!place) {
+            return complaint;
+        }
+        grant.arrival = place->id;
     }
     if (!store_->grant(from->id, to->id, grant)) {
         return "the grant could not be written";
     }
-    out_ << viewer << " sees " << owner << ": " << wordsOf(grant) << "\n";
+    out_ << viewer << " sees " << owner << ": " << wordsOf(*from, grant) << "\n";
     return "";
 }
 
@@ -233,17 +234,37 @@ std::string Administration::setHidden(const std::string& name, bool hidden) {
     return "";
 }
 
+std::string Administration::wordsOf(const Person& owner, const Grant& grant) {
+    std::string words = wordOf(grant.precision);
+    const auto places = grant.arrival == 0 ? std::vector<NamedPlace>() : store_->placesOf(owner.id);
+    const auto place =
+        std::find_if(places.begin(), places.end(), [&](const NamedPlace& one) { return one.id == grant.arrival; });
+    if (place != places.end()) {
+        words += " until at " + documents::forLine(place->name);
+    }
+    if (grant.until) {
+        words += (place == places.end() ? " until " : ", at the latest ") + WallClock(owner.zone).face(*grant.until);
+    }
+    return words + (grant.aloud ? ", may be said aloud" : "");
+}
+
 std::string Administration::people() {
     if (const std::string complaint = open(); !complaint.empty()) {
         return complaint;
     }
+    const std::int64_t present = store_->present(now_);
     for (const Person& person : store_->people()) {
         const auto heard = store_->lastHeard(person.id);
+        const WallClock clock(person.zone);
         out_ << person.name << (person.hidden ? ", hidden" : "")
-             << (heard ? ", last heard " + faceOf(*heard) : std::string(", never heard")) << "\n";
+             << (heard ? ", last heard " + clock.face(*heard) : std::string(", never heard")) << "\n";
         for (const auto& [viewer, grant] : store_->grantsOf(person.id)) {
-            const bool over = grant.until && *grant.until <= now_;
-            out_ << "  seen by " << viewer << ": " << wordsOf(grant) << (over ? " (over)" : "") << "\n";
+            out_ << "  seen by " << viewer << ": " << wordsOf(person, grant)
+                 << (present >= grant.end() ? " (over)" : "");
+            if (grant.asks(present)) {
+                out_ << " (still meant? ends " << clock.face(grant.end()) << " unless ktr-service keep says so)";
+            }
+            out_ << "\n";
         }
     }
     return "";

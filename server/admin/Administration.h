@@ -17,6 +17,7 @@ struct Newcomer {
     std::vector<std::string> handles;  ///< by which friends ask
     std::string key;                   ///< with which the phone seals its messages; empty: it does not
     std::vector<std::string> friends;  ///< whom the newcomer sees, and who see the newcomer, exactly
+    bool shared = false;               ///< the phone is a child's, or several people's: it says by whom they are seen
     std::string ktr;                   ///< the folder of a configuration with which ktr asks; empty: none
 };
 
@@ -35,12 +36,37 @@ class Administration {
     std::string reader(const std::string& name, const std::string& tokenFile);
     /// The two see each other exactly until one of them ends it.
     std::string befriend(const std::string& one, const std::string& other);
-    std::string share(const std::string& owner, const std::string& viewer, const std::string& precision,
-                      const std::string& until);
+    /// What is granted, in words. A value.
+    struct GrantWords {
+        std::string precision = "exact";
+        std::string until = {};    ///< as `WallClock::endingOf`
+        std::string arrival = {};  ///< the name of the owner's place on whose reaching it ends
+        bool aloud = false;
+    };
+    std::string share(const std::string& owner, const std::string& viewer, const GrantWords& words);
+    /// The owner goes on with a grant without an end.
+    std::string keepGrant(const std::string& owner, const std::string& viewer);
     /// Without a viewer: all secrets of a person.
     std::string revoke(const std::string& owner, const std::string& viewer);
+    /// Of one device, by its number in the list that `devices` writes.
+    std::string revokeDevice(const std::string& owner, int number);
+    std::string devices(const std::string& name);
     std::string setHidden(const std::string& name, bool hidden);
     std::string people();
+    /// What a command line says of a place. A value.
+    struct PlaceWords {
+        std::string name;
+        std::string at;  ///< "50.21,-3.12"
+        std::string label;
+        double radius = 150.0;
+        bool said = false;
+        bool remove = false;
+    };
+    /// Names a place of a person, changes the one of that name, or removes it.
+    std::string setPlace(const std::string& name, const PlaceWords& words);
+    std::string places(const std::string& name);
+    std::string setZone(const std::string& name, const std::string& zone);
+    std::string looks(const std::string& name);
     std::string check();
     /// Where it serves. A value.
     struct Serving {
@@ -51,12 +77,16 @@ class Administration {
     std::string serve(const Serving& where);
 
   private:
-    std::string addWithPhone(const std::string& name, const std::vector<std::string>& handles, const std::string& key);
+    std::string addWithPhone(const std::string& name, const std::vector<std::string>& handles, const std::string& key,
+                             bool shared);
     /// A new secret for ktr in that file, and the configuration that uses it.
     std::string makeReader(const std::string& name, const std::string& tokenFile, std::string& configuration);
     /// Opens the store; an empty text when it is open.
     std::string open();
     std::optional<Person> person(const std::string& name, std::string& complaint);
+    std::optional<NamedPlace> placeNamed(const Person& owner, const std::string& name, std::string& complaint);
+    /// What a grant says, for its owner.
+    std::string wordsOf(const Person& owner, const Grant& grant);
 
     const std::string folder_;
     const std::int64_t now_;

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "server/admin/Administration.h"
+#include "server/admin/RuleCommands.h"
 
 namespace {
 
@@ -25,9 +26,10 @@ int main(int count, char** words) {
     program.require_subcommand(1);
     std::string folder = defaultFolder();
     program.add_option("--data", folder, "Folder of the service (" + folder + ")")->type_name("FOLDER");
-    std::string name, other, host, store, precision = "exact", until, token = "ktr-token";
+    std::string name, other, host, store, token = "ktr-token";
     ktr::server::Newcomer newcomer;
-    int port = 8443;
+    ktr::server::Administration::GrantWords grant;
+    int port = 8443, device = 0;
     const auto named = [&](CLI::App* command) {
         command->add_option("name", name, "The person's name")->required();
         return command;
@@ -40,6 +42,7 @@ int main(int count, char** words) {
     add->add_option("--handle", newcomer.handles, "E-mail address or phone number by which friends ask")
         ->allow_extra_args(false);
     add->add_option("--key", newcomer.key, "With which the phone seals its messages");
+    add->add_flag("--shared", newcomer.shared, "The phone is a child's or shared: it shows by whom the person is seen");
     add->add_option("--friend", newcomer.friends, "Somebody there: the two see each other exactly")
         ->allow_extra_args(false);
     add->add_option("--ktr", newcomer.ktr, "Folder of a configuration to write, with which ktr asks for this person")
@@ -50,10 +53,15 @@ int main(int count, char** words) {
     friend_->add_option("other", other, "The other one")->required();
     CLI::App* share = named(program.add_subcommand("share", "Lets somebody see a person"));
     share->add_option("viewer", other, "Who may see")->required();
-    share->add_option("--precision", precision, "exact, 1km or town (exact)");
-    share->add_option("--until", until, "midnight, a time such as 18:30, or a date");
+    share->add_option("--precision", grant.precision, "exact, 1km, town or places (exact)");
+    share->add_option("--until", grant.until, "midnight, a time such as 18:30, or a date");
+    share->add_option("--arrival", grant.arrival, "A place of the person: it ends when they are there")
+        ->type_name("PLACE");
+    share->add_flag("--aloud", grant.aloud, "What is seen may be said aloud");
     CLI::App* revoke = named(program.add_subcommand("revoke", "Ends a grant, or all secrets of a person"));
-    revoke->add_option("viewer", other, "Who no longer sees the person");
+    CLI::Option* noViewer = revoke->add_option("viewer", other, "Who no longer sees the person");
+    revoke->add_option("--device", device, "One secret alone, by its number in the list of devices")
+        ->excludes(noViewer);
     CLI::App* hide = named(program.add_subcommand("hide", "Hides a person from everybody"));
     CLI::App* show = named(program.add_subcommand("show", "Shows a person again"));
     CLI::App* people = program.add_subcommand("people", "Lists people and who sees them");
@@ -65,24 +73,28 @@ int main(int count, char** words) {
         serve->add_option("--socket", where.place.path, "Socket for a proxy such as caddy or nginx")->type_name("PATH");
     serve->add_option("--socket-group", where.place.group, "Group of the proxy's user, which may connect")
         ->needs(socket);
+    const ktr::server::RuleCommands rules(program);
     CLI11_PARSE(program, count, words);
     newcomer.name = name;
 
     const auto now =
         std::chrono::duration_cast<std::chrono::seconds>(std::chrono::system_clock::now().time_since_epoch()).count();
     ktr::server::Administration administration(folder, now, std::cout);
+    const auto revokes = [&] {
+        return device != 0 ? administration.revokeDevice(name, device) : administration.revoke(name, other);
+    };
     const std::string complaint = *init      ? administration.init(host, port, store)
                                   : *add     ? administration.add(newcomer)
                                   : *reader  ? administration.reader(name, token)
                                   : *friend_ ? administration.befriend(name, other)
-                                  : *share   ? administration.share(name, other, precision, until)
-                                  : *revoke  ? administration.revoke(name, other)
+                                  : *share   ? administration.share(name, other, grant)
+                                  : *revoke  ? revokes()
                                   : *hide    ? administration.setHidden(name, true)
                                   : *show    ? administration.setHidden(name, false)
                                   : *people  ? administration.people()
                                   : *check   ? administration.check()
                                   : *serve   ? administration.serve(where)
-                                             : std::string();
+                                             : rules.run(administration).value_or("");
     if (!complaint.empty()) {
         std::cerr << "ktr-service: " << complaint << std::endl;
         return EXIT_FAILURE;

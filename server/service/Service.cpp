@@ -291,17 +291,19 @@ void Service::changeSharing(const Device& device, const Dictionary& body, const 
         reply.send(HttpResponse::json(
             200, platform::writeJson(LocationAnswers::sharing(hides || person->hidden, handle, place, now_()))));
     };
-    // "No" alone shows nobody: it may be an older answer that repeats itself.
-    if (!request->hides) {
-        return answer(false);
-    }
-    store_->hide(device.person, now_(), [this, answer, reply](bool good) {
+    const auto written = [this, answer, reply, hides = request->hides](bool good) {
         if (!good) {
             ++counters_.storeFailures;
             return reply.send(refusal(503, "the store cannot be written"));
         }
-        http_.later(0.0, [answer] { answer(true); });
-    });
+        http_.later(0.0, [answer, hides] { answer(hides); });
+    };
+    if (request->hides) {
+        store_->hide(device.person, now_(), written);
+    } else {
+        // "No" alone shows nobody: it may be an older answer that repeats itself.
+        store_->shareAsAsked(device.id, now_(), written);
+    }
 }
 
 }  // namespace ktr::server

@@ -48,6 +48,19 @@ CREATE TABLE browser (
     until {integer} NOT NULL) {strict};
 CREATE INDEX browser_person ON browser (person);
 )",
+    // 3: named places; grants that end on arrival, may be said aloud, are confirmed; zones; wishes to share by device.
+    R"(
+ALTER TABLE person ADD COLUMN zone {text} NOT NULL DEFAULT '';
+ALTER TABLE device ADD COLUMN shared {integer} NOT NULL DEFAULT 0;
+ALTER TABLE device ADD COLUMN asked_to_share {integer} NOT NULL DEFAULT 0;
+ALTER TABLE share ADD COLUMN arrival {integer} NOT NULL DEFAULT 0;
+ALTER TABLE share ADD COLUMN aloud {integer} NOT NULL DEFAULT 0;
+ALTER TABLE share ADD COLUMN confirmed {integer};
+CREATE TABLE place (
+    id {integer} NOT NULL PRIMARY KEY, owner {integer} NOT NULL REFERENCES person ON DELETE CASCADE,
+    name {text} NOT NULL, label {text} NOT NULL, latitude {real} NOT NULL, longitude {real} NOT NULL,
+    radius {real} NOT NULL, said {integer} NOT NULL, UNIQUE (owner, name)) {strict};
+)",
 };
 
 }  // namespace

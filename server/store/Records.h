@@ -21,6 +21,7 @@ struct Person {
     std::string name;                  ///< unique; what friends see
     std::vector<std::string> handles;  ///< e-mail addresses and phone numbers, the preferred one first
     bool hidden = false;
+    std::string zone = {};  ///< where their day ends, as for `WallClock`
 };
 
 /// Who is behind a secret. A value.
@@ -32,6 +33,32 @@ struct Device {
     bool hidden = false;
     std::string key;        ///< with which the phone seals its messages; empty: it does not
     std::string cardsSent;  ///< the hash of what it was last told of its friends' names
+    bool shared = false;    ///< it is a child's, or several people's: it says itself by whom they are seen
+};
+
+/// A phone or a reader, as its person sees it. Times are seconds since 1970. A value.
+struct DeviceFacts {
+    std::int64_t id = 0;
+    DeviceKind kind = DeviceKind::Phone;
+    bool shared = false;
+    std::int64_t made = 0;
+    std::optional<std::int64_t> heard;    ///< last; none: never
+    std::optional<std::int64_t> revoked;  ///< none: it is in use
+};
+
+/// Somebody saw somebody. A value.
+struct Look {
+    std::string viewer;
+    std::int64_t hour = 0;  ///< when that hour began, seconds since 1970
+    bool asked = false;     ///< else carried along with what a phone is told
+};
+
+/// What became of the answer to "is this grant still meant?".
+enum class Confirmation {
+    Kept,
+    HasAnEnd,    ///< nobody asks about such a grant
+    IsNotThere,  ///< or it is over
+    Failed,      ///< the store could not be written
 };
 
 /// A browser that is signed in to somebody's own page. A value.

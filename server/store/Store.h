@@ -45,6 +45,10 @@ class Store {
     void hide(std::int64_t person, std::int64_t now, Done done);
     /// Notes who saw whom, once an hour; `asked`: not merely carried along with a phone's answer.
     void noteLooks(std::int64_t viewer, std::vector<std::int64_t> owners, bool asked, std::int64_t now, Done done);
+    /// Notes that a device asked, in its owner's words, to be shown again. It shows nobody yet.
+    void askToShare(std::int64_t device, Done done);
+    /// Shows the owner of a device that asked so after the newest hiding, wherever that came from; else does nothing.
+    void shareAsAsked(std::int64_t device, std::int64_t now, Done done);
     void noteCards(std::int64_t device, std::string hash, Done done);
     /// Deletes what is too old, of a few people in turn: to be called again and again.
     void deleteOld(std::int64_t now, Done done);
@@ -62,6 +66,11 @@ class Store {
     std::optional<Sharing> sharing(std::int64_t viewer, std::int64_t owner);
     /// Everybody who has granted something to a viewer.
     std::vector<Friend> friendsOf(std::int64_t viewer);
+    /// Who saw somebody, the newest hour first.
+    std::vector<Look> looksAt(std::int64_t owner);
+    std::vector<NamedPlace> placesOf(std::int64_t owner);
+    /// In the order in which they were made, those whose secret has ended as well.
+    std::vector<DeviceFacts> devicesOf(std::int64_t person);
     /// The present, never before the latest that the store has seen: a clock that was set back ends nothing later.
     std::int64_t present(std::int64_t now);
 
@@ -69,13 +78,24 @@ class Store {
 
     bool addPerson(const std::string& name, const std::vector<std::string>& handles, std::int64_t now);
     bool addDevice(std::int64_t person, DeviceKind kind, std::string_view secret, std::string_view key,
-                   std::int64_t now);
+                   std::int64_t now, bool shared = false);
+    /// Replaces an earlier grant. Who saw as exactly until then goes on seeing; else nothing is seen from before
+    /// `grant.from`, nor from before this call.
     bool grant(std::int64_t owner, std::int64_t viewer, const Grant& grant);
     /// Whether there was one.
     bool revokeGrant(std::int64_t owner, std::int64_t viewer);
+    /// The owner says that a grant without an end is still meant.
+    Confirmation confirmGrant(std::int64_t owner, std::int64_t viewer, std::int64_t now);
     /// How many secrets of a person ended. Their browsers are signed out, their unused links are void.
     int revokeDevices(std::int64_t person, std::int64_t now);
+    /// Whether there was one that was in use. What it asked for ends with it.
+    bool revokeDevice(std::int64_t person, std::int64_t device, std::int64_t now);
     bool setHidden(std::int64_t person, bool hidden, std::int64_t now);
+    bool setZone(std::int64_t person, const std::string& zone);
+    /// Names a place, or changes the one of that name; its id is not used.
+    bool setPlace(std::int64_t owner, const NamedPlace& place);
+    /// Whether there was one. Grants that were to end there end now.
+    bool removePlace(std::int64_t owner, std::int64_t place, std::int64_t now);
     std::vector<std::pair<std::string, Grant>> grantsOf(std::int64_t owner);
     /// When one of a person's devices was last heard; none: never.
     std::optional<std::int64_t> lastHeard(std::int64_t person);
@@ -127,8 +147,21 @@ class Store {
     bool writeNow(const std::function<void(Database&)>& work);
     void writeAll();
     Outcome commit(std::deque<Work>::const_iterator begin, std::deque<Work>::const_iterator end);
-    /// Of seven columns: hidden, shown_since, retention, exactness, since, until, the clock's latest.
+    /// Of ten columns: hidden, shown_since, retention, the clock's latest, and a grant's six.
     Sharing sharingOf(Database::Run& row, int firstColumn);
+    /// Of six columns: exactness, since, until, arrival, aloud, confirmed.
+    static Grant grantOf(const Database::Run& row, int firstColumn);
+    static std::optional<Grant> readGrant(Database& database, std::int64_t owner, std::int64_t viewer);
+    static std::vector<NamedPlace> readPlaces(Database& database, std::int64_t owner);
+    /// Hides somebody, and takes back what their devices asked.
+    static void hideIn(Database& database, std::int64_t person);
+    void showIn(Database& database, std::int64_t person, std::int64_t now);
+    /// The first second of which nothing has been heard yet, from the present on.
+    std::int64_t afterAllHeard(Database& database, std::int64_t person, std::int64_t now);
+    /// Ends grants whose owner has arrived.
+    static void endOnArrival(Database& database, std::int64_t owner, const std::vector<Fix>& fixes, std::int64_t now);
+    /// What else decides what is seen by a grant: fixes, and places where they may be said.
+    void readSight(Database& database, std::int64_t owner, Sharing& sharing);
     void readFixes(Database& database, std::int64_t owner, Sharing& sharing);
     static void endBrowsersIn(Database& database, std::int64_t person);
 

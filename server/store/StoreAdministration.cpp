@@ -27,51 +27,28 @@ bool Store::addPerson(const std::string& name, const std::vector<std::string>& h
 }
 
 bool Store::addDevice(std::int64_t person, DeviceKind kind, std::string_view secret, std::string_view key,
-                      std::int64_t now) {
+                      std::int64_t now, bool shared) {
     const std::int64_t device = Secret::number();
     return device != 0 && writeNow([&](Database& database) {
                database
                    .statement(
-                       "INSERT INTO device (id, person, kind, secret, key, made) VALUES ($1, $2, $3, $4, $5, $6)")
+                       "INSERT INTO device (id, person, kind, secret, key, made, shared) "
+                       "VALUES ($1, $2, $3, $4, $5, $6, $7)")
                    .bind(device)
                    .bind(person)
                    .bind(static_cast<std::int64_t>(kind))
                    .bindBytes(Secret::hash(secret))
                    .bind(key)
                    .bind(now)
+                   .bind(std::int64_t{shared})
                    .run();
            });
-}
-
-bool Store::grant(std::int64_t owner, std::int64_t viewer, const Grant& grant) {
-    return writeNow([&](Database& database) {
-        database
-            .statement(
-                "INSERT INTO share (viewer, owner, exactness, since, until) VALUES ($1, $2, $3, $4, $5) "
-                "ON CONFLICT (viewer, owner) DO UPDATE SET exactness = excluded.exactness, since = excluded.since, "
-                "until = excluded.until")
-            .bind(viewer)
-            .bind(owner)
-            .bind(static_cast<std::int64_t>(grant.precision))
-            .bind(grant.from)
-            .bind(grant.until)
-            .run();
-    });
-}
-
-bool Store::revokeGrant(std::int64_t owner, std::int64_t viewer) {
-    int ended = 0;
-    const bool good = writeNow([&](Database& database) {
-        database.statement("DELETE FROM share WHERE viewer = $1 AND owner = $2").bind(viewer).bind(owner).run();
-        ended = database.changes();
-    });
-    return good && ended > 0;
 }
 
 int Store::revokeDevices(std::int64_t person, std::int64_t now) {
     int ended = 0;
     const bool good = writeNow([&](Database& database) {
-        database.statement("UPDATE device SET revoked = $1 WHERE person = $2 AND revoked IS NULL")
+        database.statement("UPDATE device SET revoked = $1, asked_to_share = 0 WHERE person = $2 AND revoked IS NULL")
             .bind(now)
             .bind(person)
             .run();
@@ -83,30 +60,18 @@ int Store::revokeDevices(std::int64_t person, std::int64_t now) {
 
 bool Store::setHidden(std::int64_t person, bool hidden, std::int64_t now) {
     return writeNow([&](Database& database) {
-        // Showing twice changes nothing: what was seen in between stays.
-        database
-            .statement(
-                "UPDATE person SET shown_since = CASE WHEN hidden = 1 AND $2 = 0 THEN $3 ELSE shown_since END, "
-                "hidden = $2 WHERE id = $1")
-            .bind(person)
-            .bind(std::int64_t{hidden})
-            .bind(now)
-            .run();
+        if (hidden) {
+            hideIn(database, person);
+        } else {
+            showIn(database, person, now);
+        }
     });
 }
 
-std::vector<std::pair<std::string, Grant>> Store::grantsOf(std::int64_t owner) {
-    const Reading reading(*this);
-    std::vector<std::pair<std::string, Grant>> grants;
-    auto row = reading->statement(
-        "SELECT name, exactness, since, until FROM share JOIN person ON person.id = viewer WHERE owner = $1 ORDER BY "
-        "name");
-    row.bind(owner);
-    while (row.next()) {
-        grants.emplace_back(row.text(0),
-                            Grant{static_cast<Precision>(row.integer(1)), row.integer(2), row.maybeInteger(3)});
-    }
-    return grants;
+bool Store::setZone(std::int64_t person, const std::string& zone) {
+    return writeNow([&](Database& database) {
+        database.statement("UPDATE person SET zone = $2 WHERE id = $1").bind(person).bind(zone).run();
+    });
 }
 
 std::optional<std::int64_t> Store::lastHeard(std::int64_t person) {

@@ -22,7 +22,8 @@ std::string Store::normalisedHandle(std::string_view handle) {
 std::optional<Device> Store::deviceOf(std::string_view secret, bool& failed) {
     const Reading reading(*this);
     auto row = reading->statement(
-        "SELECT device.id, kind, device.person, name, hidden, key, cards_sent FROM device JOIN person ON person.id = "
+        "SELECT device.id, kind, device.person, name, hidden, key, cards_sent, shared FROM device JOIN person ON "
+        "person.id = "
         "device.person "
         "WHERE secret = $1 AND revoked IS NULL");
     if (!row.bindBytes(Secret::hash(secret)).next()) {
@@ -32,7 +33,7 @@ std::optional<Device> Store::deviceOf(std::string_view secret, bool& failed) {
     return Device{row.integer(0),      static_cast<DeviceKind>(row.integer(1)),
                   row.integer(2),      row.text(3),
                   row.integer(4) != 0, row.text(5),
-                  row.text(6)};
+                  row.text(6),         row.integer(7) != 0};
 }
 
 std::optional<std::int64_t> Store::personOf(std::string_view handle) {
@@ -44,9 +45,9 @@ std::optional<std::int64_t> Store::personOf(std::string_view handle) {
 std::vector<Person> Store::people() {
     const Reading reading(*this);
     std::vector<Person> people;
-    auto row = reading->statement("SELECT id, name, hidden FROM person ORDER BY name");
+    auto row = reading->statement("SELECT id, name, hidden, zone FROM person ORDER BY name");
     while (row.next()) {
-        Person person{row.integer(0), row.text(1), {}, row.integer(2) != 0};
+        Person person{row.integer(0), row.text(1), {}, row.integer(2) != 0, row.text(3)};
         auto handle = reading->statement("SELECT shown FROM handle WHERE person = $1 ORDER BY place");
         handle.bind(person.id);
         while (handle.next()) {
@@ -59,11 +60,11 @@ std::vector<Person> Store::people() {
 
 std::optional<Person> Store::person(std::int64_t id) {
     const Reading reading(*this);
-    auto row = reading->statement("SELECT id, name, hidden FROM person WHERE id = $1");
+    auto row = reading->statement("SELECT id, name, hidden, zone FROM person WHERE id = $1");
     if (!row.bind(id).next()) {
         return std::nullopt;
     }
-    Person person{row.integer(0), row.text(1), {}, row.integer(2) != 0};
+    Person person{row.integer(0), row.text(1), {}, row.integer(2) != 0, row.text(3)};
     auto handle = reading->statement("SELECT shown FROM handle WHERE person = $1 ORDER BY place");
     handle.bind(id);
     while (handle.next()) {
@@ -90,13 +91,23 @@ Sharing Store::sharingOf(Database::Run& row, int firstColumn) {
     sharing.hidden = row.integer(firstColumn) != 0;
     sharing.shownSince = row.integer(firstColumn + 1);
     sharing.retention = row.integer(firstColumn + 2);
-    if (row.maybeInteger(firstColumn + 3)) {
-        sharing.grant = Grant{static_cast<Precision>(row.integer(firstColumn + 3)), row.integer(firstColumn + 4),
-                              row.maybeInteger(firstColumn + 5)};
-    }
     // Another process may have seen a later time.
-    sharing.latest = present(row.integer(firstColumn + 6));
+    sharing.latest = present(row.integer(firstColumn + 3));
+    if (row.maybeInteger(firstColumn + 4)) {
+        sharing.grant = grantOf(row, firstColumn + 4);
+    }
     return sharing;
+}
+
+void Store::readSight(Database& database, std::int64_t owner, Sharing& sharing) {
+    // Of an ended grant nothing is read: it takes no longer than that of a stranger.
+    if (!sharing.grant || sharing.hidden || sharing.latest >= sharing.grant->end()) {
+        return;
+    }
+    readFixes(database, owner, sharing);
+    if (Visibility::cellSide(sharing.grant->precision) == 0.0) {
+        sharing.places = readPlaces(database, owner);
+    }
 }
 
 void Store::readFixes(Database& database, std::int64_t owner, Sharing& sharing) {
@@ -111,15 +122,14 @@ void Store::readFixes(Database& database, std::int64_t owner, Sharing& sharing) 
 std::optional<Sharing> Store::sharing(std::int64_t viewer, std::int64_t owner) {
     const Reading reading(*this);
     auto row = reading->statement(
-        "SELECT hidden, shown_since, retention, exactness, since, until, (SELECT latest FROM clock) FROM person "
+        "SELECT hidden, shown_since, retention, (SELECT latest FROM clock), exactness, since, until, arrival, aloud, "
+        "confirmed FROM person "
         "LEFT JOIN share ON share.owner = person.id AND share.viewer = $1 WHERE person.id = $2");
     if (!row.bind(viewer).bind(owner).next()) {
         return std::nullopt;
     }
     Sharing sharing = sharingOf(row, 0);
-    if (sharing.grant && !sharing.hidden) {
-        readFixes(*reading, owner, sharing);
-    }
+    readSight(*reading, owner, sharing);
     return sharing;
 }
 
@@ -127,15 +137,13 @@ std::vector<Friend> Store::friendsOf(std::int64_t viewer) {
     const Reading reading(*this);
     std::vector<Friend> friends;
     auto row = reading->statement(
-        "SELECT person.id, name, hidden, shown_since, retention, exactness, since, until, (SELECT latest FROM clock) "
-        "FROM share "
-        "JOIN person ON person.id = share.owner WHERE share.viewer = $1 ORDER BY name");
+        "SELECT person.id, name, hidden, shown_since, retention, (SELECT latest FROM clock), exactness, since, until, "
+        "arrival, aloud, confirmed FROM share JOIN person ON person.id = share.owner WHERE share.viewer = $1 ORDER BY "
+        "name");
     row.bind(viewer);
     while (row.next()) {
         Friend one{row.integer(0), row.text(1), sharingOf(row, 2)};
-        if (!one.sharing.hidden) {
-            readFixes(*reading, one.person, one.sharing);
-        }
+        readSight(*reading, one.person, one.sharing);
         friends.push_back(std::move(one));
     }
     return friends;

@@ -21,18 +21,23 @@ void Store::keep(std::int64_t device, std::int64_t person, std::vector<Fix> fixe
                     .statement(
                         "INSERT INTO fix (person, time, heard, latitude, longitude, accuracy) "
                         "SELECT $1, $2, $3, $4, $5, $6 FROM person WHERE id = $1 AND hidden = 0 "
-                        "AND shown_since <= $2 {shared lock} ON CONFLICT DO NOTHING")
+                        "AND shown_since <= $2 AND NOT EXISTS (SELECT 1 FROM device WHERE device.id = $7 AND "
+                        "revoked IS NOT NULL) {shared lock} ON CONFLICT DO NOTHING")
                     .bind(person)
                     .bind(fix.time)
                     .bind(fix.heard)
                     .bind(fix.latitude)
                     .bind(fix.longitude)
                     .bind(fix.accuracy)
+                    .bind(device)
                     .run();
+            }
+            if (!all.empty()) {
+                endOnArrival(database, person, all, now);
             }
             database
                 .statement(
-                    "UPDATE device SET heard = $2 WHERE id = $1 AND "
+                    "UPDATE device SET heard = $2 WHERE id = $1 AND revoked IS NULL AND "
                     "(SELECT hidden FROM person WHERE person.id = device.person) = 0")
                 .bind(device)
                 .bind(now)
@@ -42,11 +47,7 @@ void Store::keep(std::int64_t device, std::int64_t person, std::vector<Fix> fixe
 }
 
 void Store::hide(std::int64_t person, std::int64_t, Done done) {
-    write(
-        [=](Database& database) {
-            database.statement("UPDATE person SET hidden = 1 WHERE id = $1").bind(person).run();
-        },
-        std::move(done));
+    write([=](Database& database) { hideIn(database, person); }, std::move(done));
 }
 
 void Store::noteLooks(std::int64_t viewer, std::vector<std::int64_t> owners, bool asked, std::int64_t now, Done done) {

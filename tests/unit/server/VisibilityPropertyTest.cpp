@@ -165,6 +165,8 @@ TEST_F(VisibilityPropertyTest, ThePresentSlot_IsNotSeenBelowExactPrecision) {
         for (int i = 0; i < 3; ++i) {
             other.fixes.push_back({slot + between(0, 300), slot + between(0, 300), real(-80.0, 80.0), 0.0, 5.0});
             other.fixes.push_back({slot - between(0, kDay), slot + between(0, 300), real(-80.0, 80.0), 0.0, 5.0});
+            // By a clock that is ahead.
+            other.fixes.push_back({slot + between(0, 299), slot - between(1, 300), real(-80.0, 80.0), 0.0, 5.0});
         }
         sort(other);
         for (const std::int64_t now : {kNow, slot, slot + length - 1}) {
