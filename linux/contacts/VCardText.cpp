@@ -67,6 +67,12 @@ std::size_t endOfProperty(std::string_view card, std::size_t begin) {
     return line.end;
 }
 
+/// A NUL ends the text for whoever reads it as C does, in the middle of a property: their readers of quoted-printable
+/// look two letters further.
+bool isText(std::string_view property) {
+    return property.find('\0') == std::string_view::npos;
+}
+
 bool isWithinCaps(std::string_view property, bool isPicture) {
     const auto parts = std::count_if(property.begin(), property.end(), [](char c) { return c == ';' || c == ','; });
     return static_cast<std::size_t>(parts) <= VCardText::kMostParts &&
@@ -129,7 +135,8 @@ std::string VCardText::essential(std::string_view card) {
         at = end;
         const std::string name = nameOf(property);
         const bool isFrame = name == "begin" || name == "end";
-        if (isWanted(name) && isWithinCaps(property, name == "photo") && (isFrame || ++properties <= kMostProperties)) {
+        if (isWanted(name) && isText(property) && isWithinCaps(property, name == "photo") &&
+            (isFrame || ++properties <= kMostProperties)) {
             kept += property;
         }
     }

@@ -71,6 +71,12 @@ QList<QTextLayout::FormatRange> formats(const QString& text, bool isBold, const 
     return ranges;
 }
 
+/// Whether the font's file could be opened: in place of any other the library has one of boxes, which has no name, and
+/// being asked for that ends the process with a signal. Each file has this table (OpenType, "head").
+bool isOpened(const QRawFont& font) {
+    return font.isValid() && !font.fontTable("head").isEmpty();
+}
+
 }  // namespace
 
 std::shared_ptr<const LabelGlyphs> LabelShaper::shape(const std::string& name, const Style& style) {
@@ -99,6 +105,9 @@ std::shared_ptr<const LabelGlyphs> LabelShaper::shape(const std::string& name, c
     bool hasInk = false;
     for (const QGlyphRun& run : layout.glyphRuns()) {
         const QRawFont font = run.rawFont();
+        if (!isOpened(font)) {
+            continue;
+        }
         const auto indexes = run.glyphIndexes();
         const auto positions = run.positions();
         const auto advances = font.advancesForGlyphIndexes(indexes);

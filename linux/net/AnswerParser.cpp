@@ -32,7 +32,8 @@ AnswerParser::~AnswerParser() = default;
 
 void AnswerParser::restart() {
     parser_ = std::make_unique<Parser>();
-    parser_->beast.eager(true);
+    // Room for a body is made as soon as there is a byte of it: not before the header has been looked at.
+    parser_->beast.eager(false);
     parser_->beast.header_limit(static_cast<std::uint32_t>(kLargestHead));
     parser_->beast.body_limit(maximumBytes_);
     headIsChecked_ = false;
@@ -92,6 +93,7 @@ AnswerParser::State AnswerParser::feed(std::string_view bytes) {
             if (state_ != State::Incomplete) {
                 return state_;
             }
+            parser_->beast.eager(true);
         }
         if (parser_->beast.is_done()) {
             if (status() >= kFirstFinalStatus) {

@@ -103,7 +103,10 @@ void Connector::tryNext() {
         const auto connected = std::move(connected_);
         connected(socket);
     });
-    connect(socket, &QAbstractSocket::errorOccurred, this, [this, socket] { attemptFailed(socket); });
+    // Some attempts fail while they are begun, such as without a descriptor for the socket: whoever is told may end
+    // this object and the socket with it, so that the socket has to come to its end first.
+    connect(
+        socket, &QAbstractSocket::errorOccurred, this, [this, socket] { attemptFailed(socket); }, Qt::QueuedConnection);
     start_.start();
     socket->connectToHost(address, port_);
 }

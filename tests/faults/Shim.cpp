@@ -1,6 +1,6 @@
 // Stands between a program and the C library (LD_PRELOAD) and lets one kind of call fail: a fault at every file and
 // socket call, without a kernel of one's own. What it does stands in the environment:
-//   KTR_FAULT_CALL   open, read, write, fsync, rename, close, socket, connect, recv, send
+//   KTR_FAULT_CALL   open, read, write, fsync, rename, close, mkdir, flock, watch, socket, connect, recv, send
 //   KTR_FAULT_KIND   an error by its name (EIO, ENOSPC, EINTR, EMFILE, ...), or "short": one byte is read or written
 //   KTR_FAULT_FROM   the first call that fails, from 1
 //   KTR_FAULT_TIMES  how many in a row (1)
@@ -10,6 +10,8 @@
 #include <errno.h>
 #include <fcntl.h>
 #include <stdarg.h>
+#include <sys/file.h>
+#include <sys/inotify.h>
 #include <sys/mman.h>
 #include <sys/socket.h>
 #include <sys/stat.h>
@@ -173,6 +175,37 @@ ssize_t recv(int descriptor, void* bytes, size_t size, int flags) {
 ssize_t send(int descriptor, const void* bytes, size_t size, int flags) {
     return transferred("send", descriptor, size,
                        [&](size_t count) { return real(&::send, "send")(descriptor, bytes, count, flags); });
+}
+ssize_t pread64(int descriptor, void* bytes, size_t size, off64_t from) {
+    return transferred("read", descriptor, size,
+                       [&](size_t count) { return real(&::pread64, "pread64")(descriptor, bytes, count, from); });
+}
+/// All of it or an error: half a message is the receiver's affair, and there are recv and read for that.
+ssize_t recvmsg(int descriptor, msghdr* message, int flags) {
+    if (!isShort() && carriesBytes(descriptor) && isHit("recv")) {
+        errno = plan().number;
+        return -1;
+    }
+    return real(&::recvmsg, "recvmsg")(descriptor, message, flags);
+}
+ssize_t sendmsg(int descriptor, const msghdr* message, int flags) {
+    if (!isShort() && carriesBytes(descriptor) && isHit("send")) {
+        errno = plan().number;
+        return -1;
+    }
+    return real(&::sendmsg, "sendmsg")(descriptor, message, flags);
+}
+int mkdir(const char* folder, mode_t mode) noexcept {
+    return called("mkdir", [&] { return real(&::mkdir, "mkdir")(folder, mode); });
+}
+int flock(int descriptor, int how) noexcept {
+    return called("flock", [&] { return real(&::flock, "flock")(descriptor, how); });
+}
+int inotify_init1(int flags) noexcept {
+    return called("watch", [&] { return real(&::inotify_init1, "inotify_init1")(flags); });
+}
+int inotify_add_watch(int descriptor, const char* file, uint32_t events) noexcept {
+    return called("watch", [&] { return real(&::inotify_add_watch, "inotify_add_watch")(descriptor, file, events); });
 }
 int fsync(int descriptor) {
     return called("fsync", [&] { return real(&::fsync, "fsync")(descriptor); });

@@ -5,6 +5,7 @@
 #include <filesystem>
 #include <set>
 
+#include "tests/support/NoMoreFiles.h"
 #include "tests/transport/TransportTest.h"
 
 namespace ktr::test {
@@ -165,6 +166,21 @@ TEST_F(RequestTest, NobodyThere) {
     auto other = one;
     other.host = "nobody.invalid";
     EXPECT_EQ(ask(other).failure, HttpFailure::Network);
+}
+
+TEST_F(RequestTest, WithoutADescriptorForTheSocket_FailsWithTheReason) {
+    serve(gladly());
+    auto there = request();
+    EXPECT_EQ(ask(there).failure, HttpFailure::None);
+    // An address: a name could not be looked up either.
+    there.host = "127.0.0.1:" + std::to_string(server->port());
+    settings.domains = {there.host};
+    const test::NoMoreFiles none;
+    for (int round = 0; round < 3; ++round) {
+        const auto answer = ask(there);
+        EXPECT_EQ(answer.failure, HttpFailure::Network);
+        EXPECT_EQ(answer.reason, "too many files are open");
+    }
 }
 
 // Exactly once

@@ -108,6 +108,18 @@ TEST(AnswerParserTest, BodyOfExactlyTheLimitIsRead) {
     }
 }
 
+// Room for all of it would be asked for, and what asks for so much ends the program.
+TEST(AnswerParserTest, AnnouncedLengthBeyondTheLimit_MakesNoRoom) {
+    for (const char* length : {"1001", "11111111112", "9000000000000000000"}) {
+        for (const char* begin : {"", "HTTP/1.1 103 Early Hints\r\n\r\n"}) {
+            const std::string text =
+                std::string(begin) + "HTTP/1.1 200 OK\r\nContent-Length: " + length + "\r\n\r\nbody";
+            EXPECT_EQ(read(text), "the answer is too large");
+            EXPECT_EQ(read(text, 7), "the answer is too large");
+        }
+    }
+}
+
 TEST(AnswerParserTest, NothingWithoutEndIsKept) {
     const std::string status = "HTTP/1.1 200 OK\r\n";
     const std::string chunked = status + "Transfer-Encoding: chunked\r\n\r\n";

@@ -4,6 +4,7 @@
 #include <cmath>
 
 #include "linux/maps/MapDrawer.h"
+#include "tests/support/NoMoreFiles.h"
 #include "tests/support/PlatformTest.h"
 
 namespace ktr::linux_ {
@@ -49,6 +50,13 @@ class MapLabelsTest : public test::PlatformTest {
     LabelShaper shaper;
     std::vector<std::unique_ptr<MapDrawing>> drawings;
 };
+
+TEST_F(MapLabelsTest, FontThatCannotBeOpened_IsLeftOut) {
+    auto placed = labels();
+    const test::NoMoreFiles none;
+    // Letters of a font that nothing else here needs.
+    EXPECT_FALSE(placed.placeAt("ᏣᎳᎩ", look(), {150.0, 100.0}));
+}
 
 TEST_F(MapLabelsTest, Label_StandsAroundItsPoint) {
     auto placed = labels();

@@ -49,6 +49,14 @@ TEST(VCardTextTest, Essential_LeavesOutWhatIsBeyondItsCaps) {
     EXPECT_EQ(many, card(repeated("TEL:1\r\n", VCardText::kMostProperties - 1)));
 }
 
+// Whoever reads the text as C does would look for the two letters of a "=" behind its end.
+TEST(VCardTextTest, Essential_LeavesOutWhatIsNoText) {
+    const std::string whole = "BEGIN:VCARD\nFN:Ann\nEND:VCARD\n";
+    std::string card = whole;
+    card.insert(card.find("FN"), std::string("TEL;ENCODING=QUOTED-PRINTABLE:=\0C3\n", 35));
+    EXPECT_EQ(VCardText::essential(card), whole);
+}
+
 TEST(VCardTextTest, CardsAndProblems_AreCapped) {
     const std::string cards = repeated("BEGIN:VCARD\nEND:VCARD\n", VCardText::kMostCards + 1);
     const VCardText whole = VCardText::of(cards);
