@@ -54,8 +54,9 @@ Voice::~Voice() = default;
 host::Announcements::State Voice::look() const {
     host::Announcements::State state;
     state.listening = widget_.isActiveWindow();
-    state.reachable =
-        host_.live() == nullptr || host_.live()->service().notes().trouble != host::ServiceWatch::Trouble::Unreachable;
+    using Trouble = host::ServiceWatch::Trouble;
+    const auto trouble = host_.live() == nullptr ? Trouble::None : host_.live()->service().notes().trouble;
+    state.reachable = trouble == Trouble::None || trouble == Trouble::SignedOut;
     for (const auto& turn : host_.conversation()->turns()) {
         if (!turn->card()->hidden()) {
             state.cards.push_back({turn->card().get(), peopleOf(*turn)});

@@ -13,7 +13,6 @@ namespace {
 
 /// How long the status line says that a position is looked for, seconds.
 constexpr double kFindingPosition = 20.0;
-constexpr int kUnauthorized = 401;
 
 std::string trimmed(const std::string& text) {
     constexpr const char* kBlanks = " \t\r\n";
@@ -63,7 +62,7 @@ void LiveConversation::accountRead() {
             failure_ = std::move(failure);
             continue;
         }
-        shown();
+        shown(false);
         if (handlers_.asked) {
             handlers_.asked(*host_.conversation()->turns().back());
         }
@@ -126,7 +125,7 @@ void LiveConversation::receive(const std::weak_ptr<TurnView>& weakTurn, const Sc
     if (const auto turn = weakTurn.lock()) {
         host_.answer(*turn, answer);
         if (!turn->card()->hidden()) {
-            shown();
+            shown(true);
         }
         if (handlers_.answered) {
             handlers_.answered(*turn);
@@ -139,10 +138,11 @@ void LiveConversation::receive(const std::weak_ptr<TurnView>& weakTurn, const Sc
 Scenario LiveConversation::read(const linux_::AssistantClient::Answer& answer) {
     failure_.reset();
     Scenario scenario;
-    assistantIsAway_ = !answer.hasBody();
+    assistant_ = ServiceWatch::troubleOf(answer.failure, answer.status, answer.hasBody());
+    assistantEnded_ = now();
     if (!answer.hasBody()) {
         failure_ = Failure{ExitCode::Failure, "the assistant cannot be asked: " + answer.reason};
-        const bool isSignedIn = host_.live()->isSignedIn() && answer.status != kUnauthorized;
+        const bool isSignedIn = host_.live()->isSignedIn() && assistant_ != ServiceWatch::Trouble::SignedOut;
         const char* sentence = isSignedIn                   ? "ANSWER_UNREACHABLE"
                                : host_.live()->isUnusable() ? "STATUS_UNREADABLE"
                                                             : "ANSWER_SIGN_IN";
@@ -158,8 +158,9 @@ Scenario LiveConversation::read(const linux_::AssistantClient::Answer& answer) {
     return std::get<Scenario>(std::move(read));
 }
 
-void LiveConversation::shown() {
+void LiveConversation::shown(bool wasAsked) {
     shownAt_ = now();
+    wasAsked_ = wasAsked;
     if (positions_ || !host_.live()->looksForPosition()) {
         return;
     }
@@ -185,8 +186,10 @@ LiveStatus LiveConversation::status() const {
     facts.signedIn = host_.live()->isSignedIn();
     facts.unusable = host_.live()->isUnusable();
     facts.asking = askedAt_;
-    facts.assistantIsAway = assistantIsAway_;
+    facts.assistant = assistant_;
+    facts.assistantEnded = assistantEnded_;
     facts.shown = shownAt_;
+    facts.wasAsked = wasAsked_;
     facts.now = now();
     facts.findingPosition =
         findingPosition_ && shownAt_ &&

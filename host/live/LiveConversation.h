@@ -52,7 +52,8 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
     void receive(const std::weak_ptr<TurnView>& turn, const Scenario& answer);
     /// What to show for an answer; sets `failure_`.
     Scenario read(const linux_::AssistantClient::Answer& answer);
-    void shown();
+    /// Something has come on screen: an answer of the assistant's, or a scenario.
+    void shown(bool wasAsked);
     void tellChanged();
     platform::Date now() const;
 
@@ -66,8 +67,10 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
     std::vector<Scenario> scenarios_;
     int asking_ = 0;  ///< under way, or waiting
     std::optional<platform::Date> askedAt_;
-    bool assistantIsAway_ = false;
+    ServiceWatch::Trouble assistant_ = ServiceWatch::Trouble::None;
+    platform::Date assistantEnded_;
     std::optional<platform::Date> shownAt_;
+    bool wasAsked_ = false;
     std::optional<Failure> failure_;
     std::shared_ptr<platform::PlatformLocationManager> positions_;
     bool findingPosition_ = false;

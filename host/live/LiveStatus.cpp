@@ -38,18 +38,43 @@ std::string updated(const LiveStatus::Words& words, const std::string& key, doub
                        : sentence(words, key + "_HOURS", whole(age / kHour));
 }
 
+/// How the last that was asked of anybody ended: what the service has answered since goes before a question without an
+/// answer.
+ServiceWatch::Trouble troubleOf(const LiveStatus::Facts& facts) {
+    const auto& service = facts.service;
+    const bool isOver = service.answered && since(facts.assistantEnded, *service.answered) > 0.0;
+    return facts.assistant == ServiceWatch::Trouble::None || isOver ? service.trouble : facts.assistant;
+}
+
+/// The key of what is said while the service cannot help; null when that is not so.
+const char* keyOf(ServiceWatch::Trouble trouble) {
+    switch (trouble) {
+        case ServiceWatch::Trouble::Unreachable:
+            return "STATUS_OFFLINE";
+        case ServiceWatch::Trouble::Untrusted:
+            return "STATUS_UNTRUSTED";
+        case ServiceWatch::Trouble::Faulty:
+            return "STATUS_FAULTY";
+        case ServiceWatch::Trouble::SignedOut:
+        case ServiceWatch::Trouble::None:
+            break;
+    }
+    return nullptr;
+}
+
 }  // namespace
 
 LiveStatus LiveStatus::of(const Facts& facts, const Words& words) {
     using Trouble = ServiceWatch::Trouble;
     const auto& service = facts.service;
+    const Trouble trouble = troubleOf(facts);
     if (!facts.ready) {
         return {};
     }
     if (facts.unusable) {
         return {Mark::Warning, words.text("STATUS_UNREADABLE")};
     }
-    if (!facts.signedIn || service.trouble == Trouble::SignedOut) {
+    if (!facts.signedIn || trouble == Trouble::SignedOut) {
         return {Mark::Warning, words.text("STATUS_SIGN_IN")};
     }
     if (facts.asking && since(*facts.asking, facts.now) >= kPatience) {
@@ -58,9 +83,9 @@ LiveStatus LiveStatus::of(const Facts& facts, const Words& words) {
     const auto known = service.answered && facts.shown && since(*facts.shown, *service.answered) > 0.0
                            ? service.answered
                            : facts.shown;
-    if (facts.assistantIsAway || service.trouble == Trouble::Unreachable) {
+    if (const char* key = keyOf(trouble); key != nullptr) {
         return {Mark::Warning,
-                known ? sentence(words, "STATUS_OFFLINE_SINCE", words.clock(*known)) : words.text("STATUS_OFFLINE")};
+                known ? sentence(words, std::string(key) + "_SINCE", words.clock(*known)) : words.text(key)};
     }
     if (!known) {
         return {};
@@ -72,6 +97,9 @@ LiveStatus LiveStatus::of(const Facts& facts, const Words& words) {
     const bool hasAnswer = service.answered && *known == *service.answered;
     if (facts.findingPosition && !hasAnswer) {
         return {Mark::Waiting, words.text("STATUS_FINDING_YOU")};
+    }
+    if (!hasAnswer && !facts.wasAsked) {
+        return {};
     }
     const double interval = hasAnswer ? service.interval : kFirstInterval;
     const bool goesOn = service.underWay > 0 || (interval > 0.0 && age <= interval + kGrace);

@@ -23,10 +23,13 @@ struct LiveStatus {
         bool unusable = false;  ///< the configuration is broken
         /// Since when a question waits for its answer.
         std::optional<platform::Date> asking;
-        /// The last question found no assistant.
-        bool assistantIsAway = false;
+        /// How the last question ended, and when.
+        ServiceWatch::Trouble assistant = ServiceWatch::Trouble::None;
+        platform::Date assistantEnded;
         /// When what is on screen was first known; none: nothing is on screen.
         std::optional<platform::Date> shown;
+        /// What is on screen was an answer of the assistant's. Other than a scenario it says that somebody was asked.
+        bool wasAsked = false;
         /// The user's position is still looked for.
         bool findingPosition = false;
         /// What is on screen last says that friends cannot see the user.

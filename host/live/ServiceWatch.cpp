@@ -36,12 +36,28 @@ ServiceWatch::~ServiceWatch() {
     state_->changed = nullptr;
 }
 
-ServiceWatch::Trouble ServiceWatch::troubleOf(const HttpAnswer& answer) {
-    if (answer.failure == HttpFailure::None && answer.status == 401) {
-        return Trouble::SignedOut;
+ServiceWatch::Trouble ServiceWatch::troubleOf(HttpFailure failure, int status, bool isUsable) {
+    constexpr int kUnauthorized = 401;
+    switch (failure) {
+        case HttpFailure::None:
+            return status == kUnauthorized ? Trouble::SignedOut : isUsable ? Trouble::None : Trouble::Faulty;
+        case HttpFailure::Tls:
+            return Trouble::Untrusted;
+        case HttpFailure::BadAnswer:
+        case HttpFailure::TooLarge:
+        case HttpFailure::RedirectRefused:
+            return Trouble::Faulty;
+        case HttpFailure::BadRequest:
+        case HttpFailure::Network:
+        case HttpFailure::Timeout:
+        case HttpFailure::Cancelled:
+            break;
     }
-    const bool says = answer.failure == HttpFailure::None && answer.json && answer.json->dictionary() != nullptr;
-    return says ? Trouble::None : Trouble::Unreachable;
+    return Trouble::Unreachable;
+}
+
+ServiceWatch::Trouble ServiceWatch::troubleOf(const HttpAnswer& answer) {
+    return troubleOf(answer.failure, answer.status, answer.json && answer.json->dictionary() != nullptr);
 }
 
 double ServiceWatch::intervalOf(const HttpAnswer& answer) {

@@ -15,7 +15,9 @@ class ServiceWatch : public platform::HttpTransport {
   public:
     enum class Trouble {
         None,
-        Unreachable,  ///< no connection, a failing one, or an answer that says nothing
+        Unreachable,  ///< nothing could be reached: no connection, or one that failed
+        Untrusted,    ///< whoever was reached could not prove to be the service
+        Faulty,       ///< the service answers, but not what was asked for
         SignedOut,    ///< the service does not take the credentials
     };
 
@@ -42,7 +44,8 @@ class ServiceWatch : public platform::HttpTransport {
     const Notes& notes() const { return state_->notes; }
     void setChanged(std::function<void()> changed) { state_->changed = std::move(changed); }
 
-    /// What an answer says of the service. Any thread.
+    /// What an answer says of the service; `isUsable`: it has the content that was asked for. Any thread.
+    static Trouble troubleOf(platform::HttpFailure failure, int status, bool isUsable);
     static Trouble troubleOf(const platform::HttpAnswer& answer);
     /// After how many seconds the plugin will ask again after this answer; it also reads numbers that stand in a text.
     /// 0 where the service names none. Any thread.

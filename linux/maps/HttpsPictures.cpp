@@ -171,9 +171,9 @@ class HttpsPictures::Fetcher : public QObject {
         if (answer.status == kTooMany || answer.status == kUnavailable) {
             notBefore_ = now + retryAfter(answer.field("Retry-After"));
         }
-        const bool isAway = answer.failure == platform::HttpFailure::Network ||
-                            answer.failure == platform::HttpFailure::Tls ||
-                            answer.failure == platform::HttpFailure::Timeout;
+        const bool isAway =
+            answer.failure == platform::HttpFailure::Network || answer.failure == platform::HttpFailure::BadAnswer ||
+            answer.failure == platform::HttpFailure::Tls || answer.failure == platform::HttpFailure::Timeout;
         if (!isAway) {
             awayFor_ = seconds(0);
             return;

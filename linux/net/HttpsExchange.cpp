@@ -92,6 +92,7 @@ void HttpsExchange::goTo(const QUrl& url) {
     origin_ = Origin::fromUrl(url).value_or(Origin{});
     tlsTrouble_.clear();
     parser_ = std::make_unique<AnswerParser>(request_.maximumBytes);
+    hasHeard_ = false;
     connector_ = std::make_unique<Connector>([this](QSslSocket* socket) { connected(socket); },
                                              [this](const std::string& why) { failHop(HttpFailure::Network, why); });
     heard();
@@ -146,6 +147,7 @@ void HttpsExchange::readSome() {
         if (step.isEmpty()) {
             return;
         }
+        hasHeard_ = true;
         if (parser_->feed({step.constData(), static_cast<std::size_t>(step.size())}) !=
             AnswerParser::State::Incomplete) {
             answerEnded();
@@ -178,7 +180,10 @@ void HttpsExchange::connectionEnded() {
 void HttpsExchange::answerEnded() {
     if (parser_->state() != AnswerParser::State::Whole) {
         const bool isTooLarge = parser_->state() == AnswerParser::State::TooLarge;
-        failHop(isTooLarge ? HttpFailure::TooLarge : HttpFailure::Network, parser_->trouble());
+        const auto failure = isTooLarge  ? HttpFailure::TooLarge
+                             : hasHeard_ ? HttpFailure::BadAnswer
+                                         : HttpFailure::Network;
+        failHop(failure, parser_->trouble());
         return;
     }
     if (isRedirect(parser_->status())) {

@@ -101,6 +101,7 @@ class HttpsExchange : public QObject {
     std::string tlsTrouble_;
     int redirects_ = 0;
     bool hasLeft_ = false;
+    bool hasHeard_ = false;  ///< a byte of this hop's answer
     bool fromFallback_ = false;
     QTimer deadline_;
     QTimer inactivity_;

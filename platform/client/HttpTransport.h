@@ -38,8 +38,10 @@ enum class HttpFailure {
     /// No host, no legal URL or header, a scheme other than https, or a host that the account does not allow: nothing
     /// was sent.
     BadRequest,
-    /// No connection, a broken one, or an answer that is no HTTP.
+    /// No connection, or one that broke.
     Network,
+    /// An answer that is no HTTP, or that ended before it was whole.
+    BadAnswer,
     /// The other side could not prove to be the host.
     Tls,
     /// The deadline or the inactivity limit passed.

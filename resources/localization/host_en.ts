@@ -114,6 +114,26 @@
         <translation>Offline. Showing what was known at %@.</translation>
     </message>
     <message>
+        <source>STATUS_FAULTY</source>
+        <extracomment>Status line: the service answers, but with an error, or not in its own words; nothing is on screen</extracomment>
+        <translation>Service error.</translation>
+    </message>
+    <message>
+        <source>STATUS_FAULTY_SINCE</source>
+        <extracomment>The same with an answer on screen; %@ is the time of day when it was known</extracomment>
+        <translation>Service error. Showing what was known at %@.</translation>
+    </message>
+    <message>
+        <source>STATUS_UNTRUSTED</source>
+        <extracomment>Status line: whoever answers cannot prove to be the service; nothing is on screen</extracomment>
+        <translation>Service not trusted.</translation>
+    </message>
+    <message>
+        <source>STATUS_UNTRUSTED_SINCE</source>
+        <extracomment>The same with an answer on screen; %@ is the time of day when it was known</extracomment>
+        <translation>Service not trusted. Showing what was known at %@.</translation>
+    </message>
+    <message>
         <source>STATUS_SIGN_IN</source>
         <extracomment>Status line: the service does not take the account's credentials, or there is no account</extracomment>
         <translation>Sign in again to see your friends.</translation>

@@ -114,6 +114,26 @@
         <translation>Offline. Visar det som var känt %@.</translation>
     </message>
     <message>
+        <source>STATUS_FAULTY</source>
+        <extracomment>Status line: the service answers, but with an error, or not in its own words; nothing is on screen. English: “Service error.”</extracomment>
+        <translation>Fel hos tjänsten.</translation>
+    </message>
+    <message>
+        <source>STATUS_FAULTY_SINCE</source>
+        <extracomment>The same with an answer on screen; %@ is the time of day when it was known. English: “Service error. Showing what was known at %@.”</extracomment>
+        <translation>Fel hos tjänsten. Visar det som var känt %@.</translation>
+    </message>
+    <message>
+        <source>STATUS_UNTRUSTED</source>
+        <extracomment>Status line: whoever answers cannot prove to be the service; nothing is on screen. English: “Service not trusted.”</extracomment>
+        <translation>Tjänsten är inte betrodd.</translation>
+    </message>
+    <message>
+        <source>STATUS_UNTRUSTED_SINCE</source>
+        <extracomment>The same with an answer on screen; %@ is the time of day when it was known. English: “Service not trusted. Showing what was known at %@.”</extracomment>
+        <translation>Tjänsten är inte betrodd. Visar det som var känt %@.</translation>
+    </message>
+    <message>
         <source>STATUS_SIGN_IN</source>
         <extracomment>Status line: the service does not take the account's credentials, or there is no account. English: “Sign in again to see your friends.”</extracomment>
         <translation>Logga in igen för att se dina vänner.</translation>

@@ -123,27 +123,28 @@ class LiveTest(unittest.TestCase):
     # Faults: words of the fault, what the status line says at the end, what is on screen at the end.
     WAS, IS = "Ann Marsh, Place: Home", "Ann Marsh, Place: Fish Market"
     OFFLINE = r"Offline\. Showing what was known at \d?\d:\d\d"
+    FAULTY = r"Service error\. Showing what was known at \d?\d:\d\d"
     LIVE = "Live · updated just now"
     FAULTS = {
         "slow answers": ("delay=0.5", LIVE, IS),
         "cut before the answer": ("cut=before", OFFLINE, WAS),
-        "cut after the headers": ("cut=headers", OFFLINE, WAS),
-        "cut in the body": ("cut=body", OFFLINE, WAS),
+        "cut after the headers": ("cut=headers", FAULTY, WAS),
+        "cut in the body": ("cut=body", FAULTY, WAS),
         "credentials refused": ("status=401", "Sign in again to see your friends", WAS),
-        "forbidden": ("status=403", OFFLINE, WAS),
-        "server error": ("status=500", OFFLINE, WAS),
-        "unavailable later": ("status=503,at=3", OFFLINE, None),
+        "forbidden": ("status=403", FAULTY, WAS),
+        "server error": ("status=500", FAULTY, WAS),
+        "unavailable later": ("status=503,at=3", FAULTY, None),
         "redirect to itself": ("redirect={origin}{path},count=1", LIVE, IS),
-        "redirect for ever": ("redirect={origin}{path}", OFFLINE, WAS),
-        "redirect elsewhere": ("redirect=https://127.0.0.1:{port}{path}", OFFLINE, WAS),
-        "redirect without encryption": ("redirect=http://localhost:{port}{path}", OFFLINE, WAS),
-        "redirect that makes a GET": ("redirect={origin}{path},redirectStatus=302", OFFLINE, WAS),
-        "no JSON": ("body=not-json", OFFLINE, WAS),
-        "a list": ("body=array", OFFLINE, WAS),
-        "a million brackets": ("body=deep", OFFLINE, WAS),
+        "redirect for ever": ("redirect={origin}{path}", FAULTY, WAS),
+        "redirect elsewhere": ("redirect=https://127.0.0.1:{port}{path}", FAULTY, WAS),
+        "redirect without encryption": ("redirect=http://localhost:{port}{path}", FAULTY, WAS),
+        "redirect that makes a GET": ("redirect={origin}{path},redirectStatus=302", FAULTY, WAS),
+        "no JSON": ("body=not-json", FAULTY, WAS),
+        "a list": ("body=array", FAULTY, WAS),
+        "a million brackets": ("body=deep", FAULTY, WAS),
         "an endless body": ("body=endless", None, WAS),
-        "an empty body": ("body=empty", OFFLINE, WAS),
-        "a truncated body": ("body=truncated", OFFLINE, WAS),
+        "an empty body": ("body=empty", FAULTY, WAS),
+        "a truncated body": ("body=truncated", FAULTY, WAS),
         "a slow body": ("bytesPerSecond=20", LIVE, WAS),
         "an object of nothing": ("text={}", None, "Finding your friends…"),
         "half of the friends": ("statusCode=416", LIVE, IS),
@@ -285,6 +286,7 @@ class LiveTest(unittest.TestCase):
         self.assertEqual(result.returncode, 1)
         self.assertIn("Your assistant is out of reach right now.", result.stdout)
         self.assertIn("nobody who is trusted vouches for its certificate", result.stderr)
+        self.assertIn("ktr: Service not trusted.\n", result.stderr)
 
     def test_broken_configuration_is_told(self):
         config = self.folder / "config.json"

@@ -351,7 +351,7 @@ TEST_F(RequestTest, WhatIsNoHttp) {
         socket.write("SSH-2.0-OpenSSH_9.2\r\n");
         socket.disconnectFromHost();
     });
-    EXPECT_EQ(ask().failure, HttpFailure::Network);
+    EXPECT_EQ(ask().failure, HttpFailure::BadAnswer);
 }
 
 }  // namespace

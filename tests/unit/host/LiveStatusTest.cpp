@@ -6,6 +6,7 @@ namespace ktr::test {
 
 using host::LiveStatus;
 using platform::Date;
+using Trouble = host::ServiceWatch::Trouble;
 
 class LiveStatusTest : public ::testing::Test {
   protected:
@@ -13,6 +14,7 @@ class LiveStatusTest : public ::testing::Test {
         facts.ready = true;
         facts.signedIn = true;
         facts.shown = Date{100.0};
+        facts.wasAsked = true;
         facts.now = Date{105.0};
     }
     std::string words() const { return status().words; }
@@ -44,10 +46,56 @@ TEST_F(LiveStatusTest, HiddenUser_IsSaidInsteadOfHowLiveTheAnswerIs) {
 
 TEST_F(LiveStatusTest, TroubleGoesBeforeHiding) {
     facts.hidden = true;
-    facts.assistantIsAway = true;
+    facts.assistant = Trouble::Unreachable;
     EXPECT_EQ(status().mark, LiveStatus::Mark::Warning);
     facts.signedIn = false;
     EXPECT_EQ(words(), "STATUS_SIGN_IN");
+}
+
+TEST_F(LiveStatusTest, EachTroubleHasItsOwnWords) {
+    for (const auto& [trouble, key] :
+         {std::pair(Trouble::Unreachable, "STATUS_OFFLINE"), std::pair(Trouble::Untrusted, "STATUS_UNTRUSTED"),
+          std::pair(Trouble::Faulty, "STATUS_FAULTY")}) {
+        for (const bool isAssistants : {false, true}) {
+            facts.service.trouble = isAssistants ? Trouble::None : trouble;
+            facts.assistant = isAssistants ? trouble : Trouble::None;
+            facts.shown = Date{100.0};
+            EXPECT_EQ(status(), (LiveStatus{LiveStatus::Mark::Warning, std::string(key) + "_SINCE"}));
+            facts.shown.reset();
+            EXPECT_EQ(status(), (LiveStatus{LiveStatus::Mark::Warning, key}));
+        }
+    }
+}
+
+TEST_F(LiveStatusTest, CredentialsThatAreRefused_AreSaid_WhoeverRefusesThem) {
+    facts.service.trouble = Trouble::SignedOut;
+    EXPECT_EQ(words(), "STATUS_SIGN_IN");
+    facts.service.trouble = Trouble::None;
+    facts.assistant = Trouble::SignedOut;
+    EXPECT_EQ(words(), "STATUS_SIGN_IN");
+}
+
+TEST_F(LiveStatusTest, QuestionWithoutAnswer_IsForgottenOnceTheServiceAnswers) {
+    facts.assistant = Trouble::Faulty;
+    facts.assistantEnded = Date{102.0};
+    facts.service.interval = 30.0;
+    facts.service.answered = Date{101.0};
+    EXPECT_EQ(words(), "STATUS_FAULTY_SINCE");
+    facts.service.answered = Date{103.0};
+    EXPECT_EQ(words(), "STATUS_LIVE_NOW");
+}
+
+TEST_F(LiveStatusTest, ScenarioOnScreen_IsNotLiveBeforeTheServiceHasAnswered) {
+    facts.wasAsked = false;
+    EXPECT_EQ(status(), LiveStatus());
+    facts.service.underWay = 1;
+    EXPECT_EQ(status(), LiveStatus()) << "asked, and not answered";
+    facts.now = Date{100000.0};
+    EXPECT_EQ(status(), LiveStatus()) << "nor was it ever updated";
+    facts.service.interval = 30.0;
+    facts.service.answered = Date{100001.0};
+    facts.now = Date{100002.0};
+    EXPECT_EQ(words(), "STATUS_LIVE_NOW");
 }
 
 TEST_F(LiveStatusTest, BrokenConfiguration_IsNotTakenForSigningOut) {

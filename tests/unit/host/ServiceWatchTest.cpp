@@ -34,4 +34,25 @@ TEST_F(ServiceWatchTest, Interval_IsNoneForWhatEndsTheAsking) {
     EXPECT_EQ(ServiceWatch::intervalOf({}), 0.0);
 }
 
+TEST_F(ServiceWatchTest, Trouble_IsOfflineOnlyWhereNothingCouldBeReached) {
+    using platform::HttpFailure;
+    using Trouble = ServiceWatch::Trouble;
+    const auto of = [](HttpFailure failure, int status = 0) {
+        return ServiceWatch::troubleOf({failure, status, std::nullopt, std::nullopt});
+    };
+    for (const auto failure : {HttpFailure::BadRequest, HttpFailure::Network, HttpFailure::Timeout}) {
+        EXPECT_EQ(of(failure), Trouble::Unreachable) << static_cast<int>(failure);
+    }
+    for (const auto failure : {HttpFailure::BadAnswer, HttpFailure::TooLarge, HttpFailure::RedirectRefused}) {
+        EXPECT_EQ(of(failure), Trouble::Faulty) << static_cast<int>(failure);
+    }
+    EXPECT_EQ(of(HttpFailure::Tls), Trouble::Untrusted);
+    for (const int status : {200, 204, 304, 403, 404, 500, 503}) {
+        EXPECT_EQ(of(HttpFailure::None, status), Trouble::Faulty) << status;
+    }
+    EXPECT_EQ(of(HttpFailure::None, 401), Trouble::SignedOut);
+    EXPECT_EQ(ServiceWatch::troubleOf({HttpFailure::None, 200, Value(Value::Array{}), {}}), Trouble::Faulty);
+    EXPECT_EQ(ServiceWatch::troubleOf({HttpFailure::None, 200, Value(Dictionary()), {}}), Trouble::None);
+}
+
 }  // namespace ktr::test
