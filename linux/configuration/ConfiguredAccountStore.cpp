@@ -7,10 +7,26 @@
 #include "linux/configuration/TokenFile.h"
 #include "linux/device/Buses.h"
 #include "linux/device/LoadableModule.h"
+#include "linux/net/ServicePolicy.h"
 #include "platform/base/LogArea.h"
 #include "platform/client/KTJSONCommand.h"
 
 namespace ktr::linux_ {
+
+namespace {
+
+void sayEntriesForNobody(const Configuration::Account& account) {
+    const ServicePolicy policy(account.host.value_or(""), account.domains);
+    for (const std::string& entry : policy.entriesForNobody()) {
+        platform::areaLog(platform::LogArea::Account)
+            .write(platform::LogLevel::Error,
+                   "The entry \"%@\" of account.domains allows nobody: it is no host, or a domain in "
+                   "which anybody can have a name",
+                   platform::FormatArgument(entry).shown());
+    }
+}
+
+}  // namespace
 
 class ConfiguredAccountStore::OwnerAccount : public platform::DeviceOwnerAccount {
   public:
@@ -99,6 +115,9 @@ bool ConfiguredAccountStore::load() {
     if (!problem.empty()) {
         platform::areaLog(platform::LogArea::Account)
             .write(platform::LogLevel::Error, "%@", platform::FormatArgument(problem).shown());
+    }
+    if (configuration != nullptr && configuration->account && configuration->account != this->configuration().account) {
+        sayEntriesForNobody(*configuration->account);
     }
     const std::lock_guard<std::mutex> lock(mutex_);
     problem_ = problem;

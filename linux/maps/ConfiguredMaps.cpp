@@ -8,7 +8,6 @@
 #include "linux/maps/PictureGround.h"
 #include "linux/maps/VectorGround.h"
 #include "linux/maps/WorldGround.h"
-#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -46,13 +45,9 @@ std::shared_ptr<ThreadedMapSource> ConfiguredMaps::make(const Configuration& con
                                                         const std::shared_ptr<NetworkThread>& network) {
     std::shared_ptr<const MainlandArea> gcj02;
     if (configuration.maps.datum == Configuration::Maps::Datum::Gcj02) {
-        const auto file = resourceFolder / "maps" / "world.bin";
-        std::string reason;
-        if (const auto world = WorldMap::read(file, reason)) {
+        if (const auto world = WorldMap::readOrReport(resourceFolder / "maps" / "world.bin",
+                                                      "No place is shifted for maps in GCJ-02")) {
             gcj02 = std::make_shared<MainlandArea>(world->outline());
-        } else {
-            platform::areaLog(platform::LogArea::Maps)
-                .line("The built-in map %@ cannot be used: %@", file.string(), reason);
         }
     }
     return std::make_shared<ThreadedMapSource>(std::move(mainLoop), grounds(configuration, resourceFolder, network),

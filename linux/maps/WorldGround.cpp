@@ -10,7 +10,6 @@
 #include "linux/maps/MapStyle.h"
 #include "linux/maps/MapText.h"
 #include "linux/maps/WorldNames.h"
-#include "platform/base/LogArea.h"
 #include "platform/map/Mercator.h"
 
 namespace ktr::linux_ {
@@ -353,12 +352,7 @@ class Drawer {
 MapDrawn WorldGround::draw(const MapDrawing& drawing) {
     if (!isRead_) {
         isRead_ = true;
-        std::string reason;
-        map_ = WorldMap::read(file_, reason);
-        if (!map_) {
-            platform::areaLog(platform::LogArea::Maps)
-                .line("The built-in map %@ cannot be used: %@", file_.string(), reason);
-        }
+        map_ = WorldMap::readOrReport(file_, "Land without shores and names is drawn");
     }
     drawing.painter.save();
     QTransform toPixels = drawing.painter.transform();

@@ -7,6 +7,7 @@
 #include <libdeflate.h>
 
 #include "documents/FileReader.h"
+#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -132,6 +133,21 @@ std::shared_ptr<const WorldMap> WorldMap::read(const std::filesystem::path& file
     }
     const auto& data = std::get<std::string>(read);
     return parse({data.begin(), data.end()}, reason);
+}
+
+std::shared_ptr<const WorldMap> WorldMap::readOrReport(const std::filesystem::path& file, std::string_view missing) {
+    std::string reason;
+    auto map = read(file, reason);
+    if (!map) {
+        platform::areaLog(platform::LogArea::Maps)
+            .write(
+                platform::LogLevel::Error,
+                "The built-in map %@ cannot be used: %@. %@; it comes with ktr: install it again, or name the folder "
+                "that has maps/world.bin in KTR_RESOURCES",
+                platform::FormatArgument(file.string()).shown(), platform::FormatArgument(reason).shown(),
+                platform::FormatArgument(missing).shown());
+    }
+    return map;
 }
 
 std::shared_ptr<const WorldMap> WorldMap::parse(const std::vector<unsigned char>& data, std::string& reason) {

@@ -4,6 +4,7 @@
 #include <filesystem>
 #include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include <QPointF>
@@ -54,6 +55,8 @@ class WorldMap {
 
     /// None, and a reason, when the file cannot be read or is damaged.
     static std::shared_ptr<const WorldMap> read(const std::filesystem::path& file, std::string& reason);
+    /// The same; none is an error line in the log, with the reason, what is missing for it and what to do.
+    static std::shared_ptr<const WorldMap> readOrReport(const std::filesystem::path& file, std::string_view missing);
     static std::shared_ptr<const WorldMap> parse(const std::vector<unsigned char>& data, std::string& reason);
 
     const Level& levelFor(double zoom) const;

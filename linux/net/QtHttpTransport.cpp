@@ -5,7 +5,6 @@
 #include <variant>
 
 #include "documents/JsonReader.h"
-#include "platform/base/LogArea.h"
 
 namespace ktr::linux_ {
 
@@ -81,13 +80,6 @@ void QtHttpTransport::prepare() {
         return;
     }
     policy_ = ServicePolicy(settings.serviceHost.value_or(""), settings.domains);
-    for (const std::string& entry : policy_.entriesForNobody()) {
-        platform::areaLog(platform::LogArea::Net)
-            .write(platform::LogLevel::Error,
-                   "The entry \"%@\" of account.domains allows nobody: it is no host, or a domain in "
-                   "which anybody can have a name",
-                   entry);
-    }
     current_ = std::move(settings);
 }
 

@@ -162,18 +162,5 @@ TEST_F(TroubleTest, CancelledCommandsAreNoTrouble) {
     EXPECT_TRUE(said().empty());
 }
 
-TEST_F(TroubleTest, EntriesOfTheDomainsThatAllowNobody_AreSaidOnce) {
-    serve(gladly());
-    settings.domains = {{"co.uk", "127.0.0.1", "what is this"}};
-    for (const char* entry : {"co.uk", "what is this"}) {
-        expectErrorLine(
-            std::string("The entry \"") + entry +
-            "\" of account.domains allows nobody: it is no host, or a domain in which anybody can have a name");
-    }
-    ask();
-    ask();
-    EXPECT_EQ(said().size(), 2U);
-}
-
 }  // namespace
 }  // namespace ktr::test

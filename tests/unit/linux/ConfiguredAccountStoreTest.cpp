@@ -3,6 +3,7 @@
 #include "linux/device/Buses.h"
 #include "platform/client/KTJSONCommand.h"
 #include "tests/support/PlatformTest.h"
+#include "tests/support/RedactedLogSink.h"
 #include "tests/support/TemporaryFolder.h"
 
 namespace ktr::test {
@@ -74,6 +75,32 @@ TEST_F(ConfiguredAccountStoreTest, SecretService_IsWaitedForShortly_WhereAFileHa
     store().load();
     EXPECT_EQ(seconds, linux_::Buses::kSecretBesideAFile);
     EXPECT_LT(seconds, 5.0);
+}
+
+TEST_F(ConfiguredAccountStoreTest, DomainsThatAllowNobody_AreSaidOnce_Readably) {
+    const auto said = std::make_shared<RedactedLogSink>();
+    platform->logSink = said;
+    secret = "from the keyring";
+    const auto configure = [this](const std::string& domains) {
+        folder.write("config.json",
+                     R"({"account": {"personId": "7", "host": "f.example", "domains": )" + domains + "}}");
+    };
+    const auto line = [](const std::string& entry) {
+        return "The entry \"" + entry +
+               "\" of account.domains allows nobody: it is no host, or a domain in which anybody can have a name";
+    };
+    configure(R"(["co.uk", "127.0.0.1", "what is this"])");
+    auto signedIn = store();
+    EXPECT_TRUE(signedIn.load());
+    EXPECT_EQ(said->texts(), (std::vector{line("co.uk"), line("what is this")}));
+    EXPECT_FALSE(signedIn.load());
+    EXPECT_EQ(said->texts().size(), 2U) << "nothing changed";
+    configure(R"(["127.0.0.1"])");
+    EXPECT_TRUE(signedIn.load());
+    configure(R"(["org"])");
+    EXPECT_TRUE(signedIn.load());
+    EXPECT_EQ(said->texts().size(), 3U);
+    EXPECT_EQ(said->texts().back(), line("org"));
 }
 
 TEST_F(ConfiguredAccountStoreTest, TokenAndWhatIsSentOfIt_AreKnownAsSecrets) {

@@ -12,6 +12,7 @@
 
 #include "linux/maps/MapDrawer.h"
 #include "tests/support/PlatformTest.h"
+#include "tests/support/RedactedLogSink.h"
 #include "tests/support/maps/MbtilesWriter.h"
 #include "tests/support/maps/TileWriter.h"
 
@@ -230,9 +231,27 @@ TEST_F(ConfiguredMapsTest, Datum_IsTheConfigured) {
     const auto maps = ConfiguredMaps::make(configuration, KTR_RESOURCES, time);
     EXPECT_TRUE(maps->isInGcj02(kBeijing));
     EXPECT_FALSE(maps->isInGcj02({22.28, 114.16}));
-    EXPECT_FALSE(ConfiguredMaps::make(configuration, "/nowhere", time)->isInGcj02(kBeijing));
-    EXPECT_TRUE(log->has(platform::LogLevel::Default,
-                         "The built-in map /nowhere/maps/world.bin cannot be used: there is no such file"));
+}
+
+TEST_F(ConfiguredMapsTest, WithoutTheBuiltInMap_FileAndRemedyAreSaidOnce_Readably) {
+    const auto said = std::make_shared<test::RedactedLogSink>();
+    platform->logSink = said;
+    const auto line = [](const std::string& missing) {
+        return "The built-in map /nowhere/maps/world.bin cannot be used: there is no such file. " + missing +
+               "; it comes with ktr: install it again, or name the folder that has maps/world.bin in KTR_RESOURCES";
+    };
+    const auto grounds = ConfiguredMaps::grounds({}, "/nowhere");
+    platform::MapPictureRequest request;
+    request.viewport = {kPlace, kZoom, {400.0, 219.0}};
+    for (int i = 0; i < 2; ++i) {
+        MapDrawer::draw(request, grounds, {});
+    }
+    ASSERT_EQ(said->texts().size(), 2U) << "the demo's map is not there either";
+    EXPECT_EQ(said->texts().back(), line("Land without shores and names is drawn"));
+    Configuration configuration;
+    configuration.maps.datum = Configuration::Maps::Datum::Gcj02;
+    EXPECT_FALSE(ConfiguredMaps::make(configuration, "/nowhere", time)->isInGcj02({39.9, 116.4}));
+    EXPECT_EQ(said->texts().back(), line("No place is shifted for maps in GCJ-02"));
 }
 
 }  // namespace ktr::linux_

@@ -111,10 +111,14 @@ TEST_F(WorldGroundTest, InsideTheRegionOnly) {
 }
 
 TEST_F(WorldGroundTest, WithoutItsFile_PlainLandAndALine) {
+    expectErrorLine(
+        "The built-in map /nowhere/world.bin cannot be used: there is no such file. Land without shores and names is "
+        "drawn; it comes with ktr: install it again, or name the folder that has maps/world.bin in KTR_RESOURCES");
     ground = std::make_shared<WorldGround>("/nowhere/world.bin");
     EXPECT_EQ(middle(0.0, -150.0, 5.0), style.land);
     EXPECT_EQ(middle(0.0, -150.0, 5.0), style.land);
     EXPECT_FALSE(draw(request(0.0, 0.0, 0.0)).attribution.empty());
+    EXPECT_EQ(log->texts(platform::LogLevel::Error).size(), 1U);
 }
 
 TEST_F(WorldGroundTest, InTheDark_ItIsDark) {
