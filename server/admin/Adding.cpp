@@ -5,6 +5,8 @@
 #include "documents/AtomicFile.h"
 #include "documents/Words.h"
 #include "server/admin/Administration.h"
+#include "server/admin/TerminalCode.h"
+#include "server/page/QrCode.h"
 
 namespace ktr::server {
 
@@ -27,7 +29,7 @@ std::string Administration::add(const Newcomer& who) {
                         : documents::AtomicFile::makeFolder(folder);
     }
     if (complaint.empty()) {
-        complaint = addWithPhone(who.name, who.handles, who.key, who.shared);
+        complaint = addWithPhone(who);
     }
     for (const std::string& name : who.friends) {
         complaint = complaint.empty() ? befriend(who.name, name) : complaint;
@@ -44,6 +46,19 @@ std::string Administration::add(const Newcomer& who) {
         out_ << "ktr asks as " << who.name << " with " << (folder / "config.json").string() << "\n";
     }
     return complaint;
+}
+
+void Administration::showPhone(const PhoneSetUp& phone, const Newcomer& who) {
+    out_ << "In the phone's tracker, OwnTracks, choose the mode HTTP and type:\n  URL       " << phone.url
+         << "\n  User name " << phone.user << "\n  Password  " << phone.password
+         << "\nThe password is not shown again. The first place comes when the phone reports: an Android phone every 15"
+            " minutes\nwhile it rests, an iPhone when it has moved. Trackers that know only a URL take this one:\n  "
+         << phone.address() << "\n";
+    const auto code = who.code ? QrCode::of(phone.link()) : std::nullopt;
+    if (code) {
+        out_ << "Or let the phone's camera read this, once the app's settings allow configuration from outside:\n"
+             << terminalCode(*code, who.coloured);
+    }
 }
 
 }  // namespace ktr::server

@@ -4,6 +4,7 @@
 #include <filesystem>
 
 #include "documents/AtomicFile.h"
+#include "documents/NearestName.h"
 #include "documents/Words.h"
 #include "platform/base/Json.h"
 #include "server/admin/ServiceSettings.h"
@@ -43,7 +44,12 @@ std::string Administration::open() {
 std::optional<Person> Administration::person(const std::string& name, std::string& complaint) {
     auto found = store_->personNamed(name);
     if (!found) {
-        complaint = "there is nobody called " + documents::inQuotes(name) + "; ktr-service people lists all";
+        std::vector<std::string> names;
+        for (const Person& one : store_->people()) {
+            names.push_back(one.name);
+        }
+        complaint = "there is nobody called " + documents::inQuotes(name) + "; ktr-service people lists all" +
+                    documents::didYouMean(name, names);
     }
     return found;
 }
@@ -79,8 +85,8 @@ std::string Administration::init(const std::string& host, int port, const std::s
     return complaint;
 }
 
-std::string Administration::addWithPhone(const std::string& name, const std::vector<std::string>& handles,
-                                         const std::string& key, bool shared) {
+std::string Administration::addWithPhone(const Newcomer& who) {
+    const std::string& name = who.name;
     std::string complaint = open();
     if (!complaint.empty()) {
         return complaint;
@@ -92,7 +98,7 @@ std::string Administration::addWithPhone(const std::string& name, const std::vec
     if (!isName(name)) {
         return "expected a name of 1 to 40 plain letters without a colon, found " + documents::inQuotes(name);
     }
-    for (const std::string& handle : handles) {
+    for (const std::string& handle : who.handles) {
         const std::string plain = Store::normalisedHandle(handle);
         if (plain.size() < 3 || handle.size() > 254) {
             return "--handle: expected an e-mail address or a phone number, found " + documents::inQuotes(handle);
@@ -101,23 +107,21 @@ std::string Administration::addWithPhone(const std::string& name, const std::vec
             return "--handle: " + documents::inQuotes(handle) + " belongs to somebody else";
         }
     }
-    if (!key.empty() && !SealedText::seal("", key)) {
+    if (!who.key.empty() && !SealedText::seal("", who.key)) {
         return "--key: expected at most 32 letters";
     }
     if (store_->personNamed(name)) {
         return documents::inQuotes(name) + " is there already";
     }
     const auto secret = Secret::make();
-    if (!secret || !store_->addPerson(name, handles, now_)) {
+    if (!secret || !store_->addPerson(name, who.handles, now_)) {
         return "the person could not be written";
     }
-    if (!store_->addDevice(store_->personNamed(name)->id, DeviceKind::Phone, *secret, key, now_, shared)) {
+    if (!store_->addDevice(store_->personNamed(name)->id, DeviceKind::Phone, *secret, who.key, now_, who.shared)) {
         return "the phone's secret could not be written";
     }
-    out_ << name << " is added. In the phone's tracker choose the mode HTTP and type:\n  URL       "
-         << settings->origin() << "/pub\n  User name " << name << "\n  Password  " << *secret
-         << "\nThe password is not shown again. Trackers that know only a URL:\n  " << settings->origin()
-         << "/?id=" << *secret << "\n";
+    out_ << name << " is added.\n";
+    showPhone(PhoneSetUp::of(settings->origin(), name, *secret), who);
     return "";
 }
 

@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include "server/answers/PhoneSetUp.h"
 #include "server/http/ListeningSocket.h"
 #include "server/store/Store.h"
 
@@ -16,6 +17,8 @@ struct Newcomer {
     std::string name;
     std::vector<std::string> handles;  ///< by which friends ask
     std::string key;                   ///< with which the phone seals its messages; empty: it does not
+    bool code = false;                 ///< print a code for the phone's camera
+    bool coloured = false;             ///< in a terminal's colours
     std::vector<std::string> friends;  ///< whom the newcomer sees, and who see the newcomer, exactly
     bool shared = false;               ///< the phone is a child's, or several people's: it says by whom they are seen
     std::string ktr;                   ///< the folder of a configuration with which ktr asks; empty: none
@@ -77,8 +80,9 @@ class Administration {
     std::string serve(const Serving& where);
 
   private:
-    std::string addWithPhone(const std::string& name, const std::vector<std::string>& handles, const std::string& key,
-                             bool shared);
+    std::string addWithPhone(const Newcomer& who);
+    /// What to type into a phone's app, and where.
+    void showPhone(const PhoneSetUp& phone, const Newcomer& who);
     /// A new secret for ktr in that file, and the configuration that uses it.
     std::string makeReader(const std::string& name, const std::string& tokenFile, std::string& configuration);
     /// Opens the store; an empty text when it is open.

@@ -1,3 +1,5 @@
+#include <unistd.h>
+
 #include <CLI/CLI.hpp>
 #include <chrono>
 #include <cstdlib>
@@ -6,6 +8,7 @@
 #include <vector>
 
 #include "server/admin/Administration.h"
+#include "server/admin/Help.h"
 #include "server/admin/RuleCommands.h"
 
 namespace {
@@ -42,6 +45,7 @@ int main(int count, char** words) {
     add->add_option("--handle", newcomer.handles, "E-mail address or phone number by which friends ask")
         ->allow_extra_args(false);
     add->add_option("--key", newcomer.key, "With which the phone seals its messages");
+    add->add_flag("--code", newcomer.code, "Print a code for the phone's camera (in a terminal it is always printed)");
     add->add_flag("--shared", newcomer.shared, "The phone is a child's or shared: it shows by whom the person is seen");
     add->add_option("--friend", newcomer.friends, "Somebody there: the two see each other exactly")
         ->allow_extra_args(false);
@@ -74,8 +78,12 @@ int main(int count, char** words) {
     serve->add_option("--socket-group", where.place.group, "Group of the proxy's user, which may connect")
         ->needs(socket);
     const ktr::server::RuleCommands rules(program);
-    CLI11_PARSE(program, count, words);
+    if (const auto ended = ktr::server::parsed(program, count, words)) {
+        return *ended;
+    }
     newcomer.name = name;
+    newcomer.coloured = ::isatty(STDOUT_FILENO) != 0;
+    newcomer.code = newcomer.code || newcomer.coloured;
 
     const auto now =
         std::chrono::duration_cast<std::chrono::seconds>(std::chrono::system_clock::now().time_since_epoch()).count();
