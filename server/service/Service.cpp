@@ -150,12 +150,12 @@ std::optional<Device> Service::authenticated(const HttpRequest& request, const s
     return device;
 }
 
-std::vector<Fix> Service::admitted(const Report& report) {
+std::vector<Fix> Service::admitted(const Device& device, const Report& report) {
     ++counters_.posts;
     counters_.junk += report.kind == Report::Kind::Junk ? 1 : 0;
     std::vector<Fix> fixes;
     for (const RawFix& raw : report.fixes) {
-        const auto [fix, loss] = FixRules::admit(raw, now_());
+        const auto [fix, loss] = FixRules::admit(raw, now_(), device.retention);
         counters_.droppedNoPlace += loss == FixRules::Loss::NoPlace ? 1 : 0;
         counters_.droppedNoTime += loss == FixRules::Loss::NoTime ? 1 : 0;
         counters_.droppedTooOld += loss == FixRules::Loss::TooOld ? 1 : 0;
@@ -173,7 +173,7 @@ void Service::takeOwnTracks(const HttpRequest& request, const HttpReply& reply) 
         return;
     }
     const Report report = PhoneMessages::ownTracks(request.body, device->key);
-    store_->keep(device->id, device->person, admitted(report), store_->present(now_()),
+    store_->keep(device->id, device->person, admitted(*device, report), store_->present(now_()),
                  [this, device = *device, sealed = report.sealed, reply](bool good) {
                      if (!good) {
                          // A phone keeps what got a 5xx and sends it again.
@@ -218,10 +218,11 @@ void Service::takeParameters(const HttpRequest& request, const HttpReply& reply)
     if (!device) {
         return;
     }
-    store_->keep(device->id, device->person, admitted(report), store_->present(now_()), [this, reply](bool good) {
-        counters_.storeFailures += good ? 0 : 1;
-        reply.send(good ? HttpResponse() : refusal(503, "the store cannot be written"));
-    });
+    store_->keep(device->id, device->person, admitted(*device, report), store_->present(now_()),
+                 [this, reply](bool good) {
+                     counters_.storeFailures += good ? 0 : 1;
+                     reply.send(good ? HttpResponse() : refusal(503, "the store cannot be written"));
+                 });
 }
 
 void Service::answerCommand(const HttpRequest& request, const HttpReply& reply) {

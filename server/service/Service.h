@@ -60,7 +60,7 @@ class Service {
     void takeOwnTracks(const HttpRequest& request, const HttpReply& reply);
     void takeParameters(const HttpRequest& request, const HttpReply& reply);
     /// What of a report is kept; counts the rest.
-    std::vector<Fix> admitted(const Report& report);
+    std::vector<Fix> admitted(const Device& device, const Report& report);
     HttpResponse friendsAnswer(const Device& device, bool sealed);
     void answerCommand(const HttpRequest& request, const HttpReply& reply);
     HttpResponse locations(const Device& device, const platform::Dictionary& body);

@@ -82,6 +82,9 @@ class Database {
 
     /// Begins a transaction that will write. False: nothing can be written now, and no transaction is open.
     virtual bool begin() = 0;
+    /// Begins a transaction that only reads, as everything is at this moment; `rollback` ends it. False: nothing can be
+    /// read now, and no transaction is open.
+    virtual bool beginReading() = 0;
     /// Waits until it is known what all statements did; false when one failed.
     virtual bool settle() = 0;
     /// False: nothing of the transaction was kept, unless the connection broke in that very moment. `rollback` follows.
@@ -98,6 +101,8 @@ class Database {
     virtual void setSchema(int number) = 0;
     /// In a transaction: lets no other process migrate at the same time.
     virtual void lockSchema() = 0;
+    /// Outside of a transaction: what was deleted leaves the files, as far as that is in the connection's hands.
+    virtual void scrub() = 0;
     /// Whether what is kept is whole and safe: empty, or what is wrong with it.
     virtual std::string check() = 0;
 

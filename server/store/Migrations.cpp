@@ -61,6 +61,15 @@ CREATE TABLE place (
     name {text} NOT NULL, label {text} NOT NULL, latitude {real} NOT NULL, longitude {real} NOT NULL,
     radius {real} NOT NULL, said {integer} NOT NULL, UNIQUE (owner, name)) {strict};
 )",
+    // 4: what tells somebody who was forgotten from everybody else; readers that wait for their person's word; how long
+    // looks are kept.
+    R"(
+ALTER TABLE person ADD COLUMN identity {bytes} NOT NULL DEFAULT {no bytes};
+UPDATE person SET identity = {random bytes};
+ALTER TABLE person ADD COLUMN looks_retention {integer} NOT NULL DEFAULT 2592000;
+ALTER TABLE device ADD COLUMN suspended {integer} NOT NULL DEFAULT 0;
+CREATE TABLE forgotten (hash {bytes} NOT NULL PRIMARY KEY, made {integer} NOT NULL) {strict by key};
+)",
 };
 
 }  // namespace

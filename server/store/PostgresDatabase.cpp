@@ -329,16 +329,24 @@ bool PostgresDatabase::execute(const std::string& sql) {
     return !failed();
 }
 
-bool PostgresDatabase::begin() {
+bool PostgresDatabase::start(const char* beginning) {
     refresh();
-    if (!failed() && !execute("BEGIN") && !isConnected()) {
+    if (!failed() && !execute(beginning) && !isConnected()) {
         refresh();
         if (!failed()) {
-            execute("BEGIN");
+            execute(beginning);
         }
     }
     inTransaction_ = !failed();
     return inTransaction_;
+}
+
+bool PostgresDatabase::begin() {
+    return start("BEGIN");
+}
+
+bool PostgresDatabase::beginReading() {
+    return start("BEGIN ISOLATION LEVEL REPEATABLE READ READ ONLY");
 }
 
 bool PostgresDatabase::settle() {

@@ -28,6 +28,7 @@ class PostgresDatabase final : public Database {
 
     bool execute(const std::string& sql) override;
     bool begin() override;
+    bool beginReading() override;
     bool settle() override;
     bool commit() override;
     void rollback() override;
@@ -36,6 +37,7 @@ class PostgresDatabase final : public Database {
     std::optional<int> schema() override;
     void setSchema(int number) override;
     void lockSchema() override;
+    void scrub() override {}  // the server does that in its own time
     std::string check() override;
 
   protected:
@@ -57,6 +59,7 @@ class PostgresDatabase final : public Database {
     using Result = std::unique_ptr<pg_result, FreeResult>;
 
     explicit PostgresDatabase(pg_conn* connection) : connection_(connection) {}
+    bool start(const char* beginning);
     bool setUp();
     void connectAgain();
     bool isConnected() const;

@@ -24,6 +24,17 @@ struct Person {
     std::string zone = {};  ///< where their day ends, as for `WallClock`
 };
 
+/// How long something is kept of a person. A value.
+struct Retention {
+    static constexpr std::int64_t kLongestFixes = std::int64_t{48} * 3600;
+    static constexpr std::int64_t kLongestLooks = std::int64_t{30} * 86400;
+
+    std::int64_t fixes = kLongestFixes;  ///< seconds
+    std::int64_t looks = kLongestLooks;  ///< seconds; full hours count
+
+    bool operator==(const Retention&) const = default;
+};
+
 /// Who is behind a secret. A value.
 struct Device {
     std::int64_t id = 0;
@@ -31,9 +42,10 @@ struct Device {
     std::int64_t person = 0;
     std::string name;  ///< of the person
     bool hidden = false;
-    std::string key;        ///< with which the phone seals its messages; empty: it does not
-    std::string cardsSent;  ///< the hash of what it was last told of its friends' names
-    bool shared = false;    ///< it is a child's, or several people's: it says itself by whom they are seen
+    std::int64_t retention = 0;  ///< how long the person's fixes are kept, seconds
+    std::string key;             ///< with which the phone seals its messages; empty: it does not
+    std::string cardsSent;       ///< the hash of what it was last told of its friends' names
+    bool shared = false;         ///< it is a child's, or several people's: it says itself by whom they are seen
 };
 
 /// A phone or a reader, as its person sees it. Times are seconds since 1970. A value.

@@ -36,6 +36,12 @@ std::string makeFile(const std::string& file) {
     return ::stat(file.c_str(), &facts) == 0 && S_ISREG(facts.st_mode) ? "" : "is not a file";
 }
 
+/// What a column without a value would have, by the word in its table.
+Type declaredType(const char* word) {
+    const std::string_view type = word == nullptr ? std::string_view() : std::string_view(word);
+    return type == "REAL" ? Type::Real : type == "TEXT" ? Type::Text : type == "BLOB" ? Type::Bytes : Type::Integer;
+}
+
 void bindValue(sqlite3_stmt* statement, int place, const DatabaseValue& value) {
     if (place == 0 || value.isNone) {
         return;  // a parameter without a value is none
@@ -100,7 +106,7 @@ class SqliteDatabase::Cursor final : public Database::Rows {
             case SQLITE_BLOB:
                 return DatabaseValue::of(Type::Bytes, bytes());
             default:
-                return {};
+                return DatabaseValue::none(declaredType(::sqlite3_column_decltype(statement_, column)));
         }
     }
 
@@ -210,6 +216,10 @@ bool SqliteDatabase::begin() {
     return execute("BEGIN IMMEDIATE");
 }
 
+bool SqliteDatabase::beginReading() {
+    return execute("BEGIN");
+}
+
 bool SqliteDatabase::commit() {
     return execute("COMMIT");
 }
@@ -252,6 +262,11 @@ std::optional<int> SqliteDatabase::schema() {
 void SqliteDatabase::setSchema(int number) {
     execute("PRAGMA application_id = " + std::to_string(kApplication) +
             "; PRAGMA user_version = " + std::to_string(number));
+}
+
+void SqliteDatabase::scrub() {
+    // The log in front of the file still has pages as they were.
+    execute("PRAGMA wal_checkpoint(TRUNCATE)");
 }
 
 std::string SqliteDatabase::check() {

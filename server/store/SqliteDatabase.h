@@ -27,6 +27,7 @@ class SqliteDatabase final : public Database {
 
     bool execute(const std::string& sql) override;
     bool begin() override;
+    bool beginReading() override;
     bool settle() override { return !failed(); };
     bool commit() override;
     void rollback() override;
@@ -34,6 +35,7 @@ class SqliteDatabase final : public Database {
     std::optional<int> schema() override;
     void setSchema(int number) override;
     void lockSchema() override {}  // a transaction that will write has the file for itself
+    void scrub() override;
     std::string check() override;
 
   protected:

@@ -13,6 +13,7 @@
 #include <utility>
 #include <vector>
 
+#include "platform/base/Value.h"
 #include "server/ingest/Fix.h"
 #include "server/store/Database.h"
 #include "server/store/Records.h"
@@ -99,6 +100,20 @@ class Store {
     std::vector<std::pair<std::string, Grant>> grantsOf(std::int64_t owner);
     /// When one of a person's devices was last heard; none: never.
     std::optional<std::int64_t> lastHeard(std::int64_t person);
+    /// How long is kept what; what is too old by it goes at once.
+    bool setRetention(std::int64_t person, const Retention& retention, std::int64_t now);
+    std::optional<Retention> retention(std::int64_t person);
+    /// Deletes a person and all that refers to them. What stays is a hash by which no backup brings them back.
+    bool forget(std::int64_t person, std::int64_t now);
+    /// All that is kept of a person, by table, others by their names; without secrets. None when it cannot be read.
+    std::optional<platform::Dictionary> everythingOf(std::int64_t person);
+    /// Writes a backup (see StoreCopy) while others go on; empty when done, else a sentence.
+    std::string backup(const std::string& file);
+    /// Replaces everything by a backup; empty when done, else a sentence, and nothing was changed. Everybody is hidden
+    /// afterwards, and readers do nothing until their person confirms. `folder`: where a copy of the backup can be.
+    std::string restore(const std::string& file, const std::string& folder, std::int64_t now);
+    /// After a restore, on the word of the person: how many readers work again.
+    int confirm(std::int64_t person);
     /// Whether the store is whole: empty, or what is wrong with it.
     std::string check();
 
@@ -162,6 +177,7 @@ class Store {
     static void endOnArrival(Database& database, std::int64_t owner, const std::vector<Fix>& fixes, std::int64_t now);
     /// What else decides what is seen by a grant: fixes, and places where they may be said.
     void readSight(Database& database, std::int64_t owner, Sharing& sharing);
+    static void deleteOldOf(Database& database, std::int64_t person, const Retention& retention, std::int64_t now);
     void readFixes(Database& database, std::int64_t owner, Sharing& sharing);
     static void endBrowsersIn(Database& database, std::int64_t person);
 

@@ -1,5 +1,4 @@
 // The part of the store that people use from a command line: every call waits for the disk.
-#include "server/ingest/FixRules.h"
 #include "server/store/Secret.h"
 #include "server/store/Store.h"
 
@@ -8,10 +7,14 @@ namespace ktr::server {
 bool Store::addPerson(const std::string& name, const std::vector<std::string>& handles, std::int64_t now) {
     const std::int64_t person = Secret::number();
     return person != 0 && writeNow([&](Database& database) {
-               database.statement("INSERT INTO person (id, name, retention, made) VALUES ($1, $2, $3, $4)")
+               database
+                   .statement(
+                       "INSERT INTO person (id, name, retention, looks_retention, made, identity) VALUES ($1, $2, $3, "
+                       "$4, $5, {random bytes})")
                    .bind(person)
                    .bind(name)
-                   .bind(FixRules::kRetention)
+                   .bind(Retention::kLongestFixes)
+                   .bind(Retention::kLongestLooks)
                    .bind(now)
                    .run();
                std::int64_t place = 0;

@@ -7,7 +7,6 @@ namespace {
 
 /// More than this at a step makes those who post wait.
 constexpr std::int64_t kPeopleAStep = 10;
-constexpr std::int64_t kViewedRetention = std::int64_t{30} * 86400;
 
 }  // namespace
 
@@ -76,26 +75,31 @@ void Store::noteCards(std::int64_t device, std::string hash, Done done) {
         std::move(done));
 }
 
+void Store::deleteOldOf(Database& database, std::int64_t person, const Retention& retention, std::int64_t now) {
+    database.statement("DELETE FROM fix WHERE person = $1 AND time < $2")
+        .bind(person)
+        .bind(now - retention.fixes)
+        .run();
+    database.statement("DELETE FROM viewed WHERE owner = $1 AND hour < $2")
+        .bind(person)
+        .bind((now - retention.looks) / 3600)
+        .run();
+}
+
 void Store::deleteOld(std::int64_t now, Done done) {
     write(
         [this, now](Database& database) {
-            std::vector<std::pair<std::int64_t, std::int64_t>> people;
+            std::vector<std::pair<std::int64_t, Retention>> people;
             {
-                auto row = database.statement("SELECT id, retention FROM person WHERE id > $1 ORDER BY id LIMIT $2");
+                auto row = database.statement(
+                    "SELECT id, retention, looks_retention FROM person WHERE id > $1 ORDER BY id LIMIT $2");
                 row.bind(lastSwept_).bind(kPeopleAStep);
                 while (row.next()) {
-                    people.emplace_back(row.integer(0), row.integer(1));
+                    people.emplace_back(row.integer(0), Retention{row.integer(1), row.integer(2)});
                 }
             }
             for (const auto& [person, retention] : people) {
-                database.statement("DELETE FROM fix WHERE person = $1 AND time < $2")
-                    .bind(person)
-                    .bind(now - retention)
-                    .run();
-                database.statement("DELETE FROM viewed WHERE owner = $1 AND hour < $2")
-                    .bind(person)
-                    .bind((now - kViewedRetention) / 3600)
-                    .run();
+                deleteOldOf(database, person, retention, now);
             }
             lastSwept_ = people.size() < static_cast<std::size_t>(kPeopleAStep) ? 0 : people.back().first;
         },
