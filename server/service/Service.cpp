@@ -256,18 +256,25 @@ HttpResponse Service::locations(const Device& device, const Dictionary& body) {
         return refusal(400, complaint);
     }
     store_->present(now_());
+    std::vector<std::string> lookedUp = request->handles;
+    lookedUp.resize(std::min(lookedUp.size(), LocationAnswers::kMostHandles));
+    const auto people = store_->asked(device.person, lookedUp);
+    if (!people) {
+        ++counters_.storeFailures;
+        return refusal(503, "the store cannot be read");
+    }
     std::vector<AskedFriend> asked;
     std::vector<std::int64_t> seen;
     for (const std::string& handle : request->handles) {
-        if (asked.size() >= LocationAnswers::kMostHandles) {
-            asked.push_back({handle, 0, std::nullopt});
+        asked.push_back({handle, 0, std::nullopt});
+        if (asked.size() > people->size()) {
             continue;
         }
-        const auto owner = store_->personOf(handle);
-        const auto sharing = owner ? store_->sharing(device.person, *owner) : std::nullopt;
-        asked.push_back({handle, owner.value_or(0), sharing ? Visibility::visible(*sharing, now_()) : std::nullopt});
+        const Asked& one = (*people)[asked.size() - 1];
+        asked.back().person = one.person;
+        asked.back().seen = Visibility::visible(one.sharing, now_());
         if (asked.back().seen) {
-            seen.push_back(*owner);
+            seen.push_back(one.person);
         }
     }
     if (!seen.empty()) {

@@ -48,6 +48,12 @@ struct Device {
     bool shared = false;         ///< it is a child's, or several people's: it says itself by whom they are seen
 };
 
+/// What a handle stands for, to somebody who asks for it. A value.
+struct Asked {
+    std::int64_t person = 0;  ///< 0: nobody has this handle
+    Sharing sharing;          ///< without a grant when nobody has it
+};
+
 /// A phone or a reader, as its person sees it. Times are seconds since 1970. A value.
 struct DeviceFacts {
     std::int64_t id = 0;

@@ -65,7 +65,11 @@ class Store {
     std::vector<Person> people();
     /// What decides what a viewer sees of an owner. None for one whom nobody knows.
     std::optional<Sharing> sharing(std::int64_t viewer, std::int64_t owner);
-    /// Everybody who has granted something to a viewer.
+    /// The same for each of these handles, in their order, with whom it belongs to; none in place of a person for one
+    /// that nobody has. It takes as long for a stranger. Of somebody who is seen exactly the newest fix alone is read.
+    /// None: the store could not be read.
+    std::optional<std::vector<Asked>> asked(std::int64_t viewer, const std::vector<std::string>& handles);
+    /// Everybody who has granted something to a viewer; fixes as in `asked`.
     std::vector<Friend> friendsOf(std::int64_t viewer);
     /// Who saw somebody, the newest hour first.
     std::vector<Look> looksAt(std::int64_t owner);
@@ -176,9 +180,10 @@ class Store {
     /// Ends grants whose owner has arrived.
     static void endOnArrival(Database& database, std::int64_t owner, const std::vector<Fix>& fixes, std::int64_t now);
     /// What else decides what is seen by a grant: fixes, and places where they may be said.
-    void readSight(Database& database, std::int64_t owner, Sharing& sharing);
     static void deleteOldOf(Database& database, std::int64_t person, const Retention& retention, std::int64_t now);
-    void readFixes(Database& database, std::int64_t owner, Sharing& sharing);
+    enum class Depth { All, Needed };
+    void readSight(Database& database, std::int64_t owner, Depth depth, Sharing& sharing);
+    void readFixes(Database& database, std::int64_t owner, Depth depth, Sharing& sharing);
     static void endBrowsersIn(Database& database, std::int64_t person);
 
     std::mutex readMutex_;

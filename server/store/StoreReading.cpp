@@ -101,21 +101,31 @@ Sharing Store::sharingOf(Database::Run& row, int firstColumn) {
     return sharing;
 }
 
-void Store::readSight(Database& database, std::int64_t owner, Sharing& sharing) {
+void Store::readSight(Database& database, std::int64_t owner, Depth depth, Sharing& sharing) {
     // Of an ended grant nothing is read: it takes no longer than that of a stranger.
     if (!sharing.grant || sharing.hidden || sharing.latest >= sharing.grant->end()) {
         return;
     }
-    readFixes(database, owner, sharing);
+    readFixes(database, owner, depth, sharing);
     if (Visibility::cellSide(sharing.grant->precision) == 0.0) {
         sharing.places = readPlaces(database, owner);
     }
 }
 
-void Store::readFixes(Database& database, std::int64_t owner, Sharing& sharing) {
+void Store::readFixes(Database& database, std::int64_t owner, Depth depth, Sharing& sharing) {
+    const std::int64_t first = std::max(sharing.grant->from, sharing.shownSince);
+    if (depth == Depth::Needed && sharing.grant->precision == Precision::Exact) {
+        auto row = database.statement(
+            "SELECT time, heard, latitude, longitude, accuracy FROM fix WHERE person = $1 AND time >= $2 "
+            "AND heard >= $2 ORDER BY time DESC LIMIT 1");
+        if (row.bind(owner).bind(first).next()) {
+            sharing.fixes.push_back({row.integer(0), row.integer(1), row.real(2), row.real(3), row.maybeReal(4)});
+        }
+        return;
+    }
     auto row = database.statement(
         "SELECT time, heard, latitude, longitude, accuracy FROM fix WHERE person = $1 AND time >= $2 ORDER BY time");
-    row.bind(owner).bind(std::max(sharing.grant->from, sharing.shownSince));
+    row.bind(owner).bind(first);
     while (row.next()) {
         sharing.fixes.push_back({row.integer(0), row.integer(1), row.real(2), row.real(3), row.maybeReal(4)});
     }
@@ -131,8 +141,27 @@ std::optional<Sharing> Store::sharing(std::int64_t viewer, std::int64_t owner) {
         return std::nullopt;
     }
     Sharing sharing = sharingOf(row, 0);
-    readSight(*reading, owner, sharing);
+    readSight(*reading, owner, Depth::All, sharing);
     return sharing;
+}
+
+std::optional<std::vector<Asked>> Store::asked(std::int64_t viewer, const std::vector<std::string>& handles) {
+    const Reading reading(*this);
+    std::vector<Asked> all;
+    for (const std::string& handle : handles) {
+        Asked one;
+        auto row = reading->statement(
+            "SELECT person.id, hidden, shown_since, retention, (SELECT latest FROM clock), exactness, since, until, "
+            "arrival, aloud, confirmed FROM handle JOIN person ON person.id = handle.person "
+            "LEFT JOIN share ON share.owner = person.id AND share.viewer = $1 WHERE handle.text = $2");
+        if (row.bind(viewer).bind(normalisedHandle(handle)).next()) {
+            one.person = row.integer(0);
+            one.sharing = sharingOf(row, 1);
+            readSight(*reading, one.person, Depth::Needed, one.sharing);
+        }
+        all.push_back(std::move(one));
+    }
+    return reading->failed() ? std::nullopt : std::optional(std::move(all));
 }
 
 std::vector<Friend> Store::friendsOf(std::int64_t viewer) {
@@ -145,7 +174,7 @@ std::vector<Friend> Store::friendsOf(std::int64_t viewer) {
     row.bind(viewer);
     while (row.next()) {
         Friend one{row.integer(0), row.text(1), sharingOf(row, 2)};
-        readSight(*reading, one.person, one.sharing);
+        readSight(*reading, one.person, Depth::Needed, one.sharing);
         friends.push_back(std::move(one));
     }
     return friends;

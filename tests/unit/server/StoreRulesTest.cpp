@@ -265,6 +265,44 @@ TEST_P(StoreRules, Looks_AreReadByTheHour_AskedApartFromCarriedAlong) {
     EXPECT_TRUE(store_->looksAt(otto_).empty());
 }
 
+TEST_P(StoreRules, AskedHandles_GiveWhatIsSeenOfEach_WhoeverTheyAre) {
+    ASSERT_TRUE(keep({fix(kNow - 20), fix(kNow - 10, 50.3)}));
+    const auto asked = store_->asked(otto_, {"nobody@x.example", "ANN@x.example", "mara@x.example", "ann@x.example"});
+    ASSERT_TRUE(asked);
+    ASSERT_EQ(asked->size(), 4U);
+    EXPECT_EQ((*asked)[0].person, 0);
+    EXPECT_EQ((*asked)[2].person, mara_);
+    EXPECT_EQ((*asked)[2].sharing.grant, std::nullopt);
+    for (const std::size_t ann : {std::size_t{1}, std::size_t{3}}) {
+        EXPECT_EQ((*asked)[ann].person, ann_);
+        EXPECT_EQ(Visibility::visible((*asked)[ann].sharing, kNow), seen(otto_));
+        EXPECT_EQ((*asked)[ann].sharing.fixes.size(), 1U) << "no more than is seen";
+    }
+    EXPECT_EQ(Visibility::visible(store_->friendsOf(otto_).at(0).sharing, kNow), seen(otto_));
+}
+
+TEST_P(StoreRules, NewestFix_IsTheNewestOfThoseHeardSinceTheShowing) {
+    // By a clock that is ahead, before the hiding; then by one that was put right.
+    ASSERT_TRUE(keep({{kNow + 250, kNow, 50.2, -3.1, 12.0}}));
+    ASSERT_TRUE(hides());
+    ASSERT_TRUE(store_->setHidden(ann_, false, kNow + 100));
+    ASSERT_TRUE(keep({{kNow + 110, kNow + 110, 50.3, -3.1, 12.0}}, kNow + 110));
+    const auto asked = store_->asked(otto_, {"ann@x.example"});
+    ASSERT_TRUE(asked);
+    const auto what = Visibility::visible(asked->at(0).sharing, kNow + 300);
+    ASSERT_TRUE(what);
+    EXPECT_EQ(what->latitude, 50.3);
+    EXPECT_EQ(what, seen(otto_, kNow + 300));
+}
+
+TEST_P(StoreRules, EndedGrant_ReadsNothing) {
+    ASSERT_TRUE(keep({fix(kNow - 20)}));
+    ASSERT_TRUE(store_->grant(ann_, otto_, {Precision::Exact, kNow - 1000, kNow + 5}));
+    store_->present(kNow + 5);
+    EXPECT_TRUE(store_->asked(otto_, {"ann@x.example"})->at(0).sharing.fixes.empty());
+    EXPECT_TRUE(store_->friendsOf(otto_).at(0).sharing.fixes.empty());
+}
+
 TEST_P(StoreRules, Zone_IsKept) {
     EXPECT_EQ(store_->person(ann_)->zone, "");
     ASSERT_TRUE(store_->setZone(ann_, "Asia/Tokyo"));
