@@ -57,6 +57,7 @@ ServedFriend readFriend(documents::FieldReader& fields) {
     fields.objects("track", [&](documents::FieldReader& point) {
         Waypoint waypoint = readPlace(point);
         waypoint.at = point.number("at", 0.0, kLongestTime).value_or(0.0);
+        waypoint.hidden = point.boolean("hidden").value_or(false);
         if (!person.track.empty() && waypoint.at <= person.track.back().at) {
             point.complain("at", "expected the waypoints in the order of their time");
         }

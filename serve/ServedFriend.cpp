@@ -30,11 +30,11 @@ std::optional<Waypoint> ServedFriend::placeAt(double seconds) const {
     const double moment = repeats && end > 0.0 && seconds > end ? std::fmod(seconds, end) : seconds;
     const auto next = std::upper_bound(track.begin(), track.end(), moment,
                                        [](double at, const Waypoint& waypoint) { return at < waypoint.at; });
-    if (next == track.begin()) {
-        return track.front();
+    Waypoint place = next == track.begin() ? *next : *(next - 1);
+    if (place.hidden) {
+        return std::nullopt;
     }
-    Waypoint place = *(next - 1);
-    if (next != track.end()) {
+    if (next != track.begin() && next != track.end()) {
         const double part = (moment - place.at) / (next->at - place.at);
         place.latitude += part * (next->latitude - place.latitude);
         place.longitude += part * (next->longitude - place.longitude);

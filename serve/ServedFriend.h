@@ -13,6 +13,7 @@ struct Waypoint {
     double longitude = 0.0;
     double accuracy = 12.0;  ///< metres
     std::optional<std::string> street, city, stateCode, label;
+    bool hidden = false;  ///< from here on nobody is told where the friend is
     bool operator==(const Waypoint&) const = default;
 };
 
@@ -31,7 +32,7 @@ struct ServedFriend {
     bool hidden = false;
 
     /// Between two waypoints in proportion to the time; accuracy and address are those of the waypoint last passed.
-    /// None while the friend is not found.
+    /// None while the friend is not found or a waypoint hides them.
     std::optional<Waypoint> placeAt(double seconds) const;
     /// E-mail addresses regardless of case, phone numbers by their digits and "+".
     bool answersTo(const std::string& handle) const;

@@ -57,6 +57,20 @@ TEST_F(FriendsReaderTest, LateHiddenAndLostPeople_HaveNoPlace) {
     EXPECT_EQ(friends.at(2).placeAt(0.0), std::nullopt);
 }
 
+TEST_F(FriendsReaderTest, WaypointThatHides_IsNoPlaceUntilTheNext) {
+    const auto friends = good(R"({"friends": [
+        {"phones": "1", "repeats": false, "track": [{"latitude": 1, "longitude": 2},
+            {"at": 10, "latitude": 1, "longitude": 2, "hidden": true}, {"at": 20, "latitude": 3, "longitude": 2}]},
+        {"phones": "2", "track": [{"at": 5, "latitude": 1, "longitude": 2, "hidden": true}]}]})")
+                             .friends;
+    EXPECT_NE(friends.at(0).placeAt(9.9), std::nullopt);
+    EXPECT_EQ(friends.at(0).placeAt(10.0), std::nullopt);
+    EXPECT_EQ(friends.at(0).placeAt(19.9), std::nullopt);
+    EXPECT_EQ(friends.at(0).placeAt(20.0)->latitude, 3.0);
+    EXPECT_EQ(friends.at(1).placeAt(0.0), std::nullopt);
+    EXPECT_EQ(friends.at(1).placeAt(5.0), std::nullopt);
+}
+
 TEST_F(FriendsReaderTest, Scenario_GivesPeopleWhoStay) {
     const auto friends = good(R"({"snippet": {"kind": "VAKtrLocationSnippet", "locations": [
         {"friend": {"data": "ann@b.example", "object": {"fullName": "Ann", "phones": [{"number": "+44 1"}]}},
