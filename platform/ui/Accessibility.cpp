@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "platform/assistant/AssistantSettings.h"
+#include "platform/base/Platform.h"
 #include "platform/ui/AccessibilitySubject.h"
 #include "platform/ui/View.h"
 
@@ -43,11 +45,22 @@ std::vector<AccessibilityNode> childrenOf(const View& view, Point origin, bool r
     return children;
 }
 
+/// What the assistant's language writes between the things of a list.
+const char* comma() {
+    const auto installed = Platform::installed();
+    const auto code = installed && installed->assistant ? installed->assistant->languageCode() : std::nullopt;
+    const std::string language = code ? code->substr(0, code->find_first_of("-_")) : "";
+    if (language == "ar" || language == "fa" || language == "ur") {
+        return "\u060C ";
+    }
+    return language == "ja" ? "\u3001" : language == "zh" ? "\uFF0C" : ", ";
+}
+
 /// All that the nodes say, in their order.
 void collectTexts(const std::vector<AccessibilityNode>& nodes, std::string& line) {
     for (const AccessibilityNode& node : nodes) {
         if (!node.text.empty()) {
-            line += (line.empty() ? "" : ", ") + node.text;
+            line += (line.empty() ? "" : comma()) + node.text;
         }
         collectTexts(node.children, line);
     }

@@ -27,7 +27,7 @@ struct KTR_API AccessibilityNode {
 };
 
 /// The tree below a view: hidden views and views that are not presented are left out, as are texts with nothing to say.
-/// A link and a text are one element each, which says its own text or, without one, all that stands in it.
+/// A link and a text are one element each, saying its own text or else all that is in it, with the language's commas.
 /// Reading order: from top to bottom, then from the leading to the trailing edge. Main thread.
 KTR_API AccessibilityNode accessibilityTree(const std::shared_ptr<View>& root, bool rightToLeft);
 

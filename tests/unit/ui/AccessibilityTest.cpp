@@ -80,6 +80,23 @@ TEST_F(AccessibilityTest, Link_IsOneElementOfAllItsTexts) {
     EXPECT_EQ(accessibilityName(link, false), "first, second");
 }
 
+TEST_F(AccessibilityTest, TextsOfALink_ArePartedByTheLanguagesComma) {
+    const auto link = create<Link>(&View::initWithFrame, Rect{0, 0, 100, 100});
+    link->addSubview(label("second", {0, 30, 50, 20}));
+    link->addSubview(label("first", {0, 0, 50, 20}));
+    for (const auto& [language, expected] :
+         std::vector<std::pair<std::optional<std::string>, std::string>>{{"ar-AE", "first\u060C second"},
+                                                                         {"fa", "first\u060C second"},
+                                                                         {"ja_JP", "first\u3001second"},
+                                                                         {"zh-Hant", "first\uFF0Csecond"},
+                                                                         {"he", "first, second"},
+                                                                         {"arn", "first, second"},
+                                                                         {std::nullopt, "first, second"}}) {
+        assistant->language = language;
+        EXPECT_EQ(accessibilityName(link, false), expected) << language.value_or("none");
+    }
+}
+
 TEST_F(AccessibilityTest, LinkWithItsOwnText_SaysThatAlone) {
     const auto link = create<Link>(&View::initWithFrame, Rect{0, 0, 100, 100});
     link->setAccessibilityLabel("Map of Ann");
