@@ -33,7 +33,7 @@ class AskField : public QWidget {
     void setAsked(std::function<void(const std::string&)> asked) { asked_ = std::move(asked); }
     void setColors(const linux_::Palette& palette);
     void setAnimated(bool animated) { animated_ = animated; }
-    QLineEdit& edit() const { return *edit_; }
+    QuestionEdit& edit() const { return *edit_; }
     SendButton& button() const { return *button_; }
 
   protected:

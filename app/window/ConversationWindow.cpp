@@ -97,7 +97,7 @@ void ConversationWindow::start(const std::vector<host::Scenario>& scenarios,
 
 void ConversationWindow::showStatus() {
     status_->setStatus(live_->status());
-    if (status_->height() != status_->heightForWidth(status_->width())) {
+    if (!status_->isPlaced()) {
         place();
     }
 }
@@ -140,7 +140,7 @@ void ConversationWindow::place() {
     constexpr int kAround = AskField::kAround;
     const int fieldHeight = AskField::shapeHeight();
     field_->setGeometry(x - kAround, y - kAround, across + 2 * kAround, fieldHeight + 2 * kAround);
-    status_->setGeometry(x, y + fieldHeight + kFieldToStatus, across, status_->heightForWidth(across));
+    status_->place({x, y + fieldHeight + kFieldToStatus, across, status_->heightForWidth(across)});
     field_->raise();
 }
 

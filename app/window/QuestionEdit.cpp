@@ -2,7 +2,9 @@
 
 #include <QEvent>
 #include <QFocusEvent>
+#include <QFontMetricsF>
 #include <QGuiApplication>
+#include <QInputMethodEvent>
 #include <QPainter>
 #include <QProxyStyle>
 #include <QStyleHints>
@@ -46,7 +48,9 @@ void QuestionEdit::setColors(const linux_::Palette& palette) {
     colors.setColor(QPalette::Base, Qt::transparent);
     colors.setColor(QPalette::Window, Qt::transparent);
     colors.setColor(QPalette::Text, palette.ink);
-    colors.setColor(QPalette::PlaceholderText, palette.inkSoft);
+    // The line's own placeholder would be cut where it does not fit.
+    colors.setColor(QPalette::PlaceholderText, Qt::transparent);
+    hint_ = palette.inkSoft;
     colors.setColor(QPalette::Highlight, palette.pine);
     colors.setColor(QPalette::HighlightedText, palette.onPine);
     setPalette(colors);
@@ -85,10 +89,34 @@ void QuestionEdit::showCaret() {
 
 void QuestionEdit::paintEvent(QPaintEvent* event) {
     QLineEdit::paintEvent(event);
+    if (text().isEmpty() && !composing_) {
+        QPainter painter(this);
+        painter.setFont(hintFont());
+        painter.setPen(hint_);
+        painter.drawText(rect(), static_cast<int>(alignment()) | Qt::TextSingleLine, placeholderText());
+    }
     if (hasFocus() && caretShown_ && !hasSelectedText()) {
         QPainter painter(this);
         painter.fillRect(caret(), pine_);
     }
+}
+
+QFont QuestionEdit::hintFont() const {
+    constexpr int kSmallest = 8;  // pixels
+    QFont small = font();
+    const auto fits = [this](const QFont& tried) {
+        return QFontMetricsF(tried).horizontalAdvance(placeholderText()) <= width();
+    };
+    while (!fits(small) && small.pixelSize() > kSmallest) {
+        small.setPixelSize(small.pixelSize() - 1);
+    }
+    return small;
+}
+
+void QuestionEdit::inputMethodEvent(QInputMethodEvent* event) {
+    composing_ = !event->preeditString().isEmpty();
+    QLineEdit::inputMethodEvent(event);
+    update();
 }
 
 void QuestionEdit::focusInEvent(QFocusEvent* event) {

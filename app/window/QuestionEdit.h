@@ -7,19 +7,23 @@
 
 namespace ktr::app {
 
-/// The line that is typed into: colours of the palette and a caret of its own, 2 wide in pine. Main thread.
+/// The line that is typed into: colours of the palette, a placeholder that is never cut, and a caret of its own, 2 wide
+/// in pine. Main thread.
 class QuestionEdit : public QLineEdit {
   public:
     explicit QuestionEdit(QWidget* parent = nullptr);
     ~QuestionEdit() override;
 
     void setColors(const linux_::Palette& palette);
+    /// What the placeholder is written in: small enough for all of it.
+    QFont hintFont() const;
 
   protected:
     void paintEvent(QPaintEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
     void focusOutEvent(QFocusEvent* event) override;
     void changeEvent(QEvent* event) override;
+    void inputMethodEvent(QInputMethodEvent* event) override;
 
   private:
     class CaretlessStyle;
@@ -31,7 +35,9 @@ class QuestionEdit : public QLineEdit {
     std::unique_ptr<CaretlessStyle> style_;
     QTimer blink_;
     bool caretShown_ = false;
+    bool composing_ = false;
     QColor pine_;
+    QColor hint_;
 };
 
 }  // namespace ktr::app

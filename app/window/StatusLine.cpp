@@ -5,10 +5,6 @@
 #include <algorithm>
 #include <cmath>
 
-#include "app/window/StatusWords.h"
-#include "linux/paint/FontChoice.h"
-#include "platform/base/Platform.h"
-#include "platform/ui/Device.h"
 #include "platform/ui/Font.h"
 
 namespace ktr::app {
@@ -59,17 +55,21 @@ StatusLine::StatusLine(QWidget* parent)
 }
 
 void StatusLine::refreshFont() {
-    const auto font = platform::preferredFont(platform::TextStyle::Footnote);
-    lineHeight_ = static_cast<int>(std::ceil(font.lineHeight()));
-    words_->setFont(
-        linux_::FontChoice::spec(font, static_cast<int>(font.size), linux_::FontChoice::baseFamily()).font());
-    const auto installed = platform::Platform::installed();
-    words_->setWordWrap(installed && platform::isAccessibilityCategory(installed->device->contentSizeCategory()));
+    lineHeight_ = static_cast<int>(std::ceil(platform::preferredFont(platform::TextStyle::Footnote).lineHeight()));
+    words_->setContentsMargins(0, overhang(), 0, overhang());
+    words_->update();
+}
+
+void StatusLine::place(const QRect& lines) {
+    setGeometry(lines.adjusted(0, -overhang(), 0, overhang()));
+}
+
+bool StatusLine::isPlaced() const {
+    return height() == heightForWidth(width()) + 2 * overhang();
 }
 
 int StatusLine::heightForWidth(int width) const {
-    return words_->wordWrap() ? std::max(lineHeight_, words_->heightForWidth(std::max(width - kWords, 1)))
-                              : lineHeight_;
+    return std::max(lineHeight_, words_->heightForWidth(width - kWords));
 }
 
 void StatusLine::setStatus(const host::LiveStatus& status) {
@@ -85,9 +85,7 @@ void StatusLine::setStatus(const host::LiveStatus& status) {
 
 void StatusLine::setColors(const linux_::Palette& palette) {
     palette_ = &palette;
-    QPalette colors = words_->palette();
-    colors.setColor(QPalette::WindowText, palette.inkSoft);
-    words_->setPalette(colors);
+    words_->setColors(palette);
     update();
 }
 
@@ -101,7 +99,7 @@ void StatusLine::paintEvent(QPaintEvent*) {
     painter.setRenderHint(QPainter::Antialiasing);
     const bool mirrored = layoutDirection() == Qt::RightToLeft;
     // Beside the first line.
-    const QPointF centre(mirrored ? width() - kMarkCentre : kMarkCentre, std::min(lineHeight_, height()) / 2.0 + 0.5);
+    const QPointF centre(mirrored ? width() - kMarkCentre : kMarkCentre, overhang() + lineHeight_ / 2.0 + 0.5);
     switch (mark_) {
         case host::LiveStatus::Mark::Live:
             painter.setPen(Qt::NoPen);

@@ -1,14 +1,14 @@
 #pragma once
 
-#include <QLabel>
 #include <QWidget>
 
+#include "app/window/StatusWords.h"
 #include "host/live/LiveStatus.h"
 #include "linux/paint/Palette.h"
 
 namespace ktr::app {
 
-/// One line: a mark and words. Main thread.
+/// A mark and words, which take as many lines as they need. Main thread.
 class StatusLine : public QWidget {
   public:
     /// From the line's start edge: the mark's centre and the words.
@@ -22,15 +22,22 @@ class StatusLine : public QWidget {
     QString words() const { return words_->text(); }
     /// Where the text size has become another.
     void refreshFont();
-    /// Large words take as many lines as they need.
+    /// Where it stands in its parent: as wide, and at least a line high. Letters that are higher or deeper than a line
+    /// reach beyond it, above and below.
+    void place(const QRect& lines);
+    /// Of the lines alone, at least one.
     int heightForWidth(int width) const override;
+    /// Whether its words take as many lines as it has.
+    bool isPlaced() const;
 
   protected:
     void paintEvent(QPaintEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
 
   private:
-    QLabel* words_;
+    int overhang() const { return lineHeight_ / 4; }
+
+    StatusWords* words_;
     const linux_::Palette* palette_;
     host::LiveStatus::Mark mark_ = host::LiveStatus::Mark::None;
     int lineHeight_ = 0;
