@@ -55,6 +55,8 @@ class Administration {
     std::string revokeDevice(const std::string& owner, int number);
     std::string devices(const std::string& name);
     std::string setHidden(const std::string& name, bool hidden);
+    /// The picture that friends' phones show; without a file: none any more.
+    std::string face(const std::string& name, const std::string& file);
     std::string people();
     /// What a command line says of a place. A value.
     struct PlaceWords {

@@ -29,7 +29,7 @@ int main(int count, char** words) {
     program.require_subcommand(1);
     std::string folder = defaultFolder();
     program.add_option("--data", folder, "Folder of the service (" + folder + ")")->type_name("FOLDER");
-    std::string name, other, host, store, token = "ktr-token";
+    std::string name, other, host, store, picture, token = "ktr-token";
     ktr::server::Newcomer newcomer;
     ktr::server::Administration::GrantWords grant;
     int port = 8443, device = 0;
@@ -68,6 +68,9 @@ int main(int count, char** words) {
         ->excludes(noViewer);
     CLI::App* hide = named(program.add_subcommand("hide", "Hides a person from everybody"));
     CLI::App* show = named(program.add_subcommand("show", "Shows a person again"));
+    CLI::App* face = named(program.add_subcommand("face", "Sets or takes away the picture that phones show"));
+    face->add_option("picture", picture, "A JPEG or PNG of at most 512 pixels a side; without one: none any more")
+        ->type_name("FILE");
     CLI::App* people = program.add_subcommand("people", "Lists people and who sees them");
     CLI::App* check = program.add_subcommand("check", "Looks whether all is whole");
     CLI::App* serve = program.add_subcommand("serve", "Serves until it is told to end");
@@ -99,6 +102,7 @@ int main(int count, char** words) {
                                   : *revoke  ? revokes()
                                   : *hide    ? administration.setHidden(name, true)
                                   : *show    ? administration.setHidden(name, false)
+                                  : *face    ? administration.face(name, picture)
                                   : *people  ? administration.people()
                                   : *check   ? administration.check()
                                   : *serve   ? administration.serve(where)

@@ -1,13 +1,22 @@
 #include "server/answers/PhoneAnswer.h"
 
 #include <cmath>
+#include <cstdlib>
 
+#include "server/ingest/Base64.h"
 #include "server/store/Secret.h"
 
 namespace ktr::server {
 
 using platform::Dictionary;
 using platform::Value;
+
+namespace {
+
+/// After which a card comes again: a phone may have lost it. Seconds.
+constexpr std::int64_t kWeek = std::int64_t{7} * 86400;
+
+}  // namespace
 
 bool PhoneAnswer::isSound(const Dictionary& message) {
     for (const auto& [name, value] : message) {
@@ -34,7 +43,7 @@ bool PhoneAnswer::isSound(const Dictionary& message) {
            std::abs(*number("lat")) <= 90.0 && number("lon") && std::abs(*number("lon")) <= 180.0;
 }
 
-Value::Array PhoneAnswer::messages(const std::vector<PhoneFriend>& friends, bool withCards) {
+Value::Array PhoneAnswer::messages(const std::vector<PhoneFriend>& friends) {
     Value::Array messages;
     const auto add = [&](const Dictionary& message) {
         if (isSound(message)) {
@@ -42,8 +51,13 @@ Value::Array PhoneAnswer::messages(const std::vector<PhoneFriend>& friends, bool
         }
     };
     for (const PhoneFriend& one : friends) {
-        if (withCards) {
-            add({{"_type", "card"}, {"tid", one.name}, {"name", one.name}});
+        if (one.withCard) {
+            // Before the place: a phone that knows no card yet would show two letters.
+            Dictionary card{{"_type", "card"}, {"tid", one.name}, {"name", one.name}};
+            if (!one.face.empty()) {
+                card.set("face", Base64::encode(one.face));
+            }
+            add(card);
         }
         Dictionary location{{"_type", "location"},
                             {"tid", one.name},
@@ -59,12 +73,12 @@ Value::Array PhoneAnswer::messages(const std::vector<PhoneFriend>& friends, bool
     return messages;
 }
 
-std::string PhoneAnswer::cardsHash(const std::vector<PhoneFriend>& friends) {
-    std::string names;
-    for (const PhoneFriend& one : friends) {
-        names += one.name + '\n';
-    }
-    return Secret::hash(names);
+std::string PhoneAnswer::cardHash(const std::string& name, const std::string& faceHash) {
+    return Secret::hash(name + '\n' + faceHash);
+}
+
+bool PhoneAnswer::isCardDue(const SentCard& sent, const std::string& hash, std::int64_t now, std::int64_t post) {
+    return sent.hash != hash || std::abs(now - sent.time) >= kWeek || (post != 0 && post == sent.post);
 }
 
 }  // namespace ktr::server

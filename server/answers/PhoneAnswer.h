@@ -1,10 +1,12 @@
 #pragma once
 
+#include <cstdint>
 #include <string>
 #include <vector>
 
 #include "platform/base/Value.h"
 #include "server/rules/Visibility.h"
+#include "server/store/Records.h"
 
 namespace ktr::server {
 
@@ -12,6 +14,8 @@ namespace ktr::server {
 struct PhoneFriend {
     std::string name;
     Seen seen;
+    bool withCard = false;
+    std::string face = {};  ///< the bytes of a picture for the card; empty: none
 };
 
 /// Words the answer to an OwnTracks post: friends as an array of messages. A single message that the app does not
@@ -20,9 +24,12 @@ struct PhoneFriend {
 class PhoneAnswer {
   public:
     /// A name as the identity under which the apps keep a friend; the apps show it before a card has come.
-    static platform::Value::Array messages(const std::vector<PhoneFriend>& friends, bool withCards);
-    /// What the cards of these friends say, as a short text that changes with them.
-    static std::string cardsHash(const std::vector<PhoneFriend>& friends);
+    static platform::Value::Array messages(const std::vector<PhoneFriend>& friends);
+    /// What somebody's card says, as a short text that changes with it.
+    static std::string cardHash(const std::string& name, const std::string& faceHash);
+    /// Whether a phone is to be told: never before, something else, a week ago, or in the answer to this very post,
+    /// which it sends again since that answer did not arrive. `post`: the time of the post's fix, 0 without one.
+    static bool isCardDue(const SentCard& sent, const std::string& hash, std::int64_t now, std::int64_t post);
     /// Whether both apps take such a message: a whole time after 1970, a place on earth, a name, nothing null.
     static bool isSound(const platform::Dictionary& message);
 };

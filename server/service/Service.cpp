@@ -6,11 +6,11 @@
 #include "platform/base/Json.h"
 #include "server/answers/CommandRequest.h"
 #include "server/answers/LocationAnswers.h"
-#include "server/answers/PhoneAnswer.h"
 #include "server/http/BasicCredentials.h"
+#include "server/ingest/Face.h"
 #include "server/ingest/FixRules.h"
 #include "server/ingest/PhoneMessages.h"
-#include "server/ingest/SealedText.h"
+#include "server/service/PhoneFriends.h"
 
 namespace ktr::server {
 
@@ -173,41 +173,29 @@ void Service::takeOwnTracks(const HttpRequest& request, const HttpReply& reply) 
         return;
     }
     const Report report = PhoneMessages::ownTracks(request.body, device->key);
+    // Written before the rest of the post, so that its fate is known when the rest is on the disk.
+    const auto faceKept = std::make_shared<bool>(true);
+    if (const auto face = cleanedFace(report)) {
+        store_->keepFace(device->person, *face, [faceKept](bool good) { *faceKept = good; });
+    }
     store_->keep(device->id, device->person, admitted(*device, report), store_->present(now_()),
-                 [this, device = *device, sealed = report.sealed, reply](bool good) {
-                     if (!good) {
+                 [this, device = *device, report, faceKept, reply](bool good) {
+                     if (!good || !*faceKept) {
                          // A phone keeps what got a 5xx and sends it again.
                          ++counters_.storeFailures;
                          return reply.send(refusal(503, "the store cannot be written"));
                      }
-                     http_.later(0.0, [this, device, sealed, reply] { reply.send(friendsAnswer(device, sealed)); });
+                     http_.later(0.0, [this, device, report, reply] {
+                         reply.send(HttpResponse::json(200, PhoneFriends(*store_).answer(device, report, now_())));
+                     });
                  });
 }
 
-HttpResponse Service::friendsAnswer(const Device& device, bool sealed) {
-    std::vector<PhoneFriend> friends;
-    std::vector<std::int64_t> seen;
-    for (const Friend& one : store_->friendsOf(device.person)) {
-        if (const auto what = Visibility::visible(one.sharing, now_())) {
-            friends.push_back({one.name, *what});
-            seen.push_back(one.person);
-        }
-    }
-    const std::string hash = PhoneAnswer::cardsHash(friends);
-    const bool withCards = hash != device.cardsSent;
-    std::string body = platform::writeJson(PhoneAnswer::messages(friends, withCards));
-    if (sealed) {
-        const auto box = SealedText::seal(body, device.key);
-        // Nothing in the clear to a phone that seals.
-        body = box ? platform::writeJson(Dictionary{{"_type", "encrypted"}, {"data", *box}}) : "[]";
-    }
-    if (withCards) {
-        store_->noteCards(device.id, hash, nullptr);
-    }
-    if (!seen.empty()) {
-        store_->noteLooks(device.person, seen, false, now_(), nullptr);
-    }
-    return HttpResponse::json(200, body);
+std::optional<std::string> Service::cleanedFace(const Report& report) {
+    std::string complaint;
+    const auto face = report.face ? Face::cleaned(*report.face, complaint) : std::nullopt;
+    counters_.droppedFaces += report.face && !face ? 1 : 0;
+    return face;
 }
 
 void Service::takeParameters(const HttpRequest& request, const HttpReply& reply) {

@@ -61,7 +61,8 @@ class Service {
     void takeParameters(const HttpRequest& request, const HttpReply& reply);
     /// What of a report is kept; counts the rest.
     std::vector<Fix> admitted(const Device& device, const Report& report);
-    HttpResponse friendsAnswer(const Device& device, bool sealed);
+    /// The face that a report brings, if it is one; counts what is none.
+    std::optional<std::string> cleanedFace(const Report& report);
     void answerCommand(const HttpRequest& request, const HttpReply& reply);
     HttpResponse locations(const Device& device, const platform::Dictionary& body);
     void changeSharing(const Device& device, const platform::Dictionary& body, const HttpReply& reply);

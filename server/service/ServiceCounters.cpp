@@ -10,6 +10,7 @@ std::string ServiceCounters::text() const {
         {"dropped_no_place", droppedNoPlace},
         {"dropped_no_time", droppedNoTime},
         {"dropped_too_old", droppedTooOld},
+        {"dropped_faces", droppedFaces},
         {"commands", commands},
         {"wrong_credentials", wrongCredentials},
         {"store_failures", storeFailures},

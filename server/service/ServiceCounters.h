@@ -14,6 +14,7 @@ struct ServiceCounters {
     std::atomic<std::int64_t> droppedNoPlace = 0;    ///< positions that are no place on earth
     std::atomic<std::int64_t> droppedNoTime = 0;     ///< positions without a time
     std::atomic<std::int64_t> droppedTooOld = 0;     ///< positions beyond the retention
+    std::atomic<std::int64_t> droppedFaces = 0;      ///< pictures that are no faces
     std::atomic<std::int64_t> commands = 0;          ///< of readers, with right credentials
     std::atomic<std::int64_t> wrongCredentials = 0;  ///< refused
     std::atomic<std::int64_t> storeFailures = 0;     ///< answers that could not be given

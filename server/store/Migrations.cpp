@@ -70,6 +70,17 @@ ALTER TABLE person ADD COLUMN looks_retention {integer} NOT NULL DEFAULT 2592000
 ALTER TABLE device ADD COLUMN suspended {integer} NOT NULL DEFAULT 0;
 CREATE TABLE forgotten (hash {bytes} NOT NULL PRIMARY KEY, made {integer} NOT NULL) {strict by key};
 )",
+    // 5: faces; which card each phone was told last of each friend (device.cards_sent, one for all, is read no more).
+    R"(
+CREATE TABLE face (
+    person {integer} NOT NULL PRIMARY KEY REFERENCES person ON DELETE CASCADE, picture {bytes} NOT NULL,
+    hash {bytes} NOT NULL) {strict by key};
+CREATE TABLE card (
+    device {integer} NOT NULL REFERENCES device ON DELETE CASCADE,
+    owner {integer} NOT NULL REFERENCES person ON DELETE CASCADE, hash {bytes} NOT NULL, sent {integer} NOT NULL,
+    post {integer} NOT NULL, PRIMARY KEY (device, owner)) {strict by key};
+CREATE INDEX card_owner ON card (owner);
+)",
 };
 
 }  // namespace

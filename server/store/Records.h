@@ -44,7 +44,6 @@ struct Device {
     bool hidden = false;
     std::int64_t retention = 0;  ///< how long the person's fixes are kept, seconds
     std::string key;             ///< with which the phone seals its messages; empty: it does not
-    std::string cardsSent;       ///< the hash of what it was last told of its friends' names
     bool shared = false;         ///< it is a child's, or several people's: it says itself by whom they are seen
 };
 
@@ -92,6 +91,23 @@ enum class SignIn {
     Done,
     Spent,   ///< it was used before, has ended, or never was
     Failed,  ///< the store could not be written
+};
+
+/// What a phone was last told of who somebody is. A value.
+struct SentCard {
+    std::string hash;       ///< of what the card said; empty: there was none
+    std::int64_t time = 0;  ///< seconds since 1970
+    std::int64_t post = 0;  ///< the time of the fix that it answered; 0: none
+
+    bool operator==(const SentCard&) const = default;
+};
+
+/// Somebody's card, as one phone has it. A value.
+struct CardState {
+    std::string faceHash;  ///< of the face there is now; empty: there is none
+    SentCard sent;
+
+    bool operator==(const CardState&) const = default;
 };
 
 /// Somebody whom a viewer may see, with what decides it. A value.

@@ -4,6 +4,7 @@
 #include <cstdint>
 #include <deque>
 #include <functional>
+#include <map>
 #include <memory>
 #include <mutex>
 #include <optional>
@@ -50,7 +51,6 @@ class Store {
     void askToShare(std::int64_t device, Done done);
     /// Shows the owner of a device that asked so after the newest hiding, wherever that came from; else does nothing.
     void shareAsAsked(std::int64_t device, std::int64_t now, Done done);
-    void noteCards(std::int64_t device, std::string hash, Done done);
     /// Deletes what is too old, of a few people in turn: to be called again and again.
     void deleteOld(std::int64_t now, Done done);
 
@@ -134,6 +134,17 @@ class Store {
     std::vector<Browser> browsersOf(std::int64_t person, std::int64_t now);
     /// False when that could not be written; a browser that is gone is gone.
     bool endBrowser(std::int64_t person, std::int64_t browser);
+
+    // Faces, and the cards that bring them to phones.
+
+    /// What `Face` has cleaned; not while the person hides.
+    void keepFace(std::int64_t person, std::string picture, Done done);
+    /// The same for the administration, hidden or not; an empty picture takes it away. It waits for the disk.
+    bool setFace(std::int64_t person, const std::string& picture);
+    std::optional<std::string> face(std::int64_t person);
+    /// By owner: the cards of all who share with a viewer, as this device has them.
+    std::map<std::int64_t, CardState> cards(std::int64_t device, std::int64_t viewer);
+    void noteCards(std::int64_t device, std::map<std::int64_t, SentCard> sent, Done done);
 
     static std::string normalisedHandle(std::string_view handle);
 

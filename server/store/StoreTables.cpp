@@ -14,6 +14,8 @@ constexpr std::array kTables = {
     StoreTable{"share", true, {"owner", "viewer"}, {}},
     StoreTable{"viewed", false, {"owner", "viewer"}, {}},
     StoreTable{"place", true, {"owner"}, {}},
+    StoreTable{"face", true, {"person"}, {"hash"}},
+    StoreTable{"card", false, {"owner"}, {"hash"}},
     StoreTable{"clock", true, {}, {}},
     StoreTable{"forgotten", true, {}, {}},
 };

@@ -67,14 +67,6 @@ void Store::noteLooks(std::int64_t viewer, std::vector<std::int64_t> owners, boo
         std::move(done));
 }
 
-void Store::noteCards(std::int64_t device, std::string hash, Done done) {
-    write(
-        [=, bytes = std::move(hash)](Database& database) {
-            database.statement("UPDATE device SET cards_sent = $2 WHERE id = $1").bind(device).bindBytes(bytes).run();
-        },
-        std::move(done));
-}
-
 void Store::deleteOldOf(Database& database, std::int64_t person, const Retention& retention, std::int64_t now) {
     database.statement("DELETE FROM fix WHERE person = $1 AND time < $2")
         .bind(person)

@@ -325,6 +325,18 @@ class OwnServiceTest(unittest.TestCase):
                             (("revoke", "Ann", "Otto"), "does not see"), (("init", "--host", "b"), "already"),
                             (("hide", "Nobody"), "there is nobody called")):
             self.assertIn(part, self.command(*words, fails=True), words)
+        pipe, text = self.folder / "pipe", self.folder / "text"
+        os.mkfifo(pipe)
+        text.write_text("no picture")
+        for picture, part in (("/not/there", "no such file"), (pipe, "not a file"), (self.folder, "not a file"),
+                              (text, "is neither a JPEG nor a PNG")):
+            self.assertIn(part, self.command("face", "Ann", str(picture), fails=True))
+        for words, part in ((("--friend", "Nobody"), "there is nobody called"), (("--friend", "Ivy"), "with themselves"),
+                            (("--ktr", str(self.folder)), "has a configuration already")):
+            (self.folder / "config.json").write_text("mine")
+            self.assertIn(part, self.command("add", "Ivy", *words, fails=True))
+        self.assertEqual((self.folder / "config.json").read_text(), "mine")
+        self.assertNotIn("Ivy", self.command("people"), "nothing is done when not all of it can be done")
         self.assertIn("whole", self.command("check"))
         self.assertEqual(subprocess.run([SERVICE, "--data", "/not/there", "people"], capture_output=True, timeout=60,
                                         check=False).returncode, 1)

@@ -88,7 +88,8 @@ TEST_F(FileStoreTest, StoreOfTheFirstVersion_IsBroughtToToday_WithAllThatIsInIt)
     const auto phone = store->deviceOf("foo", failed);
     ASSERT_TRUE(phone);
     EXPECT_EQ(phone->person, 1);
-    EXPECT_EQ(phone->cardsSent, std::string("\0\xff", 2));
+    EXPECT_EQ(store->cards(phone->id, 2).size(), 1U) << "ann's, who shares with otto";
+    EXPECT_EQ(store->cards(phone->id, 2).at(1), server::CardState()) << "each phone is told anew";
     EXPECT_EQ(store->personOf("ANN@x.example"), 1);
     EXPECT_TRUE(store->person(2)->hidden);
     const auto sharing = store->sharing(2, 1);

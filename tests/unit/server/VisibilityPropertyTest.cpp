@@ -80,7 +80,7 @@ class VisibilityPropertyTest : public ::testing::Test {
         request.wanted = CommandPlace{50.1, -3.0, std::nullopt};
         std::string text = platform::writeJson(LocationAnswers::locations(request, {{"ann@x.example", 1, seen}}));
         if (seen) {
-            text += platform::writeJson(PhoneAnswer::messages({{"Ann", *seen}}, true)) + " looked";
+            text += platform::writeJson(PhoneAnswer::messages({{"Ann", *seen, true}})) + " looked";
         }
         return text;
     }
