@@ -9,6 +9,7 @@
 
 #include "server/admin/Administration.h"
 #include "server/admin/Help.h"
+#include "server/admin/KeepingCommands.h"
 #include "server/admin/RuleCommands.h"
 
 namespace {
@@ -81,6 +82,7 @@ int main(int count, char** words) {
     serve->add_option("--socket-group", where.place.group, "Group of the proxy's user, which may connect")
         ->needs(socket);
     const ktr::server::RuleCommands rules(program);
+    const ktr::server::KeepingCommands keeping(program);
     if (const auto ended = ktr::server::parsed(program, count, words)) {
         return *ended;
     }
@@ -105,8 +107,9 @@ int main(int count, char** words) {
                                   : *face    ? administration.face(name, picture)
                                   : *people  ? administration.people()
                                   : *check   ? administration.check()
-                                  : *serve   ? administration.serve(where)
-                                             : rules.run(administration).value_or("");
+                                  : *serve
+                                      ? administration.serve(where)
+                                      : rules.run(administration).value_or(keeping.run(administration).value_or(""));
     if (!complaint.empty()) {
         std::cerr << "ktr-service: " << complaint << std::endl;
         return EXIT_FAILURE;
