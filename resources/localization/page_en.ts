@@ -10,7 +10,7 @@
     </message>
     <message>
         <source>NUMBERS</source>
-        <extracomment>The numbers from one to twelve as they begin VISIBLE_TO, in its gender and case, with a bar between; digits where words are unusual</extracomment>
+        <extracomment>The numbers from one to twelve as they begin VISIBLE_TO, in its gender and case, with a bar between; a hyphen alone where digits are usual</extracomment>
         <translation>One|Two|Three|Four|Five|Six|Seven|Eight|Nine|Ten|Eleven|Twelve</translation>
     </message>
     <message>
@@ -492,6 +492,61 @@
         <source>TO_MY_PAGE</source>
         <extracomment>Link</extracomment>
         <translation>To my page</translation>
+    </message>
+    <message>
+        <source>MY_PLACES</source>
+        <extracomment>Row and title: places to which the reader gave names</extracomment>
+        <translation>My places</translation>
+    </message>
+    <message>
+        <source>PLACE_NONE</source>
+        <extracomment>No place has a name</extracomment>
+        <translation>No place has a name yet.</translation>
+    </message>
+    <message>
+        <source>PLACE_HERE</source>
+        <extracomment>Heading and button</extracomment>
+        <translation>Name the place where I am</translation>
+    </message>
+    <message>
+        <source>PLACE_HERE_HINT</source>
+        <extracomment>Below PLACE_HERE</extracomment>
+        <translation>The place of your phone’s last message, and 150 metres around it.</translation>
+    </message>
+    <message>
+        <source>PLACE_NO_FIX</source>
+        <extracomment>Instead of PLACE_HERE_HINT</extracomment>
+        <translation>Your phone has sent no place yet.</translation>
+    </message>
+    <message>
+        <source>PLACE_NAME</source>
+        <extracomment>Label of a field</extracomment>
+        <translation>Name of the place</translation>
+    </message>
+    <message>
+        <source>PLACE_SAID</source>
+        <extracomment>Label of a box to tick, and below a place</extracomment>
+        <translation>Friends may hear its name</translation>
+    </message>
+    <message>
+        <source>PLACE_UNSAID</source>
+        <extracomment>Below a place</extracomment>
+        <translation>Nobody hears its name</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE</source>
+        <extracomment>Button</extracomment>
+        <translation>Remove</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE_ONE</source>
+        <extracomment>Title, and spoken: the same button; %@ is the name of a place</extracomment>
+        <translation>Remove: %@</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE_ASK</source>
+        <extracomment>Asks before PLACE_REMOVE</extracomment>
+        <translation>Its name goes, and rules that were to end there end now.</translation>
     </message>
 </context>
 </TS>

@@ -9,7 +9,6 @@
 
 #include "server/admin/Administration.h"
 #include "server/admin/Help.h"
-#include "server/admin/KeepingCommands.h"
 #include "server/admin/RuleCommands.h"
 
 namespace {
@@ -73,6 +72,7 @@ int main(int count, char** words) {
     face->add_option("picture", picture, "A JPEG or PNG of at most 512 pixels a side; without one: none any more")
         ->type_name("FILE");
     CLI::App* people = program.add_subcommand("people", "Lists people and who sees them");
+    CLI::App* link = named(program.add_subcommand("link", "Prints a link that opens a person's own page once"));
     CLI::App* check = program.add_subcommand("check", "Looks whether all is whole");
     CLI::App* serve = program.add_subcommand("serve", "Serves until it is told to end");
     ktr::server::Administration::Serving where;
@@ -82,7 +82,6 @@ int main(int count, char** words) {
     serve->add_option("--socket-group", where.place.group, "Group of the proxy's user, which may connect")
         ->needs(socket);
     const ktr::server::RuleCommands rules(program);
-    const ktr::server::KeepingCommands keeping(program);
     if (const auto ended = ktr::server::parsed(program, count, words)) {
         return *ended;
     }
@@ -106,10 +105,10 @@ int main(int count, char** words) {
                                   : *show    ? administration.setHidden(name, false)
                                   : *face    ? administration.face(name, picture)
                                   : *people  ? administration.people()
+                                  : *link    ? administration.link(name, newcomer.coloured)
                                   : *check   ? administration.check()
-                                  : *serve
-                                      ? administration.serve(where)
-                                      : rules.run(administration).value_or(keeping.run(administration).value_or(""));
+                                  : *serve   ? administration.serve(where)
+                                             : rules.run(administration).value_or("");
     if (!complaint.empty()) {
         std::cerr << "ktr-service: " << complaint << std::endl;
         return EXIT_FAILURE;

@@ -155,8 +155,8 @@ std::string PageLanguage::ownName(const std::string& language) {
 }
 
 bool PageLanguage::isZone(const std::string& name) {
-    const auto all = zones();
-    return std::binary_search(all.begin(), all.end(), name);
+    const std::unique_ptr<icu::TimeZone> zone(icu::TimeZone::createTimeZone(icu::UnicodeString::fromUTF8(name)));
+    return !name.empty() && *zone != icu::TimeZone::getUnknown();
 }
 
 std::vector<std::string> PageLanguage::zones() {

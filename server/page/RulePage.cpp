@@ -22,13 +22,13 @@ void addSeen(PageBuilder& page, const PageContext& context, const RulePage::Data
     page.html().open("span", {{"class", "grow"}});
     const Seen& seen = *data.seen;
     if (!seen.place.empty()) {
-        page.html().leaf("bdi", {{"class", "soft"}}, shownName(seen.place));
+        page.html().open("span", {{"class", "soft"}}).leaf("bdi", {}, shownName(seen.place)).close();
     } else {
         page.html().leaf(
             "bdi", {{"class", "soft"}},
             language.coordinates(seen.latitude, seen.longitude, data.rule.grant.precision == Precision::Exact));
     }
-    page.html().leaf("bdi", {{"class", "name"}}, shownName(context.name));
+    page.html().open("span", {{"class", "name"}}).leaf("bdi", {}, shownName(context.name)).close();
     page.html().leaf("span", {{"class", "soft"}}, language.age(context.now - seen.time));
     if (seen.accuracy && seen.place.empty()) {
         page.html().leaf("span", {{"class", "soft"}},

@@ -65,7 +65,11 @@ std::string SettingsPage::html(const PageContext& context, const Data& data) {
     }
     page.html().close().close();
     openSelect(page, "SETTINGS_ZONE", "zone");
-    for (const std::string& zone : PageLanguage::zones()) {
+    std::vector<std::string> zones = PageLanguage::zones();
+    if (std::find(zones.begin(), zones.end(), language.zone()) == zones.end()) {
+        zones.insert(zones.begin(), language.zone());
+    }
+    for (const std::string& zone : zones) {
         addOption(page, zone, zone, zone == language.zone());
     }
     page.html().close().close();

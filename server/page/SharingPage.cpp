@@ -9,15 +9,14 @@ namespace ktr::server {
 
 namespace {
 
-constexpr std::int64_t kLooksKept = 30;
-
 /// "Three people can see where you are."
 std::string titleOf(const PageLanguage& language, std::int64_t count) {
     if (count == 0) {
         return language.text("VISIBLE_TO_NOBODY");
     }
     const std::string words = language.text("NUMBERS");
-    std::size_t begin = 0;
+    // A hyphen alone: digits are usual there.
+    std::size_t begin = words == "-" ? std::string::npos : 0;
     for (std::int64_t number = 1; number < count && begin != std::string::npos; ++number) {
         const std::size_t bar = words.find('|', begin);
         begin = bar == std::string::npos ? bar : bar + 1;
@@ -51,7 +50,11 @@ void addRules(PageBuilder& page, const PageContext& context, const std::vector<P
         page.html().open("li").open("a",
                                     {{"class", "row person"}, {"href", "/me/sees/" + std::to_string(rule.viewer)}});
         page.face(rule.name, rule.handle);
-        page.html().open("span", {{"class", "grow"}}).leaf("bdi", {{"class", "name"}}, shownName(rule.name));
+        page.html()
+            .open("span", {{"class", "grow"}})
+            .open("span", {{"class", "name"}})
+            .leaf("bdi", {}, shownName(rule.name))
+            .close();
         page.html().leaf("span", {{"class", "soft"}}, RuleWords::of(rule, language, context.now)).close();
         page.chevron();
         page.html().close().close();
@@ -108,7 +111,7 @@ std::string SharingPage::html(const PageContext& context, const Data& data) {
     page.openCard();
     addLooks(page, context, data.looks, kFewLooks);
     if (data.looks.size() > kFewLooks) {
-        page.linkRow("/me/looks", language.plural("ALL_LOOKS", kLooksKept));
+        page.linkRow("/me/looks", language.plural("ALL_LOOKS", data.looksKept));
     }
     page.close();
     page.section(language.text("MY_DATA"));

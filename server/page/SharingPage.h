@@ -15,6 +15,7 @@ class SharingPage {
         bool hidden = false;
         std::vector<PageRule> rules;
         std::vector<PageLook> looks;  ///< the newest first
+        std::int64_t looksKept = 30;  ///< days
         std::string told = {};        ///< what was just done; empty: nothing
     };
 

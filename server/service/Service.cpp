@@ -39,7 +39,10 @@ Service::Service(Setup setup)
       log_(std::move(setup.log)),
       traffic_(log_),
       store_(std::move(setup.store)),
-      http_(httpSetup(setup)) {}
+      http_(httpSetup(setup)),
+      page_(std::make_unique<PeoplesPage>(PeoplesPage::Setup{
+          *store_, now_, delays_,
+          [this](double seconds, std::function<void()> work) { http_.later(seconds, std::move(work)); }})) {}
 
 Service::~Service() {
     stop();
@@ -63,6 +66,7 @@ std::string Service::start() {
 
 void Service::stop() {
     http_.stop();
+    page_.reset();
     // Its last commits still answer through the edge.
     store_.reset();
 }
@@ -92,6 +96,9 @@ void Service::route(const HttpRequest& request, const HttpReply& reply) {
     }
     if (!isForUs(request)) {
         return reply.send(refusal(421, "this service has another name"));
+    }
+    if (PageRequest::isFor(request)) {
+        return page_->answer(request, reply);
     }
     if (posts && request.path == "/pub") {
         return takeOwnTracks(request, reply);

@@ -11,6 +11,7 @@
 #include "platform/base/Value.h"
 #include "server/http/HttpServer.h"
 #include "server/ingest/Report.h"
+#include "server/page/PeoplesPage.h"
 #include "server/service/FailureDelays.h"
 #include "server/service/ServiceCounters.h"
 #include "server/service/ServiceLog.h"
@@ -20,7 +21,8 @@
 namespace ktr::server {
 
 /// The service as the network meets it: phones post to "/pub" (OwnTracks) and "/" (OsmAnd, Traccar Client, GPSLogger),
-/// readers send the protocol's commands (docs/service-protocol.md). What is public belongs to the thread that made it.
+/// readers send the protocol's commands (docs/service-protocol.md), browsers show people their own page ("/me"). What
+/// is public belongs to the thread that made it.
 class Service {
   public:
     struct Setup {
@@ -78,6 +80,7 @@ class Service {
     FailureDelays delays_;
     std::unique_ptr<Store> store_;
     HttpServer http_;
+    std::unique_ptr<PeoplesPage> page_;
 };
 
 }  // namespace ktr::server

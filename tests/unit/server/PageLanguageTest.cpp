@@ -22,6 +22,14 @@ constexpr std::int64_t kHour = 3600;
 TEST(PageLanguageTest, Choose_TakesTheChosenOne_ElseTheHeaviestThatThereIs) {
     EXPECT_EQ(PageLanguage::choose("", "xx;q=1, en;q=0.5"), "en");
     EXPECT_EQ(PageLanguage::choose("", ""), "en");
+    EXPECT_EQ(PageLanguage::choose("", "fr;q=0.3, de-AT;q=0.9, en;q=0.5"), "de");
+    EXPECT_EQ(PageLanguage::choose("", "en;q=0, de;q=0.001"), "de");
+    EXPECT_EQ(PageLanguage::choose("ar", "de"), "ar");
+    EXPECT_EQ(PageLanguage::choose("xx", "de"), "de");
+    EXPECT_EQ(PageLanguage::choose("", "zh-TW"), "zh-Hant");
+    EXPECT_EQ(PageLanguage::choose("", "zh-CN"), "zh-Hans");
+    EXPECT_EQ(PageLanguage::choose("", "pt-PT"), "pt");
+    EXPECT_EQ(PageLanguage::choose("", "iw"), "he");
     EXPECT_EQ(PageLanguage::choose("nonsense!", "*"), "en");
     EXPECT_EQ(PageLanguage::choose("", ";;;,,,q=,=;q=9"), "en");
     EXPECT_EQ(PageLanguage::choose("", std::string(100000, ',')), "en");
@@ -65,13 +73,14 @@ TEST(PageLanguageTest, ArgumentsAreSetApartFromTheTextAroundThem) {
 }
 
 TEST(PageLanguageTest, EveryLanguageHasEveryText_AndCallsItselfByAName) {
+    EXPECT_EQ(PageTexts::languages().size(), 21U);
     for (const std::string_view tag : PageTexts::languages()) {
         const PageLanguage language{std::string(tag), "UTC"};
         EXPECT_FALSE(PageLanguage::ownName(std::string(tag)).empty());
         EXPECT_EQ(language.isRightToLeft(), tag == "ar" || tag == "he" || tag == "fa") << tag;
         EXPECT_NE(language.plural("VISIBLE_TO", 3), "VISIBLE_TO");
         const std::string numbers(PageTexts::find(tag, "NUMBERS"));
-        EXPECT_EQ(std::count(numbers.begin(), numbers.end(), '|'), 11) << tag;
+        EXPECT_TRUE(numbers == "-" || std::count(numbers.begin(), numbers.end(), '|') == 11) << tag;
     }
 }
 

@@ -1,0 +1,552 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="ar" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>VISIBLE_TO</source>
+        <extracomment>Title of the people's page; %@ is the number, in words from NUMBERS or in digits. English: “{0, plural, one{%@ person can see where you are.} other{%@ people can see where you are.}}”</extracomment>
+        <translation>{0, plural, zero{لا أحد يرى مكانك.} one{شخص واحد يمكنه أن يرى مكانك.} two{شخصان يمكنهما أن يريا مكانك.} few{%@ أشخاص يمكنهم أن يروا مكانك.} many{%@ شخصًا يمكنهم أن يروا مكانك.} other{%@ شخص يمكنهم أن يروا مكانك.}}</translation>
+    </message>
+    <message>
+        <source>NUMBERS</source>
+        <extracomment>The numbers from one to twelve as they begin VISIBLE_TO, in its gender and case, with a bar between; a hyphen alone where digits are usual. English: “One|Two|Three|Four|Five|Six|Seven|Eight|Nine|Ten|Eleven|Twelve”</extracomment>
+        <translation>-</translation>
+    </message>
+    <message>
+        <source>VISIBLE_TO_NOBODY</source>
+        <extracomment>Title of the people's page while the reader hides or shares with nobody. English: “Nobody can see where you are.”</extracomment>
+        <translation>لا أحد يستطيع أن يرى مكانك.</translation>
+    </message>
+    <message>
+        <source>VISIBLE</source>
+        <extracomment>Label of the one switch over everything. English: “Visible to friends”</extracomment>
+        <translation>ظاهر للأصدقاء</translation>
+    </message>
+    <message>
+        <source>VISIBLE_ON</source>
+        <extracomment>Below VISIBLE while the switch is on. English: “Off hides you from everyone at once.”</extracomment>
+        <translation>الإيقاف يخفيك عن الجميع فورًا.</translation>
+    </message>
+    <message>
+        <source>VISIBLE_OFF</source>
+        <extracomment>Below VISIBLE while the switch is off. English: “Turn on, and the rules below hold again.”</extracomment>
+        <translation>شغّله فتسري القواعد أدناه من جديد.</translation>
+    </message>
+    <message>
+        <source>SWITCH_ON</source>
+        <extracomment>Spoken: a switch, %@ is its label, is on. English: “%@, on”</extracomment>
+        <translation>%@، مشغّل</translation>
+    </message>
+    <message>
+        <source>SWITCH_OFF</source>
+        <extracomment>Spoken: a switch, %@ is its label, is off. English: “%@, off”</extracomment>
+        <translation>%@، متوقف</translation>
+    </message>
+    <message>
+        <source>WHO_SEES_ME</source>
+        <extracomment>Heading above the list of people who see the reader. English: “Who sees me”</extracomment>
+        <translation>من يراني</translation>
+    </message>
+    <message>
+        <source>EXACTLY</source>
+        <extracomment>How exactly somebody is seen. English: “Exactly”</extracomment>
+        <translation>بدقة</translation>
+    </message>
+    <message>
+        <source>WITHIN_1_KM</source>
+        <extracomment>How exactly somebody is seen. English: “Within 1 km”</extracomment>
+        <translation>في حدود 1 كم</translation>
+    </message>
+    <message>
+        <source>TOWN</source>
+        <extracomment>How exactly somebody is seen. English: “The town”</extracomment>
+        <translation>المدينة</translation>
+    </message>
+    <message>
+        <source>NAMED_PLACES</source>
+        <extracomment>How exactly somebody is seen: only when they are at one of their named places. English: “Only places I have named”</extracomment>
+        <translation>الأماكن التي سمّيتها فقط</translation>
+    </message>
+    <message>
+        <source>RULE_ALWAYS</source>
+        <extracomment>A rule: %@ is how exactly. English: “%@, always”</extracomment>
+        <translation>%@، دائمًا</translation>
+    </message>
+    <message>
+        <source>RULE_MIDNIGHT</source>
+        <extracomment>A rule that ends at the next midnight: %@ is how exactly. English: “%@, until midnight”</extracomment>
+        <translation>%@، حتى منتصف الليل</translation>
+    </message>
+    <message>
+        <source>RULE_TIME</source>
+        <extracomment>A rule that ends: %1$@ is how exactly, %2$@ a time or a day and time. English: “%1$@, until %2$@”</extracomment>
+        <translation>%1$@، حتى %2$@</translation>
+    </message>
+    <message>
+        <source>RULE_PLACE</source>
+        <extracomment>A rule that ends when the reader arrives: %1$@ is how exactly, %2$@ the reader's name of a place. English: “%1$@, until you are at %2$@”</extracomment>
+        <translation>%1$@، حتى تصل إلى %2$@</translation>
+    </message>
+    <message>
+        <source>RULE_ENDED</source>
+        <extracomment>In place of a rule that is over: %@ is a day and time. English: “Ended: %@”</extracomment>
+        <translation>انتهت: %@</translation>
+    </message>
+    <message>
+        <source>RULE_ASKED</source>
+        <extracomment>A rule without an end asks now and then whether it is still meant; %@ is the day on which it ends without an answer. English: “Still meant? Without an answer it ends: %@.”</extracomment>
+        <translation>أما زالت مقصودة؟ من دون جواب تنتهي: %@.</translation>
+    </message>
+    <message>
+        <source>KEEP_SHARING</source>
+        <extracomment>Button: the rule goes on. English: “Keep sharing”</extracomment>
+        <translation>متابعة المشاركة</translation>
+    </message>
+    <message>
+        <source>SHARE_WITH</source>
+        <extracomment>Row or button that begins a new rule. English: “Share with somebody”</extracomment>
+        <translation>مشاركة مع شخص</translation>
+    </message>
+    <message>
+        <source>SHARE_WHO</source>
+        <extracomment>Label of a field. English: “Name, e-mail address or phone number”</extracomment>
+        <translation>الاسم أو البريد الإلكتروني أو رقم الهاتف</translation>
+    </message>
+    <message>
+        <source>SHARE_UNKNOWN</source>
+        <extracomment>Nobody was found by what was typed. English: “Nobody here is called so. Whoever runs the service can add people.”</extracomment>
+        <translation>لا أحد هنا بهذا الاسم. من يدير الخدمة يمكنه إضافة أشخاص.</translation>
+    </message>
+    <message>
+        <source>SHARE_SELF</source>
+        <extracomment>The reader typed their own name. English: “Nobody shares with themselves.”</extracomment>
+        <translation>لا أحد يشارك مع نفسه.</translation>
+    </message>
+    <message>
+        <source>GO_ON</source>
+        <extracomment>Button: to the next step. English: “Go on”</extracomment>
+        <translation>متابعة</translation>
+    </message>
+    <message>
+        <source>WHO_LOOKED</source>
+        <extracomment>Heading above the list of people who looked. English: “Who looked”</extracomment>
+        <translation>من نظر</translation>
+    </message>
+    <message>
+        <source>ALL_LOOKS</source>
+        <extracomment>Row that opens all that is kept of who looked; %@ is a number of days. English: “{0, plural, one{All of the last day} other{All of the last %@ days}}”</extracomment>
+        <translation>{0, plural, zero{كل ما في آخر %@ يوم} one{كل ما في اليوم الأخير} two{كل ما في آخر يومين} few{كل ما في آخر %@ أيام} many{كل ما في آخر %@ يومًا} other{كل ما في آخر %@ يوم}}</translation>
+    </message>
+    <message>
+        <source>NOBODY_LOOKED</source>
+        <extracomment>No entry in the list of people who looked. English: “Nobody has looked.”</extracomment>
+        <translation>لم ينظر أحد.</translation>
+    </message>
+    <message>
+        <source>CARRIED</source>
+        <extracomment>After the name of who looked: their phone fetched it by itself, nobody asked. English: “by their phone alone”</extracomment>
+        <translation>الهاتف وحده من تلقاء نفسه</translation>
+    </message>
+    <message>
+        <source>MY_DATA</source>
+        <extracomment>Heading. English: “My phone and my data”</extracomment>
+        <translation>هاتفي وبياناتي</translation>
+    </message>
+    <message>
+        <source>SET_UP_PHONE</source>
+        <extracomment>Row and title. English: “Set up a phone”</extracomment>
+        <translation>إعداد هاتف</translation>
+    </message>
+    <message>
+        <source>MY_DEVICES</source>
+        <extracomment>Row and title: list of phones, programs and browsers. English: “My devices”</extracomment>
+        <translation>أجهزتي</translation>
+    </message>
+    <message>
+        <source>MY_SETTINGS</source>
+        <extracomment>Row and title: language, time zone, how long things are kept. English: “Settings”</extracomment>
+        <translation>الإعدادات</translation>
+    </message>
+    <message>
+        <source>GET_COPY</source>
+        <extracomment>Row: a file with everything about the reader. English: “Get a copy of my data”</extracomment>
+        <translation>الحصول على نسخة من بياناتي</translation>
+    </message>
+    <message>
+        <source>DELETE_ALL</source>
+        <extracomment>Row and title. English: “Delete everything about me”</extracomment>
+        <translation>حذف كل ما يخصّني</translation>
+    </message>
+    <message>
+        <source>SIGN_OUT</source>
+        <extracomment>Button. English: “Sign out”</extracomment>
+        <translation>تسجيل الخروج</translation>
+    </message>
+    <message>
+        <source>BACK</source>
+        <extracomment>Spoken: the arrow back. English: “Back”</extracomment>
+        <translation>رجوع</translation>
+    </message>
+    <message>
+        <source>SEES_TITLE</source>
+        <extracomment>Title of the page about one rule; %@ is a name. English: “What %@ sees”</extracomment>
+        <translation>ما يراه %@</translation>
+    </message>
+    <message>
+        <source>SEES_THIS</source>
+        <extracomment>Below a row that shows the reader as %@ sees them. English: “%@ sees you exactly like this.”</extracomment>
+        <translation>%@ يراك هكذا تمامًا.</translation>
+    </message>
+    <message>
+        <source>SEES_NOTHING</source>
+        <extracomment>In place of that row; %@ is a name. English: “%@ sees no place of yours now.”</extracomment>
+        <translation>%@ لا يرى لك مكانًا الآن.</translation>
+    </message>
+    <message>
+        <source>A_PLACE_WITHIN</source>
+        <extracomment>In that row: a place that is known within a distance, %@. English: “Within %@”</extracomment>
+        <translation>في حدود %@</translation>
+    </message>
+    <message>
+        <source>HOW_EXACTLY</source>
+        <extracomment>Heading above a choice. English: “How exactly”</extracomment>
+        <translation>بأي دقة</translation>
+    </message>
+    <message>
+        <source>UNTIL</source>
+        <extracomment>Heading above a choice. English: “Until”</extracomment>
+        <translation>حتى</translation>
+    </message>
+    <message>
+        <source>UNTIL_CHANGED</source>
+        <extracomment>Choice of when a rule ends: not by itself. English: “I change it”</extracomment>
+        <translation>أغيّره بنفسي</translation>
+    </message>
+    <message>
+        <source>UNTIL_MIDNIGHT</source>
+        <extracomment>Choice of when a rule ends. English: “Midnight”</extracomment>
+        <translation>منتصف الليل</translation>
+    </message>
+    <message>
+        <source>UNTIL_ARRIVAL</source>
+        <extracomment>Choice of when a rule ends; a list of places follows. English: “I arrive at”</extracomment>
+        <translation>أصل إلى</translation>
+    </message>
+    <message>
+        <source>UNTIL_TIME</source>
+        <extracomment>Choice of when a rule ends; a field for a time follows. English: “A time”</extracomment>
+        <translation>وقت معيّن</translation>
+    </message>
+    <message>
+        <source>SAID_ALOUD</source>
+        <extracomment>Label of a box to tick: speakers may say where the reader is. English: “May be said aloud”</extracomment>
+        <translation>يجوز قوله بصوت مسموع</translation>
+    </message>
+    <message>
+        <source>SAID_ALOUD_WHERE</source>
+        <extracomment>Below SAID_ALOUD; %@ is a name. English: “Speakers at %@’s may say it”</extracomment>
+        <translation>يجوز لمكبّرات الصوت لدى %@ أن تقوله</translation>
+    </message>
+    <message>
+        <source>SAVE</source>
+        <extracomment>Button. English: “Save”</extracomment>
+        <translation>حفظ</translation>
+    </message>
+    <message>
+        <source>STOP</source>
+        <extracomment>Button and title; %@ is a name. English: “Stop sharing with %@”</extracomment>
+        <translation>إيقاف المشاركة مع %@</translation>
+    </message>
+    <message>
+        <source>STOP_ASK</source>
+        <extracomment>Asks before STOP; %@ is a name. English: “%@ will see nothing of you from now on. What their phone has shown stays on it.”</extracomment>
+        <translation>لن يرى %@ شيئًا عنك من الآن. ما عرضه الهاتف يبقى عليه.</translation>
+    </message>
+    <message>
+        <source>KEEP</source>
+        <extracomment>Button: do not stop, do not delete. English: “Keep”</extracomment>
+        <translation>إبقاء</translation>
+    </message>
+    <message>
+        <source>STEP_INSTALL</source>
+        <extracomment>First step of setting up a phone. English: “Install a tracker app that can send to an address of your own.”</extracomment>
+        <translation>ثبّت تطبيق تتبّع يستطيع الإرسال إلى عنوان خاص بك.</translation>
+    </message>
+    <message>
+        <source>STEP_TYPE</source>
+        <extracomment>Second step; three values follow. English: “Type these three into it.”</extracomment>
+        <translation>اكتب هذه الثلاثة فيه.</translation>
+    </message>
+    <message>
+        <source>STEP_RUN</source>
+        <extracomment>Third step. English: “Let it run, then look again: the phone’s first place shows up here.”</extracomment>
+        <translation>دعه يعمل ثم انظر مرة أخرى: يظهر أول مكان للهاتف هنا.</translation>
+    </message>
+    <message>
+        <source>ADDRESS</source>
+        <extracomment>Label of a value to type. English: “Address”</extracomment>
+        <translation>العنوان</translation>
+    </message>
+    <message>
+        <source>USER</source>
+        <extracomment>Label of a value to type. English: “User”</extracomment>
+        <translation>المستخدم</translation>
+    </message>
+    <message>
+        <source>PASSWORD</source>
+        <extracomment>Label of a value to type. English: “Password”</extracomment>
+        <translation>كلمة السر</translation>
+    </message>
+    <message>
+        <source>SHOWN_ONCE</source>
+        <extracomment>Warning below the values. English: “This password is shown once. For another phone, set up another.”</extracomment>
+        <translation>تُعرض كلمة السر هذه مرة واحدة. لهاتف آخر أعِدّ غيرها.</translation>
+    </message>
+    <message>
+        <source>WAS_SHOWN</source>
+        <extracomment>In place of the password; %@ is a day. English: “Shown once: %@.”</extracomment>
+        <translation>عُرضت مرة واحدة: %@.</translation>
+    </message>
+    <message>
+        <source>ADDRESS_ALONE</source>
+        <extracomment>Above an address for apps that take nothing else. English: “For apps that take nothing but an address:”</extracomment>
+        <translation>للتطبيقات التي لا تقبل إلا عنوانًا:</translation>
+    </message>
+    <message>
+        <source>MAKE_PASSWORD</source>
+        <extracomment>Button on the first page of setting up a phone. English: “Show what to type”</extracomment>
+        <translation>عرض ما يُكتب</translation>
+    </message>
+    <message>
+        <source>NOTHING_YET</source>
+        <extracomment>No message of a phone has come. English: “Nothing has come yet.”</extracomment>
+        <translation>لم يصل شيء بعد.</translation>
+    </message>
+    <message>
+        <source>HERE_SINCE</source>
+        <extracomment>A phone's first place has come; %1$@ is a time, %2$@ a distance. English: “Here since %1$@, within about %2$@.”</extracomment>
+        <translation>هنا منذ %1$@، في حدود %2$@ تقريبًا.</translation>
+    </message>
+    <message>
+        <source>HERE_SINCE_TIME</source>
+        <extracomment>A phone was heard; %@ is a time. English: “Here since %@.”</extracomment>
+        <translation>هنا منذ %@.</translation>
+    </message>
+    <message>
+        <source>LOOK_AGAIN</source>
+        <extracomment>Button: loads the page again. English: “Look again”</extracomment>
+        <translation>النظر مرة أخرى</translation>
+    </message>
+    <message>
+        <source>OTHER_PHONE</source>
+        <extracomment>Above a code for a camera. English: “Is the phone another one than this? Point its camera here, and this page opens on it.”</extracomment>
+        <translation>هل الهاتف غير هذا؟ وجّه كاميرته إلى هنا فتُفتح هذه الصفحة عليه.</translation>
+    </message>
+    <message>
+        <source>CODE</source>
+        <extracomment>Spoken: a picture with a code for a camera. English: “Code for a camera”</extracomment>
+        <translation>رمز للكاميرا</translation>
+    </message>
+    <message>
+        <source>DEVICE_PHONE</source>
+        <extracomment>A device of the reader's. English: “Phone”</extracomment>
+        <translation>هاتف</translation>
+    </message>
+    <message>
+        <source>DEVICE_READER</source>
+        <extracomment>A device of the reader's: the program that shows friends. English: “Program that asks for friends”</extracomment>
+        <translation>برنامج يسأل عن الأصدقاء</translation>
+    </message>
+    <message>
+        <source>DEVICE_BROWSER</source>
+        <extracomment>A device of the reader's. English: “Browser”</extracomment>
+        <translation>متصفّح</translation>
+    </message>
+    <message>
+        <source>DEVICE_THIS</source>
+        <extracomment>A device of the reader's: the one in use. English: “This browser”</extracomment>
+        <translation>هذا المتصفّح</translation>
+    </message>
+    <message>
+        <source>DEVICE_HEARD</source>
+        <extracomment>Below a device; %@ is a day and time. English: “Last heard: %@”</extracomment>
+        <translation>آخر إشارة: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_SINCE</source>
+        <extracomment>Below a device; %@ is a day and time. English: “Since: %@”</extracomment>
+        <translation>منذ: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_END</source>
+        <extracomment>Button: the device may do nothing any more. English: “End”</extracomment>
+        <translation>إنهاء</translation>
+    </message>
+    <message>
+        <source>DEVICE_END_SPOKEN</source>
+        <extracomment>Spoken: the same button; %@ is the device and its day. English: “End: %@”</extracomment>
+        <translation>إنهاء: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_ASK</source>
+        <extracomment>Asks before DEVICE_END. English: “It sends nothing and sees nobody from then on, and what it began ends.”</extracomment>
+        <translation>لن يرسل شيئًا ولن يرى أحدًا بعد ذلك، وما بدأه ينتهي.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_PLACES_KEPT</source>
+        <extracomment>Label of a choice of durations. English: “My places are kept for”</extracomment>
+        <translation>مدة حفظ أماكني</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LOOKS_KEPT</source>
+        <extracomment>Label of a choice of durations. English: “Who looked is kept for”</extracomment>
+        <translation>مدة حفظ من نظر</translation>
+    </message>
+    <message>
+        <source>SETTINGS_ZONE</source>
+        <extracomment>Label of a choice. English: “Time zone”</extracomment>
+        <translation>المنطقة الزمنية</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LANGUAGE</source>
+        <extracomment>Label of a choice. English: “Language”</extracomment>
+        <translation>اللغة</translation>
+    </message>
+    <message>
+        <source>SAVED</source>
+        <extracomment>After saving. English: “Saved.”</extracomment>
+        <translation>تم الحفظ.</translation>
+    </message>
+    <message>
+        <source>DELETE_ASK</source>
+        <extracomment>Asks before everything about the reader is deleted. English: “Your places, rules, devices and the notes of who looked go for good. Phones of friends keep what they have shown.”</extracomment>
+        <translation>تزول أماكنك وقواعدك وأجهزتك وسجل من نظر نهائيًا. هواتف الأصدقاء تحتفظ بما عرضته.</translation>
+    </message>
+    <message>
+        <source>DELETE_NOW</source>
+        <extracomment>Button. English: “Delete everything”</extracomment>
+        <translation>حذف كل شيء</translation>
+    </message>
+    <message>
+        <source>DELETED</source>
+        <extracomment>After everything was deleted. English: “Everything about you is deleted.”</extracomment>
+        <translation>حُذف كل ما يخصّك.</translation>
+    </message>
+    <message>
+        <source>LINK_TITLE</source>
+        <extracomment>Title of the page that a link opens. English: “Your own page”</extracomment>
+        <translation>صفحتك الخاصة</translation>
+    </message>
+    <message>
+        <source>LINK_TEXT</source>
+        <extracomment>Below it. English: “This link works once. After that this browser stays signed in for 30 days.”</extracomment>
+        <translation>يعمل هذا الرابط مرة واحدة. بعدها يبقى هذا المتصفّح مسجّلًا 30 يومًا.</translation>
+    </message>
+    <message>
+        <source>LINK_OPEN</source>
+        <extracomment>Button. English: “Open my page”</extracomment>
+        <translation>فتح صفحتي</translation>
+    </message>
+    <message>
+        <source>LINK_SPENT</source>
+        <extracomment>The link cannot be used any more. English: “This link has been used, or its 15 minutes are over. Ask for another one.”</extracomment>
+        <translation>استُعمل هذا الرابط أو انقضت دقائقه الخمس عشرة. اطلب غيره.</translation>
+    </message>
+    <message>
+        <source>SIGNED_OUT</source>
+        <extracomment>Title: nobody is signed in. English: “This page opens with a link.”</extracomment>
+        <translation>تُفتح هذه الصفحة برابط.</translation>
+    </message>
+    <message>
+        <source>SIGNED_OUT_TEXT</source>
+        <extracomment>Below it. English: “Whoever runs the service gives you one. It works once, for 15 minutes.”</extracomment>
+        <translation>يعطيك إياه من يدير الخدمة. يعمل مرة واحدة خلال 15 دقيقة.</translation>
+    </message>
+    <message>
+        <source>NO_SUCH_PAGE</source>
+        <extracomment>Title. English: “There is no such page.”</extracomment>
+        <translation>لا توجد صفحة كهذه.</translation>
+    </message>
+    <message>
+        <source>NOT_FROM_HERE</source>
+        <extracomment>A form that another page sent. English: “This did not come from your own page. Nothing has changed.”</extracomment>
+        <translation>لم يأتِ هذا من صفحتك الخاصة. لم يتغيّر شيء.</translation>
+    </message>
+    <message>
+        <source>NOT_KEPT</source>
+        <extracomment>The service could not write. English: “It could not be kept just now. Nothing has changed; try again in a while.”</extracomment>
+        <translation>تعذّر الحفظ الآن. لم يتغيّر شيء؛ حاول بعد قليل.</translation>
+    </message>
+    <message>
+        <source>NOT_UNDERSTOOD</source>
+        <extracomment>A form with something missing. English: “Something is missing there. Nothing has changed; go back and choose again.”</extracomment>
+        <translation>هناك شيء ناقص. لم يتغيّر شيء؛ ارجع واختر من جديد.</translation>
+    </message>
+    <message>
+        <source>TIME_WANTED</source>
+        <extracomment>No time was given beside the choice of one. English: “Choose the time at which it ends.”</extracomment>
+        <translation>اختر الوقت الذي تنتهي فيه.</translation>
+    </message>
+    <message>
+        <source>TO_MY_PAGE</source>
+        <extracomment>Link. English: “To my page”</extracomment>
+        <translation>إلى صفحتي</translation>
+    </message>
+    <message>
+        <source>MY_PLACES</source>
+        <extracomment>Row and title: places to which the reader gave names. English: “My places”</extracomment>
+        <translation>أماكني</translation>
+    </message>
+    <message>
+        <source>PLACE_NONE</source>
+        <extracomment>No place has a name. English: “No place has a name yet.”</extracomment>
+        <translation>لا اسم لأي مكان بعد.</translation>
+    </message>
+    <message>
+        <source>PLACE_HERE</source>
+        <extracomment>Heading and button. English: “Name the place where I am”</extracomment>
+        <translation>تسمية المكان الذي أنا فيه</translation>
+    </message>
+    <message>
+        <source>PLACE_HERE_HINT</source>
+        <extracomment>Below PLACE_HERE. English: “The place of your phone’s last message, and 150 metres around it.”</extracomment>
+        <translation>مكان آخر رسالة من هاتفك، و150 مترًا حوله.</translation>
+    </message>
+    <message>
+        <source>PLACE_NO_FIX</source>
+        <extracomment>Instead of PLACE_HERE_HINT. English: “Your phone has sent no place yet.”</extracomment>
+        <translation>لم يرسل هاتفك مكانًا بعد.</translation>
+    </message>
+    <message>
+        <source>PLACE_NAME</source>
+        <extracomment>Label of a field. English: “Name of the place”</extracomment>
+        <translation>اسم المكان</translation>
+    </message>
+    <message>
+        <source>PLACE_SAID</source>
+        <extracomment>Label of a box to tick, and below a place. English: “Friends may hear its name”</extracomment>
+        <translation>يجوز للأصدقاء سماع اسمه</translation>
+    </message>
+    <message>
+        <source>PLACE_UNSAID</source>
+        <extracomment>Below a place. English: “Nobody hears its name”</extracomment>
+        <translation>لا أحد يسمع اسمه</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE</source>
+        <extracomment>Button. English: “Remove”</extracomment>
+        <translation>إزالة</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE_ONE</source>
+        <extracomment>Title, and spoken: the same button; %@ is the name of a place. English: “Remove: %@”</extracomment>
+        <translation>إزالة: %@</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE_ASK</source>
+        <extracomment>Asks before PLACE_REMOVE. English: “Its name goes, and rules that were to end there end now.”</extracomment>
+        <translation>يزول اسمه، والقواعد التي كانت ستنتهي عنده تنتهي الآن.</translation>
+    </message>
+</context>
+</TS>

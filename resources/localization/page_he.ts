@@ -1,0 +1,552 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="he" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>VISIBLE_TO</source>
+        <extracomment>Title of the people's page; %@ is the number, in words from NUMBERS or in digits. English: “{0, plural, one{%@ person can see where you are.} other{%@ people can see where you are.}}”</extracomment>
+        <translation>{0, plural, one{אדם אחד יכול לראות איפה אני.} two{שני אנשים יכולים לראות איפה אני.} many{%@ אנשים יכולים לראות איפה אני.} other{%@ אנשים יכולים לראות איפה אני.}}</translation>
+    </message>
+    <message>
+        <source>NUMBERS</source>
+        <extracomment>The numbers from one to twelve as they begin VISIBLE_TO, in its gender and case, with a bar between; a hyphen alone where digits are usual. English: “One|Two|Three|Four|Five|Six|Seven|Eight|Nine|Ten|Eleven|Twelve”</extracomment>
+        <translation>-</translation>
+    </message>
+    <message>
+        <source>VISIBLE_TO_NOBODY</source>
+        <extracomment>Title of the people's page while the reader hides or shares with nobody. English: “Nobody can see where you are.”</extracomment>
+        <translation>אף אחד לא יכול לראות איפה אני.</translation>
+    </message>
+    <message>
+        <source>VISIBLE</source>
+        <extracomment>Label of the one switch over everything. English: “Visible to friends”</extracomment>
+        <translation>גלוי לחברים</translation>
+    </message>
+    <message>
+        <source>VISIBLE_ON</source>
+        <extracomment>Below VISIBLE while the switch is on. English: “Off hides you from everyone at once.”</extracomment>
+        <translation>כיבוי מסתיר אותך מכולם מיד.</translation>
+    </message>
+    <message>
+        <source>VISIBLE_OFF</source>
+        <extracomment>Below VISIBLE while the switch is off. English: “Turn on, and the rules below hold again.”</extracomment>
+        <translation>הפעלה מחזירה לתוקף את הכללים שלמטה.</translation>
+    </message>
+    <message>
+        <source>SWITCH_ON</source>
+        <extracomment>Spoken: a switch, %@ is its label, is on. English: “%@, on”</extracomment>
+        <translation>%@, פועל</translation>
+    </message>
+    <message>
+        <source>SWITCH_OFF</source>
+        <extracomment>Spoken: a switch, %@ is its label, is off. English: “%@, off”</extracomment>
+        <translation>%@, כבוי</translation>
+    </message>
+    <message>
+        <source>WHO_SEES_ME</source>
+        <extracomment>Heading above the list of people who see the reader. English: “Who sees me”</extracomment>
+        <translation>מי רואה אותי</translation>
+    </message>
+    <message>
+        <source>EXACTLY</source>
+        <extracomment>How exactly somebody is seen. English: “Exactly”</extracomment>
+        <translation>במדויק</translation>
+    </message>
+    <message>
+        <source>WITHIN_1_KM</source>
+        <extracomment>How exactly somebody is seen. English: “Within 1 km”</extracomment>
+        <translation>בטווח 1 ק״מ</translation>
+    </message>
+    <message>
+        <source>TOWN</source>
+        <extracomment>How exactly somebody is seen. English: “The town”</extracomment>
+        <translation>העיר</translation>
+    </message>
+    <message>
+        <source>NAMED_PLACES</source>
+        <extracomment>How exactly somebody is seen: only when they are at one of their named places. English: “Only places I have named”</extracomment>
+        <translation>רק מקומות שנתתי להם שם</translation>
+    </message>
+    <message>
+        <source>RULE_ALWAYS</source>
+        <extracomment>A rule: %@ is how exactly. English: “%@, always”</extracomment>
+        <translation>%@, תמיד</translation>
+    </message>
+    <message>
+        <source>RULE_MIDNIGHT</source>
+        <extracomment>A rule that ends at the next midnight: %@ is how exactly. English: “%@, until midnight”</extracomment>
+        <translation>%@, עד חצות</translation>
+    </message>
+    <message>
+        <source>RULE_TIME</source>
+        <extracomment>A rule that ends: %1$@ is how exactly, %2$@ a time or a day and time. English: “%1$@, until %2$@”</extracomment>
+        <translation>%1$@, עד %2$@</translation>
+    </message>
+    <message>
+        <source>RULE_PLACE</source>
+        <extracomment>A rule that ends when the reader arrives: %1$@ is how exactly, %2$@ the reader's name of a place. English: “%1$@, until you are at %2$@”</extracomment>
+        <translation>%1$@, עד ההגעה אל %2$@</translation>
+    </message>
+    <message>
+        <source>RULE_ENDED</source>
+        <extracomment>In place of a rule that is over: %@ is a day and time. English: “Ended: %@”</extracomment>
+        <translation>הסתיים: %@</translation>
+    </message>
+    <message>
+        <source>RULE_ASKED</source>
+        <extracomment>A rule without an end asks now and then whether it is still meant; %@ is the day on which it ends without an answer. English: “Still meant? Without an answer it ends: %@.”</extracomment>
+        <translation>עדיין בתוקף? בלי תשובה זה מסתיים: %@.</translation>
+    </message>
+    <message>
+        <source>KEEP_SHARING</source>
+        <extracomment>Button: the rule goes on. English: “Keep sharing”</extracomment>
+        <translation>להמשיך לשתף</translation>
+    </message>
+    <message>
+        <source>SHARE_WITH</source>
+        <extracomment>Row or button that begins a new rule. English: “Share with somebody”</extracomment>
+        <translation>שיתוף עם מישהו</translation>
+    </message>
+    <message>
+        <source>SHARE_WHO</source>
+        <extracomment>Label of a field. English: “Name, e-mail address or phone number”</extracomment>
+        <translation>שם, כתובת דוא״ל או מספר טלפון</translation>
+    </message>
+    <message>
+        <source>SHARE_UNKNOWN</source>
+        <extracomment>Nobody was found by what was typed. English: “Nobody here is called so. Whoever runs the service can add people.”</extracomment>
+        <translation>אין כאן אף אחד בשם הזה. מי שמפעיל את השירות יכול להוסיף אנשים.</translation>
+    </message>
+    <message>
+        <source>SHARE_SELF</source>
+        <extracomment>The reader typed their own name. English: “Nobody shares with themselves.”</extracomment>
+        <translation>אי אפשר לשתף עם עצמך.</translation>
+    </message>
+    <message>
+        <source>GO_ON</source>
+        <extracomment>Button: to the next step. English: “Go on”</extracomment>
+        <translation>המשך</translation>
+    </message>
+    <message>
+        <source>WHO_LOOKED</source>
+        <extracomment>Heading above the list of people who looked. English: “Who looked”</extracomment>
+        <translation>מי הסתכל</translation>
+    </message>
+    <message>
+        <source>ALL_LOOKS</source>
+        <extracomment>Row that opens all that is kept of who looked; %@ is a number of days. English: “{0, plural, one{All of the last day} other{All of the last %@ days}}”</extracomment>
+        <translation>{0, plural, one{הכול מהיום האחרון} two{הכול מהיומיים האחרונים} many{הכול מ־%@ הימים האחרונים} other{הכול מ־%@ הימים האחרונים}}</translation>
+    </message>
+    <message>
+        <source>NOBODY_LOOKED</source>
+        <extracomment>No entry in the list of people who looked. English: “Nobody has looked.”</extracomment>
+        <translation>אף אחד לא הסתכל.</translation>
+    </message>
+    <message>
+        <source>CARRIED</source>
+        <extracomment>After the name of who looked: their phone fetched it by itself, nobody asked. English: “by their phone alone”</extracomment>
+        <translation>רק הטלפון מעצמו</translation>
+    </message>
+    <message>
+        <source>MY_DATA</source>
+        <extracomment>Heading. English: “My phone and my data”</extracomment>
+        <translation>הטלפון שלי והנתונים שלי</translation>
+    </message>
+    <message>
+        <source>SET_UP_PHONE</source>
+        <extracomment>Row and title. English: “Set up a phone”</extracomment>
+        <translation>הגדרת טלפון</translation>
+    </message>
+    <message>
+        <source>MY_DEVICES</source>
+        <extracomment>Row and title: list of phones, programs and browsers. English: “My devices”</extracomment>
+        <translation>המכשירים שלי</translation>
+    </message>
+    <message>
+        <source>MY_SETTINGS</source>
+        <extracomment>Row and title: language, time zone, how long things are kept. English: “Settings”</extracomment>
+        <translation>הגדרות</translation>
+    </message>
+    <message>
+        <source>GET_COPY</source>
+        <extracomment>Row: a file with everything about the reader. English: “Get a copy of my data”</extracomment>
+        <translation>קבלת עותק של הנתונים שלי</translation>
+    </message>
+    <message>
+        <source>DELETE_ALL</source>
+        <extracomment>Row and title. English: “Delete everything about me”</extracomment>
+        <translation>מחיקת כל מה שנוגע אליי</translation>
+    </message>
+    <message>
+        <source>SIGN_OUT</source>
+        <extracomment>Button. English: “Sign out”</extracomment>
+        <translation>יציאה</translation>
+    </message>
+    <message>
+        <source>BACK</source>
+        <extracomment>Spoken: the arrow back. English: “Back”</extracomment>
+        <translation>חזרה</translation>
+    </message>
+    <message>
+        <source>SEES_TITLE</source>
+        <extracomment>Title of the page about one rule; %@ is a name. English: “What %@ sees”</extracomment>
+        <translation>מה רואים אצל %@</translation>
+    </message>
+    <message>
+        <source>SEES_THIS</source>
+        <extracomment>Below a row that shows the reader as %@ sees them. English: “%@ sees you exactly like this.”</extracomment>
+        <translation>כך בדיוק רואים אותך אצל %@.</translation>
+    </message>
+    <message>
+        <source>SEES_NOTHING</source>
+        <extracomment>In place of that row; %@ is a name. English: “%@ sees no place of yours now.”</extracomment>
+        <translation>כרגע לא רואים אצל %@ שום מקום שלך.</translation>
+    </message>
+    <message>
+        <source>A_PLACE_WITHIN</source>
+        <extracomment>In that row: a place that is known within a distance, %@. English: “Within %@”</extracomment>
+        <translation>בטווח %@</translation>
+    </message>
+    <message>
+        <source>HOW_EXACTLY</source>
+        <extracomment>Heading above a choice. English: “How exactly”</extracomment>
+        <translation>באיזה דיוק</translation>
+    </message>
+    <message>
+        <source>UNTIL</source>
+        <extracomment>Heading above a choice. English: “Until”</extracomment>
+        <translation>עד</translation>
+    </message>
+    <message>
+        <source>UNTIL_CHANGED</source>
+        <extracomment>Choice of when a rule ends: not by itself. English: “I change it”</extracomment>
+        <translation>שינוי על ידי</translation>
+    </message>
+    <message>
+        <source>UNTIL_MIDNIGHT</source>
+        <extracomment>Choice of when a rule ends. English: “Midnight”</extracomment>
+        <translation>חצות</translation>
+    </message>
+    <message>
+        <source>UNTIL_ARRIVAL</source>
+        <extracomment>Choice of when a rule ends; a list of places follows. English: “I arrive at”</extracomment>
+        <translation>הגעה אל</translation>
+    </message>
+    <message>
+        <source>UNTIL_TIME</source>
+        <extracomment>Choice of when a rule ends; a field for a time follows. English: “A time”</extracomment>
+        <translation>שעה</translation>
+    </message>
+    <message>
+        <source>SAID_ALOUD</source>
+        <extracomment>Label of a box to tick: speakers may say where the reader is. English: “May be said aloud”</extracomment>
+        <translation>מותר לומר בקול</translation>
+    </message>
+    <message>
+        <source>SAID_ALOUD_WHERE</source>
+        <extracomment>Below SAID_ALOUD; %@ is a name. English: “Speakers at %@’s may say it”</extracomment>
+        <translation>לרמקולים אצל %@ מותר לומר זאת</translation>
+    </message>
+    <message>
+        <source>SAVE</source>
+        <extracomment>Button. English: “Save”</extracomment>
+        <translation>שמירה</translation>
+    </message>
+    <message>
+        <source>STOP</source>
+        <extracomment>Button and title; %@ is a name. English: “Stop sharing with %@”</extracomment>
+        <translation>הפסקת השיתוף עם %@</translation>
+    </message>
+    <message>
+        <source>STOP_ASK</source>
+        <extracomment>Asks before STOP; %@ is a name. English: “%@ will see nothing of you from now on. What their phone has shown stays on it.”</extracomment>
+        <translation>מעכשיו לא רואים עליך דבר אצל %@. מה שהטלפון הציג נשאר בו.</translation>
+    </message>
+    <message>
+        <source>KEEP</source>
+        <extracomment>Button: do not stop, do not delete. English: “Keep”</extracomment>
+        <translation>להשאיר</translation>
+    </message>
+    <message>
+        <source>STEP_INSTALL</source>
+        <extracomment>First step of setting up a phone. English: “Install a tracker app that can send to an address of your own.”</extracomment>
+        <translation>יש להתקין יישום מעקב שיכול לשלוח לכתובת משלך.</translation>
+    </message>
+    <message>
+        <source>STEP_TYPE</source>
+        <extracomment>Second step; three values follow. English: “Type these three into it.”</extracomment>
+        <translation>יש להקליד בו את שלושת אלה.</translation>
+    </message>
+    <message>
+        <source>STEP_RUN</source>
+        <extracomment>Third step. English: “Let it run, then look again: the phone’s first place shows up here.”</extracomment>
+        <translation>יש להניח לו לפעול ואז להסתכל שוב: המקום הראשון של הטלפון מופיע כאן.</translation>
+    </message>
+    <message>
+        <source>ADDRESS</source>
+        <extracomment>Label of a value to type. English: “Address”</extracomment>
+        <translation>כתובת</translation>
+    </message>
+    <message>
+        <source>USER</source>
+        <extracomment>Label of a value to type. English: “User”</extracomment>
+        <translation>משתמש</translation>
+    </message>
+    <message>
+        <source>PASSWORD</source>
+        <extracomment>Label of a value to type. English: “Password”</extracomment>
+        <translation>סיסמה</translation>
+    </message>
+    <message>
+        <source>SHOWN_ONCE</source>
+        <extracomment>Warning below the values. English: “This password is shown once. For another phone, set up another.”</extracomment>
+        <translation>הסיסמה מוצגת פעם אחת. לטלפון אחר יש להגדיר אחרת.</translation>
+    </message>
+    <message>
+        <source>WAS_SHOWN</source>
+        <extracomment>In place of the password; %@ is a day. English: “Shown once: %@.”</extracomment>
+        <translation>הוצגה פעם אחת: %@.</translation>
+    </message>
+    <message>
+        <source>ADDRESS_ALONE</source>
+        <extracomment>Above an address for apps that take nothing else. English: “For apps that take nothing but an address:”</extracomment>
+        <translation>ליישומים שמקבלים רק כתובת:</translation>
+    </message>
+    <message>
+        <source>MAKE_PASSWORD</source>
+        <extracomment>Button on the first page of setting up a phone. English: “Show what to type”</extracomment>
+        <translation>הצגת מה שיש להקליד</translation>
+    </message>
+    <message>
+        <source>NOTHING_YET</source>
+        <extracomment>No message of a phone has come. English: “Nothing has come yet.”</extracomment>
+        <translation>עוד לא הגיע דבר.</translation>
+    </message>
+    <message>
+        <source>HERE_SINCE</source>
+        <extracomment>A phone's first place has come; %1$@ is a time, %2$@ a distance. English: “Here since %1$@, within about %2$@.”</extracomment>
+        <translation>כאן מאז %1$@, בטווח של כ־%2$@.</translation>
+    </message>
+    <message>
+        <source>HERE_SINCE_TIME</source>
+        <extracomment>A phone was heard; %@ is a time. English: “Here since %@.”</extracomment>
+        <translation>כאן מאז %@.</translation>
+    </message>
+    <message>
+        <source>LOOK_AGAIN</source>
+        <extracomment>Button: loads the page again. English: “Look again”</extracomment>
+        <translation>להסתכל שוב</translation>
+    </message>
+    <message>
+        <source>OTHER_PHONE</source>
+        <extracomment>Above a code for a camera. English: “Is the phone another one than this? Point its camera here, and this page opens on it.”</extracomment>
+        <translation>הטלפון הוא אחר? יש לכוון לכאן את המצלמה שלו, והדף הזה ייפתח בו.</translation>
+    </message>
+    <message>
+        <source>CODE</source>
+        <extracomment>Spoken: a picture with a code for a camera. English: “Code for a camera”</extracomment>
+        <translation>קוד למצלמה</translation>
+    </message>
+    <message>
+        <source>DEVICE_PHONE</source>
+        <extracomment>A device of the reader's. English: “Phone”</extracomment>
+        <translation>טלפון</translation>
+    </message>
+    <message>
+        <source>DEVICE_READER</source>
+        <extracomment>A device of the reader's: the program that shows friends. English: “Program that asks for friends”</extracomment>
+        <translation>תוכנה ששואלת על חברים</translation>
+    </message>
+    <message>
+        <source>DEVICE_BROWSER</source>
+        <extracomment>A device of the reader's. English: “Browser”</extracomment>
+        <translation>דפדפן</translation>
+    </message>
+    <message>
+        <source>DEVICE_THIS</source>
+        <extracomment>A device of the reader's: the one in use. English: “This browser”</extracomment>
+        <translation>הדפדפן הזה</translation>
+    </message>
+    <message>
+        <source>DEVICE_HEARD</source>
+        <extracomment>Below a device; %@ is a day and time. English: “Last heard: %@”</extracomment>
+        <translation>נשמע לאחרונה: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_SINCE</source>
+        <extracomment>Below a device; %@ is a day and time. English: “Since: %@”</extracomment>
+        <translation>מאז: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_END</source>
+        <extracomment>Button: the device may do nothing any more. English: “End”</extracomment>
+        <translation>סיום</translation>
+    </message>
+    <message>
+        <source>DEVICE_END_SPOKEN</source>
+        <extracomment>Spoken: the same button; %@ is the device and its day. English: “End: %@”</extracomment>
+        <translation>סיום: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_ASK</source>
+        <extracomment>Asks before DEVICE_END. English: “It sends nothing and sees nobody from then on, and what it began ends.”</extracomment>
+        <translation>הוא לא ישלח דבר ולא יראה איש, ומה שהתחיל יסתיים.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_PLACES_KEPT</source>
+        <extracomment>Label of a choice of durations. English: “My places are kept for”</extracomment>
+        <translation>המקומות שלי נשמרים למשך</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LOOKS_KEPT</source>
+        <extracomment>Label of a choice of durations. English: “Who looked is kept for”</extracomment>
+        <translation>מי הסתכל נשמר למשך</translation>
+    </message>
+    <message>
+        <source>SETTINGS_ZONE</source>
+        <extracomment>Label of a choice. English: “Time zone”</extracomment>
+        <translation>אזור זמן</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LANGUAGE</source>
+        <extracomment>Label of a choice. English: “Language”</extracomment>
+        <translation>שפה</translation>
+    </message>
+    <message>
+        <source>SAVED</source>
+        <extracomment>After saving. English: “Saved.”</extracomment>
+        <translation>נשמר.</translation>
+    </message>
+    <message>
+        <source>DELETE_ASK</source>
+        <extracomment>Asks before everything about the reader is deleted. English: “Your places, rules, devices and the notes of who looked go for good. Phones of friends keep what they have shown.”</extracomment>
+        <translation>המקומות, הכללים, המכשירים והרישומים של מי הסתכל נמחקים לתמיד. הטלפונים של חברים שומרים את מה שהציגו.</translation>
+    </message>
+    <message>
+        <source>DELETE_NOW</source>
+        <extracomment>Button. English: “Delete everything”</extracomment>
+        <translation>למחוק הכול</translation>
+    </message>
+    <message>
+        <source>DELETED</source>
+        <extracomment>After everything was deleted. English: “Everything about you is deleted.”</extracomment>
+        <translation>כל מה שנוגע אליך נמחק.</translation>
+    </message>
+    <message>
+        <source>LINK_TITLE</source>
+        <extracomment>Title of the page that a link opens. English: “Your own page”</extracomment>
+        <translation>הדף שלך</translation>
+    </message>
+    <message>
+        <source>LINK_TEXT</source>
+        <extracomment>Below it. English: “This link works once. After that this browser stays signed in for 30 days.”</extracomment>
+        <translation>הקישור עובד פעם אחת. אחר כך הדפדפן נשאר מחובר 30 יום.</translation>
+    </message>
+    <message>
+        <source>LINK_OPEN</source>
+        <extracomment>Button. English: “Open my page”</extracomment>
+        <translation>פתיחת הדף שלי</translation>
+    </message>
+    <message>
+        <source>LINK_SPENT</source>
+        <extracomment>The link cannot be used any more. English: “This link has been used, or its 15 minutes are over. Ask for another one.”</extracomment>
+        <translation>הקישור כבר שימש, או ש־15 הדקות שלו עברו. יש לבקש אחר.</translation>
+    </message>
+    <message>
+        <source>SIGNED_OUT</source>
+        <extracomment>Title: nobody is signed in. English: “This page opens with a link.”</extracomment>
+        <translation>הדף הזה נפתח בקישור.</translation>
+    </message>
+    <message>
+        <source>SIGNED_OUT_TEXT</source>
+        <extracomment>Below it. English: “Whoever runs the service gives you one. It works once, for 15 minutes.”</extracomment>
+        <translation>מי שמפעיל את השירות נותן אותו. הוא עובד פעם אחת, במשך 15 דקות.</translation>
+    </message>
+    <message>
+        <source>NO_SUCH_PAGE</source>
+        <extracomment>Title. English: “There is no such page.”</extracomment>
+        <translation>אין דף כזה.</translation>
+    </message>
+    <message>
+        <source>NOT_FROM_HERE</source>
+        <extracomment>A form that another page sent. English: “This did not come from your own page. Nothing has changed.”</extracomment>
+        <translation>זה לא הגיע מהדף שלך. דבר לא השתנה.</translation>
+    </message>
+    <message>
+        <source>NOT_KEPT</source>
+        <extracomment>The service could not write. English: “It could not be kept just now. Nothing has changed; try again in a while.”</extracomment>
+        <translation>לא ניתן היה לשמור עכשיו. דבר לא השתנה; כדאי לנסות שוב עוד מעט.</translation>
+    </message>
+    <message>
+        <source>NOT_UNDERSTOOD</source>
+        <extracomment>A form with something missing. English: “Something is missing there. Nothing has changed; go back and choose again.”</extracomment>
+        <translation>משהו חסר. דבר לא השתנה; יש לחזור ולבחור שוב.</translation>
+    </message>
+    <message>
+        <source>TIME_WANTED</source>
+        <extracomment>No time was given beside the choice of one. English: “Choose the time at which it ends.”</extracomment>
+        <translation>יש לבחור את השעה שבה זה מסתיים.</translation>
+    </message>
+    <message>
+        <source>TO_MY_PAGE</source>
+        <extracomment>Link. English: “To my page”</extracomment>
+        <translation>לדף שלי</translation>
+    </message>
+    <message>
+        <source>MY_PLACES</source>
+        <extracomment>Row and title: places to which the reader gave names. English: “My places”</extracomment>
+        <translation>המקומות שלי</translation>
+    </message>
+    <message>
+        <source>PLACE_NONE</source>
+        <extracomment>No place has a name. English: “No place has a name yet.”</extracomment>
+        <translation>לאף מקום אין עדיין שם.</translation>
+    </message>
+    <message>
+        <source>PLACE_HERE</source>
+        <extracomment>Heading and button. English: “Name the place where I am”</extracomment>
+        <translation>מתן שם למקום שבו אני</translation>
+    </message>
+    <message>
+        <source>PLACE_HERE_HINT</source>
+        <extracomment>Below PLACE_HERE. English: “The place of your phone’s last message, and 150 metres around it.”</extracomment>
+        <translation>המקום של ההודעה האחרונה מהטלפון, ו־150 מטר סביבו.</translation>
+    </message>
+    <message>
+        <source>PLACE_NO_FIX</source>
+        <extracomment>Instead of PLACE_HERE_HINT. English: “Your phone has sent no place yet.”</extracomment>
+        <translation>הטלפון עוד לא שלח מקום.</translation>
+    </message>
+    <message>
+        <source>PLACE_NAME</source>
+        <extracomment>Label of a field. English: “Name of the place”</extracomment>
+        <translation>שם המקום</translation>
+    </message>
+    <message>
+        <source>PLACE_SAID</source>
+        <extracomment>Label of a box to tick, and below a place. English: “Friends may hear its name”</extracomment>
+        <translation>חברים רשאים לשמוע את השם</translation>
+    </message>
+    <message>
+        <source>PLACE_UNSAID</source>
+        <extracomment>Below a place. English: “Nobody hears its name”</extracomment>
+        <translation>אף אחד לא שומע את השם</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE</source>
+        <extracomment>Button. English: “Remove”</extracomment>
+        <translation>הסרה</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE_ONE</source>
+        <extracomment>Title, and spoken: the same button; %@ is the name of a place. English: “Remove: %@”</extracomment>
+        <translation>הסרה: %@</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE_ASK</source>
+        <extracomment>Asks before PLACE_REMOVE. English: “Its name goes, and rules that were to end there end now.”</extracomment>
+        <translation>השם נמחק, וכללים שהיו אמורים להסתיים שם מסתיימים עכשיו.</translation>
+    </message>
+</context>
+</TS>

@@ -1,0 +1,552 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="hi" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>VISIBLE_TO</source>
+        <extracomment>Title of the people's page; %@ is the number, in words from NUMBERS or in digits. English: “{0, plural, one{%@ person can see where you are.} other{%@ people can see where you are.}}”</extracomment>
+        <translation>{0, plural, one{%@ व्यक्ति देख सकता है कि आप कहाँ हैं।} other{%@ लोग देख सकते हैं कि आप कहाँ हैं।}}</translation>
+    </message>
+    <message>
+        <source>NUMBERS</source>
+        <extracomment>The numbers from one to twelve as they begin VISIBLE_TO, in its gender and case, with a bar between; a hyphen alone where digits are usual. English: “One|Two|Three|Four|Five|Six|Seven|Eight|Nine|Ten|Eleven|Twelve”</extracomment>
+        <translation>एक|दो|तीन|चार|पाँच|छह|सात|आठ|नौ|दस|ग्यारह|बारह</translation>
+    </message>
+    <message>
+        <source>VISIBLE_TO_NOBODY</source>
+        <extracomment>Title of the people's page while the reader hides or shares with nobody. English: “Nobody can see where you are.”</extracomment>
+        <translation>कोई नहीं देख सकता कि आप कहाँ हैं।</translation>
+    </message>
+    <message>
+        <source>VISIBLE</source>
+        <extracomment>Label of the one switch over everything. English: “Visible to friends”</extracomment>
+        <translation>दोस्तों को दिखें</translation>
+    </message>
+    <message>
+        <source>VISIBLE_ON</source>
+        <extracomment>Below VISIBLE while the switch is on. English: “Off hides you from everyone at once.”</extracomment>
+        <translation>बंद करने पर आप तुरंत सबसे छिप जाते हैं।</translation>
+    </message>
+    <message>
+        <source>VISIBLE_OFF</source>
+        <extracomment>Below VISIBLE while the switch is off. English: “Turn on, and the rules below hold again.”</extracomment>
+        <translation>चालू करें, और नीचे के नियम फिर लागू होंगे।</translation>
+    </message>
+    <message>
+        <source>SWITCH_ON</source>
+        <extracomment>Spoken: a switch, %@ is its label, is on. English: “%@, on”</extracomment>
+        <translation>%@, चालू</translation>
+    </message>
+    <message>
+        <source>SWITCH_OFF</source>
+        <extracomment>Spoken: a switch, %@ is its label, is off. English: “%@, off”</extracomment>
+        <translation>%@, बंद</translation>
+    </message>
+    <message>
+        <source>WHO_SEES_ME</source>
+        <extracomment>Heading above the list of people who see the reader. English: “Who sees me”</extracomment>
+        <translation>मुझे कौन देखता है</translation>
+    </message>
+    <message>
+        <source>EXACTLY</source>
+        <extracomment>How exactly somebody is seen. English: “Exactly”</extracomment>
+        <translation>ठीक-ठीक</translation>
+    </message>
+    <message>
+        <source>WITHIN_1_KM</source>
+        <extracomment>How exactly somebody is seen. English: “Within 1 km”</extracomment>
+        <translation>1 किमी के भीतर</translation>
+    </message>
+    <message>
+        <source>TOWN</source>
+        <extracomment>How exactly somebody is seen. English: “The town”</extracomment>
+        <translation>शहर</translation>
+    </message>
+    <message>
+        <source>NAMED_PLACES</source>
+        <extracomment>How exactly somebody is seen: only when they are at one of their named places. English: “Only places I have named”</extracomment>
+        <translation>केवल वे जगहें जिन्हें मैंने नाम दिया</translation>
+    </message>
+    <message>
+        <source>RULE_ALWAYS</source>
+        <extracomment>A rule: %@ is how exactly. English: “%@, always”</extracomment>
+        <translation>%@, हमेशा</translation>
+    </message>
+    <message>
+        <source>RULE_MIDNIGHT</source>
+        <extracomment>A rule that ends at the next midnight: %@ is how exactly. English: “%@, until midnight”</extracomment>
+        <translation>%@, आधी रात तक</translation>
+    </message>
+    <message>
+        <source>RULE_TIME</source>
+        <extracomment>A rule that ends: %1$@ is how exactly, %2$@ a time or a day and time. English: “%1$@, until %2$@”</extracomment>
+        <translation>%1$@, %2$@ तक</translation>
+    </message>
+    <message>
+        <source>RULE_PLACE</source>
+        <extracomment>A rule that ends when the reader arrives: %1$@ is how exactly, %2$@ the reader's name of a place. English: “%1$@, until you are at %2$@”</extracomment>
+        <translation>%1$@, %2$@ पहुँचने तक</translation>
+    </message>
+    <message>
+        <source>RULE_ENDED</source>
+        <extracomment>In place of a rule that is over: %@ is a day and time. English: “Ended: %@”</extracomment>
+        <translation>समाप्त: %@</translation>
+    </message>
+    <message>
+        <source>RULE_ASKED</source>
+        <extracomment>A rule without an end asks now and then whether it is still meant; %@ is the day on which it ends without an answer. English: “Still meant? Without an answer it ends: %@.”</extracomment>
+        <translation>क्या अब भी लागू है? जवाब के बिना समाप्त होगा: %@।</translation>
+    </message>
+    <message>
+        <source>KEEP_SHARING</source>
+        <extracomment>Button: the rule goes on. English: “Keep sharing”</extracomment>
+        <translation>साझा करते रहें</translation>
+    </message>
+    <message>
+        <source>SHARE_WITH</source>
+        <extracomment>Row or button that begins a new rule. English: “Share with somebody”</extracomment>
+        <translation>किसी के साथ साझा करें</translation>
+    </message>
+    <message>
+        <source>SHARE_WHO</source>
+        <extracomment>Label of a field. English: “Name, e-mail address or phone number”</extracomment>
+        <translation>नाम, ईमेल पता या फ़ोन नंबर</translation>
+    </message>
+    <message>
+        <source>SHARE_UNKNOWN</source>
+        <extracomment>Nobody was found by what was typed. English: “Nobody here is called so. Whoever runs the service can add people.”</extracomment>
+        <translation>यहाँ इस नाम का कोई नहीं है। सेवा चलाने वाला लोगों को जोड़ सकता है।</translation>
+    </message>
+    <message>
+        <source>SHARE_SELF</source>
+        <extracomment>The reader typed their own name. English: “Nobody shares with themselves.”</extracomment>
+        <translation>कोई अपने साथ साझा नहीं करता।</translation>
+    </message>
+    <message>
+        <source>GO_ON</source>
+        <extracomment>Button: to the next step. English: “Go on”</extracomment>
+        <translation>आगे</translation>
+    </message>
+    <message>
+        <source>WHO_LOOKED</source>
+        <extracomment>Heading above the list of people who looked. English: “Who looked”</extracomment>
+        <translation>किसने देखा</translation>
+    </message>
+    <message>
+        <source>ALL_LOOKS</source>
+        <extracomment>Row that opens all that is kept of who looked; %@ is a number of days. English: “{0, plural, one{All of the last day} other{All of the last %@ days}}”</extracomment>
+        <translation>{0, plural, one{पिछले %@ दिन का सब} other{पिछले %@ दिनों का सब}}</translation>
+    </message>
+    <message>
+        <source>NOBODY_LOOKED</source>
+        <extracomment>No entry in the list of people who looked. English: “Nobody has looked.”</extracomment>
+        <translation>किसी ने नहीं देखा।</translation>
+    </message>
+    <message>
+        <source>CARRIED</source>
+        <extracomment>After the name of who looked: their phone fetched it by itself, nobody asked. English: “by their phone alone”</extracomment>
+        <translation>केवल फ़ोन ने अपने आप</translation>
+    </message>
+    <message>
+        <source>MY_DATA</source>
+        <extracomment>Heading. English: “My phone and my data”</extracomment>
+        <translation>मेरा फ़ोन और मेरा डेटा</translation>
+    </message>
+    <message>
+        <source>SET_UP_PHONE</source>
+        <extracomment>Row and title. English: “Set up a phone”</extracomment>
+        <translation>फ़ोन सेट करें</translation>
+    </message>
+    <message>
+        <source>MY_DEVICES</source>
+        <extracomment>Row and title: list of phones, programs and browsers. English: “My devices”</extracomment>
+        <translation>मेरे डिवाइस</translation>
+    </message>
+    <message>
+        <source>MY_SETTINGS</source>
+        <extracomment>Row and title: language, time zone, how long things are kept. English: “Settings”</extracomment>
+        <translation>सेटिंग</translation>
+    </message>
+    <message>
+        <source>GET_COPY</source>
+        <extracomment>Row: a file with everything about the reader. English: “Get a copy of my data”</extracomment>
+        <translation>मेरे डेटा की प्रति लें</translation>
+    </message>
+    <message>
+        <source>DELETE_ALL</source>
+        <extracomment>Row and title. English: “Delete everything about me”</extracomment>
+        <translation>मेरे बारे में सब मिटाएँ</translation>
+    </message>
+    <message>
+        <source>SIGN_OUT</source>
+        <extracomment>Button. English: “Sign out”</extracomment>
+        <translation>साइन आउट</translation>
+    </message>
+    <message>
+        <source>BACK</source>
+        <extracomment>Spoken: the arrow back. English: “Back”</extracomment>
+        <translation>वापस</translation>
+    </message>
+    <message>
+        <source>SEES_TITLE</source>
+        <extracomment>Title of the page about one rule; %@ is a name. English: “What %@ sees”</extracomment>
+        <translation>%@ को क्या दिखता है</translation>
+    </message>
+    <message>
+        <source>SEES_THIS</source>
+        <extracomment>Below a row that shows the reader as %@ sees them. English: “%@ sees you exactly like this.”</extracomment>
+        <translation>%@ को आप ठीक ऐसे ही दिखते हैं।</translation>
+    </message>
+    <message>
+        <source>SEES_NOTHING</source>
+        <extracomment>In place of that row; %@ is a name. English: “%@ sees no place of yours now.”</extracomment>
+        <translation>%@ को अभी आपकी कोई जगह नहीं दिखती।</translation>
+    </message>
+    <message>
+        <source>A_PLACE_WITHIN</source>
+        <extracomment>In that row: a place that is known within a distance, %@. English: “Within %@”</extracomment>
+        <translation>%@ के भीतर</translation>
+    </message>
+    <message>
+        <source>HOW_EXACTLY</source>
+        <extracomment>Heading above a choice. English: “How exactly”</extracomment>
+        <translation>कितना ठीक</translation>
+    </message>
+    <message>
+        <source>UNTIL</source>
+        <extracomment>Heading above a choice. English: “Until”</extracomment>
+        <translation>कब तक</translation>
+    </message>
+    <message>
+        <source>UNTIL_CHANGED</source>
+        <extracomment>Choice of when a rule ends: not by itself. English: “I change it”</extracomment>
+        <translation>जब तक मैं न बदलूँ</translation>
+    </message>
+    <message>
+        <source>UNTIL_MIDNIGHT</source>
+        <extracomment>Choice of when a rule ends. English: “Midnight”</extracomment>
+        <translation>आधी रात</translation>
+    </message>
+    <message>
+        <source>UNTIL_ARRIVAL</source>
+        <extracomment>Choice of when a rule ends; a list of places follows. English: “I arrive at”</extracomment>
+        <translation>मैं पहुँचूँ</translation>
+    </message>
+    <message>
+        <source>UNTIL_TIME</source>
+        <extracomment>Choice of when a rule ends; a field for a time follows. English: “A time”</extracomment>
+        <translation>एक समय</translation>
+    </message>
+    <message>
+        <source>SAID_ALOUD</source>
+        <extracomment>Label of a box to tick: speakers may say where the reader is. English: “May be said aloud”</extracomment>
+        <translation>ज़ोर से कहा जा सकता है</translation>
+    </message>
+    <message>
+        <source>SAID_ALOUD_WHERE</source>
+        <extracomment>Below SAID_ALOUD; %@ is a name. English: “Speakers at %@’s may say it”</extracomment>
+        <translation>%@ के स्पीकर यह कह सकते हैं</translation>
+    </message>
+    <message>
+        <source>SAVE</source>
+        <extracomment>Button. English: “Save”</extracomment>
+        <translation>सहेजें</translation>
+    </message>
+    <message>
+        <source>STOP</source>
+        <extracomment>Button and title; %@ is a name. English: “Stop sharing with %@”</extracomment>
+        <translation>%@ के साथ साझा करना बंद करें</translation>
+    </message>
+    <message>
+        <source>STOP_ASK</source>
+        <extracomment>Asks before STOP; %@ is a name. English: “%@ will see nothing of you from now on. What their phone has shown stays on it.”</extracomment>
+        <translation>अब से %@ को आपका कुछ नहीं दिखेगा। फ़ोन ने जो दिखाया वह उस पर रहेगा।</translation>
+    </message>
+    <message>
+        <source>KEEP</source>
+        <extracomment>Button: do not stop, do not delete. English: “Keep”</extracomment>
+        <translation>रखें</translation>
+    </message>
+    <message>
+        <source>STEP_INSTALL</source>
+        <extracomment>First step of setting up a phone. English: “Install a tracker app that can send to an address of your own.”</extracomment>
+        <translation>ऐसा ट्रैकर ऐप इंस्टॉल करें जो आपके अपने पते पर भेज सके।</translation>
+    </message>
+    <message>
+        <source>STEP_TYPE</source>
+        <extracomment>Second step; three values follow. English: “Type these three into it.”</extracomment>
+        <translation>उसमें ये तीन लिखें।</translation>
+    </message>
+    <message>
+        <source>STEP_RUN</source>
+        <extracomment>Third step. English: “Let it run, then look again: the phone’s first place shows up here.”</extracomment>
+        <translation>उसे चलने दें, फिर दोबारा देखें: फ़ोन की पहली जगह यहाँ दिखेगी।</translation>
+    </message>
+    <message>
+        <source>ADDRESS</source>
+        <extracomment>Label of a value to type. English: “Address”</extracomment>
+        <translation>पता</translation>
+    </message>
+    <message>
+        <source>USER</source>
+        <extracomment>Label of a value to type. English: “User”</extracomment>
+        <translation>उपयोगकर्ता</translation>
+    </message>
+    <message>
+        <source>PASSWORD</source>
+        <extracomment>Label of a value to type. English: “Password”</extracomment>
+        <translation>पासवर्ड</translation>
+    </message>
+    <message>
+        <source>SHOWN_ONCE</source>
+        <extracomment>Warning below the values. English: “This password is shown once. For another phone, set up another.”</extracomment>
+        <translation>यह पासवर्ड एक बार दिखाया जाता है। दूसरे फ़ोन के लिए दूसरा सेट करें।</translation>
+    </message>
+    <message>
+        <source>WAS_SHOWN</source>
+        <extracomment>In place of the password; %@ is a day. English: “Shown once: %@.”</extracomment>
+        <translation>एक बार दिखाया गया: %@।</translation>
+    </message>
+    <message>
+        <source>ADDRESS_ALONE</source>
+        <extracomment>Above an address for apps that take nothing else. English: “For apps that take nothing but an address:”</extracomment>
+        <translation>जो ऐप केवल पता लेते हैं, उनके लिए:</translation>
+    </message>
+    <message>
+        <source>MAKE_PASSWORD</source>
+        <extracomment>Button on the first page of setting up a phone. English: “Show what to type”</extracomment>
+        <translation>क्या लिखना है, दिखाएँ</translation>
+    </message>
+    <message>
+        <source>NOTHING_YET</source>
+        <extracomment>No message of a phone has come. English: “Nothing has come yet.”</extracomment>
+        <translation>अभी कुछ नहीं आया।</translation>
+    </message>
+    <message>
+        <source>HERE_SINCE</source>
+        <extracomment>A phone's first place has come; %1$@ is a time, %2$@ a distance. English: “Here since %1$@, within about %2$@.”</extracomment>
+        <translation>यहाँ %1$@ से, लगभग %2$@ के भीतर।</translation>
+    </message>
+    <message>
+        <source>HERE_SINCE_TIME</source>
+        <extracomment>A phone was heard; %@ is a time. English: “Here since %@.”</extracomment>
+        <translation>यहाँ %@ से।</translation>
+    </message>
+    <message>
+        <source>LOOK_AGAIN</source>
+        <extracomment>Button: loads the page again. English: “Look again”</extracomment>
+        <translation>दोबारा देखें</translation>
+    </message>
+    <message>
+        <source>OTHER_PHONE</source>
+        <extracomment>Above a code for a camera. English: “Is the phone another one than this? Point its camera here, and this page opens on it.”</extracomment>
+        <translation>क्या फ़ोन कोई और है? उसका कैमरा यहाँ करें, यह पेज उस पर खुलेगा।</translation>
+    </message>
+    <message>
+        <source>CODE</source>
+        <extracomment>Spoken: a picture with a code for a camera. English: “Code for a camera”</extracomment>
+        <translation>कैमरे के लिए कोड</translation>
+    </message>
+    <message>
+        <source>DEVICE_PHONE</source>
+        <extracomment>A device of the reader's. English: “Phone”</extracomment>
+        <translation>फ़ोन</translation>
+    </message>
+    <message>
+        <source>DEVICE_READER</source>
+        <extracomment>A device of the reader's: the program that shows friends. English: “Program that asks for friends”</extracomment>
+        <translation>दोस्तों के बारे में पूछने वाला प्रोग्राम</translation>
+    </message>
+    <message>
+        <source>DEVICE_BROWSER</source>
+        <extracomment>A device of the reader's. English: “Browser”</extracomment>
+        <translation>ब्राउज़र</translation>
+    </message>
+    <message>
+        <source>DEVICE_THIS</source>
+        <extracomment>A device of the reader's: the one in use. English: “This browser”</extracomment>
+        <translation>यह ब्राउज़र</translation>
+    </message>
+    <message>
+        <source>DEVICE_HEARD</source>
+        <extracomment>Below a device; %@ is a day and time. English: “Last heard: %@”</extracomment>
+        <translation>आख़िरी ख़बर: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_SINCE</source>
+        <extracomment>Below a device; %@ is a day and time. English: “Since: %@”</extracomment>
+        <translation>कब से: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_END</source>
+        <extracomment>Button: the device may do nothing any more. English: “End”</extracomment>
+        <translation>समाप्त करें</translation>
+    </message>
+    <message>
+        <source>DEVICE_END_SPOKEN</source>
+        <extracomment>Spoken: the same button; %@ is the device and its day. English: “End: %@”</extracomment>
+        <translation>समाप्त करें: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_ASK</source>
+        <extracomment>Asks before DEVICE_END. English: “It sends nothing and sees nobody from then on, and what it began ends.”</extracomment>
+        <translation>उसके बाद यह न कुछ भेजेगा, न किसी को देखेगा, और जो शुरू किया वह समाप्त होगा।</translation>
+    </message>
+    <message>
+        <source>SETTINGS_PLACES_KEPT</source>
+        <extracomment>Label of a choice of durations. English: “My places are kept for”</extracomment>
+        <translation>मेरी जगहें रखी जाती हैं</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LOOKS_KEPT</source>
+        <extracomment>Label of a choice of durations. English: “Who looked is kept for”</extracomment>
+        <translation>किसने देखा, रखा जाता है</translation>
+    </message>
+    <message>
+        <source>SETTINGS_ZONE</source>
+        <extracomment>Label of a choice. English: “Time zone”</extracomment>
+        <translation>समय क्षेत्र</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LANGUAGE</source>
+        <extracomment>Label of a choice. English: “Language”</extracomment>
+        <translation>भाषा</translation>
+    </message>
+    <message>
+        <source>SAVED</source>
+        <extracomment>After saving. English: “Saved.”</extracomment>
+        <translation>सहेजा गया।</translation>
+    </message>
+    <message>
+        <source>DELETE_ASK</source>
+        <extracomment>Asks before everything about the reader is deleted. English: “Your places, rules, devices and the notes of who looked go for good. Phones of friends keep what they have shown.”</extracomment>
+        <translation>आपकी जगहें, नियम, डिवाइस और किसने देखा के नोट हमेशा के लिए मिट जाएँगे। दोस्तों के फ़ोन ने जो दिखाया वह उन पर रहेगा।</translation>
+    </message>
+    <message>
+        <source>DELETE_NOW</source>
+        <extracomment>Button. English: “Delete everything”</extracomment>
+        <translation>सब मिटाएँ</translation>
+    </message>
+    <message>
+        <source>DELETED</source>
+        <extracomment>After everything was deleted. English: “Everything about you is deleted.”</extracomment>
+        <translation>आपके बारे में सब मिटा दिया गया।</translation>
+    </message>
+    <message>
+        <source>LINK_TITLE</source>
+        <extracomment>Title of the page that a link opens. English: “Your own page”</extracomment>
+        <translation>आपका अपना पेज</translation>
+    </message>
+    <message>
+        <source>LINK_TEXT</source>
+        <extracomment>Below it. English: “This link works once. After that this browser stays signed in for 30 days.”</extracomment>
+        <translation>यह लिंक एक बार काम करता है। फिर यह ब्राउज़र 30 दिन साइन इन रहता है।</translation>
+    </message>
+    <message>
+        <source>LINK_OPEN</source>
+        <extracomment>Button. English: “Open my page”</extracomment>
+        <translation>मेरा पेज खोलें</translation>
+    </message>
+    <message>
+        <source>LINK_SPENT</source>
+        <extracomment>The link cannot be used any more. English: “This link has been used, or its 15 minutes are over. Ask for another one.”</extracomment>
+        <translation>यह लिंक इस्तेमाल हो चुका है, या इसके 15 मिनट बीत गए। दूसरा माँगें।</translation>
+    </message>
+    <message>
+        <source>SIGNED_OUT</source>
+        <extracomment>Title: nobody is signed in. English: “This page opens with a link.”</extracomment>
+        <translation>यह पेज एक लिंक से खुलता है।</translation>
+    </message>
+    <message>
+        <source>SIGNED_OUT_TEXT</source>
+        <extracomment>Below it. English: “Whoever runs the service gives you one. It works once, for 15 minutes.”</extracomment>
+        <translation>सेवा चलाने वाला आपको देता है। वह एक बार, 15 मिनट तक काम करता है।</translation>
+    </message>
+    <message>
+        <source>NO_SUCH_PAGE</source>
+        <extracomment>Title. English: “There is no such page.”</extracomment>
+        <translation>ऐसा कोई पेज नहीं है।</translation>
+    </message>
+    <message>
+        <source>NOT_FROM_HERE</source>
+        <extracomment>A form that another page sent. English: “This did not come from your own page. Nothing has changed.”</extracomment>
+        <translation>यह आपके अपने पेज से नहीं आया। कुछ नहीं बदला।</translation>
+    </message>
+    <message>
+        <source>NOT_KEPT</source>
+        <extracomment>The service could not write. English: “It could not be kept just now. Nothing has changed; try again in a while.”</extracomment>
+        <translation>अभी सहेजा नहीं जा सका। कुछ नहीं बदला; थोड़ी देर में फिर कोशिश करें।</translation>
+    </message>
+    <message>
+        <source>NOT_UNDERSTOOD</source>
+        <extracomment>A form with something missing. English: “Something is missing there. Nothing has changed; go back and choose again.”</extracomment>
+        <translation>कुछ छूट गया है। कुछ नहीं बदला; वापस जाकर फिर चुनें।</translation>
+    </message>
+    <message>
+        <source>TIME_WANTED</source>
+        <extracomment>No time was given beside the choice of one. English: “Choose the time at which it ends.”</extracomment>
+        <translation>वह समय चुनें जब यह समाप्त हो।</translation>
+    </message>
+    <message>
+        <source>TO_MY_PAGE</source>
+        <extracomment>Link. English: “To my page”</extracomment>
+        <translation>मेरे पेज पर</translation>
+    </message>
+    <message>
+        <source>MY_PLACES</source>
+        <extracomment>Row and title: places to which the reader gave names. English: “My places”</extracomment>
+        <translation>मेरी जगहें</translation>
+    </message>
+    <message>
+        <source>PLACE_NONE</source>
+        <extracomment>No place has a name. English: “No place has a name yet.”</extracomment>
+        <translation>अभी किसी जगह का नाम नहीं है।</translation>
+    </message>
+    <message>
+        <source>PLACE_HERE</source>
+        <extracomment>Heading and button. English: “Name the place where I am”</extracomment>
+        <translation>जहाँ मैं हूँ उस जगह को नाम दें</translation>
+    </message>
+    <message>
+        <source>PLACE_HERE_HINT</source>
+        <extracomment>Below PLACE_HERE. English: “The place of your phone’s last message, and 150 metres around it.”</extracomment>
+        <translation>आपके फ़ोन के आख़िरी संदेश की जगह, और उसके आसपास 150 मीटर।</translation>
+    </message>
+    <message>
+        <source>PLACE_NO_FIX</source>
+        <extracomment>Instead of PLACE_HERE_HINT. English: “Your phone has sent no place yet.”</extracomment>
+        <translation>आपके फ़ोन ने अभी कोई जगह नहीं भेजी।</translation>
+    </message>
+    <message>
+        <source>PLACE_NAME</source>
+        <extracomment>Label of a field. English: “Name of the place”</extracomment>
+        <translation>जगह का नाम</translation>
+    </message>
+    <message>
+        <source>PLACE_SAID</source>
+        <extracomment>Label of a box to tick, and below a place. English: “Friends may hear its name”</extracomment>
+        <translation>दोस्त इसका नाम सुन सकते हैं</translation>
+    </message>
+    <message>
+        <source>PLACE_UNSAID</source>
+        <extracomment>Below a place. English: “Nobody hears its name”</extracomment>
+        <translation>इसका नाम कोई नहीं सुनता</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE</source>
+        <extracomment>Button. English: “Remove”</extracomment>
+        <translation>हटाएँ</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE_ONE</source>
+        <extracomment>Title, and spoken: the same button; %@ is the name of a place. English: “Remove: %@”</extracomment>
+        <translation>हटाएँ: %@</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE_ASK</source>
+        <extracomment>Asks before PLACE_REMOVE. English: “Its name goes, and rules that were to end there end now.”</extracomment>
+        <translation>इसका नाम मिट जाएगा, और वहाँ समाप्त होने वाले नियम अभी समाप्त होंगे।</translation>
+    </message>
+</context>
+</TS>

@@ -1,0 +1,552 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="nl" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>VISIBLE_TO</source>
+        <extracomment>Title of the people's page; %@ is the number, in words from NUMBERS or in digits. English: “{0, plural, one{%@ person can see where you are.} other{%@ people can see where you are.}}”</extracomment>
+        <translation>{0, plural, one{%@ persoon kan zien waar je bent.} other{%@ mensen kunnen zien waar je bent.}}</translation>
+    </message>
+    <message>
+        <source>NUMBERS</source>
+        <extracomment>The numbers from one to twelve as they begin VISIBLE_TO, in its gender and case, with a bar between; a hyphen alone where digits are usual. English: “One|Two|Three|Four|Five|Six|Seven|Eight|Nine|Ten|Eleven|Twelve”</extracomment>
+        <translation>Eén|Twee|Drie|Vier|Vijf|Zes|Zeven|Acht|Negen|Tien|Elf|Twaalf</translation>
+    </message>
+    <message>
+        <source>VISIBLE_TO_NOBODY</source>
+        <extracomment>Title of the people's page while the reader hides or shares with nobody. English: “Nobody can see where you are.”</extracomment>
+        <translation>Niemand kan zien waar je bent.</translation>
+    </message>
+    <message>
+        <source>VISIBLE</source>
+        <extracomment>Label of the one switch over everything. English: “Visible to friends”</extracomment>
+        <translation>Zichtbaar voor vrienden</translation>
+    </message>
+    <message>
+        <source>VISIBLE_ON</source>
+        <extracomment>Below VISIBLE while the switch is on. English: “Off hides you from everyone at once.”</extracomment>
+        <translation>Uit verbergt je meteen voor iedereen.</translation>
+    </message>
+    <message>
+        <source>VISIBLE_OFF</source>
+        <extracomment>Below VISIBLE while the switch is off. English: “Turn on, and the rules below hold again.”</extracomment>
+        <translation>Zet aan, en de regels hieronder gelden weer.</translation>
+    </message>
+    <message>
+        <source>SWITCH_ON</source>
+        <extracomment>Spoken: a switch, %@ is its label, is on. English: “%@, on”</extracomment>
+        <translation>%@, aan</translation>
+    </message>
+    <message>
+        <source>SWITCH_OFF</source>
+        <extracomment>Spoken: a switch, %@ is its label, is off. English: “%@, off”</extracomment>
+        <translation>%@, uit</translation>
+    </message>
+    <message>
+        <source>WHO_SEES_ME</source>
+        <extracomment>Heading above the list of people who see the reader. English: “Who sees me”</extracomment>
+        <translation>Wie mij ziet</translation>
+    </message>
+    <message>
+        <source>EXACTLY</source>
+        <extracomment>How exactly somebody is seen. English: “Exactly”</extracomment>
+        <translation>Precies</translation>
+    </message>
+    <message>
+        <source>WITHIN_1_KM</source>
+        <extracomment>How exactly somebody is seen. English: “Within 1 km”</extracomment>
+        <translation>Binnen 1 km</translation>
+    </message>
+    <message>
+        <source>TOWN</source>
+        <extracomment>How exactly somebody is seen. English: “The town”</extracomment>
+        <translation>De plaats</translation>
+    </message>
+    <message>
+        <source>NAMED_PLACES</source>
+        <extracomment>How exactly somebody is seen: only when they are at one of their named places. English: “Only places I have named”</extracomment>
+        <translation>Alleen plekken die ik een naam gaf</translation>
+    </message>
+    <message>
+        <source>RULE_ALWAYS</source>
+        <extracomment>A rule: %@ is how exactly. English: “%@, always”</extracomment>
+        <translation>%@, altijd</translation>
+    </message>
+    <message>
+        <source>RULE_MIDNIGHT</source>
+        <extracomment>A rule that ends at the next midnight: %@ is how exactly. English: “%@, until midnight”</extracomment>
+        <translation>%@, tot middernacht</translation>
+    </message>
+    <message>
+        <source>RULE_TIME</source>
+        <extracomment>A rule that ends: %1$@ is how exactly, %2$@ a time or a day and time. English: “%1$@, until %2$@”</extracomment>
+        <translation>%1$@, tot %2$@</translation>
+    </message>
+    <message>
+        <source>RULE_PLACE</source>
+        <extracomment>A rule that ends when the reader arrives: %1$@ is how exactly, %2$@ the reader's name of a place. English: “%1$@, until you are at %2$@”</extracomment>
+        <translation>%1$@, tot je hier bent: %2$@</translation>
+    </message>
+    <message>
+        <source>RULE_ENDED</source>
+        <extracomment>In place of a rule that is over: %@ is a day and time. English: “Ended: %@”</extracomment>
+        <translation>Beëindigd: %@</translation>
+    </message>
+    <message>
+        <source>RULE_ASKED</source>
+        <extracomment>A rule without an end asks now and then whether it is still meant; %@ is the day on which it ends without an answer. English: “Still meant? Without an answer it ends: %@.”</extracomment>
+        <translation>Nog de bedoeling? Zonder antwoord eindigt het: %@.</translation>
+    </message>
+    <message>
+        <source>KEEP_SHARING</source>
+        <extracomment>Button: the rule goes on. English: “Keep sharing”</extracomment>
+        <translation>Blijven delen</translation>
+    </message>
+    <message>
+        <source>SHARE_WITH</source>
+        <extracomment>Row or button that begins a new rule. English: “Share with somebody”</extracomment>
+        <translation>Delen met iemand</translation>
+    </message>
+    <message>
+        <source>SHARE_WHO</source>
+        <extracomment>Label of a field. English: “Name, e-mail address or phone number”</extracomment>
+        <translation>Naam, e-mailadres of telefoonnummer</translation>
+    </message>
+    <message>
+        <source>SHARE_UNKNOWN</source>
+        <extracomment>Nobody was found by what was typed. English: “Nobody here is called so. Whoever runs the service can add people.”</extracomment>
+        <translation>Niemand hier heet zo. Wie de dienst beheert kan mensen toevoegen.</translation>
+    </message>
+    <message>
+        <source>SHARE_SELF</source>
+        <extracomment>The reader typed their own name. English: “Nobody shares with themselves.”</extracomment>
+        <translation>Niemand deelt met zichzelf.</translation>
+    </message>
+    <message>
+        <source>GO_ON</source>
+        <extracomment>Button: to the next step. English: “Go on”</extracomment>
+        <translation>Verder</translation>
+    </message>
+    <message>
+        <source>WHO_LOOKED</source>
+        <extracomment>Heading above the list of people who looked. English: “Who looked”</extracomment>
+        <translation>Wie keek</translation>
+    </message>
+    <message>
+        <source>ALL_LOOKS</source>
+        <extracomment>Row that opens all that is kept of who looked; %@ is a number of days. English: “{0, plural, one{All of the last day} other{All of the last %@ days}}”</extracomment>
+        <translation>{0, plural, one{Alles van de laatste dag} other{Alles van de laatste %@ dagen}}</translation>
+    </message>
+    <message>
+        <source>NOBODY_LOOKED</source>
+        <extracomment>No entry in the list of people who looked. English: “Nobody has looked.”</extracomment>
+        <translation>Niemand keek.</translation>
+    </message>
+    <message>
+        <source>CARRIED</source>
+        <extracomment>After the name of who looked: their phone fetched it by itself, nobody asked. English: “by their phone alone”</extracomment>
+        <translation>alleen de telefoon zelf</translation>
+    </message>
+    <message>
+        <source>MY_DATA</source>
+        <extracomment>Heading. English: “My phone and my data”</extracomment>
+        <translation>Mijn telefoon en mijn gegevens</translation>
+    </message>
+    <message>
+        <source>SET_UP_PHONE</source>
+        <extracomment>Row and title. English: “Set up a phone”</extracomment>
+        <translation>Een telefoon instellen</translation>
+    </message>
+    <message>
+        <source>MY_DEVICES</source>
+        <extracomment>Row and title: list of phones, programs and browsers. English: “My devices”</extracomment>
+        <translation>Mijn apparaten</translation>
+    </message>
+    <message>
+        <source>MY_SETTINGS</source>
+        <extracomment>Row and title: language, time zone, how long things are kept. English: “Settings”</extracomment>
+        <translation>Instellingen</translation>
+    </message>
+    <message>
+        <source>GET_COPY</source>
+        <extracomment>Row: a file with everything about the reader. English: “Get a copy of my data”</extracomment>
+        <translation>Een kopie van mijn gegevens</translation>
+    </message>
+    <message>
+        <source>DELETE_ALL</source>
+        <extracomment>Row and title. English: “Delete everything about me”</extracomment>
+        <translation>Alles over mij verwijderen</translation>
+    </message>
+    <message>
+        <source>SIGN_OUT</source>
+        <extracomment>Button. English: “Sign out”</extracomment>
+        <translation>Uitloggen</translation>
+    </message>
+    <message>
+        <source>BACK</source>
+        <extracomment>Spoken: the arrow back. English: “Back”</extracomment>
+        <translation>Terug</translation>
+    </message>
+    <message>
+        <source>SEES_TITLE</source>
+        <extracomment>Title of the page about one rule; %@ is a name. English: “What %@ sees”</extracomment>
+        <translation>Wat %@ ziet</translation>
+    </message>
+    <message>
+        <source>SEES_THIS</source>
+        <extracomment>Below a row that shows the reader as %@ sees them. English: “%@ sees you exactly like this.”</extracomment>
+        <translation>%@ ziet je precies zo.</translation>
+    </message>
+    <message>
+        <source>SEES_NOTHING</source>
+        <extracomment>In place of that row; %@ is a name. English: “%@ sees no place of yours now.”</extracomment>
+        <translation>%@ ziet nu geen plek van je.</translation>
+    </message>
+    <message>
+        <source>A_PLACE_WITHIN</source>
+        <extracomment>In that row: a place that is known within a distance, %@. English: “Within %@”</extracomment>
+        <translation>Binnen %@</translation>
+    </message>
+    <message>
+        <source>HOW_EXACTLY</source>
+        <extracomment>Heading above a choice. English: “How exactly”</extracomment>
+        <translation>Hoe precies</translation>
+    </message>
+    <message>
+        <source>UNTIL</source>
+        <extracomment>Heading above a choice. English: “Until”</extracomment>
+        <translation>Tot</translation>
+    </message>
+    <message>
+        <source>UNTIL_CHANGED</source>
+        <extracomment>Choice of when a rule ends: not by itself. English: “I change it”</extracomment>
+        <translation>Ik het verander</translation>
+    </message>
+    <message>
+        <source>UNTIL_MIDNIGHT</source>
+        <extracomment>Choice of when a rule ends. English: “Midnight”</extracomment>
+        <translation>Middernacht</translation>
+    </message>
+    <message>
+        <source>UNTIL_ARRIVAL</source>
+        <extracomment>Choice of when a rule ends; a list of places follows. English: “I arrive at”</extracomment>
+        <translation>Ik aankom:</translation>
+    </message>
+    <message>
+        <source>UNTIL_TIME</source>
+        <extracomment>Choice of when a rule ends; a field for a time follows. English: “A time”</extracomment>
+        <translation>Een tijd</translation>
+    </message>
+    <message>
+        <source>SAID_ALOUD</source>
+        <extracomment>Label of a box to tick: speakers may say where the reader is. English: “May be said aloud”</extracomment>
+        <translation>Mag hardop gezegd worden</translation>
+    </message>
+    <message>
+        <source>SAID_ALOUD_WHERE</source>
+        <extracomment>Below SAID_ALOUD; %@ is a name. English: “Speakers at %@’s may say it”</extracomment>
+        <translation>Luidsprekers bij %@ mogen het zeggen</translation>
+    </message>
+    <message>
+        <source>SAVE</source>
+        <extracomment>Button. English: “Save”</extracomment>
+        <translation>Bewaren</translation>
+    </message>
+    <message>
+        <source>STOP</source>
+        <extracomment>Button and title; %@ is a name. English: “Stop sharing with %@”</extracomment>
+        <translation>Niet meer delen met %@</translation>
+    </message>
+    <message>
+        <source>STOP_ASK</source>
+        <extracomment>Asks before STOP; %@ is a name. English: “%@ will see nothing of you from now on. What their phone has shown stays on it.”</extracomment>
+        <translation>%@ ziet vanaf nu niets meer van je. Wat de telefoon toonde, blijft erop.</translation>
+    </message>
+    <message>
+        <source>KEEP</source>
+        <extracomment>Button: do not stop, do not delete. English: “Keep”</extracomment>
+        <translation>Houden</translation>
+    </message>
+    <message>
+        <source>STEP_INSTALL</source>
+        <extracomment>First step of setting up a phone. English: “Install a tracker app that can send to an address of your own.”</extracomment>
+        <translation>Installeer een tracker-app die naar een eigen adres kan sturen.</translation>
+    </message>
+    <message>
+        <source>STEP_TYPE</source>
+        <extracomment>Second step; three values follow. English: “Type these three into it.”</extracomment>
+        <translation>Typ deze drie erin.</translation>
+    </message>
+    <message>
+        <source>STEP_RUN</source>
+        <extracomment>Third step. English: “Let it run, then look again: the phone’s first place shows up here.”</extracomment>
+        <translation>Laat hem lopen en kijk opnieuw: de eerste plek van de telefoon verschijnt hier.</translation>
+    </message>
+    <message>
+        <source>ADDRESS</source>
+        <extracomment>Label of a value to type. English: “Address”</extracomment>
+        <translation>Adres</translation>
+    </message>
+    <message>
+        <source>USER</source>
+        <extracomment>Label of a value to type. English: “User”</extracomment>
+        <translation>Gebruiker</translation>
+    </message>
+    <message>
+        <source>PASSWORD</source>
+        <extracomment>Label of a value to type. English: “Password”</extracomment>
+        <translation>Wachtwoord</translation>
+    </message>
+    <message>
+        <source>SHOWN_ONCE</source>
+        <extracomment>Warning below the values. English: “This password is shown once. For another phone, set up another.”</extracomment>
+        <translation>Dit wachtwoord wordt één keer getoond. Stel voor een andere telefoon een ander in.</translation>
+    </message>
+    <message>
+        <source>WAS_SHOWN</source>
+        <extracomment>In place of the password; %@ is a day. English: “Shown once: %@.”</extracomment>
+        <translation>Eén keer getoond: %@.</translation>
+    </message>
+    <message>
+        <source>ADDRESS_ALONE</source>
+        <extracomment>Above an address for apps that take nothing else. English: “For apps that take nothing but an address:”</extracomment>
+        <translation>Voor apps die alleen een adres aannemen:</translation>
+    </message>
+    <message>
+        <source>MAKE_PASSWORD</source>
+        <extracomment>Button on the first page of setting up a phone. English: “Show what to type”</extracomment>
+        <translation>Toon wat ik moet typen</translation>
+    </message>
+    <message>
+        <source>NOTHING_YET</source>
+        <extracomment>No message of a phone has come. English: “Nothing has come yet.”</extracomment>
+        <translation>Er is nog niets gekomen.</translation>
+    </message>
+    <message>
+        <source>HERE_SINCE</source>
+        <extracomment>A phone's first place has come; %1$@ is a time, %2$@ a distance. English: “Here since %1$@, within about %2$@.”</extracomment>
+        <translation>Hier sinds %1$@, binnen ongeveer %2$@.</translation>
+    </message>
+    <message>
+        <source>HERE_SINCE_TIME</source>
+        <extracomment>A phone was heard; %@ is a time. English: “Here since %@.”</extracomment>
+        <translation>Hier sinds %@.</translation>
+    </message>
+    <message>
+        <source>LOOK_AGAIN</source>
+        <extracomment>Button: loads the page again. English: “Look again”</extracomment>
+        <translation>Opnieuw kijken</translation>
+    </message>
+    <message>
+        <source>OTHER_PHONE</source>
+        <extracomment>Above a code for a camera. English: “Is the phone another one than this? Point its camera here, and this page opens on it.”</extracomment>
+        <translation>Is de telefoon een andere dan deze? Richt de camera hierop, en deze pagina opent erop.</translation>
+    </message>
+    <message>
+        <source>CODE</source>
+        <extracomment>Spoken: a picture with a code for a camera. English: “Code for a camera”</extracomment>
+        <translation>Code voor een camera</translation>
+    </message>
+    <message>
+        <source>DEVICE_PHONE</source>
+        <extracomment>A device of the reader's. English: “Phone”</extracomment>
+        <translation>Telefoon</translation>
+    </message>
+    <message>
+        <source>DEVICE_READER</source>
+        <extracomment>A device of the reader's: the program that shows friends. English: “Program that asks for friends”</extracomment>
+        <translation>Programma dat naar vrienden vraagt</translation>
+    </message>
+    <message>
+        <source>DEVICE_BROWSER</source>
+        <extracomment>A device of the reader's. English: “Browser”</extracomment>
+        <translation>Browser</translation>
+    </message>
+    <message>
+        <source>DEVICE_THIS</source>
+        <extracomment>A device of the reader's: the one in use. English: “This browser”</extracomment>
+        <translation>Deze browser</translation>
+    </message>
+    <message>
+        <source>DEVICE_HEARD</source>
+        <extracomment>Below a device; %@ is a day and time. English: “Last heard: %@”</extracomment>
+        <translation>Laatst gehoord: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_SINCE</source>
+        <extracomment>Below a device; %@ is a day and time. English: “Since: %@”</extracomment>
+        <translation>Sinds: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_END</source>
+        <extracomment>Button: the device may do nothing any more. English: “End”</extracomment>
+        <translation>Beëindigen</translation>
+    </message>
+    <message>
+        <source>DEVICE_END_SPOKEN</source>
+        <extracomment>Spoken: the same button; %@ is the device and its day. English: “End: %@”</extracomment>
+        <translation>Beëindigen: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_ASK</source>
+        <extracomment>Asks before DEVICE_END. English: “It sends nothing and sees nobody from then on, and what it began ends.”</extracomment>
+        <translation>Het stuurt niets en ziet niemand meer, en wat het begon eindigt.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_PLACES_KEPT</source>
+        <extracomment>Label of a choice of durations. English: “My places are kept for”</extracomment>
+        <translation>Mijn plekken worden bewaard</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LOOKS_KEPT</source>
+        <extracomment>Label of a choice of durations. English: “Who looked is kept for”</extracomment>
+        <translation>Wie keek wordt bewaard</translation>
+    </message>
+    <message>
+        <source>SETTINGS_ZONE</source>
+        <extracomment>Label of a choice. English: “Time zone”</extracomment>
+        <translation>Tijdzone</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LANGUAGE</source>
+        <extracomment>Label of a choice. English: “Language”</extracomment>
+        <translation>Taal</translation>
+    </message>
+    <message>
+        <source>SAVED</source>
+        <extracomment>After saving. English: “Saved.”</extracomment>
+        <translation>Bewaard.</translation>
+    </message>
+    <message>
+        <source>DELETE_ASK</source>
+        <extracomment>Asks before everything about the reader is deleted. English: “Your places, rules, devices and the notes of who looked go for good. Phones of friends keep what they have shown.”</extracomment>
+        <translation>Je plekken, regels, apparaten en de notities over wie keek verdwijnen voorgoed. Telefoons van vrienden houden wat ze toonden.</translation>
+    </message>
+    <message>
+        <source>DELETE_NOW</source>
+        <extracomment>Button. English: “Delete everything”</extracomment>
+        <translation>Alles verwijderen</translation>
+    </message>
+    <message>
+        <source>DELETED</source>
+        <extracomment>After everything was deleted. English: “Everything about you is deleted.”</extracomment>
+        <translation>Alles over jou is verwijderd.</translation>
+    </message>
+    <message>
+        <source>LINK_TITLE</source>
+        <extracomment>Title of the page that a link opens. English: “Your own page”</extracomment>
+        <translation>Je eigen pagina</translation>
+    </message>
+    <message>
+        <source>LINK_TEXT</source>
+        <extracomment>Below it. English: “This link works once. After that this browser stays signed in for 30 days.”</extracomment>
+        <translation>Deze link werkt één keer. Daarna blijft deze browser 30 dagen ingelogd.</translation>
+    </message>
+    <message>
+        <source>LINK_OPEN</source>
+        <extracomment>Button. English: “Open my page”</extracomment>
+        <translation>Mijn pagina openen</translation>
+    </message>
+    <message>
+        <source>LINK_SPENT</source>
+        <extracomment>The link cannot be used any more. English: “This link has been used, or its 15 minutes are over. Ask for another one.”</extracomment>
+        <translation>Deze link is gebruikt, of de 15 minuten zijn voorbij. Vraag om een nieuwe.</translation>
+    </message>
+    <message>
+        <source>SIGNED_OUT</source>
+        <extracomment>Title: nobody is signed in. English: “This page opens with a link.”</extracomment>
+        <translation>Deze pagina opent met een link.</translation>
+    </message>
+    <message>
+        <source>SIGNED_OUT_TEXT</source>
+        <extracomment>Below it. English: “Whoever runs the service gives you one. It works once, for 15 minutes.”</extracomment>
+        <translation>Wie de dienst beheert geeft je er een. Hij werkt één keer, 15 minuten lang.</translation>
+    </message>
+    <message>
+        <source>NO_SUCH_PAGE</source>
+        <extracomment>Title. English: “There is no such page.”</extracomment>
+        <translation>Deze pagina bestaat niet.</translation>
+    </message>
+    <message>
+        <source>NOT_FROM_HERE</source>
+        <extracomment>A form that another page sent. English: “This did not come from your own page. Nothing has changed.”</extracomment>
+        <translation>Dit kwam niet van je eigen pagina. Er is niets veranderd.</translation>
+    </message>
+    <message>
+        <source>NOT_KEPT</source>
+        <extracomment>The service could not write. English: “It could not be kept just now. Nothing has changed; try again in a while.”</extracomment>
+        <translation>Het kon nu niet bewaard worden. Er is niets veranderd; probeer het straks opnieuw.</translation>
+    </message>
+    <message>
+        <source>NOT_UNDERSTOOD</source>
+        <extracomment>A form with something missing. English: “Something is missing there. Nothing has changed; go back and choose again.”</extracomment>
+        <translation>Er ontbreekt iets. Er is niets veranderd; ga terug en kies opnieuw.</translation>
+    </message>
+    <message>
+        <source>TIME_WANTED</source>
+        <extracomment>No time was given beside the choice of one. English: “Choose the time at which it ends.”</extracomment>
+        <translation>Kies de tijd waarop het eindigt.</translation>
+    </message>
+    <message>
+        <source>TO_MY_PAGE</source>
+        <extracomment>Link. English: “To my page”</extracomment>
+        <translation>Naar mijn pagina</translation>
+    </message>
+    <message>
+        <source>MY_PLACES</source>
+        <extracomment>Row and title: places to which the reader gave names. English: “My places”</extracomment>
+        <translation>Mijn plekken</translation>
+    </message>
+    <message>
+        <source>PLACE_NONE</source>
+        <extracomment>No place has a name. English: “No place has a name yet.”</extracomment>
+        <translation>Nog geen plek heeft een naam.</translation>
+    </message>
+    <message>
+        <source>PLACE_HERE</source>
+        <extracomment>Heading and button. English: “Name the place where I am”</extracomment>
+        <translation>De plek waar ik ben een naam geven</translation>
+    </message>
+    <message>
+        <source>PLACE_HERE_HINT</source>
+        <extracomment>Below PLACE_HERE. English: “The place of your phone’s last message, and 150 metres around it.”</extracomment>
+        <translation>De plek van het laatste bericht van je telefoon, en 150 meter eromheen.</translation>
+    </message>
+    <message>
+        <source>PLACE_NO_FIX</source>
+        <extracomment>Instead of PLACE_HERE_HINT. English: “Your phone has sent no place yet.”</extracomment>
+        <translation>Je telefoon heeft nog geen plek gestuurd.</translation>
+    </message>
+    <message>
+        <source>PLACE_NAME</source>
+        <extracomment>Label of a field. English: “Name of the place”</extracomment>
+        <translation>Naam van de plek</translation>
+    </message>
+    <message>
+        <source>PLACE_SAID</source>
+        <extracomment>Label of a box to tick, and below a place. English: “Friends may hear its name”</extracomment>
+        <translation>Vrienden mogen de naam horen</translation>
+    </message>
+    <message>
+        <source>PLACE_UNSAID</source>
+        <extracomment>Below a place. English: “Nobody hears its name”</extracomment>
+        <translation>Niemand hoort de naam</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE</source>
+        <extracomment>Button. English: “Remove”</extracomment>
+        <translation>Verwijderen</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE_ONE</source>
+        <extracomment>Title, and spoken: the same button; %@ is the name of a place. English: “Remove: %@”</extracomment>
+        <translation>Verwijderen: %@</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE_ASK</source>
+        <extracomment>Asks before PLACE_REMOVE. English: “Its name goes, and rules that were to end there end now.”</extracomment>
+        <translation>De naam verdwijnt, en regels die daar zouden eindigen, eindigen nu.</translation>
+    </message>
+</context>
+</TS>

@@ -1,0 +1,552 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="pl" sourcelanguage="en">
+<context>
+    <name>Localizable</name>
+    <message>
+        <source>VISIBLE_TO</source>
+        <extracomment>Title of the people's page; %@ is the number, in words from NUMBERS or in digits. English: “{0, plural, one{%@ person can see where you are.} other{%@ people can see where you are.}}”</extracomment>
+        <translation>{0, plural, one{%@ osoba może widzieć, gdzie jesteś.} few{%@ osoby mogą widzieć, gdzie jesteś.} many{%@ osób może widzieć, gdzie jesteś.} other{%@ osoby może widzieć, gdzie jesteś.}}</translation>
+    </message>
+    <message>
+        <source>NUMBERS</source>
+        <extracomment>The numbers from one to twelve as they begin VISIBLE_TO, in its gender and case, with a bar between; a hyphen alone where digits are usual. English: “One|Two|Three|Four|Five|Six|Seven|Eight|Nine|Ten|Eleven|Twelve”</extracomment>
+        <translation>Jedna|Dwie|Trzy|Cztery|Pięć|Sześć|Siedem|Osiem|Dziewięć|Dziesięć|Jedenaście|Dwanaście</translation>
+    </message>
+    <message>
+        <source>VISIBLE_TO_NOBODY</source>
+        <extracomment>Title of the people's page while the reader hides or shares with nobody. English: “Nobody can see where you are.”</extracomment>
+        <translation>Nikt nie może widzieć, gdzie jesteś.</translation>
+    </message>
+    <message>
+        <source>VISIBLE</source>
+        <extracomment>Label of the one switch over everything. English: “Visible to friends”</extracomment>
+        <translation>Widoczność dla znajomych</translation>
+    </message>
+    <message>
+        <source>VISIBLE_ON</source>
+        <extracomment>Below VISIBLE while the switch is on. English: “Off hides you from everyone at once.”</extracomment>
+        <translation>Wyłączenie od razu ukrywa cię przed wszystkimi.</translation>
+    </message>
+    <message>
+        <source>VISIBLE_OFF</source>
+        <extracomment>Below VISIBLE while the switch is off. English: “Turn on, and the rules below hold again.”</extracomment>
+        <translation>Włącz, a zasady poniżej znów obowiązują.</translation>
+    </message>
+    <message>
+        <source>SWITCH_ON</source>
+        <extracomment>Spoken: a switch, %@ is its label, is on. English: “%@, on”</extracomment>
+        <translation>%@, włączone</translation>
+    </message>
+    <message>
+        <source>SWITCH_OFF</source>
+        <extracomment>Spoken: a switch, %@ is its label, is off. English: “%@, off”</extracomment>
+        <translation>%@, wyłączone</translation>
+    </message>
+    <message>
+        <source>WHO_SEES_ME</source>
+        <extracomment>Heading above the list of people who see the reader. English: “Who sees me”</extracomment>
+        <translation>Kto mnie widzi</translation>
+    </message>
+    <message>
+        <source>EXACTLY</source>
+        <extracomment>How exactly somebody is seen. English: “Exactly”</extracomment>
+        <translation>Dokładnie</translation>
+    </message>
+    <message>
+        <source>WITHIN_1_KM</source>
+        <extracomment>How exactly somebody is seen. English: “Within 1 km”</extracomment>
+        <translation>Do 1 km</translation>
+    </message>
+    <message>
+        <source>TOWN</source>
+        <extracomment>How exactly somebody is seen. English: “The town”</extracomment>
+        <translation>Miejscowość</translation>
+    </message>
+    <message>
+        <source>NAMED_PLACES</source>
+        <extracomment>How exactly somebody is seen: only when they are at one of their named places. English: “Only places I have named”</extracomment>
+        <translation>Tylko miejsca, które mają nazwę ode mnie</translation>
+    </message>
+    <message>
+        <source>RULE_ALWAYS</source>
+        <extracomment>A rule: %@ is how exactly. English: “%@, always”</extracomment>
+        <translation>%@, zawsze</translation>
+    </message>
+    <message>
+        <source>RULE_MIDNIGHT</source>
+        <extracomment>A rule that ends at the next midnight: %@ is how exactly. English: “%@, until midnight”</extracomment>
+        <translation>%@, do północy</translation>
+    </message>
+    <message>
+        <source>RULE_TIME</source>
+        <extracomment>A rule that ends: %1$@ is how exactly, %2$@ a time or a day and time. English: “%1$@, until %2$@”</extracomment>
+        <translation>%1$@, do: %2$@</translation>
+    </message>
+    <message>
+        <source>RULE_PLACE</source>
+        <extracomment>A rule that ends when the reader arrives: %1$@ is how exactly, %2$@ the reader's name of a place. English: “%1$@, until you are at %2$@”</extracomment>
+        <translation>%1$@, do przybycia: %2$@</translation>
+    </message>
+    <message>
+        <source>RULE_ENDED</source>
+        <extracomment>In place of a rule that is over: %@ is a day and time. English: “Ended: %@”</extracomment>
+        <translation>Zakończone: %@</translation>
+    </message>
+    <message>
+        <source>RULE_ASKED</source>
+        <extracomment>A rule without an end asks now and then whether it is still meant; %@ is the day on which it ends without an answer. English: “Still meant? Without an answer it ends: %@.”</extracomment>
+        <translation>Nadal aktualne? Bez odpowiedzi kończy się: %@.</translation>
+    </message>
+    <message>
+        <source>KEEP_SHARING</source>
+        <extracomment>Button: the rule goes on. English: “Keep sharing”</extracomment>
+        <translation>Udostępniaj dalej</translation>
+    </message>
+    <message>
+        <source>SHARE_WITH</source>
+        <extracomment>Row or button that begins a new rule. English: “Share with somebody”</extracomment>
+        <translation>Udostępnij komuś</translation>
+    </message>
+    <message>
+        <source>SHARE_WHO</source>
+        <extracomment>Label of a field. English: “Name, e-mail address or phone number”</extracomment>
+        <translation>Imię, adres e-mail lub numer telefonu</translation>
+    </message>
+    <message>
+        <source>SHARE_UNKNOWN</source>
+        <extracomment>Nobody was found by what was typed. English: “Nobody here is called so. Whoever runs the service can add people.”</extracomment>
+        <translation>Nikt tu się tak nie nazywa. Osoba prowadząca usługę może dodawać ludzi.</translation>
+    </message>
+    <message>
+        <source>SHARE_SELF</source>
+        <extracomment>The reader typed their own name. English: “Nobody shares with themselves.”</extracomment>
+        <translation>Nikt nie udostępnia samemu sobie.</translation>
+    </message>
+    <message>
+        <source>GO_ON</source>
+        <extracomment>Button: to the next step. English: “Go on”</extracomment>
+        <translation>Dalej</translation>
+    </message>
+    <message>
+        <source>WHO_LOOKED</source>
+        <extracomment>Heading above the list of people who looked. English: “Who looked”</extracomment>
+        <translation>Kto patrzył</translation>
+    </message>
+    <message>
+        <source>ALL_LOOKS</source>
+        <extracomment>Row that opens all that is kept of who looked; %@ is a number of days. English: “{0, plural, one{All of the last day} other{All of the last %@ days}}”</extracomment>
+        <translation>{0, plural, one{Wszystko z ostatniego dnia} few{Wszystko z ostatnich %@ dni} many{Wszystko z ostatnich %@ dni} other{Wszystko z ostatnich %@ dnia}}</translation>
+    </message>
+    <message>
+        <source>NOBODY_LOOKED</source>
+        <extracomment>No entry in the list of people who looked. English: “Nobody has looked.”</extracomment>
+        <translation>Nikt nie patrzył.</translation>
+    </message>
+    <message>
+        <source>CARRIED</source>
+        <extracomment>After the name of who looked: their phone fetched it by itself, nobody asked. English: “by their phone alone”</extracomment>
+        <translation>tylko sam telefon</translation>
+    </message>
+    <message>
+        <source>MY_DATA</source>
+        <extracomment>Heading. English: “My phone and my data”</extracomment>
+        <translation>Mój telefon i moje dane</translation>
+    </message>
+    <message>
+        <source>SET_UP_PHONE</source>
+        <extracomment>Row and title. English: “Set up a phone”</extracomment>
+        <translation>Skonfiguruj telefon</translation>
+    </message>
+    <message>
+        <source>MY_DEVICES</source>
+        <extracomment>Row and title: list of phones, programs and browsers. English: “My devices”</extracomment>
+        <translation>Moje urządzenia</translation>
+    </message>
+    <message>
+        <source>MY_SETTINGS</source>
+        <extracomment>Row and title: language, time zone, how long things are kept. English: “Settings”</extracomment>
+        <translation>Ustawienia</translation>
+    </message>
+    <message>
+        <source>GET_COPY</source>
+        <extracomment>Row: a file with everything about the reader. English: “Get a copy of my data”</extracomment>
+        <translation>Pobierz kopię moich danych</translation>
+    </message>
+    <message>
+        <source>DELETE_ALL</source>
+        <extracomment>Row and title. English: “Delete everything about me”</extracomment>
+        <translation>Usuń wszystko o mnie</translation>
+    </message>
+    <message>
+        <source>SIGN_OUT</source>
+        <extracomment>Button. English: “Sign out”</extracomment>
+        <translation>Wyloguj</translation>
+    </message>
+    <message>
+        <source>BACK</source>
+        <extracomment>Spoken: the arrow back. English: “Back”</extracomment>
+        <translation>Wstecz</translation>
+    </message>
+    <message>
+        <source>SEES_TITLE</source>
+        <extracomment>Title of the page about one rule; %@ is a name. English: “What %@ sees”</extracomment>
+        <translation>Co widzi %@</translation>
+    </message>
+    <message>
+        <source>SEES_THIS</source>
+        <extracomment>Below a row that shows the reader as %@ sees them. English: “%@ sees you exactly like this.”</extracomment>
+        <translation>%@ widzi cię dokładnie tak.</translation>
+    </message>
+    <message>
+        <source>SEES_NOTHING</source>
+        <extracomment>In place of that row; %@ is a name. English: “%@ sees no place of yours now.”</extracomment>
+        <translation>%@ nie widzi teraz żadnego twojego miejsca.</translation>
+    </message>
+    <message>
+        <source>A_PLACE_WITHIN</source>
+        <extracomment>In that row: a place that is known within a distance, %@. English: “Within %@”</extracomment>
+        <translation>Do %@</translation>
+    </message>
+    <message>
+        <source>HOW_EXACTLY</source>
+        <extracomment>Heading above a choice. English: “How exactly”</extracomment>
+        <translation>Jak dokładnie</translation>
+    </message>
+    <message>
+        <source>UNTIL</source>
+        <extracomment>Heading above a choice. English: “Until”</extracomment>
+        <translation>Do</translation>
+    </message>
+    <message>
+        <source>UNTIL_CHANGED</source>
+        <extracomment>Choice of when a rule ends: not by itself. English: “I change it”</extracomment>
+        <translation>Kiedy to zmienię</translation>
+    </message>
+    <message>
+        <source>UNTIL_MIDNIGHT</source>
+        <extracomment>Choice of when a rule ends. English: “Midnight”</extracomment>
+        <translation>Północ</translation>
+    </message>
+    <message>
+        <source>UNTIL_ARRIVAL</source>
+        <extracomment>Choice of when a rule ends; a list of places follows. English: “I arrive at”</extracomment>
+        <translation>Przybycie:</translation>
+    </message>
+    <message>
+        <source>UNTIL_TIME</source>
+        <extracomment>Choice of when a rule ends; a field for a time follows. English: “A time”</extracomment>
+        <translation>Godzina</translation>
+    </message>
+    <message>
+        <source>SAID_ALOUD</source>
+        <extracomment>Label of a box to tick: speakers may say where the reader is. English: “May be said aloud”</extracomment>
+        <translation>Można mówić na głos</translation>
+    </message>
+    <message>
+        <source>SAID_ALOUD_WHERE</source>
+        <extracomment>Below SAID_ALOUD; %@ is a name. English: “Speakers at %@’s may say it”</extracomment>
+        <translation>Głośniki, które ma %@, mogą to mówić</translation>
+    </message>
+    <message>
+        <source>SAVE</source>
+        <extracomment>Button. English: “Save”</extracomment>
+        <translation>Zapisz</translation>
+    </message>
+    <message>
+        <source>STOP</source>
+        <extracomment>Button and title; %@ is a name. English: “Stop sharing with %@”</extracomment>
+        <translation>Przestań udostępniać: %@</translation>
+    </message>
+    <message>
+        <source>STOP_ASK</source>
+        <extracomment>Asks before STOP; %@ is a name. English: “%@ will see nothing of you from now on. What their phone has shown stays on it.”</extracomment>
+        <translation>%@ nie zobaczy już niczego o tobie. To, co pokazał telefon, na nim zostaje.</translation>
+    </message>
+    <message>
+        <source>KEEP</source>
+        <extracomment>Button: do not stop, do not delete. English: “Keep”</extracomment>
+        <translation>Zachowaj</translation>
+    </message>
+    <message>
+        <source>STEP_INSTALL</source>
+        <extracomment>First step of setting up a phone. English: “Install a tracker app that can send to an address of your own.”</extracomment>
+        <translation>Zainstaluj aplikację śledzącą, która może wysyłać na własny adres.</translation>
+    </message>
+    <message>
+        <source>STEP_TYPE</source>
+        <extracomment>Second step; three values follow. English: “Type these three into it.”</extracomment>
+        <translation>Wpisz w niej te trzy wartości.</translation>
+    </message>
+    <message>
+        <source>STEP_RUN</source>
+        <extracomment>Third step. English: “Let it run, then look again: the phone’s first place shows up here.”</extracomment>
+        <translation>Niech działa, potem sprawdź ponownie: pierwsze miejsce telefonu pojawi się tutaj.</translation>
+    </message>
+    <message>
+        <source>ADDRESS</source>
+        <extracomment>Label of a value to type. English: “Address”</extracomment>
+        <translation>Adres</translation>
+    </message>
+    <message>
+        <source>USER</source>
+        <extracomment>Label of a value to type. English: “User”</extracomment>
+        <translation>Użytkownik</translation>
+    </message>
+    <message>
+        <source>PASSWORD</source>
+        <extracomment>Label of a value to type. English: “Password”</extracomment>
+        <translation>Hasło</translation>
+    </message>
+    <message>
+        <source>SHOWN_ONCE</source>
+        <extracomment>Warning below the values. English: “This password is shown once. For another phone, set up another.”</extracomment>
+        <translation>To hasło jest pokazywane raz. Dla innego telefonu skonfiguruj inne.</translation>
+    </message>
+    <message>
+        <source>WAS_SHOWN</source>
+        <extracomment>In place of the password; %@ is a day. English: “Shown once: %@.”</extracomment>
+        <translation>Pokazane raz: %@.</translation>
+    </message>
+    <message>
+        <source>ADDRESS_ALONE</source>
+        <extracomment>Above an address for apps that take nothing else. English: “For apps that take nothing but an address:”</extracomment>
+        <translation>Dla aplikacji, które przyjmują tylko adres:</translation>
+    </message>
+    <message>
+        <source>MAKE_PASSWORD</source>
+        <extracomment>Button on the first page of setting up a phone. English: “Show what to type”</extracomment>
+        <translation>Pokaż, co wpisać</translation>
+    </message>
+    <message>
+        <source>NOTHING_YET</source>
+        <extracomment>No message of a phone has come. English: “Nothing has come yet.”</extracomment>
+        <translation>Jeszcze nic nie przyszło.</translation>
+    </message>
+    <message>
+        <source>HERE_SINCE</source>
+        <extracomment>A phone's first place has come; %1$@ is a time, %2$@ a distance. English: “Here since %1$@, within about %2$@.”</extracomment>
+        <translation>Tutaj od %1$@, z dokładnością do około %2$@.</translation>
+    </message>
+    <message>
+        <source>HERE_SINCE_TIME</source>
+        <extracomment>A phone was heard; %@ is a time. English: “Here since %@.”</extracomment>
+        <translation>Tutaj od %@.</translation>
+    </message>
+    <message>
+        <source>LOOK_AGAIN</source>
+        <extracomment>Button: loads the page again. English: “Look again”</extracomment>
+        <translation>Sprawdź ponownie</translation>
+    </message>
+    <message>
+        <source>OTHER_PHONE</source>
+        <extracomment>Above a code for a camera. English: “Is the phone another one than this? Point its camera here, and this page opens on it.”</extracomment>
+        <translation>Czy to inny telefon niż ten? Skieruj jego aparat tutaj, a ta strona się na nim otworzy.</translation>
+    </message>
+    <message>
+        <source>CODE</source>
+        <extracomment>Spoken: a picture with a code for a camera. English: “Code for a camera”</extracomment>
+        <translation>Kod dla aparatu</translation>
+    </message>
+    <message>
+        <source>DEVICE_PHONE</source>
+        <extracomment>A device of the reader's. English: “Phone”</extracomment>
+        <translation>Telefon</translation>
+    </message>
+    <message>
+        <source>DEVICE_READER</source>
+        <extracomment>A device of the reader's: the program that shows friends. English: “Program that asks for friends”</extracomment>
+        <translation>Program, który pyta o znajomych</translation>
+    </message>
+    <message>
+        <source>DEVICE_BROWSER</source>
+        <extracomment>A device of the reader's. English: “Browser”</extracomment>
+        <translation>Przeglądarka</translation>
+    </message>
+    <message>
+        <source>DEVICE_THIS</source>
+        <extracomment>A device of the reader's: the one in use. English: “This browser”</extracomment>
+        <translation>Ta przeglądarka</translation>
+    </message>
+    <message>
+        <source>DEVICE_HEARD</source>
+        <extracomment>Below a device; %@ is a day and time. English: “Last heard: %@”</extracomment>
+        <translation>Ostatnio słyszane: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_SINCE</source>
+        <extracomment>Below a device; %@ is a day and time. English: “Since: %@”</extracomment>
+        <translation>Od: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_END</source>
+        <extracomment>Button: the device may do nothing any more. English: “End”</extracomment>
+        <translation>Zakończ</translation>
+    </message>
+    <message>
+        <source>DEVICE_END_SPOKEN</source>
+        <extracomment>Spoken: the same button; %@ is the device and its day. English: “End: %@”</extracomment>
+        <translation>Zakończ: %@</translation>
+    </message>
+    <message>
+        <source>DEVICE_ASK</source>
+        <extracomment>Asks before DEVICE_END. English: “It sends nothing and sees nobody from then on, and what it began ends.”</extracomment>
+        <translation>Niczego już nie wysyła i nikogo nie widzi, a to, co zaczęło, kończy się.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_PLACES_KEPT</source>
+        <extracomment>Label of a choice of durations. English: “My places are kept for”</extracomment>
+        <translation>Moje miejsca są przechowywane przez</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LOOKS_KEPT</source>
+        <extracomment>Label of a choice of durations. English: “Who looked is kept for”</extracomment>
+        <translation>Kto patrzył, jest przechowywane przez</translation>
+    </message>
+    <message>
+        <source>SETTINGS_ZONE</source>
+        <extracomment>Label of a choice. English: “Time zone”</extracomment>
+        <translation>Strefa czasowa</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LANGUAGE</source>
+        <extracomment>Label of a choice. English: “Language”</extracomment>
+        <translation>Język</translation>
+    </message>
+    <message>
+        <source>SAVED</source>
+        <extracomment>After saving. English: “Saved.”</extracomment>
+        <translation>Zapisano.</translation>
+    </message>
+    <message>
+        <source>DELETE_ASK</source>
+        <extracomment>Asks before everything about the reader is deleted. English: “Your places, rules, devices and the notes of who looked go for good. Phones of friends keep what they have shown.”</extracomment>
+        <translation>Twoje miejsca, zasady, urządzenia i notatki o tym, kto patrzył, znikają na dobre. Telefony znajomych zachowują to, co pokazały.</translation>
+    </message>
+    <message>
+        <source>DELETE_NOW</source>
+        <extracomment>Button. English: “Delete everything”</extracomment>
+        <translation>Usuń wszystko</translation>
+    </message>
+    <message>
+        <source>DELETED</source>
+        <extracomment>After everything was deleted. English: “Everything about you is deleted.”</extracomment>
+        <translation>Wszystko o tobie zostało usunięte.</translation>
+    </message>
+    <message>
+        <source>LINK_TITLE</source>
+        <extracomment>Title of the page that a link opens. English: “Your own page”</extracomment>
+        <translation>Twoja własna strona</translation>
+    </message>
+    <message>
+        <source>LINK_TEXT</source>
+        <extracomment>Below it. English: “This link works once. After that this browser stays signed in for 30 days.”</extracomment>
+        <translation>Ten link działa raz. Potem ta przeglądarka pozostaje zalogowana przez 30 dni.</translation>
+    </message>
+    <message>
+        <source>LINK_OPEN</source>
+        <extracomment>Button. English: “Open my page”</extracomment>
+        <translation>Otwórz moją stronę</translation>
+    </message>
+    <message>
+        <source>LINK_SPENT</source>
+        <extracomment>The link cannot be used any more. English: “This link has been used, or its 15 minutes are over. Ask for another one.”</extracomment>
+        <translation>Ten link został użyty albo minęło jego 15 minut. Poproś o nowy.</translation>
+    </message>
+    <message>
+        <source>SIGNED_OUT</source>
+        <extracomment>Title: nobody is signed in. English: “This page opens with a link.”</extracomment>
+        <translation>Ta strona otwiera się linkiem.</translation>
+    </message>
+    <message>
+        <source>SIGNED_OUT_TEXT</source>
+        <extracomment>Below it. English: “Whoever runs the service gives you one. It works once, for 15 minutes.”</extracomment>
+        <translation>Daje go osoba prowadząca usługę. Działa raz, przez 15 minut.</translation>
+    </message>
+    <message>
+        <source>NO_SUCH_PAGE</source>
+        <extracomment>Title. English: “There is no such page.”</extracomment>
+        <translation>Nie ma takiej strony.</translation>
+    </message>
+    <message>
+        <source>NOT_FROM_HERE</source>
+        <extracomment>A form that another page sent. English: “This did not come from your own page. Nothing has changed.”</extracomment>
+        <translation>To nie przyszło z twojej własnej strony. Nic się nie zmieniło.</translation>
+    </message>
+    <message>
+        <source>NOT_KEPT</source>
+        <extracomment>The service could not write. English: “It could not be kept just now. Nothing has changed; try again in a while.”</extracomment>
+        <translation>Teraz nie udało się zapisać. Nic się nie zmieniło; spróbuj za chwilę.</translation>
+    </message>
+    <message>
+        <source>NOT_UNDERSTOOD</source>
+        <extracomment>A form with something missing. English: “Something is missing there. Nothing has changed; go back and choose again.”</extracomment>
+        <translation>Czegoś brakuje. Nic się nie zmieniło; wróć i wybierz ponownie.</translation>
+    </message>
+    <message>
+        <source>TIME_WANTED</source>
+        <extracomment>No time was given beside the choice of one. English: “Choose the time at which it ends.”</extracomment>
+        <translation>Wybierz godzinę, o której to się kończy.</translation>
+    </message>
+    <message>
+        <source>TO_MY_PAGE</source>
+        <extracomment>Link. English: “To my page”</extracomment>
+        <translation>Do mojej strony</translation>
+    </message>
+    <message>
+        <source>MY_PLACES</source>
+        <extracomment>Row and title: places to which the reader gave names. English: “My places”</extracomment>
+        <translation>Moje miejsca</translation>
+    </message>
+    <message>
+        <source>PLACE_NONE</source>
+        <extracomment>No place has a name. English: “No place has a name yet.”</extracomment>
+        <translation>Żadne miejsce nie ma jeszcze nazwy.</translation>
+    </message>
+    <message>
+        <source>PLACE_HERE</source>
+        <extracomment>Heading and button. English: “Name the place where I am”</extracomment>
+        <translation>Nazwij miejsce, w którym jestem</translation>
+    </message>
+    <message>
+        <source>PLACE_HERE_HINT</source>
+        <extracomment>Below PLACE_HERE. English: “The place of your phone’s last message, and 150 metres around it.”</extracomment>
+        <translation>Miejsce z ostatniej wiadomości twojego telefonu i 150 metrów wokół.</translation>
+    </message>
+    <message>
+        <source>PLACE_NO_FIX</source>
+        <extracomment>Instead of PLACE_HERE_HINT. English: “Your phone has sent no place yet.”</extracomment>
+        <translation>Twój telefon nie wysłał jeszcze żadnego miejsca.</translation>
+    </message>
+    <message>
+        <source>PLACE_NAME</source>
+        <extracomment>Label of a field. English: “Name of the place”</extracomment>
+        <translation>Nazwa miejsca</translation>
+    </message>
+    <message>
+        <source>PLACE_SAID</source>
+        <extracomment>Label of a box to tick, and below a place. English: “Friends may hear its name”</extracomment>
+        <translation>Znajomi mogą słyszeć nazwę</translation>
+    </message>
+    <message>
+        <source>PLACE_UNSAID</source>
+        <extracomment>Below a place. English: “Nobody hears its name”</extracomment>
+        <translation>Nikt nie słyszy nazwy</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE</source>
+        <extracomment>Button. English: “Remove”</extracomment>
+        <translation>Usuń</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE_ONE</source>
+        <extracomment>Title, and spoken: the same button; %@ is the name of a place. English: “Remove: %@”</extracomment>
+        <translation>Usuń: %@</translation>
+    </message>
+    <message>
+        <source>PLACE_REMOVE_ASK</source>
+        <extracomment>Asks before PLACE_REMOVE. English: “Its name goes, and rules that were to end there end now.”</extracomment>
+        <translation>Nazwa znika, a zasady, które miały się tam skończyć, kończą się teraz.</translation>
+    </message>
+</context>
+</TS>

@@ -1,0 +1,130 @@
+#include "server/page/PeoplesPage.h"
+
+#include "server/http/BasicCredentials.h"
+#include "server/page/PageAnswer.h"
+#include "server/page/PlainPage.h"
+#include "server/rules/WallClock.h"
+#include "server/store/Secret.h"
+
+namespace ktr::server {
+
+namespace {
+
+constexpr const char* kLinkField = "link";
+
+/// What a session's forms carry. It is made of the session's secret, and tells nothing of it.
+std::string tokenOf(const std::string& session) {
+    constexpr char kDigits[] = "0123456789abcdef";
+    std::string token;
+    for (const char byte : Secret::hash("form " + session).substr(0, 16)) {
+        token += kDigits[static_cast<unsigned char>(byte) / 16];
+        token += kDigits[static_cast<unsigned char>(byte) % 16];
+    }
+    return token;
+}
+
+HttpResponse saying(int status, const PageLanguage& language, const char* title, const char* more, bool leadsBack) {
+    return PageAnswer::html(status, PlainPage::sayingHtml(language, language.text(title),
+                                                          more == nullptr ? "" : language.text(more), leadsBack));
+}
+
+}  // namespace
+
+PeoplesPage::PeoplesPage(Setup setup) : setup_(std::move(setup)), own_(setup_.store) {
+    thread_ = std::thread([this] { work(); });
+}
+
+PeoplesPage::~PeoplesPage() {
+    {
+        const std::lock_guard<std::mutex> lock(mutex_);
+        ending_ = true;
+    }
+    wake_.notify_all();
+    thread_.join();
+}
+
+void PeoplesPage::answer(const HttpRequest& request, HttpReply reply) {
+    {
+        const std::lock_guard<std::mutex> lock(mutex_);
+        if (waiting_.size() < kMostWaiting) {
+            waiting_.emplace_back(PageRequest::read(request), std::move(reply));
+            wake_.notify_all();
+            return;
+        }
+    }
+    const PageLanguage language("en", "UTC");
+    HttpResponse response = saying(503, language, "NOT_KEPT", nullptr, false);
+    response.headers.emplace_back("Retry-After", "5");
+    reply.send(std::move(response));
+}
+
+void PeoplesPage::work() {
+    for (;;) {
+        std::unique_lock<std::mutex> lock(mutex_);
+        wake_.wait(lock, [this] { return ending_ || !waiting_.empty(); });
+        if (waiting_.empty()) {
+            return;
+        }
+        auto [request, reply] = std::move(waiting_.front());
+        waiting_.pop_front();
+        lock.unlock();
+        double delay = 0.0;
+        HttpResponse response = answerTo(request, delay);
+        if (delay > 0.0) {
+            setup_.later(delay, [reply, response] { reply.send(response); });
+        } else {
+            reply.send(std::move(response));
+        }
+    }
+}
+
+HttpResponse PeoplesPage::signIn(const PageRequest& request, const PageLanguage& language, double& delay) {
+    if (!request.isOwn) {
+        return saying(403, language, "NOT_FROM_HERE", nullptr, false);
+    }
+    const std::string link = request.field(kLinkField);
+    const auto session = Secret::make();
+    switch (session && !link.empty() ? setup_.store.signIn(link, *session, setup_.now()) : SignIn::Spent) {
+        case SignIn::Done: {
+            HttpResponse response = PageAnswer::seeOther("/me");
+            PageAnswer::setCookie(response, PageAnswer::kSession, *session, Store::kBrowserLasts);
+            return response;
+        }
+        case SignIn::Spent:
+            delay = setup_.delays.afterFailure(request.peer, FailureDelays::Clock::now());
+            return saying(403, language, "LINK_SPENT", nullptr, false);
+        case SignIn::Failed:
+            break;
+    }
+    return saying(503, language, "NOT_KEPT", nullptr, false);
+}
+
+HttpResponse PeoplesPage::answerTo(const PageRequest& request, double& delay) {
+    const std::int64_t now = setup_.now();
+    const std::string tag = PageLanguage::choose(request.language, request.accepted);
+    const PageLanguage plain(tag, "UTC");
+    if (request.is({"in"})) {
+        return request.posts
+                   ? signIn(request, plain, delay)
+                   : PageAnswer::html(200, PlainPage::linkHtml(plain, request.query.find(kLinkField).value_or("")));
+    }
+    bool failed = false;
+    const auto browser = request.session.empty() ? std::nullopt : setup_.store.browserOf(request.session, now, failed);
+    const auto person = browser ? setup_.store.person(browser->person) : std::nullopt;
+    if (failed || (browser && !person)) {
+        return saying(503, plain, "NOT_KEPT", nullptr, true);
+    }
+    if (!browser) {
+        return PageAnswer::html(403, PlainPage::signedOutHtml(plain));
+    }
+    const std::string token = tokenOf(request.session);
+    if (request.posts && (!request.isOwn || !sameSecret(request.field("token"), token))) {
+        return saying(403, plain, "NOT_FROM_HERE", nullptr, true);
+    }
+    const PageLanguage language(tag, person->zone.empty() ? WallClock::machineZone() : person->zone);
+    const PageContext context{language, token, setup_.store.present(now), person->name,
+                              person->handles.empty() ? person->name : person->handles.front()};
+    return own_.answer(request, {context, *browser, *person});
+}
+
+}  // namespace ktr::server
