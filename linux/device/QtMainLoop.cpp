@@ -3,12 +3,13 @@
 #include <algorithm>
 #include <chrono>
 #include <cmath>
-#include <limits>
+#include <cstdint>
+#include <map>
 #include <mutex>
 #include <utility>
+#include <vector>
 
 #include <QObject>
-#include <QPointer>
 #include <QRunnable>
 #include <QTimer>
 
@@ -52,9 +53,6 @@ class QtMainLoop::Context {
         }
     }
 
-    /// The parent of the timers; null once closed. Main thread.
-    QObject* receiver() const { return receiver_.get(); }
-
     /// Drops what is posted. It is destroyed outside the lock, since a destructor may post again.
     void close() {
         std::unique_ptr<QObject> receiver;
@@ -69,61 +67,125 @@ class QtMainLoop::Context {
     std::unique_ptr<QObject> receiver_;
 };
 
-/// The receiver owns the Qt timer, and that owns the work: dropping the handle stops nothing, closing the loop does.
-class QtMainLoop::QtTimer : public platform::Timer {
+/// What is to be done later, by the time when it is due, then by the order in which it was asked for; one Qt timer
+/// waits for the first. Tens of thousands of rows have a step each: as many Qt timers took seconds. Main thread.
+class QtMainLoop::Schedule : public std::enable_shared_from_this<Schedule> {
   public:
-    explicit QtTimer(double interval) : interval_(interval) {}
+    /// The schedule owns it: dropping the handle stops nothing, closing the loop does.
+    class Entry : public platform::Timer {
+      public:
+        Entry(double interval, bool repeats, Work work)
+            : interval_(interval), repeats_(repeats), work_(std::make_shared<const Work>(std::move(work))) {}
 
-    static std::shared_ptr<QtTimer> start(QObject* receiver, double interval, bool repeats, Work work) {
-        auto handle = std::make_shared<QtTimer>(interval);
-        auto* timer = new QTimer(receiver);
-        handle->timer_ = timer;
-        timer->setSingleShot(true);
-        timer->setTimerType(Qt::PreciseTimer);
-        auto due = later(SteadyClock::now(), interval);
-        QObject::connect(timer, &QTimer::timeout, timer,
-                         [timer, handle, repeats, due, work = std::move(work)]() mutable {
-                             if (const double left = secondsUntil(due); left > 0.0) {
-                                 timer->start(wait(left));
-                                 return;
-                             }
-                             // The work may invalidate the timer, which drops this very closure at the next turn.
-                             const Work now = work;
-                             if (repeats) {
-                                 // From the time that was meant, unless that has passed as well: a stalled loop does
-                                 // not fire in bursts.
-                                 due = std::max(later(due, handle->interval()), SteadyClock::now());
-                                 timer->start(wait(secondsUntil(due)));
-                             } else {
-                                 handle->invalidate();
-                             }
-                             now();
-                         });
-        timer->start(wait(interval));
-        return handle;
+        void invalidate() override {
+            if (const auto schedule = schedule_.lock()) {
+                schedule->drop(*this);
+            }
+        }
+        bool isValid() const override { return !schedule_.expired(); }
+        double interval() const override { return interval_; }
+
+      private:
+        friend class Schedule;
+        const double interval_;
+        const bool repeats_;
+        /// Goes when it is done or dropped: the handle, which the work may hold, stays.
+        std::shared_ptr<const Work> work_;
+        /// Where it waits; none once it does not.
+        std::weak_ptr<Schedule> schedule_;
+        SteadyClock::time_point due_;
+        std::uint64_t number_ = 0;
+    };
+
+    Schedule() {
+        timer_.setSingleShot(true);
+        timer_.setTimerType(Qt::PreciseTimer);
+        QObject::connect(&timer_, &QTimer::timeout, &timer_, [this] { turn(); });
     }
 
-    void invalidate() override {
-        if (timer_) {
-            timer_->stop();
-            timer_->disconnect();
-            timer_->deleteLater();
-            timer_ = nullptr;
+    void add(const std::shared_ptr<Entry>& entry) {
+        if (!isClosed_) {
+            insert(entry, later(SteadyClock::now(), entry->interval_));
+            if (waiting_.begin()->second == entry && dropped_.empty()) {
+                waitForFirst();
+            }
         }
     }
-    bool isValid() const override { return !timer_.isNull(); }
-    double interval() const override { return interval_; }
+
+    /// Drops all that waits. What is dropped may ask for more in its destructor: it gets nothing.
+    void close() {
+        isClosed_ = true;
+        timer_.stop();
+        auto dropped = std::exchange(dropped_, {});
+        for (const auto& [place, entry] : std::exchange(waiting_, {})) {
+            entry->schedule_.reset();
+            dropped.push_back(std::move(entry->work_));
+        }
+    }
 
   private:
-    double interval_;
-    QPointer<QTimer> timer_;
+    using Place = std::pair<SteadyClock::time_point, std::uint64_t>;
+
+    void insert(const std::shared_ptr<Entry>& entry, SteadyClock::time_point due) {
+        entry->schedule_ = weak_from_this();
+        entry->due_ = due;
+        entry->number_ = ++numbers_;
+        waiting_.emplace(Place(due, entry->number_), entry);
+    }
+
+    void drop(Entry& entry) {
+        entry.schedule_.reset();
+        // Whoever says so may live by what the work holds: that goes on a later turn.
+        dropped_.push_back(std::move(entry.work_));
+        waiting_.erase(Place(entry.due_, entry.number_));
+        timer_.start(0);
+    }
+
+    void turn() {
+        const auto self = shared_from_this();
+        std::exchange(dropped_, {}).clear();
+        // Work may run an event loop of its own, in which the rest goes on.
+        timer_.start(0);
+        const auto now = SteadyClock::now();
+        while (!waiting_.empty() && waiting_.begin()->first.first <= now) {
+            const auto entry = waiting_.extract(waiting_.begin()).mapped();
+            const auto work = entry->work_;
+            if (entry->repeats_) {
+                // From the time that was meant, unless that has passed as well: a stalled loop does not fire in bursts.
+                insert(entry, std::max(later(entry->due_, entry->interval_), SteadyClock::now()));
+            } else {
+                entry->schedule_.reset();
+                entry->work_.reset();
+            }
+            (*work)();
+        }
+        if (!dropped_.empty()) {
+            return;
+        }
+        timer_.stop();
+        if (!waiting_.empty()) {
+            waitForFirst();
+        }
+    }
+
+    void waitForFirst() { timer_.start(wait(secondsUntil(waiting_.begin()->first.first))); }
+
+    std::map<Place, std::shared_ptr<Entry>> waiting_;
+    std::vector<std::shared_ptr<const Work>> dropped_;
+    std::uint64_t numbers_ = 0;
+    bool isClosed_ = false;
+    QTimer timer_;
 };
 
-QtMainLoop::QtMainLoop() : thread_(std::this_thread::get_id()), context_(std::make_unique<Context>()) {}
+QtMainLoop::QtMainLoop()
+    : thread_(std::this_thread::get_id()),
+      context_(std::make_unique<Context>()),
+      schedule_(std::make_shared<Schedule>()) {}
 
 QtMainLoop::~QtMainLoop() {
     workers_.clear();
     workers_.waitForDone();
+    schedule_->close();
     context_->close();
 }
 
@@ -136,9 +198,9 @@ std::shared_ptr<platform::Timer> QtMainLoop::schedule(double seconds, bool repea
     if (repeats) {
         interval = std::max(interval, kShortestRepeat);
     }
-    QObject* receiver = context_->receiver();
-    return receiver ? QtTimer::start(receiver, interval, repeats, std::move(work))
-                    : std::make_shared<QtTimer>(interval);
+    const auto entry = std::make_shared<Schedule::Entry>(interval, repeats, std::move(work));
+    schedule_->add(entry);
+    return entry;
 }
 
 void QtMainLoop::runInBackground(Work work) {

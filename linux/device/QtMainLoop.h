@@ -28,10 +28,11 @@ class QtMainLoop : public platform::MainLoop {
 
   private:
     class Context;
-    class QtTimer;
+    class Schedule;
 
     std::thread::id thread_;
     std::unique_ptr<Context> context_;
+    std::shared_ptr<Schedule> schedule_;
     QThreadPool workers_;
 };
 

@@ -7,6 +7,8 @@
 #include <atomic>
 #include <chrono>
 #include <latch>
+#include <numeric>
+#include <vector>
 
 namespace ktr::linux_ {
 
@@ -57,6 +59,83 @@ TEST(QtMainLoopTest, WorkThatPostsWhenItIsDropped_IsDroppedToo) {
     auto guard = std::make_shared<PostsAtTheEnd>(loop.get(), &ran);
     loop->post([guard = std::move(guard)] {});
     loop.reset();
+    QCoreApplication::processEvents();
+    EXPECT_FALSE(ran);
+}
+
+TEST(QtMainLoopTest, ManySteps_AreOneTimerOfTheToolkit_AndRunInTheirOrder) {
+    class TimerEvents : public QObject {
+      public:
+        bool eventFilter(QObject*, QEvent* event) override {
+            count += event->type() == QEvent::Timer ? 1 : 0;
+            return false;
+        }
+        int count = 0;
+    };
+    constexpr int kSteps = 20000;
+    QtMainLoop loop;
+    TimerEvents events;
+    QCoreApplication::instance()->installEventFilter(&events);
+    std::vector<int> ran;
+    for (int i = 0; i < kSteps; ++i) {
+        loop.schedule(0.001, false, [&ran, i] { ran.push_back(i); });
+    }
+    std::vector<int> inOrder(kSteps);
+    std::iota(inOrder.begin(), inOrder.end(), 0);
+    while (ran.size() < inOrder.size()) {
+        QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents);
+    }
+    EXPECT_EQ(ran, inOrder);
+    EXPECT_LT(events.count, kSteps / 10);
+}
+
+TEST(QtMainLoopTest, WorkWithAnEventLoopOfItsOwn_HoldsUpNothingElse) {
+    QtMainLoop loop;
+    bool other = false;
+    bool done = false;
+    loop.schedule(0.001, false, [&] {
+        while (!other) {
+            QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents);
+        }
+        done = true;
+    });
+    loop.schedule(0.001, false, [&] { other = true; });
+    while (!done) {
+        QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents);
+    }
+    EXPECT_TRUE(other);
+}
+
+TEST(QtMainLoopTest, WhoStopsATimer_MayLiveByWhatItsWorkHolds) {
+    struct Owner {
+        std::shared_ptr<platform::Timer> timer;
+        bool* gone = nullptr;
+        ~Owner() { *gone = true; }
+    };
+    QtMainLoop loop;
+    bool gone = false;
+    auto owner = std::make_shared<Owner>();
+    owner->gone = &gone;
+    owner->timer = loop.schedule(1000.0, true, [owner] {});
+    const auto* raw = owner.get();
+    owner.reset();
+    raw->timer->invalidate();
+    EXPECT_FALSE(gone) << "inside its own call";
+    while (!gone) {
+        QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents);
+    }
+    EXPECT_TRUE(gone);
+}
+
+TEST(QtMainLoopTest, ALoopThatEndsInItsOwnWork_RunsNothingMore) {
+    auto loop = std::make_unique<QtMainLoop>();
+    bool ran = false;
+    loop->schedule(0.0, false, [&loop] { loop.reset(); });
+    const auto next = loop->schedule(0.0, true, [&ran] { ran = true; });
+    while (loop) {
+        QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents);
+    }
+    EXPECT_FALSE(next->isValid());
     QCoreApplication::processEvents();
     EXPECT_FALSE(ran);
 }
