@@ -5,9 +5,13 @@
 
 #include <algorithm>
 #include <array>
-#include <fstream>
 #include <iterator>
 #include <map>
+#include <sstream>
+#include <utility>
+#include <variant>
+
+#include "documents/FileReader.h"
 
 namespace ktr::linux_ {
 
@@ -18,11 +22,18 @@ namespace fs = std::filesystem;
 /// This program's own number: identifiers derived with it are no other program's.
 constexpr sd_id128_t kApplication = SD_ID128_MAKE(8e, 5f, 2a, 61, b0, 3d, 4c, 17, 9a, c4, 70, d2, 1f, 66, e8, 3b);
 
+/// A small file; none where there is none, or none that can be read.
+std::optional<std::string> textOf(const fs::path& file) {
+    constexpr std::size_t kMost = std::size_t{64} * 1024;
+    auto read = documents::FileReader::read(file, {kMost, {}});
+    auto* text = std::get_if<std::string>(&read);
+    return text != nullptr ? std::optional(std::move(*text)) : std::nullopt;
+}
+
 /// The first line of a small file, without what is no text around it; empty when there is none.
 std::string lineOf(const fs::path& file) {
-    std::ifstream stream(file, std::ios::binary);
-    std::string line;
-    std::getline(stream, line);
+    std::string line = textOf(file).value_or("");
+    line.erase(std::find(line.begin(), line.end(), '\n'), line.end());
     // The device tree ends its texts with a zero byte.
     line.erase(std::find(line.begin(), line.end(), '\0'), line.end());
     const std::size_t begin = line.find_first_not_of(" \t\r");
@@ -64,11 +75,11 @@ std::string unquoted(const std::string& value) {
 
 /// The file format is described in os-release(5).
 std::map<std::string, std::string> osRelease(const fs::path& root) {
-    std::ifstream stream(root / "etc/os-release");
-    if (!stream) {
-        stream.clear();
-        stream.open(root / "usr/lib/os-release");
+    auto text = textOf(root / "etc/os-release");
+    if (!text) {
+        text = textOf(root / "usr/lib/os-release");
     }
+    std::istringstream stream(text.value_or(""));
     std::map<std::string, std::string> values;
     for (std::string line; std::getline(stream, line);) {
         const std::size_t equals = line.find('=');

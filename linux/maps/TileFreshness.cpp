@@ -1,12 +1,11 @@
 #include "linux/maps/TileFreshness.h"
 
-#include <QDateTime>
-#include <QLocale>
 #include <QString>
 #include <QStringList>
-#include <QTimeZone>
 #include <algorithm>
 #include <optional>
+
+#include "documents/HttpTime.h"
 
 namespace ktr::linux_ {
 
@@ -15,12 +14,11 @@ namespace {
 constexpr std::int64_t kDay = 86400;
 constexpr std::int64_t kYear = 365 * kDay;
 
-/// "Sun, 06 Nov 1994 08:49:37 GMT"; anything else has passed already.
+/// What is no date has passed already.
 std::int64_t dateOf(const std::string& text) {
-    QDateTime date = QLocale::c().toDateTime(QString::fromStdString(text).trimmed(),
-                                             QStringLiteral("ddd, dd MMM yyyy hh:mm:ss 'GMT'"));
-    date.setTimeSpec(Qt::UTC);
-    return date.isValid() ? date.toSecsSinceEpoch() : 0;
+    const auto date = documents::parseHttpTime(text);
+    return date ? static_cast<std::int64_t>(date->secondsSinceReferenceDate + platform::kSecondsFrom1970ToReferenceDate)
+                : 0;
 }
 
 std::optional<std::int64_t> secondsOf(const QString& text) {

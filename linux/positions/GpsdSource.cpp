@@ -1,13 +1,13 @@
 #include "linux/positions/GpsdSource.h"
 
-#include <QJsonDocument>
-#include <QJsonObject>
 #include <QTcpSocket>
 #include <algorithm>
 #include <cmath>
-#include <limits>
+#include <string>
+#include <variant>
 
 #include "documents/IsoTime.h"
+#include "documents/JsonReader.h"
 #include "linux/device/SystemClock.h"
 
 namespace ktr::linux_ {
@@ -21,12 +21,19 @@ constexpr double kUnknownAccuracy = 50.0;
 constexpr int kFix2D = 2;
 constexpr int kFix3D = 3;
 
-double number(const QJsonObject& report, const char* name) {
-    const double value = report.value(QLatin1String(name)).toDouble(std::numeric_limits<double>::quiet_NaN());
-    return std::isfinite(value) ? value : std::numeric_limits<double>::quiet_NaN();
+/// NaN where there is none.
+double number(const platform::Dictionary& report, const char* name) {
+    const auto* value = report.find(name);
+    return value != nullptr ? value->number().value_or(std::nan("")) : std::nan("");
 }
 
-double firstNumber(const QJsonObject& report, std::initializer_list<const char*> names, double otherwise) {
+std::string text(const platform::Dictionary& report, const char* name) {
+    const auto* value = report.find(name);
+    const auto* text = value != nullptr ? value->string() : nullptr;
+    return text != nullptr ? *text : "";
+}
+
+double firstNumber(const platform::Dictionary& report, std::initializer_list<const char*> names, double otherwise) {
     for (const char* name : names) {
         if (const double value = number(report, name); !std::isnan(value)) {
             return value;
@@ -45,9 +52,15 @@ GpsdSource::~GpsdSource() {
 }
 
 std::optional<platform::PlatformLocation::Fix> GpsdSource::fixOf(const QByteArray& line) {
-    const QJsonObject report = QJsonDocument::fromJson(line).object();
-    const int mode = report.value(QLatin1String("mode")).toInt();
-    if (report.value(QLatin1String("class")).toString() != QLatin1String("TPV") || mode < kFix2D) {
+    const auto read = documents::JsonReader::read({line.constData(), static_cast<std::size_t>(line.size())});
+    const auto* value = std::get_if<platform::Value>(&read);
+    const auto* object = value != nullptr ? value->dictionary() : nullptr;
+    if (object == nullptr) {
+        return std::nullopt;
+    }
+    const platform::Dictionary& report = *object;
+    const double mode = firstNumber(report, {"mode"}, 0.0);
+    if (text(report, "class") != "TPV" || mode < kFix2D) {
         return std::nullopt;
     }
     platform::PlatformLocation::Fix fix;
@@ -66,7 +79,7 @@ std::optional<platform::PlatformLocation::Fix> GpsdSource::fixOf(const QByteArra
     }
     fix.course = firstNumber(report, {"track"}, -1.0);
     fix.speed = firstNumber(report, {"speed"}, -1.0);
-    const auto time = documents::parseIsoTime(report.value(QLatin1String("time")).toString().toStdString());
+    const auto time = documents::parseIsoTime(text(report, "time"));
     fix.timestamp = time ? time->date : SystemClock().now();
     return fix;
 }

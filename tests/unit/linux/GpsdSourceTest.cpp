@@ -55,7 +55,9 @@ TEST_F(GpsdSourceTest, Report_BecomesAFix) {
 TEST_F(GpsdSourceTest, ReportWithoutFixOrPlace_IsNone) {
     for (const char* line : {"{\"class\":\"TPV\",\"mode\":1}", "{\"class\":\"TPV\",\"mode\":2,\"lat\":51.5}",
                              "{\"class\":\"SKY\",\"mode\":3}", "{\"class\":\"TPV\",\"mode\":2,\"lat\":91,\"lon\":0}",
-                             "not json", "", "[]"}) {
+                             "not json", "", "[]", "{\"class\":\"TPV\",\"mode\":\"3\",\"lat\":51.5,\"lon\":-2.5}",
+                             "{\"class\":\"TPV\",\"mode\":3,\"lat\":51.5,\"lat\":5.5,\"lon\":-2.5}",
+                             "{\"class\":\"TPV\",\"mode\":3,\"lat\":51.5,\"lon\":-2.5,\"device\":\"\xff\"}"}) {
         EXPECT_EQ(GpsdSource::fixOf(line), std::nullopt) << line;
     }
     const auto flat =

@@ -1,7 +1,10 @@
 #include "linux/device/SystemDeviceInformation.h"
 
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 #include <sys/utsname.h>
+
+#include <filesystem>
 
 #include "tests/support/TemporaryFolder.h"
 
@@ -38,6 +41,16 @@ TEST_F(SystemDeviceInformationTest, FillerOfTheFirmware_GivesWayToTheDeviceTree)
     root.write("usr/lib/os-release", "VERSION_ID=7\n");
     const SystemDeviceInformation device(root.path());
     EXPECT_EQ(device.productType(), "Board 4");
+    EXPECT_EQ(device.operatingSystemVersion(), "7");
+}
+
+TEST_F(SystemDeviceInformationTest, WhatIsNoFile_IsNotWaitedFor) {
+    std::filesystem::create_directories(root.path() / "sys/class/dmi/id");
+    ASSERT_EQ(::mkfifo((root.path() / "sys/class/dmi/id/product_name").c_str(), 0600), 0);
+    std::filesystem::create_directories(root.path() / "etc/os-release");
+    root.write("usr/lib/os-release", "VERSION_ID=7\n");
+    const SystemDeviceInformation device(root.path());
+    EXPECT_EQ(device.productType(), std::nullopt);
     EXPECT_EQ(device.operatingSystemVersion(), "7");
 }
 
