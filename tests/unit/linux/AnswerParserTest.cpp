@@ -48,6 +48,7 @@ TEST(AnswerParserTest, AnswersOfEveryFormInPiecesOfEverySize) {
         {"HTTP/1.1 599 Own\r\nContent-Length: 1\r\n\r\nx", "599 x"},
         {"HTTP/1.1 200 OK\r\nTransfer-Encoding: chunked\r\n\r\n3\r\nabc\r\n2;a=b\r\nde\r\n0\r\n\r\n", "200 abcde"},
         {"HTTP/1.1 200 OK\r\nTransfer-Encoding: chunked\r\n\r\n1\r\na\r\n0\r\nX-Sum: 1\r\n\r\n", "200 a"},
+        {"HTTP/1.1 200 OK\r\nTransfer-Encoding: chunked\r\n\r\n0\r\n\r\n", "200 "},
         {"HTTP/1.1 100 Continue\r\n\r\nHTTP/1.1 103 Early Hints\r\nLink: </a>\r\n\r\nHTTP/1.1 201 Made\r\n"
          "Content-Length: 1\r\n\r\nx",
          "201 x"},
