@@ -51,7 +51,6 @@ LiveServices::LiveServices(std::filesystem::path configurationFile, std::shared_
 }
 
 LiveServices::~LiveServices() {
-    *alive_ = false;
     outdated_ = nullptr;
     // The loop waits for its workers when it ends.
     accounts_->giveUp();
@@ -119,22 +118,13 @@ void LiveServices::addTo(platform::Platform& platform, const std::string& langua
 }
 
 void LiveServices::start(std::function<void()> ready) {
-    platform::MainLoop* const mainLoop = mainLoop_.get();
-    mainLoop->runInBackground([this, mainLoop, accounts = accounts_, alive = std::weak_ptr<bool>(alive_),
-                               ready = std::move(ready)] {
-        accounts->load();
-        mainLoop->post([this, accounts, alive, ready] {
-            const auto still = alive.lock();
-            if (!still || !*still) {
-                return;
-            }
-            watcher_ =
-                std::make_unique<linux_::ConfigurationWatcher>(accounts, mainLoop_, [this] { configurationChanged(); });
-            // Nothing has asked for the account before it is read for the first time.
-            account_ = accounts->deviceOwnerAccount();
-            configurationChanged();
-            ready();
-        });
+    // It watches before it reads: a keyring may wait a minute for its password, and the file may change meanwhile.
+    watcher_ = std::make_unique<linux_::ConfigurationWatcher>(accounts_, mainLoop_, [this] { configurationChanged(); });
+    watcher_->start([this, ready = std::move(ready)] {
+        // Nothing has asked for the account before it is read for the first time.
+        account_ = accounts_->deviceOwnerAccount();
+        configurationChanged();
+        ready();
     });
 }
 

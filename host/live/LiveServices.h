@@ -101,7 +101,6 @@ class LiveServices {
     std::function<void()> outdated_;
     bool looksForPosition_ = false;
     /// Tells work in the background whether this still stands.
-    std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);
 };
 
 }  // namespace ktr::host

@@ -1,5 +1,6 @@
 #include "linux/configuration/ConfiguredAccountStore.h"
 
+#include <utility>
 #include <variant>
 
 #include "linux/configuration/ConfigurationReader.h"
@@ -95,41 +96,52 @@ std::optional<std::string> ConfiguredAccountStore::readToken(const Configuration
     return std::nullopt;
 }
 
-bool ConfiguredAccountStore::load() {
+void ConfiguredAccountStore::read() {
     auto read = ConfigurationReader::readFile(file_);
-    std::string problem;
-    std::shared_ptr<OwnerAccount> account;
-    auto* configuration = std::get_if<Configuration>(&read);
-    if (configuration == nullptr) {
-        problem = std::get<ConfigurationReader::Error>(read).text;
-    } else if (configuration->account) {
-        auto token = readToken(*configuration->account, problem);
+    Reading reading;
+    if (auto* configuration = std::get_if<Configuration>(&read)) {
+        reading.configuration = std::move(*configuration);
+    } else {
+        reading.problem = std::get<ConfigurationReader::Error>(read).text;
+    }
+    if (reading.configuration && reading.configuration->account) {
+        const auto& owner = *reading.configuration->account;
+        auto token = readToken(owner, reading.problem);
         if (token && knownSecrets_) {
             knownSecrets_->add(*token);
-            if (const auto header = platform::basicAuthorization(configuration->account->personId, *token)) {
+            if (const auto header = platform::basicAuthorization(owner.personId, *token)) {
                 knownSecrets_->add(header->substr(header->find(' ') + 1));
             }
         }
-        account = std::make_shared<OwnerAccount>(*configuration->account, std::move(token));
+        reading.account = std::make_shared<OwnerAccount>(owner, std::move(token));
     }
-    if (!problem.empty()) {
+    if (!reading.problem.empty()) {
         platform::areaLog(platform::LogArea::Account)
-            .write(platform::LogLevel::Error, "%@", platform::FormatArgument(problem).shown());
+            .write(platform::LogLevel::Error, "%@", platform::FormatArgument(reading.problem).shown());
     }
-    if (configuration != nullptr && configuration->account && configuration->account != this->configuration().account) {
-        sayEntriesForNobody(*configuration->account);
+    if (reading.account && reading.configuration->account != configuration().account) {
+        sayEntriesForNobody(*reading.configuration->account);
     }
     const std::lock_guard<std::mutex> lock(mutex_);
-    problem_ = problem;
-    isBroken_ = configuration == nullptr;
-    if (configuration == nullptr) {
+    next_ = std::move(reading);
+}
+
+bool ConfiguredAccountStore::take() {
+    const std::lock_guard<std::mutex> lock(mutex_);
+    if (!next_) {
         return false;
     }
-    const bool sameAccount = account && account_ ? *account == *account_ : account == account_;
-    const bool changed = !sameAccount || !(*configuration == configuration_);
-    configuration_ = std::move(*configuration);
+    const Reading reading = *std::exchange(next_, std::nullopt);
+    problem_ = reading.problem;
+    isBroken_ = !reading.configuration.has_value();
+    if (isBroken_) {
+        return false;
+    }
+    const bool sameAccount = reading.account && account_ ? *reading.account == *account_ : reading.account == account_;
+    const bool changed = !sameAccount || !(*reading.configuration == configuration_);
+    configuration_ = *reading.configuration;
     if (!sameAccount) {
-        account_ = std::move(account);
+        account_ = reading.account;
     }
     return changed;
 }

@@ -5,6 +5,7 @@
 #include <functional>
 #include <memory>
 #include <mutex>
+#include <optional>
 #include <string>
 
 #include "linux/configuration/Configuration.h"
@@ -14,7 +15,8 @@
 namespace ktr::linux_ {
 
 /// The account of the configuration file, with the app token from the Secret Service or from a private file. It answers
-/// from memory; `load` reads the disk and asks the bus.
+/// from memory; `read` reads the disk and asks the bus, and what it has read counts once it is taken: whoever makes a
+/// command finds the host that the token belongs to.
 class ConfiguredAccountStore : public platform::AccountStore {
   public:
     /// What is asked of the Secret Service, and for how long.
@@ -33,20 +35,22 @@ class ConfiguredAccountStore : public platform::AccountStore {
     ConfiguredAccountStore(const std::filesystem::path& configurationFile, Secrets secrets);
     ~ConfiguredAccountStore() override;
 
-    /// Who is told of each token that is read, before anybody gets it. Set before the first `load`.
+    /// Who is told of each token that is read, before anybody gets it. Set before the first `read`.
     void setKnownSecrets(std::shared_ptr<KnownSecrets> secrets) { knownSecrets_ = std::move(secrets); }
 
-    /// Reads configuration and token; true when anything differs from before. A file with an error leaves everything as
-    /// it was. Logs what is wrong, and keeps it for `problem`. Any thread, but for a keyring's sake not the main thread
+    /// Reads configuration and token, and logs what is wrong. Any thread, but for a keyring's sake not the main thread
     /// once a window is open.
-    bool load();
-    /// The program ends: what a `load` still waits for is not waited for any longer. Any thread.
+    void read();
+    /// What was read last counts from now on; true when anything differs from before. A file with an error leaves
+    /// everything as it was, but for `problem`. Main thread.
+    bool take();
+    /// The program ends: what a `read` still waits for is not waited for any longer. Any thread.
     void giveUp() { givesUp_ = true; }
-    /// The configuration last read. Any thread.
+    /// The configuration last taken. Any thread.
     Configuration configuration() const;
-    /// What was wrong at the last `load`, in one line; empty when nothing was. Any thread.
+    /// What was wrong with what was taken last, in one line; empty when nothing was. Any thread.
     std::string problem() const;
-    /// Whether the configuration itself could not be used at the last `load`, so that an earlier one counts. Any
+    /// Whether the configuration itself could not be used at the last `take`, so that an earlier one counts. Any
     /// thread.
     bool isBroken() const;
     std::filesystem::path configurationFile() const { return file_; }
@@ -57,6 +61,11 @@ class ConfiguredAccountStore : public platform::AccountStore {
 
   private:
     class OwnerAccount;
+    struct Reading {
+        std::optional<Configuration> configuration;
+        std::shared_ptr<OwnerAccount> account;
+        std::string problem;
+    };
     std::optional<std::string> readToken(const Configuration::Account& account, std::string& problem) const;
     static std::optional<std::string> askSecretService(const SecretQuestion& question, std::string& problem);
 
@@ -65,6 +74,7 @@ class ConfiguredAccountStore : public platform::AccountStore {
     std::atomic<bool> givesUp_ = false;
     std::shared_ptr<KnownSecrets> knownSecrets_;
     mutable std::mutex mutex_;
+    std::optional<Reading> next_;  ///< read, and not taken yet
     Configuration configuration_;
     std::shared_ptr<OwnerAccount> account_;
     std::string problem_;

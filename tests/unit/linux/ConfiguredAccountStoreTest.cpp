@@ -21,6 +21,11 @@ class ConfiguredAccountStoreTest : public PlatformTest {
                                           return secret;
                                       });
     }
+    /// Whether anything differs from before.
+    static bool load(ConfiguredAccountStore& store) {
+        store.read();
+        return store.take();
+    }
     std::string onlyError() {
         const auto errors = log->texts(platform::LogLevel::Error);
         EXPECT_EQ(errors.size(), 1U);
@@ -39,9 +44,26 @@ class ConfiguredAccountStoreTest : public PlatformTest {
 
 TEST_F(ConfiguredAccountStoreTest, NoFile_NobodyIsSignedIn) {
     auto signedIn = store();
-    EXPECT_FALSE(signedIn.load());
+    EXPECT_FALSE(load(signedIn));
     EXPECT_EQ(signedIn.deviceOwnerAccount(), nullptr);
     EXPECT_TRUE(asked.empty());
+}
+
+TEST_F(ConfiguredAccountStoreTest, WhatIsRead_CountsOnceItIsTaken) {
+    folder.write("config.json", R"({"account": {"personId": "7", "host": "a.example"}})");
+    secret = "token of a";
+    auto signedIn = store();
+    load(signedIn);
+    const auto before = signedIn.deviceOwnerAccount();
+    folder.write("config.json", R"({"account": {"personId": "7", "host": "b.example"}})");
+    signedIn.read();
+    // A command that is made now has the first host's token.
+    EXPECT_EQ(signedIn.configuration().account->host, "a.example");
+    EXPECT_EQ(signedIn.deviceOwnerAccount(), before);
+    EXPECT_TRUE(signedIn.take());
+    EXPECT_EQ(signedIn.configuration().account->host, "b.example");
+    EXPECT_EQ(signedIn.deviceOwnerAccount()->hostNameOfType(0), "b.example");
+    EXPECT_FALSE(signedIn.take()) << "nothing was read since";
 }
 
 TEST_F(ConfiguredAccountStoreTest, SecretService_GoesBeforeTheFile) {
@@ -49,8 +71,8 @@ TEST_F(ConfiguredAccountStoreTest, SecretService_GoesBeforeTheFile) {
     folder.write("token", "from the file\n");
     secret = "from the keyring";
     auto signedIn = store();
-    EXPECT_TRUE(signedIn.load());
-    EXPECT_FALSE(signedIn.load()) << "nothing changed";
+    EXPECT_TRUE(load(signedIn));
+    EXPECT_FALSE(load(signedIn)) << "nothing changed";
     const auto account = signedIn.deviceOwnerAccount();
     ASSERT_NE(account, nullptr);
     EXPECT_EQ(account->personIdentifier(), "7");
@@ -61,7 +83,7 @@ TEST_F(ConfiguredAccountStoreTest, SecretService_GoesBeforeTheFile) {
     EXPECT_EQ(account->tokenOfType(1), std::nullopt);
     EXPECT_EQ(asked.front(), "7 f.example");
     secret = std::nullopt;
-    EXPECT_TRUE(signedIn.load());
+    EXPECT_TRUE(load(signedIn));
     EXPECT_EQ(signedIn.deviceOwnerAccount()->tokenOfType(0), "from the file");
     EXPECT_EQ(account->tokenOfType(0), "from the keyring") << "what was handed out does not change";
 }
@@ -69,10 +91,12 @@ TEST_F(ConfiguredAccountStoreTest, SecretService_GoesBeforeTheFile) {
 TEST_F(ConfiguredAccountStoreTest, SecretService_IsWaitedForShortly_WhereAFileHasAToken) {
     folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example"}})");
     secret = "from the keyring";
-    store().load();
+    auto first = store();
+    load(first);
     EXPECT_EQ(seconds, linux_::Buses::kSecretAlone);
     folder.write("token", "from the file\n");
-    store().load();
+    auto second = store();
+    load(second);
     EXPECT_EQ(seconds, linux_::Buses::kSecretBesideAFile);
     EXPECT_LT(seconds, 5.0);
 }
@@ -91,14 +115,14 @@ TEST_F(ConfiguredAccountStoreTest, DomainsThatAllowNobody_AreSaidOnce_Readably) 
     };
     configure(R"(["co.uk", "127.0.0.1", "what is this"])");
     auto signedIn = store();
-    EXPECT_TRUE(signedIn.load());
+    EXPECT_TRUE(load(signedIn));
     EXPECT_EQ(said->texts(), (std::vector{line("co.uk"), line("what is this")}));
-    EXPECT_FALSE(signedIn.load());
+    EXPECT_FALSE(load(signedIn));
     EXPECT_EQ(said->texts().size(), 2U) << "nothing changed";
     configure(R"(["127.0.0.1"])");
-    EXPECT_TRUE(signedIn.load());
+    EXPECT_TRUE(load(signedIn));
     configure(R"(["org"])");
-    EXPECT_TRUE(signedIn.load());
+    EXPECT_TRUE(load(signedIn));
     EXPECT_EQ(said->texts().size(), 3U);
     EXPECT_EQ(said->texts().back(), line("org"));
 }
@@ -109,9 +133,9 @@ TEST_F(ConfiguredAccountStoreTest, TokenAndWhatIsSentOfIt_AreKnownAsSecrets) {
     const auto known = std::make_shared<linux_::KnownSecrets>();
     auto signedIn = store();
     signedIn.setKnownSecrets(known);
-    EXPECT_TRUE(signedIn.load());
+    EXPECT_TRUE(load(signedIn));
     secret = "second-t0ken";
-    EXPECT_TRUE(signedIn.load());
+    EXPECT_TRUE(load(signedIn));
     const auto header = *platform::basicAuthorization("7", "second-t0ken");
     EXPECT_EQ(known->without("first-t0ken second-t0ken " + header), "<hidden> <hidden> Basic <hidden>");
 }
@@ -120,7 +144,7 @@ TEST_F(ConfiguredAccountStoreTest, ConfigurationThatOthersMayWrite_IsRefusedWith
     folder.write("config.json", R"({"account": {"personId": "7", "host": "thief.example"}})", 0666);
     folder.write("token", "s3cret\n");
     auto signedIn = store();
-    EXPECT_FALSE(signedIn.load());
+    EXPECT_FALSE(load(signedIn));
     EXPECT_EQ(signedIn.deviceOwnerAccount(), nullptr);
     EXPECT_NE(onlyError().find("config.json: others may write it (mode 0666); forbid it with: chmod go-w"),
               std::string::npos);
@@ -130,7 +154,7 @@ TEST_F(ConfiguredAccountStoreTest, SecretWithItsLineEnd_IsTheTokenWithout) {
     folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example"}})");
     secret = "s3cret\n";
     auto signedIn = store();
-    EXPECT_TRUE(signedIn.load());
+    EXPECT_TRUE(load(signedIn));
     EXPECT_EQ(signedIn.deviceOwnerAccount()->tokenOfType(0), "s3cret");
     EXPECT_EQ(signedIn.problem(), "");
 }
@@ -140,7 +164,7 @@ TEST_F(ConfiguredAccountStoreTest, SecretThatNoHeaderCanHold_IsRefusedWithoutIts
     folder.write("token", "from the file\n");
     secret = "s3cret\nsecond";
     auto signedIn = store();
-    EXPECT_TRUE(signedIn.load());
+    EXPECT_TRUE(load(signedIn));
     EXPECT_EQ(signedIn.deviceOwnerAccount()->tokenOfType(0), std::nullopt);
     EXPECT_EQ(onlyError(), "the Secret Service's secret is refused: expected one line of at most 16 KiB");
 }
@@ -149,7 +173,7 @@ TEST_F(ConfiguredAccountStoreTest, NamedTokenFile_IsTheOnlySource) {
     folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example", "tokenFile": "t"}})");
     folder.write("t", "mine", 0644);
     auto signedIn = store();
-    EXPECT_TRUE(signedIn.load());
+    EXPECT_TRUE(load(signedIn));
     EXPECT_TRUE(asked.empty());
     EXPECT_EQ(signedIn.deviceOwnerAccount()->tokenOfType(0), std::nullopt);
     EXPECT_NE(signedIn.problem().find("mode 0644"), std::string::npos);
@@ -160,7 +184,7 @@ TEST_F(ConfiguredAccountStoreTest, NoTokenAnywhere_SaysWhereItLooked) {
     folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example"}})");
     secretProblem = "no bus";
     auto signedIn = store();
-    EXPECT_TRUE(signedIn.load());
+    EXPECT_TRUE(load(signedIn));
     EXPECT_NE(signedIn.deviceOwnerAccount(), nullptr);
     EXPECT_NE(onlyError().find("the Secret Service has none (no bus), and "), std::string::npos);
 }
@@ -169,9 +193,9 @@ TEST_F(ConfiguredAccountStoreTest, BrokenConfiguration_LeavesWhatWasRead) {
     folder.write("config.json", R"({"account": {"personId": "7", "host": "f.example"}})");
     secret = "s";
     auto signedIn = store();
-    EXPECT_TRUE(signedIn.load());
+    EXPECT_TRUE(load(signedIn));
     folder.write("config.json", R"({"account": )");
-    EXPECT_FALSE(signedIn.load());
+    EXPECT_FALSE(load(signedIn));
     EXPECT_EQ(signedIn.deviceOwnerAccount()->personIdentifier(), "7");
     EXPECT_NE(onlyError().find("config.json:1:"), std::string::npos);
 }
