@@ -1,6 +1,7 @@
 #include "server/http/HttpServer.h"
 
 #include <gtest/gtest.h>
+#include <sys/resource.h>
 
 #include <atomic>
 #include <chrono>
@@ -311,6 +312,43 @@ TEST_F(HttpServerTest, FloodOfOneAddress_LeavesRoomForAnother) {
         flood.back()->send("GET /flood HTTP/1.1\r\nHost: a\r\n");
     }
     EXPECT_NE(kept.get("/still").find("ok:/still"), std::string::npos) << "nobody else's connection gave way";
+}
+
+TEST_F(HttpServerTest, ThousandIdlePhones_AndTwoHundredThatDrip_AreAllAnsweredBesideOthers) {
+    rlimit limit{};
+    ASSERT_EQ(::getrlimit(RLIMIT_NOFILE, &limit), 0);
+    limit.rlim_cur = limit.rlim_max;
+    ASSERT_EQ(::setrlimit(RLIMIT_NOFILE, &limit), 0);
+    ASSERT_GE(limit.rlim_max, 4096U) << "too few descriptors for this test";
+    auto patient = setup();
+    // What is tested is that nobody is forgotten, not how quick this machine is.
+    patient.limits.idleTime = std::chrono::minutes(5);
+    patient.limits.headerTime = std::chrono::minutes(5);
+    HttpServer server(std::move(patient));
+    ASSERT_EQ(server.start(), "");
+    std::vector<std::unique_ptr<RawClient>> phones;
+    for (int i = 0; i < 1000; ++i) {
+        phones.push_back(std::make_unique<RawClient>(server.port(), "127.0.1." + std::to_string(1 + i % 10)));
+        ASSERT_NE(phones.back()->get("/first").find("ok:/first"), std::string::npos) << i;
+    }
+    std::vector<std::unique_ptr<RawClient>> dripping;
+    for (int i = 0; i < 200; ++i) {
+        dripping.push_back(std::make_unique<RawClient>(server.port(), "127.0.2." + std::to_string(1 + i % 4)));
+        dripping.back()->send("G");
+    }
+    const RawClient other(server.port());
+    for (int i = 0; i < 20; ++i) {
+        for (const auto& one : dripping) {
+            one->send(i == 0 ? "ET / HTTP/1.1\r\nX-Slow: " : "x");
+        }
+        EXPECT_NE(other.get("/now").find("ok:/now"), std::string::npos);
+    }
+    int answered = 0;
+    for (const auto& phone : phones) {
+        answered += phone->get("/again").find("ok:/again") != std::string::npos ? 1 : 0;
+    }
+    EXPECT_EQ(answered, 1000);
+    EXPECT_NE(server.numbers().find("ktr_service_connections 1201\n"), std::string::npos) << server.numbers();
 }
 
 }  // namespace ktr::test
