@@ -53,20 +53,23 @@ Value::Array PhoneAnswer::messages(const std::vector<PhoneFriend>& friends) {
     for (const PhoneFriend& one : friends) {
         if (one.withCard) {
             // Before the place: a phone that knows no card yet would show two letters.
-            Dictionary card{{"_type", "card"}, {"tid", one.name}, {"name", one.name}};
+            Dictionary card{{"_type", "card"}, {"tid", one.name}, {"name", one.title.empty() ? one.name : one.title}};
             if (!one.face.empty()) {
                 card.set("face", Base64::encode(one.face));
             }
             add(card);
         }
+        if (!one.seen) {
+            continue;
+        }
         Dictionary location{{"_type", "location"},
                             {"tid", one.name},
-                            {"lat", one.seen.latitude},
-                            {"lon", one.seen.longitude},
-                            {"tst", one.seen.time}};
-        if (one.seen.accuracy) {
+                            {"lat", one.seen->latitude},
+                            {"lon", one.seen->longitude},
+                            {"tst", one.seen->time}};
+        if (one.seen->accuracy) {
             // The apps read whole metres.
-            location.set("acc", static_cast<std::int64_t>(std::ceil(*one.seen.accuracy)));
+            location.set("acc", static_cast<std::int64_t>(std::ceil(*one.seen->accuracy)));
         }
         add(location);
     }

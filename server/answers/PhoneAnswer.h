@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -13,9 +14,10 @@ namespace ktr::server {
 /// A friend as a phone is told of them.
 struct PhoneFriend {
     std::string name;
-    Seen seen;
+    std::optional<Seen> seen;  ///< none: only the card, if there is one
     bool withCard = false;
-    std::string face = {};  ///< the bytes of a picture for the card; empty: none
+    std::string face = {};   ///< the bytes of a picture for the card; empty: none
+    std::string title = {};  ///< what the card calls them; empty: the name
 };
 
 /// Words the answer to an OwnTracks post: friends as an array of messages. A single message that the app does not

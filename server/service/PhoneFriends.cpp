@@ -1,11 +1,9 @@
 #include "server/service/PhoneFriends.h"
 
 #include <cmath>
-#include <map>
-#include <vector>
 
 #include "platform/base/Json.h"
-#include "server/answers/PhoneAnswer.h"
+#include "server/ingest/FixRules.h"
 #include "server/ingest/SealedText.h"
 
 namespace ktr::server {
@@ -21,6 +19,42 @@ std::int64_t postOf(const Report& report) {
 }
 
 }  // namespace
+
+std::string PhoneFriends::titleOf(const Person& person, std::int64_t now) {
+    Sharing sharing;
+    sharing.hidden = person.hidden;
+    sharing.latest = store_.present(now);
+    std::string viewers;
+    for (const auto& [viewer, grant] : store_.grantsOf(person.id)) {
+        sharing.grant = grant;
+        if (Visibility::isOpen(sharing, now)) {
+            viewers += (viewers.empty() ? "" : ", ") + viewer;
+        }
+    }
+    return person.name + ", seen by " + (viewers.empty() ? "nobody" : viewers);
+}
+
+void PhoneFriends::addOwn(const Device& device, const Report& report, std::int64_t now,
+                          std::vector<PhoneFriend>& friends, std::map<std::int64_t, SentCard>& told) {
+    const auto person = store_.person(device.person);
+    if (!person) {
+        return;
+    }
+    PhoneFriend own{person->name, std::nullopt};
+    // Apps show a friend who has a place: where it just said that it is. While hidden nothing goes back and forth.
+    if (!report.fixes.empty() && !person->hidden) {
+        if (const auto fix = FixRules::admit(report.fixes.back(), now).fix) {
+            own.seen = Seen{fix->latitude, fix->longitude, fix->accuracy, fix->time};
+        }
+    }
+    own.title = titleOf(*person, now);
+    const std::string hash = PhoneAnswer::cardHash(own.title, "");
+    own.withCard = PhoneAnswer::isCardDue(store_.sentCard(device.id, person->id), hash, now, postOf(report));
+    if (own.withCard) {
+        told[person->id] = {hash, now, postOf(report)};
+    }
+    friends.push_back(std::move(own));
+}
 
 std::string PhoneFriends::answer(const Device& device, const Report& report, std::int64_t now) {
     std::vector<PhoneFriend> friends;
@@ -48,6 +82,9 @@ std::string PhoneFriends::answer(const Device& device, const Report& report, std
         friend_.face = state->second.faceHash.empty() ? "" : store_.face(one.person).value_or("");
         faces += friend_.face.size();
         told[one.person] = {hash, now, postOf(report)};
+    }
+    if (device.shared) {
+        addOwn(device, report, now, friends, told);
     }
     std::string body = platform::writeJson(PhoneAnswer::messages(friends));
     if (report.sealed) {

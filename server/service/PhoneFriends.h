@@ -2,15 +2,19 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <map>
 #include <string>
+#include <vector>
 
+#include "server/answers/PhoneAnswer.h"
 #include "server/ingest/Report.h"
 #include "server/store/Store.h"
 
 namespace ktr::server {
 
 /// What a phone hears of its owner's friends when it posts: who is seen now, and the cards that it does not have yet.
-/// Any thread.
+/// The phone of a child, or one that several use, finds its own person among them, with a card that says by whom they
+/// are seen. Any thread.
 class PhoneFriends {
   public:
     /// Faces of one answer, bytes of pictures: it travels over a mobile network. Further ones come with the next.
@@ -23,6 +27,11 @@ class PhoneFriends {
     std::string answer(const Device& device, const Report& report, std::int64_t now);
 
   private:
+    /// "Ann, seen by Mara, Otto".
+    std::string titleOf(const Person& person, std::int64_t now);
+    void addOwn(const Device& device, const Report& report, std::int64_t now, std::vector<PhoneFriend>& friends,
+                std::map<std::int64_t, SentCard>& told);
+
     Store& store_;
 };
 

@@ -144,6 +144,8 @@ class Store {
     std::optional<std::string> face(std::int64_t person);
     /// By owner: the cards of all who share with a viewer, as this device has them.
     std::map<std::int64_t, CardState> cards(std::int64_t device, std::int64_t viewer);
+    /// What this phone was last told of who somebody is.
+    SentCard sentCard(std::int64_t device, std::int64_t owner);
     void noteCards(std::int64_t device, std::map<std::int64_t, SentCard> sent, Done done);
 
     static std::string normalisedHandle(std::string_view handle);

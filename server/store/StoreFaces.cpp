@@ -54,6 +54,12 @@ std::map<std::int64_t, CardState> Store::cards(std::int64_t device, std::int64_t
     return cards;
 }
 
+SentCard Store::sentCard(std::int64_t device, std::int64_t owner) {
+    const Reading reading(*this);
+    auto row = reading->statement("SELECT hash, sent, post FROM card WHERE device = $1 AND owner = $2");
+    return row.bind(device).bind(owner).next() ? SentCard{row.text(0), row.integer(1), row.integer(2)} : SentCard{};
+}
+
 void Store::noteCards(std::int64_t device, std::map<std::int64_t, SentCard> sent, Done done) {
     write(
         [device, all = std::move(sent)](Database& database) {

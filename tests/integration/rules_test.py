@@ -247,10 +247,39 @@ class RulesTest(unittest.TestCase):
         looks = self.service.command("looks", "Ann").splitlines()
         self.assertEqual([re.sub(r"^\S+ \d\d:00  ", "", line) for line in looks], ["Mara, asked", "Otto, carried along"])
         devices = self.service.command("devices", "Mara")
-        self.assertRegex(devices, r"^1  phone, since .*, never heard\n2  reader, since .*\n$")
-        self.service.command("revoke", "Mara", "--device", "2")
+        # In the order of seconds.
+        number = re.search(r"^(\d)  reader, since .*", devices, re.MULTILINE).group(1)
+        self.assertRegex(devices, r"(?m)^\d  phone, since .*, never heard$")
+        self.service.command("revoke", "Mara", "--device", number)
         self.assertEqual(mara.bytes("getlocations", handles=["ann@x.example"])[0], 401)
-        self.assertRegex(self.service.command("devices", "Mara"), r"2  reader, since .*, ended ")
+        self.assertRegex(self.service.command("devices", "Mara"), number + r"  reader, since .*, ended ")
+
+    def test_a_shared_phone_says_that_it_is_seen_and_by_whom(self):
+        for kind in ("android", "ios"):
+            child, other = self.phone(f"Kim{kind}", "--shared", kind=kind), self.phone(f"Ann{kind}", kind=kind)
+            for name in ("Otto", "Mara"):
+                self.service.add(name + kind)
+            self.service.command("share", child.user, f"Mara{kind}", "--until", "midnight")
+            self.service.command("share", child.user, f"Otto{kind}")
+            self.service.command("share", f"Otto{kind}", child.user)
+            if self.service.process is None:
+                self.service.start()
+            self.locate(child, ago=3)
+            own = child.contacts[f"owntracks/http/{child.user}"]
+            self.assertEqual(own.name, f"{child.user}, seen by Mara{kind}, Otto{kind}")
+            self.assertEqual(own.location["lat"], 50.2104)
+            self.locate(child, 50.3, ago=2)
+            self.assertEqual([one["_type"] for one in child.answers[-1]], ["location"], "a card comes once")
+            self.service.command("revoke", child.user, f"Otto{kind}")
+            self.locate(child, 50.3, ago=1)
+            self.assertEqual(own.name, f"{child.user}, seen by Mara{kind}")
+            self.service.command("hide", child.user)
+            self.locate(child, 50.4, ago=0)
+            self.assertEqual(own.name, f"{child.user}, seen by nobody")
+            self.assertEqual(own.location["lat"], 50.3)
+            self.locate(other)
+            self.assertEqual(other.answers[-1], [], "another phone is not marked")
+            self.assertEqual((child.lost, child.alerts), (0, []))
 
     def test_a_grant_without_an_end_asks(self):
         self.service.add("Ann")

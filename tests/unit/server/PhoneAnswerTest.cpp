@@ -22,10 +22,7 @@ class PhoneAnswerTest : public ::testing::Test {
     static PhoneFriend ann() {
         PhoneFriend ann;
         ann.name = "Ann";
-        ann.seen.latitude = 50.2;
-        ann.seen.longitude = -3.1;
-        ann.seen.accuracy = 12.2;
-        ann.seen.time = kNow;
+        ann.seen = Seen{50.2, -3.1, 12.2, kNow};
         return ann;
     }
     static std::string text(const std::vector<PhoneFriend>& friends) {
@@ -33,10 +30,19 @@ class PhoneAnswerTest : public ::testing::Test {
     }
 };
 
+TEST_F(PhoneAnswerTest, Card_CallsThemByTheirTitle_AndNeedsNoPlace) {
+    PhoneFriend own = ann();
+    own.seen = std::nullopt;
+    EXPECT_EQ(text({own}), "[]");
+    own.withCard = true;
+    own.title = "Ann, seen by Otto";
+    EXPECT_EQ(text({own}), R"([{"_type":"card","tid":"Ann","name":"Ann, seen by Otto"}])");
+}
+
 TEST_F(PhoneAnswerTest, Friend_IsAPlaceInWholeSecondsAndMetres) {
     EXPECT_EQ(text({ann()}), R"([{"_type":"location","tid":"Ann","lat":50.2,"lon":-3.1,"tst":1763760000,"acc":13}])");
     PhoneFriend unknown = ann();
-    unknown.seen.accuracy = std::nullopt;
+    unknown.seen->accuracy = std::nullopt;
     EXPECT_EQ(text({unknown}).find("acc"), std::string::npos);
     EXPECT_EQ(text({}), "[]");
 }
@@ -55,10 +61,10 @@ TEST_F(PhoneAnswerTest, WhatAPhoneWouldNotTake_IsLeftOut_AndCostsNothingElse) {
     const double nan = std::numeric_limits<double>::quiet_NaN();
     std::vector<PhoneFriend> friends(6, ann());
     friends[0].name = "";
-    friends[1].seen.time = 0;
-    friends[2].seen.latitude = 91.0;
-    friends[3].seen.longitude = nan;
-    friends[4].seen.latitude = nan;
+    friends[1].seen->time = 0;
+    friends[2].seen->latitude = 91.0;
+    friends[3].seen->longitude = nan;
+    friends[4].seen->latitude = nan;
     EXPECT_EQ(text(friends), text({ann()}));
 }
 
