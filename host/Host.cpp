@@ -314,7 +314,11 @@ void Host::answer(TurnView& view, const Scenario& answer) {
     turn->scenario = answer;
     turn->scenario.question = std::move(question);
     turn->isAnswered = true;
-    show(*turn);
+    if (!show(*turn)) {
+        platform::areaLog(platform::LogArea::Host)
+            .write(platform::LogLevel::Error, "the plugin draws no such answer: a %@",
+                   platform::FormatArgument(answer.kind).shown());
+    }
 }
 
 double Host::layOut(double width) {

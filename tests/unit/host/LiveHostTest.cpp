@@ -15,6 +15,7 @@
 #include "linux/configuration/ConfigurationReader.h"
 #include "linux/paint/QtCanvas.h"
 #include "tests/support/EnvironmentVariable.h"
+#include "tests/support/RecordingLogSink.h"
 #include "tests/support/ServiceDoubles.h"
 
 namespace ktr::test {
@@ -305,6 +306,18 @@ TEST_F(LiveHostTest, ChangedContacts_AreReadAgain) {
     write("Anna");
     ASSERT_TRUE(runUntil([&] { return nameOfAnn() == "Anna"; }));
     EXPECT_NE(turn->card()->controller(), before);
+}
+
+TEST_F(LiveHostTest, AnswerThatThePluginDoesNotDraw_IsSaid) {
+    const auto log = std::make_shared<RecordingLogSink>();
+    host->platform()->logSink = log;
+    const auto turn = host->addQuestion("Who am I?");
+    const auto read = host::ScenarioReader({0.0}, host::ScenarioReader::Clock::Present)
+                          .readText(R"({"sentence": "You.", "snippet": {"kind": "VAMirror"}})", "test");
+    host->answer(*turn, std::get<host::Scenario>(read));
+    EXPECT_NE(described().find("You."), std::string::npos);
+    EXPECT_EQ(log->texts(platform::LogLevel::Error),
+              std::vector<std::string>{"the plugin draws no such answer: a VAMirror"});
 }
 
 TEST_F(LiveHostTest, Restricted_MakesNoCardAndSaysSo) {

@@ -4,6 +4,9 @@
 #include <QFile>
 #include <QTemporaryDir>
 #include <chrono>
+#include <filesystem>
+
+#include <sys/stat.h>
 
 #include "tests/support/PlatformTest.h"
 #include "tests/support/maps/MbtilesWriter.h"
@@ -80,6 +83,22 @@ TEST_F(MbtilesLoaderTest, NoFile_OrNoDatabase_IsAnError) {
         error.clear();
         EXPECT_EQ(open(), nullptr);
         EXPECT_FALSE(error.empty());
+    }
+}
+
+// Opening a pipe waits for somebody who writes into it.
+TEST_F(MbtilesLoaderTest, PipeBesideTheFile_IsAnErrorNow) {
+    makeTown();
+    const std::string link = folder.filePath(QStringLiteral("link")).toStdString();
+    std::filesystem::create_symlink(path(), link);
+    for (const char* end : {"-journal", "-wal", "-shm"}) {
+        const std::string beside = path() + end;
+        ASSERT_EQ(::mkfifo(beside.c_str(), 0600), 0);
+        EXPECT_EQ(open(), nullptr);
+        EXPECT_TRUE(error.starts_with("not a file")) << error;
+        EXPECT_EQ(MbtilesLoader::open(link, error), nullptr);
+        std::filesystem::remove(beside);
+        EXPECT_NE(open(), nullptr);
     }
 }
 
