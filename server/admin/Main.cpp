@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "server/admin/Administration.h"
+#include "server/admin/FolderOwner.h"
 #include "server/admin/Help.h"
 #include "server/admin/RuleCommands.h"
 
@@ -91,6 +92,10 @@ int main(int count, char** words) {
 
     const auto now =
         std::chrono::duration_cast<std::chrono::seconds>(std::chrono::system_clock::now().time_since_epoch()).count();
+    if (const std::string complaint = ktr::server::becomeOwnerOf(folder); !complaint.empty()) {
+        std::cerr << "ktr-service: " << complaint << std::endl;
+        return EXIT_FAILURE;
+    }
     ktr::server::Administration administration(folder, now, std::cout);
     const auto revokes = [&] {
         return device != 0 ? administration.revokeDevice(name, device) : administration.revoke(name, other);

@@ -3,6 +3,7 @@
 
   operation_test.py SERVICE [unittest options]
 """
+import os
 import pathlib
 import re
 import shutil
@@ -170,6 +171,27 @@ class OperationTest(unittest.TestCase):
         for word in ("canary", "48.12", "11.65", "48,12", secret, reader, secret[:8], reader[:8], "x.example",
                      "192.0.2", "127.0.0.1", "id="):
             self.assertNotIn(word.lower(), written.lower())
+
+    @unittest.skipUnless(os.geteuid() == 0, "only an administrator can do what is tested")
+    def test_administrator_works_as_the_user_who_serves(self):
+        service, nobody = self.service, 65534
+        data = service.folder / "data"
+        for path in (data, *data.iterdir()):
+            os.chown(path, nobody, nobody)
+        # As behind systemd's /var/lib/private.
+        os.chmod(service.folder, 0o700)
+        secret = service.add("Ann")
+        service.command("check")
+        self.assertEqual({path.stat().st_uid for path in (data, *data.iterdir())}, {nobody}, "no file is another's")
+        service.start("--address", "127.0.0.1")
+        status = pathlib.Path(f"/proc/{service.process.pid}/status").read_text()
+        self.assertRegex(status, rf"Uid:\t{nobody}\t{nobody}\t{nobody}\t{nobody}\n")
+        self.assertRegex(status, r"CapEff:\t0+4\n")
+        self.assertEqual(service.post("Ann", secret, _type="location", lat=1, lon=2, tst=int(time.time()))[0], 200)
+        service.command("add", "Mara")
+        # What is the owner's no longer counts as trusted when it is somebody else's.
+        os.chown(data / "settings.json", nobody - 1, nobody - 1)
+        self.assertIn("belongs to another user", service.command("add", "Zoe", fails=True))
 
     def test_numbers_are_prometheus(self):
         service = self.service
