@@ -30,6 +30,7 @@ constexpr std::pair<const char*, const char*> kExamples[] = {
     {"hide", "hide Ann"},
     {"show", "show Ann"},
     {"link", "link Ann"},
+    {"face", "face Ann ann.jpg"},
     {"people", "people"},
     {"check", "check"},
     {"serve", "serve --socket /run/ktr-service/http.sock --socket-group www-data"},

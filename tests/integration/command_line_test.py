@@ -33,7 +33,7 @@ class CommandLineTest(unittest.TestCase):
             text = self.run_it(command, "--help").stdout
             with self.subTest(command):
                 match = re.search(r"Example: ktr-service (.*)", text)
-                self.assertTrue(match, text)
+                self.assertTrue(match, f"server/admin/Help.cpp has no example for it: {text}")
                 words = shlex.split(match.group(1).split(" > ")[0].replace("~", str(service.folder)))
                 self.assertEqual(words[0], command)
                 if command in ("init", "serve"):

@@ -81,7 +81,8 @@ TEST_P(StoreKeeping, EveryTable_IsNamedWithItsPeople) {
             continue;
         }
         // Whatever refers to a person goes with the person, and is known to.
-        auto row = database->statement(("PRAGMA foreign_key_list(" + std::string(table.name) + ")").c_str());
+        auto row = database->statement("SELECT * FROM pragma_foreign_key_list($1)");
+        row.bind(table.name);
         while (row.next()) {
             if (row.text(2) == "person") {
                 EXPECT_EQ(std::count(table.people.begin(), table.people.end(), row.text(3)), 1)
