@@ -19,9 +19,9 @@ constexpr std::string_view kSheet = R"css(
 --shadow:0 1px 2px rgba(70,52,26,.1),0 8px 24px -6px rgba(70,52,26,.1);--ring:2px}
 @media (prefers-color-scheme:dark){:root{--window:#1B1916;--card:#2E2A25;--cardEdge:#3B362F;--bubble:#2F4239;
 --highlight:#37443D;--ink:#F2ECE1;--inkSoft:#BFB5A7;--pine:#86CDB5;--onPine:#10251E;--fieldLine:#857D72;--warning:#FF9C8F;
---shadow:none}}
+--shadow:0 0 transparent}}
 @media (prefers-contrast:more){:root{--window:#FFF;--card:#FFF;--cardEdge:#000;--bubble:#FFF;--highlight:#FFF;--ink:#000;
---inkSoft:#2B2620;--pine:#0B4536;--fieldLine:#000;--warning:#7F150D;--separator:#000;--shadow:none;--ring:3px}}
+--inkSoft:#2B2620;--pine:#0B4536;--fieldLine:#000;--warning:#7F150D;--separator:#000;--shadow:0 0 transparent;--ring:3px}}
 @media (prefers-contrast:more) and (prefers-color-scheme:dark){:root{--window:#000;--card:#000;--cardEdge:#FFF;--bubble:#000;
 --highlight:#000;--ink:#FFF;--inkSoft:#E9E2D6;--pine:#B6F0DC;--onPine:#000;--fieldLine:#FFF;--warning:#FFC3BA;
 --separator:#FFF}}
@@ -42,7 +42,6 @@ h1{font-size:1.5rem;text-wrap:balance;padding:10px 15px 12px}
 .bar h1{font-size:1rem;padding:0 11px}
 h2,legend{font-size:.8125rem;font-weight:400;color:var(--inkSoft);padding:22px 15px 8px}
 .card{background:var(--card);border-radius:20px;box-shadow:var(--shadow),inset 0 0 0 1px var(--cardEdge);overflow:hidden}
-@media (prefers-color-scheme:dark){.card{box-shadow:inset 0 0 0 1px var(--cardEdge)}}
 .apart,.card+.card,form+.card,.card+form{margin-top:16px}
 .row{display:flex;align-items:center;gap:12px;width:100%;min-height:53px;padding:8px 15px;text-decoration:none;color:inherit;
 background:none;border:0;font:inherit;text-align:start;position:relative}

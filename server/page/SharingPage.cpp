@@ -31,12 +31,11 @@ void addSwitch(PageBuilder& page, bool hidden) {
     page.openForm("/me/visible");
     page.hiddenField("state", hidden ? "on" : "off");
     page.openCard();
-    page.html().open("button", {{"class", "row"},
-                                {"aria-label", language.text(hidden ? "SWITCH_OFF" : "SWITCH_ON", {label})},
-                                {"aria-describedby", "visible-hint"}});
-    page.html().open("span", {{"class", "grow"}}).leaf("span", {}, label);
-    page.html().leaf("span", {{"class", "soft"}, {"id", "visible-hint"}},
-                     language.text(hidden ? "VISIBLE_OFF" : "VISIBLE_ON"));
+    page.html().open("button", {{"class", "row"}}).open("span", {{"class", "grow"}});
+    // Who hears it hears the state; who sees it sees the switch.
+    page.html().leaf("span", {{"aria-hidden", "true"}}, label);
+    page.html().leaf("span", {{"class", "unseen"}}, language.text(hidden ? "SWITCH_OFF" : "SWITCH_ON", {label}));
+    page.html().leaf("span", {{"class", "soft"}}, language.text(hidden ? "VISIBLE_OFF" : "VISIBLE_ON"));
     page.html().close().leaf("span", {{"class", hidden ? "switch" : "switch on"}}, "");
     page.html().close().close().close();
 }
