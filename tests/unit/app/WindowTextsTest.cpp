@@ -14,7 +14,10 @@
 #include "app/window/StatusLine.h"
 #include "host/Host.h"
 #include "host/HostOptions.h"
+#include "host/scenario/ScenarioReader.h"
 #include "platform/base/Format.h"
+#include "platform/text/TextEngine.h"
+#include "platform/ui/Label.h"
 
 #include <gtest/gtest.h>
 
@@ -76,17 +79,38 @@ bool touchesItsEdge(const QImage& picture) {
 
 class KTRWindowTextsTest : public ::testing::Test {
   protected:
-    void open(const std::string& language, ContentSizeCategory size) {
+    void open(const std::string& language, ContentSizeCategory size,
+              const std::vector<host::Scenario>& scenarios = {}) {
         host = nullptr;
         host::HostOptions options;
         options.language = language;
         options.textSize = size;
-        const auto settings = host::HostSettings::decide(options, {}, {});
+        const auto settings = host::HostSettings::decide(options, scenarios, {});
         ASSERT_TRUE(std::holds_alternative<host::HostSettings>(settings));
         auto made =
             host::Host::make(std::get<host::HostSettings>(settings), host::Host::Time::Virtual, KTR_PLUGIN_FILE);
         ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made));
         host = std::move(std::get<std::unique_ptr<host::Host>>(made));
+    }
+    /// The texts below a view that the room of their labels cuts, but for those that are to give way, as names are.
+    void collectCut(const platform::View& view, std::vector<std::string>& cut) const {
+        for (const auto& child : view.presentedSubviews()) {
+            const auto label = std::dynamic_pointer_cast<platform::Label>(child);
+            const auto across = platform::LayoutAxis::Horizontal;
+            if (label && !label->hidden() && !label->text().empty() &&
+                label->contentCompressionResistancePriority(across) > platform::kDefaultHuggingPriority) {
+                platform::TextContainer container;
+                container.width = label->frame().width;
+                container.maximumLines = label->numberOfLines();
+                container.lineBreakMode = label->lineBreakMode();
+                const auto layout = host->platform()->textEngine->layOut(
+                    platform::AttributedString(label->text(), label->font()), container);
+                if (layout->isTruncated() || layout->usedSize().height > label->frame().height + 1.0) {
+                    cut.push_back(label->text());
+                }
+            }
+            collectCut(*child, cut);
+        }
     }
     Qt::LayoutDirection direction() const { return host->rightToLeft() ? Qt::RightToLeft : Qt::LeftToRight; }
 
@@ -153,6 +177,34 @@ TEST_F(KTRWindowTextsTest, HintThatFits_IsAsLargeAsWhatIsTyped) {
     field.resize(376, 60);
     field.grab();
     EXPECT_EQ(field.edit().hintFont(), field.edit().font());
+}
+
+TEST_F(KTRWindowTextsTest, Conversation_CutsNoTextOfItsOwn) {
+    int asked = 0;
+    for (const auto& entry : std::filesystem::directory_iterator(KTR_SOURCE_DIR "/resources/scenarios")) {
+        const std::string name = entry.path().filename().string();
+        // Places longer than any row, and a fence's sentence, which has one line however long its place is.
+        if (!name.ends_with(".json") || name == "long-names.json" || name.starts_with("fence-")) {
+            continue;
+        }
+        auto read = host::ScenarioReader({0.0}).readFile(entry.path());
+        ASSERT_TRUE(std::holds_alternative<host::Scenario>(read));
+        const auto& scenario = std::get<host::Scenario>(read);
+        for (const char* language : {"qps", "qps-plocm", "el", "hi"}) {
+            for (const double width : {320.0, 400.0}) {
+                open(language, ContentSizeCategory::L, {scenario});
+                ASSERT_FALSE(host->addTurn(scenario));
+                host->settle(width);
+                std::vector<std::string> cut;
+                collectCut(*host->window(), cut);
+                for (const std::string& text : cut) {
+                    ADD_FAILURE() << name << " in " << language << ", " << width << " wide: " << text;
+                }
+                ++asked;
+            }
+        }
+    }
+    EXPECT_GT(asked, 150);
 }
 
 }  // namespace ktr::app
