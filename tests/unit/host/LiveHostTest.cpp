@@ -9,6 +9,7 @@
 #include <algorithm>
 #include <filesystem>
 #include <fstream>
+#include <mutex>
 
 #include "host/Host.h"
 #include "host/scenario/ScenarioReader.h"
@@ -48,6 +49,7 @@ class LiveHostTest : public ::testing::Test {
         auto made = Host::make(settings, Host::Time::Running, KTR_PLUGIN_FILE);
         EXPECT_TRUE(std::holds_alternative<std::unique_ptr<Host>>(made)) << std::get<host::Failure>(made).line;
         host = std::move(std::get<std::unique_ptr<Host>>(made));
+        real = host->platform()->httpTransport;
         record();
         bool ready = false;
         host->live()->start([&] { ready = true; });
@@ -108,6 +110,8 @@ class LiveHostTest : public ::testing::Test {
     EnvironmentVariable state;
     std::shared_ptr<FakeHttpTransport> transport = std::make_shared<FakeHttpTransport>();
     std::unique_ptr<Host> host;
+    /// What the plugin would send through.
+    std::shared_ptr<platform::HttpTransport> real;
 };
 
 TEST_F(LiveHostTest, SharingCard_SendsOnItsTimers) {
@@ -125,6 +129,29 @@ TEST_F(LiveHostTest, WishThatIsSent_LeavesNothingOfTheSharingBefore) {
     run(500);
     EXPECT_EQ(shown(), 0U) << "neither timer of the earlier card";
     EXPECT_TRUE(view.expired());
+}
+
+// What a card had on its way, or still hands over, goes to nobody.
+TEST_F(LiveHostTest, WishThatIsSent_ClosesTheWayOfWhatShowsTheUser) {
+    const auto failureOfSharing = [this] {
+        platform::HttpRequest request;
+        request.path = "/qloxservice/friends/va/showHideLocation";
+        std::optional<platform::HttpFailure> failure;
+        std::mutex mutex;
+        real->send(request, [&](const platform::HttpAnswer& answer) {
+            const std::lock_guard<std::mutex> lock(mutex);
+            failure = answer.failure;
+        });
+        runUntil([&] {
+            const std::lock_guard<std::mutex> lock(mutex);
+            return failure.has_value();
+        });
+        return failure;
+    };
+    add(kSharing);
+    EXPECT_EQ(failureOfSharing(), platform::HttpFailure::BadRequest) << "it has no host, but is on its way";
+    host->endSharing();
+    EXPECT_EQ(failureOfSharing(), platform::HttpFailure::Cancelled);
 }
 
 TEST_F(LiveHostTest, NewerAnswerAboutSharing_EndsTheOneBefore) {
