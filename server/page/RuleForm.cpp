@@ -22,6 +22,9 @@ std::pair<std::optional<Grant>, const char*> RuleForm::read(const UrlQuery& form
     const WallClock clock(context.language.zone());
     if (until == "midnight") {
         grant.until = clock.endingOf("midnight", context.now);
+        if (!grant.until) {
+            return {std::nullopt, "TIME_WANTED"};  // never for ever instead
+        }
     } else if (until == "time") {
         const std::string time = field("time");
         const bool isKept = before && before->until && *before->until > context.now &&

@@ -124,7 +124,7 @@ class Store {
     // Browsers: a link signs in once, within 15 minutes; a browser stays signed in for 30 days. Secrets are kept as
     // hashes.
 
-    static constexpr std::int64_t kSignInLasts = 15 * 60;                    ///< seconds
+    static constexpr std::int64_t kSignInLasts = std::int64_t{15} * 60;      ///< seconds
     static constexpr std::int64_t kBrowserLasts = std::int64_t{30} * 86400;  ///< seconds
     bool addSignIn(std::int64_t person, std::string_view link, std::int64_t now);
     /// Spends the link, and signs a browser in that holds this secret from then on.

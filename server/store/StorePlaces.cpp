@@ -84,7 +84,7 @@ void Store::endOnArrival(Database& database, std::int64_t owner, const std::vect
         auto row = database.statement(
             "SELECT place.id, place.name, label, latitude, longitude, radius, said, viewer, since, shown_since "
             "FROM share JOIN place ON place.id = share.arrival JOIN person ON person.id = share.owner "
-            "WHERE share.owner = $1 AND hidden = 0 AND (until IS NULL OR until > $2)");
+            "WHERE share.owner = $1 AND arrival <> 0 AND hidden = 0 AND (until IS NULL OR until > $2)");
         row.bind(owner).bind(now);
         while (row.next()) {
             const NamedPlace place = placeOf(row, 0);
