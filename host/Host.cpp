@@ -64,7 +64,7 @@ void Host::followFiles() {
 }
 
 void Host::configurationChanged() {
-    live()->takeConfiguration();
+    const bool isMoreThanContacts = live()->takeConfiguration();
     HostSettings now = settings_;
     now.follow(live()->configuration());
     if (now.contacts != settings_.contacts) {
@@ -73,7 +73,9 @@ void Host::configurationChanged() {
         contactFiles_->reload();
         now.contacts = settings_.contacts;
     }
-    remakeOrSay(now, nullptr);
+    if (isMoreThanContacts) {
+        remakeOrSay(now, nullptr);
+    }
 }
 
 void Host::remakeOrSay(const HostSettings& settings, const Environment::Contacts* contacts) {

@@ -132,8 +132,11 @@ void LiveServices::drawConfiguredMaps(std::shared_ptr<linux_::ThreadedMapSource>
     maps_ = std::move(maps);
 }
 
-void LiveServices::takeConfiguration() {
-    configuration_ = accounts_->configuration();
+bool LiveServices::takeConfiguration() {
+    const auto before = std::exchange(configuration_, accounts_->configuration());
+    auto rest = configuration_;
+    rest.contacts = before.contacts;
+    return rest != before || accounts_->deviceOwnerAccount() != account_;
 }
 
 void LiveServices::configurationChanged() {

@@ -48,8 +48,8 @@ class LiveServices {
     /// Called when account, token, language, contacts or anything else has changed that a platform is asked only once:
     /// it wants another platform, with the configuration as it is now.
     void setOutdated(std::function<void()> outdated) { outdated_ = std::move(outdated); }
-    /// Takes over the configuration as it was read last.
-    void takeConfiguration();
+    /// Takes over the configuration as it was read last; whether anything but the list of contacts has changed.
+    bool takeConfiguration();
 
     /// Ends all commands under way.
     void cancelCommands() { lanes_->cancelAll(); }

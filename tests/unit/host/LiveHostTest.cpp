@@ -326,9 +326,12 @@ TEST_F(LiveHostTest, ChangedContacts_AreReadAgain) {
     EXPECT_EQ(nameOfAnn(), "");
     write("Ann");
     const auto turn = add(kFriends);
+    int remakes = 0;
+    host->setRemade([&] { ++remakes; });
     configure(R"({"account": {"personId": "1000", "host": "service.example"}, "positions": {"source": "none"},
                   "language": "en-GB", "contacts": ["cards.vcf"]})");
     ASSERT_TRUE(runUntil([&] { return nameOfAnn() == "Ann"; }));
+    EXPECT_EQ(remakes, 1) << "for another list of contacts the cards are made anew once";
     const auto before = turn->card()->controller();
     write("Anna");
     ASSERT_TRUE(runUntil([&] { return nameOfAnn() == "Anna"; }));
