@@ -7,7 +7,7 @@
 #include "model/PluginBundle.h"
 #include "platform/base/MainLoop.h"
 #include "platform/base/Platform.h"
-#include "platform/layout/LayoutConstraint.h"
+#include "platform/layout/PinnedEdges.h"
 #include "platform/map/MapLocationManager.h"
 #include "service/ContextValues.h"
 #include "service/KTRVAUtils.h"
@@ -88,10 +88,9 @@ void VAKTRBaseSnippetController::updateViewConstraints() {
     const auto pinned = view();
     if (const auto parent = pinned ? pinned->superview() : nullptr) {
         using platform::LayoutAttribute;
-        for (const auto edge :
-             {LayoutAttribute::Top, LayoutAttribute::Left, LayoutAttribute::Right, LayoutAttribute::Bottom}) {
-            pinned->anchor(edge).constraintEqualTo(parent->anchor(edge))->setActive(true);
-        }
+        platform::pinEdges(
+            *pinned, *parent,
+            {LayoutAttribute::Top, LayoutAttribute::Left, LayoutAttribute::Right, LayoutAttribute::Bottom});
     }
     HostSnippetViewController::updateViewConstraints();
 }

@@ -8,7 +8,8 @@
 #include "model/LogCategory.h"
 #include "platform/base/MainLoop.h"
 #include "platform/base/Platform.h"
-#include "platform/layout/LayoutConstraint.h"
+#include "platform/layout/ConstraintRule.h"
+#include "platform/layout/PinnedEdges.h"
 #include "platform/map/KTAnnotationView.h"
 #include "platform/map/MapsApplication.h"
 #include "service/KTRVAUtils.h"
@@ -93,12 +94,13 @@ void KTRDynVelaMapView::setupMap() {
 
 void KTRDynVelaMapView::setupConstraints(const platform::Size& size) {
     using platform::LayoutAttribute;
-    for (const auto edge :
-         {LayoutAttribute::Top, LayoutAttribute::Left, LayoutAttribute::Right, LayoutAttribute::Bottom}) {
-        mapView_->anchor(edge).constraintEqualTo(anchor(edge))->setActive(true);
-    }
-    widthAnchor().constraintEqualToConstant(size.width)->setActive(true);
-    heightAnchor().constraintEqualToConstant(size.height)->setActive(true);
+    platform::pinEdges(*mapView_, *this,
+                       {LayoutAttribute::Top, LayoutAttribute::Left, LayoutAttribute::Right, LayoutAttribute::Bottom});
+    const platform::ViewReference self(*this);
+    constexpr auto kEqual = platform::LayoutRelation::Equal;
+    addRules(std::vector<platform::ConstraintRule>{
+        {self, {}, {LayoutAttribute::Width, LayoutAttribute::None, kEqual, 0.0, size.width}},
+        {self, {}, {LayoutAttribute::Height, LayoutAttribute::None, kEqual, 0.0, size.height}}});
 }
 
 void KTRDynVelaMapView::setLocation(std::shared_ptr<KTRVALocation> location) {

@@ -4,7 +4,7 @@
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/base/MainLoop.h"
 #include "platform/base/Platform.h"
-#include "platform/layout/ConstraintRule.h"
+#include "platform/layout/PinnedEdges.h"
 #include "platform/text/TextEngine.h"
 #include "platform/ui/Device.h"
 
@@ -112,15 +112,9 @@ void KTRVelaBaseView::setupAvatar() {
     friendIconView_ = create<View>(&View::initWithFrame, Rect{0.0, 0.0, kAvatarDiameter, kAvatarDiameter});
     friendIconView_->setTranslatesAutoresizingMaskIntoConstraints(false);
     friendIconView_->addSubview(avatar);
-    const platform::ViewReference image(*avatar);
-    const platform::ViewReference icon(*friendIconView_);
-    std::vector<platform::ConstraintRule> edges;
-    edges.reserve(4);
-    for (const auto edge :
-         {LayoutAttribute::Top, LayoutAttribute::Bottom, LayoutAttribute::Leading, LayoutAttribute::Trailing}) {
-        edges.push_back({image, icon, {edge, edge}});
-    }
-    friendIconView_->addRules(edges);
+    platform::pinEdges(
+        *avatar, *friendIconView_,
+        {LayoutAttribute::Top, LayoutAttribute::Bottom, LayoutAttribute::Leading, LayoutAttribute::Trailing});
     addSubview(friendIconView_);
 }
 
