@@ -143,10 +143,10 @@ std::string AssistantAnswers::help() const {
            " leaves work\" or \"Hide my location\".";
 }
 
-Dictionary AssistantAnswers::sharingAnswer(SharingQuestion::Wish wish) const {
+Dictionary AssistantAnswers::sharingAnswer(SharingQuestion::Wish wish, const ServiceMoment& moment) const {
     SharingState& sharing = service_.sharing();
     if (wish != SharingQuestion::Wish::Know) {
-        sharing.wish(wish == SharingQuestion::Wish::Hide);
+        sharing.wish(wish == SharingQuestion::Wish::Hide, moment.wholeSeconds());
     }
     const bool hidden = sharing.now().hidden;
     const std::string state = hidden ? "Friends can\u2019t see where you are." : "Friends can see where you are.";
@@ -266,7 +266,7 @@ Dictionary AssistantAnswers::answer(const std::string& question, const ServiceMo
     const auto friends = friendsNamed(words);
     Dictionary answer;
     if (const auto wish = SharingQuestion::wishOf(words)) {
-        answer = sharingAnswer(*wish);
+        answer = sharingAnswer(*wish, moment);
     } else if (auto fence = fenceAnswer(words, friends, moment)) {
         answer = *fence;
     } else {

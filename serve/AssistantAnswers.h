@@ -23,7 +23,7 @@ class AssistantAnswers {
   private:
     std::vector<const ServedFriend*> friendsNamed(const QuestionWords& question) const;
     // Each gives a turn without its question.
-    platform::Dictionary sharingAnswer(SharingQuestion::Wish wish) const;
+    platform::Dictionary sharingAnswer(SharingQuestion::Wish wish, const ServiceMoment& moment) const;
     /// None when it is not asked for.
     std::optional<platform::Dictionary> fenceAnswer(const QuestionWords& question,
                                                     const std::vector<const ServedFriend*>& friends,

@@ -1,13 +1,10 @@
 #include "serve/DevelopmentCertificates.h"
 
-#include <openssl/rand.h>
-
-#include <array>
-
 #include "documents/AtomicFile.h"
 #include "documents/FileLock.h"
 #include "documents/FileTrust.h"
 #include "linux/configuration/TokenFile.h"
+#include "server/store/Secret.h"
 
 namespace ktr::serve {
 
@@ -21,20 +18,6 @@ std::optional<CertificateAuthority> makeAuthority() {
                                       "critical,permitted;DNS:localhost,permitted;IP:127.0.0.0/255.0.0.0,"
                                       "permitted;IP:0:0:0:0:0:0:0:1/FFFF:FFFF:FFFF:FFFF:FFFF:FFFF:FFFF:FFFF",
                                       30);
-}
-
-std::string makeToken() {
-    std::array<unsigned char, 24> bytes{};
-    if (RAND_bytes(bytes.data(), static_cast<int>(bytes.size())) != 1) {
-        return "";
-    }
-    constexpr char kDigits[] = "0123456789abcdef";
-    std::string token;
-    for (const unsigned char byte : bytes) {
-        token += kDigits[byte >> 4U];
-        token += kDigits[byte & 15U];
-    }
-    return token;
 }
 
 }  // namespace
@@ -80,7 +63,7 @@ std::variant<DevelopmentCertificates, std::string> DevelopmentCertificates::prep
     if (const auto& error = std::get<linux_::TokenFile::Error>(token); !error.missing) {
         return error.text;
     }
-    certificates.token_ = makeToken();
+    certificates.token_ = server::Secret::make().value_or("");
     if (certificates.token_.empty()) {
         return std::string("the system gives no random numbers for a token");
     }

@@ -2,6 +2,8 @@
 
 #include <atomic>
 #include <chrono>
+#include <functional>
+#include <memory>
 #include <mutex>
 #include <optional>
 
@@ -10,13 +12,14 @@
 #include "serve/AssistantAnswers.h"
 #include "server/answers/CommandRequest.h"
 #include "server/http/BasicCredentials.h"
-#include "server/http/HttpServer.h"
 #include "server/http/TlsContext.h"
+#include "server/service/Service.h"
 
 namespace ktr::serve {
 
 using platform::Dictionary;
 using platform::Value;
+using server::HttpHandler;
 using server::HttpReply;
 using server::HttpRequest;
 using server::HttpResponse;
@@ -30,16 +33,20 @@ constexpr std::size_t kMostClients = 1000;
 constexpr std::chrono::milliseconds kGrace{200};
 constexpr std::size_t kDeepBrackets = 1000000;
 
-/// One of the service's commands: the last part of its path, and who answers it.
-struct Command {
-    const char* name;
-    std::optional<Dictionary> (LocationService::*answer)(const Dictionary&, const ServiceMoment&, const Fault&,
-                                                         std::string&) const;
-    std::string path() const { return std::string(kCommands) + name; }
-};
+constexpr const char* kGetLocations = "getlocations";
+constexpr const char* kShowHide = "showHideLocation";
 
-constexpr Command kAllCommands[] = {{"getlocations", &LocationService::getLocations},
-                                    {"showHideLocation", &LocationService::showHideLocation}};
+/// A JSON object as a body, or none.
+std::optional<Dictionary> objectOf(const std::string& body) {
+    const auto document = documents::JsonReader::read(body);
+    const auto* value = std::get_if<Value>(&document);
+    return value == nullptr || value->dictionary() == nullptr ? std::nullopt : std::optional(*value->dictionary());
+}
+
+std::int64_t presentTime() {
+    return std::chrono::duration_cast<std::chrono::seconds>(std::chrono::system_clock::now().time_since_epoch())
+        .count();
+}
 
 std::string replaced(std::string text, const std::string& what, const std::string& with) {
     for (std::size_t at = text.find(what); at != std::string::npos; at = text.find(what, at + with.size())) {
@@ -75,40 +82,53 @@ class DevelopmentServer::Server {
   public:
     explicit Server(Setup setup)
         : setup_(std::move(setup)),
-          service_(setup_.friends),
-          assistant_(service_),
+          made_(setup_.friends, setup_.personId, setup_.token, presentTime()),
+          assistant_(made_),
           authorization_(server::BasicCredentials{setup_.personId, setup_.token}.header()),
-          tls_(server::TlsContext::make(setup_.certificate.certificate.get(), setup_.certificate.key.get())),
-          http_(httpSetup()) {}
+          tls_(server::TlsContext::make(setup_.certificate.certificate.get(), setup_.certificate.key.get())) {}
 
-    std::string start() { return tls_ ? http_.start() : "the service's certificate cannot be used"; }
-    void stop() { http_.stop(kGrace); }
-    int port() const { return http_.port(); }
+    std::string start() {
+        if (!tls_ || !made_.people().complaint().empty()) {
+            return tls_ ? made_.people().complaint() : "the service's certificate cannot be used";
+        }
+        service_ = std::make_unique<server::Service>(serviceSetup());
+        return service_->start();
+    }
+    void stop() {
+        if (service_) {
+            service_->stop(kGrace);
+        }
+    }
+    int port() const { return service_ ? service_->port() : 0; }
 
   private:
-    server::HttpServer::Setup httpSetup() {
-        server::HttpServer::Setup http;
-        http.port = setup_.port;
-        http.tls = tls_;
-        http.limits.connections = kMostClients;
-        http.limits.connectionsPerAddress = kMostClients;
-        http.handler = [this](HttpRequest request, const HttpReply& reply) { route(std::move(request), reply); };
-        return http;
+    server::Service::Setup serviceSetup() {
+        server::Service::Setup service;
+        service.http.port = setup_.port;
+        service.http.tls = tls_;
+        service.http.limits.connections = kMostClients;
+        service.http.limits.connectionsPerAddress = kMostClients;
+        service.store = made_.people().store();
+        service.now = presentTime;
+        service.around = [this](HttpRequest request, HttpReply reply, const HttpHandler& inner) {
+            route(std::move(request), std::move(reply), inner);
+        };
+        return service;
     }
 
-    void route(HttpRequest request, const HttpReply& reply) {
+    void route(HttpRequest request, HttpReply reply, const HttpHandler& inner) {
         if (!isForUs(request)) {
             return reply.send(server::refusal(421, "this service is for localhost alone"));
         }
         if (request.path == "/assistant") {
             return reply.send(ask(request));
         }
-        for (const Command& command : kAllCommands) {
-            if (request.method == "POST" && request.path == command.path()) {
-                return run(command, std::move(request), reply);
+        for (const char* command : {kGetLocations, kShowHide}) {
+            if (request.method == "POST" && request.path == std::string(kCommands) + command) {
+                return run({command, std::move(request), std::move(reply), inner});
             }
         }
-        reply.send(server::refusal(404, "there is no such path"));
+        inner(std::move(request), std::move(reply));
     }
 
     /// A web page that resolves its own name to loopback must not read the answers.
@@ -150,10 +170,8 @@ class DevelopmentServer::Server {
         if (const auto refused = server::refusalOfType(request)) {
             return *refused;
         }
-        const auto document = documents::JsonReader::read(request.body);
-        const auto* value = std::get_if<Value>(&document);
-        const auto* members = value != nullptr ? value->dictionary() : nullptr;
-        const auto* question = members != nullptr ? members->find("question") : nullptr;
+        const auto members = objectOf(request.body);
+        const auto* question = members ? members->find("question") : nullptr;
         if (question == nullptr || question->string() == nullptr) {
             return server::refusal(400, "expected a question: {\"question\": \"Where is Ann?\"}");
         }
@@ -175,58 +193,102 @@ class DevelopmentServer::Server {
         return refused ? refused : server::refusalOfCommand(request);
     }
 
-    void run(const Command& command, HttpRequest request, const HttpReply& reply) {
-        const int number = ++requests_;
-        const Fault fault = setup_.faults.faultFor(number);
-        if (fault.delaySeconds <= 0.0) {
-            return reply.send(answer(command, request, fault, number));
+    /// A command under way.
+    struct Call {
+        std::string command;
+        HttpRequest request;
+        HttpReply reply;
+        HttpHandler inner;  ///< the service that answers it
+        int number = 0;
+        Fault fault = {};
+    };
+
+    void run(Call call) {
+        call.number = ++requests_;
+        call.fault = setup_.faults.faultFor(call.number);
+        if (call.fault.delaySeconds <= 0.0) {
+            return answer(call);
         }
-        http_.later(fault.delaySeconds, [this, command, fault, number, reply, late = std::move(request)] {
-            reply.send(answer(command, late, fault, number));
-        });
+        service_->later(call.fault.delaySeconds, [this, call] { answer(call); });
     }
 
-    HttpResponse answer(const Command& command, const HttpRequest& request, const Fault& fault, int number) {
-        const std::string name = command.name;
+    void answer(const Call& call) {
+        const Fault& fault = call.fault;
         HttpResponse response;
         if (fault.cut == Fault::Cut::BeforeAnswer) {
-            report(number, name + ", reset");
+            report(call.number, call.command + ", reset");
             response.delivery.reset = true;
-            return response;
+            return call.reply.send(response);
         }
         if (!fault.redirect.empty()) {
             response.status = fault.redirectStatus;
-            response.headers.emplace_back("Location", locationOf(fault.redirect, command));
-            report(number, name + ", " + std::to_string(response.status) + ", redirected");
-            return response;
+            response.headers.emplace_back("Location", locationOf(fault.redirect, call.request.path));
+            report(call.number, call.command + ", " + std::to_string(response.status) + ", redirected");
+            return call.reply.send(response);
         }
-        const auto refused = refusal(request);
-        response = refused ? *refused : ordinaryAnswer(command, request, fault);
-        report(number, name + ", " + std::to_string(response.status));
-        if (!refused) {
+        if (const auto refused = refusal(call.request)) {
+            return finish(call, *refused);
+        }
+        if (fault.status >= 300) {
+            response = server::refusal(fault.status, "a fault that was asked for");
             spoil(fault, response);
+            return finish(call, response);
         }
+        afterPosts(call, [this, call] {
+            call.inner(call.request, HttpReply([this, call](std::optional<HttpResponse> given) {
+                           if (given) {
+                               finish(call, given->status == 200 ? completed(call, std::move(*given)) : *given);
+                           }
+                       }));
+        });
+    }
+
+    /// The phones of those who are asked for send where they are; then goes on.
+    void afterPosts(const Call& call, std::function<void()> then) {
+        const auto body = objectOf(call.request.body);
+        std::string complaint;
+        const auto asks =
+            body && call.command == kGetLocations ? server::LocationsRequest::read(*body, complaint) : std::nullopt;
+        const auto posts = asks ? made_.posts(asks->handles, now()) : std::vector<HttpRequest>();
+        if (posts.empty()) {
+            return then();
+        }
+        const auto under = std::make_shared<std::atomic<std::size_t>>(posts.size());
+        for (const HttpRequest& post : posts) {
+            call.inner(post, HttpReply([under, then](const std::optional<HttpResponse>&) {
+                           if (under->fetch_sub(1) == 1) {
+                               then();
+                           }
+                       }));
+        }
+    }
+
+    /// The service's answer, with what the friends file and the fault add to it.
+    HttpResponse completed(const Call& call, HttpResponse response) const {
+        auto answer = objectOf(response.body);
+        const auto request = objectOf(call.request.body);
+        if (answer && request) {
+            if (call.command == kGetLocations) {
+                made_.completeLocations(*answer, now(), call.fault);
+            } else {
+                made_.completeSharing(*answer, *request, now(), call.fault);
+            }
+            response =
+                HttpResponse::json(call.fault.status == 0 ? 200 : call.fault.status, platform::writeJson(*answer));
+        }
+        spoil(call.fault, response);
         return response;
     }
 
-    HttpResponse ordinaryAnswer(const Command& command, const HttpRequest& request, const Fault& fault) const {
-        const auto document = documents::JsonReader::read(request.body);
-        const auto* value = std::get_if<Value>(&document);
-        std::string complaint = "expected a JSON object as the body";
-        if (value != nullptr && value->dictionary() != nullptr) {
-            if (auto given = (service_.*command.answer)(*value->dictionary(), now(), fault, complaint)) {
-                const int status = fault.status == 0 ? 200 : fault.status;
-                return status < 300 ? HttpResponse::json(status, platform::writeJson(*given))
-                                    : server::refusal(status, "a fault that was asked for");
-            }
-        }
-        return server::refusal(400, complaint);
+    void finish(const Call& call, const HttpResponse& response) {
+        report(call.number, call.command + ", " + std::to_string(response.status));
+        call.reply.send(response);
     }
 
-    std::string locationOf(const std::string& redirect, const Command& command) const {
+    std::string locationOf(const std::string& redirect, const std::string& path) const {
         std::string location = replaced(redirect, "{origin}", "https://localhost:" + std::to_string(port()));
         location = replaced(std::move(location), "{port}", std::to_string(port()));
-        return replaced(std::move(location), "{path}", command.path());
+        return replaced(std::move(location), "{path}", path);
     }
 
     /// Gives an answer the body, and has it go the way, that the fault asks for.
@@ -242,14 +304,14 @@ class DevelopmentServer::Server {
     }
 
     Setup setup_;
-    LocationService service_;
+    LocationService made_;
     AssistantAnswers assistant_;
     std::string authorization_;
     std::chrono::steady_clock::time_point start_ = std::chrono::steady_clock::now();
     std::atomic<int> requests_ = 0;
     std::mutex reportMutex_;
     server::TlsContext::Context tls_;
-    server::HttpServer http_;
+    std::unique_ptr<server::Service> service_;  ///< from the start on
 };
 
 DevelopmentServer::DevelopmentServer(Setup setup) : server_(std::make_unique<Server>(std::move(setup))) {}

@@ -15,8 +15,6 @@ namespace {
 
 constexpr int kPartial = 416;
 constexpr int kNotReported = 411;
-/// How near to a requested place counts as being there, metres.
-constexpr double kAtPlace = 150.0;
 
 /// How near to a street's waypoint an address has that street, and to a town's that town, metres.
 constexpr double kInStreet = 75.0;
@@ -28,26 +26,32 @@ void setWhenPresent(Dictionary& dictionary, const char* name, const std::optiona
     }
 }
 
-Value locationOf(const Waypoint& place, double millisecondsSince1970) {
+/// What the place is called.
+void addWords(Dictionary& location, const Waypoint& place) {
     Dictionary address;
     setWhenPresent(address, "locality", place.city);
     setWhenPresent(address, "stateCode", place.stateCode);
-    Dictionary location{{"latitude", place.latitude},
-                        {"longitude", place.longitude},
-                        {"horizontalAccuracy", place.accuracy},
-                        {"timestamp", std::floor(millisecondsSince1970)}};
     setWhenPresent(location, "streetAddress", place.street);
     location.set("address", address.empty() ? Value() : Value(address));
     location.set("labels", place.label ? Value(Value::Array{Dictionary{{"label", *place.label}}}) : Value());
-    return location;
 }
 
-/// Whole centimetres, as decimal text.
-std::string metresText(double metres) {
-    return Value(std::round(metres * 100.0) / 100.0).description();
+Dictionary memberOf(const Dictionary& dictionary, const char* name) {
+    const Value* value = dictionary.find(name);
+    return value == nullptr || value->dictionary() == nullptr ? Dictionary() : *value->dictionary();
 }
 
 }  // namespace
+
+std::int64_t ServiceMoment::wholeSeconds() const {
+    return static_cast<std::int64_t>(std::floor(millisecondsSince1970 / 1000.0));
+}
+
+LocationService::LocationService(FriendsFile file, const std::string& personId, const std::string& token,
+                                 std::int64_t now)
+    : file_(std::move(file)),
+      people_(file_, personId, token, now),
+      sharing_(std::make_unique<SharingState>(people_.store(), people_.owner(), people_.reader())) {}
 
 double LocationService::distance(double latitude, double longitude, const Waypoint& place) {
     double metres = 0.0;
@@ -55,63 +59,106 @@ double LocationService::distance(double latitude, double longitude, const Waypoi
     return metres;
 }
 
-std::vector<LocationService::Asked> LocationService::friendsAskedFor(const std::vector<std::string>& handles) const {
-    std::vector<Asked> asked;
-    for (const std::string& handle : handles) {
-        const auto person = std::find_if(file_.friends.begin(), file_.friends.end(),
-                                         [&](const auto& one) { return one.answersTo(handle); });
-        if (person == file_.friends.end()) {
-            continue;
-        }
-        const auto before =
-            std::find_if(asked.begin(), asked.end(), [&](const Asked& one) { return one.person == &*person; });
-        if (before == asked.end()) {
-            asked.push_back({handle, &*person});
-        } else if (before->handle.find('@') == std::string::npos && handle.find('@') != std::string::npos) {
-            // One entry a friend; an e-mail address comes back as it was asked for, a phone number may not.
-            before->handle = handle;
-        }
-    }
-    return asked;
+const ServedFriend* LocationService::friendWith(const std::string& handle) const {
+    const auto person = std::find_if(file_.friends.begin(), file_.friends.end(),
+                                     [&](const ServedFriend& one) { return one.answersTo(handle); });
+    return person == file_.friends.end() ? nullptr : &*person;
 }
 
-std::optional<Dictionary> LocationService::getLocations(const Dictionary& request, const ServiceMoment& moment,
-                                                        const Fault& fault, std::string& complaint) const {
-    const auto asks = server::LocationsRequest::read(request, complaint);
-    if (!asks) {
+std::vector<server::HttpRequest> LocationService::posts(const std::vector<std::string>& handles,
+                                                        const ServiceMoment& moment) const {
+    std::vector<std::size_t> asked;
+    for (const std::string& handle : handles) {
+        if (const ServedFriend* person = friendWith(handle)) {
+            asked.push_back(static_cast<std::size_t>(person - file_.friends.data()));
+        }
+    }
+    std::sort(asked.begin(), asked.end());
+    asked.erase(std::unique(asked.begin(), asked.end()), asked.end());
+    std::vector<server::HttpRequest> posts;
+    for (const std::size_t number : asked) {
+        if (const auto place = file_.friends[number].placeAt(moment.seconds)) {
+            posts.push_back(people_.post(number, *place, moment.wholeSeconds()));
+        }
+    }
+    return posts;
+}
+
+std::optional<Dictionary> LocationService::entryOf(const std::string& handle, const Value* given,
+                                                   const ServiceMoment& moment, const Fault& fault) const {
+    const ServedFriend* person = friendWith(handle);
+    if (person == nullptr) {
         return std::nullopt;
     }
-    std::vector<Asked> asked = friendsAskedFor(asks->handles);
-    const int statusCode = fault.statusCode.value_or(200);
-    if (statusCode == kPartial) {
-        asked.resize((asked.size() + 1) / 2);
+    const bool faulty = fault.entryStatus && (fault.entry.empty() || person->answersTo(fault.entry));
+    if (given == nullptr && !faulty && !person->hidden) {
+        return std::nullopt;
     }
-
-    Dictionary locations;
-    Value::Array order;
-    for (const auto& [handle, person] : asked) {
-        const auto place = person->placeAt(moment.seconds);
-        const bool faulty = fault.entryStatus && (fault.entry.empty() || person->answersTo(fault.entry));
-        Dictionary entry{{"status", faulty ? *fault.entryStatus : person->hidden ? kNotReported : 200}};
-        entry.set("location", place ? locationOf(*place, moment.millisecondsSince1970) : Value());
-        if (place && asks->mine) {
-            entry.set("distanceInMeters", metresText(distance(asks->mine->latitude, asks->mine->longitude, *place)));
-        }
-        if (place && asks->wanted) {
-            entry.set("match", distance(asks->wanted->latitude, asks->wanted->longitude, *place) <= kAtPlace);
-        }
-        locations.set(handle, entry);
-        order.emplace_back(handle);
+    Dictionary entry =
+        given != nullptr ? *given->dictionary() : Dictionary{{"status", kNotReported}, {"location", Value()}};
+    if (faulty) {
+        entry.set("status", *fault.entryStatus);
     }
-    Dictionary context = serverContext(fault);
-    setWhenPresent(context, "clientId", asks->clientId);
-    return Dictionary{
-        {"statusCode", statusCode}, {"serverContext", context}, {"locations", locations}, {"emails", order}};
+    if (const auto place = person->placeAt(moment.seconds); place && given != nullptr) {
+        Dictionary location = memberOf(entry, "location");
+        addWords(location, *place);
+        entry.set("location", location);
+    }
+    return entry;
 }
 
-Dictionary LocationService::serverContext(const Fault& fault) const {
-    return {{"minCallbackIntervalInMS", std::round(fault.intervalSeconds.value_or(file_.intervalSeconds) * 1000.0)},
-            {"callbackTimeoutIntervalInMS", std::round(file_.timeoutSeconds * 1000.0)}};
+void LocationService::completeLocations(Dictionary& answer, const ServiceMoment& moment, const Fault& fault) const {
+    const Dictionary given = memberOf(answer, "locations");
+    const Value* listed = answer.find("emails");
+    Value::Array handles = listed == nullptr || listed->array() == nullptr ? Value::Array() : *listed->array();
+    if (fault.statusCode == kPartial) {
+        handles.resize((handles.size() + 1) / 2);
+    }
+    Dictionary locations;
+    for (const Value& handle : handles) {
+        if (const auto entry = entryOf(*handle.string(), given.find(*handle.string()), moment, fault)) {
+            locations.set(*handle.string(), *entry);
+        }
+    }
+    answer.set("locations", locations);
+    answer.set("emails", handles);
+    completeContext(answer, fault);
+}
+
+void LocationService::completeContext(Dictionary& answer, const Fault& fault) const {
+    if (fault.statusCode) {
+        answer.set("statusCode", *fault.statusCode);
+    }
+    Dictionary context = memberOf(answer, "serverContext");
+    context.set("minCallbackIntervalInMS", std::round(fault.intervalSeconds.value_or(file_.intervalSeconds) * 1000.0));
+    context.set("callbackTimeoutIntervalInMS", std::round(file_.timeoutSeconds * 1000.0));
+    answer.set("serverContext", context);
+}
+
+void LocationService::completeSharing(Dictionary& answer, const Dictionary& request, const ServiceMoment& moment,
+                                      const Fault& fault) const {
+    std::string complaint;
+    if (const auto asks = server::SharingRequest::read(request, complaint)) {
+        std::optional<SharingState::Position> position;
+        if (asks->place) {
+            position = SharingState::Position{asks->place->latitude, asks->place->longitude};
+            position->accuracy = asks->place->accuracy.value_or(position->accuracy);
+        }
+        sharing_->commanded(asks->hides, position);
+    }
+    Dictionary myInfo = memberOf(answer, "myInfo");
+    const Value* hidden = myInfo.find("hidden");
+    const auto position = sharing_->now().position;
+    if (hidden != nullptr && hidden->boolean() == false && position) {
+        Dictionary location{{"latitude", position->latitude},
+                            {"longitude", position->longitude},
+                            {"horizontalAccuracy", position->accuracy},
+                            {"timestamp", std::floor(moment.millisecondsSince1970)}};
+        addWords(location, placeAt(position->latitude, position->longitude));
+        myInfo.set("location", location);
+    }
+    answer.set("myInfo", myInfo);
+    completeContext(answer, fault);
 }
 
 Waypoint LocationService::placeAt(double latitude, double longitude) const {
@@ -137,37 +184,6 @@ Waypoint LocationService::placeAt(double latitude, double longitude) const {
         }
     }
     return place;
-}
-
-std::optional<Dictionary> LocationService::showHideLocation(const Dictionary& request, const ServiceMoment& moment,
-                                                            const Fault& fault, std::string& complaint) const {
-    const auto asks = server::SharingRequest::read(request, complaint);
-    if (!asks) {
-        return std::nullopt;
-    }
-    if (fault.status < 300) {
-        std::optional<SharingState::Position> position;
-        if (asks->place) {
-            position = SharingState::Position{asks->place->latitude, asks->place->longitude};
-            position->accuracy = asks->place->accuracy.value_or(position->accuracy);
-        }
-        sharing_->command(asks->hides, position);
-    }
-    const auto known = sharing_->now();
-    Dictionary myInfo;
-    if (!file_.user.emails.empty()) {
-        myInfo.set("preferredEmail", file_.user.emails.front());
-    }
-    myInfo.set("hidden", known.hidden);
-    Value location;
-    if (!known.hidden && known.position) {
-        Waypoint place = placeAt(known.position->latitude, known.position->longitude);
-        place.accuracy = known.position->accuracy;
-        location = locationOf(place, moment.millisecondsSince1970);
-    }
-    myInfo.set("location", location);
-    return Dictionary{
-        {"statusCode", fault.statusCode.value_or(200)}, {"serverContext", serverContext(fault)}, {"myInfo", myInfo}};
 }
 
 }  // namespace ktr::serve

@@ -3,24 +3,9 @@
 #include <algorithm>
 #include <cmath>
 
+#include "server/store/Store.h"
+
 namespace ktr::serve {
-
-namespace {
-
-std::string comparable(const std::string& handle) {
-    const bool email = handle.find('@') != std::string::npos;
-    std::string text;
-    for (const char c : handle) {
-        if (email) {
-            text += c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
-        } else if ((c >= '0' && c <= '9') || c == '+') {
-            text += c;
-        }
-    }
-    return text;
-}
-
-}  // namespace
 
 std::optional<Waypoint> ServedFriend::placeAt(double seconds) const {
     if (track.empty() || hidden || seconds < locatedAfter) {
@@ -56,8 +41,9 @@ ServedFriend FriendsFile::defaultUser() {
 }
 
 bool ServedFriend::answersTo(const std::string& handle) const {
-    const std::string wanted = comparable(handle);
-    const auto same = [&](const std::string& own) { return comparable(own) == wanted; };
+    using server::Store;
+    const std::string wanted = Store::normalisedHandle(handle);
+    const auto same = [&](const std::string& own) { return Store::normalisedHandle(own) == wanted; };
     return !wanted.empty() &&
            (std::any_of(emails.begin(), emails.end(), same) || std::any_of(phones.begin(), phones.end(), same));
 }

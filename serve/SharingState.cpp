@@ -3,21 +3,30 @@
 namespace ktr::serve {
 
 SharingState::Sharing SharingState::now() const {
+    const auto person = store_->person(person_);
     const std::lock_guard<std::mutex> lock(mutex_);
-    return sharing_;
+    // What is not known is hidden.
+    return {!person || person->hidden, position_};
 }
 
-void SharingState::wish(bool hidden) {
-    const std::lock_guard<std::mutex> lock(mutex_);
-    wishesToHide_ = hidden;
-    sharing_.hidden = hidden;
+void SharingState::wish(bool hidden, std::int64_t now) {
+    {
+        const std::lock_guard<std::mutex> lock(mutex_);
+        wishesToHide_ = hidden;
+    }
+    store_->setHidden(person_, hidden, now);
+    if (!hidden) {
+        store_->askToShare(reader_, nullptr);
+    }
 }
 
-void SharingState::command(bool hidden, const std::optional<Position>& position) {
+void SharingState::commanded(bool hides, const std::optional<Position>& position) {
     const std::lock_guard<std::mutex> lock(mutex_);
-    sharing_.hidden = hidden || wishesToHide_;
+    if (hides && !wishesToHide_) {
+        store_->askToShare(reader_, nullptr);
+    }
     if (position) {
-        sharing_.position = position;
+        position_ = position;
     }
 }
 

@@ -1,12 +1,16 @@
 #pragma once
 
+#include <cstdint>
+#include <memory>
 #include <mutex>
 #include <optional>
 
+#include "server/store/Store.h"
+
 namespace ktr::serve {
 
-/// Whether the friends of the development account's owner can see where that is, and where it was when a command last
-/// said so. Kept while the service runs. Any thread.
+/// Whether the friends of the development account's owner can see where that is, which the service's store knows, and
+/// where it was when a command last said so, which it does not. Any thread.
 class SharingState {
   public:
     struct Position {
@@ -19,16 +23,23 @@ class SharingState {
         std::optional<Position> position;
     };
 
+    /// Whose sharing it is, and with which reader commands come.
+    SharingState(std::shared_ptr<server::Store> store, std::int64_t person, std::int64_t reader)
+        : store_(std::move(store)), person_(person), reader_(reader) {}
+
     Sharing now() const;
-    /// What the user asked for.
-    void wish(bool hidden);
-    /// What a command says. One that shows may be an older answer that repeats itself, and does not undo a wish to be
-    /// hidden. Without a position the one before stays known.
-    void command(bool hidden, const std::optional<Position>& position);
+    /// What the user asked for. Returns when it holds.
+    void wish(bool hidden, std::int64_t now);
+    /// What a command said that the service obeyed. One that hides does not take back the user's wish to share: the
+    /// next one that shows, shows. Without a position the one before stays known.
+    void commanded(bool hides, const std::optional<Position>& position);
 
   private:
+    const std::shared_ptr<server::Store> store_;
+    const std::int64_t person_;
+    const std::int64_t reader_;
     mutable std::mutex mutex_;
-    Sharing sharing_;
+    std::optional<Position> position_;
     bool wishesToHide_ = false;
 };
 

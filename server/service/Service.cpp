@@ -53,6 +53,12 @@ HttpServer::Setup Service::httpSetup(Setup& setup) {
     http.handler = [this](const HttpRequest& request, const HttpReply& reply) {
         route(request, traffic_.watched(request, reply));
     };
+    if (setup.around) {
+        http.handler = [around = std::move(setup.around), service = std::move(http.handler)](HttpRequest request,
+                                                                                             HttpReply reply) {
+            around(std::move(request), std::move(reply), service);
+        };
+    }
     return http;
 }
 
@@ -64,11 +70,14 @@ std::string Service::start() {
     return failure;
 }
 
-void Service::stop() {
-    http_.stop();
+void Service::stop(std::chrono::milliseconds grace) {
+    http_.stop(grace);
     page_.reset();
-    // Its last commits still answer through the edge.
-    store_.reset();
+    // Its last commits still answer through the edge; and the store may be somebody else's, too.
+    if (store_) {
+        store_->finish();
+        store_.reset();
+    }
 }
 
 void Service::sweep() {
@@ -290,9 +299,12 @@ void Service::changeSharing(const Device& device, const Dictionary& body, const 
             ++counters_.storeFailures;
             return reply.send(refusal(503, "the store cannot be read"));
         }
-        const std::string handle = person->handles.empty() ? std::string() : person->handles.front();
+        // What is said to be an e-mail address is one.
+        const auto handle = std::find_if(person->handles.begin(), person->handles.end(),
+                                         [](const std::string& one) { return one.find('@') != std::string::npos; });
         reply.send(HttpResponse::json(
-            200, platform::writeJson(LocationAnswers::sharing(hides || person->hidden, handle, place, now_()))));
+            200, platform::writeJson(LocationAnswers::sharing(
+                     hides || person->hidden, handle == person->handles.end() ? "" : *handle, place, now_()))));
     };
     const auto written = [this, answer, reply, hides = request->hides](bool good) {
         if (!good) {

@@ -27,13 +27,16 @@ class Service {
   public:
     struct Setup {
         HttpServer::Setup http;  ///< its handler is not used
-        std::unique_ptr<Store> store;
+        std::shared_ptr<Store> store;
         /// The host names of its address, without a port; empty: any.
         std::vector<std::string> hosts;
         std::function<std::int64_t()> now;  ///< seconds since 1970
         /// Called about once a second, for as long as requests can be answered and the store answers; may be empty.
         std::function<void()> alive = {};
         std::shared_ptr<ServiceLog> log = {};  ///< none: nothing is written
+        /// Sees each request before the service does, and answers it or hands it on: for a service whose answers go
+        /// wrong on purpose. On the edge's threads; none: nobody does.
+        std::function<void(HttpRequest, HttpReply, const HttpHandler& service)> around = {};
     };
 
     explicit Service(Setup setup);
@@ -44,7 +47,9 @@ class Service {
 
     /// Empty when it answers, else what failed.
     std::string start();
-    void stop();
+    void stop(std::chrono::milliseconds grace = std::chrono::milliseconds(2000));
+    /// As the edge's.
+    void later(double seconds, std::function<void()> what) { http_.later(seconds, std::move(what)); }
     int port() const { return http_.port(); }
     const ServiceCounters& counters() const { return counters_; }
 
@@ -78,7 +83,7 @@ class Service {
     std::atomic<bool> storeIsWell_ = true;  ///< as the last sweep found it
     ServiceCounters counters_;
     FailureDelays delays_;
-    std::unique_ptr<Store> store_;
+    std::shared_ptr<Store> store_;
     HttpServer http_;
     std::unique_ptr<PeoplesPage> page_;
 };

@@ -62,6 +62,10 @@ void Store::write(std::function<void(Database&)> work, Done done) {
     wake_.notify_all();
 }
 
+void Store::finish() {
+    writeNow([](Database&) {});
+}
+
 bool Store::writeNow(const std::function<void(Database&)>& work) {
     std::promise<bool> written;
     write(work, [&](bool good) { written.set_value(good); });

@@ -39,6 +39,9 @@ class Store {
     Store(const Store&) = delete;
     Store& operator=(const Store&) = delete;
 
+    /// Returns when all that was to be written so far was, or failed, and those who wait for it have heard.
+    void finish();
+
     // Writing, later: `done` follows the commit.
 
     /// Keeps fixes of a person, each time once; nothing while the person hides. Also notes that the device was heard.

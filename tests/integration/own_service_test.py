@@ -191,6 +191,15 @@ class OwnServiceTest(unittest.TestCase):
         seen = self.ask("Mara", mara, "ann@x.example")[1]["locations"]["ann@x.example"]["location"]
         self.assertEqual(seen["latitude"], 52.0)
 
+    def test_a_phone_number_is_not_said_to_be_an_address(self):
+        self.command("add", "Ann", "--handle", "+44 1632 960001", "--handle", "ann@x.example")
+        self.command("add", "Otto", "--handle", "+44 1632 960002")
+        readers = {name: self.reader(name)[1] for name in ("Ann", "Otto")}
+        self.start()
+        preferred = {name: self.ask(name, secret, command="showHideLocation", prefs={"hideLocation": "No"})[1]["myInfo"].get(
+            "preferredEmail") for name, secret in readers.items()}
+        self.assertEqual(preferred, {"Ann": "ann@x.example", "Otto": None})
+
     def test_friends_come_back_to_the_phone(self):
         ann, otto = self.add("Ann"), self.add("Otto")
         self.command("friend", "Ann", "Otto")

@@ -24,7 +24,7 @@ class AssistantRequestsTest : public ::testing::Test {
              "track": [{"latitude": 51.6, "longitude": -2.6, "label": "Fish Market"}]},
             {"fullName": "Shirin", "firstName": "Shirin", "phones": "+44 1", "hidden": true}]})",
                                                    "f.json");
-        return LocationService(std::get<serve::FriendsFile>(read));
+        return {std::get<serve::FriendsFile>(read), "1000", "token", 1700000000};
     }
     platform::Dictionary answer(const std::string& question) const {
         return AssistantAnswers(service).answer(question, {0.0, 1.7e12});
@@ -90,7 +90,7 @@ TEST_F(AssistantRequestsTest, WithoutAPlace_WhereTheFriendIs) {
 
 TEST_F(AssistantRequestsTest, Here_IsWhereTheUserIs) {
     EXPECT_EQ(fence("Tell me when Ann gets here"), "-");
-    service.sharing().command(false, serve::SharingState::Position{51.51, -2.51});
+    service.sharing().commanded(false, serve::SharingState::Position{51.51, -2.51});
     EXPECT_EQ(fence("Tell me when Ann gets here"), "OnArrival none Salt Lane 51.51");
 }
 
@@ -126,7 +126,7 @@ TEST_F(AssistantRequestsTest, Hiding) {
          {"Hide my location", "hide me", "Please stop sharing my location", "Don't share where I am",
           "Don\xE2\x80\x99t let my friends see me", "Make me invisible", "Can you hide my location?",
           "Hide my location from Ann", "Stop showing my location", "Never share my location"}) {
-        service.sharing().wish(false);
+        service.sharing().wish(false, 1700000000);
         EXPECT_EQ(sharing(question), "hidden hidden") << question;
     }
 }
@@ -136,7 +136,7 @@ TEST_F(AssistantRequestsTest, Showing) {
          {"Share my location", "Show my location", "show my position to my friends", "Let my friends see me",
           "Stop hiding me", "Unhide me", "Make me visible", "share my location with Ann and Otto",
           "Could you share where I am?", "Let everybody see where I am"}) {
-        service.sharing().wish(true);
+        service.sharing().wish(true, 1700000000);
         EXPECT_EQ(sharing(question), "seen seen") << question;
     }
 }
@@ -144,15 +144,15 @@ TEST_F(AssistantRequestsTest, Showing) {
 TEST_F(AssistantRequestsTest, AskingChangesNothing) {
     for (const char* question : {"Am I hidden?", "Can my friends see me?", "Is my location shared?", "Who can see me?",
                                  "Do my friends see where I am?", "Am I sharing my location?"}) {
-        service.sharing().wish(true);
+        service.sharing().wish(true, 1700000000);
         EXPECT_EQ(sharing(question), "hidden hidden") << question;
-        service.sharing().wish(false);
+        service.sharing().wish(false, 1700000000);
         EXPECT_EQ(sharing(question), "seen seen") << question;
     }
 }
 
 TEST_F(AssistantRequestsTest, WhatIsInDoubt_ShowsNobody) {
-    service.sharing().wish(true);
+    service.sharing().wish(true, 1700000000);
     for (const char* question : {"Show me where I am", "Where am I?", "Show me my friends", "Is Ann sharing with me?",
                                  "Where is Ann hiding?", "Share a joke", "Find me a restaurant", "Show me Ann"}) {
         EXPECT_EQ(sharing(question), "- hidden") << question;

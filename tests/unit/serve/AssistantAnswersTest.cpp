@@ -16,11 +16,12 @@ using serve::LocationService;
 
 class AssistantAnswersTest : public ::testing::Test {
   protected:
+    static LocationService of(const serve::FriendsFile& file) { return {file, "1000", "token", 1700000000}; }
     static LocationService demoPeople() {
         auto read = serve::FriendsReader::readFile(KTR_SOURCE_DIR "/resources/service/friends.json");
         auto* file = std::get_if<serve::FriendsFile>(&read);
         EXPECT_NE(file, nullptr);
-        return LocationService(file != nullptr ? *file : serve::FriendsFile());
+        return of(file != nullptr ? *file : serve::FriendsFile());
     }
     platform::Dictionary answer(const std::string& question) const {
         return AssistantAnswers(service).answer(question, {0.0, 1.7e12});
@@ -71,7 +72,7 @@ TEST_F(AssistantAnswersTest, PeopleOfAScenario_MayHaveNoHandleAndNoName) {
         {"latitude": 1, "longitude": 2}, {"friend": {"object": {"firstName": "Zed"}}}]}})",
                                                      "s.json");
     ASSERT_TRUE(std::holds_alternative<serve::FriendsFile>(read));
-    const LocationService unnamed(std::get<serve::FriendsFile>(read));
+    const LocationService unnamed = of(std::get<serve::FriendsFile>(read));
     const AssistantAnswers assistant(unnamed);
     const auto sentence = [&](const char* question) {
         return *assistant.answer(question, {0.0, 1.7e12}).find("sentence")->string();
@@ -100,7 +101,7 @@ TEST_F(AssistantAnswersTest, PreferredEmail_ArrivesAsItIsWhateverItsCharacters) 
     for (const char* email : {"mara.lind@harbour.example", "a&b=c d+%41@x.example", "\xC3\xBC@x.example"}) {
         serve::FriendsFile file;
         file.user.emails = {email};
-        service = LocationService(file);
+        service = of(file);
         const auto drawn = host::ScenarioReader(platform::Date{0.0})
                                .readText(platform::writeJson(answer("Share my location")), "answer");
         const auto* scenario = std::get_if<host::Scenario>(&drawn);

@@ -136,6 +136,15 @@ TEST_P(StoreBasics, WholeFile_IsFoundWhole) {
     EXPECT_EQ(store_->check(), "");
 }
 
+TEST_P(StoreBasics, Finish_ReturnsWhenAllWhoWaitedHaveHeard) {
+    std::atomic<int> heard = 0;
+    for (int i = 0; i < 700; ++i) {
+        store_->keep(phone_, ann_, {at(kNow - i)}, kNow, [&](bool good) { heard += good ? 1 : 0; });
+    }
+    store_->finish();
+    EXPECT_EQ(heard, 700);
+}
+
 TEST_P(StoreBasics, WhatOneCannotWrite_RefusesNoneOfTheOthers) {
     // In one batch: the writing thread is busy with the first of them.
     std::promise<void> go;

@@ -1,0 +1,90 @@
+#include "serve/MadeUpPeople.h"
+
+#include <algorithm>
+
+#include "platform/base/Json.h"
+#include "server/http/BasicCredentials.h"
+#include "server/store/Secret.h"
+
+namespace ktr::serve {
+
+using server::DeviceKind;
+using server::Store;
+
+namespace {
+
+/// A name that nobody in a friends file needs: several may be called alike, or not at all.
+std::string nameOf(std::size_t number) {
+    return "friend-" + std::to_string(number);
+}
+
+}  // namespace
+
+MadeUpPeople::MadeUpPeople(const FriendsFile& file, const std::string& personId, const std::string& token,
+                           std::int64_t now)
+    : store_(Store::open(server::StoreAddress::inMemory(), true, complaint_)) {
+    if (store_ && !make(file, personId, token, now)) {
+        complaint_ = "the people cannot be made";
+    }
+}
+
+bool MadeUpPeople::make(const FriendsFile& file, const std::string& personId, const std::string& token,
+                        std::int64_t now) {
+    std::vector<std::int64_t> friends;
+    for (const ServedFriend& person : file.friends) {
+        const std::string name = nameOf(secrets_.size());
+        const auto secret = server::Secret::make();
+        if (!secret || !add(name, person, now)) {
+            return false;
+        }
+        friends.push_back(store_->personNamed(name)->id);
+        secrets_.push_back(*secret);
+        if (!store_->addDevice(friends.back(), DeviceKind::Phone, *secret, "", now)) {
+            return false;
+        }
+    }
+    if (!add(personId, file.user, now)) {
+        return false;
+    }
+    owner_ = store_->personNamed(personId)->id;
+    bool failed = !store_->addDevice(owner_, DeviceKind::Reader, token, "", now);
+    const auto reader = store_->deviceOf(token, failed);
+    reader_ = reader ? reader->id : 0;
+    return reader && std::all_of(friends.begin(), friends.end(), [&](std::int64_t person) {
+               return store_->grant(person, owner_, {server::Precision::Exact, now, std::nullopt});
+           });
+}
+
+bool MadeUpPeople::add(const std::string& name, const ServedFriend& person, std::int64_t now) {
+    std::vector<std::string> handles;
+    std::vector<std::string> taken;
+    for (const auto* list : {&person.emails, &person.phones}) {
+        for (const std::string& handle : *list) {
+            const std::string plain = Store::normalisedHandle(handle);
+            const bool isNew = std::find(taken.begin(), taken.end(), plain) == taken.end();
+            if (!plain.empty() && isNew && !store_->personOf(handle)) {
+                handles.push_back(handle);
+                taken.push_back(plain);
+            }
+        }
+    }
+    return store_->addPerson(name, handles, now);
+}
+
+server::HttpRequest MadeUpPeople::post(std::size_t number, const Waypoint& place, std::int64_t now) const {
+    server::HttpRequest request;
+    request.method = "POST";
+    request.path = "/pub";
+    request.headers = {{"Authorization", server::BasicCredentials{nameOf(number), secrets_.at(number)}.header()},
+                       {"Content-Type", "application/json; charset=utf-8"}};
+    request.body = platform::writeJson(platform::Dictionary{{"_type", "location"},
+                                                            {"tid", "me"},
+                                                            {"t", "u"},
+                                                            {"lat", place.latitude},
+                                                            {"lon", place.longitude},
+                                                            {"acc", place.accuracy},
+                                                            {"tst", now}});
+    return request;
+}
+
+}  // namespace ktr::serve

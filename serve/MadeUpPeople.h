@@ -1,0 +1,42 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "serve/ServedFriend.h"
+#include "server/http/HttpRequest.h"
+#include "server/store/Store.h"
+
+namespace ktr::serve {
+
+/// The people of a friends file as people of a service of one's own that is kept in memory. Each has a phone, and
+/// shares exactly with the account's owner, who has a reader. Where the file gives a handle to several, the first one
+/// has it. Any thread.
+class MadeUpPeople {
+  public:
+    /// The owner's name there is the account's person identifier; the reader's secret is its token.
+    MadeUpPeople(const FriendsFile& file, const std::string& personId, const std::string& token, std::int64_t now);
+
+    /// Empty, or why there are none.
+    const std::string& complaint() const { return complaint_; }
+    const std::shared_ptr<server::Store>& store() const { return store_; }
+    std::int64_t owner() const { return owner_; }
+    std::int64_t reader() const { return reader_; }
+
+    /// What the phone of the file's friend of this number sends from a place, as it reaches the service.
+    server::HttpRequest post(std::size_t number, const Waypoint& place, std::int64_t now) const;
+
+  private:
+    bool add(const std::string& name, const ServedFriend& person, std::int64_t now);
+    bool make(const FriendsFile& file, const std::string& personId, const std::string& token, std::int64_t now);
+
+    std::shared_ptr<server::Store> store_;
+    std::string complaint_;
+    std::vector<std::string> secrets_;  ///< of the phones, in the file's order
+    std::int64_t owner_ = 0;
+    std::int64_t reader_ = 0;
+};
+
+}  // namespace ktr::serve
