@@ -12,7 +12,7 @@ constexpr double kStroke = 2.0;
 constexpr int kFrame = 16;  // milliseconds
 
 QColor between(const QColor& from, const QColor& to, double share) {
-    const auto mix = [share](int a, int b) { return static_cast<int>(a + (b - a) * share + 0.5); };
+    const auto mix = [share](int a, int b) { return qRound(a + (b - a) * share); };
     return {mix(from.red(), to.red()), mix(from.green(), to.green()), mix(from.blue(), to.blue())};
 }
 
