@@ -28,12 +28,15 @@ constexpr qsizetype kShapedAhead = 64;
 
 /// Qt reads a word to its end for each line that it breaks it into: a word of a hundred thousand letters would take
 /// seconds. Words beyond this are nobody's; the text that has one breaks anywhere.
-bool hasEndlessWord(QStringView text) {
+bool hasEndlessWord(const QString& text) {
     constexpr qsizetype kLongest = 1000;
     constexpr char16_t kFirstIdeographic = 0x2E80;
     qsizetype length = 0;
-    for (const QChar c : text) {
-        length = c.isSpace() || (c.unicode() >= kFirstIdeographic && !c.isSurrogate()) ? 0 : length + 1;
+    for (qsizetype i = 0; i < text.size(); ++i) {
+        const QChar c = text[i];
+        const bool isIdeographic = c.unicode() >= kFirstIdeographic && !c.isSurrogate();
+        const bool begins = c.isSpace() || (isIdeographic && !JapanesePhrases::isBoundToBefore(text, i));
+        length = begins ? 0 : length + 1;
         if (length > kLongest) {
             return true;
         }

@@ -1,6 +1,8 @@
 #include <gmock/gmock.h>
 
+#include <chrono>
 #include <cmath>
+#include <string>
 
 #include "platform/text/TextImage.h"
 #include "tests/contract/TextEngineContract.h"
@@ -157,6 +159,18 @@ TEST_P(TextEngineContract, NoLineBeginsWithAMarkOfJapanese) {
 TEST_P(TextEngineContract, LineOfMarksAlone_IsFilled) {
     const auto layout = layOut("あーーーーーーーーーーーーーーーーーーー", wrapped(10.0 * body().size));
     EXPECT_EQ(layout->lines().size(), 2U);
+}
+
+TEST_P(TextEngineContract, MarksWithoutEnd_AreBrokenLikeLetters) {
+    std::string marks;
+    for (int i = 0; i < 300000; ++i) {
+        marks += "。";
+    }
+    const auto begin = std::chrono::steady_clock::now();
+    const auto layout = layOut(marks, wrapped(20.0 * body().size));
+    EXPECT_GE(layout->lines().size(), 15000U);
+    // Half a second; it is minutes when each line reads all the rest.
+    EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::seconds(60));
 }
 
 TEST_P(TextEngineContract, LineFeed_BeginsALine) {

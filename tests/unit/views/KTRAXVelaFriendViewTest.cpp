@@ -1,6 +1,7 @@
 #include "views/accessibility/KTRAXVelaFriendView.h"
 
 #include <algorithm>
+#include <limits>
 
 #include "platform/ui/Window.h"
 #include "tests/support/BackgroundLoop.h"
@@ -274,7 +275,7 @@ TEST_F(KTRAXVelaFriendViewTest, Image_FlowsAroundTheAvatarAndHasNoLimitOfLines) 
 }
 
 TEST_F(KTRAXVelaFriendViewTest, Width_OfNothing_WaitsForTheFirstLayout) {
-    for (const double width : {0.0, 30.0, -5.0}) {
+    for (const double width : {0.0, 30.0, -5.0, std::numeric_limits<double>::quiet_NaN()}) {
         const auto row = rowFor(ann(), width);
         time->runPosted();
         EXPECT_EQ(row->imageView()->image(), nullptr) << width;
