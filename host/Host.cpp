@@ -113,6 +113,8 @@ Host::~Host() {
         QCoreApplication::sendPostedEvents();
     }
     plugin_.reset();
+    // What cannot be kept is said while there is a log.
+    platform()->preferences.reset();
     if (Platform::installed() == platform()) {
         Platform::install(nullptr);
     }

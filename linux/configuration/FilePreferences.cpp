@@ -104,14 +104,18 @@ void FilePreferences::work() {
         queue_.pop_front();
         busy_ = true;
         lock.unlock();
-        bringToDisk(domain);
+        const bool isDone = bringToDisk(domain);
         lock.lock();
+        if (!isDone && ending_) {
+            // Whoever held the lock that long holds it still: the end waits once.
+            std::erase(queue_, domain);
+        }
         busy_ = false;
         idle_.notify_all();
     }
 }
 
-void FilePreferences::bringToDisk(const std::string& name) {
+bool FilePreferences::bringToDisk(const std::string& name) {
     PreferencesFile::Changes changes;
     {
         const std::lock_guard<std::mutex> lock(mutex_);
@@ -120,7 +124,7 @@ void FilePreferences::bringToDisk(const std::string& name) {
     auto merged = PreferencesFile::merge(fileOf(name), changes);
     if (const auto* error = std::get_if<PreferencesFile::Error>(&merged)) {
         logFailure(error->text);
-        return;
+        return false;
     }
     const std::lock_guard<std::mutex> lock(mutex_);
     Domain& domain = domainNamed(name);
@@ -132,6 +136,7 @@ void FilePreferences::bringToDisk(const std::string& name) {
             domain.changes.erase(now);
         }
     }
+    return true;
 }
 
 }  // namespace ktr::linux_

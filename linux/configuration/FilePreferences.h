@@ -14,9 +14,8 @@
 namespace ktr::linux_ {
 
 /// Preferences in one file a domain, "DOMAIN.json" in a folder. The disk is the business of a thread of its own; what
-/// `synchronize` asked for is done before the destructor returns. A domain whose name is no file name ("", "..", one
-/// with
-/// "/") lives in memory alone. A domain that nobody loaded is read on first use, by whoever uses it.
+/// `synchronize` asked for is tried before the destructor returns. A domain whose name is no file name ("", "..", one
+/// with "/") lives in memory alone. A domain that nobody loaded is read on first use, by whoever uses it.
 class FilePreferences : public platform::Preferences {
   public:
     explicit FilePreferences(std::filesystem::path folder);
@@ -43,7 +42,8 @@ class FilePreferences : public platform::Preferences {
     Domain& domainNamed(const std::string& name) const;
     std::filesystem::path fileOf(const std::string& domain) const;
     void work();
-    void bringToDisk(const std::string& domain);
+    /// False, and a line in the log, when that failed.
+    bool bringToDisk(const std::string& domain);
 
     const std::filesystem::path folder_;
     mutable std::mutex mutex_;

@@ -3,6 +3,7 @@
 the last words where they are."""
 
 import concurrent.futures
+import fcntl
 import json
 import os
 import pathlib
@@ -233,6 +234,25 @@ class LiveTest(unittest.TestCase):
         self.assertIsNone(self.remembered())
         self.assertEqual(len(self.commands(shard)), 6)
         self.assertEqual(len(self.commands(service)), 4)
+
+    def test_exit_is_not_held_up_by_a_lock_held_elsewhere(self):
+        (self.folder / "shard.json").write_text(json.dumps({"friends": MOVING}))
+        shard = self.shard()
+        redirect = f"redirect=https://localhost:{shard.port}{{path}}"
+        _, environment = self.serve_with_shard(shard, "--fault", redirect)
+        lock = self.folder / "state" / "ktr" / "preferences" / "org.ktr.snippets.json.lock"
+        lock.parent.mkdir(parents=True)
+        with lock.open("w") as held:
+            fcntl.flock(held, fcntl.LOCK_EX)
+            result = self.run_live(environment, "describe", 1.5, self.snippet_of_ann(), question=None)
+        self.assertEqual(result.returncode, 0, result.stderr)
+        self.assertIn("Ann Marsh", result.stdout)
+        self.assertIn("another process holds the lock", result.stderr)
+        # It waits five seconds for the lock, once.
+        self.assertLess(result.seconds, 9)
+        self.assertIsNone(self.remembered())
+        self.assertIn("Live", self.told(environment))
+        self.assertEqual(self.remembered(), f"localhost:{shard.port}", "with the lock free it is kept")
 
     def test_remembered_host_that_cannot_prove_itself_hears_nothing_and_is_forgotten(self):
         (self.folder / "shard.json").write_text(json.dumps({"friends": MOVING}))
