@@ -4,7 +4,6 @@
 #include <cmath>
 
 #include "documents/Words.h"
-#include "platform/base/Utf8.h"
 #include "server/admin/Administration.h"
 #include "server/rules/WallClock.h"
 
@@ -17,12 +16,6 @@ std::optional<double> degrees(std::string_view text, double most) {
     const auto [stop, error] = std::from_chars(text.data(), text.data() + text.size(), number);
     const bool whole = error == std::errc() && stop == text.data() + text.size();
     return whole && std::abs(number) <= most ? std::optional(number) : std::nullopt;
-}
-
-/// One line that can be read aloud.
-bool isPlaceName(const std::string& name) {
-    return platform::isValidUtf8(name) && documents::withoutControls(name) == name && !name.empty() &&
-           platform::utf8Length(name) <= 40 && name.front() != ' ' && name.back() != ' ';
 }
 
 /// Empty when the words were understood.
@@ -62,7 +55,7 @@ std::string Administration::setPlace(const std::string& name, const PlaceWords& 
         }
         return complaint;
     }
-    if (!isPlaceName(words.name)) {
+    if (!NamedPlace::isName(words.name)) {
         return "--name: expected 1 to 40 letters on one line, found " + documents::inQuotes(words.name);
     }
     NamedPlace place;

@@ -81,6 +81,12 @@ HttpResponse OwnPages::show(const PageRequest& request, const Reader& reader) {
     if (request.is({"delete"})) {
         return PageAnswer::html(200, SettingsPage::deleteHtml(context));
     }
+    if (request.is({"places"})) {
+        return placesPage(reader, 200, "", nullptr);
+    }
+    if (request.is({"places", "*", "remove"})) {
+        return showPlaceRemoval(request, reader);
+    }
     if (request.is({"sees", "*"}) || request.is({"sees", "*", "stop"})) {
         return showRule(request, reader);
     }
@@ -122,6 +128,9 @@ HttpResponse OwnPages::change(const PageRequest& request, const Reader& reader) 
     }
     if (request.is({"settings"})) {
         return changeSettings(request, reader);
+    }
+    if (request.is({"places"}) || request.is({"places", "*", "remove"})) {
+        return changePlaces(request, reader);
     }
     if (request.is({"delete"})) {
         return deleteAll(reader);
@@ -211,6 +220,9 @@ HttpResponse OwnPages::showPhone(const PageRequest& request, const Reader& reade
     for (const PageDevice& device : devicesOf(reader)) {
         if (device.kind == PageDevice::Kind::Phone && device.id == request.number(1)) {
             PhonePage::Data data{"https://" + request.host + "/pub", "", "", "", device.id, device.made, device.heard};
+            if (const auto fix = store_.newestFix(reader.person.id); fix && device.heard) {
+                data.accuracy = fix->accuracy;
+            }
             return PageAnswer::html(200, PhonePage::html(reader.context, data));
         }
     }

@@ -40,6 +40,9 @@ class OwnPages {
     HttpResponse endDevice(const PageRequest& request, const Reader& reader);
     HttpResponse changeSettings(const PageRequest& request, const Reader& reader);
     HttpResponse deleteAll(const Reader& reader);
+    HttpResponse placesPage(const Reader& reader, int status, const std::string& typed, const char* complaint);
+    HttpResponse showPlaceRemoval(const PageRequest& request, const Reader& reader);
+    HttpResponse changePlaces(const PageRequest& request, const Reader& reader);
 
     SharingPage::Data sharingOf(const Reader& reader);
     std::vector<PageLook> looksOf(const Reader& reader);

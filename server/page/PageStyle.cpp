@@ -45,7 +45,7 @@ h2,legend{font-size:.8125rem;font-weight:400;color:var(--inkSoft);padding:22px 1
 .apart,.card+.card,form+.card,.card+form{margin-top:16px}
 .row{display:flex;align-items:center;gap:12px;width:100%;min-height:53px;padding:8px 15px;text-decoration:none;color:inherit;
 background:none;border:0;font:inherit;text-align:start;position:relative}
-.row+.row,li+li>.row,ul+.row{border-top:1px solid var(--separator)}
+.row+.row,li+li>.row,ul+.row,.ruled{border-top:1px solid var(--separator)}
 a.row:hover,button.row:hover{background:var(--highlight)}
 a.row:active,button.row:active{background-image:linear-gradient(rgba(0,0,0,.2),rgba(0,0,0,.2))}
 .row:focus-visible{outline-offset:-3px}

@@ -5,10 +5,14 @@
 #include <array>
 #include <cmath>
 
+#include "documents/Words.h"
+#include "platform/base/Utf8.h"
+
 namespace ktr::server {
 
 namespace {
 
+constexpr std::size_t kLongestName = 40;
 /// A degree of latitude is nowhere shorter, metres.
 constexpr double kShortestDegree = 110000.0;
 constexpr double kEnoughAccuracy = 200.0;
@@ -33,6 +37,11 @@ const NamedPlace* NamedPlace::saidAt(const std::vector<NamedPlace>& places, cons
         }
     }
     return best;
+}
+
+bool NamedPlace::isName(std::string_view text) {
+    return platform::isValidUtf8(text) && documents::withoutControls(std::string(text)) == text && !text.empty() &&
+           platform::utf8Length(text) <= kLongestName && text.front() != ' ' && text.back() != ' ';
 }
 
 bool NamedPlace::isLabel(std::string_view word) {

@@ -28,6 +28,8 @@ struct NamedPlace {
     bool holds(const Fix& fix) const;
     /// Of the places whose name may be said the one that holds a fix, the smallest of several; null when none does.
     static const NamedPlace* saidAt(const std::vector<NamedPlace>& places, const Fix& fix);
+    /// 1 to 40 letters on one line, which can be read aloud.
+    static bool isName(std::string_view text);
     static bool isLabel(std::string_view word);
 
     bool operator==(const NamedPlace&) const = default;

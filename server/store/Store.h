@@ -76,6 +76,8 @@ class Store {
     std::vector<Friend> friendsOf(std::int64_t viewer);
     /// Who saw somebody, the newest hour first.
     std::vector<Look> looksAt(std::int64_t owner);
+    /// A person's newest place, for their own eyes. None: none is kept.
+    std::optional<Fix> newestFix(std::int64_t person);
     std::vector<NamedPlace> placesOf(std::int64_t owner);
     /// In the order in which they were made, those whose secret has ended as well.
     std::vector<DeviceFacts> devicesOf(std::int64_t person);

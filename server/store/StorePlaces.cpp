@@ -62,6 +62,15 @@ bool Store::removePlace(std::int64_t owner, std::int64_t place, std::int64_t now
     return good && removed > 0;
 }
 
+std::optional<Fix> Store::newestFix(std::int64_t person) {
+    const Reading reading(*this);
+    auto row = reading->statement(
+        "SELECT time, heard, latitude, longitude, accuracy FROM fix WHERE person = $1 ORDER BY time DESC LIMIT 1");
+    return row.bind(person).next()
+               ? std::optional(Fix{row.integer(0), row.integer(1), row.real(2), row.real(3), row.maybeReal(4)})
+               : std::nullopt;
+}
+
 std::vector<NamedPlace> Store::placesOf(std::int64_t owner) {
     const Reading reading(*this);
     return readPlaces(*reading, owner);

@@ -310,6 +310,13 @@ TEST_P(StoreRules, Zone_IsKept) {
     EXPECT_EQ(store_->people().front().zone, "Asia/Tokyo");
 }
 
+TEST_P(StoreRules, NewestFix_IsTheOneWithTheGreatestTime) {
+    EXPECT_EQ(store_->newestFix(ann_), std::nullopt);
+    ASSERT_TRUE(keep({at(kNow - 10, 51.0), at(kNow - 30), at(kNow - 20)}));
+    EXPECT_EQ(store_->newestFix(ann_), at(kNow - 10, 51.0));
+    EXPECT_EQ(store_->newestFix(otto_), std::nullopt);
+}
+
 INSTANTIATE_TEST_SUITE_P(Sqlite, StoreRules, ::testing::Values(false));
 INSTANTIATE_TEST_SUITE_P(Postgres, StoreRules, ::testing::Values(true));
 
