@@ -65,7 +65,8 @@ void PeoplesPage::work() {
         if (waiting_.empty()) {
             return;
         }
-        auto [request, reply] = std::move(waiting_.front());
+        const PageRequest request = std::move(waiting_.front().first);
+        const HttpReply reply = std::move(waiting_.front().second);
         waiting_.pop_front();
         lock.unlock();
         double delay = 0.0;
