@@ -58,7 +58,7 @@ std::variant<std::vector<host::Scenario>, host::Failure> readScenarios(const Opt
     return scenarios;
 }
 
-/// What the file says, as far as it can be read: what is wrong with it is told once the account is read.
+/// What the file says, as far as it can be read: what is wrong with it is reported once the account is read.
 linux_::Configuration configurationOf(const std::filesystem::path& file) {
     documents::DocumentWarnings warnings;
     auto read = linux_::ConfigurationReader::readFile(file, &warnings);

@@ -66,7 +66,7 @@ std::shared_ptr<linux_::QtLocalization> readTexts(const HostSettings& settings, 
     return texts;
 }
 
-/// Lengths on maps are told in the units of the distances beside them, whatever decides those.
+/// Lengths on maps are shown in the units of the distances beside them, whatever decides those.
 platform::LengthSystem lengthSystem(const Platform& platform) {
     platform::DistanceCalculator::Settings settings;
     settings.defaultsSuite = "group.org.ktr";
@@ -111,7 +111,7 @@ void addUserInterface(Platform& platform, const HostSettings& settings, bool isW
         platform.appearance = earlier->appearance;
     } else {
         auto appearance = std::make_shared<linux_::QtAppearance>();
-        // In real time without a window nobody watches: at any moment maps are where they would come to rest.
+        // In real time without a window no motion is seen: at any moment maps are where they would come to rest.
         appearance->setReducesMotion(isWithoutWindow && settings.liveConfiguration.has_value());
         platform.appearance = appearance;
     }

@@ -81,7 +81,7 @@ void VAKTRVisibilityController::showMyLocation() {
         friendView_->setLocation(myLocation_);
     }
     if (mapView_) {
-        // The map shows where the user is by itself; from here on its link names nobody.
+        // The map shows where the user is by itself; from here on its link has no handle.
         mapView_->setLocation(nullptr);
     }
 }

@@ -12,7 +12,7 @@
 namespace ktr {
 
 namespace {
-/// Metres: the distance filter, and the shortest move that is told of.
+/// Metres: the distance filter, and the shortest move that is sent.
 constexpr double kDistanceOfNote = 10.0;
 /// Degrees: a user who has moved no further rests.
 constexpr double kSamePlace = 1e-6;

@@ -102,7 +102,7 @@ void KTRVelaFenceView::setGeoFence(std::shared_ptr<platform::VAKtrGeoFence> geoF
 }
 
 void KTRVelaFenceView::updateFenceView() {
-    // Without a platform nothing can be worded: what is shown stays.
+    // Without a platform no text can be formatted: what is shown stays.
     if (!Platform::installed()) {
         return;
     }
@@ -208,7 +208,7 @@ platform::AccessibilityRole KTRVelaFenceView::accessibilityRole() const {
 }
 
 std::string KTRVelaFenceView::accessibilityText() const {
-    // Whoever listens may come when the host has already gone: then nothing can be worded.
+    // Whoever listens may come when the host has already gone: then no text can be formatted.
     if (!Platform::installed()) {
         return "";
     }

@@ -129,7 +129,8 @@ void KTRVelaFriendView::setLocation(std::shared_ptr<KTRVALocation> location) {
 }
 
 void KTRVelaFriendView::updateView() {
-    // A position may still arrive when the host has already gone: nothing can be worded then, and what is shown stays.
+    // A position may still arrive when the host has already gone: no text can be formatted then, and what is shown
+    // stays.
     if (!Platform::installed()) {
         return;
     }
@@ -218,7 +219,7 @@ std::optional<platform::Url> KTRVelaFriendView::urlForTouch() {
 }
 
 std::string KTRVelaFriendView::accessibilityText() const {
-    // Whoever listens may come when the host has already gone: then nothing can be worded.
+    // Whoever listens may come when the host has already gone: then no text can be formatted.
     if (!Platform::installed()) {
         return "";
     }

@@ -279,7 +279,7 @@ double ConversationWidget::newestTop() const {
     if (turns.size() < 2) {
         return 0.0;
     }
-    // Side by side, question and card begin at their turn's very top: the space above them is nobody's.
+    // Side by side, question and card begin at their turn's very top: the space above them belongs to neither.
     const double above = width() >= host::measures::kWideFrom ? host::measures::kCardToQuestion : 0.0;
     return host_.conversation()->topOf(*turns.back()) - above;
 }

@@ -35,7 +35,7 @@ StatusWords::StatusWords(QWidget* parent) : QLabel(parent), palette_(&linux_::Pa
     // Again changes nothing.
     QAccessible::removeFactory(readingOf);
     QAccessible::installFactory(readingOf);
-    // A label with a name of its own tells nobody when its text changes; what is read is the text all the same.
+    // A label with a name of its own announces no change of its text; what is read is the text all the same.
     setAccessibleName(QStringLiteral("-"));
 }
 

@@ -37,7 +37,7 @@ bool NameChanges::isNews(const void* element, const std::string& name,
     const auto before = found == told_.end() ? std::nullopt : found->second.closeness;
     const auto close = subject && subject->metres ? std::optional(closeness(*subject->metres, before)) : std::nullopt;
     if (found == told_.end()) {
-        // An element about nobody may tell its first change at once: nobody has been told anything of it yet.
+        // An element about no person may announce its first change at once: nothing was announced of it yet.
         told_[element] = {name, subject, close, subject ? now : now - kLeastBetween};
         return false;
     }

@@ -104,7 +104,7 @@ void LiveConversation::sendNext() {
         });
         return;
     }
-    // Whatever the question is: it may be a wish to hide, and nobody here can tell.
+    // Whatever the question is: it may be a wish to hide, which only the assistant can tell.
     host_.endSharing();
     // The assistant's client ends before the loop does, and what it posts after this has gone does nothing.
     platform::MainLoop* const mainLoop = host_.platform()->mainLoop.get();

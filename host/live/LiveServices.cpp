@@ -43,7 +43,7 @@ linux_::QtHttpTransport::Settings transportSettings(const linux_::ConfiguredAcco
 LiveServices::LiveServices(std::filesystem::path configurationFile, std::shared_ptr<linux_::KnownSecrets> secrets)
     : file_(std::move(configurationFile)), accounts_(std::make_shared<linux_::ConfiguredAccountStore>(file_)) {
     accounts_->setKnownSecrets(std::move(secrets));
-    // What is wrong with the file is told when the account is read.
+    // What is wrong with the file is reported when the account is read.
     auto read = linux_::ConfigurationReader::readFile(file_);
     if (auto* configuration = std::get_if<linux_::Configuration>(&read)) {
         configuration_ = std::move(*configuration);

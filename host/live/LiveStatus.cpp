@@ -11,7 +11,7 @@ namespace {
 
 constexpr double kMinute = 60.0;
 constexpr double kHour = 3600.0;
-/// How late a command may be before nobody counts on it any more, seconds.
+/// How late a command may be before it no longer counts as coming, seconds.
 constexpr double kGrace = 3.0;
 /// What is counted on before the service has named an interval, seconds.
 constexpr double kFirstInterval = 30.0;

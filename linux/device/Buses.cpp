@@ -30,7 +30,7 @@ constexpr const char* kSystemAddress = "unix:path=/var/run/dbus/system_bus_socke
 /// No transport is called so: whoever asks for it is refused at once.
 constexpr const char* kNoBus = "disabled:";
 
-/// A socket that waits for nobody longer than until a deadline.
+/// A socket whose calls all end at a deadline.
 class Connection {
   public:
     explicit Connection(SteadyClock::time_point deadline) : deadline_(deadline) {}
@@ -50,7 +50,7 @@ class Connection {
         if (::connect(socket_, reinterpret_cast<const sockaddr*>(&address), length) == 0) {
             return Greeting::Answered;
         }
-        // A socket of this kind says so when nobody takes connections from its queue.
+        // A socket of this kind says so when no process takes connections from its queue.
         return errno == EAGAIN ? Greeting::Silent : Greeting::Refused;
     }
 

@@ -30,7 +30,7 @@ constexpr std::size_t kMostKnown = 16384;
 /// An odd number without a pattern (2^64 divided by the golden ratio).
 constexpr std::size_t kHashFactor = 0x9E3779B97F4A7C15U;
 
-/// What short distances are told in.
+/// The units of short distances.
 bool isShortUnit(const icu::MeasureUnit& unit) {
     const std::string_view name = unit.getIdentifier();
     return name == "meter" || name == "yard" || name == "foot";

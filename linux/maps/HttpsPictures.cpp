@@ -26,7 +26,7 @@ constexpr std::size_t kMostAtOnce = 2;
 constexpr std::size_t kMostWaiting = 64;
 constexpr std::size_t kMostStates = 4096;
 constexpr double kDeadline = 20.0;  // seconds
-/// Tiles that arrive together are told of together; milliseconds.
+/// Tiles that arrive together are reported together; milliseconds.
 constexpr int kGathering = 120;
 /// No tile is asked for again within this, whatever the server says of its freshness.
 constexpr seconds kLeastPause{60};

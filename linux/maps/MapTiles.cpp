@@ -9,7 +9,7 @@ namespace ktr::linux_ {
 
 namespace {
 
-/// Edges of tiles are told up to here: a coarse tile reaches far beyond a picture that shows a street.
+/// Edges of tiles are given up to here: a coarse tile reaches far beyond a picture that shows a street.
 constexpr double kFarPixels = 1 << 20;
 
 }  // namespace

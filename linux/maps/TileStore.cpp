@@ -103,7 +103,7 @@ void TileStore::save(const tiles::TileKey& key, const Entry& entry) {
     const fs::path file = fileOf(key);
     std::error_code failed;
     fs::create_directories(file.parent_path(), failed);
-    // Where somebody looked is nobody else's business.
+    // Where the user has looked is private.
     fs::permissions(root_, fs::perms::owner_all, failed);
     const fs::path partial = file.string() + ".new";
     {

@@ -27,7 +27,7 @@ constexpr double kNarrowLetter = 0.2;
 constexpr qsizetype kShapedAhead = 64;
 
 /// Qt reads a word to its end for each line that it breaks it into: a word of a hundred thousand letters would take
-/// seconds. Words beyond this are nobody's; the text that has one breaks anywhere.
+/// seconds. No language has longer words; the text that has one breaks anywhere.
 bool hasEndlessWord(const QString& text) {
     constexpr qsizetype kLongest = 1000;
     constexpr char16_t kFirstIdeographic = 0x2E80;

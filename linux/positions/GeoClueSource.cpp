@@ -92,7 +92,7 @@ GeoClueSource::GeoClueSource(std::shared_ptr<platform::MainLoop> mainLoop, QStri
     connect(watcher, &QDBusServiceWatcher::serviceOwnerChanged, this,
             [this](const QString&, const QString&, const QString& now) {
                 forgetClient();
-                // GeoClue ends when nobody needs it, and the bus starts it again: a call does.
+                // GeoClue ends when no program uses it, and the bus starts it again: a call does.
                 if (started_ && now.isEmpty()) {
                     retry_.later();
                 } else if (started_) {

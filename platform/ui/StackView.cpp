@@ -234,7 +234,7 @@ Size StackView::systemLayoutSizeFitting(const Size& target, double /*horizontalP
     return {target.width, height};
 }
 
-/// Subviews stand one under the other: of a thousand rows only those at hand are looked at.
+/// Subviews stand one under the other: of a thousand rows only the few in question are looked at.
 std::pair<std::size_t, std::size_t> StackView::presentedWithin(const Rect& rect) const {
     if (hasHidden_ || areAllChanged_ || misplaced_ < arranged_.size()) {
         return View::presentedWithin(rect);

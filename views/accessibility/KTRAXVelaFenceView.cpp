@@ -47,7 +47,7 @@ void KTRAXVelaFenceView::setupView() {
 }
 
 void KTRAXVelaFenceView::updateFenceView() {
-    // Without a platform nothing can be worded: what is shown stays.
+    // Without a platform no text can be formatted: what is shown stays.
     if (!Platform::installed()) {
         return;
     }

@@ -41,7 +41,7 @@ void KTRAXVelaFriendView::setupView() {
 }
 
 void KTRAXVelaFriendView::updateView() {
-    // Without a platform nothing can be worded: what is shown stays.
+    // Without a platform no text can be formatted: what is shown stays.
     if (!Platform::installed()) {
         return;
     }
