@@ -42,7 +42,7 @@ Traffic::Route Traffic::routeOf(const HttpRequest& request) {
             return route;
         }
     }
-    return request.path.rfind("/page", 0) == 0 ? Route::Page : Route::Other;
+    return request.path == "/me" || request.path.rfind("/me/", 0) == 0 ? Route::Page : Route::Other;
 }
 
 HttpReply Traffic::watched(const HttpRequest& request, HttpReply reply) {

@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "server/http/BasicCredentials.h"
+#include "server/http/ClientAddress.h"
 #include "server/http/RequestReader.h"
 #include "server/http/UrlQuery.h"
 #include "tests/fuzz/Require.h"
@@ -16,6 +17,7 @@ namespace {
 
 using ktr::fuzz::require;
 using ktr::server::BasicCredentials;
+using ktr::server::ClientAddress;
 using ktr::server::HttpLimits;
 using ktr::server::HttpRequest;
 using ktr::server::RequestReader;
@@ -48,6 +50,8 @@ Outcome read(std::string_view bytes, std::size_t step) {
             require(!request.path.empty() && request.path.front() == '/', "a path");
             UrlQuery::read(request.query);
             BasicCredentials::read(request.headerText("Authorization"));
+            const std::string client = ClientAddress::forwardedFor(request);
+            require(!client.empty() && client.size() < 46, "an address, or that there is none");
             outcome.requests.push_back(request.method + " " + request.path + " " + request.body);
             state = reader.next();
         }

@@ -72,6 +72,13 @@ TEST_F(TrafficTest, PathsThatAreUnknown_AreOne_AndNothingOfThemIsSaid) {
     EXPECT_EQ(traffic_.text().find("canary"), std::string::npos);
 }
 
+TEST_F(TrafficTest, PagesOfPeople_AreOneRoute) {
+    for (const char* path : {"/me", "/me/in", "/me/devices", "/mean"}) {
+        answer(path, 200);
+    }
+    EXPECT_TRUE(says("ktr_service_requests_total{route=\"page\",status=\"2xx\"} 3"));
+}
+
 TEST_F(TrafficTest, Text_IsPrometheus) {
     answer("/pub", 200);
     const std::string text = traffic_.text();
