@@ -10,7 +10,6 @@
 #include <cstdio>
 
 #include "documents/Words.h"
-#include "linux/paint/FontChoice.h"
 
 namespace ktr::linux_ {
 
@@ -110,31 +109,6 @@ std::vector<std::string> FontSetup::load(Mode mode) {
         }
     }
     return missing;
-}
-
-bool FontSetup::hasBaseFamily() {
-    return QFontDatabase::hasFamily(FontChoice::baseFamily());
-}
-
-std::vector<FontSetup::Substitute> FontSetup::substitutes() {
-    std::vector<Substitute> list;
-    const std::string base = FontChoice::baseFamily().toStdString();
-    if (!hasBaseFamily()) {
-        list.push_back({base, "the system's sans-serif"});
-        return list;
-    }
-    for (const char* style : {"Light", "Thin"}) {
-        if (!FontChoice::hasStyle(FontChoice::baseFamily(), QString::fromLatin1(style))) {
-            list.push_back({base + " " + style, base + " Regular"});
-        }
-    }
-    // There is no rounded cut of the family, nor a semibold one in the packages that are pinned.
-    list.push_back({base + " Rounded", base});
-    list.push_back({base + " SemiBold", base + " Bold"});
-    if (!QFontDatabase::hasFamily(FontChoice::emojiFamily())) {
-        list.push_back({FontChoice::emojiFamily().toStdString(), "what the system has"});
-    }
-    return list;
 }
 
 }  // namespace ktr::linux_

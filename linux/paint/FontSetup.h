@@ -13,12 +13,6 @@ class FontSetup {
   public:
     enum class Mode { System, Pinned };
 
-    /// A face that is asked for and what is shown instead.
-    struct Substitute {
-        std::string wanted;
-        std::string used;
-    };
-
     /// Before the QGuiApplication is made: weights and slants are never synthesised; in pinned mode the system's fonts
     /// are hidden. False, with a reason in `error`, when that cannot be set up.
     static bool prepare(Mode mode, std::string* error = nullptr);
@@ -27,10 +21,6 @@ class FontSetup {
     /// (full names of files; pinned mode only).
     static std::vector<std::string> load(Mode mode);
 
-    /// Whether the family that everything is drawn for is there. Without it the system's own sans-serif serves.
-    static bool hasBaseFamily();
-    /// Faces that the interface asks for and the installed (or pinned) fonts do not have.
-    static std::vector<Substitute> substitutes();
     /// The files that pinned mode loads, in order.
     static QStringList pinnedFiles();
 };

@@ -105,10 +105,6 @@ VariableId Solver::addVariable() {
     return static_cast<VariableId>(at);
 }
 
-std::size_t Solver::variableCount() const {
-    return state_.problem->variables.size();
-}
-
 std::size_t Solver::constraintCount() const {
     return state_.problem->order.size();
 }

@@ -40,7 +40,6 @@ class KTR_API Solver {
     Solver();
 
     VariableId addVariable();
-    std::size_t variableCount() const;
 
     /// Adds "terms relation constant". Equal constraints (terms, relation, constant and level) are one: they are
     /// counted, and count once. One that is meant to be edited stays apart. Levels are clamped to 1 ... 1001.

@@ -3,14 +3,15 @@
 #include <gtest/gtest.h>
 
 #include <QFontDatabase>
-#include <set>
+
+#include "linux/paint/FontChoice.h"
 
 namespace ktr::linux_ {
 
 // The tests' own application runs with the pinned fonts.
 
 TEST(FontSetupTest, PinnedFonts_AreTheOnlyOnes) {
-    EXPECT_TRUE(FontSetup::hasBaseFamily());
+    EXPECT_TRUE(QFontDatabase::hasFamily(FontChoice::baseFamily()));
     EXPECT_TRUE(QFontDatabase::hasFamily(QStringLiteral("Noto Sans CJK JP")));
     EXPECT_TRUE(QFontDatabase::hasFamily(QStringLiteral("Noto Color Emoji")));
     // Three names are Qt's own for whatever there is.
@@ -18,16 +19,6 @@ TEST(FontSetupTest, PinnedFonts_AreTheOnlyOnes) {
     for (const QString& family : QFontDatabase::families()) {
         EXPECT_TRUE(family.startsWith(u"Noto ") || aliases.contains(family)) << family.toStdString();
     }
-}
-
-TEST(FontSetupTest, Substitutes_AreNamed) {
-    std::set<std::string> wanted;
-    for (const auto& substitute : FontSetup::substitutes()) {
-        wanted.insert(substitute.wanted);
-        EXPECT_FALSE(substitute.used.empty());
-    }
-    EXPECT_EQ(wanted,
-              (std::set<std::string>{"Noto Sans Light", "Noto Sans Thin", "Noto Sans Rounded", "Noto Sans SemiBold"}));
 }
 
 TEST(FontSetupTest, SystemMode_LoadsNothing) {
