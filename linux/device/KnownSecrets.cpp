@@ -81,9 +81,8 @@ std::size_t endOfValue(std::string_view text, bool quoted) {
         const char c = text[at];
         if (quoted && c == '\\' && at + 1 < text.size() && text[at + 1] != '"') {
             ++at;
-        } else if (c == '"' || c == '\\' || text.substr(at, 3) == "%22" || text.substr(at, 3) == "%26") {
-            return at;
-        } else if (!quoted && std::string_view(",}]&# \n").find(c) != std::string_view::npos) {
+        } else if (c == '"' || c == '\\' || text.substr(at, 3) == "%22" || text.substr(at, 3) == "%26" ||
+                   (!quoted && std::string_view(",}]&# \n").find(c) != std::string_view::npos)) {
             return at;
         }
     }

@@ -54,7 +54,7 @@ MapDrawn drawGround(MapGround& ground, const MapDrawing& drawing) {
 
 std::optional<MapDrawer::Result> MapDrawer::draw(const platform::MapPictureRequest& asked,
                                                  const std::vector<std::shared_ptr<MapGround>>& grounds,
-                                                 std::stop_token stop) {
+                                                 const std::stop_token& stop) {
     const platform::MapPictureRequest request = checked(asked);
     const auto side = [&](double points) { return std::max(1, static_cast<int>(std::lround(points * request.scale))); };
     Result result;

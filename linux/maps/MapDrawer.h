@@ -23,7 +23,8 @@ class MapDrawer {
     /// None when it was stopped on the way. A request that makes no picture (no size, no number) is drawn as the
     /// nearest one that does; a picture too large for memory is drawn with fewer pixels.
     static std::optional<Result> draw(const platform::MapPictureRequest& request,
-                                      const std::vector<std::shared_ptr<MapGround>>& grounds, std::stop_token stop);
+                                      const std::vector<std::shared_ptr<MapGround>>& grounds,
+                                      const std::stop_token& stop);
 };
 
 }  // namespace ktr::linux_
