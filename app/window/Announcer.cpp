@@ -1,15 +1,16 @@
 #include "app/window/Announcer.h"
 
 #include <QAccessible>
-#include <QAccessibleWidget>
+
+#include "app/window/AccessiblePlain.h"
 
 namespace ktr::app {
 
 namespace {
 
-class Notice : public QAccessibleWidget {
+class Notice : public AccessiblePlain {
   public:
-    explicit Notice(Announcer& announcer) : QAccessibleWidget(&announcer, QAccessible::Notification) {}
+    explicit Notice(Announcer& announcer) : AccessiblePlain(&announcer, QAccessible::Notification) {}
     QString text(QAccessible::Text kind) const override {
         return kind == QAccessible::Name ? static_cast<Announcer*>(widget())->message() : QString();
     }

@@ -44,7 +44,7 @@ void AskField::refreshFont() {
 }
 
 AskField::AskField(const Texts& texts, QWidget* parent)
-    : QWidget(parent),
+    : PlainWidget(parent),
       edit_(new QuestionEdit(this)),
       button_(new SendButton(this)),
       palette_(&linux_::Palette::of(linux_::ColorScheme::Light)) {
@@ -54,10 +54,10 @@ AskField::AskField(const Texts& texts, QWidget* parent)
     setTabOrder(edit_, button_);
     edit_->installEventFilter(this);
     button_->installEventFilter(this);
-    connect(edit_, &QLineEdit::textChanged, this,
+    connect(edit_, &QLineEdit::textChanged, &listener_,
             [this](const QString& text) { button_->setReady(!text.trimmed().isEmpty(), animated_); });
-    connect(edit_, &QLineEdit::returnPressed, this, [this] { send(); });
-    connect(button_, &QAbstractButton::clicked, this, [this] { send(); });
+    connect(edit_, &QLineEdit::returnPressed, &listener_, [this] { send(); });
+    connect(button_, &QAbstractButton::clicked, &listener_, [this] { send(); });
 }
 
 void AskField::setTexts(const Texts& texts) {

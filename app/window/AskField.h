@@ -1,9 +1,9 @@
 #pragma once
 
-#include <QWidget>
 #include <functional>
 #include <string>
 
+#include "app/window/PlainWidget.h"
 #include "app/window/QuestionEdit.h"
 #include "app/window/SendButton.h"
 
@@ -11,7 +11,7 @@ namespace ktr::app {
 
 /// The field in which questions are typed. Its shape is inset by `kAround`, where the ring of the keyboard's focus
 /// stands. Main thread.
-class AskField : public QWidget {
+class AskField : public PlainWidget {
   public:
     static constexpr int kAround = 7;
 
@@ -53,6 +53,9 @@ class AskField : public QWidget {
     const linux_::Palette* palette_;
     bool animated_ = true;
     bool marksFocus_ = false;
+    /// Hears the edit and the button in the field's place: a widget that hears another counts for assistive technology
+    /// as controlled by it, but does not say so itself.
+    QObject listener_;
 };
 
 }  // namespace ktr::app

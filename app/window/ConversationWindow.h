@@ -1,13 +1,13 @@
 #pragma once
 
 #include <QTimer>
-#include <QWidget>
 #include <memory>
 #include <string>
 #include <vector>
 
 #include "app/window/AskField.h"
 #include "app/window/ConversationWidget.h"
+#include "app/window/PlainWidget.h"
 #include "app/window/StatusLine.h"
 #include "host/live/LiveConversation.h"
 #include "linux/device/DesktopSettings.h"
@@ -15,7 +15,7 @@
 namespace ktr::app {
 
 /// The window: a conversation and, where it is live, the field and the status line under it. Main thread.
-class ConversationWindow : public QWidget {
+class ConversationWindow : public PlainWidget {
   public:
     /// The host outlives the window.
     explicit ConversationWindow(host::Host& host);

@@ -49,7 +49,7 @@ QPainterPath hiddenPath() {
 }  // namespace
 
 StatusLine::StatusLine(QWidget* parent)
-    : QWidget(parent), words_(new StatusWords(this)), palette_(&linux_::Palette::of(linux_::ColorScheme::Light)) {
+    : PlainWidget(parent), words_(new StatusWords(this)), palette_(&linux_::Palette::of(linux_::ColorScheme::Light)) {
     words_->setTextFormat(Qt::PlainText);
     refreshFont();
 }

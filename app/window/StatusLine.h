@@ -1,7 +1,6 @@
 #pragma once
 
-#include <QWidget>
-
+#include "app/window/PlainWidget.h"
 #include "app/window/StatusWords.h"
 #include "host/live/LiveStatus.h"
 #include "linux/paint/Palette.h"
@@ -9,7 +8,7 @@
 namespace ktr::app {
 
 /// A mark and words, which take as many lines as they need. Main thread.
-class StatusLine : public QWidget {
+class StatusLine : public PlainWidget {
   public:
     /// From the line's start edge: the mark's centre and the words.
     static constexpr int kMarkCentre = 19;

@@ -1,11 +1,11 @@
 #include "app/window/StatusWords.h"
 
 #include <QAccessible>
-#include <QAccessibleWidget>
 #include <QPainter>
 #include <algorithm>
 #include <cmath>
 
+#include "app/window/AccessiblePlain.h"
 #include "platform/base/Platform.h"
 #include "platform/ui/Font.h"
 
@@ -16,9 +16,9 @@ namespace {
 /// What letters may reach beyond their width.
 constexpr int kBeside = 2;
 
-class Reading : public QAccessibleWidget {
+class Reading : public AccessiblePlain {
   public:
-    explicit Reading(StatusWords& words) : QAccessibleWidget(&words, QAccessible::StaticText) {}
+    explicit Reading(StatusWords& words) : AccessiblePlain(&words, QAccessible::StaticText) {}
     QString text(QAccessible::Text kind) const override {
         return kind == QAccessible::Name ? static_cast<StatusWords*>(widget())->text() : QString();
     }
