@@ -1,6 +1,8 @@
 #include "server/rules/Visibility.h"
 
 #include <algorithm>
+#include <iterator>
+#include <limits>
 
 #include "server/rules/Cell.h"
 
@@ -36,7 +38,60 @@ Key shownAt(const std::vector<Fix>& fixes, std::int64_t present, std::int64_t le
     return initial;
 }
 
+/// What may count at all.
+FixRange usableRange(const Sharing& sharing, std::int64_t now) {
+    const bool exact = sharing.grant->precision == Precision::Exact;
+    const std::int64_t length = Visibility::slotLength(sharing.grant->precision);
+    // Below exact precision nothing is used that came in this slot: it would tell when it came; nor what becomes too
+    // old in this slot, for the same reason.
+    const std::int64_t end = exact ? now + 1 : slotOf(now, length) * length;
+    const std::int64_t oldest = (exact ? now : end + length) - sharing.retention;
+    const std::int64_t shared = std::max(sharing.grant->from, sharing.shownSince);
+    // A phone's clock may be ahead: what was heard before the grant is from before it.
+    return {std::max(shared, oldest), exact ? std::numeric_limits<std::int64_t>::max() : end, shared, end};
+}
+
 }  // namespace
+
+std::vector<Fix> Visibility::needed(const Sharing& sharing, std::int64_t now, const FixSource& source) {
+    std::vector<Fix> fixes;
+    if (!isOpen(sharing, now)) {
+        return fixes;
+    }
+    const Precision precision = sharing.grant->precision;
+    const std::int64_t length = slotLength(precision);
+    const double side = cellSide(precision);
+    const auto isSamePlace = [&](const Fix& one, const Fix& other) {
+        return precision == Precision::Places
+                   ? NamedPlace::saidAt(sharing.places, one) == NamedPlace::saidAt(sharing.places, other)
+                   : Cell::of(one.latitude, one.longitude, side) == Cell::of(other.latitude, other.longitude, side);
+    };
+    FixRange range = usableRange(sharing, now);
+    bool isDecided = false;
+    std::int64_t later = slotOf(now, length);  // of the slots before this one nothing has been read yet
+    while (!isDecided) {
+        const auto fix = source(range, FixEdge::Last);
+        if (!fix) {
+            break;
+        }
+        const std::int64_t slot = slotOf(fix->time, length);
+        // Two slots of which this was the last, or an end like that of the slot after it.
+        isDecided =
+            precision == Precision::Exact || slot < later - 1 || (!fixes.empty() && isSamePlace(*fix, fixes.back()));
+        fixes.push_back(*fix);
+        later = slot;
+        range.end = slot * length;
+    }
+    if (!fixes.empty() && !isDecided) {
+        // Where nobody stayed for two slots the first fix decides.
+        range.end = fixes.back().time;
+        if (const auto first = source(range, FixEdge::First)) {
+            fixes.push_back(*first);
+        }
+    }
+    std::reverse(fixes.begin(), fixes.end());
+    return fixes;
+}
 
 double Visibility::cellSide(Precision precision) {
     return precision == Precision::Kilometre ? 1000.0 : precision == Precision::Town ? 4000.0 : 0.0;
@@ -59,19 +114,10 @@ std::optional<Seen> Visibility::visible(const Sharing& sharing, std::int64_t now
     const bool exact = precision == Precision::Exact;
     const std::int64_t length = slotLength(precision);
     const std::int64_t present = slotOf(now, length);
-    // Below exact precision nothing is used that came in this slot: it would tell when it came; nor what becomes too
-    // old in this slot, for the same reason.
-    const std::int64_t end = exact ? now + 1 : present * length;
-    const std::int64_t oldest = (exact ? now : end + length) - sharing.retention;
-    const std::int64_t shared = std::max(sharing.grant->from, sharing.shownSince);
+    const FixRange range = usableRange(sharing, now);
     std::vector<Fix> usable;
-    for (const Fix& fix : sharing.fixes) {
-        // A phone's clock may be ahead: what was heard before the grant is from before it.
-        if (std::min(fix.time, fix.heard) >= shared && fix.time >= oldest && fix.heard < end &&
-            (exact || fix.time < end)) {
-            usable.push_back(fix);
-        }
-    }
+    std::copy_if(sharing.fixes.begin(), sharing.fixes.end(), std::back_inserter(usable),
+                 [&](const Fix& fix) { return range.holds(fix); });
     if (usable.empty()) {
         return std::nullopt;
     }

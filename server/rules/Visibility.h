@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "server/ingest/Fix.h"
+#include "server/rules/FixRange.h"
 #include "server/rules/Grant.h"
 #include "server/rules/NamedPlace.h"
 
@@ -48,6 +49,11 @@ class Visibility {
     /// Names of places are said at exact precision, and at "only named places": there the place stands for the person,
     /// by the same grid of time (5 minutes) and the same two slots, and outside of such places nothing is seen.
     static std::optional<Seen> visible(const Sharing& sharing, std::int64_t now);
+
+    /// Of a person's fixes those by which `visible` decides at that time, by ascending time: with them alone it says
+    /// the same. Below exact precision that is the last of each slot, back to where one stayed for two; not days of
+    /// fixes. The sharing's own fixes are not used.
+    static std::vector<Fix> needed(const Sharing& sharing, std::int64_t now, const FixSource& source);
 
     /// Whether there is a grant that has begun and is not over, of somebody who does not hide: what `visible` begins
     /// with.

@@ -62,7 +62,7 @@ std::string PhoneFriends::answer(const Device& device, const Report& report, std
     std::map<std::int64_t, SentCard> told;
     std::size_t faces = 0;
     const auto cards = store_.cards(device.id, device.person);
-    for (const Friend& one : store_.friendsOf(device.person)) {
+    for (const Friend& one : store_.friendsOf(device.person, now)) {
         const auto what = Visibility::visible(one.sharing, now);
         if (!what) {
             continue;

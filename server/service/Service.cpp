@@ -259,10 +259,11 @@ HttpResponse Service::locations(const Device& device, const Dictionary& body) {
     if (!request) {
         return refusal(400, complaint);
     }
-    store_->present(now_());
+    const std::int64_t now = now_();
+    store_->present(now);
     std::vector<std::string> lookedUp = request->handles;
     lookedUp.resize(std::min(lookedUp.size(), LocationAnswers::kMostHandles));
-    const auto people = store_->asked(device.person, lookedUp);
+    const auto people = store_->asked(device.person, lookedUp, now);
     if (!people) {
         ++counters_.storeFailures;
         return refusal(503, "the store cannot be read");
@@ -276,13 +277,13 @@ HttpResponse Service::locations(const Device& device, const Dictionary& body) {
         }
         const Asked& one = (*people)[asked.size() - 1];
         asked.back().person = one.person;
-        asked.back().seen = Visibility::visible(one.sharing, now_());
+        asked.back().seen = Visibility::visible(one.sharing, now);
         if (asked.back().seen) {
             seen.push_back(one.person);
         }
     }
     if (!seen.empty()) {
-        store_->noteLooks(device.person, seen, true, now_(), nullptr);
+        store_->noteLooks(device.person, seen, true, now, nullptr);
     }
     return HttpResponse::json(200, platform::writeJson(LocationAnswers::locations(*request, std::move(asked))));
 }

@@ -69,11 +69,12 @@ class Store {
     /// What decides what a viewer sees of an owner. None for one whom nobody knows.
     std::optional<Sharing> sharing(std::int64_t viewer, std::int64_t owner);
     /// The same for each of these handles, in their order, with whom it belongs to; none in place of a person for one
-    /// that nobody has. It takes as long for a stranger. Of somebody who is seen exactly the newest fix alone is read.
-    /// None: the store could not be read.
-    std::optional<std::vector<Asked>> asked(std::int64_t viewer, const std::vector<std::string>& handles);
+    /// that nobody has. It takes as long for a stranger. Of the fixes those alone are read that `Visibility` needs at
+    /// `now`. None: the store could not be read.
+    std::optional<std::vector<Asked>> asked(std::int64_t viewer, const std::vector<std::string>& handles,
+                                            std::int64_t now);
     /// Everybody who has granted something to a viewer; fixes as in `asked`.
-    std::vector<Friend> friendsOf(std::int64_t viewer);
+    std::vector<Friend> friendsOf(std::int64_t viewer, std::int64_t now);
     /// Who saw somebody, the newest hour first.
     std::vector<Look> looksAt(std::int64_t owner);
     /// A person's newest place, for their own eyes. None: none is kept.
@@ -199,9 +200,9 @@ class Store {
     static void endOnArrival(Database& database, std::int64_t owner, const std::vector<Fix>& fixes, std::int64_t now);
     /// What else decides what is seen by a grant: fixes, and places where they may be said.
     static void deleteOldOf(Database& database, std::int64_t person, const Retention& retention, std::int64_t now);
-    enum class Depth { All, Needed };
-    void readSight(Database& database, std::int64_t owner, Depth depth, Sharing& sharing);
-    void readFixes(Database& database, std::int64_t owner, Depth depth, Sharing& sharing);
+    /// `now`: reads of the fixes what is needed then; none: all.
+    void readSight(Database& database, std::int64_t owner, std::optional<std::int64_t> now, Sharing& sharing);
+    static std::optional<Fix> readEdge(Database& database, std::int64_t owner, const FixRange& range, FixEdge edge);
     static void endBrowsersIn(Database& database, std::int64_t person);
 
     std::mutex readMutex_;

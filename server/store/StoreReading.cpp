@@ -6,6 +6,15 @@
 
 namespace ktr::server {
 
+namespace {
+
+/// Five columns: time, heard, latitude, longitude, accuracy.
+Fix fixOf(const Database::Run& row) {
+    return {row.integer(0), row.integer(1), row.real(2), row.real(3), row.maybeReal(4)};
+}
+
+}  // namespace
+
 std::string Store::normalisedHandle(std::string_view handle) {
     std::string text;
     if (handle.find('@') != std::string_view::npos) {
@@ -98,34 +107,36 @@ Sharing Store::sharingOf(Database::Run& row, int firstColumn) {
     return sharing;
 }
 
-void Store::readSight(Database& database, std::int64_t owner, Depth depth, Sharing& sharing) {
+void Store::readSight(Database& database, std::int64_t owner, std::optional<std::int64_t> now, Sharing& sharing) {
     // Of an ended grant nothing is read: it takes no longer than that of a stranger.
     if (!sharing.grant || sharing.hidden || sharing.latest >= sharing.grant->end()) {
         return;
     }
-    readFixes(database, owner, depth, sharing);
     if (Visibility::cellSide(sharing.grant->precision) == 0.0) {
         sharing.places = readPlaces(database, owner);
     }
-}
-
-void Store::readFixes(Database& database, std::int64_t owner, Depth depth, Sharing& sharing) {
-    const std::int64_t first = std::max(sharing.grant->from, sharing.shownSince);
-    if (depth == Depth::Needed && sharing.grant->precision == Precision::Exact) {
-        auto row = database.statement(
-            "SELECT time, heard, latitude, longitude, accuracy FROM fix WHERE person = $1 AND time >= $2 "
-            "AND heard >= $2 ORDER BY time DESC LIMIT 1");
-        if (row.bind(owner).bind(first).next()) {
-            sharing.fixes.push_back({row.integer(0), row.integer(1), row.real(2), row.real(3), row.maybeReal(4)});
-        }
+    if (now) {
+        sharing.fixes = Visibility::needed(
+            sharing, *now, [&](const FixRange& range, FixEdge edge) { return readEdge(database, owner, range, edge); });
         return;
     }
     auto row = database.statement(
         "SELECT time, heard, latitude, longitude, accuracy FROM fix WHERE person = $1 AND time >= $2 ORDER BY time");
-    row.bind(owner).bind(first);
+    row.bind(owner).bind(std::max(sharing.grant->from, sharing.shownSince));
     while (row.next()) {
-        sharing.fixes.push_back({row.integer(0), row.integer(1), row.real(2), row.real(3), row.maybeReal(4)});
+        sharing.fixes.push_back(fixOf(row));
     }
+}
+
+std::optional<Fix> Store::readEdge(Database& database, std::int64_t owner, const FixRange& range, FixEdge edge) {
+    auto row = database.statement(
+        edge == FixEdge::Last
+            ? "SELECT time, heard, latitude, longitude, accuracy FROM fix WHERE person = $1 AND time >= $2 AND "
+              "time < $3 AND heard >= $4 AND heard < $5 ORDER BY time DESC LIMIT 1"
+            : "SELECT time, heard, latitude, longitude, accuracy FROM fix WHERE person = $1 AND time >= $2 AND "
+              "time < $3 AND heard >= $4 AND heard < $5 ORDER BY time LIMIT 1");
+    row.bind(owner).bind(range.from).bind(range.end).bind(range.heardFrom).bind(range.heardEnd);
+    return row.next() ? std::optional(fixOf(row)) : std::nullopt;
 }
 
 std::optional<Sharing> Store::sharing(std::int64_t viewer, std::int64_t owner) {
@@ -138,11 +149,12 @@ std::optional<Sharing> Store::sharing(std::int64_t viewer, std::int64_t owner) {
         return std::nullopt;
     }
     Sharing sharing = sharingOf(row, 0);
-    readSight(*reading, owner, Depth::All, sharing);
+    readSight(*reading, owner, std::nullopt, sharing);
     return sharing;
 }
 
-std::optional<std::vector<Asked>> Store::asked(std::int64_t viewer, const std::vector<std::string>& handles) {
+std::optional<std::vector<Asked>> Store::asked(std::int64_t viewer, const std::vector<std::string>& handles,
+                                               std::int64_t now) {
     const Reading reading(*this);
     std::vector<Asked> all;
     for (const std::string& handle : handles) {
@@ -154,14 +166,14 @@ std::optional<std::vector<Asked>> Store::asked(std::int64_t viewer, const std::v
         if (row.bind(viewer).bind(normalisedHandle(handle)).next()) {
             one.person = row.integer(0);
             one.sharing = sharingOf(row, 1);
-            readSight(*reading, one.person, Depth::Needed, one.sharing);
+            readSight(*reading, one.person, now, one.sharing);
         }
         all.push_back(std::move(one));
     }
     return reading->failed() ? std::nullopt : std::optional(std::move(all));
 }
 
-std::vector<Friend> Store::friendsOf(std::int64_t viewer) {
+std::vector<Friend> Store::friendsOf(std::int64_t viewer, std::int64_t now) {
     const Reading reading(*this);
     std::vector<Friend> friends;
     auto row = reading->statement(
@@ -171,7 +183,7 @@ std::vector<Friend> Store::friendsOf(std::int64_t viewer) {
     row.bind(viewer);
     while (row.next()) {
         Friend one{row.integer(0), row.text(1), sharingOf(row, 2)};
-        readSight(*reading, one.person, Depth::Needed, one.sharing);
+        readSight(*reading, one.person, now, one.sharing);
         friends.push_back(std::move(one));
     }
     return friends;

@@ -124,7 +124,7 @@ TEST_P(StoreRules, Grants_KeepAllThatTheySay) {
     EXPECT_EQ(store_->sharing(mara_, ann_)->grant, grant);
     ASSERT_EQ(store_->grantsOf(ann_).front().first, "mara");
     EXPECT_EQ(store_->grantsOf(ann_).front().second, grant);
-    EXPECT_EQ(store_->friendsOf(mara_).front().sharing.grant, grant);
+    EXPECT_EQ(store_->friendsOf(mara_, kNow).front().sharing.grant, grant);
 }
 
 TEST_P(StoreRules, NewGrant_ShowsNothingThatWasHeardBefore_NotInTheSameSecond) {
@@ -267,7 +267,8 @@ TEST_P(StoreRules, Looks_AreReadByTheHour_AskedApartFromCarriedAlong) {
 
 TEST_P(StoreRules, AskedHandles_GiveWhatIsSeenOfEach_WhoeverTheyAre) {
     ASSERT_TRUE(keep({fix(kNow - 20), fix(kNow - 10, 50.3)}));
-    const auto asked = store_->asked(otto_, {"nobody@x.example", "ANN@x.example", "mara@x.example", "ann@x.example"});
+    const auto asked =
+        store_->asked(otto_, {"nobody@x.example", "ANN@x.example", "mara@x.example", "ann@x.example"}, kNow);
     ASSERT_TRUE(asked);
     ASSERT_EQ(asked->size(), 4U);
     EXPECT_EQ((*asked)[0].person, 0);
@@ -278,7 +279,7 @@ TEST_P(StoreRules, AskedHandles_GiveWhatIsSeenOfEach_WhoeverTheyAre) {
         EXPECT_EQ(Visibility::visible((*asked)[ann].sharing, kNow), seen(otto_));
         EXPECT_EQ((*asked)[ann].sharing.fixes.size(), 1U) << "no more than is seen";
     }
-    EXPECT_EQ(Visibility::visible(store_->friendsOf(otto_).at(0).sharing, kNow), seen(otto_));
+    EXPECT_EQ(Visibility::visible(store_->friendsOf(otto_, kNow).at(0).sharing, kNow), seen(otto_));
 }
 
 TEST_P(StoreRules, NewestFix_IsTheNewestOfThoseHeardSinceTheShowing) {
@@ -287,7 +288,7 @@ TEST_P(StoreRules, NewestFix_IsTheNewestOfThoseHeardSinceTheShowing) {
     ASSERT_TRUE(hides());
     ASSERT_TRUE(store_->setHidden(ann_, false, kNow + 100));
     ASSERT_TRUE(keep({{kNow + 110, kNow + 110, 50.3, -3.1, 12.0}}, kNow + 110));
-    const auto asked = store_->asked(otto_, {"ann@x.example"});
+    const auto asked = store_->asked(otto_, {"ann@x.example"}, kNow + 300);
     ASSERT_TRUE(asked);
     const auto what = Visibility::visible(asked->at(0).sharing, kNow + 300);
     ASSERT_TRUE(what);
@@ -295,12 +296,33 @@ TEST_P(StoreRules, NewestFix_IsTheNewestOfThoseHeardSinceTheShowing) {
     EXPECT_EQ(what, seen(otto_, kNow + 300));
 }
 
+TEST_P(StoreRules, CoarseGrant_ReadsTheLastSlots_NotTwoDaysOfMinutes) {
+    ASSERT_TRUE(store_->addPerson("kim", {}, kNow));
+    const std::int64_t kim = store_->personNamed("kim")->id;
+    ASSERT_TRUE(store_->setPlace(ann_, {0, "Field", "", 50.3, -3.1, 500.0, true}));
+    ASSERT_TRUE(store_->grant(ann_, otto_, {Precision::Kilometre, kNow - 2 * kDay, std::nullopt}));
+    ASSERT_TRUE(store_->grant(ann_, mara_, {Precision::Town, kNow - 2 * kDay, std::nullopt}));
+    ASSERT_TRUE(store_->grant(ann_, kim, {Precision::Places, kNow - 2 * kDay, std::nullopt}));
+    std::vector<Fix> fixes;
+    for (std::int64_t time = kNow - 2 * kDay + 3600; time < kNow; time += 60) {
+        fixes.push_back(fix(time, time < kNow - 600 ? 50.2 : 50.3));
+    }
+    ASSERT_TRUE(keep(fixes));
+    for (const std::int64_t viewer : {otto_, mara_, kim}) {
+        const auto asked = store_->asked(viewer, {"ann@x.example"}, kNow);
+        ASSERT_TRUE(asked);
+        EXPECT_LE(asked->at(0).sharing.fixes.size(), 4U);
+        ASSERT_TRUE(seen(viewer));
+        EXPECT_EQ(Visibility::visible(asked->at(0).sharing, kNow), seen(viewer));
+    }
+}
+
 TEST_P(StoreRules, EndedGrant_ReadsNothing) {
     ASSERT_TRUE(keep({fix(kNow - 20)}));
     ASSERT_TRUE(store_->grant(ann_, otto_, {Precision::Exact, kNow - 1000, kNow + 5}));
     store_->present(kNow + 5);
-    EXPECT_TRUE(store_->asked(otto_, {"ann@x.example"})->at(0).sharing.fixes.empty());
-    EXPECT_TRUE(store_->friendsOf(otto_).at(0).sharing.fixes.empty());
+    EXPECT_TRUE(store_->asked(otto_, {"ann@x.example"}, kNow)->at(0).sharing.fixes.empty());
+    EXPECT_TRUE(store_->friendsOf(otto_, kNow).at(0).sharing.fixes.empty());
 }
 
 TEST_P(StoreRules, Zone_IsKept) {

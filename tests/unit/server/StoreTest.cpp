@@ -49,11 +49,11 @@ TEST_P(StoreBasics, Grants_AreReplacedAndRevoked) {
     EXPECT_EQ(store_->sharing(mara_, ann_)->grant, (Grant{Precision::Town, kNow, kNow + 60}));
     EXPECT_EQ(store_->sharing(ann_, mara_)->grant, std::nullopt) << "one way only";
     EXPECT_EQ(store_->grantsOf(ann_).size(), 2U);
-    EXPECT_EQ(store_->friendsOf(mara_).size(), 1U);
+    EXPECT_EQ(store_->friendsOf(mara_, kNow).size(), 1U);
     EXPECT_TRUE(store_->revokeGrant(ann_, mara_));
     EXPECT_FALSE(store_->revokeGrant(ann_, mara_));
     EXPECT_EQ(store_->sharing(mara_, ann_)->grant, std::nullopt);
-    EXPECT_TRUE(store_->friendsOf(mara_).empty());
+    EXPECT_TRUE(store_->friendsOf(mara_, kNow).empty());
 }
 
 TEST_P(StoreBasics, Secrets_AreKeptAsHashes_AndEndWhenRevoked) {

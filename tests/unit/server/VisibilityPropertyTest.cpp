@@ -18,6 +18,9 @@ using server::AskedFriend;
 using server::Cell;
 using server::CommandPlace;
 using server::Fix;
+using server::FixEdge;
+using server::FixRange;
+using server::FixSource;
 using server::Grant;
 using server::LocationAnswers;
 using server::LocationsRequest;
@@ -226,6 +229,46 @@ TEST_P(VisibilityPropertyTest, MovesWithinACell_AreNotSeenBelowExactPrecision) {
         ASSERT_TRUE(alike(sharing, other)) << "round " << round << ", " << wordOf(precision);
     }
     EXPECT_GT(visible, rounds() / 10);
+}
+
+TEST_P(VisibilityPropertyTest, WhatIsNeededOfAHistory_SaysTheSameAsAllOfIt) {
+    std::size_t all = 0;
+    std::size_t read = 0;
+    for (int round = 0; round < rounds(); ++round) {
+        Sharing sharing = drawn();
+        // A dense stretch beside what is strewn over days: to and fro over the edges of cells, or at rest.
+        const std::int64_t begin = kNow - between(0, kDay);
+        const std::int64_t pause = between(30, 2000);
+        const double stride = between(0, 2) == 0 ? 0.0 : real(0.0, 0.03);
+        for (std::int64_t i = between(0, 60); i > 0; --i) {
+            const std::int64_t time = begin + i * pause;
+            sharing.fixes.push_back({time, between(0, 9) == 0 ? kNow - between(0, 1000) : time,
+                                     50.0 + stride * static_cast<double>(between(0, 2)), -3.0, 12.0});
+        }
+        sharing.places.push_back({99, "Fifty", "", 50.0, -3.0, 1000.0, true});
+        sort(sharing);
+        // A store keeps each time once.
+        sharing.fixes.erase(std::unique(sharing.fixes.begin(), sharing.fixes.end(),
+                                        [](const Fix& a, const Fix& b) { return a.time == b.time; }),
+                            sharing.fixes.end());
+        const FixSource source = [&](const FixRange& range, FixEdge edge) -> std::optional<Fix> {
+            std::optional<Fix> found;
+            for (const Fix& fix : sharing.fixes) {
+                if (range.holds(fix) && (!found || edge == FixEdge::Last)) {
+                    found = fix;
+                }
+            }
+            return found;
+        };
+        const std::int64_t now = kNow + between(-7200, 7200);
+        Sharing thin = sharing;
+        thin.fixes = Visibility::needed(sharing, now, source);
+        all += sharing.fixes.size();
+        read += thin.fixes.size();
+        ASSERT_EQ(Visibility::visible(thin, now), Visibility::visible(sharing, now))
+            << "round " << round << ", " << wordOf(sharing.grant->precision);
+    }
+    EXPECT_LT(read, all / 5);
 }
 
 TEST_P(VisibilityPropertyTest, ProbingPositions_DoNotNarrowATown) {
