@@ -127,15 +127,19 @@ void HttpConnection::act(RequestReader::State state) {
             }
             break;
         case RequestReader::State::Done:
-            answerRequest();
+            answerRequest(setup_->handler);
             break;
         case RequestReader::State::Refused:
-            refuse();
+            if (reader_.status() == 413 && setup_->tooLong) {
+                answerRequest(setup_->tooLong);
+            } else {
+                refuse();
+            }
             break;
     }
 }
 
-void HttpConnection::answerRequest() {
+void HttpConnection::answerRequest(const HttpHandler& handler) {
     deadline_.cancel();
     keepsAlive_ = reader_.keepsAlive();
     answering_ = true;
@@ -162,7 +166,7 @@ void HttpConnection::answerRequest() {
             self->send(std::move(*answer));
         });
     });
-    setup_->handler(std::move(request), std::move(reply));
+    handler(std::move(request), std::move(reply));
 }
 
 void HttpConnection::tellClient(HttpRequest& request) const {

@@ -37,6 +37,7 @@ class HttpConnection : public std::enable_shared_from_this<HttpConnection> {
         std::shared_ptr<SSL_CTX> tls;  ///< none: without TLS
         HttpLimits limits;
         HttpHandler handler;
+        HttpHandler tooLong = {};  ///< for requests that are refused for their length; none: 413
         std::shared_ptr<EdgeCounters> counters;
     };
 
@@ -60,7 +61,7 @@ class HttpConnection : public std::enable_shared_from_this<HttpConnection> {
 
     void receive();
     void act(RequestReader::State state);
-    void answerRequest();
+    void answerRequest(const HttpHandler& handler);
     void tellClient(HttpRequest& request) const;
     void refuse();
     void send(HttpResponse response);

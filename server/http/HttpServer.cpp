@@ -163,6 +163,7 @@ class HttpServer::Listener {
         shared->tls = isFile ? nullptr : setup_.tls;
         shared->limits = setup_.limits;
         shared->handler = setup_.handler;
+        shared->tooLong = setup_.tooLong;
         shared->counters = counters_;
         return shared;
     }

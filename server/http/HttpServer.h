@@ -27,6 +27,9 @@ class HttpServer {
         std::vector<int> inherited = {};    ///< sockets that whoever started this process made
         HttpLimits limits;
         HttpHandler handler;
+        /// Answers a request whose body is longer than the limits say, by its header alone: the body is not read, and
+        /// the connection ends with the answer. None: such a request gets 413.
+        HttpHandler tooLong = {};
         int threads = 2;
     };
 

@@ -103,7 +103,7 @@ RequestReader::State RequestReader::readHeader() {
     }
     const std::size_t used = parser_->put(std::string_view(waiting_).substr(0, end));
     if (parser_->failure == http::error::body_limit) {
-        return refuse(413, "the body is too long");
+        return checkHeader() == State::Refused ? state_ : refuse(413, "the body is too long");
     }
     if (parser_->failure || !parser_->message.is_header_done() || used != end) {
         return refuse(400, "the header is not one of HTTP/1.1");

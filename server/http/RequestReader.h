@@ -37,7 +37,7 @@ class RequestReader {
     bool begun() const { return !waiting_.empty(); }
     /// In `Body`: whether the client waits to be told to go on (RFC 9110, 10.1.1).
     bool wantsContinue() const;
-    /// In `Done`: the request, without its peer; once.
+    /// In `Done`: the request, without its peer; once. In `Refused` with the status 413: its header.
     HttpRequest take();
     /// In `Done`: whether the client may send another one.
     bool keepsAlive() const;

@@ -53,6 +53,9 @@ HttpServer::Setup Service::httpSetup(Setup& setup) {
     http.handler = [this](const HttpRequest& request, const HttpReply& reply) {
         route(request, traffic_.watched(request, reply));
     };
+    http.tooLong = [this](const HttpRequest& request, const HttpReply& reply) {
+        takeTooLong(request, traffic_.watched(request, reply));
+    };
     if (setup.around) {
         http.handler = [around = std::move(setup.around), service = std::move(http.handler)](HttpRequest request,
                                                                                              HttpReply reply) {
@@ -205,6 +208,21 @@ void Service::takeOwnTracks(const HttpRequest& request, const HttpReply& reply) 
                          reply.send(HttpResponse::json(200, PhoneFriends(*store_).answer(device, report, now_())));
                      });
                  });
+}
+
+void Service::takeTooLong(const HttpRequest& request, const HttpReply& reply) {
+    const bool isPub = request.path == "/pub";
+    const std::string secret = isPub ? "" : PhoneMessages::parameters(request.query).device;
+    const bool saysWho = request.header("Authorization") != nullptr || !secret.empty();
+    if (!isForUs(request) || request.method != "POST" || !(isPub || request.path == "/") || !saysWho) {
+        return reply.send(refusal(413, "the body is too long"));
+    }
+    if (const auto device = authenticated(request, secret, DeviceKind::Phone, reply)) {
+        // A phone would drop it with an alarm, or send it for ever before anything else.
+        ++counters_.posts;
+        ++counters_.junk;
+        reply.send(isPub ? HttpResponse::json(200, "[]") : HttpResponse());
+    }
 }
 
 std::optional<std::string> Service::cleanedFace(const Report& report) {

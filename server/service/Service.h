@@ -66,6 +66,8 @@ class Service {
     void refuseCredentials(const HttpRequest& request, const HttpReply& reply);
     void takeOwnTracks(const HttpRequest& request, const HttpReply& reply);
     void takeParameters(const HttpRequest& request, const HttpReply& reply);
+    /// A request whose body is too long to be read.
+    void takeTooLong(const HttpRequest& request, const HttpReply& reply);
     /// What of a report is kept; counts the rest.
     std::vector<Fix> admitted(const Device& device, const Report& report);
     /// The face that a report brings, if it is one; counts what is none.

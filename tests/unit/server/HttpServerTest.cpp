@@ -77,6 +77,31 @@ TEST_F(HttpServerTest, BodyThatIsTooLong_IsRefusedBeforeItIsRead_AndSeenToBe) {
     EXPECT_EQ(client.read("}").rfind("HTTP/1.1 413 ", 0), 0U);
 }
 
+TEST_F(HttpServerTest, BodyThatIsTooLong_MayBeAnsweredByItsHeader_AndEndsTheConnection) {
+    HttpServer::Setup tolerant = setup();
+    tolerant.tooLong = [](const HttpRequest& request, const HttpReply& reply) {
+        reply.send(HttpResponse::json(200, "{" + request.path + " " + request.headerText("X-Who") + " " +
+                                               std::to_string(request.body.size()) + "}"));
+    };
+    HttpServer server(std::move(tolerant));
+    ASSERT_EQ(server.start(), "");
+    const std::string hidden = "GET /hidden HTTP/1.1\r\nHost: a\r\n\r\n";
+    for (const char* length : {"Content-Length: 1100000\r\n\r\n", "Transfer-Encoding: chunked\r\n\r\n200000\r\n"}) {
+        const RawClient client(server.port());
+        client.send("POST /a HTTP/1.1\r\nHost: a\r\nX-Who: ann\r\n" + std::string(length));
+        for (int i = 0; i < 11; ++i) {
+            client.send(hidden + std::string(100000, 'x'));
+        }
+        const std::string answer = client.read("(never)");
+        EXPECT_EQ(answer.rfind("HTTP/1.1 200 ", 0), 0U) << answer;
+        EXPECT_TRUE(answer.ends_with("{/a ann 0}(end)")) << answer << " and nothing of the body is a request";
+    }
+    // What could mean anything has nobody to ask.
+    const RawClient client(server.port());
+    client.send("POST /a HTTP/1.1\r\nHost: a\r\nHost: b\r\nContent-Length: 1100000\r\n\r\n");
+    EXPECT_EQ(client.read("(never)").rfind("HTTP/1.1 400 ", 0), 0U);
+}
+
 TEST_F(HttpServerTest, SilentAndDrippingClients_AreClosedAtTheDeadlineForTheWhole) {
     auto short_ = setup();
     short_.limits.headerTime = milliseconds(300);
