@@ -125,7 +125,11 @@ HttpResponse PeoplesPage::answerTo(const PageRequest& request, double& delay) {
     const PageLanguage language(tag, person->zone.empty() ? WallClock::machineZone() : person->zone);
     const PageContext context{language, token, setup_.store.present(now), person->name,
                               person->handles.empty() ? person->name : person->handles.front()};
-    return own_.answer(request, {context, *browser, *person});
+    const std::uint64_t failures = setup_.store.readFailures();
+    HttpResponse response = own_.answer(request, {context, *browser, *person});
+    // "Nobody sees you" would be said by a list that could not be read.
+    return setup_.store.readFailures() == failures ? std::move(response)
+                                                   : saying(503, language, "NOT_KEPT", nullptr, true);
 }
 
 }  // namespace ktr::server

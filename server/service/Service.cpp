@@ -26,7 +26,8 @@ constexpr double kSweepPause = 1.0;
 /// The host of a Host header, without its port.
 std::string hostOf(const std::string& header) {
     const std::size_t colon = header.rfind(':');
-    const bool hasPort = colon != std::string::npos && header.find(']', colon) == std::string::npos;
+    const bool hasPort = colon != std::string::npos && colon + 1 < header.size() &&
+                         header.find_first_not_of("0123456789", colon + 1) == std::string::npos;
     return hasPort ? header.substr(0, colon) : header;
 }
 
@@ -205,7 +206,13 @@ void Service::takeOwnTracks(const HttpRequest& request, const HttpReply& reply) 
                          return reply.send(refusal(503, "the store cannot be written"));
                      }
                      http_.later(0.0, [this, device, report, reply] {
-                         reply.send(HttpResponse::json(200, PhoneFriends(*store_).answer(device, report, now_())));
+                         const std::uint64_t failures = store_->readFailures();
+                         const std::string friends = PhoneFriends(*store_).answer(device, report, now_());
+                         if (store_->readFailures() != failures) {
+                             ++counters_.storeFailures;
+                             return reply.send(refusal(503, "the store cannot be read"));
+                         }
+                         reply.send(HttpResponse::json(200, friends));
                      });
                  });
 }

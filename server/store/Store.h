@@ -1,5 +1,6 @@
 #pragma once
 
+#include <atomic>
 #include <condition_variable>
 #include <cstdint>
 #include <deque>
@@ -59,6 +60,9 @@ class Store {
 
     // Reading.
 
+    /// How many reads have failed. What is put together of several reads that each say "none" is true if this is the
+    /// same before and after.
+    std::uint64_t readFailures() const { return readFailures_; }
     /// Whose secret this is, if it is not revoked. None with `failed` set: the store could not be read.
     std::optional<Device> deviceOf(std::string_view secret, bool& failed);
     /// Who has this handle: e-mail addresses in any case, phone numbers by their digits and "+".
@@ -160,13 +164,20 @@ class Store {
     /// The connection that reads, for as long as this lives.
     class Reading {
       public:
-        explicit Reading(Store& store) : lock_(store.readMutex_), database_(*store.reading_) { database_.refresh(); }
+        explicit Reading(Store& store)
+            : lock_(store.readMutex_), database_(*store.reading_), failures_(store.readFailures_) {
+            database_.refresh();
+        }
+        ~Reading() { failures_ += database_.failed() ? 1 : 0; }
+        Reading(const Reading&) = delete;
+        Reading& operator=(const Reading&) = delete;
         Database* operator->() const { return &database_; }
         Database& operator*() const { return database_; }
 
       private:
         const std::lock_guard<std::mutex> lock_;
         Database& database_;
+        std::atomic<std::uint64_t>& failures_;
     };
     enum class Outcome {
         Kept,
@@ -205,6 +216,7 @@ class Store {
     static std::optional<Fix> readEdge(Database& database, std::int64_t owner, const FixRange& range, FixEdge edge);
     static void endBrowsersIn(Database& database, std::int64_t person);
 
+    std::atomic<std::uint64_t> readFailures_ = 0;
     std::mutex readMutex_;
     std::unique_ptr<Database> reading_;
     std::unique_ptr<Database> writing_;

@@ -1,6 +1,7 @@
 // The part of the store that only reads: beside what is written.
 #include <algorithm>
 
+#include "platform/base/Utf8.h"
 #include "server/store/Secret.h"
 #include "server/store/Store.h"
 
@@ -11,6 +12,11 @@ namespace {
 /// Five columns: time, heard, latitude, longitude, accuracy.
 Fix fixOf(const Database::Run& row) {
     return {row.integer(0), row.integer(1), row.real(2), row.real(3), row.maybeReal(4)};
+}
+
+/// Whether a database takes it: nobody has a name or a handle that it would not.
+bool isText(std::string_view text) {
+    return text.find('\0') == std::string_view::npos && platform::isValidUtf8(text);
 }
 
 }  // namespace
@@ -45,6 +51,9 @@ std::optional<Device> Store::deviceOf(std::string_view secret, bool& failed) {
 }
 
 std::optional<std::int64_t> Store::personOf(std::string_view handle) {
+    if (!isText(handle)) {
+        return std::nullopt;
+    }
     const Reading reading(*this);
     auto row = reading->statement("SELECT person FROM handle WHERE text = $1");
     return row.bind(std::string_view(normalisedHandle(handle))).next() ? std::optional(row.integer(0)) : std::nullopt;
@@ -82,6 +91,9 @@ std::optional<Person> Store::person(std::int64_t id) {
 }
 
 std::optional<Person> Store::personNamed(std::string_view name) {
+    if (!isText(name)) {
+        return std::nullopt;
+    }
     std::int64_t id = 0;
     {
         const Reading reading(*this);
@@ -163,7 +175,7 @@ std::optional<std::vector<Asked>> Store::asked(std::int64_t viewer, const std::v
             "SELECT person.id, hidden, shown_since, retention, (SELECT latest FROM clock), exactness, since, until, "
             "arrival, aloud, confirmed FROM handle JOIN person ON person.id = handle.person "
             "LEFT JOIN share ON share.owner = person.id AND share.viewer = $1 WHERE handle.text = $2");
-        if (row.bind(viewer).bind(normalisedHandle(handle)).next()) {
+        if (isText(handle) && row.bind(viewer).bind(normalisedHandle(handle)).next()) {
             one.person = row.integer(0);
             one.sharing = sharingOf(row, 1);
             readSight(*reading, one.person, now, one.sharing);

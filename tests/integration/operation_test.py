@@ -3,6 +3,7 @@
 
   operation_test.py SERVICE [unittest options]
 """
+import json
 import os
 import pathlib
 import re
@@ -124,6 +125,25 @@ class OperationTest(unittest.TestCase):
         self.assertIn("level=error event=store-failing", log)
         self.assertIn("event=failed route=phone status=503", log)
         self.assertIn("event=store-mended", log)
+
+    def test_store_that_cannot_be_read_is_not_said_to_know_nobody(self):
+        service = self.service
+        secret = service.add("Ann")
+        reader = service.reader("Ann")
+        service.start("--socket", service.socket)
+        other = sqlite3.connect(service.folder / "data" / "service.db", isolation_level=None)
+        self.addCleanup(other.close)
+        for table in ("share", "device", "person", "fix"):
+            other.execute(f"ALTER TABLE {table} RENAME TO gone")
+            if table != "fix":  # which is read of those alone who are seen
+                self.assertEqual(service.ask("Ann", reader, "nobody@x.example", by_socket=True)[0], 503, table)
+            status = service.post("Ann", secret, True, _type="location", lat=1, lon=2, tst=int(time.time()))[0]
+            self.assertEqual(status, 503, table)
+            other.execute(f"ALTER TABLE gone RENAME TO {table}")
+        status, text = service.ask("Ann", reader, "a\0@x.example", "nobody@x.example", by_socket=True)
+        self.assertEqual((status, len(json.loads(text)["emails"])), (200, 2), "no text of a handle is a failure")
+        self.assertEqual(service.ask("Ann", reader, "nobody@x.example", by_socket=True)[0], 200)
+        self.assertEqual(service.post("Ann", secret, True, _type="location", lat=1, lon=2, tst=int(time.time()))[0], 200)
 
     def test_wrong_secrets_are_delayed_by_the_address_that_the_proxy_names(self):
         service = self.service

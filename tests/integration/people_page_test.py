@@ -161,11 +161,12 @@ class PeoplePageTest(unittest.TestCase):
     def test_another_host_is_none_of_ours(self):
         import ssl
         context = ssl.create_default_context(cafile=self.folder / "data" / "ca.pem")
-        request = urllib.request.Request(self.origin + "/me", headers={"Host": "evil.example"})
-        with self.assertRaises(urllib.error.HTTPError) as refused:
-            urllib.request.urlopen(request, context=context, timeout=20)
-        self.assertEqual(refused.exception.code, 421)
-        refused.exception.close()
+        for host in ("evil.example", "localhost:1@evil.example", "localhost:", "localhost.evil.example"):
+            request = urllib.request.Request(self.origin + "/me", headers={"Host": host})
+            with self.assertRaises(urllib.error.HTTPError) as refused:
+                urllib.request.urlopen(request, context=context, timeout=20)
+            self.assertEqual(refused.exception.code, 421, host)
+            refused.exception.close()
 
     def pages(self):
         """The address of each page, with a rule that ends and one that does not."""

@@ -63,6 +63,25 @@ TEST_F(OwnPagesTest, Rule_IsChanged_AndEnded) {
     EXPECT_EQ(get(address()).status, 404);
 }
 
+TEST_F(OwnPagesTest, KeepSharing_IsAskedAfter90Days_AndAnswersForAnother90) {
+    constexpr std::int64_t kDay = 86400;
+    ASSERT_TRUE(store_->grant(mara_, lea_, {Precision::Exact, now_, std::nullopt}));
+    signIn();
+    EXPECT_FALSE(has(get(address()), "Keep sharing"));
+    EXPECT_EQ(post("/me/sees/999/keep").status, 303);
+    now_ += 91 * kDay;
+    signIn();
+    EXPECT_TRUE(has(get(address()), "Keep sharing"));
+    EXPECT_EQ(headerOf(post(address("/keep")), "Location"), address("?saved"));
+    EXPECT_EQ(leasGrant()->confirmed, now_);
+    EXPECT_EQ(leasGrant()->end(), now_ + 97 * kDay);
+    EXPECT_FALSE(has(get(address()), "Keep sharing")) << "it is answered";
+    now_ += 98 * kDay;
+    signIn();
+    post(address("/keep"));
+    EXPECT_LE(leasGrant()->end(), now_) << "nobody answered for seven days: it began again by nothing";
+}
+
 TEST_F(OwnPagesTest, EndThatWasNotTouched_StaysOnItsDay) {
     signIn();
     const std::int64_t end = now_ + 5 * 86400;

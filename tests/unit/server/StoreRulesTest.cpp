@@ -282,6 +282,21 @@ TEST_P(StoreRules, AskedHandles_GiveWhatIsSeenOfEach_WhoeverTheyAre) {
     EXPECT_EQ(Visibility::visible(store_->friendsOf(otto_, kNow).at(0).sharing, kNow), seen(otto_));
 }
 
+TEST_P(StoreRules, HandlesThatAreNoText_AreNobodys_AndHideNobodyElse) {
+    ASSERT_TRUE(keep({fix(kNow - 10)}));
+    const std::string zero("a\0@x.example", 12);
+    const auto asked = store_->asked(otto_, {zero, "\xff@x.example", "\xff", "ann@x.example"}, kNow);
+    ASSERT_TRUE(asked);
+    EXPECT_EQ((*asked)[0].person, 0);
+    EXPECT_EQ((*asked)[1].person, 0);
+    EXPECT_EQ((*asked)[2].person, 0);
+    EXPECT_EQ((*asked)[3].person, ann_);
+    EXPECT_TRUE(Visibility::visible((*asked)[3].sharing, kNow));
+    EXPECT_EQ(store_->personOf(zero), std::nullopt);
+    EXPECT_FALSE(store_->personNamed(zero));
+    EXPECT_EQ(store_->readFailures(), 0U);
+}
+
 TEST_P(StoreRules, NewestFix_IsTheNewestOfThoseHeardSinceTheShowing) {
     // By a clock that is ahead, before the hiding; then by one that was put right.
     ASSERT_TRUE(keep({{kNow + 250, kNow, 50.2, -3.1, 12.0}}));
