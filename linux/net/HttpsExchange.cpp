@@ -133,7 +133,7 @@ void HttpsExchange::write() {
     }
     std::string text = request_.method + " " + targetOf(url_) + " HTTP/1.1\r\n";
     for (const auto& [name, value] : fields) {
-        text += name + ": " + value + "\r\n";
+        text.append(name).append(": ").append(value).append("\r\n");
     }
     text += "\r\n" + request_.body;
     hasLeft_ = true;

@@ -48,7 +48,7 @@ class TimedData final : public QIODevice {
 QImage upright(const QImage& stored, int orientation) {
     constexpr int kMirrored[] = {2, 4, 5, 7};
     const bool isMirrored = std::find(std::begin(kMirrored), std::end(kMirrored), orientation) != std::end(kMirrored);
-    const QImage image = isMirrored ? stored.mirrored(true, false) : stored;
+    QImage image = isMirrored ? stored.mirrored(true, false) : stored;
     switch (orientation) {
         case 3:
         case 4:
