@@ -77,7 +77,9 @@ std::vector<server::HttpRequest> LocationService::posts(const std::vector<std::s
     asked.erase(std::unique(asked.begin(), asked.end()), asked.end());
     std::vector<server::HttpRequest> posts;
     for (const std::size_t number : asked) {
-        if (const auto place = file_.friends[number].placeAt(moment.seconds)) {
+        const ServedFriend& person = file_.friends[number];
+        people_.setHidden(number, person.hidesAt(moment.seconds), moment.wholeSeconds());
+        if (const auto place = person.placeAt(moment.seconds)) {
             posts.push_back(people_.post(number, *place, moment.wholeSeconds()));
         }
     }

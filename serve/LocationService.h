@@ -34,7 +34,7 @@ class LocationService {
     SharingState& sharing() const { return *sharing_; }
 
     /// What the phones of those who are asked for send at this moment, as it reaches the service: of those who are
-    /// found.
+    /// found. Whoever hides from now on, or no longer, does so in the service first.
     std::vector<server::HttpRequest> posts(const std::vector<std::string>& handles, const ServiceMoment& moment) const;
     /// Adds to the service's answer to a get-locations command what the friends file says beyond positions, and what
     /// the fault asks for.

@@ -30,16 +30,15 @@ MadeUpPeople::MadeUpPeople(const FriendsFile& file, const std::string& personId,
 
 bool MadeUpPeople::make(const FriendsFile& file, const std::string& personId, const std::string& token,
                         std::int64_t now) {
-    std::vector<std::int64_t> friends;
     for (const ServedFriend& person : file.friends) {
         const std::string name = nameOf(secrets_.size());
         const auto secret = server::Secret::make();
         if (!secret || !add(name, person, now)) {
             return false;
         }
-        friends.push_back(store_->personNamed(name)->id);
+        friends_.push_back(store_->personNamed(name)->id);
         secrets_.push_back(*secret);
-        if (!store_->addDevice(friends.back(), DeviceKind::Phone, *secret, "", now)) {
+        if (!store_->addDevice(friends_.back(), DeviceKind::Phone, *secret, "", now)) {
             return false;
         }
     }
@@ -50,7 +49,7 @@ bool MadeUpPeople::make(const FriendsFile& file, const std::string& personId, co
     bool failed = !store_->addDevice(owner_, DeviceKind::Reader, token, "", now);
     const auto reader = store_->deviceOf(token, failed);
     reader_ = reader ? reader->id : 0;
-    return reader && std::all_of(friends.begin(), friends.end(), [&](std::int64_t person) {
+    return reader && std::all_of(friends_.begin(), friends_.end(), [&](std::int64_t person) {
                return store_->grant(person, owner_, {server::Precision::Exact, now, std::nullopt});
            });
 }
@@ -69,6 +68,13 @@ bool MadeUpPeople::add(const std::string& name, const ServedFriend& person, std:
         }
     }
     return store_->addPerson(name, handles, now);
+}
+
+void MadeUpPeople::setHidden(std::size_t number, bool hidden, std::int64_t now) const {
+    const std::int64_t id = friends_.at(number);
+    if (const auto person = store_->person(id); person && person->hidden != hidden) {
+        store_->setHidden(id, hidden, now);
+    }
 }
 
 server::HttpRequest MadeUpPeople::post(std::size_t number, const Waypoint& place, std::int64_t now) const {

@@ -25,6 +25,8 @@ class MadeUpPeople {
     std::int64_t owner() const { return owner_; }
     std::int64_t reader() const { return reader_; }
 
+    /// Hides the file's friend of this number, or shows them again; nothing where it is so already.
+    void setHidden(std::size_t number, bool hidden, std::int64_t now) const;
     /// What the phone of the file's friend of this number sends from a place, as it reaches the service.
     server::HttpRequest post(std::size_t number, const Waypoint& place, std::int64_t now) const;
 
@@ -34,7 +36,8 @@ class MadeUpPeople {
 
     std::shared_ptr<server::Store> store_;
     std::string complaint_;
-    std::vector<std::string> secrets_;  ///< of the phones, in the file's order
+    std::vector<std::string> secrets_;   ///< of the phones, in the file's order
+    std::vector<std::int64_t> friends_;  ///< as the store knows them, in the same order
     std::int64_t owner_ = 0;
     std::int64_t reader_ = 0;
 };

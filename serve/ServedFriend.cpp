@@ -7,18 +7,35 @@
 
 namespace ktr::serve {
 
-std::optional<Waypoint> ServedFriend::placeAt(double seconds) const {
-    if (track.empty() || hidden || seconds < locatedAfter) {
-        return std::nullopt;
-    }
+namespace {
+
+auto waypointAfter(const std::vector<Waypoint>& track, double moment) {
+    return std::upper_bound(track.begin(), track.end(), moment,
+                            [](double at, const Waypoint& waypoint) { return at < waypoint.at; });
+}
+
+}  // namespace
+
+double ServedFriend::momentOf(double seconds) const {
     const double end = track.back().at;
-    const double moment = repeats && end > 0.0 && seconds > end ? std::fmod(seconds, end) : seconds;
-    const auto next = std::upper_bound(track.begin(), track.end(), moment,
-                                       [](double at, const Waypoint& waypoint) { return at < waypoint.at; });
-    Waypoint place = next == track.begin() ? *next : *(next - 1);
-    if (place.hidden) {
+    return repeats && end > 0.0 && seconds > end ? std::fmod(seconds, end) : seconds;
+}
+
+bool ServedFriend::hidesAt(double seconds) const {
+    if (hidden || track.empty()) {
+        return hidden;
+    }
+    const auto next = waypointAfter(track, momentOf(seconds));
+    return (next == track.begin() ? next : next - 1)->hidden;
+}
+
+std::optional<Waypoint> ServedFriend::placeAt(double seconds) const {
+    if (track.empty() || seconds < locatedAfter || hidesAt(seconds)) {
         return std::nullopt;
     }
+    const double moment = momentOf(seconds);
+    const auto next = waypointAfter(track, moment);
+    Waypoint place = next == track.begin() ? *next : *(next - 1);
     if (next != track.begin() && next != track.end()) {
         const double part = (moment - place.at) / (next->at - place.at);
         place.latitude += part * (next->latitude - place.latitude);

@@ -34,10 +34,16 @@ struct ServedFriend {
     /// Between two waypoints in proportion to the time; accuracy and address are those of the waypoint last passed.
     /// None while the friend is not found or a waypoint hides them.
     std::optional<Waypoint> placeAt(double seconds) const;
+    /// Whether the friend hides then: always, or since the waypoint last passed.
+    bool hidesAt(double seconds) const;
     /// E-mail addresses regardless of case, phone numbers by their digits and "+".
     bool answersTo(const std::string& handle) const;
     /// The first e-mail address, else the first phone number; empty without either.
     std::string handle() const;
+
+  private:
+    /// Of the track, which is not empty.
+    double momentOf(double seconds) const;
 };
 
 /// What a friends file says.

@@ -106,6 +106,30 @@ TEST_F(LocationServiceTest, PhonesOfThoseWhoAreAskedFor_PostWhereTheyAre_AsAnyPh
     EXPECT_EQ(service.posts({}, kMoment).size(), 0U);
 }
 
+TEST_F(LocationServiceTest, WaypointThatHides_HidesInTheServiceUntilTheNext_WhereverTheFriendWasBefore) {
+    FriendsFile file = people();
+    auto& track = file.friends.front().track;
+    const auto place = track.front();
+    track.insert(track.end(), {place, place});
+    track[1].at = 10.0;
+    track[1].hidden = true;
+    track[2].at = 20.0;
+    file.friends.front().repeats = false;
+    const LocationService moving{file, "1000", "token", kMoment.wholeSeconds()};
+    server::Store& store = *moving.people().store();
+    const auto ann = store.personOf("ann@b.example");
+    ASSERT_TRUE(ann);
+    const auto postsAt = [&](double seconds) {
+        return moving.posts({"ann@b.example"}, {seconds, kMoment.millisecondsSince1970 + seconds * 1000.0}).size();
+    };
+    EXPECT_EQ(postsAt(5.0), 1U);
+    EXPECT_FALSE(store.person(*ann)->hidden);
+    EXPECT_EQ(postsAt(15.0), 0U);
+    EXPECT_TRUE(store.person(*ann)->hidden) << "what was posted before would still be seen";
+    EXPECT_EQ(postsAt(25.0), 1U);
+    EXPECT_FALSE(store.person(*ann)->hidden);
+}
+
 TEST_F(LocationServiceTest, PeopleOfTheFile_ArePeopleOfAService_WhoShareExactlyWithTheUser) {
     server::Store& store = *service.people().store();
     EXPECT_EQ(service.people().complaint(), "");
