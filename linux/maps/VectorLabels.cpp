@@ -280,9 +280,10 @@ void VectorLabels::placeAreas(MapLabels& labels, tiles::MapKind kind) {
             continue;
         }
         const auto spots = candidates(bounds, centroidOf(path));
-        const bool isPlaced = std::any_of(spots.begin(), spots.end(), [&, text = std::string(name)](const QPointF& spot) {
-            return holds(path, spot, label) && labels.placeAt(text, look, spot);
-        });
+        const bool isPlaced =
+            std::any_of(spots.begin(), spots.end(), [&, text = std::string(name)](const QPointF& spot) {
+                return holds(path, spot, label) && labels.placeAt(text, look, spot);
+            });
         if (!isPlaced && kind == tiles::MapKind::Park) {
             labels.placeAt(std::string(name), look, spots.front());
         }
