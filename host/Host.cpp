@@ -113,8 +113,10 @@ Host::~Host() {
         QCoreApplication::sendPostedEvents();
     }
     plugin_.reset();
-    // What cannot be kept is said while there is a log.
-    platform()->preferences.reset();
+    // What cannot be kept is said while there is a log. There is no platform where one could not be made.
+    if (platform()) {
+        platform()->preferences.reset();
+    }
     if (Platform::installed() == platform()) {
         Platform::install(nullptr);
     }
