@@ -74,6 +74,16 @@ class Administration {
     std::string looks(const std::string& name);
     /// A link that opens a person's own page in a browser, once; in a terminal also as a code for a camera.
     std::string link(const std::string& name, bool isTerminal);
+    /// Writes a backup while the service runs.
+    std::string backup(const std::string& file);
+    /// `replace`: also where there are people.
+    std::string restore(const std::string& file, bool replace);
+    /// After a restore: the person's readers work again.
+    std::string confirm(const std::string& name);
+    std::string exportPerson(const std::string& name, const std::string& file);
+    std::string forget(const std::string& name);
+    /// Durations such as "24h" and "7d"; empty: as it is. Says what holds.
+    std::string retention(const std::string& name, const std::string& fixes, const std::string& looks);
     std::string check();
     /// Where it serves. A value.
     struct Serving {

@@ -10,6 +10,7 @@
 #include "server/admin/Administration.h"
 #include "server/admin/FolderOwner.h"
 #include "server/admin/Help.h"
+#include "server/admin/KeepingCommands.h"
 #include "server/admin/RuleCommands.h"
 
 namespace {
@@ -83,6 +84,7 @@ int main(int count, char** words) {
     serve->add_option("--socket-group", where.place.group, "Group of the proxy's user, which may connect")
         ->needs(socket);
     const ktr::server::RuleCommands rules(program);
+    const ktr::server::KeepingCommands keeping(program);
     if (const auto ended = ktr::server::parsed(program, count, words)) {
         return *ended;
     }
@@ -112,8 +114,9 @@ int main(int count, char** words) {
                                   : *people  ? administration.people()
                                   : *link    ? administration.link(name, newcomer.coloured)
                                   : *check   ? administration.check()
-                                  : *serve   ? administration.serve(where)
-                                             : rules.run(administration).value_or("");
+                                  : *serve
+                                      ? administration.serve(where)
+                                      : rules.run(administration).value_or(keeping.run(administration).value_or(""));
     if (!complaint.empty()) {
         std::cerr << "ktr-service: " << complaint << std::endl;
         return EXIT_FAILURE;
