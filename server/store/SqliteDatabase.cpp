@@ -116,10 +116,9 @@ class SqliteDatabase::Cursor final : public Database::Rows {
     bool isOver_ = false;
 };
 
-std::unique_ptr<SqliteDatabase> SqliteDatabase::open(const std::string& file, std::string& complaint,
-                                                     const char* system) {
+std::unique_ptr<SqliteDatabase> SqliteDatabase::open(const std::string& file, std::string& complaint) {
     complaint = makeFile(file);
-    return complaint.empty() ? connect(file, complaint, system) : nullptr;
+    return complaint.empty() ? connect(file, complaint, nullptr) : nullptr;
 }
 
 std::unique_ptr<SqliteDatabase> SqliteDatabase::openInMemory(const std::string& name, std::string& complaint) {

@@ -18,9 +18,8 @@ namespace ktr::server {
 class SqliteDatabase final : public Database {
   public:
     /// Opens the file, and makes it (mode 0600) when it is missing. None, with the reason in `complaint`, when that
-    /// fails. `system`: the name of an SQLite file system other than the usual one.
-    static std::unique_ptr<SqliteDatabase> open(const std::string& file, std::string& complaint,
-                                                const char* system = nullptr);
+    /// fails.
+    static std::unique_ptr<SqliteDatabase> open(const std::string& file, std::string& complaint);
     /// All connections of this process with the same name have the same database, which is gone with the last of them.
     static std::unique_ptr<SqliteDatabase> openInMemory(const std::string& name, std::string& complaint);
     ~SqliteDatabase() override;
