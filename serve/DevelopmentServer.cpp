@@ -244,7 +244,7 @@ class DevelopmentServer::Server {
     }
 
     /// The phones of those who are asked for send where they are; then goes on.
-    void afterPosts(const Call& call, std::function<void()> then) {
+    void afterPosts(const Call& call, const std::function<void()>& then) {
         const auto body = objectOf(call.request.body);
         std::string complaint;
         const auto asks =

@@ -9,6 +9,7 @@ namespace ktr::linux_ {
 namespace {
 
 using platform::Bytes;
+// NOLINTNEXTLINE(misc-unused-using-decls): every "..."sv below uses it.
 using std::string_view_literals::operator""sv;
 
 std::uint32_t big(const Bytes& data, std::size_t at, std::size_t bytes) {

@@ -127,7 +127,7 @@ std::shared_ptr<const TextLayout> Label::textLayout() const {
     }
     const double width = bounds().width;
     if (numberOfLines_ == 1) {
-        const auto natural = naturalLayout();
+        auto natural = naturalLayout();
         if (natural && !natural->isTruncated() && natural->usedSize().width <= width + kFit) {
             return natural;
         }

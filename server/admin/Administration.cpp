@@ -127,7 +127,7 @@ std::string Administration::addWithPhone(const Newcomer& who) {
 
 std::string Administration::reader(const std::string& name, const std::string& tokenFile) {
     std::string configuration;
-    const std::string complaint = makeReader(name, tokenFile, configuration);
+    std::string complaint = makeReader(name, tokenFile, configuration);
     if (complaint.empty()) {
         out_ << configuration << "\n";
     }
@@ -253,7 +253,7 @@ std::string Administration::wordsOf(const Person& owner, const Grant& grant) {
 }
 
 std::string Administration::people() {
-    if (const std::string complaint = open(); !complaint.empty()) {
+    if (std::string complaint = open(); !complaint.empty()) {
         return complaint;
     }
     const std::int64_t present = store_->present(now_);

@@ -94,7 +94,7 @@ int main(int count, char** words) {
 
     const auto now =
         std::chrono::duration_cast<std::chrono::seconds>(std::chrono::system_clock::now().time_since_epoch()).count();
-    if (const std::string complaint = ktr::server::becomeOwnerOf(folder); !complaint.empty()) {
+    if (std::string complaint = ktr::server::becomeOwnerOf(folder); !complaint.empty()) {
         std::cerr << "ktr-service: " << complaint << std::endl;
         return EXIT_FAILURE;
     }

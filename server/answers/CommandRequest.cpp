@@ -12,7 +12,6 @@ namespace {
 using documents::Complaints;
 using documents::FieldReader;
 using platform::Dictionary;
-using platform::Value;
 
 std::optional<CommandPlace> readPlace(FieldReader& request, const std::string& name) {
     std::optional<CommandPlace> place;
