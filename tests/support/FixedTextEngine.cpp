@@ -103,6 +103,17 @@ struct Break {
     bool forced = false;
 };
 
+/// Where a line ends that has room up to `whole`, so that the next one begins with nothing that is bound to what is
+/// before. A line of such marks alone is filled.
+std::size_t forcedEnd(const std::vector<Glyph>& glyphs, std::size_t begin, std::size_t whole) {
+    const auto binds = [&](std::size_t at) { return at < glyphs.size() && isBoundToBefore(glyphs[at].code); };
+    std::size_t end = whole;
+    while (end > begin + 1 && binds(end)) {
+        --end;
+    }
+    return binds(end) ? whole : end;
+}
+
 Break breakAt(const std::vector<Glyph>& glyphs, std::size_t begin, double room) {
     double width = 0.0;
     std::size_t lastBlank = begin;
@@ -126,13 +137,7 @@ Break breakAt(const std::vector<Glyph>& glyphs, std::size_t begin, double room) 
             if (lastBlank > begin) {
                 return {lastBlank, lastBlank + 1, false, false};
             }
-            const std::size_t whole = std::max(i, begin + 1);
-            std::size_t end = whole;
-            while (end > begin + 1 && isBoundToBefore(glyphs[end].code)) {
-                --end;
-            }
-            // A line of such marks alone is filled.
-            end = isBoundToBefore(glyphs[end].code) ? whole : end;
+            const std::size_t end = forcedEnd(glyphs, begin, std::max(i, begin + 1));
             return {end, end, false, true};
         }
     }
