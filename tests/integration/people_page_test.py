@@ -88,6 +88,14 @@ class PeoplePageTest(unittest.TestCase):
             threading.Event().wait(0.05)
         self.fail(f"the page is {self.browser.title()!r}, not {title!r}")
 
+    def waitForWords(self, words):
+        """Where the page that comes has the title of the one that goes."""
+        for _ in range(200):
+            if words in self.browser.source():
+                return
+            threading.Event().wait(0.05)
+        self.fail(f"{words!r} is not on the page {self.browser.title()!r}")
+
     def test_by_keyboard_and_without_scripts_at_320(self):
         browser = self.browser
         browser.protocol("Emulation.setScriptExecutionDisabled", value=True)
@@ -113,8 +121,7 @@ class PeoplePageTest(unittest.TestCase):
         browser.press("Space")
         browser.tab_to("Save")
         browser.press("Enter")
-        self.waitFor("sees$")
-        self.assertIn("Saved.", browser.source())
+        self.waitForWords("Saved.")
         browser.tab_to("Back")
         browser.press("Enter")
         self.waitFor("^One person can see where you are.$")
@@ -128,8 +135,7 @@ class PeoplePageTest(unittest.TestCase):
         browser.open(link)
         browser.tab_to("Open my page")
         browser.press("Enter")
-        self.waitFor("Your own page|can see|This link has been used")
-        self.assertIn("This link has been used", browser.source())
+        self.waitForWords("This link has been used")
 
     def test_page_of_another_site_changes_nothing(self):
         """A form of somebody else's, in a browser that is signed in."""
