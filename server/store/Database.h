@@ -7,6 +7,7 @@
 #include <string_view>
 #include <vector>
 
+#include "server/store/Changes.h"
 #include "server/store/DatabaseValue.h"
 
 namespace ktr::server {
@@ -95,6 +96,12 @@ class Database {
     virtual int changes() = 0;
     /// Before a read: clears what failed, and connects again where that is needed.
     virtual void refresh() { clear(); }
+
+    /// Tells other processes that use the same database, with the commit of the transaction, or at once when there is
+    /// none; does nothing where they find out by `othersWrote`.
+    virtual void announce(const Change& change, std::string_view sender) = 0;
+    /// Whether somebody wrote by another connection since this was asked last; false where they announce it.
+    virtual bool othersWrote() = 0;
 
     /// The number of the last migration; 0 in an empty database; none, with a complaint, when it holds something else.
     virtual std::optional<int> schema() = 0;

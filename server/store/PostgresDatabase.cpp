@@ -6,6 +6,9 @@
 #include <charconv>
 #include <cstdlib>
 
+#include "server/store/PostgresHearing.h"
+#include "server/store/PostgresParameters.h"
+
 namespace ktr::server {
 
 using Type = DatabaseValue::Type;
@@ -122,14 +125,9 @@ void PostgresDatabase::FreeResult::operator()(pg_result* result) const {
 }
 
 std::unique_ptr<PostgresDatabase> PostgresDatabase::open(const std::string& address, std::string& complaint) {
-    // What the address says itself comes later, and holds. A peer that says nothing any more is given up.
-    constexpr std::array kNames = {
-        "connect_timeout",  "tcp_user_timeout",          "keepalives_idle", "keepalives_interval",
-        "keepalives_count", "fallback_application_name", "dbname",          static_cast<const char*>(nullptr)};
-    const std::array values = {
-        "5", "15000", "10", "5", "3", "ktr-service", address.c_str(), static_cast<const char*>(nullptr)};
+    const PostgresParameters parameters(address);
     std::unique_ptr<PostgresDatabase> database(
-        new PostgresDatabase(::PQconnectdbParams(kNames.data(), values.data(), 1)));
+        new PostgresDatabase(::PQconnectdbParams(parameters.names.data(), parameters.values.data(), 1)));
     if (!database->isConnected() || !database->setUp()) {
         complaint = database->failed() ? database->complaint() : ::PQerrorMessage(database->connection_);
         while (!complaint.empty() && complaint.back() == '\n') {
@@ -376,6 +374,13 @@ void PostgresDatabase::rollback() {
 int PostgresDatabase::changes() {
     drain();
     return changes_;
+}
+
+void PostgresDatabase::announce(const Change& change, std::string_view sender) {
+    static_assert(std::string_view(PostgresHearing::kChannel) == "ktr_changes");
+    for (const std::string& line : change.lines(sender, PostgresHearing::kLongestLine)) {
+        statement("SELECT pg_notify('ktr_changes', $1)").bind(std::string_view(line)).run();
+    }
 }
 
 std::optional<int> PostgresDatabase::schema() {

@@ -34,6 +34,8 @@ class PostgresDatabase final : public Database {
     void rollback() override;
     int changes() override;
     void refresh() override;
+    void announce(const Change& change, std::string_view sender) override;
+    bool othersWrote() override { return false; }
     std::optional<int> schema() override;
     void setSchema(int number) override;
     void lockSchema() override;

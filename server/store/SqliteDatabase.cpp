@@ -7,6 +7,7 @@
 
 #include <cerrno>
 #include <cstring>
+#include <utility>
 
 namespace ktr::server {
 
@@ -239,6 +240,12 @@ int SqliteDatabase::changes() {
 std::optional<std::int64_t> SqliteDatabase::number(const char* sql) {
     auto row = statement(sql);
     return row.next() ? row.maybeInteger(0) : std::nullopt;
+}
+
+bool SqliteDatabase::othersWrote() {
+    // Changes with what other connections write, and never with what this one does.
+    const std::int64_t version = number("PRAGMA data_version").value_or(lastVersion_);
+    return std::exchange(lastVersion_, version) != version;
 }
 
 std::optional<int> SqliteDatabase::schema() {

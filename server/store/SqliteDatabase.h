@@ -31,6 +31,8 @@ class SqliteDatabase final : public Database {
     bool commit() override;
     void rollback() override;
     int changes() override;
+    void announce(const Change&, std::string_view) override {}
+    bool othersWrote() override;
     std::optional<int> schema() override;
     void setSchema(int number) override;
     void lockSchema() override {}  // a transaction that will write has the file for itself
@@ -57,6 +59,7 @@ class SqliteDatabase final : public Database {
     std::optional<std::int64_t> number(const char* sql);
 
     sqlite3* handle_;
+    std::int64_t lastVersion_ = 0;
     std::unordered_map<std::string, Prepared> statements_;
 };
 

@@ -6,12 +6,16 @@
 
 #include "documents/AtomicFile.h"
 #include "server/store/Migrations.h"
+#include "server/store/PostgresHearing.h"
+#include "server/store/Secret.h"
 
 namespace ktr::server {
 
 namespace {
 
 constexpr std::size_t kLargestBatch = 512;
+/// While there is more to write, other processes hear that often where people are.
+constexpr std::chrono::milliseconds kMovesAtLeast{20};
 
 }  // namespace
 
@@ -34,14 +38,18 @@ std::unique_ptr<Store> Store::open(const StoreAddress& address, bool make, std::
     if (!reading) {
         return nullptr;
     }
-    return std::unique_ptr<Store>(new Store(std::move(reading), std::move(writing)));
+    return std::unique_ptr<Store>(new Store(address, std::move(reading), std::move(writing)));
 }
 
-Store::Store(std::unique_ptr<Database> reading, std::unique_ptr<Database> writing)
-    : reading_(std::move(reading)), writing_(std::move(writing)) {
+Store::Store(const StoreAddress& address, std::unique_ptr<Database> reading, std::unique_ptr<Database> writing)
+    : reading_(std::move(reading)),
+      writing_(std::move(writing)),
+      address_(address),
+      self_(std::to_string(Secret::number())) {
     if (auto row = reading_->statement("SELECT latest FROM clock"); row.next()) {
         latest_ = row.integer(0);
     }
+    writing_->othersWrote();  // before now concerns nobody
     thread_ = std::thread([this] { writeAll(); });
 }
 
@@ -72,18 +80,66 @@ bool Store::writeNow(const std::function<void(Database&)>& work) {
     return written.get_future().get();
 }
 
+std::shared_ptr<void> Store::listen(Changes::Listener listener) {
+    auto listening = changes_.listen(std::move(listener));
+    if (StoreAddress::isServer(address_.text)) {
+        const std::lock_guard<std::mutex> lock(hearingMutex_);
+        if (!hearing_) {
+            hearing_ = std::make_unique<PostgresHearing>(address_.text, self_,
+                                                         [this](const Change& change) { changes_.tell(change); });
+        }
+    } else {
+        // From now on the writing thread wakes up by itself.
+        const std::lock_guard<std::mutex> lock(mutex_);
+        wake_.notify_all();
+    }
+    return listening;
+}
+
+void Store::lookAfterOthers() {
+    if (changes_.isListenedTo() && writing_->othersWrote()) {
+        changes_.tell({true, {}});
+    }
+    writing_->clear();
+}
+
+void Store::announceMoves() {
+    const auto now = std::chrono::steady_clock::now();
+    {
+        const std::lock_guard<std::mutex> lock(mutex_);
+        // Those who wait for their commit come first.
+        if (toAnnounce_.isNothing() || (!waiting_.empty() && now - lastAnnounced_ < kMovesAtLeast)) {
+            return;
+        }
+    }
+    lastAnnounced_ = now;
+    writing_->announce(toAnnounce_, self_);
+    if (!writing_->failed()) {
+        toAnnounce_ = {};
+    }
+    writing_->clear();
+}
+
+bool Store::waitForWork(std::deque<Work>& batch) {
+    std::unique_lock<std::mutex> lock(mutex_);
+    while (!ending_ && waiting_.empty()) {
+        if (!address_.isFolder() || !changes_.isListenedTo()) {
+            wake_.wait(lock);
+        } else if (wake_.wait_for(lock, kLookAfter) == std::cv_status::timeout) {
+            break;
+        }
+    }
+    const auto end = waiting_.begin() + static_cast<std::ptrdiff_t>(std::min(kLargestBatch, waiting_.size()));
+    std::move(waiting_.begin(), end, std::back_inserter(batch));
+    waiting_.erase(waiting_.begin(), end);
+    return !ending_ || !batch.empty();
+}
+
 void Store::writeAll() {
-    for (;;) {
-        std::deque<Work> batch;
-        {
-            std::unique_lock<std::mutex> lock(mutex_);
-            wake_.wait(lock, [this] { return ending_ || !waiting_.empty(); });
-            if (waiting_.empty()) {
-                return;
-            }
-            const auto end = waiting_.begin() + static_cast<std::ptrdiff_t>(std::min(kLargestBatch, waiting_.size()));
-            std::move(waiting_.begin(), end, std::back_inserter(batch));
-            waiting_.erase(waiting_.begin(), end);
+    for (std::deque<Work> batch; waitForWork(batch); batch.clear()) {
+        lookAfterOthers();
+        if (batch.empty()) {
+            continue;
         }
         Outcome outcome = commit(batch.begin(), batch.end());
         // What one of them cannot do does not refuse the others.
@@ -96,10 +152,12 @@ void Store::writeAll() {
                 work->done(outcome == Outcome::Kept);
             }
         }
+        announceMoves();
     }
 }
 
 Store::Outcome Store::commit(std::deque<Work>::const_iterator begin, std::deque<Work>::const_iterator end) {
+    changed_ = moved_ = {};
     if (!writing_->begin()) {
         writing_->rollback();
         return Outcome::Broken;
@@ -114,8 +172,14 @@ Store::Outcome Store::commit(std::deque<Work>::const_iterator begin, std::deque<
     }
     // At most once a second: other processes wait for whoever changes this one row.
     writing_->statement("UPDATE clock SET latest = $1 WHERE latest < $1").bind(latest).run();
+    writing_->announce(changed_, self_);
     const bool isDone = writing_->settle();
     if (isDone && writing_->commit()) {
+        toAnnounce_.add(moved_);
+        changed_.add(moved_);
+        if (!changed_.isNothing()) {
+            changes_.tell(changed_);
+        }
         return Outcome::Kept;
     }
     writing_->rollback();

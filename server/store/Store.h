@@ -1,6 +1,7 @@
 #pragma once
 
 #include <atomic>
+#include <chrono>
 #include <condition_variable>
 #include <cstdint>
 #include <deque>
@@ -17,11 +18,14 @@
 
 #include "platform/base/Value.h"
 #include "server/ingest/Fix.h"
+#include "server/store/Changes.h"
 #include "server/store/Database.h"
 #include "server/store/Records.h"
 #include "server/store/StoreAddress.h"
 
 namespace ktr::server {
+
+class PostgresHearing;
 
 /// What the service remembers, in one SQLite file ("service.db" in its folder) or on a PostgreSQL server. One thread
 /// writes: it takes all that waits into one commit, and says so to those who wait when that commit is on the disk; what
@@ -42,6 +46,11 @@ class Store {
 
     /// Returns when all that was to be written so far was, or failed, and those who wait for it have heard.
     void finish();
+
+    /// Tells of changes from now on, of other processes as well: of a server's at once, of a file's within
+    /// `kLookAfter`. See Changes.
+    [[nodiscard]] std::shared_ptr<void> listen(Changes::Listener listener);
+    static constexpr std::chrono::milliseconds kLookAfter{250};
 
     // Writing, later: `done` follows the commit.
 
@@ -189,12 +198,21 @@ class Store {
         Done done;
     };
 
-    Store(std::unique_ptr<Database> reading, std::unique_ptr<Database> writing);
+    Store(const StoreAddress& address, std::unique_ptr<Database> reading, std::unique_ptr<Database> writing);
     /// `work` runs on the writing thread, and once more, alone, when what was written together with it failed.
     void write(std::function<void(Database&)> work, Done done);
     /// Waits for the commit.
     bool writeNow(const std::function<void(Database&)>& work);
     void writeAll();
+    /// On the writing thread, in a transaction: what will have changed with its commit.
+    void changes(std::int64_t person) { changed_.people.insert(person); }
+    void changesEverything() { changed_.everything = true; }
+    /// Where the person is; other processes hear of it a little later, and wait for nobody.
+    void moves(std::int64_t person) { moved_.people.insert(person); }
+    void announceMoves();
+    void lookAfterOthers();
+    /// Waits until something is to be written, or it is time to look after others. False: it is over.
+    bool waitForWork(std::deque<Work>& batch);
     Outcome commit(std::deque<Work>::const_iterator begin, std::deque<Work>::const_iterator end);
     /// Of ten columns: hidden, shown_since, retention, the clock's latest, and a grant's six.
     Sharing sharingOf(Database::Run& row, int firstColumn);
@@ -203,12 +221,12 @@ class Store {
     static std::optional<Grant> readGrant(Database& database, std::int64_t owner, std::int64_t viewer);
     static std::vector<NamedPlace> readPlaces(Database& database, std::int64_t owner);
     /// Hides somebody, and takes back what their devices asked.
-    static void hideIn(Database& database, std::int64_t person);
+    void hideIn(Database& database, std::int64_t person);
     void showIn(Database& database, std::int64_t person, std::int64_t now);
     /// The first second of which nothing has been heard yet, from the present on.
     std::int64_t afterAllHeard(Database& database, std::int64_t person, std::int64_t now);
     /// Ends grants whose owner has arrived.
-    static void endOnArrival(Database& database, std::int64_t owner, const std::vector<Fix>& fixes, std::int64_t now);
+    void endOnArrival(Database& database, std::int64_t owner, const std::vector<Fix>& fixes, std::int64_t now);
     /// What else decides what is seen by a grant: fixes, and places where they may be said.
     static void deleteOldOf(Database& database, std::int64_t person, const Retention& retention, std::int64_t now);
     /// `now`: reads of the fixes what is needed then; none: all.
@@ -224,8 +242,19 @@ class Store {
     std::condition_variable wake_;
     std::deque<Work> waiting_;
     bool ending_ = false;
-    std::int64_t latest_ = 0;     ///< under `mutex_`
-    std::int64_t lastSwept_ = 0;  ///< on the writing thread
+    std::int64_t latest_ = 0;  ///< under `mutex_`
+    // On the writing thread.
+    std::int64_t lastSwept_ = 0;
+    Change changed_;
+    Change moved_;
+    Change toAnnounce_;  ///< to other processes: where people are
+    std::chrono::steady_clock::time_point lastAnnounced_;
+
+    const StoreAddress address_;
+    const std::string self_;  ///< who this is to other processes
+    Changes changes_;
+    std::mutex hearingMutex_;
+    std::unique_ptr<PostgresHearing> hearing_;  ///< from the first that listens on, where others announce
     std::thread thread_;
 };
 

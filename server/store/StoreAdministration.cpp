@@ -57,6 +57,7 @@ int Store::revokeDevices(std::int64_t person, std::int64_t now) {
             .run();
         ended = database.changes();
         endBrowsersIn(database, person);
+        changes(person);
     });
     return good ? ended : 0;
 }

@@ -29,6 +29,7 @@ bool Store::revokeDevice(std::int64_t person, std::int64_t device, std::int64_t 
             .bind(now)
             .run();
         ended = database.changes();
+        changes(person);
     });
     return good && ended > 0;
 }
@@ -67,11 +68,13 @@ void Store::shareAsAsked(std::int64_t device, std::int64_t now, Done done) {
 }
 
 void Store::hideIn(Database& database, std::int64_t person) {
+    changes(person);
     database.statement("UPDATE person SET hidden = 1 WHERE id = $1").bind(person).run();
     database.statement("UPDATE device SET asked_to_share = 0 WHERE person = $1").bind(person).run();
 }
 
 void Store::showIn(Database& database, std::int64_t person, std::int64_t now) {
+    changes(person);
     // Showing twice changes nothing: what was seen in between stays.
     database.statement("UPDATE person SET shown_since = $2, hidden = 0 WHERE id = $1 AND hidden = 1")
         .bind(person)

@@ -33,6 +33,8 @@ std::optional<Grant> Store::readGrant(Database& database, std::int64_t owner, st
 
 bool Store::grant(std::int64_t owner, std::int64_t viewer, const Grant& grant) {
     return writeNow([&](Database& database) {
+        changes(owner);
+        changes(viewer);
         const std::int64_t latest = present(0);
         const auto before = readGrant(database, owner, viewer);
         // Whoever saw as exactly until now goes on seeing; else nothing from before is seen.
@@ -62,6 +64,8 @@ bool Store::grant(std::int64_t owner, std::int64_t viewer, const Grant& grant) {
 bool Store::revokeGrant(std::int64_t owner, std::int64_t viewer) {
     int ended = 0;
     const bool good = writeNow([&](Database& database) {
+        changes(owner);
+        changes(viewer);
         database.statement("DELETE FROM share WHERE viewer = $1 AND owner = $2").bind(viewer).bind(owner).run();
         ended = database.changes();
     });
@@ -77,6 +81,8 @@ Confirmation Store::confirmGrant(std::int64_t owner, std::int64_t viewer, std::i
                   : grant->until                   ? Confirmation::HasAnEnd
                                                    : Confirmation::Kept;
         if (outcome == Confirmation::Kept) {
+            changes(owner);
+            changes(viewer);
             database.statement("UPDATE share SET confirmed = $3 WHERE owner = $1 AND viewer = $2 AND until IS NULL")
                 .bind(owner)
                 .bind(viewer)

@@ -88,6 +88,7 @@ std::string Store::restore(const std::string& file, const std::string& folder, s
     }
     std::string complaint;
     const bool good = writeNow([&](Database& database) {
+        changesEverything();
         StoreCopy::restore(database, backup.database(), now);
         for (const std::int64_t person : numbersOfAll(database)) {
             hideIn(database, person);
@@ -100,6 +101,7 @@ std::string Store::restore(const std::string& file, const std::string& folder, s
 
 bool Store::forget(std::int64_t person, std::int64_t now) {
     const bool good = writeNow([&](Database& database) {
+        changesEverything();
         std::string identity;
         {
             auto row = database.statement("SELECT identity FROM person WHERE id = $1");
@@ -147,6 +149,7 @@ bool Store::setRetention(std::int64_t person, const Retention& retention, std::i
             .bind(retention.looks)
             .run();
         deleteOldOf(database, person, retention, now);
+        changes(person);
     });
 }
 
@@ -161,6 +164,7 @@ int Store::confirm(std::int64_t person) {
     const bool good = writeNow([&](Database& database) {
         database.statement("UPDATE device SET suspended = 0 WHERE person = $1 AND suspended = 1").bind(person).run();
         confirmed = database.changes();
+        changes(person);
     });
     return good ? confirmed : 0;
 }

@@ -26,6 +26,7 @@ NamedPlace placeOf(Database::Run& row, int column) {
 bool Store::setPlace(std::int64_t owner, const NamedPlace& place) {
     const std::int64_t id = Secret::number();
     return id != 0 && writeNow([&](Database& database) {
+               changes(owner);
                database
                    .statement(
                        "INSERT INTO place (id, owner, name, label, latitude, longitude, radius, said) "
@@ -47,6 +48,7 @@ bool Store::setPlace(std::int64_t owner, const NamedPlace& place) {
 bool Store::removePlace(std::int64_t owner, std::int64_t place, std::int64_t now) {
     int removed = 0;
     const bool good = writeNow([&](Database& database) {
+        changes(owner);
         // Nobody arrives there any more: what was to end there would never end.
         database
             .statement(
@@ -106,6 +108,8 @@ void Store::endOnArrival(Database& database, std::int64_t owner, const std::vect
         }
     }
     for (const std::int64_t viewer : ended) {
+        changes(owner);
+        changes(viewer);
         database.statement("UPDATE share SET until = $3 WHERE owner = $1 AND viewer = $2")
             .bind(owner)
             .bind(viewer)

@@ -12,7 +12,7 @@ constexpr std::int64_t kPeopleAStep = 10;
 
 void Store::keep(std::int64_t device, std::int64_t person, std::vector<Fix> fixes, std::int64_t now, Done done) {
     write(
-        [=, all = std::move(fixes)](Database& database) {
+        [=, this, all = std::move(fixes)](Database& database) {
             // In the same commit as the question whether the person hides: nothing of that time comes in, then or
             // later.
             for (const Fix& fix : all) {
@@ -32,6 +32,7 @@ void Store::keep(std::int64_t device, std::int64_t person, std::vector<Fix> fixe
                     .run();
             }
             if (!all.empty()) {
+                moves(person);
                 endOnArrival(database, person, all, now);
             }
             database
@@ -46,7 +47,7 @@ void Store::keep(std::int64_t device, std::int64_t person, std::vector<Fix> fixe
 }
 
 void Store::hide(std::int64_t person, std::int64_t, Done done) {
-    write([=](Database& database) { hideIn(database, person); }, std::move(done));
+    write([=, this](Database& database) { hideIn(database, person); }, std::move(done));
 }
 
 void Store::noteLooks(std::int64_t viewer, std::vector<std::int64_t> owners, bool asked, std::int64_t now, Done done) {
