@@ -140,6 +140,27 @@ std::string Host::clockFace(platform::Date moment) const {
     return clockText(moment, offset, settings_.language, settings_.region);
 }
 
+std::vector<std::shared_ptr<platform::AssistantObject>> Host::snippets() const {
+    std::vector<std::shared_ptr<platform::AssistantObject>> snippets;
+    for (auto turn = turns_.rbegin(); turn != turns_.rend(); ++turn) {
+        const auto controller = turn->view->card()->controller();
+        auto newest = controller ? controller->currentSnippet() : nullptr;
+        if (newest || turn->scenario.snippet) {
+            snippets.push_back(newest ? std::move(newest) : turn->scenario.snippet);
+        }
+    }
+    return snippets;
+}
+
+std::shared_ptr<platform::HostSnippetViewController> Host::controllerFor(
+    const std::shared_ptr<platform::AssistantObject>& snippet) const {
+    auto controller = plugin_ && !isRestricted() ? plugin_->factory().viewControllerForSnippet(snippet) : nullptr;
+    if (controller) {
+        controller->setDelegate(delegate_);
+    }
+    return controller;
+}
+
 bool Host::isRestricted() const {
     const auto& restrictions = platform()->restrictions;
     return restrictions && (restrictions->isFriendLocationRestricted() || !restrictions->isFriendLocationAllowed());
@@ -267,6 +288,9 @@ std::optional<Failure> Host::remake(const HostSettings& settings, const Environm
     const auto earlier = platform();
     if (auto failure = environment_.remake(settings, contacts)) {
         return failure;
+    }
+    if (remaking_) {
+        remaking_();
     }
     settings_ = settings;
     letCardsGo();

@@ -61,6 +61,15 @@ class Host {
     std::optional<Failure> remake(const HostSettings& settings) { return remake(settings, nullptr); }
     /// Called after `remake`.
     void setRemade(std::function<void()> remade) { remade_ = std::move(remade); }
+    /// Called in `remake` while what is there is still whole: what belongs to its platform has to go now.
+    void setRemaking(std::function<void()> remaking) { remaking_ = std::move(remaking); }
+
+    /// What the answers are about, the newest turn first and as its card knows it now. Of a turn without one nothing.
+    std::vector<std::shared_ptr<platform::AssistantObject>> snippets() const;
+    /// What draws a snippet outside the conversation; it asks and reports as a card's does. Whoever has it lets go of
+    /// it when `remaking` is called. Null where the plugin draws no such thing.
+    std::shared_ptr<platform::HostSnippetViewController> controllerFor(
+        const std::shared_ptr<platform::AssistantObject>& snippet) const;
 
     /// The device allows no friends' locations: no card is made and nothing is asked; a turn says so instead.
     bool isRestricted() const;
@@ -131,6 +140,7 @@ class Host {
     std::weak_ptr<TurnView> sharing_;
     bool saysHidden_ = false;
     std::function<void()> remade_;
+    std::function<void()> remaking_;
 };
 
 }  // namespace ktr::host

@@ -8,8 +8,6 @@
 #include <QStandardPaths>
 #include <QStringList>
 #include <cmath>
-#include <mutex>
-#include <thread>
 
 #include "linux/device/KdeFonts.h"
 #include "platform/base/Log.h"
@@ -57,11 +55,6 @@ DesktopSettings::Places DesktopSettings::Places::ofSession() {
             qEnvironmentVariable("DBUS_SESSION_BUS_ADDRESS"), QStringLiteral("gsettings")};
 }
 
-struct DesktopSettings::Return {
-    std::mutex mutex;
-    DesktopSettings* owner = nullptr;  ///< none once it has gone
-};
-
 DesktopSettings::DesktopSettings(Places places)
     : places_(std::move(places)),
       desktop_([this] {
@@ -73,8 +66,7 @@ DesktopSettings::DesktopSettings(Places places)
                              names.contains(QLatin1String("Phosh"), Qt::CaseInsensitive);
           return gnome ? Desktop::Gnome : Desktop::Other;
       }()),
-      return_(std::make_shared<Return>()) {
-    return_->owner = this;
+      aside_(*this) {
     if (desktop_ == Desktop::Kde) {
         // The folder too: files there are replaced, not written.
         files_.addPath(QString::fromStdString(places_.configuration.string()));
@@ -86,23 +78,9 @@ DesktopSettings::DesktopSettings(Places places)
 }
 
 DesktopSettings::~DesktopSettings() {
-    {
-        const std::lock_guard lock(return_->mutex);
-        return_->owner = nullptr;
-    }
     if (bus_) {
         QDBusConnection::disconnectFromBus(bus_->name());
     }
-}
-
-void DesktopSettings::runAside(std::function<std::function<void()>()> work) {
-    std::thread([back = return_, work = std::move(work)] {
-        auto done = work();
-        const std::lock_guard lock(back->mutex);
-        if (back->owner != nullptr) {
-            QMetaObject::invokeMethod(back->owner, std::move(done), Qt::QueuedConnection);
-        }
-    }).detach();
 }
 
 void DesktopSettings::joinBus() {
@@ -111,7 +89,7 @@ void DesktopSettings::joinBus() {
     }
     const QString name =
         QStringLiteral("ktr-desktop-settings-") + QString::number(reinterpret_cast<quintptr>(this), 16);
-    runAside([this, name, address = places_.busAddress] {
+    aside_.run([this, name, address = places_.busAddress] {
         const QDBusConnection bus = QDBusConnection::connectToBus(address, name);
         return [this, bus] {
             if (bus.isConnected()) {
@@ -192,7 +170,7 @@ void DesktopSettings::readKdeFonts() {
             files_.addPath(file);
         }
     }
-    runAside([this, folder = places_.configuration] {
+    aside_.run([this, folder = places_.configuration] {
         return [this, scale = KdeFonts::textScale(folder)] {
             Values values = values_;
             values.textScale = scale;

@@ -8,9 +8,10 @@
 #include <filesystem>
 #include <functional>
 #include <map>
-#include <memory>
 #include <optional>
 #include <utility>
+
+#include "linux/device/Aside.h"
 
 namespace ktr::linux_ {
 
@@ -52,11 +53,6 @@ class DesktopSettings : public QObject {
 
   private:
     enum class Desktop { Kde, Gnome, Other };
-    struct Return;
-
-    /// Runs `work` on a thread of its own, and what it gives on the main thread unless this has gone by then. Nobody
-    /// waits for that thread: a bus may never answer.
-    void runAside(std::function<std::function<void()>()> work);
 
     void joinBus();
     void useBus(const QDBusConnection& bus);
@@ -76,8 +72,7 @@ class DesktopSettings : public QObject {
     bool portalKnowsTextScale_ = false;
     /// Changes that were told, by group and key of what is asked for: an answer that one of them overtook is older.
     std::map<std::pair<QString, QString>, unsigned> heard_;
-    /// The way back for work in the background.
-    std::shared_ptr<Return> return_;
+    Aside aside_;
 };
 
 }  // namespace ktr::linux_

@@ -20,7 +20,12 @@ Rect placeOf(const MapViewport& picture, const MapViewport& viewport) {
     return {middle.x - size.width / 2.0, middle.y - size.height / 2.0, size.width, size.height};
 }
 
-bool covers(const Rect& rect, const Size& size) {
+bool isWhole(const Rect& rect) {
+    constexpr double kSame = 1e-3;
+    return std::abs(rect.x - std::round(rect.x)) < kSame && std::abs(rect.y - std::round(rect.y)) < kSame;
+}
+
+bool fills(const Rect& rect, const Size& size) {
     constexpr double kSlack = 1e-6;
     return rect.x <= kSlack && rect.y <= kSlack && rect.maxX() >= size.width - kSlack &&
            rect.maxY() >= size.height - kSlack;
@@ -47,7 +52,7 @@ MapBackdrop::~MapBackdrop() {
     }
 }
 
-void MapBackdrop::want(const MapPictureRequest& request) {
+void MapBackdrop::want(const MapPictureRequest& request, Hurry hurry) {
     if (!source_ || wanted_ == request) {
         return;
     }
@@ -55,7 +60,17 @@ void MapBackdrop::want(const MapPictureRequest& request) {
         earlier_.clear();
     }
     wanted_ = request;
+    if (pending_ && hurry == Hurry::Patient) {
+        isOutdated_ = true;
+        return;
+    }
     this->request();
+}
+
+bool MapBackdrop::covers(const MapViewport& viewport) const {
+    constexpr double kNearEnough = 0.5;
+    return latest_ && std::abs(latest_->viewport.zoom - viewport.zoom) <= kNearEnough &&
+           fills(placeOf(latest_->viewport, viewport), viewport.size);
 }
 
 void MapBackdrop::request() {
@@ -107,7 +122,7 @@ void MapBackdrop::draw(Canvas& canvas, const MapViewport& viewport) const {
     const Rect top = placeOf(latest_->viewport, viewport);
     // From the newest that fills the map, or else the oldest.
     auto first = earlier_.end();
-    for (Rect place = top; first != earlier_.begin() && !covers(place, size);) {
+    for (Rect place = top; first != earlier_.begin() && !fills(place, size);) {
         place = placeOf((--first)->viewport, viewport);
     }
     for (; first != earlier_.end(); ++first) {
@@ -115,9 +130,9 @@ void MapBackdrop::draw(Canvas& canvas, const MapViewport& viewport) const {
             canvas.drawMoving(*first->image, placeOf(first->viewport, viewport));
         }
     }
-    // At rest every pixel of the picture is a pixel of the screen.
-    if (latest_->viewport == viewport) {
-        canvas.draw(*latest_->image, {0.0, 0.0, size.width, size.height});
+    // At rest every pixel of the picture is a pixel of the screen, and so it is while whole points are gone through.
+    if (isWhole(top) && latest_->viewport.zoom == viewport.zoom) {
+        canvas.draw(*latest_->image, {std::round(top.x), std::round(top.y), top.width, top.height});
     } else {
         canvas.drawMoving(*latest_->image, top);
     }

@@ -24,9 +24,14 @@ class MapBackdrop {
 
     /// Whether there is anybody who draws pictures.
     bool hasSource() const { return source_ != nullptr; }
-    /// What is to be seen when the map has come to rest. Asks for nothing that was asked for last; what is under way
-    /// and no longer wanted is cancelled.
-    void want(const MapPictureRequest& request);
+    enum class Hurry {
+        Now,     ///< what is under way and no longer wanted is cancelled
+        Patient  ///< it is shown first: a map that never rests would never get a picture
+    };
+    /// What is to be seen when the map has come to rest. Asks for nothing that was asked for last.
+    void want(const MapPictureRequest& request, Hurry hurry = Hurry::Now);
+    /// Whether the latest picture fills this viewport, at a scale that is near enough to be looked at.
+    bool covers(const MapViewport& viewport) const;
     /// The pictures that there are, the latest on top, as many as fill the map; beside them the land's colour.
     void draw(Canvas& canvas, const MapViewport& viewport) const;
     /// Of the latest picture; empty without one.

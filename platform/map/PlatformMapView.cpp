@@ -26,6 +26,8 @@ constexpr double kGlide = 0.5;  // seconds
 constexpr MapRegion kWorld{{20.0, 0.0}, {170.0, 360.0}};
 /// Rectangles that labels keep clear of are taken this coarsely: a step of the user's does not change the picture.
 constexpr double kClearGrid = 12.0;
+/// How far beyond each edge a map is drawn that is moved by hand, as a share of its size.
+constexpr double kBeyond = 0.25;
 
 Rect onGrid(const Rect& rect) {
     const double left = std::floor(rect.x / kClearGrid) * kClearGrid;
@@ -204,13 +206,40 @@ void PlatformMapView::setRegion(const MapRegion& region, bool animated) {
     if (!isValid(region.center)) {
         return;
     }
-    glidesToRequested_ = animated && requested_.has_value();
+    glidesToRequested_ = animated && (requested_.has_value() || held_);
     requested_ = region;
+    held_.reset();
+    isMoving_ = false;
     updateViewport();
     setNeedsUpdate();
 }
 
+void PlatformMapView::showAt(const Coordinate& centre, double zoom, Hand hand) {
+    if (!isValid(centre) || !std::isfinite(zoom)) {
+        return;
+    }
+    held_ = Held{centre, zoom};
+    isMoving_ = hand == Hand::Moving;
+    updateViewport();
+    if (!isMoving_) {
+        setNeedsUpdate();
+    } else if (!backdrop_->covers(shown_)) {
+        requestGround();
+    }
+}
+
+void PlatformMapView::setSurroundings(Surroundings surroundings) {
+    if (surroundings != surroundings_) {
+        surroundings_ = std::move(surroundings);
+        placeChrome();
+        setNeedsUpdate();
+    }
+}
+
 MapViewport PlatformMapView::viewportAtRest() const {
+    if (held_) {
+        return {held_->centre, held_->zoom, bounds().size()};
+    }
     return requested_.value_or(kWorld).viewport(bounds().size());
 }
 
@@ -255,9 +284,21 @@ void PlatformMapView::glideTo(const MapViewport& target) {
 void PlatformMapView::show(const MapViewport& viewport) {
     shown_ = viewport;
     layer_->place(viewport);
-    chrome_->setFrame(bounds());
-    chrome_->show(viewport, backdrop_->hasSource(), backdrop_->attribution());
+    placeChrome();
     setNeedsDisplay();
+}
+
+Rect PlatformMapView::chromeFrame() const {
+    const EdgeInsets& insets = surroundings_.insets;
+    return {insets.left, insets.top, std::max(bounds().width - insets.left - insets.right, 0.0),
+            std::max(bounds().height - insets.top - insets.bottom, 0.0)};
+}
+
+void PlatformMapView::placeChrome() {
+    chrome_->setFrame(chromeFrame());
+    MapViewport within = shown_;
+    within.size = chrome_->bounds().size();
+    chrome_->show(within, backdrop_->hasSource(), backdrop_->attribution());
 }
 
 void PlatformMapView::requestGround() {
@@ -268,19 +309,32 @@ void PlatformMapView::requestGround() {
     }
     MapPictureRequest request;
     request.viewport = target;
+    // A map that is moved by hand is drawn beyond its edges, so that there is ground where it is moved to.
+    const double beyondX = held_ ? std::floor(target.size.width * kBeyond) : 0.0;
+    const double beyondY = held_ ? std::floor(target.size.height * kBeyond) : 0.0;
+    request.viewport.size.width += 2.0 * beyondX;
+    request.viewport.size.height += 2.0 * beyondY;
     request.scale = installed->device ? std::clamp(installed->device->mainScreenScale(), 1.0, 3.0) : 1.0;
     request.isDark = installed->appearance && installed->appearance->isDark();
     request.isHighContrast = installed->appearance && installed->appearance->isHighContrast();
     request.language = installed->assistant ? installed->assistant->languageCode().value_or("") : "";
     const auto covered = layer_->coveredRects(target);
-    chrome_->avoid(covered, target.size);
+    const Rect corners = chromeFrame();
+    std::vector<Rect> fromCorners;
+    fromCorners.reserve(covered.size());
     for (const Rect& rect : covered) {
-        request.clear.push_back(onGrid(rect));
+        fromCorners.push_back(rect.offsetBy(-corners.x, -corners.y));
     }
-    for (const Rect& rect : chrome_->clearRects(target.size)) {
-        request.clear.push_back(onGrid(rect));
-    }
-    backdrop_->want(request);
+    chrome_->avoid(fromCorners, corners.size());
+    const auto keepClear = [&](const std::vector<Rect>& rects, double dx, double dy) {
+        for (const Rect& rect : rects) {
+            request.clear.push_back(onGrid(rect.offsetBy(dx + beyondX, dy + beyondY)));
+        }
+    };
+    keepClear(covered, 0.0, 0.0);
+    keepClear(surroundings_.taken, 0.0, 0.0);
+    keepClear(chrome_->clearRects(corners.size()), corners.x, corners.y);
+    backdrop_->want(request, isMoving_ ? MapBackdrop::Hurry::Patient : MapBackdrop::Hurry::Now);
 }
 
 // Annotations and overlays
@@ -378,7 +432,7 @@ void PlatformMapView::userMoved(const std::shared_ptr<PlatformLocation>& locatio
 // Drawing
 
 void PlatformMapView::layoutSubviews() {
-    chrome_->setFrame(bounds());
+    placeChrome();
     updateNow();
 }
 

@@ -60,6 +60,22 @@ class KTR_API PlatformMapView : public View {
     const MapViewport& viewport() const { return shown_; }
     MapViewport viewportAtRest() const;
 
+    // A host's hand on the map
+    enum class Hand {
+        Moving,  ///< more will follow: what is drawn already moves along, and new ground is asked for one by one
+        Resting
+    };
+    /// Shows this part of the world at once, whatever the region, until a region is set again. An invalid centre is
+    /// ignored; a zoom that is no number too.
+    void showAt(const Coordinate& centre, double zoom, Hand hand);
+    /// What stands over the map and is not its own.
+    struct Surroundings {
+        EdgeInsets insets;        ///< scale bar and attribution stand within them
+        std::vector<Rect> taken;  ///< points of the view where no label may stand
+        bool operator==(const Surroundings&) const = default;
+    };
+    void setSurroundings(Surroundings surroundings);
+
     // Annotations
     /// Without the user.
     const std::vector<std::shared_ptr<MapAnnotation>>& annotations() const { return annotations_; }
@@ -112,12 +128,22 @@ class KTR_API PlatformMapView : public View {
     void updateViewport();
     void glideTo(const MapViewport& target);
     void show(const MapViewport& viewport);
+    void placeChrome();
+    Rect chromeFrame() const;
     void requestGround();
     void userMoved(const std::shared_ptr<PlatformLocation>& location);
 
     std::weak_ptr<PlatformMapViewDelegate> delegate_;
     std::optional<MapRegion> requested_;
     MapViewport shown_;
+    struct Held {
+        Coordinate centre;
+        double zoom = 0.0;
+    };
+    /// Where a host's hand has left the map; none: the region holds.
+    std::optional<Held> held_;
+    bool isMoving_ = false;
+    Surroundings surroundings_;
     bool glidesToRequested_ = false;
     std::shared_ptr<Animation> glide_;
     std::optional<MapViewport> glideTarget_;

@@ -228,5 +228,180 @@
         <extracomment>Two sentences that are said one after the other, as the language parts them; each has its full stop</extracomment>
         <translation>%1$@ %2$@</translation>
     </message>
+    <message>
+        <source>LINK_NOBODY</source>
+        <extracomment>A tap on a link that no program opens</extracomment>
+        <translation>لا يوجد برنامج على هذا الكمبيوتر يفتح الروابط.</translation>
+    </message>
+    <message>
+        <source>PLACE_NOBODY</source>
+        <extracomment>The same, of a place on the map</extracomment>
+        <translation>لا يوجد برنامج على هذا الكمبيوتر يفتح الأماكن.</translation>
+    </message>
+    <message>
+        <source>CALL_NOBODY</source>
+        <extracomment>The same, of a call</extracomment>
+        <translation>لا يوجد برنامج على هذا الكمبيوتر يجري المكالمات.</translation>
+    </message>
+    <message>
+        <source>WRITE_NOBODY</source>
+        <extracomment>The same, of a message</extracomment>
+        <translation>لا يوجد برنامج على هذا الكمبيوتر يكتب الرسائل.</translation>
+    </message>
+    <message>
+        <source>LINK_REFUSED</source>
+        <extracomment>A link of a kind that this program does not open</extracomment>
+        <translation>لا يُفتح هذا الرابط هنا.</translation>
+    </message>
+    <message>
+        <source>LINK_UNKNOWN</source>
+        <extracomment>A link from elsewhere about nobody who is among the user’s friends</extracomment>
+        <translation>لا أعرف عمّن يتحدث هذا الرابط.</translation>
+    </message>
+    <message>
+        <source>FRIEND_CALL</source>
+        <extracomment>Under a round button: calls the friend</extracomment>
+        <translation>اتصال</translation>
+    </message>
+    <message>
+        <source>FRIEND_WRITE</source>
+        <extracomment>Under a round button: writes to the friend</extracomment>
+        <translation>كتابة</translation>
+    </message>
+    <message>
+        <source>FRIEND_MAPS</source>
+        <extracomment>Under a round button: opens the place in a program for maps</extracomment>
+        <translation>فتح في الخرائط</translation>
+    </message>
+    <message>
+        <source>FRIEND_COPY</source>
+        <extracomment>Under a round button: puts the place into the clipboard</extracomment>
+        <translation>نسخ المكان</translation>
+    </message>
+    <message>
+        <source>FRIEND_COPIED</source>
+        <extracomment>In the place of “Copy place”, for two seconds after it was pressed</extracomment>
+        <translation>تم النسخ</translation>
+    </message>
+    <message>
+        <source>FRIEND_SHOW</source>
+        <extracomment>A button: brings the friend (%@) back into view on the map</extracomment>
+        <translation>إظهار %@</translation>
+    </message>
+    <message>
+        <source>FRIEND_WHERE</source>
+        <extracomment>A button that asks where a friend (%@) is</extracomment>
+        <translation>أين %@؟</translation>
+    </message>
+    <message>
+        <source>FRIEND_NOT_SEEN</source>
+        <extracomment>A friend (%@) whose place is not to be seen</extracomment>
+        <translation>لا أستطيع أن أرى مكان %@.</translation>
+    </message>
+    <message>
+        <source>MAP_CLOSER</source>
+        <extracomment>A button on the map, spoken: zooms in</extracomment>
+        <translation>أقرب</translation>
+    </message>
+    <message>
+        <source>MAP_FURTHER</source>
+        <extracomment>A button on the map, spoken: zooms out</extracomment>
+        <translation>أبعد</translation>
+    </message>
+    <message>
+        <source>MAP_SPOKEN</source>
+        <extracomment>The map of a friend’s page, spoken; %@ is the friend</extracomment>
+        <translation>خريطة حول %@</translation>
+    </message>
+    <message>
+        <source>HOW_FEW</source>
+        <extracomment>How exactly a place is known: up to 15 metres</extracomment>
+        <translation>ضمن بضعة أمتار</translation>
+    </message>
+    <message>
+        <source>HOW_WITHIN</source>
+        <extracomment>The same; %@ is a distance with its unit</extracomment>
+        <translation>ضمن حوالي %@</translation>
+    </message>
+    <message>
+        <source>HOW_NEAR</source>
+        <extracomment>The same, of a wide place; %@ is a distance with its unit</extracomment>
+        <translation>في مكان قريب، ضمن حوالي %@</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS</source>
+        <extracomment>The name of the page with the list of friends</extracomment>
+        <translation>الأصدقاء</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS_NONE</source>
+        <extracomment>On that page, when nobody was asked about</extracomment>
+        <translation>لم يُسأل عن أحد بعد.</translation>
+    </message>
+    <message>
+        <source>PAGE_ME</source>
+        <extracomment>The name of the user’s own page</extracomment>
+        <translation>موقعي</translation>
+    </message>
+    <message>
+        <source>SHARING_SWITCH</source>
+        <extracomment>A switch on that page</extracomment>
+        <translation>يمكن للأصدقاء رؤيتي</translation>
+    </message>
+    <message>
+        <source>SHARING_ON</source>
+        <extracomment>Under that switch, while it is on</extracomment>
+        <translation>يمكن لمن تسمح لهم رؤية مكانك.</translation>
+    </message>
+    <message>
+        <source>SHARING_OFF</source>
+        <extracomment>Under that switch, while it is off</extracomment>
+        <translation>لا يمكن لأحد رؤية مكانك.</translation>
+    </message>
+    <message>
+        <source>SHARING_UNKNOWN</source>
+        <extracomment>Under that switch, while the service has not been told anything by it</extracomment>
+        <translation>لم تجب خدمتك بعد.</translation>
+    </message>
+    <message>
+        <source>SHARING_FAILED</source>
+        <extracomment>Under that switch, when the wish did not reach the service</extracomment>
+        <translation>لم تجب خدمتك. لم يتغير شيء هنا.</translation>
+    </message>
+    <message>
+        <source>MAP_NO_STREETS</source>
+        <extracomment>Under a card whose map has no streets</extracomment>
+        <translation>لا شوارع لهذه المنطقة هنا بعد.</translation>
+    </message>
+    <message>
+        <source>MAP_GET_STREETS</source>
+        <extracomment>Beside it, a button: chooses a file with a map</extracomment>
+        <translation>الحصول على الشوارع</translation>
+    </message>
+    <message>
+        <source>MAP_NO_PLACE</source>
+        <extracomment>On the plain ground of a map whose friend has no place</extracomment>
+        <translation>لا مكان</translation>
+    </message>
+    <message>
+        <source>MENU_CUT</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>قص</translation>
+    </message>
+    <message>
+        <source>MENU_COPY</source>
+        <extracomment>In the menu of the field and of the conversation</extracomment>
+        <translation>نسخ</translation>
+    </message>
+    <message>
+        <source>MENU_PASTE</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>لصق</translation>
+    </message>
+    <message>
+        <source>MENU_SELECT_ALL</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>تحديد الكل</translation>
+    </message>
 </context>
 </TS>

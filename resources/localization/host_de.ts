@@ -228,5 +228,180 @@
         <extracomment>Two sentences that are said one after the other, as the language parts them; each has its full stop</extracomment>
         <translation>%1$@ %2$@</translation>
     </message>
+    <message>
+        <source>LINK_NOBODY</source>
+        <extracomment>A tap on a link that no program opens</extracomment>
+        <translation>Kein Programm auf diesem Computer öffnet Links.</translation>
+    </message>
+    <message>
+        <source>PLACE_NOBODY</source>
+        <extracomment>The same, of a place on the map</extracomment>
+        <translation>Kein Programm auf diesem Computer öffnet Orte.</translation>
+    </message>
+    <message>
+        <source>CALL_NOBODY</source>
+        <extracomment>The same, of a call</extracomment>
+        <translation>Kein Programm auf diesem Computer ruft an.</translation>
+    </message>
+    <message>
+        <source>WRITE_NOBODY</source>
+        <extracomment>The same, of a message</extracomment>
+        <translation>Kein Programm auf diesem Computer schreibt Nachrichten.</translation>
+    </message>
+    <message>
+        <source>LINK_REFUSED</source>
+        <extracomment>A link of a kind that this program does not open</extracomment>
+        <translation>Dieser Link wird hier nicht geöffnet.</translation>
+    </message>
+    <message>
+        <source>LINK_UNKNOWN</source>
+        <extracomment>A link from elsewhere about nobody who is among the user’s friends</extracomment>
+        <translation>Ich weiß nicht, um wen es in diesem Link geht.</translation>
+    </message>
+    <message>
+        <source>FRIEND_CALL</source>
+        <extracomment>Under a round button: calls the friend</extracomment>
+        <translation>Anrufen</translation>
+    </message>
+    <message>
+        <source>FRIEND_WRITE</source>
+        <extracomment>Under a round button: writes to the friend</extracomment>
+        <translation>Schreiben</translation>
+    </message>
+    <message>
+        <source>FRIEND_MAPS</source>
+        <extracomment>Under a round button: opens the place in a program for maps</extracomment>
+        <translation>In Karten öffnen</translation>
+    </message>
+    <message>
+        <source>FRIEND_COPY</source>
+        <extracomment>Under a round button: puts the place into the clipboard</extracomment>
+        <translation>Ort kopieren</translation>
+    </message>
+    <message>
+        <source>FRIEND_COPIED</source>
+        <extracomment>In the place of “Copy place”, for two seconds after it was pressed</extracomment>
+        <translation>Kopiert</translation>
+    </message>
+    <message>
+        <source>FRIEND_SHOW</source>
+        <extracomment>A button: brings the friend (%@) back into view on the map</extracomment>
+        <translation>%@ zeigen</translation>
+    </message>
+    <message>
+        <source>FRIEND_WHERE</source>
+        <extracomment>A button that asks where a friend (%@) is</extracomment>
+        <translation>Wo ist %@?</translation>
+    </message>
+    <message>
+        <source>FRIEND_NOT_SEEN</source>
+        <extracomment>A friend (%@) whose place is not to be seen</extracomment>
+        <translation>Ich kann nicht sehen, wo %@ ist.</translation>
+    </message>
+    <message>
+        <source>MAP_CLOSER</source>
+        <extracomment>A button on the map, spoken: zooms in</extracomment>
+        <translation>Näher</translation>
+    </message>
+    <message>
+        <source>MAP_FURTHER</source>
+        <extracomment>A button on the map, spoken: zooms out</extracomment>
+        <translation>Weiter weg</translation>
+    </message>
+    <message>
+        <source>MAP_SPOKEN</source>
+        <extracomment>The map of a friend’s page, spoken; %@ is the friend</extracomment>
+        <translation>Karte um %@</translation>
+    </message>
+    <message>
+        <source>HOW_FEW</source>
+        <extracomment>How exactly a place is known: up to 15 metres</extracomment>
+        <translation>Auf wenige Meter genau</translation>
+    </message>
+    <message>
+        <source>HOW_WITHIN</source>
+        <extracomment>The same; %@ is a distance with its unit</extracomment>
+        <translation>Auf etwa %@ genau</translation>
+    </message>
+    <message>
+        <source>HOW_NEAR</source>
+        <extracomment>The same, of a wide place; %@ is a distance with its unit</extracomment>
+        <translation>Irgendwo in der Nähe, auf etwa %@ genau</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS</source>
+        <extracomment>The name of the page with the list of friends</extracomment>
+        <translation>Freunde</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS_NONE</source>
+        <extracomment>On that page, when nobody was asked about</extracomment>
+        <translation>Es wurde noch nach niemandem gefragt.</translation>
+    </message>
+    <message>
+        <source>PAGE_ME</source>
+        <extracomment>The name of the user’s own page</extracomment>
+        <translation>Mein Standort</translation>
+    </message>
+    <message>
+        <source>SHARING_SWITCH</source>
+        <extracomment>A switch on that page</extracomment>
+        <translation>Freunde können mich sehen</translation>
+    </message>
+    <message>
+        <source>SHARING_ON</source>
+        <extracomment>Under that switch, while it is on</extracomment>
+        <translation>Wem du es erlaubst, der sieht, wo du bist.</translation>
+    </message>
+    <message>
+        <source>SHARING_OFF</source>
+        <extracomment>Under that switch, while it is off</extracomment>
+        <translation>Niemand kann sehen, wo du bist.</translation>
+    </message>
+    <message>
+        <source>SHARING_UNKNOWN</source>
+        <extracomment>Under that switch, while the service has not been told anything by it</extracomment>
+        <translation>Dein Dienst hat es noch nicht gesagt.</translation>
+    </message>
+    <message>
+        <source>SHARING_FAILED</source>
+        <extracomment>Under that switch, when the wish did not reach the service</extracomment>
+        <translation>Dein Dienst hat nicht geantwortet. Hier ist alles wie zuvor.</translation>
+    </message>
+    <message>
+        <source>MAP_NO_STREETS</source>
+        <extracomment>Under a card whose map has no streets</extracomment>
+        <translation>Für diese Gegend gibt es hier noch keine Straßen.</translation>
+    </message>
+    <message>
+        <source>MAP_GET_STREETS</source>
+        <extracomment>Beside it, a button: chooses a file with a map</extracomment>
+        <translation>Straßen holen</translation>
+    </message>
+    <message>
+        <source>MAP_NO_PLACE</source>
+        <extracomment>On the plain ground of a map whose friend has no place</extracomment>
+        <translation>Kein Ort</translation>
+    </message>
+    <message>
+        <source>MENU_CUT</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>Ausschneiden</translation>
+    </message>
+    <message>
+        <source>MENU_COPY</source>
+        <extracomment>In the menu of the field and of the conversation</extracomment>
+        <translation>Kopieren</translation>
+    </message>
+    <message>
+        <source>MENU_PASTE</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>Einfügen</translation>
+    </message>
+    <message>
+        <source>MENU_SELECT_ALL</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>Alles auswählen</translation>
+    </message>
 </context>
 </TS>

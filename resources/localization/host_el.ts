@@ -228,5 +228,180 @@
         <extracomment>Two sentences that are said one after the other, as the language parts them; each has its full stop. English: “%1$@ %2$@”</extracomment>
         <translation>%1$@ %2$@</translation>
     </message>
+    <message>
+        <source>LINK_NOBODY</source>
+        <extracomment>A tap on a link that no program opens</extracomment>
+        <translation>Κανένα πρόγραμμα σε αυτόν τον υπολογιστή δεν ανοίγει συνδέσμους.</translation>
+    </message>
+    <message>
+        <source>PLACE_NOBODY</source>
+        <extracomment>The same, of a place on the map</extracomment>
+        <translation>Κανένα πρόγραμμα σε αυτόν τον υπολογιστή δεν ανοίγει τοποθεσίες.</translation>
+    </message>
+    <message>
+        <source>CALL_NOBODY</source>
+        <extracomment>The same, of a call</extracomment>
+        <translation>Κανένα πρόγραμμα σε αυτόν τον υπολογιστή δεν κάνει κλήσεις.</translation>
+    </message>
+    <message>
+        <source>WRITE_NOBODY</source>
+        <extracomment>The same, of a message</extracomment>
+        <translation>Κανένα πρόγραμμα σε αυτόν τον υπολογιστή δεν γράφει μηνύματα.</translation>
+    </message>
+    <message>
+        <source>LINK_REFUSED</source>
+        <extracomment>A link of a kind that this program does not open</extracomment>
+        <translation>Αυτός ο σύνδεσμος δεν ανοίγει εδώ.</translation>
+    </message>
+    <message>
+        <source>LINK_UNKNOWN</source>
+        <extracomment>A link from elsewhere about nobody who is among the user’s friends</extracomment>
+        <translation>Δεν ξέρω για ποιον είναι αυτός ο σύνδεσμος.</translation>
+    </message>
+    <message>
+        <source>FRIEND_CALL</source>
+        <extracomment>Under a round button: calls the friend</extracomment>
+        <translation>Κλήση</translation>
+    </message>
+    <message>
+        <source>FRIEND_WRITE</source>
+        <extracomment>Under a round button: writes to the friend</extracomment>
+        <translation>Γράψτε</translation>
+    </message>
+    <message>
+        <source>FRIEND_MAPS</source>
+        <extracomment>Under a round button: opens the place in a program for maps</extracomment>
+        <translation>Άνοιγμα σε χάρτες</translation>
+    </message>
+    <message>
+        <source>FRIEND_COPY</source>
+        <extracomment>Under a round button: puts the place into the clipboard</extracomment>
+        <translation>Αντιγραφή θέσης</translation>
+    </message>
+    <message>
+        <source>FRIEND_COPIED</source>
+        <extracomment>In the place of “Copy place”, for two seconds after it was pressed</extracomment>
+        <translation>Αντιγράφηκε</translation>
+    </message>
+    <message>
+        <source>FRIEND_SHOW</source>
+        <extracomment>A button: brings the friend (%@) back into view on the map</extracomment>
+        <translation>Εμφάνιση: %@</translation>
+    </message>
+    <message>
+        <source>FRIEND_WHERE</source>
+        <extracomment>A button that asks where a friend (%@) is</extracomment>
+        <translation>Πού βρίσκεται: %@;</translation>
+    </message>
+    <message>
+        <source>FRIEND_NOT_SEEN</source>
+        <extracomment>A friend (%@) whose place is not to be seen</extracomment>
+        <translation>Δεν μπορώ να δω πού βρίσκεται: %@.</translation>
+    </message>
+    <message>
+        <source>MAP_CLOSER</source>
+        <extracomment>A button on the map, spoken: zooms in</extracomment>
+        <translation>Πιο κοντά</translation>
+    </message>
+    <message>
+        <source>MAP_FURTHER</source>
+        <extracomment>A button on the map, spoken: zooms out</extracomment>
+        <translation>Πιο μακριά</translation>
+    </message>
+    <message>
+        <source>MAP_SPOKEN</source>
+        <extracomment>The map of a friend’s page, spoken; %@ is the friend</extracomment>
+        <translation>Χάρτης γύρω από: %@</translation>
+    </message>
+    <message>
+        <source>HOW_FEW</source>
+        <extracomment>How exactly a place is known: up to 15 metres</extracomment>
+        <translation>Με ακρίβεια λίγων μέτρων</translation>
+    </message>
+    <message>
+        <source>HOW_WITHIN</source>
+        <extracomment>The same; %@ is a distance with its unit</extracomment>
+        <translation>Με ακρίβεια περίπου %@</translation>
+    </message>
+    <message>
+        <source>HOW_NEAR</source>
+        <extracomment>The same, of a wide place; %@ is a distance with its unit</extracomment>
+        <translation>Κάπου κοντά, με ακρίβεια περίπου %@</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS</source>
+        <extracomment>The name of the page with the list of friends</extracomment>
+        <translation>Φίλοι</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS_NONE</source>
+        <extracomment>On that page, when nobody was asked about</extracomment>
+        <translation>Δεν έχει ζητηθεί ακόμη κανείς.</translation>
+    </message>
+    <message>
+        <source>PAGE_ME</source>
+        <extracomment>The name of the user’s own page</extracomment>
+        <translation>Η θέση μου</translation>
+    </message>
+    <message>
+        <source>SHARING_SWITCH</source>
+        <extracomment>A switch on that page</extracomment>
+        <translation>Οι φίλοι με βλέπουν</translation>
+    </message>
+    <message>
+        <source>SHARING_ON</source>
+        <extracomment>Under that switch, while it is on</extracomment>
+        <translation>Όσοι επιτρέπετε βλέπουν πού είστε.</translation>
+    </message>
+    <message>
+        <source>SHARING_OFF</source>
+        <extracomment>Under that switch, while it is off</extracomment>
+        <translation>Κανείς δεν βλέπει πού είστε.</translation>
+    </message>
+    <message>
+        <source>SHARING_UNKNOWN</source>
+        <extracomment>Under that switch, while the service has not been told anything by it</extracomment>
+        <translation>Η υπηρεσία σας δεν το έχει πει ακόμη.</translation>
+    </message>
+    <message>
+        <source>SHARING_FAILED</source>
+        <extracomment>Under that switch, when the wish did not reach the service</extracomment>
+        <translation>Η υπηρεσία σας δεν απάντησε. Εδώ δεν άλλαξε τίποτα.</translation>
+    </message>
+    <message>
+        <source>MAP_NO_STREETS</source>
+        <extracomment>Under a card whose map has no streets</extracomment>
+        <translation>Δεν υπάρχουν ακόμη δρόμοι για αυτή την περιοχή.</translation>
+    </message>
+    <message>
+        <source>MAP_GET_STREETS</source>
+        <extracomment>Beside it, a button: chooses a file with a map</extracomment>
+        <translation>Λήψη δρόμων</translation>
+    </message>
+    <message>
+        <source>MAP_NO_PLACE</source>
+        <extracomment>On the plain ground of a map whose friend has no place</extracomment>
+        <translation>Καμία θέση</translation>
+    </message>
+    <message>
+        <source>MENU_CUT</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>Αποκοπή</translation>
+    </message>
+    <message>
+        <source>MENU_COPY</source>
+        <extracomment>In the menu of the field and of the conversation</extracomment>
+        <translation>Αντιγραφή</translation>
+    </message>
+    <message>
+        <source>MENU_PASTE</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>Επικόλληση</translation>
+    </message>
+    <message>
+        <source>MENU_SELECT_ALL</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>Επιλογή όλων</translation>
+    </message>
 </context>
 </TS>

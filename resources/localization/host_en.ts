@@ -228,5 +228,180 @@
         <extracomment>Two sentences that are said one after the other, as the language parts them; each has its full stop</extracomment>
         <translation>%1$@ %2$@</translation>
     </message>
+    <message>
+        <source>LINK_NOBODY</source>
+        <extracomment>A tap on a link that no program opens</extracomment>
+        <translation>No program on this computer opens links.</translation>
+    </message>
+    <message>
+        <source>PLACE_NOBODY</source>
+        <extracomment>The same, of a place on the map</extracomment>
+        <translation>No program on this computer opens places.</translation>
+    </message>
+    <message>
+        <source>CALL_NOBODY</source>
+        <extracomment>The same, of a call</extracomment>
+        <translation>No program on this computer makes calls.</translation>
+    </message>
+    <message>
+        <source>WRITE_NOBODY</source>
+        <extracomment>The same, of a message</extracomment>
+        <translation>No program on this computer writes messages.</translation>
+    </message>
+    <message>
+        <source>LINK_REFUSED</source>
+        <extracomment>A link of a kind that this program does not open</extracomment>
+        <translation>This link isn’t opened here.</translation>
+    </message>
+    <message>
+        <source>LINK_UNKNOWN</source>
+        <extracomment>A link from elsewhere about nobody who is among the user’s friends</extracomment>
+        <translation>I don’t know who this link is about.</translation>
+    </message>
+    <message>
+        <source>FRIEND_CALL</source>
+        <extracomment>Under a round button: calls the friend</extracomment>
+        <translation>Call</translation>
+    </message>
+    <message>
+        <source>FRIEND_WRITE</source>
+        <extracomment>Under a round button: writes to the friend</extracomment>
+        <translation>Write</translation>
+    </message>
+    <message>
+        <source>FRIEND_MAPS</source>
+        <extracomment>Under a round button: opens the place in a program for maps</extracomment>
+        <translation>Open in Maps</translation>
+    </message>
+    <message>
+        <source>FRIEND_COPY</source>
+        <extracomment>Under a round button: puts the place into the clipboard</extracomment>
+        <translation>Copy place</translation>
+    </message>
+    <message>
+        <source>FRIEND_COPIED</source>
+        <extracomment>In the place of “Copy place”, for two seconds after it was pressed</extracomment>
+        <translation>Copied</translation>
+    </message>
+    <message>
+        <source>FRIEND_SHOW</source>
+        <extracomment>A button: brings the friend (%@) back into view on the map</extracomment>
+        <translation>Show %@</translation>
+    </message>
+    <message>
+        <source>FRIEND_WHERE</source>
+        <extracomment>A button that asks where a friend (%@) is</extracomment>
+        <translation>Where is %@?</translation>
+    </message>
+    <message>
+        <source>FRIEND_NOT_SEEN</source>
+        <extracomment>A friend (%@) whose place is not to be seen</extracomment>
+        <translation>I can’t see where %@ is.</translation>
+    </message>
+    <message>
+        <source>MAP_CLOSER</source>
+        <extracomment>A button on the map, spoken: zooms in</extracomment>
+        <translation>Closer</translation>
+    </message>
+    <message>
+        <source>MAP_FURTHER</source>
+        <extracomment>A button on the map, spoken: zooms out</extracomment>
+        <translation>Further away</translation>
+    </message>
+    <message>
+        <source>MAP_SPOKEN</source>
+        <extracomment>The map of a friend’s page, spoken; %@ is the friend</extracomment>
+        <translation>Map around %@</translation>
+    </message>
+    <message>
+        <source>HOW_FEW</source>
+        <extracomment>How exactly a place is known: up to 15 metres</extracomment>
+        <translation>Within a few metres</translation>
+    </message>
+    <message>
+        <source>HOW_WITHIN</source>
+        <extracomment>The same; %@ is a distance with its unit</extracomment>
+        <translation>Within about %@</translation>
+    </message>
+    <message>
+        <source>HOW_NEAR</source>
+        <extracomment>The same, of a wide place; %@ is a distance with its unit</extracomment>
+        <translation>Somewhere near, within about %@</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS</source>
+        <extracomment>The name of the page with the list of friends</extracomment>
+        <translation>Friends</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS_NONE</source>
+        <extracomment>On that page, when nobody was asked about</extracomment>
+        <translation>Nobody was asked about yet.</translation>
+    </message>
+    <message>
+        <source>PAGE_ME</source>
+        <extracomment>The name of the user’s own page</extracomment>
+        <translation>My location</translation>
+    </message>
+    <message>
+        <source>SHARING_SWITCH</source>
+        <extracomment>A switch on that page</extracomment>
+        <translation>Friends can see me</translation>
+    </message>
+    <message>
+        <source>SHARING_ON</source>
+        <extracomment>Under that switch, while it is on</extracomment>
+        <translation>Those you allow can see where you are.</translation>
+    </message>
+    <message>
+        <source>SHARING_OFF</source>
+        <extracomment>Under that switch, while it is off</extracomment>
+        <translation>Nobody can see where you are.</translation>
+    </message>
+    <message>
+        <source>SHARING_UNKNOWN</source>
+        <extracomment>Under that switch, while the service has not been told anything by it</extracomment>
+        <translation>Your service hasn’t said yet.</translation>
+    </message>
+    <message>
+        <source>SHARING_FAILED</source>
+        <extracomment>Under that switch, when the wish did not reach the service</extracomment>
+        <translation>Your service didn’t answer. Nothing has changed here.</translation>
+    </message>
+    <message>
+        <source>MAP_NO_STREETS</source>
+        <extracomment>Under a card whose map has no streets</extracomment>
+        <translation>No streets for this region here yet.</translation>
+    </message>
+    <message>
+        <source>MAP_GET_STREETS</source>
+        <extracomment>Beside it, a button: chooses a file with a map</extracomment>
+        <translation>Get streets</translation>
+    </message>
+    <message>
+        <source>MAP_NO_PLACE</source>
+        <extracomment>On the plain ground of a map whose friend has no place</extracomment>
+        <translation>No place</translation>
+    </message>
+    <message>
+        <source>MENU_CUT</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>Cut</translation>
+    </message>
+    <message>
+        <source>MENU_COPY</source>
+        <extracomment>In the menu of the field and of the conversation</extracomment>
+        <translation>Copy</translation>
+    </message>
+    <message>
+        <source>MENU_PASTE</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>Paste</translation>
+    </message>
+    <message>
+        <source>MENU_SELECT_ALL</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>Select all</translation>
+    </message>
 </context>
 </TS>

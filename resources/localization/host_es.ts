@@ -228,5 +228,180 @@
         <extracomment>Two sentences that are said one after the other, as the language parts them; each has its full stop. English: “%1$@ %2$@”</extracomment>
         <translation>%1$@ %2$@</translation>
     </message>
+    <message>
+        <source>LINK_NOBODY</source>
+        <extracomment>A tap on a link that no program opens</extracomment>
+        <translation>Ningún programa de este equipo abre enlaces.</translation>
+    </message>
+    <message>
+        <source>PLACE_NOBODY</source>
+        <extracomment>The same, of a place on the map</extracomment>
+        <translation>Ningún programa de este equipo abre lugares.</translation>
+    </message>
+    <message>
+        <source>CALL_NOBODY</source>
+        <extracomment>The same, of a call</extracomment>
+        <translation>Ningún programa de este equipo hace llamadas.</translation>
+    </message>
+    <message>
+        <source>WRITE_NOBODY</source>
+        <extracomment>The same, of a message</extracomment>
+        <translation>Ningún programa de este equipo escribe mensajes.</translation>
+    </message>
+    <message>
+        <source>LINK_REFUSED</source>
+        <extracomment>A link of a kind that this program does not open</extracomment>
+        <translation>Este enlace no se abre aquí.</translation>
+    </message>
+    <message>
+        <source>LINK_UNKNOWN</source>
+        <extracomment>A link from elsewhere about nobody who is among the user’s friends</extracomment>
+        <translation>No sé de quién trata este enlace.</translation>
+    </message>
+    <message>
+        <source>FRIEND_CALL</source>
+        <extracomment>Under a round button: calls the friend</extracomment>
+        <translation>Llamar</translation>
+    </message>
+    <message>
+        <source>FRIEND_WRITE</source>
+        <extracomment>Under a round button: writes to the friend</extracomment>
+        <translation>Escribir</translation>
+    </message>
+    <message>
+        <source>FRIEND_MAPS</source>
+        <extracomment>Under a round button: opens the place in a program for maps</extracomment>
+        <translation>Abrir en mapas</translation>
+    </message>
+    <message>
+        <source>FRIEND_COPY</source>
+        <extracomment>Under a round button: puts the place into the clipboard</extracomment>
+        <translation>Copiar lugar</translation>
+    </message>
+    <message>
+        <source>FRIEND_COPIED</source>
+        <extracomment>In the place of “Copy place”, for two seconds after it was pressed</extracomment>
+        <translation>Copiado</translation>
+    </message>
+    <message>
+        <source>FRIEND_SHOW</source>
+        <extracomment>A button: brings the friend (%@) back into view on the map</extracomment>
+        <translation>Mostrar a %@</translation>
+    </message>
+    <message>
+        <source>FRIEND_WHERE</source>
+        <extracomment>A button that asks where a friend (%@) is</extracomment>
+        <translation>¿Dónde está %@?</translation>
+    </message>
+    <message>
+        <source>FRIEND_NOT_SEEN</source>
+        <extracomment>A friend (%@) whose place is not to be seen</extracomment>
+        <translation>No puedo ver dónde está %@.</translation>
+    </message>
+    <message>
+        <source>MAP_CLOSER</source>
+        <extracomment>A button on the map, spoken: zooms in</extracomment>
+        <translation>Más cerca</translation>
+    </message>
+    <message>
+        <source>MAP_FURTHER</source>
+        <extracomment>A button on the map, spoken: zooms out</extracomment>
+        <translation>Más lejos</translation>
+    </message>
+    <message>
+        <source>MAP_SPOKEN</source>
+        <extracomment>The map of a friend’s page, spoken; %@ is the friend</extracomment>
+        <translation>Mapa alrededor de %@</translation>
+    </message>
+    <message>
+        <source>HOW_FEW</source>
+        <extracomment>How exactly a place is known: up to 15 metres</extracomment>
+        <translation>A unos pocos metros</translation>
+    </message>
+    <message>
+        <source>HOW_WITHIN</source>
+        <extracomment>The same; %@ is a distance with its unit</extracomment>
+        <translation>A unos %@</translation>
+    </message>
+    <message>
+        <source>HOW_NEAR</source>
+        <extracomment>The same, of a wide place; %@ is a distance with its unit</extracomment>
+        <translation>En algún lugar cercano, a unos %@</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS</source>
+        <extracomment>The name of the page with the list of friends</extracomment>
+        <translation>Amigos</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS_NONE</source>
+        <extracomment>On that page, when nobody was asked about</extracomment>
+        <translation>Aún no se ha preguntado por nadie.</translation>
+    </message>
+    <message>
+        <source>PAGE_ME</source>
+        <extracomment>The name of the user’s own page</extracomment>
+        <translation>Mi ubicación</translation>
+    </message>
+    <message>
+        <source>SHARING_SWITCH</source>
+        <extracomment>A switch on that page</extracomment>
+        <translation>Los amigos pueden verme</translation>
+    </message>
+    <message>
+        <source>SHARING_ON</source>
+        <extracomment>Under that switch, while it is on</extracomment>
+        <translation>Quienes tú permites pueden ver dónde estás.</translation>
+    </message>
+    <message>
+        <source>SHARING_OFF</source>
+        <extracomment>Under that switch, while it is off</extracomment>
+        <translation>Nadie puede ver dónde estás.</translation>
+    </message>
+    <message>
+        <source>SHARING_UNKNOWN</source>
+        <extracomment>Under that switch, while the service has not been told anything by it</extracomment>
+        <translation>Tu servicio aún no lo ha dicho.</translation>
+    </message>
+    <message>
+        <source>SHARING_FAILED</source>
+        <extracomment>Under that switch, when the wish did not reach the service</extracomment>
+        <translation>Tu servicio no respondió. Aquí nada ha cambiado.</translation>
+    </message>
+    <message>
+        <source>MAP_NO_STREETS</source>
+        <extracomment>Under a card whose map has no streets</extracomment>
+        <translation>Aún no hay calles de esta región.</translation>
+    </message>
+    <message>
+        <source>MAP_GET_STREETS</source>
+        <extracomment>Beside it, a button: chooses a file with a map</extracomment>
+        <translation>Obtener calles</translation>
+    </message>
+    <message>
+        <source>MAP_NO_PLACE</source>
+        <extracomment>On the plain ground of a map whose friend has no place</extracomment>
+        <translation>Ningún lugar</translation>
+    </message>
+    <message>
+        <source>MENU_CUT</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>Cortar</translation>
+    </message>
+    <message>
+        <source>MENU_COPY</source>
+        <extracomment>In the menu of the field and of the conversation</extracomment>
+        <translation>Copiar</translation>
+    </message>
+    <message>
+        <source>MENU_PASTE</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>Pegar</translation>
+    </message>
+    <message>
+        <source>MENU_SELECT_ALL</source>
+        <extracomment>In the menu of the field</extracomment>
+        <translation>Seleccionar todo</translation>
+    </message>
 </context>
 </TS>

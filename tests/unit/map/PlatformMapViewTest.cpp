@@ -1,6 +1,7 @@
 #include "platform/map/PlatformMapView.h"
 
 #include <algorithm>
+#include <cmath>
 
 #include "platform/map/KTAnnotationView.h"
 #include "platform/map/MapLocationManager.h"
@@ -495,6 +496,71 @@ TEST_F(PlatformMapViewTest, Taps_GoToWhatHoldsTheMap) {
     const auto holder = create<View>(&View::initWithFrame, Rect{0.0, 0.0, 376.0, 219.0});
     holder->addSubview(map_);
     EXPECT_EQ(holder->hitTest({100.0, 100.0}), holder);
+}
+
+TEST_F(PlatformMapViewTest, AHandMovesTheMapAtOnce_UntilARegionIsSetAgain) {
+    map_->setRegion(kTown, false);
+    time->runPosted();
+    const Coordinate there{50.2155, -3.1111};
+    map_->showAt(there, 15.25, PlatformMapView::Hand::Resting);
+    EXPECT_EQ(map_->viewport().centre, there);
+    EXPECT_EQ(map_->viewport().zoom, 15.25);
+    EXPECT_EQ(map_->viewportAtRest(), map_->viewport());
+    map_->showAt({95.0, 0.0}, 15.0, PlatformMapView::Hand::Resting);
+    map_->showAt(there, std::nan(""), PlatformMapView::Hand::Resting);
+    EXPECT_EQ(map_->viewport().centre, there);
+    map_->setRegion(kTown, false);
+    EXPECT_EQ(map_->viewport(), kTown.viewport({376.0, 219.0}));
+}
+
+TEST_F(PlatformMapViewTest, AHeldMapIsDrawnBeyondItsEdges_AndAsksForNothingWhileThatLasts) {
+    map_->showAt({50.21, -3.12}, 15.0, PlatformMapView::Hand::Resting);
+    time->runPosted();
+    ASSERT_FALSE(maps_->requests.empty());
+    EXPECT_EQ(maps_->requests.back().viewport.size, (Size{376.0 + 2.0 * 94.0, 219.0 + 2.0 * 54.0}));
+    maps_->answer();
+    time->runPosted();
+    const auto asked = maps_->requests.size();
+    const MapViewport start = map_->viewport();
+    for (int step = 1; step <= 90; ++step) {
+        map_->showAt(start.coordinateAt({188.0 + step, 109.5}), 15.0, PlatformMapView::Hand::Moving);
+    }
+    EXPECT_EQ(maps_->requests.size(), asked);
+    map_->showAt(start.coordinateAt({188.0 + 120.0, 109.5}), 15.0, PlatformMapView::Hand::Moving);
+    EXPECT_EQ(maps_->requests.size(), asked + 1);
+}
+
+TEST_F(PlatformMapViewTest, AMapThatNeverRestsGetsItsPictures) {
+    map_->showAt({50.21, -3.12}, 15.0, PlatformMapView::Hand::Moving);
+    time->runPosted();
+    const auto asked = maps_->requests.size();
+    for (int step = 1; step <= 50; ++step) {
+        map_->showAt({50.21, -3.12 + step * 0.01}, 15.0, PlatformMapView::Hand::Moving);
+        time->runPosted();
+    }
+    // One is under way all the time, and none of them was called off.
+    EXPECT_EQ(maps_->requests.size(), asked);
+    EXPECT_TRUE(maps_->cancelled.empty());
+    maps_->answer();
+    EXPECT_EQ(maps_->requests.size(), asked + 1);
+    EXPECT_NEAR(maps_->requests.back().viewport.centre.longitude, -3.12 + 0.5, 1e-9);
+}
+
+TEST_F(PlatformMapViewTest, LabelsKeepClearOfWhatStandsOverTheMap_AndTheCornersMoveIn) {
+    map_->setSurroundings({{10.0, 0.0, 60.0, 20.0}, {{0.0, 159.0, 376.0, 60.0}}});
+    map_->showAt({50.21, -3.12}, 15.0, PlatformMapView::Hand::Resting);
+    time->runPosted();
+    const Rect chrome = map_->subviews().back()->frame();
+    EXPECT_EQ(chrome, (Rect{0.0, 10.0, 356.0, 149.0}));
+    const auto& clear = maps_->requests.back().clear;
+    const auto covers = [&](Point point) {
+        return std::any_of(clear.begin(), clear.end(), [&](const Rect& rect) {
+            return rect.contains({point.x + 94.0, point.y + 54.0});
+        });
+    };
+    EXPECT_TRUE(covers({100.0, 200.0}));
+    EXPECT_TRUE(covers({60.0, 150.0}));  // the scale
+    EXPECT_FALSE(covers({188.0, 60.0}));
 }
 
 }  // namespace ktr::test
