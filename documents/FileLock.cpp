@@ -9,11 +9,13 @@
 #include <cstring>
 #include <thread>
 
+#include "documents/FileSteps.h"
+
 namespace ktr::documents {
 
 FileLock::FileLock(const std::filesystem::path& file, std::chrono::milliseconds longestWait) {
     // Not waiting: what stands in the lock's place may be a pipe.
-    descriptor_ = ::open(file.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK, 0600);
+    descriptor_ = FileSteps::open(file, O_RDWR | O_CREAT | O_NOFOLLOW | O_NONBLOCK, 0600);
     if (descriptor_ < 0) {
         problem_ = std::strerror(errno);
         return;

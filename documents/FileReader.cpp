@@ -8,6 +8,8 @@
 #include <cstring>
 #include <optional>
 
+#include "documents/FileSteps.h"
+
 namespace ktr::documents {
 
 namespace {
@@ -85,16 +87,6 @@ std::variant<std::string, Error> readOpened(int descriptor, std::size_t expected
     }
 }
 
-int openQuietly(const char* file) {
-    for (;;) {
-        // Not waiting: a pipe could take the file's place between a look at it and the opening.
-        const int descriptor = ::open(file, O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY);
-        if (descriptor >= 0 || errno != EINTR) {
-            return descriptor;
-        }
-    }
-}
-
 }  // namespace
 
 std::variant<std::string, Error> FileReader::read(const std::filesystem::path& file, const Terms& terms) {
@@ -109,7 +101,8 @@ std::variant<std::string, Error> FileReader::read(const std::filesystem::path& f
     if (auto wrong = wrongType(facts.st_mode)) {
         return *wrong;
     }
-    const Descriptor descriptor(openQuietly(file.c_str()));
+    // Not waiting: a pipe could take the file's place between the look at it and the opening.
+    const Descriptor descriptor(FileSteps::open(file, O_RDONLY | O_NONBLOCK | O_NOCTTY));
     if (descriptor.number() < 0 || ::fstat(descriptor.number(), &facts) != 0) {
         return failed(errno);
     }

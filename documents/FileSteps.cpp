@@ -30,18 +30,18 @@ int sync(int descriptor) {
     return result == 0 ? 0 : errno;
 }
 
-int openPatiently(const char* file, int flags, mode_t mode = 0) {
+}  // namespace
+
+int FileSteps::open(const std::filesystem::path& file, int flags, mode_t mode) {
     int descriptor = -1;
     do {
-        descriptor = ::open(file, flags | O_CLOEXEC, mode);
+        descriptor = ::open(file.c_str(), flags | O_CLOEXEC, mode);
     } while (descriptor < 0 && errno == EINTR);
     return descriptor;
 }
 
-}  // namespace
-
 int FileSteps::writeNew(const std::filesystem::path& file, std::string_view bytes, mode_t mode) {
-    const int descriptor = openPatiently(file.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW, mode);
+    const int descriptor = open(file, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW, mode);
     if (descriptor < 0) {
         return errno;
     }
@@ -60,7 +60,7 @@ int FileSteps::writeNew(const std::filesystem::path& file, std::string_view byte
 }
 
 int FileSteps::syncFolder(const std::filesystem::path& folder) {
-    const int descriptor = openPatiently(folder.c_str(), O_RDONLY | O_DIRECTORY);
+    const int descriptor = open(folder, O_RDONLY | O_DIRECTORY);
     if (descriptor < 0) {
         return errno;
     }

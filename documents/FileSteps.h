@@ -8,14 +8,17 @@
 
 namespace ktr::documents {
 
-/// The steps of replacing a file, each of which gives 0 or the errno of its failure. Any thread; they wait for the
-/// disk.
+/// The steps of replacing a file, each of which gives 0 or the errno of its failure where it does not say otherwise.
+/// Any thread; they wait for the disk.
 class FileSteps {
   public:
     /// Makes a file that was not there, writes all bytes and brings them to the disk. What a failure leaves is removed.
     static int writeNew(const std::filesystem::path& file, std::string_view bytes, mode_t mode);
     /// Brings the names in a folder to the disk.
     static int syncFolder(const std::filesystem::path& folder);
+    /// `open`, closed in programs that are started later, and again where a signal came between. A descriptor, or -1
+    /// and errno.
+    static int open(const std::filesystem::path& file, int flags, mode_t mode = 0);
     static std::filesystem::path folderOf(const std::filesystem::path& file);
     /// "dinner.png: cannot be written: No space left on device".
     static std::string sentence(const std::filesystem::path& file, const char* what, int failure);

@@ -5,6 +5,7 @@
 #include <chrono>
 #include <cmath>
 #include <cstddef>
+#include <cstdint>
 #include <string>
 
 #include "documents/IsoTime.h"
@@ -54,6 +55,22 @@ std::optional<platform::Date> parseHttpTime(std::string_view text) {
     const auto time =
         parseIsoTime(part(12, 4) + "-" + monthNumber(text.substr(8, 3)) + "-" + part(5, 2) + "T" + part(17, 8) + "Z");
     return time && dayName(time->date) == text.substr(0, 3) ? std::optional(time->date) : std::nullopt;
+}
+
+std::optional<std::chrono::seconds> parseRetryAfter(std::string_view text, platform::Date now) {
+    constexpr double kLongest = 365 * kSecondsADay;
+    text = trimmed(text);
+    double wanted = 0.0;
+    if (!text.empty() && text.find_first_not_of("0123456789") == std::string_view::npos) {
+        for (const char letter : text) {
+            wanted = std::min(wanted * 10 + (letter - '0'), kLongest);
+        }
+    } else if (const auto moment = parseHttpTime(text)) {
+        wanted = std::ceil(moment->secondsSinceReferenceDate - now.secondsSinceReferenceDate);
+    } else {
+        return std::nullopt;
+    }
+    return std::chrono::seconds(static_cast<std::int64_t>(std::clamp(wanted, 0.0, kLongest)));
 }
 
 }  // namespace ktr::documents

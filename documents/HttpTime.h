@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <optional>
 #include <string_view>
 
@@ -11,5 +12,9 @@ namespace ktr::documents {
 /// `Sun, 06 Nov 1994 08:49:37 GMT`, with blanks around it or without. None for anything else, also for a day that does
 /// not exist or has another name.
 std::optional<platform::Date> parseHttpTime(std::string_view text);
+
+/// How long a server wants to be left alone from `now` on: the field Retry-After (RFC 9110, section 10.2.3), a count of
+/// seconds or a moment as above; not below 0 and at most a year. None for anything else.
+std::optional<std::chrono::seconds> parseRetryAfter(std::string_view text, platform::Date now);
 
 }  // namespace ktr::documents

@@ -8,6 +8,7 @@
 #include <string_view>
 #include <utility>
 
+#include "documents/HttpTime.h"
 #include "linux/maps/TileFreshness.h"
 #include "linux/net/TroubleLine.h"
 
@@ -49,12 +50,10 @@ bool isPicture(std::string_view data) {
     return data.starts_with("\x89PNG\r\n\x1a\n") || data.starts_with("\xff\xd8\xff");
 }
 
-/// How long a server wants to be left alone (RFC 9110, section 10.2.3); it need not say, and is not asked to say it
-/// well.
-seconds retryAfter(const std::string& field) {
-    bool isNumber = false;
-    const int wanted = QByteArray::fromStdString(field).trimmed().toInt(&isNumber);
-    return isNumber ? std::clamp(seconds(wanted), kLeastPause, kPauseWhenGone) : kLeastPause;
+/// How long a server that is busy is left alone; it need not say, and is not asked to say it well.
+seconds pauseWhenBusy(const std::string& retryAfter) {
+    const platform::Date now{static_cast<double>(secondsNow()) - platform::kSecondsFrom1970ToReferenceDate};
+    return std::clamp(documents::parseRetryAfter(retryAfter, now).value_or(kLeastPause), kLeastPause, kPauseWhenGone);
 }
 
 QUrl addressOf(const std::string& pattern, const tiles::TileKey& key) {
@@ -169,7 +168,7 @@ class HttpsPictures::Fetcher : public QObject {
     void pauseAfter(const HttpsAnswer& answer) {
         const auto now = std::chrono::steady_clock::now();
         if (answer.status == kTooMany || answer.status == kUnavailable) {
-            notBefore_ = now + retryAfter(answer.field("Retry-After"));
+            notBefore_ = now + pauseWhenBusy(answer.field("Retry-After"));
         }
         const bool isAway =
             answer.failure == platform::HttpFailure::Network || answer.failure == platform::HttpFailure::BadAnswer ||

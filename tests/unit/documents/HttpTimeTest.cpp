@@ -28,4 +28,19 @@ TEST(HttpTimeTest, AnythingElse_IsNone) {
     }
 }
 
+TEST(HttpTimeTest, RetryAfter_IsSecondsOrAMoment) {
+    using documents::parseRetryAfter;
+    using std::chrono::seconds;
+    const auto now = *parseHttpTime("Sun, 06 Nov 1994 08:49:37 GMT");
+    EXPECT_EQ(parseRetryAfter("0", now), seconds(0));
+    EXPECT_EQ(parseRetryAfter(" 120\t", now), seconds(120));
+    EXPECT_EQ(parseRetryAfter("Sun, 06 Nov 1994 08:51:37 GMT", now), seconds(120));
+    EXPECT_EQ(parseRetryAfter("Sun, 06 Nov 1994 08:00:00 GMT", now), seconds(0));
+    EXPECT_EQ(parseRetryAfter("Fri, 31 Dec 9999 23:59:59 GMT", now), seconds(31536000));
+    EXPECT_EQ(parseRetryAfter(std::string(10000, '9'), now), seconds(31536000));
+    for (const char* text : {"", " ", "-1", "+1", "1.5", "soon", "1 2", "0x10"}) {
+        EXPECT_EQ(parseRetryAfter(text, now), std::nullopt) << text;
+    }
+}
+
 }  // namespace ktr::test
