@@ -9,7 +9,7 @@
 
 namespace ktr::app {
 
-/// Lets a live conversation happen without a window: in real time, with what goes on told on the standard error. Main
+/// Lets a live conversation happen without a window: in real time, with progress reported on the standard error. Main
 /// thread, with Qt's event loop.
 class LiveRun {
   public:

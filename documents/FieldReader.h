@@ -23,7 +23,7 @@ struct Complaints {
     static constexpr std::size_t kMostUnknown = 8;
 
     std::optional<Complaint> first;
-    std::vector<Complaint> unknown;  ///< members that nobody asked for
+    std::vector<Complaint> unknown;  ///< members that no reader knows
     std::size_t moreUnknown = 0;
 
     explicit operator bool() const { return first.has_value(); }
@@ -61,13 +61,14 @@ class FieldReader {
     void complain(const std::string& name, std::string message);
     void complainAt(const JsonPath& path, std::string message);
 
-    /// Members that this reader does not know are none of its business: nobody is warned of them.
+    /// Members that this reader does not know are none of its business: no warning is given.
     void leaveOthers() { leavesOthers_ = true; }
-    /// The members that nobody asked for so far, in the document's order. "$schema" is always known.
+    /// The members that no reader has asked for so far, in the document's order. "$schema" is always known.
     std::vector<std::string> unasked() const;
     /// What was asked for so far.
     const std::vector<std::string>& asked() const { return asked_; }
-    /// Notes what nobody asked for; called once everything was. `object` and `objects` do it for what they read.
+    /// Notes what no reader asked for; called after everything else was. `object` and `objects` do it for what they
+    /// read.
     void warnOfOthers();
 
     const platform::Dictionary& dictionary() const { return dictionary_; }

@@ -12,7 +12,7 @@ inline constexpr std::size_t kLongestLine = 4000;
 /// Any text, fit to be printed as one line: nothing in it ends the line, steers a terminal or turns the order of what
 /// follows. Control characters of both ranges, line and paragraph separators and directional marks are escaped
 /// ("\n", "\x1b", "\u009b", "\u202e"), malformed UTF-8 is replaced, what is beyond `longest` bytes is cut off. Isolates
-/// that `inQuotes` made stay. Everything that is printed passes here once, whoever worded it.
+/// that `inQuotes` made stay. Everything that is printed passes here once, no matter who wrote it.
 std::string forLine(std::string_view text, std::size_t longest = kLongestLine);
 
 /// A text from outside inside a line of ours: in quotes, escaped like `forLine`, quotes and backslashes too, shortened

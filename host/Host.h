@@ -25,7 +25,7 @@ namespace ktr::host {
 /// answers stand. One at a time; a QGuiApplication exists as long as it does. Main thread.
 class Host {
   public:
-    /// How time passes: only when told to, or by itself on Qt's event loop. A live conversation's always runs.
+    /// How time passes: only when asked to, or by itself on Qt's event loop. A live conversation's always runs.
     enum class Time { Virtual, Running };
 
     /// Installs the platform, reads the contacts and loads the plugin.

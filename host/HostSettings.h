@@ -48,7 +48,7 @@ struct HostSettings {
     Said said;
     /// The configuration's.
     std::optional<platform::ContentSizeCategory> configuredTextSize;
-    /// The desktop's: 1 is its usual size. None where nobody was asked or said anything.
+    /// The desktop's: 1 is its usual size. Null where no desktop was asked, or none answered.
     std::optional<double> desktopTextScale;
     bool desktopHighContrast = false;  ///< the desktop's wish
 

@@ -13,7 +13,7 @@ namespace ktr::host {
 class Plugin {
   public:
     /// Loads the library at `path` and makes its principal object for the installed platform; else one line that says
-    /// why not. A library whose ABI number differs is told so before anything else of it is used.
+    /// why not. A library whose ABI number differs is refused before anything else of it is used.
     static std::variant<std::unique_ptr<Plugin>, std::string> load(const std::string& path);
     ~Plugin();
     Plugin(const Plugin&) = delete;

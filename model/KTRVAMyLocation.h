@@ -29,7 +29,7 @@ class KTRVAMyLocation : public KTRVALocation {
 
     /// "Hidden" as long as the user is, whatever place is known; else a friend's line.
     std::string friendLocation(bool refreshFinished) const override;
-    /// Always none: of oneself no age is told in words.
+    /// Always none: one's own place has no age in words.
     std::optional<std::string> prettyTimestamp() const { return std::nullopt; }
     /// The plugin's bundle.
     static std::shared_ptr<platform::Bundle> bundle();

@@ -6,7 +6,7 @@
 namespace ktr::app {
 
 /// A finger's drag and what it leaves behind: the distance follows the finger, and a fling runs on, slowing down.
-/// Points and seconds; time is told from outside.
+/// Points and seconds; the caller passes the time.
 class KineticScroll {
   public:
     /// A fling slower than this, in points a second, stands.

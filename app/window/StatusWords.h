@@ -9,7 +9,7 @@
 namespace ktr::app {
 
 /// The words of the status line, set as the conversation's texts are. They change every few seconds: assistive
-/// technology reads them when it asks, and is never told of a change. Main thread.
+/// technology reads them when it asks, and never gets a notice of a change. Main thread.
 class StatusWords : public QLabel {
   public:
     explicit StatusWords(QWidget* parent);

@@ -4,7 +4,7 @@
 
 namespace ktr::host {
 
-/// Shows its subviews as faintly as it is told. Main thread.
+/// Shows its subviews with a given opacity. Main thread.
 class FadeView : public platform::View {
   public:
     /// From 0 to 1.

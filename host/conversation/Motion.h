@@ -5,7 +5,7 @@ namespace ktr::host {
 /// What may move: nothing in a picture, fades alone where the user wants little motion, else everything.
 enum class MotionStyle { None, Reduced, Full };
 
-/// A number on its way from one value to another. Seconds; time is told from outside. A value.
+/// A number on its way from one value to another. Seconds; the caller passes the time. A value.
 class Motion {
   public:
     /// At rest.

@@ -31,7 +31,7 @@ class LiveServices {
     LiveServices(const LiveServices&) = delete;
     LiveServices& operator=(const LiveServices&) = delete;
 
-    /// As the platform was told last.
+    /// As last reported to the platform.
     const linux_::Configuration& configuration() const { return configuration_; }
     /// What was wrong with the configuration or the token at the last reading, in one line; empty when nothing was.
     std::string problem() const { return accounts_->problem(); }
@@ -69,7 +69,7 @@ class LiveServices {
     /// What ages are counted by; the moments of `service` are its.
     const linux_::EvenClock& evenClock() const { return *evenClock_; }
     linux_::AssistantClient& assistant() { return *assistant_; }
-    /// Called after something that the user is told of may have changed.
+    /// Called after something that the user gets to see may have changed.
     void setChanged(std::function<void()> changed);
 
   private:

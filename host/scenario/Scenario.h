@@ -60,7 +60,7 @@ struct Scenario {
     std::optional<documents::IsoTime> clock;  ///< the moment at which the scenario starts
     std::vector<ScenarioPosition> positions;
     std::optional<bool> dark;
-    /// Of the user's own account: an e-mail address or a phone number; none: nobody is signed in.
+    /// Of the user's own account: an e-mail address or a phone number; null: not signed in.
     std::optional<std::string> userName;
 };
 

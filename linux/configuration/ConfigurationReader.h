@@ -18,9 +18,9 @@ class ConfigurationReader {
         std::string text;
     };
 
-    /// A file that does not exist reads as an empty one: nobody is signed in and everything has its default. One that
-    /// others may change is an error: it says where the app token goes.
-    /// Unknown members go to `warnings`, if there are any to go to.
+    /// A file that does not exist reads as an empty one: no account is signed in and everything has its default. One
+    /// that others may change is an error: it says where the app token goes. Unknown members go to `warnings`, if there
+    /// are any to go to.
     static std::variant<Configuration, Error> readFile(const std::filesystem::path& file,
                                                        documents::DocumentWarnings* warnings = nullptr);
     /// `file` names the text in messages; relative paths inside it start from its folder.

@@ -24,7 +24,7 @@ class ConfiguredAccountStore : public platform::AccountStore {
         std::string person;
         std::string host;
         double seconds = 0.0;
-        const std::atomic<bool>& givesUp;  ///< nobody waits for the answer any more
+        const std::atomic<bool>& givesUp;  ///< the answer is not waited for any more
     };
     /// The secret from the Secret Service; none when it holds none, with the reason in the text if there is one. Any
     /// thread.
@@ -35,7 +35,7 @@ class ConfiguredAccountStore : public platform::AccountStore {
     ConfiguredAccountStore(const std::filesystem::path& configurationFile, Secrets secrets);
     ~ConfiguredAccountStore() override;
 
-    /// Who is told of each token that is read, before anybody gets it. Set before the first `read`.
+    /// Receives each token that is read before anything else gets it. Set before the first `read`.
     void setKnownSecrets(std::shared_ptr<KnownSecrets> secrets) { knownSecrets_ = std::move(secrets); }
 
     /// Reads configuration and token, and logs what is wrong. Any thread, but for a keyring's sake not the main thread

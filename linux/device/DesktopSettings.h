@@ -70,7 +70,8 @@ class DesktopSettings : public QObject {
     std::optional<QDBusConnection> bus_;
     QFileSystemWatcher files_;
     bool portalKnowsTextScale_ = false;
-    /// Changes that were told, by group and key of what is asked for: an answer that one of them overtook is older.
+    /// Changes that were announced, by group and key of what is asked for: an answer that one of them overtook is
+    /// older.
     std::map<std::pair<QString, QString>, unsigned> heard_;
     Aside aside_;
 };

@@ -14,10 +14,10 @@ namespace ktr::linux_ {
 enum class UnitSystem { Metric = 0, ImperialUS = 1, ImperialUK = 2 };
 
 /// Words distances as road signs do, by ICU: unit and rounding follow the region's custom for roads (Unicode CLDR unit
-/// preferences, usage "road"), but metres, yards and feet are told in tens throughout; words and digits the language.
-/// The region is the one that the measurement-system locale names, else the one it most likely stands for. A no-break
-/// space stands between number and unit. The host's text "DISTANCE_TEXT", where the localization has one, frames the
-/// result ("%@"). Main thread.
+/// preferences, usage "road"), but metres, yards and feet are rounded to tens throughout; words and digits the
+/// language. The region is the one that the measurement-system locale names, else the one it most likely stands for. A
+/// no-break space stands between number and unit. The host's text "DISTANCE_TEXT", where the localization has one,
+/// frames the result ("%@"). Main thread.
 class IcuDistanceCalculator : public platform::DistanceCalculator {
   public:
     /// `override` is what the person's preferences ask for; none: the units of the settings' locale.
@@ -50,7 +50,7 @@ class IcuDistanceCalculator : public platform::DistanceCalculator {
     UnitSystem system_;
     std::shared_ptr<platform::Geodesy> geodesy_;
     std::unique_ptr<Formatter> formatter_;
-    /// What was worded lately: at each refresh most friends are where they were.
+    /// Cached words of late distances: at each refresh most friends are where they were.
     std::unordered_map<Ends, std::string, EndsHash> known_;
 };
 

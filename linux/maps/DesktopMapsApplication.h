@@ -10,7 +10,7 @@ namespace ktr::linux_ {
 /// Hands a place to whatever application the desktop has for "geo:" addresses. Main thread.
 class DesktopMapsApplication final : public platform::MapsApplication {
   public:
-    /// Opens an address; false when nobody does.
+    /// Opens an address; false when no program does.
     using Opener = std::function<bool(const std::string& url)>;
 
     /// Without an opener the desktop's.

@@ -23,7 +23,7 @@ struct MapDrawing {
     /// What no ground before has drawn, in pixels of the picture. A ground draws inside it only: it sets its own clip,
     /// and a label that does not lie in it altogether is left out.
     QRegion region;
-    /// Stopped when nobody waits for the picture any more; a ground that works for long looks at it now and then and
+    /// Stopped when the picture is not wanted any more; a ground that works for long looks at it now and then and
     /// returns early.
     std::stop_token stop;
 };

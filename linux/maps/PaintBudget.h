@@ -16,7 +16,7 @@ class PaintBudget {
   public:
     explicit PaintBudget(const MapDrawing& drawing);
 
-    /// Whether a surface may be filled; its cost is gone then. Nothing may, once nobody waits for the picture.
+    /// Whether a surface may be filled; its cost is gone then. Nothing may, once the picture is not wanted any more.
     bool takeArea(const QPainterPath& path);
     /// Whether a line may be drawn this wide; points.
     bool takeLine(const QPolygonF& line, double width);

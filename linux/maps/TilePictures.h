@@ -28,7 +28,7 @@ class TilePictures {
     /// The part of the world that it covers; none for all.
     virtual std::optional<tiles::TilesetFacts::Bounds> bounds() const { return std::nullopt; }
     virtual std::string attribution() const = 0;
-    /// `isWanted`: fetch it where that takes a while; else only what is at hand is of use.
+    /// `isWanted`: fetch it where that takes a while; else only what is cached is of use.
     virtual Answer tile(const tiles::TileKey& key, bool isWanted) = 0;
     /// As MapGround's.
     virtual void setChangeHandler(std::function<void()> changed);

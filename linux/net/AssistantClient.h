@@ -18,9 +18,9 @@ namespace ktr::linux_ {
 class AssistantClient {
   public:
     struct Settings {
-        /// A host, with ":port" when the port is not 443; none: nobody is asked.
+        /// A host, with ":port" when the port is not 443; empty: no question is sent.
         std::optional<std::string> host;
-        /// The value of the field "Authorization"; none: nobody is asked.
+        /// The value of the field "Authorization"; empty: no question is sent.
         std::optional<std::string> authorization;
         /// Files of certificates (PEM) that are trusted besides the system's.
         std::vector<std::string> certificateFiles;

@@ -25,7 +25,7 @@ class PersonColors {
     /// Under the figure that stands for nobody.
     static QColor stone();
 
-    /// What a contact is told apart by: the first e-mail address in ASCII lower case, else the first phone number
+    /// What identifies a contact: the first e-mail address in ASCII lower case, else the first phone number
     /// reduced to digits and "+", else the identifier, else the name.
     static std::string handleOf(const platform::Contact& contact);
     static QColor colorOf(const platform::Contact& contact);

@@ -12,7 +12,7 @@ class QPainter;
 
 namespace ktr::linux_ {
 
-/// A picture of a text with its pixels at hand: made ahead, at one scale and in one appearance's colours. What is
+/// A picture of a text with its pixels kept: made ahead, at one scale and in one appearance's colours. What is
 /// painted at another scale or in other colours is drawn from the text, which looks the same, and the pixels for it are
 /// made in the background meanwhile. Made on any thread, drawn on the main thread.
 class QtTextImage final : public platform::TextImage {
@@ -24,12 +24,12 @@ class QtTextImage final : public platform::TextImage {
     QtTextImage(std::shared_ptr<const platform::TextLayout> layout, const platform::Size& size, double scale,
                 std::shared_ptr<LastPalette> lastPalette);
 
-    /// Paints the pixels, when they are at hand for `scale` device pixels a point and for these colours; else says so
+    /// Paints the pixels, when they were made for `scale` device pixels a point and for these colours; else says so
     /// and has them made. `topLeft` stands on a whole pixel.
     bool drawPixels(QPainter& painter, QPointF topLeft, double scale, const Palette& palette) const;
 
   private:
-    /// Null pixels: none at hand.
+    /// Null: no pixels were made.
     struct Pixels {
         QImage image;
         double scale = 0.0;

@@ -4,7 +4,7 @@
 
 namespace ktr::platform {
 
-/// Root of what the assistant's server sends. Kinds are told apart with dynamic_pointer_cast.
+/// Root of what the assistant's server sends. Kinds are distinguished with dynamic_pointer_cast.
 class KTR_API AssistantObject : public Object {
   public:
     ~AssistantObject() override;

@@ -14,7 +14,7 @@ inline constexpr const char* VAKtrGeoFenceTriggerImmediateValue = "Immediate";
 /// The notification comes when the friend leaves the place. Every other trigger means: when the friend arrives.
 inline constexpr const char* VAKtrGeoFenceTriggerOnDepartureValue = "OnDeparture";
 
-/// A place, and the friend whose coming or going there is told.
+/// A place, and the friend whose coming or going there is announced.
 class KTR_API VAKtrGeoFence : public AssistantObject {
   public:
     ~VAKtrGeoFence() override;

@@ -19,7 +19,8 @@ class KTR_API LengthFormatter {
     /// The amount as it is, with at most one decimal digit; a no-break space before an abbreviated unit.
     virtual std::string text(double amount, LengthUnit unit, LengthWidth width) const = 0;
 
-    /// A length on the ground, rounded as it is told: to two digits, in metres or kilometres, feet or yards or miles.
+    /// A length on the ground, rounded as people say it: to two digits, in metres or kilometres, feet or yards or
+    /// miles.
     std::string textForMetres(double metres, LengthWidth width) const;
 };
 

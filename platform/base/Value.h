@@ -17,7 +17,7 @@ namespace ktr::platform {
 
 class Dictionary;
 
-/// A value as JSON knows it. Bool, integer and real are told apart; null is a value, absence is not one.
+/// A value as JSON knows it. Bool, integer and real are distinct; null is a value, absence is not one.
 /// Containers are shared and immutable: copying a Value is cheap. Any thread.
 class KTR_API Value {
   public:

@@ -13,7 +13,7 @@
 
 namespace ktr::platform {
 
-/// A main loop and clock whose time moves only when told to: rendering and tests use it instead of waiting. Background
+/// A main loop and clock whose time moves only when asked to: rendering and tests use it instead of waiting. Background
 /// work runs on the main thread, as a turn of its own. Everything but `post` and `runInBackground` belongs to the
 /// thread that made it.
 class KTR_API VirtualTime : public MainLoop, public Clock {

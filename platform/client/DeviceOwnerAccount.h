@@ -27,7 +27,7 @@ class KTR_API DeviceOwnerAccount {
 class KTR_API AccountStore {
   public:
     virtual ~AccountStore();
-    /// None when nobody is signed in. Main thread; answers from memory.
+    /// Null when not signed in. Main thread; answers from memory.
     virtual std::shared_ptr<DeviceOwnerAccount> deviceOwnerAccount() const = 0;
 };
 

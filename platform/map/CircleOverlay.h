@@ -55,7 +55,7 @@ class KTR_API MapOverlayRenderer : public Object {
     double alpha_ = 1.0;
 };
 
-/// Draws a circle. Neither filled nor stroked until told.
+/// Draws a circle. Neither filled nor stroked until a colour is set.
 class KTR_API CircleOverlayRenderer : public MapOverlayRenderer {
   public:
     explicit CircleOverlayRenderer(std::shared_ptr<CircleOverlay> circle)
