@@ -16,8 +16,8 @@
 #include "tests/support/PlatformTest.h"
 
 // Anything as the service's answer, on its way to the rows: a body of any bytes when the first byte is even, else an
-// object of any shape. The next six bits choose the way: a whole snippet costs twenty times what a command does, so that one
-// answer in 64 goes each of the two ways through one.
+// object of any shape. The next six bits choose the way: a whole snippet costs twenty times what a command does, so
+// that one answer in 64 goes each of the two ways through one.
 
 namespace {
 
