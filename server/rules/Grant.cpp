@@ -29,6 +29,10 @@ std::int64_t Grant::end() const {
     return until.value_or(confirmed.value_or(from) + kQuestion + kPatience);
 }
 
+bool Grant::tells(std::int64_t now) const {
+    return fences && precision == Precision::Exact && now >= from && now < end();
+}
+
 bool Grant::asks(std::int64_t now) const {
     return !until && now >= end() - kPatience && now < end();
 }

@@ -34,9 +34,13 @@ struct Grant {
     bool aloud = false;  ///< what is seen may be said aloud
     std::optional<std::int64_t> confirmed =
         std::nullopt;  ///< when the owner last said that it is meant; none: when it was made
+    /// The viewer may be told when the owner comes and goes; that also takes exact precision.
+    bool fences = false;
 
     /// When it ends if nothing more is done about it.
     std::int64_t end() const;
+    /// Whether the viewer may be told now when the owner comes and goes, unless the owner hides.
+    bool tells(std::int64_t now) const;
     /// Whether the owner is being asked.
     bool asks(std::int64_t now) const;
 

@@ -81,6 +81,34 @@ CREATE TABLE card (
     post {integer} NOT NULL, PRIMARY KEY (device, owner)) {strict by key};
 CREATE INDEX card_owner ON card (owner);
 )",
+    // 6: fences, with whose leave; what is to be told to which device, in the order of its own count. A fence remembers
+    // times of fixes alone: where they were goes with the fixes. `post`: of the phone's post that was told of it last.
+    R"(
+ALTER TABLE share ADD COLUMN fences {integer} NOT NULL DEFAULT 0;
+ALTER TABLE device ADD COLUMN events {integer} NOT NULL DEFAULT 0;
+ALTER TABLE device ADD COLUMN holds_events {integer} NOT NULL DEFAULT 0;
+ALTER TABLE device ADD COLUMN url {text} NOT NULL DEFAULT '';
+CREATE TABLE fence (
+    id {integer} NOT NULL PRIMARY KEY, watcher {integer} NOT NULL REFERENCES person ON DELETE CASCADE,
+    subject {integer} NOT NULL REFERENCES person ON DELETE CASCADE, name {text} NOT NULL, label {text} NOT NULL,
+    latitude {real} NOT NULL, longitude {real} NOT NULL, radius {real} NOT NULL, arrives {integer} NOT NULL,
+    once {integer} NOT NULL, made {integer} NOT NULL, side {integer} NOT NULL DEFAULT 0,
+    candidate {integer} NOT NULL DEFAULT 0, candidate_since {integer} NOT NULL DEFAULT 0, last {integer},
+    doubtful {integer}) {strict};
+CREATE INDEX fence_subject ON fence (subject, watcher);
+CREATE INDEX fence_watcher ON fence (watcher);
+CREATE TABLE outbox (
+    device {integer} NOT NULL REFERENCES device ON DELETE CASCADE, number {integer} NOT NULL,
+    watcher {integer} NOT NULL REFERENCES person ON DELETE CASCADE,
+    subject {integer} NOT NULL REFERENCES person ON DELETE CASCADE, name {text} NOT NULL, label {text} NOT NULL,
+    latitude {real} NOT NULL, longitude {real} NOT NULL, radius {real} NOT NULL, arrives {integer} NOT NULL,
+    time {integer} NOT NULL, made {integer} NOT NULL, until {integer} NOT NULL, post {integer} NOT NULL DEFAULT 0,
+    claimed {integer} NOT NULL DEFAULT 0, tries {integer} NOT NULL DEFAULT 0,
+    PRIMARY KEY (device, number)) {strict by key};
+CREATE INDEX outbox_subject ON outbox (subject, watcher);
+CREATE INDEX outbox_watcher ON outbox (watcher);
+CREATE INDEX outbox_until ON outbox (until);
+)",
 };
 
 }  // namespace

@@ -17,6 +17,7 @@
 #include <vector>
 
 #include "platform/base/Value.h"
+#include "server/fences/Fence.h"
 #include "server/ingest/Fix.h"
 #include "server/store/Changes.h"
 #include "server/store/Database.h"
@@ -167,6 +168,30 @@ class Store {
     SentCard sentCard(std::int64_t device, std::int64_t owner);
     void noteCards(std::int64_t device, std::map<std::int64_t, SentCard> sent, Done done);
 
+    // Fences: somebody is told when somebody comes or goes. They end with the grant that they rest on, and with every
+    // hiding; what has not been told by then goes in the same commit.
+
+    static constexpr int kMostFences = 10;  ///< of one pair
+    /// What became of a wish; the fence when it was set, or there was the same one already. On the writing thread.
+    using FenceDone = std::function<void(FenceOutcome, const Fence&)>;
+    void setFence(const FenceWish& wish, std::int64_t now, FenceDone done);
+    /// Whether there was one with this id, which this person set or which is about this person.
+    void endFence(std::int64_t person, std::int64_t id, std::function<void(FenceOutcome)> done);
+    /// Waits for the disk.
+    FenceOutcome endFence(std::int64_t person, std::int64_t id);
+    /// Those that somebody set; the oldest first. None: the store could not be read.
+    std::optional<std::vector<FenceFacts>> fencesBy(std::int64_t watcher);
+    /// Those that are about somebody.
+    std::optional<std::vector<FenceFacts>> fencesAbout(std::int64_t subject);
+    /// What a device is to be told that has heard of everything up to `after`; at most `most`. None: the store could
+    /// not be read.
+    std::optional<std::vector<FenceEvent>> eventsFor(std::int64_t device, std::int64_t after, std::int64_t now,
+                                                     int most);
+    /// A device has heard of everything up to this number.
+    void acknowledgeEvents(std::int64_t device, std::int64_t number, Done done);
+    /// What nobody heard of in time is deleted and counted here: events that were dropped, in this process.
+    std::uint64_t droppedEvents() const { return droppedEvents_; }
+
     static std::string normalisedHandle(std::string_view handle);
 
   private:
@@ -214,9 +239,9 @@ class Store {
     /// Waits until something is to be written, or it is time to look after others. False: it is over.
     bool waitForWork(std::deque<Work>& batch);
     Outcome commit(std::deque<Work>::const_iterator begin, std::deque<Work>::const_iterator end);
-    /// Of ten columns: hidden, shown_since, retention, the clock's latest, and a grant's six.
+    /// Of eleven columns: hidden, shown_since, retention, the clock's latest, and a grant's seven.
     Sharing sharingOf(Database::Run& row, int firstColumn);
-    /// Of six columns: exactness, since, until, arrival, aloud, confirmed.
+    /// Of seven columns: exactness, since, until, arrival, aloud, confirmed, fences.
     static Grant grantOf(const Database::Run& row, int firstColumn);
     static std::optional<Grant> readGrant(Database& database, std::int64_t owner, std::int64_t viewer);
     static std::vector<NamedPlace> readPlaces(Database& database, std::int64_t owner);
@@ -227,6 +252,15 @@ class Store {
     std::int64_t afterAllHeard(Database& database, std::int64_t person, std::int64_t now);
     /// Ends grants whose owner has arrived.
     void endOnArrival(Database& database, std::int64_t owner, const std::vector<Fix>& fixes, std::int64_t now);
+    /// Sees who crossed a fence with these fixes, which have just been kept.
+    void watchFences(Database& database, std::int64_t subject, const std::vector<Fix>& fixes, std::int64_t now);
+    /// Puts what happened into the outbox of each device of the watcher's that can be told.
+    void tellOf(Database& database, const Fence& fence, const FenceCrossing& crossing);
+    void dropLateEvents(Database& database, std::int64_t now);
+    /// Ends those of one pair; without a watcher, of all who watch. With what they have not told.
+    void endFencesIn(Database& database, std::int64_t subject, std::optional<std::int64_t> watcher);
+    std::optional<std::vector<FenceFacts>> fences(std::int64_t person, const char* sql);
+    FenceOutcome setFenceIn(Database& database, const FenceWish& wish, std::int64_t now, Fence& fence);
     /// What else decides what is seen by a grant: fixes, and places where they may be said.
     static void deleteOldOf(Database& database, std::int64_t person, const Retention& retention, std::int64_t now);
     /// `now`: reads of the fixes what is needed then; none: all.
@@ -235,6 +269,7 @@ class Store {
     static void endBrowsersIn(Database& database, std::int64_t person);
 
     std::atomic<std::uint64_t> readFailures_ = 0;
+    std::atomic<std::uint64_t> droppedEvents_ = 0;
     std::mutex readMutex_;
     std::unique_ptr<Database> reading_;
     std::unique_ptr<Database> writing_;

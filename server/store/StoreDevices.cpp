@@ -71,6 +71,7 @@ void Store::hideIn(Database& database, std::int64_t person) {
     changes(person);
     database.statement("UPDATE person SET hidden = 1 WHERE id = $1").bind(person).run();
     database.statement("UPDATE device SET asked_to_share = 0 WHERE person = $1").bind(person).run();
+    endFencesIn(database, person, std::nullopt);
 }
 
 void Store::showIn(Database& database, std::int64_t person, std::int64_t now) {

@@ -22,12 +22,14 @@ Grant Store::grantOf(const Database::Run& row, int column) {
     grant.arrival = row.integer(column + 3);
     grant.aloud = row.integer(column + 4) != 0;
     grant.confirmed = row.maybeInteger(column + 5);
+    grant.fences = row.integer(column + 6) != 0;
     return grant;
 }
 
 std::optional<Grant> Store::readGrant(Database& database, std::int64_t owner, std::int64_t viewer) {
     auto row = database.statement(
-        "SELECT exactness, since, until, arrival, aloud, confirmed FROM share WHERE owner = $1 AND viewer = $2");
+        "SELECT exactness, since, until, arrival, aloud, confirmed, fences FROM share WHERE owner = $1 AND viewer = "
+        "$2");
     return row.bind(owner).bind(viewer).next() ? std::optional(grantOf(row, 0)) : std::nullopt;
 }
 
@@ -45,10 +47,11 @@ bool Store::grant(std::int64_t owner, std::int64_t viewer, const Grant& grant) {
         const auto confirmed = grant.confirmed || grant.until || latest <= since ? grant.confirmed : latest;
         database
             .statement(
-                "INSERT INTO share (viewer, owner, exactness, since, until, arrival, aloud, confirmed) "
-                "VALUES ($1, $2, $3, $4, $5, $6, $7, $8) ON CONFLICT (viewer, owner) DO UPDATE SET "
+                "INSERT INTO share (viewer, owner, exactness, since, until, arrival, aloud, confirmed, fences) "
+                "VALUES ($1, $2, $3, $4, $5, $6, $7, $8, $9) ON CONFLICT (viewer, owner) DO UPDATE SET "
                 "exactness = excluded.exactness, since = excluded.since, until = excluded.until, "
-                "arrival = excluded.arrival, aloud = excluded.aloud, confirmed = excluded.confirmed")
+                "arrival = excluded.arrival, aloud = excluded.aloud, confirmed = excluded.confirmed, "
+                "fences = excluded.fences")
             .bind(viewer)
             .bind(owner)
             .bind(static_cast<std::int64_t>(grant.precision))
@@ -57,7 +60,13 @@ bool Store::grant(std::int64_t owner, std::int64_t viewer, const Grant& grant) {
             .bind(grant.arrival)
             .bind(std::int64_t{grant.aloud})
             .bind(confirmed)
+            .bind(std::int64_t{grant.fences})
             .run();
+        Grant kept = grant;
+        kept.from = since;
+        if (!goesOn || !kept.tells(latest)) {
+            endFencesIn(database, owner, viewer);
+        }
     });
 }
 
@@ -68,6 +77,7 @@ bool Store::revokeGrant(std::int64_t owner, std::int64_t viewer) {
         changes(viewer);
         database.statement("DELETE FROM share WHERE viewer = $1 AND owner = $2").bind(viewer).bind(owner).run();
         ended = database.changes();
+        endFencesIn(database, owner, viewer);
     });
     return good && ended > 0;
 }
@@ -97,7 +107,8 @@ std::vector<std::pair<std::string, Grant>> Store::grantsOf(std::int64_t owner) {
     const Reading reading(*this);
     std::vector<std::pair<std::string, Grant>> grants;
     auto row = reading->statement(
-        "SELECT name, exactness, since, until, arrival, aloud, confirmed FROM share JOIN person ON person.id = viewer "
+        "SELECT name, exactness, since, until, arrival, aloud, confirmed, fences FROM share JOIN person ON person.id = "
+        "viewer "
         "WHERE owner = $1 ORDER BY name");
     row.bind(owner);
     while (row.next()) {

@@ -21,6 +21,17 @@ NamedPlace placeOf(Database::Run& row, int column) {
     return place;
 }
 
+/// Whose grants end when the owner reaches a place.
+std::vector<std::int64_t> viewersUntil(Database& database, std::int64_t owner, std::int64_t place) {
+    std::vector<std::int64_t> viewers;
+    auto row = database.statement("SELECT viewer FROM share WHERE owner = $1 AND arrival = $2");
+    row.bind(owner).bind(place);
+    while (row.next()) {
+        viewers.push_back(row.integer(0));
+    }
+    return viewers;
+}
+
 }  // namespace
 
 bool Store::setPlace(std::int64_t owner, const NamedPlace& place) {
@@ -49,6 +60,9 @@ bool Store::removePlace(std::int64_t owner, std::int64_t place, std::int64_t now
     int removed = 0;
     const bool good = writeNow([&](Database& database) {
         changes(owner);
+        for (const std::int64_t viewer : viewersUntil(database, owner, place)) {
+            endFencesIn(database, owner, viewer);
+        }
         // Nobody arrives there any more: what was to end there would never end.
         database
             .statement(
@@ -115,6 +129,7 @@ void Store::endOnArrival(Database& database, std::int64_t owner, const std::vect
             .bind(viewer)
             .bind(now)
             .run();
+        endFencesIn(database, owner, viewer);
     }
 }
 

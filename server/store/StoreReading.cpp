@@ -173,7 +173,7 @@ std::optional<std::vector<Asked>> Store::asked(std::int64_t viewer, const std::v
         Asked one;
         auto row = reading->statement(
             "SELECT person.id, hidden, shown_since, retention, (SELECT latest FROM clock), exactness, since, until, "
-            "arrival, aloud, confirmed FROM handle JOIN person ON person.id = handle.person "
+            "arrival, aloud, confirmed, fences FROM handle JOIN person ON person.id = handle.person "
             "LEFT JOIN share ON share.owner = person.id AND share.viewer = $1 WHERE handle.text = $2");
         if (isText(handle) && row.bind(viewer).bind(normalisedHandle(handle)).next()) {
             one.person = row.integer(0);
@@ -190,7 +190,8 @@ std::vector<Friend> Store::friendsOf(std::int64_t viewer, std::int64_t now) {
     std::vector<Friend> friends;
     auto row = reading->statement(
         "SELECT person.id, name, hidden, shown_since, retention, (SELECT latest FROM clock), exactness, since, until, "
-        "arrival, aloud, confirmed FROM share JOIN person ON person.id = share.owner WHERE share.viewer = $1 ORDER BY "
+        "arrival, aloud, confirmed, fences FROM share JOIN person ON person.id = share.owner WHERE share.viewer = $1 "
+        "ORDER BY "
         "name");
     row.bind(viewer);
     while (row.next()) {

@@ -16,6 +16,8 @@ constexpr std::array kTables = {
     StoreTable{"place", true, {"owner"}, {}},
     StoreTable{"face", true, {"person"}, {"hash"}},
     StoreTable{"card", false, {"owner"}, {"hash"}},
+    StoreTable{"fence", false, {"subject", "watcher"}, {}},
+    StoreTable{"outbox", false, {"subject", "watcher"}, {"claimed"}},
     StoreTable{"clock", true, {}, {}},
     StoreTable{"forgotten", true, {}, {}},
 };

@@ -33,6 +33,7 @@ void Store::keep(std::int64_t device, std::int64_t person, std::vector<Fix> fixe
             }
             if (!all.empty()) {
                 moves(person);
+                watchFences(database, person, all, now);
                 endOnArrival(database, person, all, now);
             }
             database
@@ -94,6 +95,7 @@ void Store::deleteOld(std::int64_t now, Done done) {
             for (const auto& [person, retention] : people) {
                 deleteOldOf(database, person, retention, now);
             }
+            dropLateEvents(database, now);
             lastSwept_ = people.size() < static_cast<std::size_t>(kPeopleAStep) ? 0 : people.back().first;
         },
         std::move(done));
