@@ -212,12 +212,27 @@ void Host::endSharing() {
         live()->closeSharing();
     }
     const auto earlier = std::exchange(sharing_, {}).lock();
-    const auto controller = earlier ? earlier->card()->controller() : nullptr;
-    if (controller && live()) {
+    if (!earlier || !earlier->card()->controller()) {
+        return;
+    }
+    if (live()) {
         makeStill(*earlier);
-    } else if (controller) {
+    } else {
         // Without a service nothing of it can leave: it just goes on no more.
-        controller->viewWillDisappear(false);
+        earlier->card()->setOnScreen(false);
+    }
+}
+
+void Host::tellWhatIsSeen(const std::function<bool(const TurnView&)>& isSeen) {
+    const auto newest = std::find_if(turns_.rbegin(), turns_.rend(),
+                                     [](const Turn& turn) { return turn.view->card()->controller() != nullptr; });
+    for (auto turn = newest; turn != turns_.rend(); ++turn) {
+        const auto& card = turn->view->card();
+        const bool isShown = turn == newest || isSeen(*turn->view);
+        const bool shares = std::dynamic_pointer_cast<platform::VAKtrVisibilityView>(turn->scenario.snippet) != nullptr;
+        if (!isShown || !shares) {
+            card->setOnScreen(isShown);
+        }
     }
 }
 

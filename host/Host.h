@@ -74,6 +74,11 @@ class Host {
     /// The device allows no friends' locations: no card is made and nothing is asked; a turn says so instead.
     bool isRestricted() const;
 
+    /// Tells each card that is scrolled away that it disappears, and when it is back that it appears: it then asks once
+    /// more and rests. The newest card lives on wherever it stands, and one about the user's own sharing never appears
+    /// twice: it would share again.
+    void tellWhatIsSeen(const std::function<bool(const TurnView&)>& isSeen);
+
     /// The same for as long as the host stands.
     const std::shared_ptr<platform::Window>& window() const { return window_; }
     const std::shared_ptr<ConversationView>& conversation() const { return conversation_; }

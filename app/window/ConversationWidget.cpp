@@ -20,6 +20,8 @@ namespace {
 
 constexpr int kBarWidth = 8;
 constexpr int kFrame = 16;  // milliseconds
+/// Scrolling rests after so long: what only passes by is told nothing. Milliseconds.
+constexpr int kRest = 250;
 
 }  // namespace
 
@@ -46,7 +48,9 @@ ConversationWidget::ConversationWidget(host::Host& host, QWidget* parent)
       palette_(&Palette::of(ColorScheme::Light)),
       voice_(std::make_unique<Voice>(host, *this)),
       bar_(new QScrollBar(Qt::Vertical, this)),
-      rings_(host.conversation(), [this] { return standsStill(); }) {
+      rings_(
+          host.conversation(), [this] { return standsStill(); },
+          [this](const host::TurnView& turn) { return isSeen_ && isOnScreen(turn); }) {
     setAttribute(Qt::WA_OpaquePaintEvent);
     setAttribute(Qt::WA_AcceptTouchEvents);
     setMouseTracking(true);
@@ -59,7 +63,11 @@ ConversationWidget::ConversationWidget(host::Host& host, QWidget* parent)
     connect(bar_, &QScrollBar::valueChanged, this, [this] {
         update();
         AccessibleConversation::moved(*this);
+        lookLater();
     });
+    restTimer_.setSingleShot(true);
+    restTimer_.setInterval(kRest);
+    connect(&restTimer_, &QTimer::timeout, this, [this] { look(); });
     flingTimer_.setInterval(kFrame);
     connect(&flingTimer_, &QTimer::timeout, this, [this] { fling(); });
     motionTimer_.setInterval(kFrame);
@@ -135,6 +143,7 @@ void ConversationWidget::layOut() {
     rings_.update();
     update();
     rowsChanged();
+    lookLater();
     if (heightsChanged_) {
         requestLayout();
     }
@@ -314,6 +323,25 @@ void ConversationWidget::setHighContrast(bool high) {
         host_.setDesktopHighContrast(high);
         choosePalette();
     }
+}
+
+bool ConversationWidget::isOnScreen(const host::TurnView& turn) const {
+    const auto card = turn.card()->frameInRoot();
+    return card.maxY() > scrolled() && card.y < scrolled() + height();
+}
+
+void ConversationWidget::lookLater() {
+    restTimer_.start();
+}
+
+void ConversationWidget::look() {
+    host_.tellWhatIsSeen([this](const host::TurnView& turn) { return isOnScreen(turn); });
+    rings_.update();
+}
+
+void ConversationWidget::setSeen(bool seen) {
+    isSeen_ = seen;
+    rings_.update();
 }
 
 void ConversationWidget::setReducedMotion(bool reduced) {

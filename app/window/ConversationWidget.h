@@ -42,6 +42,8 @@ class ConversationWidget : public QWidget {
     void turnCame(host::TurnView& turn);
     void answerCame(host::TurnView& turn);
     void setReducedMotion(bool reduced);
+    /// Whether anybody sees the window; so it is at first. Nothing turns while nobody does.
+    void setSeen(bool seen);
     /// The desktop's wish, besides that of the options; the host has it too, for its stills.
     void setHighContrast(bool high);
     const linux_::Palette& colors() const { return *palette_; }
@@ -91,6 +93,10 @@ class ConversationWidget : public QWidget {
     bool standsStill() const;
     void chooseMotion();
     void stopScrolling() { scrollFrom_.reset(); }
+    /// Tells the cards which of them are scrolled away, once scrolling rests.
+    void lookLater();
+    void look();
+    bool isOnScreen(const host::TurnView& turn) const;
     /// Where the turn stands on screen that the reader's eye is on: the first that is seen.
     std::shared_ptr<host::TurnView> anchor() const;
     void keepInPlace(const std::shared_ptr<host::TurnView>& turn, double before);
@@ -121,6 +127,7 @@ class ConversationWidget : public QWidget {
     RingTurner rings_;
     QTimer flingTimer_;
     QTimer motionTimer_;
+    QTimer restTimer_;
     /// Where the way to the newest turn began; none: nothing scrolls by itself.
     std::optional<double> scrollFrom_;
     host::Motion scroll_;
@@ -133,6 +140,7 @@ class ConversationWidget : public QWidget {
     bool layingOut_ = false;
     bool layoutRequested_ = false;
     bool heightsChanged_ = false;
+    bool isSeen_ = true;
     QRegion lastPainted_;
 };
 

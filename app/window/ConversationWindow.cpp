@@ -4,6 +4,7 @@
 #include <QKeyEvent>
 #include <QPainter>
 #include <algorithm>
+#include <cmath>
 
 #include "host/conversation/WideColumns.h"
 #include "platform/base/LogArea.h"
@@ -15,12 +16,15 @@ namespace {
 constexpr int kAboveField = 10;
 constexpr int kFieldToStatus = 8;
 constexpr int kBelowStatus = 11;
-constexpr int kStatusEvery = 1000;  // milliseconds
+constexpr double kMillisecondsASecond = 1000.0;
 
 }  // namespace
 
 ConversationWindow::ConversationWindow(host::Host& host)
-    : host_(host), conversation_(new ConversationWidget(host, this)), saidTextSize_(host.settings().said.textSize) {
+    : host_(host),
+      conversation_(new ConversationWidget(host, this)),
+      sight_(*this, [&host] { return host.live() != nullptr && host.live()->isLocked(); }),
+      saidTextSize_(host.settings().said.textSize) {
     setAttribute(Qt::WA_OpaquePaintEvent);
     setLayoutDirection(host.rightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
     setMinimumSize(conversation_->minimumSize());
@@ -32,6 +36,7 @@ ConversationWindow::ConversationWindow(host::Host& host)
     }
     conversation_->setPaletteChanged([this] { choosePalette(); });
     host_.setRemade([this] { remade(); });
+    sight_.setChanged([this] { sightChanged(); });
     choosePalette();
 }
 
@@ -43,6 +48,7 @@ ConversationWindow::~ConversationWindow() {
     }
     if (live_) {
         live_->setHandlers({});
+        host_.live()->setLockChanged(nullptr);
     }
 }
 
@@ -63,7 +69,8 @@ void ConversationWindow::addField() {
                             showStatus();
                             conversation_->tellListeners();
                         }});
-    statusTimer_.setInterval(kStatusEvery);
+    statusTimer_.setSingleShot(true);
+    host_.live()->setLockChanged([this] { sight_.look(); });
     connect(&statusTimer_, &QTimer::timeout, this, [this] { showStatus(); });
 }
 
@@ -91,7 +98,6 @@ void ConversationWindow::start(const std::vector<host::Scenario>& scenarios,
             live_->ask(question);
         }
         live_->start(scenarios);
-        statusTimer_.start();
     }
 }
 
@@ -99,6 +105,21 @@ void ConversationWindow::showStatus() {
     status_->setStatus(live_->status());
     if (!status_->isPlaced()) {
         place();
+    }
+    // A line that nobody sees is written when somebody does.
+    const auto seconds = sight_.isSeen() ? live_->statusChangesIn() : std::nullopt;
+    if (seconds) {
+        statusTimer_.start(static_cast<int>(std::ceil(*seconds * kMillisecondsASecond)));
+    } else {
+        statusTimer_.stop();
+    }
+}
+
+void ConversationWindow::sightChanged() {
+    conversation_->setSeen(sight_.isSeen());
+    if (live_) {
+        host_.live()->setSeen(sight_.isSeen());
+        showStatus();
     }
 }
 

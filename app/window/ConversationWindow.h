@@ -6,9 +6,11 @@
 #include <vector>
 
 #include "app/window/AskField.h"
+#include "app/window/CaretRest.h"
 #include "app/window/ConversationWidget.h"
 #include "app/window/PlainWidget.h"
 #include "app/window/StatusLine.h"
+#include "app/window/WindowSight.h"
 #include "host/live/LiveConversation.h"
 #include "linux/device/DesktopSettings.h"
 
@@ -42,6 +44,8 @@ class ConversationWindow : public PlainWidget {
     void addField();
     void choosePalette();
     void showStatus();
+    /// Whether anybody sees the window has become another.
+    void sightChanged();
     void remade();
     /// Puts conversation, field and status line where they belong.
     void place();
@@ -59,6 +63,8 @@ class ConversationWindow : public PlainWidget {
     AskField* field_ = nullptr;
     StatusLine* status_ = nullptr;
     QTimer statusTimer_;
+    WindowSight sight_;
+    CaretRest caretRest_;
     linux_::DesktopSettings* desktop_ = nullptr;
     bool reducedMotion_ = false;
     /// What options and scenarios said of the text size, and what the window's user has chosen since.

@@ -38,6 +38,7 @@ QuestionEdit::QuestionEdit(QWidget* parent) : QLineEdit(parent), style_(std::mak
     });
     connect(this, &QLineEdit::cursorPositionChanged, this, [this] { showCaret(); });
     connect(this, &QLineEdit::textChanged, this, [this] { showCaret(); });
+    connect(QGuiApplication::styleHints(), &QStyleHints::cursorFlashTimeChanged, this, [this] { showCaret(); });
 }
 
 QuestionEdit::~QuestionEdit() = default;
@@ -83,6 +84,8 @@ void QuestionEdit::showCaret() {
     const int time = QGuiApplication::styleHints()->cursorFlashTime();
     if (time > 0) {
         blink_.start(time / 2);
+    } else {
+        blink_.stop();
     }
     update();
 }

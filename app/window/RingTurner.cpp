@@ -8,16 +8,17 @@ namespace ktr::app {
 namespace {
 
 constexpr int kStep = 32;        // milliseconds
+constexpr int kStillStep = 500;  // milliseconds
 constexpr double kTurn = 1.2;    // seconds
 constexpr double kShare = 0.25;  // of the circle, while it turns
 constexpr double kStillShare = 0.75;
 
 }  // namespace
 
-RingTurner::RingTurner(std::shared_ptr<host::ConversationView> conversation, std::function<bool()> isStill)
-    : conversation_(std::move(conversation)), isStill_(std::move(isStill)) {
+RingTurner::RingTurner(std::shared_ptr<host::ConversationView> conversation, std::function<bool()> isStill,
+                       std::function<bool(const host::TurnView&)> isSeen)
+    : conversation_(std::move(conversation)), isStill_(std::move(isStill)), isSeen_(std::move(isSeen)) {
     clock_.start();
-    timer_.setInterval(kStep);
     QObject::connect(&timer_, &QTimer::timeout, &timer_, [this] { update(); });
 }
 
@@ -28,7 +29,7 @@ void RingTurner::update() {
     for (const auto& turn : conversation_->turns()) {
         turn->card()->updateRing();
         const auto& ring = turn->card()->ring();
-        if (ring->hidden()) {
+        if (ring->hidden() || !isSeen_(*turn)) {
             continue;
         }
         any = true;
@@ -36,10 +37,11 @@ void RingTurner::update() {
         ring->setTurn(still ? 0.0 : std::fmod(turns, 1.0));
     }
     // Also for rings that stand still: they go when the search is over.
-    if (any && !timer_.isActive()) {
-        timer_.start();
-    } else if (!any) {
+    const int step = still ? kStillStep : kStep;
+    if (!any) {
         timer_.stop();
+    } else if (!timer_.isActive() || timer_.interval() != step) {
+        timer_.start(step);
     }
 }
 

@@ -9,18 +9,22 @@
 
 namespace ktr::app {
 
-/// Turns the rings of the cards that search, and takes them away when their search is over. Main thread.
+/// Turns the rings of the cards that search, and takes them away when their search is over; of those that are seen.
+/// Main thread.
 class RingTurner {
   public:
-    /// `isStill`: whether rings stand, asked at each step.
-    RingTurner(std::shared_ptr<host::ConversationView> conversation, std::function<bool()> isStill);
+    /// Both are asked at each step. `isStill`: whether rings stand; `isSeen`: whether anybody sees this turn.
+    RingTurner(std::shared_ptr<host::ConversationView> conversation, std::function<bool()> isStill,
+               std::function<bool(const host::TurnView&)> isSeen);
 
-    /// Brings every ring up to date, and goes on by itself while one is shown.
+    /// Brings every ring up to date, and goes on by itself while one is seen: whoever brings another turn on screen
+    /// calls again.
     void update();
 
   private:
     std::shared_ptr<host::ConversationView> conversation_;
     std::function<bool()> isStill_;
+    std::function<bool(const host::TurnView&)> isSeen_;
     QTimer timer_;
     QElapsedTimer clock_;
 };

@@ -3,6 +3,7 @@
 #include <QPainter>
 #include <algorithm>
 #include <cmath>
+#include <utility>
 
 #include "host/conversation/Measures.h"
 #include "host/conversation/Shapes.h"
@@ -86,7 +87,7 @@ void CardView::setController(const std::shared_ptr<HostSnippetViewController>& c
     }
     content_->addSubview(controller->view());
     controller->updateViewConstraints();
-    controller->viewWillAppear(false);
+    setOnScreen(true);
     isFolded_ = awaitsImages(*content_);
     if (isFolded_) {
         unfolding_ = Platform::installed()->mainLoop->schedule(kFolded, false, [weakSelf = weak(this)] {
@@ -94,6 +95,17 @@ void CardView::setController(const std::shared_ptr<HostSnippetViewController>& c
                 self->unfold();
             }
         });
+    }
+}
+
+void CardView::setOnScreen(bool onScreen) {
+    if (!controller_ || std::exchange(isOnScreen_, onScreen) == onScreen) {
+        return;
+    }
+    if (onScreen) {
+        controller_->viewWillAppear(false);
+    } else {
+        controller_->viewWillDisappear(false);
     }
 }
 
@@ -116,7 +128,7 @@ void CardView::letGo() {
         unfolding_->invalidate();
     }
     unfold();
-    controller_->viewWillDisappear(false);
+    setOnScreen(false);
     if (const auto view = controller_->viewIfLoaded()) {
         view->removeFromSuperview();
     }

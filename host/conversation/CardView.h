@@ -25,6 +25,9 @@ class CardView : public platform::View {
     const std::shared_ptr<platform::HostSnippetViewController>& controller() const { return controller_; }
     /// Lets go of the controller and its view, which hears that it disappears. The header stays, over nothing.
     void letGo();
+    /// Tells the controller that it disappears, or appears again, unless it was told so last. Its view stays.
+    void setOnScreen(bool onScreen);
+    bool isOnScreen() const { return isOnScreen_; }
     /// Puts a still in the place of the controller's view, which has been let go of.
     void setStill(const std::shared_ptr<StillView>& still);
     const std::shared_ptr<StillView>& still() const { return still_; }
@@ -82,6 +85,7 @@ class CardView : public platform::View {
     /// Of `lowerEdge` when the height was asked for.
     double knownEdge_ = 0.0;
     bool isFolded_ = false;
+    bool isOnScreen_ = false;
     /// The text size of now is an accessibility size.
     bool isLarge_ = false;
     std::shared_ptr<platform::Timer> unfolding_;

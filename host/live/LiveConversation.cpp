@@ -1,5 +1,6 @@
 #include "host/live/LiveConversation.h"
 
+#include <algorithm>
 #include <utility>
 
 #include "host/conversation/CutText.h"
@@ -180,7 +181,7 @@ void LiveConversation::didUpdateLocations(platform::PlatformLocationManager& man
     tellChanged();
 }
 
-LiveStatus LiveConversation::status() const {
+LiveStatus::Facts LiveConversation::facts() const {
     LiveStatus::Facts facts;
     facts.ready = ready_;
     facts.signedIn = host_.live()->isSignedIn();
@@ -196,10 +197,26 @@ LiveStatus LiveConversation::status() const {
         facts.now.secondsSinceReferenceDate - shownAt_->secondsSinceReferenceDate < kFindingPosition;
     facts.hidden = host_.saysHidden();
     facts.service = host_.live()->service().notes();
-    return LiveStatus::of(
-        facts, {[this](const std::string& key) { return host_.text(key); },
-                [this](platform::Date moment) { return host_.clockFace(host_.live()->evenClock().onTheOther(moment)); },
-                [this](std::int64_t number) { return host_.number(number); }});
+    return facts;
+}
+
+std::optional<double> LiveConversation::statusChangesIn() const {
+    const auto known = facts();
+    auto first = LiveStatus::changesIn(known);
+    if (known.findingPosition) {
+        const double end = shownAt_->secondsSinceReferenceDate + kFindingPosition;
+        const double left = end - known.now.secondsSinceReferenceDate;
+        first = std::min(first.value_or(left), left);
+    }
+    return first;
+}
+
+LiveStatus LiveConversation::status() const {
+    return LiveStatus::of(facts(), {[this](const std::string& key) { return host_.text(key); },
+                                    [this](platform::Date moment) {
+                                        return host_.clockFace(host_.live()->evenClock().onTheOther(moment));
+                                    },
+                                    [this](std::int64_t number) { return host_.number(number); }});
 }
 
 }  // namespace ktr::host

@@ -37,6 +37,8 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
     void ask(const std::string& question);
 
     LiveStatus status() const;
+    /// After how many seconds that may be another although nothing happens. None: never.
+    std::optional<double> statusChangesIn() const;
     /// Whether questions, or the account, are still waited for.
     bool isWaiting() const { return !ready_ || asking_ > 0; }
     /// Why the last question, or the last scenario, has no answer; none when it has one.
@@ -45,6 +47,7 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
     void didUpdateLocations(platform::PlatformLocationManager&, const platform::PlatformLocations&) override;
 
   private:
+    LiveStatus::Facts facts() const;
     explicit LiveConversation(Host& host) : host_(host) {}
     void accountRead();
     /// Sends the question that waits longest, unless one is under way.

@@ -9,7 +9,6 @@
 #include "linux/configuration/ConfiguredRestrictions.h"
 #include "linux/configuration/FilePreferences.h"
 #include "linux/configuration/XdgFolders.h"
-#include "linux/device/LogindLock.h"
 #include "linux/device/SystemDeviceInformation.h"
 #include "linux/maps/ConfiguredMaps.h"
 #include "linux/net/QtHttpTransport.h"
@@ -74,6 +73,7 @@ void LiveServices::makeOnce(const platform::Platform& platform) {
         lanes_, preferences_, [accounts = accounts_] { return transportSettings(*accounts).serviceHost; },
         kPreferences);
     service_ = std::make_shared<ServiceWatch>(remembering, mainLoop_, evenClock_);
+    requests_ = std::make_shared<SeenRequests>(service_, mainLoop_);
     service_->setChanged([this] {
         if (changed_) {
             changed_();
@@ -106,7 +106,7 @@ void LiveServices::addTo(platform::Platform& platform, const std::string& langua
     platform.restrictions = std::make_shared<linux_::ConfiguredRestrictions>(accounts_);
     platform.geographicSettings = std::make_shared<linux_::ConfiguredGeography>(accounts_);
     platform.preferences = preferences_;
-    platform.httpTransport = service_;
+    platform.httpTransport = requests_;
     if (!ownPositions) {
         if (!positions_ || positionsMade_ != configuration_.positions) {
             positionsMade_ = configuration_.positions;

@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include "host/live/SeenRequests.h"
 #include "host/live/ServiceLanes.h"
 #include "host/live/ServiceWatch.h"
 #include "linux/configuration/Configuration.h"
@@ -13,6 +14,7 @@
 #include "linux/configuration/ConfiguredAccountStore.h"
 #include "linux/configuration/FilePreferences.h"
 #include "linux/device/EvenClock.h"
+#include "linux/device/LogindLock.h"
 #include "linux/maps/ThreadedMapSource.h"
 #include "linux/net/AssistantClient.h"
 #include "linux/net/NetworkThread.h"
@@ -51,8 +53,16 @@ class LiveServices {
     /// Takes over the configuration as it was read last; whether anything but the list of contacts has changed.
     bool takeConfiguration();
 
-    /// Ends all commands under way.
-    void cancelCommands() { lanes_->cancelAll(); }
+    /// Ends all commands under way, and what waits to be seen.
+    void cancelCommands() {
+        requests_->cancelHeld();
+        lanes_->cancelAll();
+    }
+    /// Whether somebody sees the cards (`SeenRequests`); so it is at first.
+    void setSeen(bool seen) { requests_->setSeen(seen); }
+    /// Whether the session is locked; `changed` is called after that may have become another.
+    bool isLocked() const { return deviceLock_->lockState() == platform::DeviceLock::kLocked; }
+    void setLockChanged(std::function<void()> changed) { deviceLock_->setChanged(std::move(changed)); }
     /// Lets commands show the user, or ends those that do (`ServiceLanes`).
     void openSharing() { lanes_->openSharing(); }
     void closeSharing() { lanes_->closeSharing(); }
@@ -85,7 +95,7 @@ class LiveServices {
     std::shared_ptr<platform::MainLoop> mainLoop_;
     std::shared_ptr<linux_::FilePreferences> preferences_;
     std::shared_ptr<platform::DeviceInformation> deviceInformation_;
-    std::shared_ptr<platform::DeviceLock> deviceLock_;
+    std::shared_ptr<linux_::LogindLock> deviceLock_;
     std::shared_ptr<platform::LocationManagerFactory> positions_;
     linux_::Configuration::Positions positionsMade_;
     std::shared_ptr<linux_::EvenClock> evenClock_;
@@ -93,6 +103,7 @@ class LiveServices {
     std::shared_ptr<linux_::NetworkThread> network_ = std::make_shared<linux_::NetworkThread>();
     std::shared_ptr<ServiceLanes> lanes_;
     std::shared_ptr<ServiceWatch> service_;
+    std::shared_ptr<SeenRequests> requests_;
     std::string language_;
     std::unique_ptr<linux_::AssistantClient> assistant_;
     std::unique_ptr<linux_::ConfigurationWatcher> watcher_;

@@ -11,6 +11,8 @@ namespace {
 
 constexpr double kMinute = 60.0;
 constexpr double kHour = 3600.0;
+/// Of an age below a minute.
+constexpr double kSecondsStep = 10.0;
 /// How late a command may be before it no longer counts as coming, seconds.
 constexpr double kGrace = 3.0;
 /// What is counted on before the service has named an interval, seconds.
@@ -32,7 +34,7 @@ std::string updated(const LiveStatus::Words& words, const std::string& key, doub
     }
     if (age < kMinute) {
         // In steps: a line that counts draws the eye.
-        return sentence(words, key + "_SECONDS", whole(std::floor(age / 10.0) * 10.0));
+        return sentence(words, key + "_SECONDS", whole(std::floor(age / kSecondsStep) * kSecondsStep));
     }
     return age < kHour ? sentence(words, key + "_MINUTES", whole(age / kMinute))
                        : sentence(words, key + "_HOURS", whole(age / kHour));
@@ -44,6 +46,12 @@ ServiceWatch::Trouble troubleOf(const LiveStatus::Facts& facts) {
     const auto& service = facts.service;
     const bool isOver = service.answered && since(facts.assistantEnded, *service.answered) > 0.0;
     return facts.assistant == ServiceWatch::Trouble::None || isOver ? service.trouble : facts.assistant;
+}
+
+/// Since when what is on screen is as it is.
+std::optional<platform::Date> knownIn(const LiveStatus::Facts& facts) {
+    const auto& answered = facts.service.answered;
+    return answered && facts.shown && since(*facts.shown, *answered) > 0.0 ? answered : facts.shown;
 }
 
 /// The key of what is said while the service cannot help; null when that is not so.
@@ -64,6 +72,28 @@ const char* keyOf(ServiceWatch::Trouble trouble) {
 
 }  // namespace
 
+std::optional<double> LiveStatus::changesIn(const Facts& facts) {
+    std::optional<double> first;
+    const auto at = [&first](double moment, double age) {
+        if (moment > age) {
+            first = std::min(first.value_or(moment - age), moment - age);
+        }
+    };
+    if (facts.asking) {
+        at(kPatience, since(*facts.asking, facts.now));
+    }
+    if (facts.shown) {
+        // As `updated` counts.
+        const double age = since(knownIn(facts).value_or(*facts.shown), facts.now);
+        const double step = age < kMinute ? kSecondsStep : age < kHour ? kMinute : kHour;
+        at(kJustNow, age);
+        at((std::floor(age / step) + 1.0) * step, age);
+        at(facts.service.interval + kGrace, age);
+        at(kFirstInterval + kGrace, age);
+    }
+    return first;
+}
+
 LiveStatus LiveStatus::of(const Facts& facts, const Words& words) {
     using Trouble = ServiceWatch::Trouble;
     const auto& service = facts.service;
@@ -80,9 +110,7 @@ LiveStatus LiveStatus::of(const Facts& facts, const Words& words) {
     if (facts.asking && since(*facts.asking, facts.now) >= kPatience) {
         return {Mark::Waiting, words.text("STATUS_ASKING")};
     }
-    const auto known = service.answered && facts.shown && since(*facts.shown, *service.answered) > 0.0
-                           ? service.answered
-                           : facts.shown;
+    const auto known = knownIn(facts);
     if (const char* key = keyOf(trouble); key != nullptr) {
         return {Mark::Warning,
                 known ? sentence(words, std::string(key) + "_SINCE", words.clock(*known)) : words.text(key)};

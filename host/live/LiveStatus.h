@@ -51,6 +51,8 @@ struct LiveStatus {
     static constexpr double kJustNow = 15.0;
 
     static LiveStatus of(const Facts& facts, const Words& words);
+    /// After how many seconds it may say something else although nothing happens. None: never.
+    static std::optional<double> changesIn(const Facts& facts);
 
     Mark mark = Mark::None;
     std::string words;  ///< empty: the line is empty

@@ -67,7 +67,7 @@ LogindLock::LogindLock(QDBusConnection bus) : bus_(std::move(bus)) {
     connect(watcher, &QDBusServiceWatcher::serviceOwnerChanged, this,
             [this](const QString&, const QString&, const QString& now) {
                 if (now.isEmpty()) {
-                    state_ = kWithoutLock;
+                    setState(kWithoutLock);
                 } else {
                     findSession();
                 }
@@ -122,6 +122,12 @@ void LogindLock::useSession(const QString& path) {
         bus_.connect(kService, session_, kProperties, name, this, slot);
     }
     readHint();
+}
+
+void LogindLock::setState(int state) {
+    if (std::exchange(state_, state) != state && changed_) {
+        changed_();
+    }
 }
 
 void LogindLock::readHint() {

@@ -5,6 +5,8 @@
 #include <QString>
 #include <QStringList>
 #include <QVariantMap>
+#include <functional>
+#include <utility>
 
 #include "platform/base/DeviceInformation.h"
 
@@ -24,6 +26,8 @@ class LogindLock : public QObject, public platform::DeviceLock {
     ~LogindLock() override;
 
     int lockState() const override { return state_; }
+    /// Called after the state has become another.
+    void setChanged(std::function<void()> changed) { changed_ = std::move(changed); }
 
   private Q_SLOTS:
     void propertiesChanged(const QString& interface, const QVariantMap& changed, const QStringList& invalidated);
@@ -33,11 +37,13 @@ class LogindLock : public QObject, public platform::DeviceLock {
     void findSessionOfUser();
     void useSession(const QString& path);
     void readHint();
-    void setHint(bool locked) { state_ = locked ? kLocked : kUnlocked; }
+    void setState(int state);
+    void setHint(bool locked) { setState(locked ? kLocked : kUnlocked); }
 
     QDBusConnection bus_;
     QString session_;
     int state_ = kWithoutLock;
+    std::function<void()> changed_;
 };
 
 }  // namespace ktr::linux_

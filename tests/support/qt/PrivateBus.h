@@ -2,29 +2,16 @@
 
 #include <gtest/gtest.h>
 
-#include <QCoreApplication>
 #include <QDBusConnection>
 #include <QDBusMessage>
 #include <QDBusVirtualObject>
-#include <QDeadlineTimer>
-#include <QEventLoop>
 #include <QProcess>
 #include <QString>
 #include <functional>
 
-namespace ktr::test {
+#include "tests/support/qt/EventLoops.h"
 
-/// Runs the event loop until the condition holds; false after ten seconds.
-inline bool eventually(const std::function<bool()>& condition) {
-    const QDeadlineTimer deadline(10000);
-    while (!condition()) {
-        if (deadline.hasExpired()) {
-            return false;
-        }
-        QCoreApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents, 20);
-    }
-    return true;
-}
+namespace ktr::test {
 
 /// A message bus of the test's own.
 class PrivateBus {

@@ -7,6 +7,7 @@
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QPointingDevice>
+#include <QProxyStyle>
 #include <QTouchEvent>
 #include <QWheelEvent>
 #include <memory>
@@ -16,6 +17,7 @@
 #include "platform/base/Platform.h"
 #include "platform/ui/Appearance.h"
 #include "platform/ui/Label.h"
+#include "tests/support/qt/EventLoops.h"
 
 #include <gtest/gtest.h>
 
@@ -29,6 +31,16 @@ class GrowingController : public platform::HostSnippetViewController {
     double desiredHeightForWidth(double) override { return height; }
     bool searching = false;
     bool isSearching() const override { return searching; }
+};
+
+/// A desktop that lets things move, which the one without a screen does not.
+class MovingStyle : public QProxyStyle {
+  public:
+    int styleHint(StyleHint hint, const QStyleOption* option, const QWidget* widget,
+                  QStyleHintReturn* data) const override {
+        constexpr int kDuration = 200;
+        return hint == SH_Widget_Animation_Duration ? kDuration : QProxyStyle::styleHint(hint, option, widget, data);
+    }
 };
 
 /// The demo scenario in a window, with the real plugin.
@@ -364,6 +376,37 @@ TEST_F(KTRConversationWidgetTest, Ring_GoesWhenTheSearchEndsThoughNobodyTells) {
         QApplication::processEvents(QEventLoop::WaitForMoreEvents);
     }
     EXPECT_TRUE(turn->card()->ring()->hidden());
+}
+
+TEST_F(KTRConversationWidgetTest, CardsScrolledAway_AreToldOnceScrollingRests) {
+    open({"dinner", "locating", "dinner"}, 400, 300);
+    widget->scrollToNewest();
+    const auto& turns = host->conversation()->turns();
+    EXPECT_TRUE(turns.front()->card()->isOnScreen()) << "not while it scrolls";
+    EXPECT_TRUE(test::eventually([&] { return !turns.front()->card()->isOnScreen(); }));
+    widget->scrollTo(0.0);
+    EXPECT_TRUE(test::eventually([&] { return turns.front()->card()->isOnScreen(); }));
+    EXPECT_TRUE(turns.back()->card()->isOnScreen()) << "the newest lives on";
+}
+
+TEST_F(KTRConversationWidgetTest, Ring_TurnsForNobody) {
+    open({"dinner"});
+    auto turn = platform::create<host::TurnView>(&host::TurnView::initWithFrame, platform::Rect{});
+    const auto controller = platform::create<GrowingController>(&GrowingController::init);
+    controller->searching = true;
+    turn->setController(controller);
+    host->conversation()->addTurn(turn);
+    MovingStyle moving;
+    widget->setStyle(&moving);
+    widget->resize(400, 701);
+    widget->scrollToNewest();
+    test::wakesIn(1000);
+    EXPECT_GT(test::wakesIn(1000), 15) << "it turns on screen";
+    widget->setSeen(false);
+    EXPECT_LE(test::wakesIn(1000), 2);
+    widget->setSeen(true);
+    EXPECT_GT(test::wakesIn(1000), 15) << "and again once it is seen";
+    widget->setStyle(nullptr);
 }
 
 TEST_F(KTRConversationWidgetTest, SeveralTurns_BeginWithTheNewestAtTheTop) {

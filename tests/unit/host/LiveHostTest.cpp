@@ -371,4 +371,62 @@ TEST_F(LiveHostTest, Restricted_MakesNoCardAndSaysSo) {
     EXPECT_TRUE(transport->requests.empty());
 }
 
+TEST_F(LiveHostTest, CardScrolledAway_AsksOnceMoreWhenItIsBackAndRests) {
+    const auto earlier = add(kFriends);
+    const auto newest = add(kFriends);
+    const auto asked = [this] { return transport->requests.size(); };
+    ASSERT_TRUE(runUntil([&] { return asked() == 4; })) << "each card starts twice";
+    host->tellWhatIsSeen([&](const host::TurnView& turn) { return &turn == newest.get(); });
+    EXPECT_FALSE(earlier->card()->isOnScreen());
+    const auto answer = [this] {
+        const platform::Dictionary context{{"minCallbackIntervalInMS", 100}};
+        transport->answer(platform::Dictionary{{"locations", platform::Dictionary{}}, {"serverContext", context}});
+    };
+    answer();
+    answer();
+    run(400);
+    EXPECT_EQ(asked(), 4U) << "away: what comes is shown, and nothing more is asked";
+    host->tellWhatIsSeen([](const host::TurnView&) { return true; });
+    host->tellWhatIsSeen([](const host::TurnView&) { return true; });
+    EXPECT_TRUE(runUntil([&] { return asked() == 5; })) << "back: once more";
+    run(400);
+    EXPECT_EQ(asked(), 5U);
+}
+
+TEST_F(LiveHostTest, NewestCard_LivesOnWhereverItStands) {
+    add(kFriends);
+    const auto newest = add(kFriends);
+    host->tellWhatIsSeen([](const host::TurnView&) { return false; });
+    EXPECT_TRUE(newest->card()->isOnScreen());
+    EXPECT_FALSE(host->conversation()->turns().front()->card()->isOnScreen());
+}
+
+TEST_F(LiveHostTest, SharingCard_NeverAppearsTwice) {
+    const auto sharing = add(kSharing);
+    EXPECT_TRUE(runUntil([&] { return shown() > 0; }));
+    add(kFriends);
+    host->tellWhatIsSeen([](const host::TurnView&) { return false; });
+    EXPECT_FALSE(sharing->card()->isOnScreen());
+    run(300);
+    const std::size_t before = shown();
+    host->tellWhatIsSeen([](const host::TurnView&) { return true; });
+    EXPECT_FALSE(sharing->card()->isOnScreen());
+    run(400);
+    EXPECT_EQ(shown(), before) << "it would share again";
+}
+
+// The whole way that the plugin's commands take: nothing leaves while nobody sees, but for one's friends' newest
+// question.
+TEST_F(LiveHostTest, UnseenConversation_HoldsWhatItsCardsAsk) {
+    host->platform()->httpTransport = real;
+    const auto answered = [this] { return host->live()->service().notes().failures; };
+    host->live()->setSeen(false);
+    add(kFriends);
+    run(500);
+    EXPECT_EQ(answered(), 0);
+    EXPECT_EQ(host->live()->service().notes().underWay, 0);
+    host->live()->setSeen(true);
+    EXPECT_EQ(host->live()->service().notes().underWay, 1) << "one request for both starts";
+}
+
 }  // namespace ktr::test

@@ -110,4 +110,36 @@ TEST_F(LiveStatusTest, QuestionUnderWayGoesBeforeHiding) {
     EXPECT_EQ(words(), "STATUS_ASKING");
 }
 
+// Whoever shows the line waits for no less: at each moment before, it says what it said.
+TEST_F(LiveStatusTest, ChangesIn_IsNeverTooLateAndSeldomEarly) {
+    facts.service.answered = Date{101.0};
+    facts.service.interval = 40.0;
+    facts.asking = Date{104.8};
+    int looked = 0;
+    constexpr double kDay = 86400.0;
+    constexpr double kAlmost = 1e-3;
+    std::vector<std::string> said = {words()};
+    while (facts.now.secondsSinceReferenceDate < kDay) {
+        const auto wait = LiveStatus::changesIn(facts);
+        ASSERT_TRUE(wait);
+        ASSERT_GT(*wait, 0.0);
+        ++looked;
+        const double next = facts.now.secondsSinceReferenceDate + *wait;
+        facts.now = Date{next - std::min(kAlmost, *wait / 2.0)};
+        EXPECT_EQ(words(), said.back()) << facts.now.secondsSinceReferenceDate;
+        facts.now = Date{next + kAlmost};
+        said.push_back(words());
+        if (facts.asking) {
+            facts.asking.reset();
+            said.push_back(words());
+        }
+    }
+    EXPECT_LT(looked, 110) << "every ten seconds, then every minute, then every hour";
+}
+
+TEST_F(LiveStatusTest, ChangesIn_NothingOnScreenNeverChanges) {
+    facts.shown.reset();
+    EXPECT_FALSE(LiveStatus::changesIn(facts));
+}
+
 }  // namespace ktr::test

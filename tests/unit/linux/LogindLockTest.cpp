@@ -78,4 +78,16 @@ TEST_F(LogindLockTest, LogindThatComesAndGoes_IsFollowed) {
     EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kUnlocked; }));
 }
 
+TEST_F(LogindLockTest, Change_IsToldOnceAfterIt) {
+    startLogind();
+    LogindLock lock(client);
+    std::vector<int> told;
+    lock.setChanged([&] { told.push_back(lock.lockState()); });
+    EXPECT_TRUE(eventually([&] { return told.size() == 1; }));
+    announce(false);
+    announce(true);
+    EXPECT_TRUE(eventually([&] { return told.size() == 2; }));
+    EXPECT_EQ(told, (std::vector<int>{LogindLock::kUnlocked, LogindLock::kLocked}));
+}
+
 }  // namespace ktr::test
