@@ -1,0 +1,110 @@
+#!/usr/bin/python3
+"""What nobody sees does not ask: the live window on a virtual display, hidden as window managers hide windows, with `ktr serve`
+behind it. Skipped without Xvfb, xdotool and xprop."""
+
+import os
+import pathlib
+import shutil
+import subprocess
+import sys
+import tempfile
+import time
+import unittest
+
+from serve import Service
+from virtual_display import VirtualDisplay
+
+PROGRAM = os.environ["KTR_PROGRAM"]
+INTERVAL = 0.5
+
+
+class UnseenTest(unittest.TestCase):
+    @classmethod
+    def setUpClass(cls):
+        display = VirtualDisplay("1300x900")
+        cls.addClassCleanup(display.stop)
+        cls.display = display.name
+
+    def setUp(self):
+        folder = tempfile.TemporaryDirectory()
+        self.addCleanup(folder.cleanup)
+        os.chmod(folder.name, 0o700)
+        config = pathlib.Path(folder.name) / "config.json"
+        self.service = Service(PROGRAM, "--write-config", config, "--interval", str(INTERVAL))
+        self.addCleanup(self.service.__exit__)
+        self.environment = {**os.environ, "DISPLAY": self.display, "XDG_RUNTIME_DIR": folder.name, "LANG": "C.UTF-8",
+                            "XDG_STATE_HOME": folder.name, "QT_QPA_PLATFORM": "xcb", "NO_AT_BRIDGE": "1",
+                            "KTR_CONFIG": str(config)}
+
+    def open(self, question):
+        program = subprocess.Popen([PROGRAM, "show", "--language", "en-GB", "--ask", question], env=self.environment)
+        self.addCleanup(program.wait)
+        self.addCleanup(program.terminate)
+        deadline = time.monotonic() + 30
+        while time.monotonic() < deadline:
+            found = subprocess.run(["xdotool", "search", "--onlyvisible", "--name", "^ktr$"], env=self.environment,
+                                   capture_output=True, text=True, check=False).stdout.split()
+            if found:
+                self.window = found[0]
+                return
+            time.sleep(0.05)
+        self.fail("the window does not come")
+
+    def xprop(self, *words):
+        subprocess.run(["xprop", *words], env=self.environment, check=True, stdout=subprocess.DEVNULL)
+
+    def asked(self, command="getlocations"):
+        """Asked of the service since this was called last."""
+        lines = self.service.process.stdout
+        os.set_blocking(lines.fileno(), False)
+        count = (lines.buffer.read() or b"").count(b": " + command.encode())
+        os.set_blocking(lines.fileno(), True)
+        return count
+
+    def wait_until_asked(self, command="getlocations"):
+        deadline = time.monotonic() + 30
+        while not self.asked(command):
+            self.assertLess(time.monotonic(), deadline, "it does not ask")
+            time.sleep(0.05)
+
+    def assert_asks_nothing(self, why):
+        # What was on its way when the window went is over by then.
+        time.sleep(4 * INTERVAL)
+        self.asked()
+        time.sleep(6 * INTERVAL)
+        self.assertEqual(self.asked(), 0, why)
+
+    def test_window_that_is_hidden_or_elsewhere_asks_nothing_and_asks_when_it_is_back(self):
+        self.open("Where are my friends?")
+        self.wait_until_asked()
+        self.xprop("-id", self.window, "-f", "_NET_WM_STATE", "32a", "-set", "_NET_WM_STATE", "_NET_WM_STATE_HIDDEN")
+        self.assert_asks_nothing("minimised by a compositing window manager, which leaves it mapped")
+        self.xprop("-id", self.window, "-remove", "_NET_WM_STATE")
+        self.wait_until_asked()
+        self.xprop("-root", "-f", "_NET_CURRENT_DESKTOP", "32c", "-set", "_NET_CURRENT_DESKTOP", "0")
+        self.xprop("-id", self.window, "-f", "_NET_WM_DESKTOP", "32c", "-set", "_NET_WM_DESKTOP", "1")
+        self.assert_asks_nothing("on another workspace")
+        self.xprop("-root", "-f", "_NET_CURRENT_DESKTOP", "32c", "-set", "_NET_CURRENT_DESKTOP", "1")
+        self.wait_until_asked()
+        self.xprop("-id", self.window, "-f", "_NET_WM_DESKTOP", "32c", "-set", "_NET_WM_DESKTOP", "4294967295")
+        self.asked()
+        self.wait_until_asked()
+        subprocess.run(["xdotool", "windowunmap", "--sync", self.window], env=self.environment, check=True)
+        self.assert_asks_nothing("taken off the screen")
+        subprocess.run(["xdotool", "windowmap", "--sync", self.window], env=self.environment, check=True)
+        self.wait_until_asked()
+
+    def test_two_starts_of_a_card_are_one_request(self):
+        self.open("Where are my friends?")
+        self.wait_until_asked()
+        time.sleep(INTERVAL / 2)
+        self.asked()
+        time.sleep(10 * INTERVAL)
+        self.assertLessEqual(self.asked(), 12, "one an interval, though the card started twice")
+
+
+if __name__ == "__main__":
+    if not all(shutil.which(tool) for tool in ("Xvfb", "xdotool", "xprop")):
+        print("skipped: Xvfb, xdotool and xprop are needed")
+        sys.exit(77)
+    unittest.main()
