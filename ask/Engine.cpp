@@ -1,0 +1,218 @@
+#include "ask/Engine.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "ask/Sight.h"
+#include "ask/WishAnswers.h"
+
+namespace ktr::ask {
+
+using platform::Dictionary;
+using platform::Value;
+
+namespace {
+
+constexpr const char* kClient = "ktr-ask";
+
+Dictionary memberOf(const Dictionary& object, const char* name) {
+    const Value* value = object.find(name);
+    return value == nullptr || value->dictionary() == nullptr ? Dictionary() : *value->dictionary();
+}
+
+std::vector<WhereAnswers::Place> placesIn(const Dictionary& answer) {
+    std::vector<WhereAnswers::Place> places;
+    const Value* given = answer.find("places");
+    if (given == nullptr || given->array() == nullptr) {
+        return places;
+    }
+    for (const Value& one : *given->array()) {
+        const Dictionary* place = one.dictionary();
+        const Value* name = place == nullptr ? nullptr : place->find("name");
+        const Value* latitude = place == nullptr ? nullptr : place->find("latitude");
+        const Value* longitude = place == nullptr ? nullptr : place->find("longitude");
+        if (name != nullptr && name->string() != nullptr && latitude != nullptr && latitude->number() &&
+            longitude != nullptr && longitude->number()) {
+            places.push_back({*name->string(), *latitude->number(), *longitude->number()});
+        }
+    }
+    return places;
+}
+
+/// Whether the answer depends on a place that the user may have named.
+bool needsPlaces(const Understood& understood) {
+    const Wish wish = understood.meaning.wish;
+    return (wish == Wish::NearPlace || wish == Wish::Closest || wish == Wish::IsAt) &&
+           !(understood.meaning.place.empty() && understood.placeWord.empty()) && understood.placeWord != "me" && understood.placePerson == nullptr;
+}
+
+}  // namespace
+
+Engine::Engine(std::shared_ptr<Languages> languages, ServicePort& service, World world)
+    : languages_(std::move(languages)), service_(service), world_(std::move(world)) {
+    setPeople({});
+}
+
+std::variant<Answer, Engine::Shared> Engine::begun(const Question& question) {
+    const auto asking = std::make_shared<Asking>();
+    asking->question = question;
+    asking->people = people_;
+    asking->world = world_;
+    asking->language = languages_->language(question.language);
+    const auto english = languages_->language("en");
+    if (!asking->language || !english) {
+        // Without its texts the program has no words of its own.
+        Answer answer;
+        answer.outcome = Outcome::Unreachable;
+        answer.sentence = languages_->problem();
+        return answer;
+    }
+    if (world_.isLocked && world_.isLocked()) {
+        return asking->locked();
+    }
+    const auto result = Understanding(*asking->language, *english, *people_).understand(question);
+    if (const auto* unknown = std::get_if<Understanding::UnknownPerson>(&result)) {
+        return asking->unknownPerson(*unknown);
+    }
+    if (const auto* several = std::get_if<Understanding::Ambiguous>(&result)) {
+        return asking->ambiguous(*several);
+    }
+    if (std::holds_alternative<Understanding::UnknownMoment>(result)) {
+        return asking->notUnderstood("unknownMoment");
+    }
+    if (!std::holds_alternative<Understood>(result)) {
+        return asking->notUnderstood("notUnderstood");
+    }
+    asking->understood = std::get<Understood>(result);
+    if (isPersonal(asking->understood.meaning.wish) && !question.mayChange) {
+        return asking->refused();
+    }
+    return Shared(asking);
+}
+
+std::optional<Answer> Engine::answerHere(const Question& question) {
+    auto begin = begun(question);
+    auto* answer = std::get_if<Answer>(&begin);
+    return answer == nullptr ? std::nullopt : std::optional(std::move(*answer));
+}
+
+void Engine::ask(const Question& question, const Completion& completion) {
+    auto begin = begun(question);
+    if (auto* answer = std::get_if<Answer>(&begin)) {
+        return completion(std::move(*answer));
+    }
+    const auto& asking = std::get<Shared>(begin);
+    // "Tell me where Ann is now" is one ordinary read.
+    const Wish want = asking->understood.meaning.wish;
+    isPersonal(want) && want != Wish::TellNow ? wish(asking, completion) : read(asking, completion);
+}
+
+void Engine::gather(const Shared& asking, std::shared_ptr<const std::vector<std::string>> handles, std::size_t from,
+                    Dictionary gathered, const std::function<void(ServiceReply)>& then) {
+    const std::size_t end = std::min(from + kMostHandles, handles->size());
+    Dictionary members{{"handles", Value::Array(handles->begin() + static_cast<std::ptrdiff_t>(from),
+                                                handles->begin() + static_cast<std::ptrdiff_t>(end))},
+                       {"serverContext", Dictionary{{"clientId", kClient}}}};
+    if (const auto& position = asking->question.position) {
+        Dictionary mine{{"latitude", position->latitude}, {"longitude", position->longitude}, {"source", "assistant"}};
+        if (position->accuracy) {
+            mine.set("horizontalAccuracy", *position->accuracy);
+        }
+        members.set("myLocation", mine);
+    }
+    service_.send("getlocations", members, [this, asking, handles, end, gathered, then](ServiceReply reply) {
+        if (reply.failure != ServiceReply::Failure::None) {
+            return then(std::move(reply));
+        }
+        Dictionary locations = memberOf(gathered, "locations");
+        for (const auto& [handle, entry] : memberOf(reply.body, "locations")) {
+            locations.set(handle, entry);
+        }
+        reply.body.set("locations", locations);
+        if (end == handles->size()) {
+            return then(std::move(reply));
+        }
+        gather(asking, handles, end, std::move(reply.body), then);
+    });
+}
+
+void Engine::read(const Shared& asking, const Completion& completion) {
+    const auto people = WhereAnswers::asked(asking->understood, *asking->people);
+    const auto handles = std::make_shared<std::vector<std::string>>();
+    for (const Person* person : people) {
+        handles->insert(handles->end(), person->emails.begin(), person->emails.end());
+        handles->insert(handles->end(), person->phones.begin(), person->phones.end());
+    }
+    gather(asking, handles, 0, {}, [this, asking, people, completion](ServiceReply reply) {
+        if (reply.failure != ServiceReply::Failure::None) {
+            return completion(asking->failed(reply.failure));
+        }
+        auto sights = sightsIn(reply.body, people);
+        if (needsPlaces(asking->understood)) {
+            return readPlaces(asking, std::move(sights), std::move(reply.body), completion);
+        }
+        completion(WhereAnswers(*asking, std::move(sights), reply.body).answer({}));
+    });
+}
+
+void Engine::readPlaces(const Shared& asking, std::vector<Sight> sights, Dictionary answer, const Completion& completion) {
+    service_.send("places", {}, [asking, sights = std::move(sights), answer = std::move(answer), completion](const ServiceReply& reply) {
+        // A service that knows no places still knows where friends are.
+        if (reply.failure == ServiceReply::Failure::NotSignedIn || reply.failure == ServiceReply::Failure::Unreachable) {
+            return completion(asking->failed(reply.failure));
+        }
+        completion(WhereAnswers(*asking, sights, answer).answer(placesIn(reply.body)));
+    });
+}
+
+void Engine::wish(const Shared& asking, const Completion& completion) {
+    const WishAnswers wishes(*asking);
+    if (const auto impossible = wishes.impossible()) {
+        return completion(*impossible);
+    }
+    const auto [command, members] = wishes.request();
+    service_.send(command, members, [asking, completion](const ServiceReply& reply) {
+        switch (reply.failure) {
+            case ServiceReply::Failure::None:
+                return completion(WishAnswers(*asking).done(reply.body));
+            case ServiceReply::Failure::Refused:
+                return completion(WishAnswers(*asking).refused());
+            default:
+                return completion(asking->failed(reply.failure));
+        }
+    });
+}
+
+void Engine::askToShare(const std::string& handle, const Question& question, const Completion& completion) {
+    const auto asking = std::make_shared<Asking>();
+    asking->question = question;
+    asking->people = people_;
+    asking->world = world_;
+    asking->language = languages_->language(question.language);
+    if (!asking->language) {
+        Answer answer;
+        answer.outcome = Outcome::Unreachable;
+        answer.sentence = languages_->problem();
+        return completion(answer);
+    }
+    for (const Person& person : people_->all()) {
+        const auto is = [&](const std::string& own) { return own == handle; };
+        if (std::any_of(person.emails.begin(), person.emails.end(), is) ||
+            std::any_of(person.phones.begin(), person.phones.end(), is)) {
+            asking->understood.people = {&person};
+        }
+    }
+    service_.send("askToShare", {{"handle", handle}}, [asking, handle, completion](const ServiceReply& reply) {
+        if (reply.failure == ServiceReply::Failure::NotSignedIn || reply.failure == ServiceReply::Failure::Unreachable) {
+            return completion(asking->failed(reply.failure));
+        }
+        const auto& people = asking->understood.people;
+        const std::string name = people.empty() ? handle : people.front()->shownName();
+        // Refused: it was asked today.
+        const bool isAgain = reply.failure == ServiceReply::Failure::Refused;
+        completion(asking->answer(Outcome::Found, asking->sentences().text(isAgain ? "askedBefore" : "asked",
+                                                                          {{"name", name}})));
+    });
+}
+
+}  // namespace ktr::ask
