@@ -7,6 +7,7 @@
 #include <cmath>
 
 #include "app/window/AccessibleConversation.h"
+#include "app/window/ScrollBarStyle.h"
 #include "host/conversation/Measures.h"
 #include "linux/paint/QtCanvas.h"
 
@@ -18,7 +19,6 @@ using linux_::Palette;
 
 namespace {
 
-constexpr int kBarWidth = 8;
 constexpr int kFrame = 16;  // milliseconds
 /// Scrolling rests after so long: what only passes by is told nothing. Milliseconds.
 constexpr int kRest = 250;
@@ -112,15 +112,7 @@ void ConversationWidget::choosePalette() {
     palette_ = &Palette::of(settings.dark.value_or(systemIsDark) ? ColorScheme::Dark : ColorScheme::Light,
                             highContrast ? Contrast::High : Contrast::Normal);
     host_.conversation()->setPalette(*palette_);
-    QColor handle = palette_->inkSoft;
-    handle.setAlphaF(highContrast ? 1.0F : 0.45F);
-    bar_->setStyleSheet(QStringLiteral("QScrollBar:vertical { background: transparent; width: %1px; border: none; }"
-                                       "QScrollBar::handle:vertical { background: %2; border-radius: 3px; margin: 1px; "
-                                       "min-height: 32px; }"
-                                       "QScrollBar::add-line, QScrollBar::sub-line { height: 0; }"
-                                       "QScrollBar::add-page, QScrollBar::sub-page { background: none; }")
-                            .arg(kBarWidth)
-                            .arg(handle.name(QColor::HexArgb)));
+    bar_->setStyleSheet(scrollBarStyle(*palette_));
     update();
     if (paletteChanged_) {
         paletteChanged_();
@@ -255,7 +247,7 @@ void ConversationWidget::updateBar() {
     bar_->setPageStep(height());
     bar_->setRange(0, most);
     bar_->setVisible(most > 0);
-    bar_->setGeometry(host_.rightToLeft() ? 0 : width() - kBarWidth, 0, kBarWidth, height());
+    bar_->setGeometry(host_.rightToLeft() ? 0 : width() - kScrollBarWidth, 0, kScrollBarWidth, height());
 }
 
 void ConversationWidget::resizeCard(platform::HostSnippetViewController& controller, bool pinTop) {

@@ -5,6 +5,7 @@
 #include <QPainter>
 #include <algorithm>
 #include <cmath>
+#include <initializer_list>
 
 #include "host/conversation/WideColumns.h"
 #include "platform/base/LogArea.h"
@@ -34,6 +35,14 @@ ConversationWindow::ConversationWindow(host::Host& host)
         setFocusProxy(conversation_);
         conversation_->setFocus();
     }
+    pages_ = new PageStack(this);
+    pages_->setBelow([this](bool isSeen) {
+        for (QWidget* part : std::initializer_list<QWidget*>{conversation_, field_, status_}) {
+            if (part != nullptr) {
+                part->setVisible(isSeen);
+            }
+        }
+    });
     conversation_->setPaletteChanged([this] { choosePalette(); });
     host_.setRemade([this] { remade(); });
     sight_.setChanged([this] { sightChanged(); });
@@ -87,6 +96,7 @@ void ConversationWindow::remade() {
         status_->refreshFont();
         showStatus();
     }
+    pages_->refresh();
     place();
 }
 
@@ -128,7 +138,15 @@ void ConversationWindow::choosePalette() {
         field_->setColors(conversation_->colors());
         status_->setColors(conversation_->colors());
     }
+    chooseMotion();
     update();
+}
+
+void ConversationWindow::chooseMotion() {
+    const bool isReduced = reducedMotion_ || (desktop_ != nullptr && desktop_->values().reducedMotion.value_or(false));
+    conversation_->setReducedMotion(isReduced);
+    pages_->setMotion(isReduced ? host::MotionStyle::Reduced : host::MotionStyle::Full);
+    pages_->setLook({&conversation_->colors(), isReduced});
 }
 
 int ConversationWindow::fieldWidth() const {
@@ -149,6 +167,7 @@ void ConversationWindow::resizeEvent(QResizeEvent*) {
 void ConversationWindow::place() {
     const int bar = barHeight();
     conversation_->setGeometry(0, 0, width(), std::max(height() - bar, 0));
+    pages_->setGeometry(rect());
     if (field_ == nullptr) {
         return;
     }
@@ -200,7 +219,7 @@ void ConversationWindow::follow(linux_::DesktopSettings& desktop, bool reducedMo
 
 void ConversationWindow::desktopChanged() {
     const auto& values = desktop_->values();
-    conversation_->setReducedMotion(reducedMotion_ || values.reducedMotion.value_or(false));
+    chooseMotion();
     conversation_->setHighContrast(values.highContrast.value_or(false));
     decideTextSize();
 }

@@ -11,6 +11,7 @@
 #include "app/window/PlainWidget.h"
 #include "app/window/StatusLine.h"
 #include "app/window/WindowSight.h"
+#include "app/window/pages/PageStack.h"
 #include "host/live/LiveConversation.h"
 #include "linux/device/DesktopSettings.h"
 
@@ -33,6 +34,8 @@ class ConversationWindow : public PlainWidget {
     /// None where nothing is live.
     AskField* field() const { return field_; }
     StatusLine* status() const { return status_; }
+    /// What covers the conversation: settings, a friend, signing in.
+    PageStack& pages() const { return *pages_; }
 
   protected:
     void resizeEvent(QResizeEvent* event) override;
@@ -43,6 +46,7 @@ class ConversationWindow : public PlainWidget {
   private:
     void addField();
     void choosePalette();
+    void chooseMotion();
     void showStatus();
     /// Whether anybody sees the window has become another.
     void sightChanged();
@@ -62,6 +66,7 @@ class ConversationWindow : public PlainWidget {
     std::shared_ptr<host::LiveConversation> live_;
     AskField* field_ = nullptr;
     StatusLine* status_ = nullptr;
+    PageStack* pages_;
     QTimer statusTimer_;
     WindowSight sight_;
     CaretRest caretRest_;

@@ -22,24 +22,26 @@ void RingView::setShare(double share) {
 }
 
 void RingView::draw(platform::Canvas& canvas) const {
-    auto* qt = qtCanvas(canvas);
-    if (qt == nullptr) {
-        return;
+    if (auto* qt = qtCanvas(canvas)) {
+        paint(qt->painter(), toQt(bounds()), qt->palette().pine, turn_, share_);
     }
+}
+
+void RingView::paint(QPainter& painter, const QRectF& box, const QColor& color, double turn, double share) {
     constexpr double kTrackAlpha = 0.2;
     const double half = measures::kRingStroke / 2.0;
-    const QRectF circle = toQt(bounds()).adjusted(half, half, -half, -half);
-    QColor track = qt->palette().pine;
+    const QRectF circle = box.adjusted(half, half, -half, -half);
+    QColor track = color;
     track.setAlphaF(static_cast<float>(kTrackAlpha));
     QPainterPath whole;
     whole.addEllipse(circle);
-    qt->painter().strokePath(whole, QPen(track, measures::kRingStroke));
+    painter.strokePath(whole, QPen(track, measures::kRingStroke));
     // Qt counts angles from three o'clock, counter-clockwise.
-    const double start = 90.0 - 360.0 * turn_;
+    const double start = 90.0 - 360.0 * turn;
     QPainterPath arc;
     arc.arcMoveTo(circle, start);
-    arc.arcTo(circle, start, -360.0 * share_);
-    qt->painter().strokePath(arc, QPen(qt->palette().pine, measures::kRingStroke, Qt::SolidLine, Qt::RoundCap));
+    arc.arcTo(circle, start, -360.0 * share);
+    painter.strokePath(arc, QPen(color, measures::kRingStroke, Qt::SolidLine, Qt::RoundCap));
 }
 
 }  // namespace ktr::host

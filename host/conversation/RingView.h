@@ -1,6 +1,11 @@
 #pragma once
 
+#include <QColor>
+#include <QRectF>
+
 #include "platform/ui/View.h"
+
+class QPainter;
 
 namespace ktr::host {
 
@@ -13,6 +18,8 @@ class RingView : public platform::View {
     void setTurn(double turn);
     /// How much of the circle the arc covers, from 0 to 1; a quarter, or three quarters where nothing may move.
     void setShare(double share);
+    /// The same ring wherever else something is under way.
+    static void paint(QPainter& painter, const QRectF& box, const QColor& color, double turn, double share);
 
   protected:
     void draw(platform::Canvas& canvas) const override;

@@ -1,0 +1,51 @@
+#include "app/window/blocks/AccessibleBlock.h"
+
+namespace ktr::app {
+
+namespace {
+
+QAccessibleInterface* accessibleOf(const QString& /*className*/, QObject* object) {
+    auto* block = dynamic_cast<Block*>(object);
+    return block == nullptr ? nullptr : new AccessibleBlock(*block);
+}
+
+}  // namespace
+
+void AccessibleBlock::install() {
+    QAccessible::removeFactory(accessibleOf);
+    QAccessible::installFactory(accessibleOf);
+}
+
+QAccessible::State AccessibleBlock::state() const {
+    QAccessible::State state = AccessiblePlain::state();
+    state.checkable = block_.isCheckable();
+    state.checked = block_.isChecked();
+    state.focusable = block_.canBePressed() && block_.isEnabled();
+    return state;
+}
+
+void* AccessibleBlock::interface_cast(QAccessible::InterfaceType type) {
+    // What cannot be pressed has no actions, not an empty list of them.
+    return type == QAccessible::ActionInterface && block_.canBePressed() ? QAccessibleWidget::interface_cast(type)
+                                                                         : AccessiblePlain::interface_cast(type);
+}
+
+QStringList AccessibleBlock::actionNames() const {
+    if (!block_.canBePressed() || !block_.isEnabled()) {
+        return {};
+    }
+    return {block_.isCheckable() ? toggleAction() : pressAction(), setFocusAction()};
+}
+
+void AccessibleBlock::doAction(const QString& name) {
+    if (!block_.isEnabled()) {
+        return;
+    }
+    if (name == setFocusAction()) {
+        block_.setFocus(Qt::OtherFocusReason);
+    } else if (block_.canBePressed() && (name == pressAction() || name == toggleAction())) {
+        block_.press();
+    }
+}
+
+}  // namespace ktr::app

@@ -1,0 +1,33 @@
+#pragma once
+
+#include "app/window/blocks/Icon.h"
+#include "app/window/blocks/PressBlock.h"
+
+namespace ktr::app {
+
+/// A button of one icon in a target of 44 points; its name is only spoken, and shown under a pointer. Main thread.
+class IconButton : public PressBlock {
+  public:
+    enum class Tone { Pine, Soft, Ink };
+
+    explicit IconButton(Icon icon, Tone tone = Tone::Pine, QWidget* parent = nullptr);
+
+    void setName(const QString& name);
+    /// Of its target.
+    static int side() { return controlHeight(kSide); }
+
+    int around() const override { return 0; }
+    int shapeHeight(int /*width*/) const override { return side(); }
+    int naturalWidth() const override { return side(); }
+
+  protected:
+    void paintEvent(QPaintEvent* event) override;
+
+  private:
+    static constexpr int kSide = 44;
+
+    const Icon icon_;
+    const Tone tone_;
+};
+
+}  // namespace ktr::app

@@ -1,0 +1,68 @@
+#include "app/window/blocks/Words.h"
+
+#include <QPainter>
+
+#include "app/window/blocks/Icon.h"
+
+namespace ktr::app {
+
+namespace {
+
+constexpr int kMarkGap = 8;
+
+}  // namespace
+
+Words::Words(BlockStyle style, Tone tone, QWidget* parent)
+    : Block(parent), style_(style), tone_(tone), isBalanced_(style == BlockStyle::Title) {
+    setFocusPolicy(Qt::NoFocus);
+}
+
+void Words::setText(const QString& text) {
+    if (text != text_.text()) {
+        text_ = BlockText(text, style_, isBalanced_);
+        setAccessibleName(text);
+        askForRoom();
+    }
+}
+
+void Words::setAlignment(BlockAlignment alignment) {
+    alignment_ = alignment;
+    update();
+}
+
+void Words::setBalanced(bool isBalanced) {
+    isBalanced_ = isBalanced;
+    text_ = BlockText(text_.text(), style_, isBalanced);
+    askForRoom();
+}
+
+void Words::setWarning(bool isWarning) {
+    isWarning_ = isWarning;
+    askForRoom();
+}
+
+int Words::markRoom() const {
+    return isWarning_ ? static_cast<int>(grown(iconSide(Icon::Warning))) + kMarkGap : 0;
+}
+
+int Words::shapeHeight(int width) const {
+    return text_.heightFor(width - markRoom());
+}
+
+int Words::naturalWidth() const {
+    return text_.naturalWidth() + markRoom();
+}
+
+void Words::paintEvent(QPaintEvent*) {
+    QPainter painter(this);
+    const QRectF box = mirrored(QRectF(markRoom(), 0, width() - markRoom(), height()));
+    text_.paint(painter, box, tone_ == Tone::Soft ? colors().inkSoft : colors().ink, colors(), isMirrored(),
+                alignment_);
+    if (isWarning_) {
+        const double side = grown(iconSide(Icon::Warning));
+        const double top = (BlockText::fontOf(style_).lineHeight() - side) / 2.0;
+        paintIcon(painter, Icon::Warning, mirrored({0.0, std::max(top, 0.0), side, side}), colors().warning, false);
+    }
+}
+
+}  // namespace ktr::app

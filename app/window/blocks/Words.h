@@ -1,0 +1,42 @@
+#pragma once
+
+#include "app/window/blocks/Block.h"
+#include "app/window/blocks/BlockText.h"
+
+namespace ktr::app {
+
+/// Words on a page that are only read: its title, a line, a section's name, a note with a mark. Main thread.
+class Words : public Block {
+  public:
+    enum class Tone { Ink, Soft };
+
+    explicit Words(BlockStyle style, Tone tone = Tone::Ink, QWidget* parent = nullptr);
+
+    void setText(const QString& text);
+    const QString& text() const { return text_.text(); }
+    void setAlignment(BlockAlignment alignment);
+    void setBalanced(bool isBalanced);
+    /// A warning before the first line.
+    void setWarning(bool isWarning);
+
+    int shapeHeight(int width) const override;
+    int naturalWidth() const override;
+    QAccessible::Role role() const override {
+        return style_ == BlockStyle::Title ? QAccessible::Heading : QAccessible::StaticText;
+    }
+
+  protected:
+    void paintEvent(QPaintEvent* event) override;
+
+  private:
+    int markRoom() const;
+
+    const BlockStyle style_;
+    const Tone tone_;
+    BlockText text_;
+    BlockAlignment alignment_ = BlockAlignment::Start;
+    bool isBalanced_ = false;
+    bool isWarning_ = false;
+};
+
+}  // namespace ktr::app

@@ -1,0 +1,118 @@
+#include "app/window/pages/ColumnPage.h"
+
+#include <QEvent>
+#include <QScroller>
+#include <algorithm>
+
+#include "app/window/ScrollBarStyle.h"
+
+namespace ktr::app {
+
+namespace {
+
+constexpr int kGutter = 12;
+constexpr int kBelowLower = 16;
+constexpr int kAboveLower = 8;
+
+}  // namespace
+
+ColumnPage::ColumnPage(Bar bar, QWidget* parent)
+    : Page(parent), area_(new QScrollArea(this)), handle_(new QScrollBar(Qt::Vertical, this)), column_(new Column) {
+    if (bar == Bar::With) {
+        bar_ = new PageBar(this);
+        bar_->setBack([this] { leave(); });
+        setTabOrder(&bar_->back(), area_);
+    }
+    area_->setFrameShape(QFrame::NoFrame);
+    area_->setFocusPolicy(Qt::NoFocus);
+    area_->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+    // The bar lies over the page, as it does over a conversation.
+    area_->setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+    area_->viewport()->setAutoFillBackground(false);
+    area_->setWidget(column_);
+    column_->setAutoFillBackground(false);
+    column_->installEventFilter(this);
+    area_->viewport()->installEventFilter(this);
+    QScroller::grabGesture(area_->viewport(), QScroller::TouchGesture);
+    handle_->setFocusPolicy(Qt::NoFocus);
+    handle_->setCursor(Qt::ArrowCursor);
+    const QScrollBar* scrolled = area_->verticalScrollBar();
+    connect(scrolled, &QScrollBar::rangeChanged, handle_, [this](int least, int most) {
+        handle_->setRange(least, most);
+        handle_->setVisible(most > least);
+    });
+    connect(scrolled, &QScrollBar::valueChanged, handle_, &QScrollBar::setValue);
+    connect(handle_, &QScrollBar::valueChanged, scrolled, &QScrollBar::setValue);
+    handle_->hide();
+}
+
+void ColumnPage::setLower(Block* lower) {
+    lower_ = lower;
+    lower_->setParent(this);
+    lower_->setLook(look());
+    lower_->show();
+    place();
+}
+
+void ColumnPage::reveal(const QWidget& block) {
+    constexpr int kAround = 24;
+    area_->ensureWidgetVisible(const_cast<QWidget*>(&block), 0, kAround);
+}
+
+void ColumnPage::lookChanged() {
+    column_->setLook(look());
+    handle_->setStyleSheet(scrollBarStyle(colors()));
+}
+
+void ColumnPage::refreshed() {
+    column_->refresh();
+    place();
+}
+
+void ColumnPage::resizeEvent(QResizeEvent*) {
+    place();
+}
+
+bool ColumnPage::event(QEvent* event) {
+    if (event->type() == QEvent::LayoutRequest) {
+        place();
+        return true;
+    }
+    return Page::event(event);
+}
+
+bool ColumnPage::eventFilter(QObject* object, QEvent* event) {
+    if (object == area_->viewport() && event->type() == QEvent::LayoutRequest) {
+        place();
+    } else if (object == column_ && event->type() == QEvent::LayoutDirectionChange) {
+        place();
+    }
+    return Page::eventFilter(object, event);
+}
+
+void ColumnPage::place() {
+    const int above = bar_ == nullptr ? 0 : bar_->shapeHeight(width());
+    if (bar_ != nullptr) {
+        bar_->placeShape({0, 0, width(), above});
+    }
+    column_->setMostWidth(mostWidth());
+    int below = 0;
+    if (lower_ != nullptr) {
+        const int column = std::min(width(), mostWidth());
+        const int across = column - 2 * kGutter;
+        const int high = lower_->shapeHeight(across);
+        below = high + kAboveLower + kBelowLower;
+        lower_->placeShape({(width() - across) / 2, height() - kBelowLower - high, across, high});
+    }
+    const int room = std::max(height() - above - below, 0);
+    area_->setGeometry(0, above, width(), room);
+    column_->resize(width(), std::max(column_->shapeHeight(width()), room));
+    const QScrollBar* scrolled = area_->verticalScrollBar();
+    handle_->setPageStep(room);
+    handle_->setRange(scrolled->minimum(), scrolled->maximum());
+    handle_->setVisible(scrolled->maximum() > scrolled->minimum());
+    handle_->setGeometry(isMirrored() ? 0 : width() - kScrollBarWidth, above, kScrollBarWidth, room);
+    handle_->raise();
+}
+
+}  // namespace ktr::app

@@ -1,0 +1,47 @@
+#pragma once
+
+#include <QScrollArea>
+#include <QScrollBar>
+
+#include "app/window/blocks/Column.h"
+#include "app/window/blocks/PageBar.h"
+#include "app/window/pages/Page.h"
+
+namespace ktr::app {
+
+/// A page of blocks below each other that scrolls, with a page bar above where it can be left, and with what stays at
+/// the lower edge. Main thread.
+class ColumnPage : public Page {
+  public:
+    enum class Bar { With, Without };
+
+    explicit ColumnPage(Bar bar, QWidget* parent = nullptr);
+
+    Column& column() const { return *column_; }
+    /// None without one.
+    PageBar* bar() const { return bar_; }
+    /// Takes over what stays at the lower edge.
+    void setLower(Block* lower);
+    /// Scrolls so that a block is seen.
+    void reveal(const QWidget& block);
+
+  protected:
+    void resizeEvent(QResizeEvent* event) override;
+    bool event(QEvent* event) override;
+    bool eventFilter(QObject* object, QEvent* event) override;
+    void lookChanged() override;
+    void refreshed() override;
+    /// Of the column, where the window is wider.
+    virtual int mostWidth() const { return 480; }
+
+  private:
+    void place();
+
+    PageBar* bar_ = nullptr;
+    QScrollArea* area_;
+    QScrollBar* handle_;
+    Column* column_;
+    Block* lower_ = nullptr;
+};
+
+}  // namespace ktr::app
