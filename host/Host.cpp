@@ -144,9 +144,9 @@ std::vector<std::shared_ptr<platform::AssistantObject>> Host::snippets() const {
     std::vector<std::shared_ptr<platform::AssistantObject>> snippets;
     for (auto turn = turns_.rbegin(); turn != turns_.rend(); ++turn) {
         const auto controller = turn->view->card()->controller();
-        auto newest = controller ? controller->currentSnippet() : nullptr;
+        const auto newest = controller ? controller->currentSnippet() : nullptr;
         if (newest || turn->scenario.snippet) {
-            snippets.push_back(newest ? std::move(newest) : turn->scenario.snippet);
+            snippets.push_back(newest ? newest : turn->scenario.snippet);
         }
     }
     return snippets;
