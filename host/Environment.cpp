@@ -7,6 +7,7 @@
 #include "host/scenario/ScenarioAccounts.h"
 #include "host/scenario/ScenarioClock.h"
 #include "linux/configuration/ConfiguredAssistant.h"
+#include "linux/contacts/ContactFiles.h"
 #include "linux/contacts/MemoryContactStore.h"
 #include "linux/contacts/PhonenumberLibrary.h"
 #include "linux/contacts/PrefixedAssistantContacts.h"
@@ -121,8 +122,8 @@ void addUserInterface(Platform& platform, const HostSettings& settings, bool isW
 
 }  // namespace
 
-std::optional<Failure> Environment::fill(Platform& made, const HostSettings& settings,
-                                         const linux_::ContactFiles::Contacts& contacts, const Platform* earlier) {
+std::optional<Failure> Environment::fill(Platform& made, const HostSettings& settings, const Contacts& contacts,
+                                         const Platform* earlier) {
     made.calendar = std::make_shared<linux_::LocalCalendar>();
     made.assistant = std::make_shared<linux_::ConfiguredAssistant>(settings.language);
     const auto region = std::make_shared<linux_::LocaleRegion>(settings.region);
@@ -164,6 +165,16 @@ std::optional<Failure> Environment::fill(Platform& made, const HostSettings& set
     return std::nullopt;
 }
 
+std::optional<Environment::Contacts> Environment::readContacts(const HostSettings& settings, bool isLive,
+                                                               std::string& error) {
+    if (!isLive) {
+        return linux_::ContactFiles::read(settings.contacts, error);
+    }
+    userContacts = std::make_unique<linux_::UserContacts>(platform->mainLoop, settings.contacts);
+    auto contacts = userContacts->first(linux_::UserContacts::kFirstWait, error);
+    return error.empty() ? std::optional(std::move(contacts)) : std::nullopt;
+}
+
 std::variant<Environment, Failure> Environment::make(const HostSettings& settings, bool isVirtual) {
     Environment environment;
     environment.isVirtual_ = isVirtual;
@@ -191,7 +202,7 @@ std::variant<Environment, Failure> Environment::make(const HostSettings& setting
         environment.live = std::make_unique<LiveServices>(*settings.liveConfiguration, secrets);
     }
     std::string error;
-    auto contacts = linux_::ContactFiles::read(settings.contacts, error);
+    auto contacts = environment.readContacts(settings, isLive, error);
     auto failure = contacts ? environment.fill(*environment.platform, settings, *contacts, nullptr)
                             : Failure{ExitCode::Failure, "the contacts cannot be read: " + error};
     if (failure) {

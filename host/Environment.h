@@ -6,7 +6,7 @@
 #include "host/Failure.h"
 #include "host/HostSettings.h"
 #include "host/live/LiveServices.h"
-#include "linux/contacts/ContactFiles.h"
+#include "linux/contacts/UserContacts.h"
 #include "platform/base/Platform.h"
 #include "platform/base/VirtualTime.h"
 
@@ -15,7 +15,7 @@ namespace ktr::host {
 /// The platform of a conversation, put together from the Linux implementations. Main thread, while a QGuiApplication
 /// exists.
 struct Environment {
-    using Contacts = linux_::ContactFiles::Contacts;
+    using Contacts = linux_::UserContacts::Contacts;
 
     std::shared_ptr<platform::Platform> platform;
     /// The platform's clock and loop when time is virtual; else none.
@@ -23,6 +23,8 @@ struct Environment {
 
     /// What a live conversation asks; else none.
     std::unique_ptr<LiveServices> live;
+    /// The contacts of what is live: a picture is of one moment. It goes before the platform's main loop does.
+    std::unique_ptr<linux_::UserContacts> userContacts;
 
     /// Log and loop come first and are installed while the rest is made, so that what is found on the way is reported.
     /// The platform itself is not installed yet, and a failure leaves none behind. A failure for contacts that cannot
@@ -36,6 +38,8 @@ struct Environment {
     std::optional<Failure> remake(const HostSettings& settings, const Contacts* contacts = nullptr);
 
   private:
+    /// None, and why in `error`, where the files cannot be read.
+    std::optional<Contacts> readContacts(const HostSettings& settings, bool isLive, std::string& error);
     std::optional<Failure> fill(platform::Platform& made, const HostSettings& settings, const Contacts& contacts,
                                 const platform::Platform* earlier);
     bool isVirtual_ = false;

@@ -55,8 +55,7 @@ std::variant<std::unique_ptr<Host>, Failure> Host::make(const HostSettings& sett
 
 void Host::followFiles() {
     live()->setOutdated([this] { configurationChanged(); });
-    contactFiles_ = std::make_unique<linux_::ContactFiles>(platform()->mainLoop);
-    contactFiles_->follow(settings_.contacts, [this](const Environment::Contacts& contacts) {
+    environment_.userContacts->follow([this](const Environment::Contacts& contacts) {
         HostSettings now = settings_;
         now.follow(live()->configuration());
         remakeOrSay(now, &contacts);
@@ -69,8 +68,7 @@ void Host::configurationChanged() {
     now.follow(live()->configuration());
     if (now.contacts != settings_.contacts) {
         // Other files: what they hold is there when they have been read.
-        contactFiles_->setPaths(now.contacts);
-        contactFiles_->reload();
+        environment_.userContacts->setPaths(now.contacts);
         now.contacts = settings_.contacts;
     }
     if (isMoreThanContacts) {
@@ -96,7 +94,7 @@ std::optional<Failure> Host::loadPlugin() {
 }
 
 Host::~Host() {
-    contactFiles_.reset();
+    environment_.userContacts.reset();
     // Views and controllers come from the plugin, and all of them use the platform.
     for (const Turn& turn : turns_) {
         turn.view->card()->letGo();

@@ -114,7 +114,7 @@ class Host {
 
     Host() = default;
     std::optional<Failure> remake(const HostSettings& settings, const Environment::Contacts* contacts);
-    /// Follows the configuration from then on, and the files of the contacts.
+    /// Follows the configuration from then on, and the contacts.
     void followFiles();
     void configurationChanged();
     void remakeOrSay(const HostSettings& settings, const Environment::Contacts* contacts);
@@ -133,8 +133,6 @@ class Host {
     HostSettings settings_;
     std::string pluginPath_;
     Environment environment_;
-    /// Of what is live: a picture is of one moment.
-    std::unique_ptr<linux_::ContactFiles> contactFiles_;
     std::unique_ptr<Plugin> plugin_;
     std::shared_ptr<HostDelegate> delegate_;
     std::shared_ptr<platform::Window> window_;

@@ -7,18 +7,24 @@
 #include <QDBusVirtualObject>
 #include <QProcess>
 #include <QString>
+#include <QTemporaryFile>
 #include <functional>
 
 #include "tests/support/qt/EventLoops.h"
 
 namespace ktr::test {
 
-/// A message bus of the test's own.
+/// A message bus of the test's own, which starts no service of this machine's.
 class PrivateBus {
   public:
     PrivateBus() {
-        daemon_.start(QStringLiteral("dbus-daemon"),
-                      {QStringLiteral("--session"), QStringLiteral("--nofork"), QStringLiteral("--print-address=1")});
+        EXPECT_TRUE(configuration_.open());
+        configuration_.write(R"(<busconfig><type>session</type><listen>unix:tmpdir=/tmp</listen>
+            <policy context="default"><allow send_destination="*"/><allow receive_sender="*"/><allow own="*"/></policy>
+            </busconfig>)");
+        configuration_.flush();
+        daemon_.start(QStringLiteral("dbus-daemon"), {QStringLiteral("--config-file=") + configuration_.fileName(),
+                                                      QStringLiteral("--nofork"), QStringLiteral("--print-address=1")});
         if (daemon_.waitForStarted(10000) && daemon_.waitForReadyRead(10000)) {
             address_ = QString::fromUtf8(daemon_.readLine()).trimmed();
         }
@@ -37,6 +43,7 @@ class PrivateBus {
     static void disconnect(const QString& name) { QDBusConnection::disconnectFromBus(name); }
 
   private:
+    QTemporaryFile configuration_;
     QProcess daemon_;
     QString address_;
 };
