@@ -20,12 +20,13 @@ class AddressBooksTest : public PlatformTest {
         books.reset();
         PrivateBus::disconnect(QStringLiteral("books-client"));
     }
-    void open() {
+    void open(int answer = 5000) {
         AddressBooks::Pauses pauses;
-        pauses.answer = 400;
+        pauses.answer = answer;
         pauses.partial = 100;
         pauses.quiet = 20;
         pauses.retry = 100;
+        pauses.longest = 400;
         books = std::make_unique<AddressBooks>(
             bus.connect(QStringLiteral("books-client")),
             [this](const std::vector<AddressBooks::Book>& now, bool complete) {
@@ -92,7 +93,7 @@ TEST_F(AddressBooksTest, SilentBook_IsLeftOutAndTriedAgain) {
     FakeAddressBooks service(bus);
     service.set(QStringLiteral("local"), {"Ann"});
     service.setManner(Manner::Silent, QStringLiteral("Open"));
-    open();
+    open(400);
     EXPECT_TRUE(eventually([&] { return isComplete; })) << "nobody waits for it";
     EXPECT_EQ(cards(), "local{}");
     service.setManner(Manner::Answers);
@@ -103,7 +104,7 @@ TEST_F(AddressBooksTest, SilentRegistry_IsTriedAgain) {
     FakeAddressBooks service(bus);
     service.set(QStringLiteral("local"), {"Ann"});
     service.setManner(Manner::Silent);
-    open();
+    open(400);
     EXPECT_TRUE(eventually([&] { return isComplete; }));
     service.setManner(Manner::Answers);
     EXPECT_TRUE(comesTo("local{Ann}"));
