@@ -107,7 +107,6 @@ void AddressBooks::callBook(const OpenedBook& book, const QString& method, const
 void AddressBooks::start() {
     ++generation_;
     isStale_ = false;
-    reading_ = 0;
     retry_.stop();
     if (!bus_.isConnected()) {
         tell(true);
@@ -179,7 +178,6 @@ void AddressBooks::listBooks() {
                  found.emplace(source.uid, book);
              }
              books_ = std::move(found);
-             reading_ = static_cast<int>(books_.size());
              for (const auto& [uid, book] : books_) {
                  open(book);
              }
@@ -261,15 +259,17 @@ void AddressBooks::take(const OpenedBook& book, const QDBusMessage& answer) {
 void AddressBooks::ended(const OpenedBook& book, bool isRead) {
     book->isFailed = !isRead;
     book->isReading = false;
-    --reading_;
     if (!isRead) {
         retryLater();
     } else if (book->isStale) {
         quiet_.start();
     }
-    const bool isOver = reading_ == 0;
-    const bool isWell =
-        std::none_of(books_.begin(), books_.end(), [](const auto& entry) { return entry.second->isFailed; });
+    // Of the books that there are now: this one may have been replaced while it was read.
+    const auto none = [this](bool Opened::*is) {
+        return std::none_of(books_.begin(), books_.end(), [is](const auto& entry) { return (*entry.second).*is; });
+    };
+    const bool isOver = none(&Opened::isReading);
+    const bool isWell = none(&Opened::isFailed);
     if (isOver && isWell && !isStale_) {
         pause_ = pauses_.retry;
     }
@@ -322,10 +322,8 @@ void AddressBooks::refresh() {
     }
     for (const auto& [uid, book] : books_) {
         if (!book->isReading && book->isFailed) {
-            ++reading_;
             open(book);
         } else if (!book->isReading && book->isStale) {
-            ++reading_;
             book->isReading = true;
             read(book);
         }

@@ -82,7 +82,6 @@ class AddressBooks : public QObject {
     /// By identifier.
     std::map<QString, OpenedBook> books_;
     int generation_ = 0;
-    int reading_ = 0;  ///< books that have not ended
     bool isStale_ = false;
     bool wasTold_ = false;
     std::vector<Book> told_;
