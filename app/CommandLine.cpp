@@ -5,6 +5,7 @@
 #include <charconv>
 #include <cmath>
 
+#include "app/CrossingHook.h"
 #include "app/ServeArguments.h"
 #include "documents/NearestName.h"
 #include "documents/Words.h"
@@ -91,6 +92,7 @@ struct Parser {
     CLI::App* render = nullptr;
     CLI::App* describe = nullptr;
     std::unique_ptr<ServeArguments> serve;
+    CLI::App* watch = nullptr;
     Options options;
     Words words;
 
@@ -133,6 +135,18 @@ struct Parser {
             addCommon(*command);
         }
         serve = std::make_unique<ServeArguments>(app);
+        watch =
+            app.add_subcommand("watch", "Shows a notification when somebody comes or goes, as the service tells it");
+        watch->add_flag("--print", options.watch.prints, "Lines on the standard output instead of notifications");
+        watch->add_option("--language", options.watch.language, "Language of the notifications, such as en, de, ar")
+            ->type_name("TAG");
+        CLI::Option* hook =
+            watch->add_option("--hook", options.watch.hook, "Also post each, signed, to an address of your own")
+                ->type_name("https://...");
+        CLI::Option* key = watch->add_option("--hook-key", options.watch.hookKey, "File of the key that signs")
+                               ->type_name("FILE")
+                               ->needs(hook);
+        hook->needs(key);
         show->footer(kShowExamples);
         render->footer(kRenderExamples);
         describe->footer(kDescribeExamples);
@@ -298,6 +312,18 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
         parser.options.command = Options::Command::Serve;
         const std::string complaint = parser.serve->read(parser.options.serve);
         return complaint.empty() ? std::variant<Options, Ending>(parser.options) : misuse(complaint);
+    }
+    if (parser.watch->parsed()) {
+        parser.options.command = Options::Command::Watch;
+        const WatchCommand::Options& watch = parser.options.watch;
+        if (!watch.language.empty() && !host::isLanguageTag(watch.language)) {
+            return misuse(wrong("--language", "a language such as en-GB", watch.language));
+        }
+        if (const std::string objection = watch.hook.empty() ? "" : CrossingHook::objection(watch.hook);
+            !objection.empty()) {
+            return misuse("--hook: " + objection);
+        }
+        return parser.options;
     }
     parser.options.command = parser.show->parsed()     ? Options::Command::Show
                              : parser.render->parsed() ? Options::Command::Render

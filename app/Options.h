@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "app/WatchCommand.h"
 #include "host/HostOptions.h"
 #include "serve/ServeOptions.h"
 
@@ -10,7 +11,7 @@ namespace ktr::app {
 
 /// What the command line asks for. Members that are none leave the decision to the scenario, then to the session.
 struct Options : host::HostOptions {
-    enum class Command { Show, Render, Describe, Serve };
+    enum class Command { Show, Render, Describe, Serve, Watch };
 
     Command command = Command::Show;
     std::vector<std::string> scenarios;  ///< never empty where nothing is live, but for serve
@@ -21,6 +22,7 @@ struct Options : host::HostOptions {
     std::string output;                  ///< of render: a file ending in .png, .svg or .pdf
     std::string plugin;                  ///< empty: looked for
     serve::ServeOptions serve;           ///< of serve
+    WatchCommand::Options watch;         ///< of watch
     bool reducedMotion = false;          ///< of show
     bool printUrls = false;              ///< of show: URLs go to the standard output instead of the desktop
 };

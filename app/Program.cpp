@@ -238,6 +238,9 @@ host::ExitCode runProgram(int argc, char** argv) {
     if (const auto failure = wantDescriptors(isLive ? Descriptors::kForLive : Descriptors::kForOthers)) {
         return fail(*failure);
     }
+    if (options.command == Options::Command::Watch) {
+        return WatchCommand::run(options.watch, argc, argv);
+    }
     return options.command == Options::Command::Serve ? ServeCommand::run(options.serve) : run(options, argc, argv);
 }
 

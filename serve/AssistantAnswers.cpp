@@ -198,10 +198,18 @@ std::optional<Waypoint> AssistantAnswers::placeNamed(const QString& words, const
 }
 
 Dictionary AssistantAnswers::fenceAnswer(const FenceQuestion& question, const ServedFriend& person,
-                                         const Waypoint& place) const {
+                                         const Waypoint& place, const ServiceMoment& moment) const {
     using Trigger = FenceQuestion::Trigger;
     const bool leaves = question.trigger == Trigger::Departure;
-    Dictionary location{{"latitude", place.latitude}, {"longitude", place.longitude}, {"accuracy", kFenceRadius}};
+    server::FenceCircle circle{place.latitude, place.longitude, kFenceRadius};
+    if (question.trigger != Trigger::Immediate) {
+        const auto kept = service_.setFence(person, circle, !leaves, moment);
+        if (!kept) {
+            return Dictionary{{"sentence", "I may not tell you when " + nameOf(person) + " comes and goes."}};
+        }
+        circle = kept->circle;
+    }
+    Dictionary location{{"latitude", circle.latitude}, {"longitude", circle.longitude}, {"accuracy", circle.radius}};
     if (!question.place.isEmpty()) {
         setWhenPresent(location, "label", place.label.value_or(""));
         setWhenPresent(location, "street", place.street.value_or(""));
@@ -229,7 +237,7 @@ std::optional<Dictionary> AssistantAnswers::fenceAnswer(const QuestionWords& que
     }
     const ServedFriend& person = *friends.front();
     if (const auto place = placeNamed(fence->place, person, moment)) {
-        return fenceAnswer(*fence, person, *place);
+        return fenceAnswer(*fence, person, *place, moment);
     }
     if (fence->needsPlace) {
         return std::nullopt;

@@ -28,8 +28,8 @@ class AssistantAnswers {
     std::optional<platform::Dictionary> fenceAnswer(const QuestionWords& question,
                                                     const std::vector<const ServedFriend*>& friends,
                                                     const ServiceMoment& moment) const;
-    platform::Dictionary fenceAnswer(const FenceQuestion& question, const ServedFriend& person,
-                                     const Waypoint& place) const;
+    platform::Dictionary fenceAnswer(const FenceQuestion& question, const ServedFriend& person, const Waypoint& place,
+                                     const ServiceMoment& moment) const;
     platform::Dictionary locationsAnswer(const QuestionWords& question, std::vector<const ServedFriend*> friends,
                                          const ServiceMoment& moment) const;
     /// The place that these words mean to a friend; without words, where the friend is.

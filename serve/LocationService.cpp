@@ -3,6 +3,7 @@
 #include <GeographicLib/Geodesic.hpp>
 #include <algorithm>
 #include <cmath>
+#include <future>
 
 #include "server/answers/CommandRequest.h"
 
@@ -161,6 +162,19 @@ void LocationService::completeSharing(Dictionary& answer, const Dictionary& requ
     }
     answer.set("myInfo", myInfo);
     completeContext(answer, fault);
+}
+
+std::optional<server::Fence> LocationService::setFence(const ServedFriend& person, const server::FenceCircle& circle,
+                                                       bool arrives, const ServiceMoment& moment) const {
+    const auto number = static_cast<std::size_t>(&person - file_.friends.data());
+    people_.setHidden(number, person.hidesAt(moment.seconds), moment.wholeSeconds());
+    const server::FenceWish wish{people_.owner(), people_.friendAt(number), {"", circle}, arrives, true};
+    std::promise<std::optional<server::Fence>> kept;
+    people_.store()->setFence(
+        wish, moment.wholeSeconds(), [&](server::FenceOutcome outcome, const server::Fence& fence) {
+            kept.set_value(outcome == server::FenceOutcome::Set ? std::optional(fence) : std::nullopt);
+        });
+    return kept.get_future().get();
 }
 
 Waypoint LocationService::placeAt(double latitude, double longitude) const {

@@ -50,7 +50,9 @@ bool MadeUpPeople::make(const FriendsFile& file, const std::string& personId, co
     const auto reader = store_->deviceOf(token, failed);
     reader_ = reader ? reader->id : 0;
     return reader && std::all_of(friends_.begin(), friends_.end(), [&](std::int64_t person) {
-               return store_->grant(person, owner_, {server::Precision::Exact, now, std::nullopt});
+               server::Grant grant{server::Precision::Exact, now, std::nullopt};
+               grant.fences = true;
+               return store_->grant(person, owner_, grant);
            });
 }
 

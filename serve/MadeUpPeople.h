@@ -24,6 +24,8 @@ class MadeUpPeople {
     const std::shared_ptr<server::Store>& store() const { return store_; }
     std::int64_t owner() const { return owner_; }
     std::int64_t reader() const { return reader_; }
+    /// The file's friend of this number.
+    std::int64_t friendAt(std::size_t number) const { return friends_.at(number); }
 
     /// Hides the file's friend of this number, or shows them again; nothing where it is so already.
     void setHidden(std::size_t number, bool hidden, std::int64_t now) const;

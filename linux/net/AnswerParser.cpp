@@ -135,6 +135,11 @@ std::string AnswerParser::field(std::string_view name) const {
     return found != answer.end() ? std::string(found->value()) : std::string();
 }
 
+std::string AnswerParser::takePiece() {
+    constexpr int kOk = 200;
+    return headIsChecked_ && status() == kOk ? std::exchange(parser_->beast.get().body(), {}) : std::string();
+}
+
 std::string AnswerParser::takeBody() {
     return std::move(parser_->beast.get().body());
 }

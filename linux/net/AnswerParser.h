@@ -44,6 +44,8 @@ class AnswerParser {
     /// The value of the first field of this name in any case; empty without one.
     std::string field(std::string_view name) const;
     std::string takeBody();
+    /// What has come of the body of an answer with status 200 and has not been taken yet, before it is whole.
+    std::string takePiece();
 
   private:
     struct Parser;

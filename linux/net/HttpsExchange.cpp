@@ -148,8 +148,14 @@ void HttpsExchange::readSome() {
             return;
         }
         hasHeard_ = true;
-        if (parser_->feed({step.constData(), static_cast<std::size_t>(step.size())}) !=
-            AnswerParser::State::Incomplete) {
+        const auto state = parser_->feed({step.constData(), static_cast<std::size_t>(step.size())});
+        if (request_.piece) {
+            if (std::string piece = parser_->takePiece(); !piece.empty() && !request_.piece(std::move(piece))) {
+                fail(HttpFailure::BadAnswer, "the answer is of no use");
+                return;
+            }
+        }
+        if (state != AnswerParser::State::Incomplete) {
             answerEnded();
             return;
         }

@@ -31,6 +31,9 @@ struct HttpsRequest {
     double deadline = 30.0;         ///< seconds for everything together, names, redirects and all
     double inactivityLimit = 15.0;  ///< seconds without a byte in either direction
     std::size_t maximumBytes = std::size_t{8} * 1024 * 1024;  ///< of the answer's body
+    /// Gets the body of an answer with status 200 as it comes, instead of the answer; none: nobody does. On the network
+    /// thread; a false ends the exchange.
+    std::function<bool(std::string)> piece;
     /// Who may be sent the same request when an answer says so (307, 308); none: no redirect is followed.
     std::function<bool(const Origin&)> mayFollow;
 };

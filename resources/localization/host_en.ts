@@ -403,5 +403,25 @@
         <extracomment>In the menu of the field</extracomment>
         <translation>Select all</translation>
     </message>
+    <message>
+        <source>WATCH_ARRIVAL</source>
+        <extracomment>A notification about a friend, below the name: the friend has arrived at %@, a place with a name, or a time such as 17:42</extracomment>
+        <translation>Arrived: %@</translation>
+    </message>
+    <message>
+        <source>WATCH_DEPARTURE</source>
+        <extracomment>A notification about a friend, below the name: the friend has left %@, a place with a name, or a time such as 17:42</extracomment>
+        <translation>Left: %@</translation>
+    </message>
+    <message>
+        <source>WATCH_SOMEBODY_ARRIVED</source>
+        <extracomment>A notification while the screen is locked: it says neither who nor where</extracomment>
+        <translation>Somebody arrived</translation>
+    </message>
+    <message>
+        <source>WATCH_SOMEBODY_LEFT</source>
+        <extracomment>A notification while the screen is locked: it says neither who nor where</extracomment>
+        <translation>Somebody left</translation>
+    </message>
 </context>
 </TS>

@@ -403,5 +403,25 @@
         <extracomment>In the menu of the field</extracomment>
         <translation>सब चुनें</translation>
     </message>
+    <message>
+        <source>WATCH_ARRIVAL</source>
+        <extracomment>A notification about a friend, below the name: the friend has arrived at %@, a place with a name, or a time such as 17:42. English: “Arrived: %@”</extracomment>
+        <translation>पहुँचे: %@</translation>
+    </message>
+    <message>
+        <source>WATCH_DEPARTURE</source>
+        <extracomment>A notification about a friend, below the name: the friend has left %@, a place with a name, or a time such as 17:42. English: “Left: %@”</extracomment>
+        <translation>निकले: %@</translation>
+    </message>
+    <message>
+        <source>WATCH_SOMEBODY_ARRIVED</source>
+        <extracomment>A notification while the screen is locked: it says neither who nor where. English: “Somebody arrived”</extracomment>
+        <translation>कोई पहुँचा</translation>
+    </message>
+    <message>
+        <source>WATCH_SOMEBODY_LEFT</source>
+        <extracomment>A notification while the screen is locked: it says neither who nor where. English: “Somebody left”</extracomment>
+        <translation>कोई निकला</translation>
+    </message>
 </context>
 </TS>

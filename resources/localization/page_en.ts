@@ -548,5 +548,35 @@
         <extracomment>Asks before PLACE_REMOVE</extracomment>
         <translation>Its name goes, and rules that were to end there end now.</translation>
     </message>
+    <message>
+        <source>TOLD_MAY</source>
+        <extracomment>Label of a switch: whether one person may be told when the reader comes and goes</extracomment>
+        <translation>May be told when you come and go</translation>
+    </message>
+    <message>
+        <source>TOLD_MAY_HINT</source>
+        <extracomment>Below TOLD_MAY; %@ is EXACTLY, a choice on the same page</extracomment>
+        <translation>Holds only with “%@”.</translation>
+    </message>
+    <message>
+        <source>TOLD_TITLE</source>
+        <extracomment>Title of the page that lists who is told when the reader comes and goes, and the way there</extracomment>
+        <translation>Who is told when I come and go</translation>
+    </message>
+    <message>
+        <source>TOLD_NOBODY</source>
+        <extracomment>On the page TOLD_TITLE when the list is empty</extracomment>
+        <translation>Nobody is told.</translation>
+    </message>
+    <message>
+        <source>TOLD_LEAVING</source>
+        <extracomment>In a row with somebody's name: that person is told when the reader leaves %@, a place</extracomment>
+        <translation>When I leave: %@</translation>
+    </message>
+    <message>
+        <source>TOLD_ARRIVING</source>
+        <extracomment>In a row with somebody's name: that person is told when the reader arrives at %@, a place</extracomment>
+        <translation>When I arrive: %@</translation>
+    </message>
 </context>
 </TS>

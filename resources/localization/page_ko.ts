@@ -548,5 +548,35 @@
         <extracomment>Asks before PLACE_REMOVE. English: “Its name goes, and rules that were to end there end now.”</extracomment>
         <translation>이름이 사라지고, 거기서 끝나기로 한 규칙은 지금 끝납니다.</translation>
     </message>
+    <message>
+        <source>TOLD_MAY</source>
+        <extracomment>Label of a switch: whether one person may be told when the reader comes and goes. English: “May be told when you come and go”</extracomment>
+        <translation>오고 가는 것을 알려도 됨</translation>
+    </message>
+    <message>
+        <source>TOLD_MAY_HINT</source>
+        <extracomment>Below TOLD_MAY; %@ is EXACTLY, a choice on the same page. English: “Holds only with “%@”.”</extracomment>
+        <translation>‘%@’일 때만 적용됩니다.</translation>
+    </message>
+    <message>
+        <source>TOLD_TITLE</source>
+        <extracomment>Title of the page that lists who is told when the reader comes and goes, and the way there. English: “Who is told when I come and go”</extracomment>
+        <translation>내가 오고 가는 것을 아는 사람</translation>
+    </message>
+    <message>
+        <source>TOLD_NOBODY</source>
+        <extracomment>On the page TOLD_TITLE when the list is empty. English: “Nobody is told.”</extracomment>
+        <translation>아무도 모릅니다.</translation>
+    </message>
+    <message>
+        <source>TOLD_LEAVING</source>
+        <extracomment>In a row with somebody's name: that person is told when the reader leaves %@, a place. English: “When I leave: %@”</extracomment>
+        <translation>떠날 때: %@</translation>
+    </message>
+    <message>
+        <source>TOLD_ARRIVING</source>
+        <extracomment>In a row with somebody's name: that person is told when the reader arrives at %@, a place. English: “When I arrive: %@”</extracomment>
+        <translation>도착할 때: %@</translation>
+    </message>
 </context>
 </TS>

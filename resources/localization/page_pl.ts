@@ -548,5 +548,35 @@
         <extracomment>Asks before PLACE_REMOVE. English: “Its name goes, and rules that were to end there end now.”</extracomment>
         <translation>Nazwa znika, a zasady, które miały się tam skończyć, kończą się teraz.</translation>
     </message>
+    <message>
+        <source>TOLD_MAY</source>
+        <extracomment>Label of a switch: whether one person may be told when the reader comes and goes. English: “May be told when you come and go”</extracomment>
+        <translation>Może wiedzieć, kiedy przychodzisz i wychodzisz</translation>
+    </message>
+    <message>
+        <source>TOLD_MAY_HINT</source>
+        <extracomment>Below TOLD_MAY; %@ is EXACTLY, a choice on the same page. English: “Holds only with “%@”.”</extracomment>
+        <translation>Działa tylko przy „%@”.</translation>
+    </message>
+    <message>
+        <source>TOLD_TITLE</source>
+        <extracomment>Title of the page that lists who is told when the reader comes and goes, and the way there. English: “Who is told when I come and go”</extracomment>
+        <translation>Kto wie, kiedy przychodzę i wychodzę</translation>
+    </message>
+    <message>
+        <source>TOLD_NOBODY</source>
+        <extracomment>On the page TOLD_TITLE when the list is empty. English: “Nobody is told.”</extracomment>
+        <translation>Nikt tego nie wie.</translation>
+    </message>
+    <message>
+        <source>TOLD_LEAVING</source>
+        <extracomment>In a row with somebody's name: that person is told when the reader leaves %@, a place. English: “When I leave: %@”</extracomment>
+        <translation>Kiedy wychodzę: %@</translation>
+    </message>
+    <message>
+        <source>TOLD_ARRIVING</source>
+        <extracomment>In a row with somebody's name: that person is told when the reader arrives at %@, a place. English: “When I arrive: %@”</extracomment>
+        <translation>Kiedy przychodzę: %@</translation>
+    </message>
 </context>
 </TS>

@@ -548,5 +548,35 @@
         <extracomment>Asks before PLACE_REMOVE. English: “Its name goes, and rules that were to end there end now.”</extracomment>
         <translation>Adı gider, orada bitecek kurallar şimdi biter.</translation>
     </message>
+    <message>
+        <source>TOLD_MAY</source>
+        <extracomment>Label of a switch: whether one person may be told when the reader comes and goes. English: “May be told when you come and go”</extracomment>
+        <translation>Geldiğini ve gittiğini öğrenebilir</translation>
+    </message>
+    <message>
+        <source>TOLD_MAY_HINT</source>
+        <extracomment>Below TOLD_MAY; %@ is EXACTLY, a choice on the same page. English: “Holds only with “%@”.”</extracomment>
+        <translation>Yalnızca “%@” ile geçerlidir.</translation>
+    </message>
+    <message>
+        <source>TOLD_TITLE</source>
+        <extracomment>Title of the page that lists who is told when the reader comes and goes, and the way there. English: “Who is told when I come and go”</extracomment>
+        <translation>Geldiğimi ve gittiğimi kim öğreniyor</translation>
+    </message>
+    <message>
+        <source>TOLD_NOBODY</source>
+        <extracomment>On the page TOLD_TITLE when the list is empty. English: “Nobody is told.”</extracomment>
+        <translation>Kimse öğrenmiyor.</translation>
+    </message>
+    <message>
+        <source>TOLD_LEAVING</source>
+        <extracomment>In a row with somebody's name: that person is told when the reader leaves %@, a place. English: “When I leave: %@”</extracomment>
+        <translation>Ayrıldığımda: %@</translation>
+    </message>
+    <message>
+        <source>TOLD_ARRIVING</source>
+        <extracomment>In a row with somebody's name: that person is told when the reader arrives at %@, a place. English: “When I arrive: %@”</extracomment>
+        <translation>Vardığımda: %@</translation>
+    </message>
 </context>
 </TS>

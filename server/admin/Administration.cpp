@@ -179,10 +179,14 @@ std::string Administration::share(const std::string& owner, const std::string& v
     if (!exactness) {
         return "--precision: expected exact, 1km, town or places, found " + documents::inQuotes(words.precision);
     }
+    if (words.fences && *exactness != Precision::Exact) {
+        return "--fences: only who sees somebody exactly can be told when they come and go";
+    }
     Grant grant;
     grant.precision = *exactness;
     grant.from = store_->present(now_);
     grant.aloud = words.aloud;
+    grant.fences = words.fences;
     if (!words.until.empty()) {
         grant.until = WallClock(from->zone).endingOf(words.until, now_);
         if (!grant.until) {
@@ -249,7 +253,8 @@ std::string Administration::wordsOf(const Person& owner, const Grant& grant) {
     if (grant.until) {
         words += (place == places.end() ? " until " : ", at the latest ") + WallClock(owner.zone).face(*grant.until);
     }
-    return words + (grant.aloud ? ", may be said aloud" : "");
+    return words + (grant.aloud ? ", may be said aloud" : "") +
+           (grant.fences ? ", may be told of coming and going" : "");
 }
 
 std::string Administration::people() {

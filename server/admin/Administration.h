@@ -45,6 +45,7 @@ class Administration {
         std::string until = {};    ///< as `WallClock::endingOf`
         std::string arrival = {};  ///< the name of the owner's place on whose reaching it ends
         bool aloud = false;
+        bool fences = false;  ///< the viewer may be told when the owner comes and goes
     };
     std::string share(const std::string& owner, const std::string& viewer, const GrantWords& words);
     /// The owner goes on with a grant without an end.
@@ -72,6 +73,10 @@ class Administration {
     std::string places(const std::string& name);
     std::string setZone(const std::string& name, const std::string& zone);
     std::string looks(const std::string& name);
+    /// Who is told when a person comes and goes, where, and since when.
+    std::string fences(const std::string& name);
+    /// Ends one of them, by its number in that list.
+    std::string endFence(const std::string& name, int number);
     /// A link that opens a person's own page in a browser, once; in a terminal also as a code for a camera.
     std::string link(const std::string& name, bool isTerminal);
     /// Writes a backup while the service runs.

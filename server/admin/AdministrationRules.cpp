@@ -122,6 +122,49 @@ std::string Administration::looks(const std::string& name) {
     return complaint;
 }
 
+std::string Administration::fences(const std::string& name) {
+    std::string complaint = open();
+    const auto who = complaint.empty() ? person(name, complaint) : std::nullopt;
+    if (!who) {
+        return complaint;
+    }
+    const auto all = store_->fencesAbout(who->id);
+    if (!all) {
+        return "the store cannot be read";
+    }
+    const WallClock clock(who->zone);
+    int number = 0;
+    for (const FenceFacts& one : *all) {
+        const Fence& fence = one.fence;
+        out_ << ++number << "  " << one.other << " is told when " << name << (fence.arrives ? " arrives" : " leaves")
+             << (fence.name.empty() ? std::string() : (fence.arrives ? " at " : " ") + documents::inQuotes(fence.name))
+             << ", " << std::llround(fence.circle.radius) << " m, " << (fence.once ? "once" : "always") << ", since "
+             << clock.face(fence.made) << "\n";
+    }
+    return "";
+}
+
+std::string Administration::endFence(const std::string& name, int number) {
+    std::string complaint = open();
+    const auto who = complaint.empty() ? person(name, complaint) : std::nullopt;
+    if (!who) {
+        return complaint;
+    }
+    const auto all = store_->fencesAbout(who->id);
+    if (!all) {
+        return "the store cannot be read";
+    }
+    if (static_cast<std::size_t>(number) > all->size()) {
+        return "--end: there is no such number; ktr-service fences lists them";
+    }
+    const FenceFacts& one = (*all)[static_cast<std::size_t>(number - 1)];
+    if (store_->endFence(who->id, one.fence.id) == FenceOutcome::Failed) {
+        return "it could not be written";
+    }
+    out_ << one.other << " is told of that no more\n";
+    return "";
+}
+
 std::string Administration::keepGrant(const std::string& owner, const std::string& viewer) {
     std::string complaint = open();
     const auto from = complaint.empty() ? person(owner, complaint) : std::nullopt;

@@ -64,6 +64,7 @@ int main(int count, char** words) {
     share->add_option("--arrival", grant.arrival, "A place of the person: it ends when they are there")
         ->type_name("PLACE");
     share->add_flag("--aloud", grant.aloud, "What is seen may be said aloud");
+    share->add_flag("--fences", grant.fences, "They may be told when the person comes and goes");
     CLI::App* revoke = named(program.add_subcommand("revoke", "Ends a grant, or all secrets of a person"));
     CLI::Option* noViewer = revoke->add_option("viewer", other, "Who no longer sees the person");
     revoke->add_option("--device", device, "One secret alone, by its number in the list of devices")

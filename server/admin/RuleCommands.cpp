@@ -19,6 +19,8 @@ RuleCommands::RuleCommands(CLI::App& program) {
     zone_ = named("zone", "Sets where a person's day ends");
     zone_->add_option("zone", other_, "A time zone such as Europe/Berlin")->required();
     looks_ = named("looks", "Lists who saw a person in the last 30 days");
+    fences_ = named("fences", "Lists who is told when a person comes and goes");
+    fences_->add_option("--end", number_, "Ends the one with this number")->check(CLI::PositiveNumber);
     keep_ = named("keep", "Says that a grant without an end is still meant");
     keep_->add_option("viewer", other_, "Who sees the person")->required();
     devices_ = named("devices", "Lists a person's phones and readers");
@@ -30,6 +32,9 @@ std::optional<std::string> RuleCommands::run(Administration& administration) con
     }
     if (*places_) {
         return administration.places(name_);
+    }
+    if (*fences_) {
+        return number_ > 0 ? administration.endFence(name_, number_) : administration.fences(name_);
     }
     if (*zone_) {
         return administration.setZone(name_, other_);

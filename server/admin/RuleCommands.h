@@ -27,6 +27,8 @@ class RuleCommands {
     CLI::App* places_;
     CLI::App* zone_;
     CLI::App* looks_;
+    CLI::App* fences_;
+    int number_ = 0;
     CLI::App* keep_;
     CLI::App* devices_;
 };

@@ -84,6 +84,7 @@ std::string Administration::serve(const Serving& where) {
     const bool isSix = settings->host.find(':') != std::string::npos;
     setup.hosts = {isSix ? "[" + settings->host + "]" : settings->host};
     setup.now = presentTime;
+    setup.holdsAnswers = true;
     setup.alive = ServiceManager::tellAlive;
     const auto log = std::make_shared<ServiceLog>(STDERR_FILENO);
     setup.log = log;

@@ -4,6 +4,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include "platform/base/Json.h"
+
 namespace ktr::server {
 
 using platform::Dictionary;
@@ -50,8 +52,8 @@ Dictionary entryOf(const Seen& seen, const LocationsRequest& request) {
     return entry;
 }
 
-Dictionary serverContext() {
-    return {{"minCallbackIntervalInMS", LocationAnswers::kInterval * 1000.0},
+Dictionary serverContext(double interval) {
+    return {{"minCallbackIntervalInMS", interval * 1000.0},
             {"callbackTimeoutIntervalInMS", LocationAnswers::kTimeout * 1000.0}};
 }
 
@@ -61,7 +63,15 @@ bool isEmail(const std::string& handle) {
 
 }  // namespace
 
-Dictionary LocationAnswers::locations(const LocationsRequest& request, std::vector<AskedFriend> friends) {
+std::string LocationAnswers::said(const AskedFriend& friend_) {
+    if (!friend_.seen) {
+        return "";
+    }
+    return platform::writeJson(locationOf(*friend_.seen));
+}
+
+Dictionary LocationAnswers::locations(const LocationsRequest& request, std::vector<AskedFriend> friends,
+                                      double interval) {
     const bool partly = request.handles.size() > kMostHandles;
     std::vector<AskedFriend> found;
     Value::Array rest;
@@ -86,7 +96,7 @@ Dictionary LocationAnswers::locations(const LocationsRequest& request, std::vect
         order.emplace_back(one.handle);
     }
     order.insert(order.end(), rest.begin(), rest.end());
-    Dictionary context = serverContext();
+    Dictionary context = serverContext(interval);
     if (request.clientId) {
         context.set("clientId", *request.clientId);
     }
@@ -104,7 +114,7 @@ Dictionary LocationAnswers::sharing(bool hidden, const std::string& preferredHan
     myInfo.set("location", hidden || !place
                                ? Value()
                                : Value(locationOf({place->latitude, place->longitude, place->accuracy, now})));
-    return {{"statusCode", 200}, {"serverContext", serverContext()}, {"myInfo", myInfo}};
+    return {{"statusCode", 200}, {"serverContext", serverContext(kInterval)}, {"myInfo", myInfo}};
 }
 
 }  // namespace ktr::server

@@ -32,7 +32,10 @@ class LocationAnswers {
     /// The answer to a get-locations command. Friends who are seen come first, one handle each, the e-mail address if
     /// one was asked for. All others are listed as they were asked for, without an entry, whatever the reason.
     /// `friends` are as many as were asked for.
-    static platform::Dictionary locations(const LocationsRequest& request, std::vector<AskedFriend> friends);
+    static platform::Dictionary locations(const LocationsRequest& request, std::vector<AskedFriend> friends,
+                                          double interval = kInterval);
+    /// What is said of where a friend is, as a text that changes with it.
+    static std::string said(const AskedFriend& friend_);
 
     /// The answer to a command about the user's own sharing. `place` serves the answer and is kept nowhere.
     static platform::Dictionary sharing(bool hidden, const std::string& preferredHandle,

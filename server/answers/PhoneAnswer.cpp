@@ -1,6 +1,7 @@
 #include "server/answers/PhoneAnswer.h"
 
 #include <cmath>
+#include <cstdio>
 #include <cstdlib>
 
 #include "server/ingest/Base64.h"
@@ -38,9 +39,17 @@ bool PhoneAnswer::isSound(const Dictionary& message) {
         const Value* value = message.find(name);
         return value == nullptr ? std::nullopt : value->number();
     };
-    const Value* time = message.find("tst");
-    return text("_type") == "location" && time != nullptr && time->integer() && *time->integer() > 0 && number("lat") &&
-           std::abs(*number("lat")) <= 90.0 && number("lon") && std::abs(*number("lon")) <= 180.0;
+    const auto isTime = [&](const char* name) {
+        const Value* time = message.find(name);
+        return time != nullptr && time->integer() && *time->integer() > 0;
+    };
+    const bool hasPlace = isTime("tst") && number("lat") && std::abs(*number("lat")) <= 90.0 && number("lon") &&
+                          std::abs(*number("lon")) <= 180.0;
+    if (text("_type") == "transition") {
+        return hasPlace && isTime("wtst") && number("acc") && !text("desc").empty() &&
+               (text("event") == "enter" || text("event") == "leave");
+    }
+    return text("_type") == "location" && hasPlace;
 }
 
 Value::Array PhoneAnswer::messages(const std::vector<PhoneFriend>& friends) {
@@ -72,6 +81,33 @@ Value::Array PhoneAnswer::messages(const std::vector<PhoneFriend>& friends) {
             location.set("acc", static_cast<std::int64_t>(std::ceil(*one.seen->accuracy)));
         }
         add(location);
+    }
+    return messages;
+}
+
+bool PhoneAnswer::showsTransitions(const std::string& userAgent) {
+    // The system's own words for the program: "OwnTracks/18.5 CFNetwork/1494.0.7 Darwin/23.4.0".
+    return userAgent.rfind("OwnTracks/", 0) == 0 && userAgent.find(" CFNetwork/") != std::string::npos;
+}
+
+Value::Array PhoneAnswer::transitions(const std::vector<FenceEvent>& events) {
+    Value::Array messages;
+    for (const FenceEvent& event : events) {
+        char place[64] = "";
+        std::snprintf(place, sizeof place, "%.2f, %.2f", event.circle.latitude, event.circle.longitude);
+        Dictionary message{{"_type", "transition"},
+                           {"tid", event.name},
+                           {"event", event.arrives ? "enter" : "leave"},
+                           {"desc", event.place.empty() ? std::string(place) : event.place},
+                           {"wtst", event.made},
+                           {"tst", event.time},
+                           {"lat", event.circle.latitude},
+                           {"lon", event.circle.longitude},
+                           {"acc", static_cast<std::int64_t>(std::ceil(event.circle.radius))},
+                           {"t", "c"}};
+        if (isSound(message)) {
+            messages.emplace_back(std::move(message));
+        }
     }
     return messages;
 }

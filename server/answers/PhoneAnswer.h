@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "platform/base/Value.h"
+#include "server/fences/Fence.h"
 #include "server/rules/Visibility.h"
 #include "server/store/Records.h"
 
@@ -21,12 +22,15 @@ struct PhoneFriend {
 };
 
 /// Words the answer to an OwnTracks post: friends as an array of messages. A single message that the app does not
-/// expect costs it the whole array: only cards and locations go out, each checked before it is written, and never a
-/// transition. Any thread.
+/// expect costs it the whole array: only cards and locations go out, and transitions to the app that takes them, each
+/// checked before it is written. Any thread.
 class PhoneAnswer {
   public:
     /// A name as the identity under which the apps keep a friend; the apps show it before a card has come.
     static platform::Value::Array messages(const std::vector<PhoneFriend>& friends);
+    /// Who came and went, for the one app that shows it: the other makes a friend without a name of it.
+    static platform::Value::Array transitions(const std::vector<FenceEvent>& events);
+    static bool showsTransitions(const std::string& userAgent);
     /// What somebody's card says, as a short text that changes with it.
     static std::string cardHash(const std::string& name, const std::string& faceHash);
     /// Whether a phone is to be told: never before, something else, a week ago, or in the answer to this very post,

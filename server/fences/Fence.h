@@ -75,6 +75,8 @@ struct FenceEvent {
     bool arrives = false;
     std::int64_t time = 0;  ///< when it happened, seconds since 1970
     std::int64_t made = 0;  ///< when the fence was set
+    /// The time of the fix of the post that a phone was told in; 0: of none.
+    std::int64_t post = 0;
 
     bool operator==(const FenceEvent&) const = default;
 };

@@ -6,6 +6,7 @@
 #include "platform/base/Json.h"
 #include "server/http/ClientAddress.h"
 #include "server/http/ConnectionTable.h"
+#include "server/http/HttpStream.h"
 
 namespace ktr::server {
 
@@ -60,6 +61,9 @@ void HttpConnection::closeNow() {
     }
     closed_ = true;
     answering_ = false;
+    if (stream_) {
+        std::exchange(stream_, nullptr)->abandon();
+    }
     deadline_.cancel();
     pace_.cancel();
     boost::system::error_code ignored;
@@ -161,6 +165,7 @@ void HttpConnection::answerRequest(const HttpHandler& handler) {
             }
             if (isHead) {
                 answer->delivery.cutAfter = 0;
+                answer->stream.reset();
                 self->keepsAlive_ = false;
             }
             self->send(std::move(*answer));
@@ -189,9 +194,20 @@ void HttpConnection::send(HttpResponse response) {
         bytes_.reset();
         return closeNow();
     }
-    keepsAlive_ = keepsAlive_ && delivery_ == HttpDelivery();
+    keepsAlive_ = keepsAlive_ && delivery_ == HttpDelivery() && !response.stream;
     out_ = response.head(keepsAlive_);
     sent_ = 0;
+    if (response.stream) {
+        // It may go on for days: nobody waits for its end.
+        answering_ = false;
+        stream_ = std::move(response.stream);
+        out_ += response.body.empty() ? std::string() : chunk(std::exchange(response.body, {}));
+        stream_->attach([weak = weak_from_this()] {
+            if (const auto self = weak.lock()) {
+                asio::post(self->descriptor_.get_executor(), [self] { self->resumeStream(); });
+            }
+        });
+    }
     rest_ = delivery_.endless ? std::string() : std::move(response.body);
     rest_.resize(std::min(rest_.size(), delivery_.cutAfter.value_or(rest_.size())));
     if (delivery_.bytesPerSecond <= 0.0) {
@@ -218,10 +234,36 @@ void HttpConnection::sendMore() {
     if (closed_) {
         return;
     }
+    if (stream_) {
+        return sendNextOfStream();
+    }
     if (delivery_.endless || !rest_.empty()) {
         return sendNextPiece();
     }
     finishAnswer();
+}
+
+void HttpConnection::resumeStream() {
+    if (!closed_ && stream_ && sent_ == out_.size()) {
+        sendNextOfStream();
+    }
+}
+
+void HttpConnection::sendNextOfStream() {
+    std::string piece = stream_->take();
+    if (!piece.empty()) {
+        out_ = chunk(piece);
+    } else if (stream_->isFinished()) {
+        stream_.reset();
+        out_ = chunk("");
+    } else {
+        // The next bytes have their own time.
+        deadline_.cancel();
+        return;
+    }
+    sent_ = 0;
+    setDeadline(setup_->limits.answerTime);
+    sendMore();
 }
 
 void HttpConnection::sendNextPiece() {

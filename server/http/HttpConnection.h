@@ -67,6 +67,8 @@ class HttpConnection : public std::enable_shared_from_this<HttpConnection> {
     void send(HttpResponse response);
     void sendMore();
     void sendNextPiece();
+    void sendNextOfStream();
+    void resumeStream();
     void finishAnswer();
     void dropWhatComes();
     void waitFor(ByteSocket::Result what, void (HttpConnection::*then)());
@@ -94,6 +96,7 @@ class HttpConnection : public std::enable_shared_from_this<HttpConnection> {
     std::size_t sent_ = 0;     ///< of it
     std::size_t dropped_ = 0;  ///< bytes that came after the last answer
     HttpDelivery delivery_;
+    std::shared_ptr<HttpStream> stream_;  ///< of the answer that is being sent
 };
 
 }  // namespace ktr::server

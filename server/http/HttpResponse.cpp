@@ -37,7 +37,7 @@ std::string HttpResponse::head(bool keepsAlive) const {
         text += oneLine(name) + ": " + oneLine(value) + "\r\n";
     }
     // Neither has a body (RFC 9110, 15.3.5 and 15.4.5).
-    if (delivery.endless) {
+    if (delivery.endless || stream) {
         text += "Transfer-Encoding: chunked\r\n";
     } else if (status != 204 && status != 304) {
         text += "Content-Length: " + std::to_string(body.size()) + "\r\n";

@@ -1,12 +1,15 @@
 #pragma once
 
 #include <cstddef>
+#include <memory>
 #include <optional>
 #include <string>
 #include <utility>
 #include <vector>
 
 namespace ktr::server {
+
+class HttpStream;
 
 /// How an answer travels when it is to go wrong on purpose, for those who test a client.
 struct HttpDelivery {
@@ -25,6 +28,8 @@ struct HttpResponse {
     std::vector<std::pair<std::string, std::string>> headers;
     std::string body;
     HttpDelivery delivery = {};
+    /// What follows the body, bit by bit; none: nothing.
+    std::shared_ptr<HttpStream> stream = {};
 
     static HttpResponse json(int status, std::string body);
     /// Status line and headers with the empty line after them.

@@ -5,6 +5,7 @@
 
 #include "platform/base/Json.h"
 #include "server/page/DevicesPage.h"
+#include "server/page/FencesPage.h"
 #include "server/page/PageAnswer.h"
 #include "server/page/PageTexts.h"
 #include "server/page/PhonePage.h"
@@ -81,6 +82,10 @@ HttpResponse OwnPages::show(const PageRequest& request, const Reader& reader) {
     if (request.is({"delete"})) {
         return PageAnswer::html(200, SettingsPage::deleteHtml(context));
     }
+    if (request.is({"fences"})) {
+        const auto fences = store_.fencesAbout(reader.person.id);
+        return fences ? PageAnswer::html(200, FencesPage::html(context, *fences)) : notKept(context);
+    }
     if (request.is({"places"})) {
         return placesPage(reader, 200, "", nullptr);
     }
@@ -131,6 +136,11 @@ HttpResponse OwnPages::change(const PageRequest& request, const Reader& reader) 
     }
     if (request.is({"places"}) || request.is({"places", "*", "remove"})) {
         return changePlaces(request, reader);
+    }
+    if (request.is({"fences", "*", "end"})) {
+        return store_.endFence(reader.person.id, request.number(1)) == FenceOutcome::Failed
+                   ? notKept(reader.context)
+                   : PageAnswer::seeOther("/me/fences");
     }
     if (request.is({"delete"})) {
         return deleteAll(reader);

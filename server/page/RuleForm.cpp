@@ -19,6 +19,7 @@ std::pair<std::optional<Grant>, const char*> RuleForm::read(const UrlQuery& form
     grant.precision = *precision;
     grant.from = context.now;
     grant.aloud = field("aloud") == "yes";
+    grant.fences = field("fences") == "yes" && *precision == Precision::Exact;
     const WallClock clock(context.language.zone());
     if (until == "midnight") {
         grant.until = clock.endingOf("midnight", context.now);

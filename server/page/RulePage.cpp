@@ -94,18 +94,19 @@ void addEnd(PageBuilder& page, const PageContext& context, const RulePage::Data&
     page.html().close().close();
 }
 
-void addAloud(PageBuilder& page, const PageRule& rule) {
-    const PageLanguage& language = page.language();
-    Html::Attributes box{{"type", "checkbox"}, {"class", "switch"}, {"name", "aloud"},
-                         {"value", "yes"},     {"id", "aloud"},     {"aria-describedby", "aloud-hint"}};
-    if (rule.grant.aloud) {
+/// A switch of its own, with a hint below its label.
+void addSwitch(PageBuilder& page, const std::string& name, bool isOn, const std::string& label,
+               const std::string& hint) {
+    const std::string hintId = name + "-hint";
+    Html::Attributes box{{"type", "checkbox"}, {"class", "switch"}, {"name", name},
+                         {"value", "yes"},     {"id", name},        {"aria-describedby", hintId}};
+    if (isOn) {
         box.emplace_back("checked", "");
     }
     page.openCard(" apart");
     page.html().open("div", {{"class", "row"}}).open("span", {{"class", "grow"}});
-    page.html().leaf("label", {{"for", "aloud"}}, language.text("SAID_ALOUD"));
-    page.html().leaf("span", {{"class", "soft"}, {"id", "aloud-hint"}},
-                     language.text("SAID_ALOUD_WHERE", {shownName(rule.name)}));
+    page.html().leaf("label", {{"for", name}}, label);
+    page.html().leaf("span", {{"class", "soft"}, {"id", hintId}}, hint);
     page.html().close().single("input", box).close();
     page.close();
 }
@@ -139,7 +140,10 @@ std::string RulePage::html(const PageContext& context, const Data& data) {
     }
     addExactness(page, data.rule.grant.precision);
     addEnd(page, context, data);
-    addAloud(page, data.rule);
+    addSwitch(page, "aloud", data.rule.grant.aloud, language.text("SAID_ALOUD"),
+              language.text("SAID_ALOUD_WHERE", {viewer}));
+    addSwitch(page, "fences", data.rule.grant.fences, language.text("TOLD_MAY"),
+              language.text("TOLD_MAY_HINT", {language.text("EXACTLY")}));
     page.html().open("div", {{"class", "buttons"}});
     page.button(PageBuilder::Button::Main, language.text("SAVE"));
     if (!data.isNew) {

@@ -118,6 +118,7 @@ std::string SharingPage::html(const PageContext& context, const Data& data) {
     page.linkRow("/me/phone", language.text("SET_UP_PHONE"));
     page.linkRow("/me/devices", language.text("MY_DEVICES"));
     page.linkRow("/me/places", language.text("MY_PLACES"));
+    page.linkRow("/me/fences", language.text("TOLD_TITLE"));
     page.linkRow("/me/settings", language.text("MY_SETTINGS"));
     page.linkRow("/me/copy", language.text("GET_COPY"));
     page.linkRow("/me/delete", language.text("DELETE_ALL"));

@@ -56,6 +56,21 @@ void PhoneFriends::addOwn(const Device& device, const Report& report, std::int64
     friends.push_back(std::move(own));
 }
 
+std::vector<FenceEvent> PhoneFriends::eventsFor(const Device& device, const Report& report, std::int64_t now) {
+    const std::int64_t post = postOf(report);
+    // A post by which nobody knows it again would be told twice, or never.
+    if (!device.holdsEvents || post == 0) {
+        return {};
+    }
+    auto events = store_.eventsFor(device.id, 0, now, kMostEvents).value_or(std::vector<FenceEvent>());
+    const std::int64_t last = events.empty() ? 0 : events.back().number;
+    std::erase_if(events, [post](const FenceEvent& event) { return event.post != 0 && event.post != post; });
+    if (last > 0) {
+        store_.noteEvents(device.id, last, post);
+    }
+    return events;
+}
+
 std::string PhoneFriends::answer(const Device& device, const Report& report, std::int64_t now) {
     std::vector<PhoneFriend> friends;
     std::vector<std::int64_t> seen;
@@ -86,7 +101,11 @@ std::string PhoneFriends::answer(const Device& device, const Report& report, std
     if (device.shared) {
         addOwn(device, report, now, friends, told);
     }
-    std::string body = platform::writeJson(PhoneAnswer::messages(friends));
+    auto messages = PhoneAnswer::messages(friends);
+    for (platform::Value& transition : PhoneAnswer::transitions(eventsFor(device, report, now))) {
+        messages.push_back(std::move(transition));
+    }
+    std::string body = platform::writeJson(messages);
     if (report.sealed) {
         const auto box = SealedText::seal(body, device.key);
         // Nothing in the clear to a phone that seals.

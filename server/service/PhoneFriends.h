@@ -19,6 +19,7 @@ class PhoneFriends {
   public:
     /// Faces of one answer, bytes of pictures: it travels over a mobile network. Further ones come with the next.
     static constexpr std::size_t kMostFaces = std::size_t{128} << 10;
+    static constexpr int kMostEvents = 20;  ///< in one answer
 
     explicit PhoneFriends(Store& store) : store_(store) {}
 
@@ -28,6 +29,8 @@ class PhoneFriends {
 
   private:
     /// "Ann, seen by Mara, Otto".
+    /// Who came and went, of which this phone has not heard.
+    std::vector<FenceEvent> eventsFor(const Device& device, const Report& report, std::int64_t now);
     std::string titleOf(const Person& person, std::int64_t now);
     void addOwn(const Device& device, const Report& report, std::int64_t now, std::vector<PhoneFriend>& friends,
                 std::map<std::int64_t, SentCard>& told);

@@ -1,11 +1,13 @@
 #include "server/service/Service.h"
 
 #include <algorithm>
+#include <charconv>
 
 #include "documents/JsonReader.h"
 #include "platform/base/Json.h"
 #include "server/answers/CommandRequest.h"
 #include "server/answers/LocationAnswers.h"
+#include "server/answers/PhoneAnswer.h"
 #include "server/http/BasicCredentials.h"
 #include "server/ingest/Face.h"
 #include "server/ingest/FixRules.h"
@@ -43,7 +45,17 @@ Service::Service(Setup setup)
       http_(httpSetup(setup)),
       page_(std::make_unique<PeoplesPage>(PeoplesPage::Setup{
           *store_, now_, delays_,
-          [this](double seconds, std::function<void()> work) { http_.later(seconds, std::move(work)); }})) {}
+          [this](double seconds, std::function<void()> work) { http_.later(seconds, std::move(work)); }})),
+      fences_(std::make_unique<FenceCommands>(FenceCommands::Setup{
+          *store_, now_, [this](const Device& device, const Dictionary& body) { return locations(device, body); }})),
+      held_(setup.holdsAnswers ? std::make_unique<HeldAnswers>([this](double seconds, std::function<void()> work) {
+          http_.later(seconds, std::move(work));
+      })
+                               : nullptr) {
+    if (held_) {
+        listening_ = store_->listen([this](const Change& change) { held_->concerns(change); });
+    }
+}
 
 Service::~Service() {
     stop();
@@ -70,12 +82,21 @@ std::string Service::start() {
     std::string failure = http_.start();
     if (failure.empty()) {
         http_.later(0.0, [this] { sweep(); });
+        events_ = std::make_unique<EventStreams>(EventStreams::Setup{
+            *store_, now_,
+            [this](double seconds, std::function<void()> work) { http_.later(seconds, std::move(work)); }});
     }
     return failure;
 }
 
 void Service::stop(std::chrono::milliseconds grace) {
+    listening_.reset();
+    if (held_ && store_) {
+        held_->release();
+    }
     http_.stop(grace);
+    events_.reset();
+    fences_.reset();
     page_.reset();
     // Its last commits still answer through the edge; and the store may be somebody else's, too.
     if (store_) {
@@ -119,6 +140,9 @@ void Service::route(const HttpRequest& request, const HttpReply& reply) {
     if ((posts || reads) && request.path == "/") {
         return takeParameters(request, reply);
     }
+    if (reads && request.path == std::string(kCommands) + "events") {
+        return openEvents(request, reply);
+    }
     if (posts && request.path.rfind(kCommands, 0) == 0) {
         return answerCommand(request, reply);
     }
@@ -132,7 +156,15 @@ void Service::answerOperator(const HttpRequest& request, const HttpReply& reply)
     }
     HttpResponse response;
     response.headers.emplace_back("Content-Type", "text/plain; version=0.0.4");
+    const auto number = [](const char* name, const char* type, std::uint64_t value) {
+        const std::string whole = std::string("ktr_service_") + name;
+        return "# TYPE " + whole + " " + type + "\n" + whole + " " + std::to_string(value) + "\n";
+    };
     response.body = counters_.text() + traffic_.text() + http_.numbers() +
+                    number("dropped_events_total", "counter", store_->droppedEvents()) +
+                    number("slow_readers_total", "counter", events_->slowReaders()) +
+                    number("event_streams", "gauge", events_->size()) +
+                    number("held_answers", "gauge", held_ ? held_->size() : 0) +
                     "# TYPE ktr_service_store_ok gauge\nktr_service_store_ok " + (storeIsWell_ ? "1" : "0") + "\n";
     reply.send(response);
 }
@@ -193,6 +225,10 @@ void Service::takeOwnTracks(const HttpRequest& request, const HttpReply& reply) 
         return;
     }
     const Report report = PhoneMessages::ownTracks(request.body, device->key);
+    if (const bool holds = PhoneAnswer::showsTransitions(request.headerText("User-Agent"));
+        holds != device->holdsEvents) {
+        store_->noteHoldsEvents(device->id, holds);
+    }
     // Written before the rest of the post, so that its fate is known when the rest is on the disk.
     const auto faceKept = std::make_shared<bool>(true);
     if (const auto face = cleanedFace(report)) {
@@ -270,32 +306,65 @@ void Service::answerCommand(const HttpRequest& request, const HttpReply& reply) 
     }
     const std::string command = request.path.substr(std::string(kCommands).size());
     if (command == "getlocations") {
-        reply.send(locations(*device, *value->dictionary()));
+        answerLocations(*device, *value->dictionary(), reply);
     } else if (command == "showHideLocation") {
         changeSharing(*device, *value->dictionary(), reply);
-    } else {
+    } else if (!fences_->answer(command, *device, *value->dictionary(), reply)) {
         reply.send(refusal(404, "there is no such path"));
     }
+}
+
+void Service::openEvents(const HttpRequest& request, const HttpReply& reply) {
+    const auto device = authenticated(request, "", DeviceKind::Reader, reply);
+    if (!device) {
+        return;
+    }
+    const std::string last = request.headerText("Last-Event-ID");
+    std::int64_t number = 0;
+    const auto [end, error] = std::from_chars(last.data(), last.data() + last.size(), number);
+    if (!last.empty() && (error != std::errc() || end != last.data() + last.size() || number < 0)) {
+        return reply.send(refusal(400, "expected digits as the Last-Event-ID"));
+    }
+    reply.send(events_->open(*device, number));
+}
+
+void Service::answerLocations(const Device& device, const Dictionary& body, const HttpReply& reply) {
+    std::string complaint;
+    const auto request = LocationsRequest::read(body, complaint);
+    if (!request) {
+        return reply.send(refusal(400, complaint));
+    }
+    if (!held_) {
+        return reply.send(locationsNow(device, *request).response());
+    }
+    std::string client = std::to_string(device.id) + '\n' + request->clientId.value_or("");
+    for (const std::string& handle : request->handles) {
+        client += '\n' + handle;
+    }
+    held_->give(
+        client, [this, device, asked = *request] { return locationsNow(device, asked); }, reply);
 }
 
 HttpResponse Service::locations(const Device& device, const Dictionary& body) {
     std::string complaint;
     const auto request = LocationsRequest::read(body, complaint);
-    if (!request) {
-        return refusal(400, complaint);
-    }
+    return request ? locationsNow(device, *request).response() : refusal(400, complaint);
+}
+
+HeldAnswers::Answer Service::locationsNow(const Device& device, const LocationsRequest& request) {
     const std::int64_t now = now_();
     store_->present(now);
-    std::vector<std::string> lookedUp = request->handles;
+    std::vector<std::string> lookedUp = request.handles;
     lookedUp.resize(std::min(lookedUp.size(), LocationAnswers::kMostHandles));
     const auto people = store_->asked(device.person, lookedUp, now);
     if (!people) {
         ++counters_.storeFailures;
-        return refusal(503, "the store cannot be read");
+        return {"", {}, [] { return refusal(503, "the store cannot be read"); }};
     }
+    HeldAnswers::Answer answer{"", {device.person}, {}};
     std::vector<AskedFriend> asked;
     std::vector<std::int64_t> seen;
-    for (const std::string& handle : request->handles) {
+    for (const std::string& handle : request.handles) {
         asked.push_back({handle, 0, std::nullopt});
         if (asked.size() > people->size()) {
             continue;
@@ -303,14 +372,22 @@ HttpResponse Service::locations(const Device& device, const Dictionary& body) {
         const Asked& one = (*people)[asked.size() - 1];
         asked.back().person = one.person;
         asked.back().seen = Visibility::visible(one.sharing, now);
+        if (one.person != 0) {
+            answer.people.insert(one.person);
+        }
         if (asked.back().seen) {
             seen.push_back(one.person);
         }
+        answer.said += LocationAnswers::said(asked.back()) + '\n';
     }
-    if (!seen.empty()) {
-        store_->noteLooks(device.person, seen, true, now, nullptr);
-    }
-    return HttpResponse::json(200, platform::writeJson(LocationAnswers::locations(*request, std::move(asked))));
+    answer.response = [this, device, request, now, asked = std::move(asked), seen = std::move(seen)] {
+        if (!seen.empty()) {
+            store_->noteLooks(device.person, seen, true, now, nullptr);
+        }
+        const double interval = held_ ? HeldAnswers::kAskAgain : LocationAnswers::kInterval;
+        return HttpResponse::json(200, platform::writeJson(LocationAnswers::locations(request, asked, interval)));
+    };
+    return answer;
 }
 
 void Service::changeSharing(const Device& device, const Dictionary& body, const HttpReply& reply) {

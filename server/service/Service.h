@@ -9,10 +9,14 @@
 #include <vector>
 
 #include "platform/base/Value.h"
+#include "server/answers/CommandRequest.h"
 #include "server/http/HttpServer.h"
 #include "server/ingest/Report.h"
+#include "server/outbox/EventStreams.h"
 #include "server/page/PeoplesPage.h"
 #include "server/service/FailureDelays.h"
+#include "server/service/FenceCommands.h"
+#include "server/service/HeldAnswers.h"
 #include "server/service/ServiceCounters.h"
 #include "server/service/ServiceLog.h"
 #include "server/service/Traffic.h"
@@ -34,6 +38,8 @@ class Service {
         /// Called about once a second, for as long as requests can be answered and the store answers; may be empty.
         std::function<void()> alive = {};
         std::shared_ptr<ServiceLog> log = {};  ///< none: nothing is written
+        /// A client that asks the same again waits until it would hear something else; else it asks every five seconds.
+        bool holdsAnswers = false;
         /// Sees each request before the service does, and answers it or hands it on: for a service whose answers go
         /// wrong on purpose. On the edge's threads; none: nobody does.
         std::function<void(HttpRequest, HttpReply, const HttpHandler& service)> around = {};
@@ -73,7 +79,10 @@ class Service {
     /// The face that a report brings, if it is one; counts what is none.
     std::optional<std::string> cleanedFace(const Report& report);
     void answerCommand(const HttpRequest& request, const HttpReply& reply);
+    void answerLocations(const Device& device, const platform::Dictionary& body, const HttpReply& reply);
+    void openEvents(const HttpRequest& request, const HttpReply& reply);
     HttpResponse locations(const Device& device, const platform::Dictionary& body);
+    HeldAnswers::Answer locationsNow(const Device& device, const LocationsRequest& request);
     void changeSharing(const Device& device, const platform::Dictionary& body, const HttpReply& reply);
     void sweep();
 
@@ -88,6 +97,10 @@ class Service {
     std::shared_ptr<Store> store_;
     HttpServer http_;
     std::unique_ptr<PeoplesPage> page_;
+    std::unique_ptr<FenceCommands> fences_;
+    std::unique_ptr<EventStreams> events_;
+    std::unique_ptr<HeldAnswers> held_;  ///< none: no answer is held
+    std::shared_ptr<void> listening_;
 };
 
 }  // namespace ktr::server

@@ -10,15 +10,19 @@ namespace {
 
 using Word = ServiceLog::Word;
 
-constexpr std::array<Word, Traffic::kRoutes> kNames{Word("phone"),    Word("tracker"), Word("getlocations"),
-                                                    Word("showhide"), Word("health"),  Word("metrics"),
-                                                    Word("page"),     Word("other")};
+constexpr std::array<Word, Traffic::kRoutes> kNames{
+    Word("phone"),   Word("tracker"), Word("getlocations"), Word("showhide"), Word("health"),
+    Word("metrics"), Word("page"),    Word("fences"),       Word("events"),   Word("other")};
 
 constexpr std::pair<std::string_view, Traffic::Route> kPaths[] = {
     {"/pub", Traffic::Route::Phone},
     {"/", Traffic::Route::Tracker},
     {"/qloxservice/friends/va/getlocations", Traffic::Route::GetLocations},
     {"/qloxservice/friends/va/showHideLocation", Traffic::Route::ShowHideLocation},
+    {"/qloxservice/friends/va/setFence", Traffic::Route::Fences},
+    {"/qloxservice/friends/va/fences", Traffic::Route::Fences},
+    {"/qloxservice/friends/va/endFence", Traffic::Route::Fences},
+    {"/qloxservice/friends/va/events", Traffic::Route::Events},
     {"/health", Traffic::Route::Health},
     {"/metrics", Traffic::Route::Metrics},
 };

@@ -18,8 +18,8 @@ namespace ktr::server {
 class Traffic {
   public:
     /// What a request is for.
-    enum class Route { Phone, Tracker, GetLocations, ShowHideLocation, Health, Metrics, Page, Other };
-    static constexpr std::size_t kRoutes = 8;
+    enum class Route { Phone, Tracker, GetLocations, ShowHideLocation, Health, Metrics, Page, Fences, Events, Other };
+    static constexpr std::size_t kRoutes = 10;
     static Route routeOf(const HttpRequest& request);
 
     /// Failures are written to the log, when there is one.

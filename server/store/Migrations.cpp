@@ -87,7 +87,6 @@ CREATE INDEX card_owner ON card (owner);
 ALTER TABLE share ADD COLUMN fences {integer} NOT NULL DEFAULT 0;
 ALTER TABLE device ADD COLUMN events {integer} NOT NULL DEFAULT 0;
 ALTER TABLE device ADD COLUMN holds_events {integer} NOT NULL DEFAULT 0;
-ALTER TABLE device ADD COLUMN url {text} NOT NULL DEFAULT '';
 CREATE TABLE fence (
     id {integer} NOT NULL PRIMARY KEY, watcher {integer} NOT NULL REFERENCES person ON DELETE CASCADE,
     subject {integer} NOT NULL REFERENCES person ON DELETE CASCADE, name {text} NOT NULL, label {text} NOT NULL,
@@ -103,7 +102,6 @@ CREATE TABLE outbox (
     subject {integer} NOT NULL REFERENCES person ON DELETE CASCADE, name {text} NOT NULL, label {text} NOT NULL,
     latitude {real} NOT NULL, longitude {real} NOT NULL, radius {real} NOT NULL, arrives {integer} NOT NULL,
     time {integer} NOT NULL, made {integer} NOT NULL, until {integer} NOT NULL, post {integer} NOT NULL DEFAULT 0,
-    claimed {integer} NOT NULL DEFAULT 0, tries {integer} NOT NULL DEFAULT 0,
     PRIMARY KEY (device, number)) {strict by key};
 CREATE INDEX outbox_subject ON outbox (subject, watcher);
 CREATE INDEX outbox_watcher ON outbox (watcher);

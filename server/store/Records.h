@@ -45,6 +45,7 @@ struct Device {
     std::int64_t retention = 0;  ///< how long the person's fixes are kept, seconds
     std::string key;             ///< with which the phone seals its messages; empty: it does not
     bool shared = false;         ///< it is a child's, or several people's: it says itself by whom they are seen
+    bool holdsEvents = false;    ///< a phone: its app shows who came and went
 };
 
 /// What a handle stands for, to somebody who asks for it. A value.

@@ -187,8 +187,15 @@ class Store {
     /// not be read.
     std::optional<std::vector<FenceEvent>> eventsFor(std::int64_t device, std::int64_t after, std::int64_t now,
                                                      int most);
+    /// Whether its secret is good: not revoked, nor waiting for its person's word. None: the store could not be read.
+    std::optional<bool> isInUse(std::int64_t device);
     /// A device has heard of everything up to this number.
     void acknowledgeEvents(std::int64_t device, std::int64_t number, Done done);
+    /// Whether a phone's app shows who came and went.
+    void noteHoldsEvents(std::int64_t device, bool holds);
+    /// A phone is told of everything up to this number in the answer to a post; of what it was told in answers to
+    /// others it has heard.
+    void noteEvents(std::int64_t device, std::int64_t number, std::int64_t post);
     /// What nobody heard of in time is deleted and counted here: events that were dropped, in this process.
     std::uint64_t droppedEvents() const { return droppedEvents_; }
 

@@ -7,7 +7,7 @@ namespace ktr::server {
 
 namespace {
 
-/// Which of a person's devices can be told: readers, hooks, and phones whose app takes it.
+/// Which of a person's devices can be told: readers, and phones whose app takes it.
 constexpr const char* kCountUp =
     "UPDATE device SET events = events + 1 WHERE person = $1 AND revoked IS NULL AND suspended = 0 "
     "AND (kind <> 0 OR holds_events = 1)";
@@ -44,7 +44,7 @@ std::optional<std::vector<FenceEvent>> Store::eventsFor(std::int64_t device, std
         "SELECT number, person.name, "
         "coalesce((SELECT shown FROM handle WHERE handle.person = subject ORDER BY place LIMIT 1), ''), outbox.name, "
         "label, latitude, longitude, radius, arrives, time, outbox.made, outbox.until, (SELECT latest FROM clock), "
-        "exactness, since, share.until, arrival, aloud, confirmed, fences "
+        "exactness, since, share.until, arrival, aloud, confirmed, fences, post "
         "FROM outbox JOIN device ON device.id = outbox.device JOIN person ON person.id = subject "
         "JOIN share ON share.owner = subject AND share.viewer = watcher "
         "WHERE outbox.device = $1 AND number > $2 AND outbox.until > $3 AND hidden = 0 AND revoked IS NULL "
@@ -65,9 +65,17 @@ std::optional<std::vector<FenceEvent>> Store::eventsFor(std::int64_t device, std
         event.arrives = row.integer(8) != 0;
         event.time = row.integer(9);
         event.made = row.integer(10);
+        event.post = row.integer(20);
         events.push_back(std::move(event));
     }
     return reading->failed() ? std::nullopt : std::optional(std::move(events));
+}
+
+std::optional<bool> Store::isInUse(std::int64_t device) {
+    const Reading reading(*this);
+    auto row = reading->statement("SELECT id FROM device WHERE id = $1 AND revoked IS NULL AND suspended = 0");
+    const bool isThere = row.bind(device).next();
+    return reading->failed() ? std::nullopt : std::optional(isThere);
 }
 
 void Store::acknowledgeEvents(std::int64_t device, std::int64_t number, Done done) {
@@ -76,6 +84,34 @@ void Store::acknowledgeEvents(std::int64_t device, std::int64_t number, Done don
             database.statement("DELETE FROM outbox WHERE device = $1 AND number <= $2").bind(device).bind(number).run();
         },
         std::move(done));
+}
+
+void Store::noteHoldsEvents(std::int64_t device, bool holds) {
+    write(
+        [=](Database& database) {
+            database.statement("UPDATE device SET holds_events = $2 WHERE id = $1")
+                .bind(device)
+                .bind(std::int64_t{holds})
+                .run();
+        },
+        nullptr);
+}
+
+void Store::noteEvents(std::int64_t device, std::int64_t number, std::int64_t post) {
+    write(
+        [=](Database& database) {
+            // It posts something else now: it has got the answer to what it posted before.
+            database.statement("DELETE FROM outbox WHERE device = $1 AND post <> 0 AND post <> $2")
+                .bind(device)
+                .bind(post)
+                .run();
+            database.statement("UPDATE outbox SET post = $3 WHERE device = $1 AND number <= $2")
+                .bind(device)
+                .bind(number)
+                .bind(post)
+                .run();
+        },
+        nullptr);
 }
 
 void Store::dropLateEvents(Database& database, std::int64_t now) {

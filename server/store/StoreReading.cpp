@@ -37,7 +37,8 @@ std::string Store::normalisedHandle(std::string_view handle) {
 std::optional<Device> Store::deviceOf(std::string_view secret, bool& failed) {
     const Reading reading(*this);
     auto row = reading->statement(
-        "SELECT device.id, kind, device.person, name, hidden, retention, key, shared FROM device JOIN person ON "
+        "SELECT device.id, kind, device.person, name, hidden, retention, key, shared, holds_events FROM device JOIN "
+        "person ON "
         "person.id = device.person "
         "WHERE secret = $1 AND revoked IS NULL AND suspended = 0");
     if (!row.bindBytes(Secret::hash(secret)).next()) {
@@ -47,7 +48,8 @@ std::optional<Device> Store::deviceOf(std::string_view secret, bool& failed) {
     return Device{row.integer(0),      static_cast<DeviceKind>(row.integer(1)),
                   row.integer(2),      row.text(3),
                   row.integer(4) != 0, row.integer(5),
-                  row.text(6),         row.integer(7) != 0};
+                  row.text(6),         row.integer(7) != 0,
+                  row.integer(8) != 0};
 }
 
 std::optional<std::int64_t> Store::personOf(std::string_view handle) {

@@ -17,7 +17,7 @@ constexpr std::array kTables = {
     StoreTable{"face", true, {"person"}, {"hash"}},
     StoreTable{"card", false, {"owner"}, {"hash"}},
     StoreTable{"fence", false, {"subject", "watcher"}, {}},
-    StoreTable{"outbox", false, {"subject", "watcher"}, {"claimed"}},
+    StoreTable{"outbox", false, {"subject", "watcher"}, {}},
     StoreTable{"clock", true, {}, {}},
     StoreTable{"forgotten", true, {}, {}},
 };

@@ -1,0 +1,46 @@
+#pragma once
+
+#include <QDBusConnection>
+#include <QObject>
+#include <QString>
+#include <QVariantMap>
+#include <functional>
+#include <map>
+#include <string>
+
+namespace ktr::linux_ {
+
+/// Shows notifications on the desktop: by its portal (org.freedesktop.portal.Notification), which shows one of a tag
+/// once however often it is told, and where there is none by the notification server (org.freedesktop.Notifications,
+/// https://specifications.freedesktop.org/notification-spec). Nothing waits. Main thread.
+class DesktopNotifier : public QObject {
+    Q_OBJECT
+
+  public:
+    struct Notification {
+        std::string tag;  ///< tells it from others; letters, digits and hyphens
+        std::string title;
+        std::string body;  ///< plain text
+    };
+    using Done = std::function<void(bool shown)>;
+
+    /// The bus: the session's, but for tests. `clicked` gets the tag of a notification that somebody opened.
+    explicit DesktopNotifier(QDBusConnection bus, std::function<void(std::string tag)> clicked);
+    ~DesktopNotifier() override;
+
+    void show(const Notification& notification, Done done);
+
+  private Q_SLOTS:
+    void portalActivated(const QString& tag, const QString& action, const QVariantList& parameter);
+    void serverActivated(uint number, const QString& action);
+    void serverClosed(uint number, uint reason);
+
+  private:
+    void askServer(const Notification& notification, const Done& done);
+
+    QDBusConnection bus_;
+    const std::function<void(std::string tag)> clicked_;
+    std::map<uint, std::string> shown_;  ///< by the server
+};
+
+}  // namespace ktr::linux_
