@@ -1,8 +1,6 @@
 #pragma once
 
 #include <cstdint>
-#include <functional>
-#include <optional>
 
 #include "server/ingest/Fix.h"
 
@@ -21,8 +19,5 @@ struct FixRange {
 };
 
 enum class FixEdge { First, Last };
-
-/// Gives the first or the last fix, by time, of those in a range; none: none is in it.
-using FixSource = std::function<std::optional<Fix>(const FixRange&, FixEdge)>;
 
 }  // namespace ktr::server

@@ -50,10 +50,8 @@ class Visibility {
     /// by the same grid of time (5 minutes) and the same two slots, and outside of such places nothing is seen.
     static std::optional<Seen> visible(const Sharing& sharing, std::int64_t now);
 
-    /// Of a person's fixes those by which `visible` decides at that time, by ascending time: with them alone it says
-    /// the same. Below exact precision that is the last of each slot, back to where one stayed for two; not days of
-    /// fixes. The sharing's own fixes are not used.
-    static std::vector<Fix> needed(const Sharing& sharing, std::int64_t now, const FixSource& source);
+    /// Which fixes `visible` counts by a sharing's grant, which it has.
+    static FixRange usable(const Sharing& sharing, std::int64_t now);
 
     /// Whether there is a grant that has begun and is not over, of somebody who does not hide: what `visible` begins
     /// with.
@@ -63,6 +61,8 @@ class Visibility {
     static double cellSide(Precision precision);
     /// Seconds; 1 for exact.
     static std::int64_t slotLength(Precision precision);
+    /// Which slot of such a length a time lies in.
+    static std::int64_t slotOf(std::int64_t time, std::int64_t length);
 };
 
 }  // namespace ktr::server

@@ -165,6 +165,7 @@ void Service::answerOperator(const HttpRequest& request, const HttpReply& reply)
                     number("slow_readers_total", "counter", events_->slowReaders()) +
                     number("event_streams", "gauge", events_->size()) +
                     number("held_answers", "gauge", held_ ? held_->size() : 0) +
+                    number("fixes_read_total", "counter", store_->fixesRead()) +
                     "# TYPE ktr_service_store_ok gauge\nktr_service_store_ok " + (storeIsWell_ ? "1" : "0") + "\n";
     reply.send(response);
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <deque>
 #include <memory>
 #include <optional>
 #include <string>
@@ -55,6 +56,10 @@ class Database {
         /// Runs it to its end; false when that failed. In a transaction the failure may be known later only: with the
         /// next row that is read, `changes`, or `commit`.
         bool run();
+        // For `fetch`.
+        const char* sql() const { return sql_; }
+        const std::vector<DatabaseValue>& values() const { return values_; }
+        void give(std::unique_ptr<Rows> rows) { rows_ = std::move(rows); }
 
         std::int64_t integer(int column) const { return value(column).integer; }
         double real(int column) const { return value(column).real; }
@@ -78,6 +83,9 @@ class Database {
 
     /// `sql` outlives the run.
     Run statement(const char* sql) { return Run(sql, *this); }
+    /// Before several statements that only read are read one after the other, each to its end or destroyed before the
+    /// next: a server is asked all of them at once, and answers at once. Where nothing is far away nothing happens.
+    virtual void fetch(std::deque<Run>& runs) = 0;
     /// Several statements without values; false when one failed.
     virtual bool execute(const std::string& sql) = 0;
 

@@ -70,7 +70,7 @@ ALTER TABLE person ADD COLUMN looks_retention {integer} NOT NULL DEFAULT 2592000
 ALTER TABLE device ADD COLUMN suspended {integer} NOT NULL DEFAULT 0;
 CREATE TABLE forgotten (hash {bytes} NOT NULL PRIMARY KEY, made {integer} NOT NULL) {strict by key};
 )",
-    // 5: faces; which card each phone was told last of each friend (device.cards_sent, one for all, is read no more).
+    // 5: faces; which card each phone was told last of each friend.
     R"(
 CREATE TABLE face (
     person {integer} NOT NULL PRIMARY KEY REFERENCES person ON DELETE CASCADE, picture {bytes} NOT NULL,
@@ -106,6 +106,11 @@ CREATE TABLE outbox (
 CREATE INDEX outbox_subject ON outbox (subject, watcher);
 CREATE INDEX outbox_watcher ON outbox (watcher);
 CREATE INDEX outbox_until ON outbox (until);
+)",
+    // 7: when a fix was last heard that belongs to an earlier slot; what is read no more goes.
+    R"(
+ALTER TABLE person ADD COLUMN heard_late {integer} NOT NULL DEFAULT 0;
+ALTER TABLE device DROP COLUMN cards_sent;
 )",
 };
 

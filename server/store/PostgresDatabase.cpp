@@ -254,7 +254,7 @@ void PostgresDatabase::send(const char* sql, const std::vector<DatabaseValue>& v
     sent_.push_back(nullptr);
 }
 
-PostgresDatabase::Result PostgresDatabase::drain() {
+PostgresDatabase::Result PostgresDatabase::drain(const Each& each) {
     Result last;
     if (!sent_.empty()) {
         ::PQsendFlushRequest(connection_);
@@ -273,17 +273,20 @@ PostgresDatabase::Result PostgresDatabase::drain() {
             break;
         }
         const Result none(::PQgetResult(connection_));
+        if (preparing == nullptr && each) {
+            each(std::move(last));
+        }
     }
     return last;
 }
 
-void PostgresDatabase::endPipeline() {
+void PostgresDatabase::endPipeline(const Each& each) {
     if (!inPipeline_) {
         return;
     }
     inPipeline_ = false;
     const bool isSynced = ::PQpipelineSync(connection_) == 1;
-    drain();
+    drain(each);
     if (isSynced && isConnected()) {
         finish(::PQgetResult(connection_));
     }
@@ -306,6 +309,33 @@ std::unique_ptr<Database::Rows> PostgresDatabase::query(const char* sql, const s
         }
     }
     return result && !failed() ? std::make_unique<Table>(std::move(result)) : nullptr;
+}
+
+void PostgresDatabase::fetchOnce(std::deque<Run>& runs) {
+    for (const Run& run : runs) {
+        send(run.sql(), run.values());
+    }
+    auto next = runs.begin();
+    const Each give = [&](Result result) { (next++)->give(std::make_unique<Table>(std::move(result))); };
+    if (inTransaction_) {
+        drain(give);
+    } else {
+        endPipeline(give);
+    }
+}
+
+void PostgresDatabase::fetch(std::deque<Run>& runs) {
+    if (failed() || runs.empty()) {
+        return;
+    }
+    fetchOnce(runs);
+    if (failed() && !isConnected() && !inTransaction_) {
+        // As of a single one: a question can be asked twice.
+        refresh();
+        if (!failed()) {
+            fetchOnce(runs);
+        }
+    }
 }
 
 void PostgresDatabase::perform(const char* sql, const std::vector<DatabaseValue>& values) {

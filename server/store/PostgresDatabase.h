@@ -3,6 +3,7 @@
 #include <chrono>
 #include <cstdint>
 #include <deque>
+#include <functional>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -26,6 +27,7 @@ class PostgresDatabase final : public Database {
     static std::unique_ptr<PostgresDatabase> open(const std::string& address, std::string& complaint);
     ~PostgresDatabase() override;
 
+    void fetch(std::deque<Run>& runs) override;
     bool execute(const std::string& sql) override;
     bool begin() override;
     bool beginReading() override;
@@ -70,10 +72,12 @@ class PostgresDatabase final : public Database {
     Result finish(pg_result* result);
     Prepared& prepared(const char* sql);
     void send(const char* sql, const std::vector<DatabaseValue>& values);
-    /// Reads what the server says of everything that was sent; the last one's result.
-    Result drain();
+    /// Reads what the server says of everything that was sent; the last one's result. `each` gets those of runs.
+    using Each = std::function<void(Result)>;
+    Result drain(const Each& each = nullptr);
     /// Leaves the state in which statements are sent without waiting.
-    void endPipeline();
+    void endPipeline(const Each& each = nullptr);
+    void fetchOnce(std::deque<Run>& runs);
     Result ask(const char* sql, const std::vector<DatabaseValue>& values);
 
     pg_conn* connection_;

@@ -24,6 +24,7 @@ class SqliteDatabase final : public Database {
     static std::unique_ptr<SqliteDatabase> openInMemory(const std::string& name, std::string& complaint);
     ~SqliteDatabase() override;
 
+    void fetch(std::deque<Run>&) override {}
     bool execute(const std::string& sql) override;
     bool begin() override;
     bool beginReading() override;

@@ -85,8 +85,8 @@ std::shared_ptr<void> Store::listen(Changes::Listener listener) {
     if (StoreAddress::isServer(address_.text)) {
         const std::lock_guard<std::mutex> lock(hearingMutex_);
         if (!hearing_) {
-            hearing_ = std::make_unique<PostgresHearing>(address_.text, self_,
-                                                         [this](const Change& change) { changes_.tell(change); });
+            hearing_ =
+                std::make_unique<PostgresHearing>(address_.text, self_, [this](const Change& change) { hear(change); });
         }
     } else {
         // From now on the writing thread wakes up by itself.
@@ -97,10 +97,17 @@ std::shared_ptr<void> Store::listen(Changes::Listener listener) {
 }
 
 void Store::lookAfterOthers() {
-    if (changes_.isListenedTo() && writing_->othersWrote()) {
-        changes_.tell({true, {}});
+    if (writing_->othersWrote()) {
+        hear({true, {}});
     }
     writing_->clear();
+}
+
+void Store::hear(const Change& change) {
+    if (change.everything) {
+        forgetRests();
+    }
+    changes_.tell(change);
 }
 
 void Store::announceMoves() {
@@ -178,7 +185,7 @@ Store::Outcome Store::commit(std::deque<Work>::const_iterator begin, std::deque<
         toAnnounce_.add(moved_);
         changed_.add(moved_);
         if (!changed_.isNothing()) {
-            changes_.tell(changed_);
+            hear(changed_);
         }
         return Outcome::Kept;
     }

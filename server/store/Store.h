@@ -19,6 +19,7 @@
 #include "platform/base/Value.h"
 #include "server/fences/Fence.h"
 #include "server/ingest/Fix.h"
+#include "server/rules/FixWalk.h"
 #include "server/store/Changes.h"
 #include "server/store/Database.h"
 #include "server/store/Records.h"
@@ -73,6 +74,8 @@ class Store {
     /// How many reads have failed. What is put together of several reads that each say "none" is true if this is the
     /// same before and after.
     std::uint64_t readFailures() const { return readFailures_; }
+    /// How many fixes have been read to say where people are.
+    std::uint64_t fixesRead() const { return fixesRead_; }
     /// Whose secret this is, if it is not revoked. None with `failed` set: the store could not be read.
     std::optional<Device> deviceOf(std::string_view secret, bool& failed);
     /// Who has this handle: e-mail addresses in any case, phone numbers by their digits and "+".
@@ -243,6 +246,8 @@ class Store {
     void moves(std::int64_t person) { moved_.people.insert(person); }
     void announceMoves();
     void lookAfterOthers();
+    /// What others wrote, or all of it.
+    void hear(const Change& change);
     /// Waits until something is to be written, or it is time to look after others. False: it is over.
     bool waitForWork(std::deque<Work>& batch);
     Outcome commit(std::deque<Work>::const_iterator begin, std::deque<Work>::const_iterator end);
@@ -251,6 +256,8 @@ class Store {
     /// Of seven columns: exactness, since, until, arrival, aloud, confirmed, fences.
     static Grant grantOf(const Database::Run& row, int firstColumn);
     static std::optional<Grant> readGrant(Database& database, std::int64_t owner, std::int64_t viewer);
+    static void askPlaces(std::deque<Database::Run>& runs, Database& database, std::int64_t owner);
+    static std::vector<NamedPlace> placesIn(Database::Run& row);
     static std::vector<NamedPlace> readPlaces(Database& database, std::int64_t owner);
     /// Hides somebody, and takes back what their devices asked.
     void hideIn(Database& database, std::int64_t person);
@@ -270,13 +277,22 @@ class Store {
     FenceOutcome setFenceIn(Database& database, const FenceWish& wish, std::int64_t now, Fence& fence);
     /// What else decides what is seen by a grant: fixes, and places where they may be said.
     static void deleteOldOf(Database& database, std::int64_t person, const Retention& retention, std::int64_t now);
-    /// `now`: reads of the fixes what is needed then; none: all.
-    void readSight(Database& database, std::int64_t owner, std::optional<std::int64_t> now, Sharing& sharing);
-    static std::optional<Fix> readEdge(Database& database, std::int64_t owner, const FixRange& range, FixEdge edge);
+    static void readAll(Database& database, std::int64_t owner, Sharing& sharing);
+    /// Somebody of whom it is to be read what is needed of their fixes.
+    struct Sight {
+        std::int64_t owner;
+        std::int64_t heardLate;  ///< see FixWalk
+        Sharing* sharing;
+    };
+    void readSights(Database& database, const std::vector<Sight>& sights, std::int64_t now);
+    LastRest knownRest(const Sight& sight);
+    void keepRest(const Sight& sight, const LastRest& rest);
+    void forgetRests();
     static void endBrowsersIn(Database& database, std::int64_t person);
 
     std::atomic<std::uint64_t> readFailures_ = 0;
     std::atomic<std::uint64_t> droppedEvents_ = 0;
+    std::atomic<std::uint64_t> fixesRead_ = 0;
     std::mutex readMutex_;
     std::unique_ptr<Database> reading_;
     std::unique_ptr<Database> writing_;
@@ -295,6 +311,9 @@ class Store {
     const StoreAddress address_;
     const std::string self_;  ///< who this is to other processes
     Changes changes_;
+    // Where people rested last, as coarse viewers see it: what `FixWalk` finds out is not read again.
+    std::mutex restMutex_;
+    std::map<std::pair<std::int64_t, Precision>, LastRest> rests_;
     std::mutex hearingMutex_;
     std::unique_ptr<PostgresHearing> hearing_;  ///< from the first that listens on, where others announce
     std::thread thread_;

@@ -92,15 +92,25 @@ std::vector<NamedPlace> Store::placesOf(std::int64_t owner) {
     return readPlaces(*reading, owner);
 }
 
-std::vector<NamedPlace> Store::readPlaces(Database& database, std::int64_t owner) {
+void Store::askPlaces(std::deque<Database::Run>& runs, Database& database, std::int64_t owner) {
+    runs.emplace_back(
+            "SELECT id, name, label, latitude, longitude, radius, said FROM place WHERE owner = $1 ORDER BY name",
+            database)
+        .bind(owner);
+}
+
+std::vector<NamedPlace> Store::placesIn(Database::Run& row) {
     std::vector<NamedPlace> places;
-    auto row = database.statement(
-        "SELECT id, name, label, latitude, longitude, radius, said FROM place WHERE owner = $1 ORDER BY name");
-    row.bind(owner);
     while (row.next()) {
         places.push_back(placeOf(row, 0));
     }
     return places;
+}
+
+std::vector<NamedPlace> Store::readPlaces(Database& database, std::int64_t owner) {
+    std::deque<Database::Run> runs;
+    askPlaces(runs, database, owner);
+    return placesIn(runs.front());
 }
 
 void Store::endOnArrival(Database& database, std::int64_t owner, const std::vector<Fix>& fixes, std::int64_t now) {

@@ -1,5 +1,6 @@
 // The part of the store that only reads: beside what is written.
 #include <algorithm>
+#include <iterator>
 
 #include "platform/base/Utf8.h"
 #include "server/store/Secret.h"
@@ -8,11 +9,6 @@
 namespace ktr::server {
 
 namespace {
-
-/// Five columns: time, heard, latitude, longitude, accuracy.
-Fix fixOf(const Database::Run& row) {
-    return {row.integer(0), row.integer(1), row.real(2), row.real(3), row.maybeReal(4)};
-}
 
 /// Whether a database takes it: nobody has a name or a handle that it would not.
 bool isText(std::string_view text) {
@@ -121,36 +117,19 @@ Sharing Store::sharingOf(Database::Run& row, int firstColumn) {
     return sharing;
 }
 
-void Store::readSight(Database& database, std::int64_t owner, std::optional<std::int64_t> now, Sharing& sharing) {
-    // Of an ended grant nothing is read: it takes no longer than that of a stranger.
+void Store::readAll(Database& database, std::int64_t owner, Sharing& sharing) {
     if (!sharing.grant || sharing.hidden || sharing.latest >= sharing.grant->end()) {
         return;
     }
     if (Visibility::cellSide(sharing.grant->precision) == 0.0) {
         sharing.places = readPlaces(database, owner);
     }
-    if (now) {
-        sharing.fixes = Visibility::needed(
-            sharing, *now, [&](const FixRange& range, FixEdge edge) { return readEdge(database, owner, range, edge); });
-        return;
-    }
     auto row = database.statement(
         "SELECT time, heard, latitude, longitude, accuracy FROM fix WHERE person = $1 AND time >= $2 ORDER BY time");
     row.bind(owner).bind(std::max(sharing.grant->from, sharing.shownSince));
     while (row.next()) {
-        sharing.fixes.push_back(fixOf(row));
+        sharing.fixes.push_back({row.integer(0), row.integer(1), row.real(2), row.real(3), row.maybeReal(4)});
     }
-}
-
-std::optional<Fix> Store::readEdge(Database& database, std::int64_t owner, const FixRange& range, FixEdge edge) {
-    auto row = database.statement(
-        edge == FixEdge::Last
-            ? "SELECT time, heard, latitude, longitude, accuracy FROM fix WHERE person = $1 AND time >= $2 AND "
-              "time < $3 AND heard >= $4 AND heard < $5 ORDER BY time DESC LIMIT 1"
-            : "SELECT time, heard, latitude, longitude, accuracy FROM fix WHERE person = $1 AND time >= $2 AND "
-              "time < $3 AND heard >= $4 AND heard < $5 ORDER BY time LIMIT 1");
-    row.bind(owner).bind(range.from).bind(range.end).bind(range.heardFrom).bind(range.heardEnd);
-    return row.next() ? std::optional(fixOf(row)) : std::nullopt;
 }
 
 std::optional<Sharing> Store::sharing(std::int64_t viewer, std::int64_t owner) {
@@ -163,45 +142,55 @@ std::optional<Sharing> Store::sharing(std::int64_t viewer, std::int64_t owner) {
         return std::nullopt;
     }
     Sharing sharing = sharingOf(row, 0);
-    readSight(*reading, owner, std::nullopt, sharing);
+    readAll(*reading, owner, sharing);
     return sharing;
 }
 
 std::optional<std::vector<Asked>> Store::asked(std::int64_t viewer, const std::vector<std::string>& handles,
                                                std::int64_t now) {
     const Reading reading(*this);
-    std::vector<Asked> all;
+    std::deque<Database::Run> runs;
     for (const std::string& handle : handles) {
-        Asked one;
-        auto row = reading->statement(
-            "SELECT person.id, hidden, shown_since, retention, (SELECT latest FROM clock), exactness, since, until, "
-            "arrival, aloud, confirmed, fences FROM handle JOIN person ON person.id = handle.person "
-            "LEFT JOIN share ON share.owner = person.id AND share.viewer = $1 WHERE handle.text = $2");
-        if (isText(handle) && row.bind(viewer).bind(normalisedHandle(handle)).next()) {
-            one.person = row.integer(0);
-            one.sharing = sharingOf(row, 1);
-            readSight(*reading, one.person, now, one.sharing);
-        }
-        all.push_back(std::move(one));
+        // What is no text is nobody's, as this is.
+        runs.emplace_back(
+                "SELECT person.id, heard_late, hidden, shown_since, retention, (SELECT latest FROM clock), exactness, "
+                "since, until, arrival, aloud, confirmed, fences FROM handle JOIN person ON person.id = handle.person "
+                "LEFT JOIN share ON share.owner = person.id AND share.viewer = $1 WHERE handle.text = $2",
+                *reading)
+            .bind(viewer)
+            .bind(std::string_view(isText(handle) ? normalisedHandle(handle) : "-"));
     }
+    reading->fetch(runs);
+    std::vector<Asked> all(handles.size());
+    std::vector<Sight> sights;
+    for (Asked& one : all) {
+        if (Database::Run& row = runs.front(); row.next()) {
+            one.person = row.integer(0);
+            one.sharing = sharingOf(row, 2);
+            sights.push_back({one.person, row.integer(1), &one.sharing});
+        }
+        runs.pop_front();
+    }
+    readSights(*reading, sights, now);
     return reading->failed() ? std::nullopt : std::optional(std::move(all));
 }
 
 std::vector<Friend> Store::friendsOf(std::int64_t viewer, std::int64_t now) {
     const Reading reading(*this);
-    std::vector<Friend> friends;
+    std::deque<Friend> friends;  // they stay where they are
+    std::vector<Sight> sights;
     auto row = reading->statement(
-        "SELECT person.id, name, hidden, shown_since, retention, (SELECT latest FROM clock), exactness, since, until, "
-        "arrival, aloud, confirmed, fences FROM share JOIN person ON person.id = share.owner WHERE share.viewer = $1 "
-        "ORDER BY "
+        "SELECT person.id, name, heard_late, hidden, shown_since, retention, (SELECT latest FROM clock), exactness, "
+        "since, until, arrival, aloud, confirmed, fences FROM share JOIN person ON person.id = share.owner WHERE share.viewer "
+        "= $1 ORDER BY "
         "name");
     row.bind(viewer);
     while (row.next()) {
-        Friend one{row.integer(0), row.text(1), sharingOf(row, 2)};
-        readSight(*reading, one.person, now, one.sharing);
-        friends.push_back(std::move(one));
+        friends.push_back({row.integer(0), row.text(1), sharingOf(row, 3)});
+        sights.push_back({friends.back().person, row.integer(2), &friends.back().sharing});
     }
-    return friends;
+    readSights(*reading, sights, now);
+    return {std::make_move_iterator(friends.begin()), std::make_move_iterator(friends.end())};
 }
 
 }  // namespace ktr::server

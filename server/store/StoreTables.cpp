@@ -7,7 +7,7 @@ namespace {
 constexpr std::array kTables = {
     StoreTable{"person", true, {"id"}, {"identity"}},
     StoreTable{"handle", true, {"person"}, {}},
-    StoreTable{"device", true, {"person"}, {"secret", "key", "cards_sent"}},
+    StoreTable{"device", true, {"person"}, {"secret", "key"}},
     StoreTable{"sign_in", false, {"person"}, {"link"}},
     StoreTable{"browser", false, {"person"}, {"session"}},
     StoreTable{"fix", false, {"person"}, {}},

@@ -1,4 +1,6 @@
 // The part of the store that the service writes while it runs: nobody waits for it.
+#include <algorithm>
+
 #include "server/store/Store.h"
 
 namespace ktr::server {
@@ -13,6 +15,12 @@ constexpr std::int64_t kPeopleAStep = 10;
 void Store::keep(std::int64_t device, std::int64_t person, std::vector<Fix> fixes, std::int64_t now, Done done) {
     write(
         [=, this, all = std::move(fixes)](Database& database) {
+            if (std::any_of(all.begin(), all.end(), [now](const Fix& fix) { return FixWalk::isLate(fix, now); })) {
+                database.statement("UPDATE person SET heard_late = $2 WHERE id = $1 AND heard_late < $2 AND hidden = 0")
+                    .bind(person)
+                    .bind(now)
+                    .run();
+            }
             // In the same commit as the question whether the person hides: nothing of that time comes in, then or
             // later.
             for (const Fix& fix : all) {

@@ -4,12 +4,14 @@
 
 #include <algorithm>
 #include <cstdlib>
+#include <map>
 #include <random>
 
 #include "platform/base/Json.h"
 #include "server/answers/LocationAnswers.h"
 #include "server/answers/PhoneAnswer.h"
 #include "server/rules/Cell.h"
+#include "server/rules/FixWalk.h"
 #include "server/rules/Visibility.h"
 
 namespace ktr::test {
@@ -20,8 +22,9 @@ using server::CommandPlace;
 using server::Fix;
 using server::FixEdge;
 using server::FixRange;
-using server::FixSource;
+using server::FixWalk;
 using server::Grant;
+using server::LastRest;
 using server::LocationAnswers;
 using server::LocationsRequest;
 using server::NamedPlace;
@@ -114,6 +117,25 @@ class VisibilityPropertyTest : public ::testing::TestWithParam<int> {
         return ::testing::AssertionSuccess();
     }
 
+    /// Answers what a walk asks.
+    std::vector<Fix> walked(FixWalk& walk, const std::vector<Fix>& fixes) {
+        for (auto questions = walk.questions(); !questions.empty(); questions = walk.questions()) {
+            std::vector<std::optional<Fix>> answers;
+            for (const auto& [range, edge] : questions) {
+                answers.emplace_back();
+                for (const Fix& fix : fixes) {
+                    if (range.holds(fix) && (!answers.back() || edge == FixEdge::Last)) {
+                        answers.back() = fix;
+                    }
+                }
+                answered_ += answers.back() ? 1 : 0;
+            }
+            walk.take(answers);
+        }
+        return walk.fixes();
+    }
+
+    std::size_t answered_ = 0;
     std::mt19937_64 random_{20261122U + static_cast<unsigned>(GetParam())};
 };
 
@@ -251,24 +273,83 @@ TEST_P(VisibilityPropertyTest, WhatIsNeededOfAHistory_SaysTheSameAsAllOfIt) {
         sharing.fixes.erase(std::unique(sharing.fixes.begin(), sharing.fixes.end(),
                                         [](const Fix& a, const Fix& b) { return a.time == b.time; }),
                             sharing.fixes.end());
-        const FixSource source = [&](const FixRange& range, FixEdge edge) -> std::optional<Fix> {
-            std::optional<Fix> found;
-            for (const Fix& fix : sharing.fixes) {
-                if (range.holds(fix) && (!found || edge == FixEdge::Last)) {
-                    found = fix;
-                }
-            }
-            return found;
-        };
         const std::int64_t now = kNow + between(-7200, 7200);
         Sharing thin = sharing;
-        thin.fixes = Visibility::needed(sharing, now, source);
+        FixWalk walk(sharing, now);
+        thin.fixes = walked(walk, sharing.fixes);
         all += sharing.fixes.size();
         read += thin.fixes.size();
         ASSERT_EQ(Visibility::visible(thin, now), Visibility::visible(sharing, now))
             << "round " << round << ", " << wordOf(sharing.grant->precision);
     }
     EXPECT_LT(read, all / 5);
+}
+
+TEST_P(VisibilityPropertyTest, WhatIsKnownOfWhereSomebodyRested_ChangesNothing) {
+    for (int round = 0; round < rounds() / 100; ++round) {
+        // A person on the way, at rest, unheard, and heard late, whom several look at again and again.
+        std::vector<Sharing> viewers(4);
+        for (Sharing& sharing : viewers) {
+            sharing.retention = between(0, 2) == 0 ? 2 * 3600 : 2 * kDay;
+            sharing.shownSince = viewers.front().shownSince;
+            sharing.grant = Grant{between(0, 1) == 0 ? Precision::Town : Precision::Kilometre,
+                                  kNow - between(-7200, 6 * 3600), std::nullopt};
+        }
+        std::vector<Fix> fixes;
+        std::map<Precision, LastRest> known;
+        std::int64_t heardLate = 0;
+        std::int64_t now = kNow;
+        double longitude = -3.0;
+        bool moves = true;
+        for (int step = 0; step < 400; ++step) {
+            now += between(1, between(0, 20) == 0 ? 4000 : 200);
+            moves = between(0, 15) == 0 ? !moves : moves;
+            longitude += moves ? real(-0.02, 0.08) : 0.0;
+            const std::int64_t ahead = between(0, 9) == 0 ? between(0, 300) : 0;
+            const std::int64_t behind = between(0, 15) == 0 ? between(0, 5000) : between(0, 3);
+            const Fix fix{now + ahead - behind, now, 50.0, longitude, 12.0};
+            heardLate = FixWalk::isLate(fix, now) ? now : heardLate;
+            const auto place = std::lower_bound(fixes.begin(), fixes.end(), fix,
+                                                [](const Fix& a, const Fix& b) { return a.time < b.time; });
+            if (place == fixes.end() || place->time != fix.time) {
+                fixes.insert(place, fix);
+            }
+            Sharing& sharing = viewers[static_cast<std::size_t>(between(0, 3))];
+            sharing.fixes = fixes;
+            Sharing thin = sharing;
+            FixWalk walk(sharing, now, known[sharing.grant->precision], heardLate);
+            thin.fixes = walked(walk, fixes);
+            known[sharing.grant->precision] = walk.found().value_or(known[sharing.grant->precision]);
+            ASSERT_EQ(Visibility::visible(thin, now), Visibility::visible(sharing, now))
+                << "round " << round << ", step " << step;
+        }
+    }
+}
+
+TEST_P(VisibilityPropertyTest, WhoeverNeverRests_IsReadOnceAsFarBack) {
+    Sharing sharing;
+    sharing.retention = 2 * kDay;
+    const bool isTown = GetParam() % 2 == 0;
+    sharing.grant = Grant{isTown ? Precision::Town : Precision::Kilometre, kNow - 3 * kDay, std::nullopt};
+    double longitude = -3.0;
+    for (std::int64_t time = kNow - 2 * kDay; time < kNow + kDay / 4; time += 60) {
+        longitude += isTown ? 0.01 : 0.02;
+        sharing.fixes.push_back({time, time + 1, 50.0, longitude, 12.0});
+    }
+    LastRest known;
+    for (std::int64_t now = kNow; now < kNow + kDay / 4; now += between(1, 600)) {
+        answered_ = 0;
+        FixWalk walk(sharing, now, known, 0);
+        Sharing thin = sharing;
+        thin.fixes = walked(walk, sharing.fixes);
+        ASSERT_EQ(Visibility::visible(thin, now), Visibility::visible(sharing, now));
+        if (now > kNow) {
+            EXPECT_LE(answered_, 6U);
+        } else {
+            EXPECT_GT(answered_, 100U) << "else this tries nothing";
+        }
+        known = walk.found().value_or(known);
+    }
 }
 
 TEST_P(VisibilityPropertyTest, ProbingPositions_DoNotNarrowATown) {
