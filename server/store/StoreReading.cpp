@@ -181,7 +181,8 @@ std::vector<Friend> Store::friendsOf(std::int64_t viewer, std::int64_t now) {
     std::vector<Sight> sights;
     auto row = reading->statement(
         "SELECT person.id, name, heard_late, hidden, shown_since, retention, (SELECT latest FROM clock), exactness, "
-        "since, until, arrival, aloud, confirmed, fences FROM share JOIN person ON person.id = share.owner WHERE share.viewer "
+        "since, until, arrival, aloud, confirmed, fences FROM share JOIN person ON person.id = share.owner WHERE "
+        "share.viewer "
         "= $1 ORDER BY "
         "name");
     row.bind(viewer);

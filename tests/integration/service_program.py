@@ -40,14 +40,14 @@ def basic(user, secret):
 class ServiceProgram:
     """One service in a folder of its own; `case` is the test that ends it."""
 
-    def __init__(self, case, program, host="localhost"):
+    def __init__(self, case, program, host="localhost", store=None):
         self.case, self.program, self.host = case, program, host
         self.folder = pathlib.Path(tempfile.mkdtemp(prefix="ktr-service-"))
         case.addCleanup(lambda: subprocess.run(["rm", "-rf", os.fspath(self.folder)], check=True))
         self.port = free_port()
         self.socket = str(self.folder / "http.sock")
         self.process = None
-        self.command("init", "--host", host, "--port", str(self.port))
+        self.command("init", "--host", host, "--port", str(self.port), *(("--store", store) if store else ()))
 
     def command(self, *words, fails=False):
         done = subprocess.run([self.program, "--data", str(self.folder / "data"), *words], capture_output=True,
