@@ -275,8 +275,7 @@ void Host::makeStill(TurnView& turn) {
             opener->open(url);
         }
     };
-    const auto contrast = settings_.drawsHighContrast() ? linux_::Contrast::High : linux_::Contrast::Normal;
-    const auto still = StillView::of(content, settings_.scale, contrast, rightToLeft(), page, open);
+    const auto still = StillView::of(content, settings_.scale, rightToLeft(), page, open);
     card->letGo();
     card->setStill(still);
 }

@@ -94,7 +94,7 @@ class Host {
     /// The clock face of a moment, as the conversation shows it.
     std::string clockFace(platform::Date moment) const;
     const HostSettings& settings() const { return settings_; }
-    /// The desktop's wish, for what is drawn from now on: a still that is there stays as it was drawn.
+    /// The desktop's wish; whoever shows the conversation draws it again.
     void setDesktopHighContrast(bool high) { settings_.desktopHighContrast = high; }
     /// The newest card says that friends cannot see the user.
     bool saysHidden() const { return saysHidden_; }

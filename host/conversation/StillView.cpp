@@ -45,13 +45,21 @@ class StillView::Part : public View {
     AccessibilityRole role_;
 };
 
-std::shared_ptr<StillView> StillView::of(const std::shared_ptr<View>& view, double scale, linux_::Contrast contrast,
-                                         bool rightToLeft, const std::optional<platform::Url>& page, const Open& open) {
+std::size_t StillView::indexOf(const Palette& palette) {
+    return (palette.scheme == ColorScheme::Dark ? 1U : 0U) + (palette.contrast == linux_::Contrast::High ? 2U : 0U);
+}
+
+std::shared_ptr<StillView> StillView::of(const std::shared_ptr<View>& view, double scale, bool rightToLeft,
+                                         const std::optional<platform::Url>& page, const Open& open) {
     auto still = platform::create<StillView>(&View::initWithFrame, view->bounds());
     still->size_ = {view->bounds().width, view->bounds().height};
     still->rightToLeft_ = rightToLeft;
-    still->pictures_ = {pictureOf(*view, scale, Palette::of(ColorScheme::Light, contrast)),
-                        pictureOf(*view, scale, Palette::of(ColorScheme::Dark, contrast))};
+    for (const ColorScheme scheme : {ColorScheme::Light, ColorScheme::Dark}) {
+        for (const auto contrast : {linux_::Contrast::Normal, linux_::Contrast::High}) {
+            const Palette& palette = Palette::of(scheme, contrast);
+            still->pictures_[indexOf(palette)] = pictureOf(*view, scale, palette);
+        }
+    }
     std::function<void()> tapped;
     if (page && open) {
         tapped = [open, page = *page] { open(page); };
@@ -104,7 +112,7 @@ void StillView::layoutSubviews() {
 
 void StillView::draw(platform::Canvas& canvas) const {
     if (auto* qt = qtCanvas(canvas)) {
-        const QImage& picture = pictures_[qt->palette().scheme == ColorScheme::Dark ? 1 : 0];
+        const QImage& picture = pictures_[indexOf(qt->palette())];
         qt->painter().drawImage(qt->snapped(place()), picture);
     }
 }

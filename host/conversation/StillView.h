@@ -24,10 +24,9 @@ class StillView : public platform::View {
     /// What a tap does.
     using Open = std::function<void(const platform::Url&)>;
 
-    /// Takes the picture of a view that is laid out, in light and in dark, `scale` pixels a point. Every part of it
-    /// that could be pressed leads to `page` from now on; none: a tap does nothing.
-    static std::shared_ptr<StillView> of(const std::shared_ptr<platform::View>& view, double scale,
-                                         linux_::Contrast contrast, bool rightToLeft,
+    /// Takes the picture of a view that is laid out, in each palette, `scale` pixels a point. Every part of it that
+    /// could be pressed leads to `page` from now on; none: a tap does nothing.
+    static std::shared_ptr<StillView> of(const std::shared_ptr<platform::View>& view, double scale, bool rightToLeft,
                                          const std::optional<platform::Url>& page, const Open& open);
 
     /// The picture's own height, or less where it has to shrink to fit in; points. The picture stands at the leading
@@ -40,6 +39,7 @@ class StillView : public platform::View {
 
   private:
     class Part;
+    static std::size_t indexOf(const linux_::Palette& palette);
     void addPart(const platform::AccessibilityNode& node, const std::function<void()>& tapped);
     /// Of the picture as it is shown to the picture as it was taken.
     double shrink() const;
@@ -48,7 +48,8 @@ class StillView : public platform::View {
 
     platform::Size size_;
     bool rightToLeft_ = false;
-    std::array<QImage, 2> pictures_;  ///< light, dark
+    /// By `indexOf`: the desktop may wish for another scheme or contrast when there is nothing left to draw.
+    std::array<QImage, 4> pictures_;
     std::vector<std::shared_ptr<Part>> parts_;
 };
 

@@ -7,6 +7,7 @@
 #include <variant>
 
 #include "documents/JsonReader.h"
+#include "host/live/AnswerTexts.h"
 #include "platform/base/Json.h"
 
 namespace ktr::host {
@@ -120,7 +121,12 @@ void SeenRequests::ask(const HttpRequest& request, const std::string& question, 
     const auto asking = std::make_shared<Asking>();
     asking->completions = std::move(completions);
     underWay_[question] = asking;
-    next_->send(request, [asking](HttpAnswer answer) { asking->answer(std::move(answer)); });
+    next_->send(request, [asking](HttpAnswer answer) {
+        if (answer.json) {
+            answer.json = withShortTexts(std::move(*answer.json));
+        }
+        asking->answer(std::move(answer));
+    });
 }
 
 void SeenRequests::send(const HttpRequest& request, Completion completion) {

@@ -15,6 +15,8 @@ namespace ktr::host {
 /// card's earlier ones with its own answer; a command that shows the user to friends ends with `Cancelled` at once: it
 /// must not leave later, when the user may have thought better of it. Cards are told nothing of all this.
 ///
+/// Texts of an answer are cut where they come in, so that no row gets a megabyte (`withShortTexts`).
+///
 /// Two questions that differ only in times are one on the wire while the first is under way: a card starts twice and so
 /// asks twice. Main thread, but for completions.
 class SeenRequests : public platform::HttpTransport {

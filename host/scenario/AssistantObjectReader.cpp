@@ -1,6 +1,9 @@
 #include "host/scenario/AssistantObjectReader.h"
 
+#include <utility>
+
 #include "documents/Words.h"
+#include "host/conversation/CutText.h"
 #include "host/scenario/Scenario.h"
 
 namespace ktr::host {
@@ -26,13 +29,24 @@ void readContext(documents::FieldReader& fields, VASnippet& snippet) {
     }
 }
 
+/// A text for a row.
+std::optional<std::string> readText(documents::FieldReader& fields, const char* name) {
+    auto text = fields.string(name);
+    return text ? std::optional(cutText(*text, AssistantObjectReader::kLongestText)) : std::nullopt;
+}
+
+std::optional<std::string> readHandle(documents::FieldReader& fields, const char* name) {
+    auto handle = fields.string(name);
+    return handle && handle->size() <= AssistantObjectReader::kLongestText ? std::move(handle) : std::nullopt;
+}
+
 /// What every kind of place has.
 void readPlace(documents::FieldReader& fields, VALocation& place) {
     place.latitude = fields.number("latitude");
     place.longitude = fields.number("longitude");
     place.accuracy = fields.number("accuracy");
-    place.label = fields.string("label");
-    place.street = fields.string("street");
+    place.label = readText(fields, "label");
+    place.street = readText(fields, "street");
 }
 
 }  // namespace
@@ -103,8 +117,8 @@ std::shared_ptr<VAKtrLocation> AssistantObjectReader::readLocation(documents::Fi
     fields.object("friend", [&](documents::FieldReader& person) { location->friend_ = readPersonAttribute(person); });
     readPlace(fields, *location);
     location->distance = fields.number("distance");
-    location->city = fields.string("city");
-    location->stateCode = fields.string("stateCode");
+    location->city = readText(fields, "city");
+    location->stateCode = readText(fields, "stateCode");
     location->locationDate = readLocationDate(fields);
     return location;
 }
@@ -121,7 +135,7 @@ std::optional<double> AssistantObjectReader::readLocationDate(documents::FieldRe
 std::shared_ptr<VAPersonAttribute> AssistantObjectReader::readPersonAttribute(documents::FieldReader& fields) const {
     expectKind(fields, "VAPersonAttribute");
     auto attribute = std::make_shared<VAPersonAttribute>();
-    attribute->data = fields.string("data");
+    attribute->data = readHandle(fields, "data");
     fields.object("object", [&](documents::FieldReader& person) { attribute->object = readPerson(person); });
     return attribute;
 }
@@ -129,20 +143,20 @@ std::shared_ptr<VAPersonAttribute> AssistantObjectReader::readPersonAttribute(do
 std::shared_ptr<VAPerson> AssistantObjectReader::readPerson(documents::FieldReader& fields) const {
     expectKind(fields, "VAPerson");
     auto person = std::make_shared<VAPerson>();
-    person->fullName = fields.string("fullName");
-    person->firstName = fields.string("firstName");
-    person->lastName = fields.string("lastName");
+    person->fullName = readText(fields, "fullName");
+    person->firstName = readText(fields, "firstName");
+    person->lastName = readText(fields, "lastName");
     person->identifier = fields.string("identifier");
     fields.objects("emails", [&](documents::FieldReader& email) {
         expectKind(email, "VAEmail");
         auto object = std::make_shared<VAEmail>();
-        object->emailAddress = email.string("emailAddress");
+        object->emailAddress = readHandle(email, "emailAddress");
         person->emails.push_back(std::move(object));
     });
     fields.objects("phones", [&](documents::FieldReader& phone) {
         expectKind(phone, "VAPhone");
         auto object = std::make_shared<VAPhone>();
-        object->number = phone.string("number");
+        object->number = readHandle(phone, "number");
         person->phones.push_back(std::move(object));
     });
     return person;

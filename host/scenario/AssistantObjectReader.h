@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <memory>
 
 #include "documents/FieldReader.h"
@@ -11,6 +12,10 @@ namespace ktr::host {
 /// Makes assistant objects of JSON objects that carry their properties by name. Main thread.
 class AssistantObjectReader {
   public:
+    /// Names of people and places are cut off after so many bytes: measuring and wrapping a megabyte of text for a row
+    /// of one line takes seconds. A handle is never cut, since it would be another's; a longer one is none.
+    static constexpr std::size_t kLongestText = 1000;
+
     /// Ages ("ageSeconds") count back from `now`.
     explicit AssistantObjectReader(platform::Date now) : now_(now) {}
 

@@ -193,28 +193,30 @@ TEST_F(LiveHostTest, Still_KeepsPictureWordsAndAWayToOnesOwnPage) {
     EXPECT_EQ(opened[0].rfind("wayloc://friend/", 0), 0U) << opened[0];
 }
 
-TEST_F(LiveHostTest, Still_HasTheContrastThatTheDesktopWishes) {
-    const auto look = [&](bool high) {
-        host->setDesktopHighContrast(high);
-        const auto turn = add(kSharing);
-        host->endSharing();
-        host->layOut(400.0);
-        const auto still = turn->card()->still();
+// Whatever the desktop wished when its card went: it may wish for something else while the still is on screen.
+TEST_F(LiveHostTest, Still_FollowsSchemeAndContrast) {
+    const auto turn = add(kSharing);
+    const auto look = [&](const platform::View& view, linux_::ColorScheme scheme, linux_::Contrast contrast) {
         QImage picture(400, 200, QImage::Format_RGB32);
-        picture.fill(Qt::white);
-        if (still == nullptr) {
-            ADD_FAILURE() << "no still";
-            return picture;
-        }
+        picture.fill(Qt::gray);
         QPainter painter(&picture);
-        // In the same colours each time: only what the still brings differs.
-        linux_::QtCanvas canvas(painter, linux_::Palette::of(linux_::ColorScheme::Light));
-        still->paint(canvas, {0.0, 0.0, 400.0, 200.0});
+        painter.setRenderHints(QPainter::Antialiasing | QPainter::TextAntialiasing | QPainter::SmoothPixmapTransform);
+        linux_::QtCanvas canvas(painter, linux_::Palette::of(scheme, contrast));
+        view.paint(canvas, {0.0, 0.0, 400.0, 200.0});
         return picture;
     };
-    const QImage usual = look(false);
-    EXPECT_NE(look(true), usual);
-    EXPECT_EQ(look(false), usual);
+    std::vector<QImage> looks;
+    host->endSharing();
+    host->layOut(400.0);
+    const auto still = turn->card()->still();
+    ASSERT_NE(still, nullptr);
+    for (const auto scheme : {linux_::ColorScheme::Light, linux_::ColorScheme::Dark}) {
+        for (const auto contrast : {linux_::Contrast::Normal, linux_::Contrast::High}) {
+            looks.push_back(look(*still, scheme, contrast));
+            EXPECT_EQ(std::count(looks.begin(), looks.end(), looks.back()), 1) << "each looks its own way";
+        }
+    }
+    EXPECT_EQ(look(*still, linux_::ColorScheme::Light, linux_::Contrast::Normal), looks.front()) << "and back";
 }
 
 TEST_F(LiveHostTest, Still_GivesWayInANarrowConversation) {

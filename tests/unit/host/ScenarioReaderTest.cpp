@@ -5,6 +5,7 @@
 #include <filesystem>
 #include <fstream>
 
+#include "host/scenario/AssistantObjectReader.h"
 #include "platform/assistant/VASnippet.h"
 
 namespace ktr::host {
@@ -69,6 +70,25 @@ TEST_F(KTRScenarioReaderTest, Snippet_ReadsEveryProperty) {
     EXPECT_EQ(person.identifier, "id");
     EXPECT_EQ(person.emails.at(0)->emailAddress, "ann@harbour.example");
     EXPECT_EQ(person.phones.at(0)->number, "+441632960001");
+}
+
+TEST_F(KTRScenarioReaderTest, EndlessNames_AreCutAndEndlessHandlesAreNone) {
+    const std::string endless(1 << 20, 'x');
+    const auto snippet = locations(R"([{"label": ")" + endless + R"(", "street": ")" + endless + R"(", "city": ")" +
+                                   endless + R"(", "stateCode": ")" + endless + R"(", "friend": {"data": ")" + endless +
+                                   R"(", "object": {"fullName": ")" + endless + R"(", "firstName": ")" + endless +
+                                   R"(", "emails": [{"emailAddress": ")" + endless + R"("}], "phones": [{"number": ")" +
+                                   endless + R"("}]}}}])");
+    ASSERT_TRUE(snippet);
+    const std::string cut = endless.substr(0, AssistantObjectReader::kLongestText) + "\u2026";
+    const auto& location = *snippet->locations->front();
+    for (const auto& text : {location.label, location.street, location.city, location.stateCode,
+                             location.friend_->object->fullName, location.friend_->object->firstName}) {
+        EXPECT_EQ(text, cut);
+    }
+    EXPECT_FALSE(location.friend_->data) << "half of it would be another's";
+    EXPECT_FALSE(location.friend_->object->emails.front()->emailAddress);
+    EXPECT_FALSE(location.friend_->object->phones.front()->number);
 }
 
 TEST_F(KTRScenarioReaderTest, AbsentAndNull_BothReadAsNone) {

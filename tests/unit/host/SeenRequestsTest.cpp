@@ -139,4 +139,26 @@ TEST_F(SeenRequestsTest, WhatWaitsWhenItGoes_IsCancelled) {
     EXPECT_EQ(ended, std::vector<std::string>{"ann: cancelled"});
 }
 
+TEST_F(SeenRequestsTest, LongTextsOfPlaces_AreCutAndHandlesAreNot) {
+    const std::string endless(1 << 20, 'x');
+    platform::Dictionary told;
+    requests->send(question("ann", 1.0, 1), [&](const HttpAnswer& answer) { told = *answer.json->dictionary(); });
+    const platform::Dictionary entry{
+        {"location", platform::Dictionary{{"labels", platform::Value::Array{endless, "Home"}},
+                                          {"address", platform::Dictionary{{"locality", endless}}},
+                                          {"latitude", 1.5}}}};
+    wire->answer(platform::Dictionary{{"emails", platform::Value::Array{endless}},
+                                      {"locations", platform::Dictionary{{endless, entry}}},
+                                      {"serverContext", platform::Dictionary{{"clientId", endless}}}});
+    EXPECT_EQ(*told.find("emails")->array()->front().string(), endless);
+    EXPECT_EQ(*told.find("serverContext")->dictionary()->find("clientId")->string(), endless);
+    const auto* location = told.find("locations")->dictionary()->find(endless)->dictionary()->find("location");
+    const auto& labels = *location->dictionary()->find("labels")->array();
+    EXPECT_EQ(*labels[0].string(), endless.substr(0, 1000) + "\u2026");
+    EXPECT_EQ(labels[1], platform::Value("Home"));
+    const auto* address = location->dictionary()->find("address")->dictionary();
+    EXPECT_EQ(*address->find("locality")->string(), endless.substr(0, 1000) + "\u2026");
+    EXPECT_EQ(*location->dictionary()->find("latitude"), platform::Value(1.5));
+}
+
 }  // namespace ktr::test
