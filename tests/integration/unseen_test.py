@@ -1,7 +1,8 @@
 #!/usr/bin/python3
 """What nobody sees does not ask: the live window on a virtual display, hidden as window managers hide windows, with `ktr serve`
-behind it. Skipped without Xvfb, xdotool and xprop."""
+behind it. Skipped without Xvfb, xdotool, xprop, gdbus and dbus-daemon."""
 
+import json
 import os
 import pathlib
 import shutil
@@ -16,6 +17,7 @@ from virtual_display import VirtualDisplay
 
 PROGRAM = os.environ["KTR_PROGRAM"]
 INTERVAL = 0.5
+LOGIND, MANAGER, SESSION = "org.freedesktop.login1", "/org/freedesktop/login1", "/org/freedesktop/login1/session/_31"
 
 
 class UnseenTest(unittest.TestCase):
@@ -29,8 +31,13 @@ class UnseenTest(unittest.TestCase):
         folder = tempfile.TemporaryDirectory()
         self.addCleanup(folder.cleanup)
         os.chmod(folder.name, 0o700)
-        config = pathlib.Path(folder.name) / "config.json"
-        self.service = Service(PROGRAM, "--write-config", config, "--interval", str(INTERVAL))
+        self.folder = pathlib.Path(folder.name)
+        config = self.folder / "config.json"
+        # The user walks on and on.
+        walk = self.folder / "walk.json"
+        walk.write_text(json.dumps({"sentence": "-", "positions": [
+            {"at": n, "latitude": 50.2 + n * 1e-3, "longitude": -3.1} for n in range(300)]}))
+        self.service = Service(PROGRAM, "--write-config", config, "--interval", str(INTERVAL), "--positions", walk)
         self.addCleanup(self.service.__exit__)
         self.environment = {**os.environ, "DISPLAY": self.display, "XDG_RUNTIME_DIR": folder.name, "LANG": "C.UTF-8",
                             "XDG_STATE_HOME": folder.name, "QT_QPA_PLATFORM": "xcb", "NO_AT_BRIDGE": "1",
@@ -94,6 +101,60 @@ class UnseenTest(unittest.TestCase):
         subprocess.run(["xdotool", "windowmap", "--sync", self.window], env=self.environment, check=True)
         self.wait_until_asked()
 
+    def start_logind(self):
+        """A login manager on a system bus of the test's own, which says whether the session is locked."""
+        configuration = self.folder / "bus.conf"
+        configuration.write_text("""<busconfig><type>system</type><listen>unix:tmpdir=/tmp</listen>
+            <policy context="default"><allow send_destination="*"/><allow receive_sender="*"/><allow own="*"/></policy>
+            </busconfig>""")
+        daemon = subprocess.Popen(["dbus-daemon", f"--config-file={configuration}", "--nofork", "--print-address=1"],
+                                  stdout=subprocess.PIPE, text=True)
+        self.addCleanup(daemon.stdout.close)
+        self.addCleanup(daemon.wait)
+        self.addCleanup(daemon.terminate)
+        self.environment["DBUS_SYSTEM_BUS_ADDRESS"] = daemon.stdout.readline().strip()
+        mock = subprocess.Popen(["/usr/bin/python3", "-m", "dbusmock", "--system", LOGIND, MANAGER, f"{LOGIND}.Manager"],
+                                env=self.environment)
+        self.addCleanup(mock.wait)
+        self.addCleanup(mock.terminate)
+        deadline = time.monotonic() + 20
+        while self.tell_logind(MANAGER, "AddMethod", f"{LOGIND}.Manager", "GetSessionByPID", "u", "o",
+                               f"ret = dbus.ObjectPath('{SESSION}')") != 0:
+            self.assertLess(time.monotonic(), deadline, "no login manager")
+            time.sleep(0.1)
+        self.assertEqual(self.tell_logind(MANAGER, "AddObject", SESSION, f"{LOGIND}.Session", "{'LockedHint': <false>}",
+                                          "@a(ssss) []"), 0)
+
+    def tell_logind(self, path, method, *arguments):
+        return subprocess.run(["gdbus", "call", "--system", "-d", LOGIND, "-o", path, "-m",
+                               f"org.freedesktop.DBus.Mock.{method}", *arguments], env=self.environment,
+                              capture_output=True, check=False).returncode
+
+    def lock(self, locked):
+        self.assertEqual(self.tell_logind(SESSION, "UpdateProperties", f"{LOGIND}.Session",
+                                          f"{{'LockedHint': <{str(locked).lower()}>}}"), 0)
+
+    def test_locked_session_asks_nothing_and_asks_when_it_is_unlocked(self):
+        self.start_logind()
+        self.open("Where are my friends?")
+        self.wait_until_asked()
+        self.lock(True)
+        self.assert_asks_nothing("behind a lock")
+        self.lock(False)
+        self.wait_until_asked()
+
+    def test_sharing_ends_where_nobody_sees_it(self):
+        self.open("Share my location")
+        self.wait_until_asked("showHideLocation")
+        self.xprop("-id", self.window, "-f", "_NET_WM_STATE", "32a", "-set", "_NET_WM_STATE", "_NET_WM_STATE_HIDDEN")
+        time.sleep(4 * INTERVAL)
+        self.asked()
+        time.sleep(6 * INTERVAL)
+        self.assertEqual(self.asked("showHideLocation"), 0)
+        self.xprop("-id", self.window, "-remove", "_NET_WM_STATE")
+        time.sleep(6 * INTERVAL)
+        self.assertEqual(self.asked("showHideLocation"), 0, "what would have shown the user is given up, not held")
+
     def test_two_starts_of_a_card_are_one_request(self):
         self.open("Where are my friends?")
         self.wait_until_asked()
@@ -104,7 +165,7 @@ class UnseenTest(unittest.TestCase):
 
 
 if __name__ == "__main__":
-    if not all(shutil.which(tool) for tool in ("Xvfb", "xdotool", "xprop")):
-        print("skipped: Xvfb, xdotool and xprop are needed")
+    if not all(shutil.which(tool) for tool in ("Xvfb", "xdotool", "xprop", "gdbus", "dbus-daemon")):
+        print("skipped: Xvfb, xdotool, xprop, gdbus and dbus-daemon are needed")
         sys.exit(77)
     unittest.main()
