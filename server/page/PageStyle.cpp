@@ -45,7 +45,7 @@ h2,legend{font-size:.8125rem;font-weight:400;color:var(--inkSoft);padding:22px 1
 .apart,.card+.card,form+.card,.card+form{margin-top:16px}
 .row{display:flex;align-items:center;gap:12px;width:100%;min-height:53px;padding:8px 15px;text-decoration:none;color:inherit;
 background:none;border:0;font:inherit;text-align:start;position:relative}
-.row+.row,li+li>.row,ul+.row,.ruled{border-top:1px solid var(--separator)}
+.row+.row,li+li>.row,li+li>form>.row,ul+.row,.ruled{border-top:1px solid var(--separator)}
 a.row:hover,button.row:hover{background:var(--highlight)}
 a.row:active,button.row:active{background-image:linear-gradient(rgba(0,0,0,.2),rgba(0,0,0,.2))}
 .row:focus-visible{outline-offset:-3px}
@@ -111,7 +111,7 @@ box-shadow:var(--shadow)}
 .note.value{font-family:"Noto Sans Mono",ui-monospace,monospace;user-select:all}
 .apart-far{margin-top:32px}
 .end{flex:none;min-height:44px;min-width:44px;padding:0 14px;border-radius:22px;border:1px solid var(--fieldLine);color:var(--ink);
-text-decoration:none;display:grid;place-items:center;font-weight:700}
+text-decoration:none;display:grid;place-items:center;font:inherit;font-weight:700;background:none}
 .unseen{position:absolute;width:1px;height:1px;overflow:hidden;clip-path:inset(50%);white-space:nowrap}
 [dir=rtl] .flip{transform:scaleX(-1)}
 @media (forced-colors:active){.face{border:1px solid}.switch::after{background:ButtonText}

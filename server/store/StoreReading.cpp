@@ -136,7 +136,7 @@ std::optional<Sharing> Store::sharing(std::int64_t viewer, std::int64_t owner) {
     const Reading reading(*this);
     auto row = reading->statement(
         "SELECT hidden, shown_since, retention, (SELECT latest FROM clock), exactness, since, until, arrival, aloud, "
-        "confirmed FROM person "
+        "confirmed, fences FROM person "
         "LEFT JOIN share ON share.owner = person.id AND share.viewer = $1 WHERE person.id = $2");
     if (!row.bind(viewer).bind(owner).next()) {
         return std::nullopt;

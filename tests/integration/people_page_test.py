@@ -5,11 +5,14 @@
 
 FOLDER: where axe-core is, or is installed when KTR_LONG_TESTS is set. KTR_PICTURES=FOLDER keeps a picture of each page.
 """
+import base64
 import http.server
+import json
 import os
 import pathlib
 import re
 import socket
+import ssl
 import subprocess
 import sys
 import tempfile
@@ -174,10 +177,27 @@ class PeoplePageTest(unittest.TestCase):
             self.assertEqual(refused.exception.code, 421, host)
             refused.exception.close()
 
+    def fence(self, watcher, handle):
+        """Somebody wishes to be told when somebody comes to a place without a name, and leaves one."""
+        token = self.folder / "token"
+        self.command("reader", watcher, "--token-file", str(token))
+        context = ssl.create_default_context(cafile=str(self.folder / "data" / "ca.pem"))
+        credentials = base64.b64encode(f"{watcher}:{token.read_text().strip()}".encode()).decode()
+        for trigger, latitude in (("OnArrival", 50.2), ("OnDeparture", 50.3)):
+            body = {"clientContext": {}, "handle": handle, "trigger": trigger,
+                    "place": {"latitude": latitude, "longitude": -3.1}}
+            request = urllib.request.Request(
+                self.origin + "/qloxservice/friends/va/setFence", json.dumps(body).encode(), {
+                    "Authorization": "Basic " + credentials, "Content-Type": "application/json",
+                    "X-Orcha-Seek-API-Ver": "4.0", "X-Orcha-AuthScheme": "Forever"})
+            with urllib.request.urlopen(request, context=context, timeout=20) as answer:
+                self.assertEqual(answer.status, 200)
+
     def pages(self):
         """The address of each page, with a rule that ends and one that does not."""
         self.command("share", "Mara", "Lea", "--precision", "town", "--until", "midnight")
-        self.command("share", "Mara", "Ann", "--arrival", "Home")
+        self.command("share", "Mara", "Ann", "--arrival", "Home", "--fences")
+        self.fence("Ann", "mara@x.example")
         self.browser.open(self.origin + "/me")
         rule, device = "", ""
         rule = re.search(r"/me/sees/\d+", self.browser.source()).group(0)
@@ -185,7 +205,7 @@ class PeoplePageTest(unittest.TestCase):
         device = re.search(r"/me/devices/\d+/end", self.browser.source()).group(0)
         return {"main": "/me", "share": "/me/share", "looks": "/me/looks", "phone": "/me/phone",
                 "set-up": device.replace("devices", "phone").replace("/end", ""), "devices": "/me/devices",
-                "end": device, "settings": "/me/settings", "places": "/me/places", "delete": "/me/delete",
+                "end": device, "settings": "/me/settings", "places": "/me/places", "told": "/me/fences", "delete": "/me/delete",
                 "rule": rule, "stop": rule + "/stop", "link": "/me/in?link=x", "none": "/me/none"}
 
     def check(self, name, where):

@@ -63,6 +63,34 @@ TEST_F(OwnPagesTest, Rule_IsChanged_AndEnded) {
     EXPECT_EQ(get(address()).status, 404);
 }
 
+TEST_F(OwnPagesTest, LeaveToBeTold_NeedsExact_AndEachFenceIsSeenAndEnded) {
+    signIn();
+    post("/me/share/with", "who=Lea&exactness=town&until=changed&fences=yes");
+    EXPECT_FALSE(leasGrant()->fences) << "less than exact";
+    post("/me/sees/" + std::to_string(lea_), "exactness=exact&until=changed&fences=yes");
+    EXPECT_TRUE(leasGrant()->fences);
+    EXPECT_NE(get("/me/fences").body.find("Nobody is told."), std::string::npos);
+    ASSERT_TRUE(store_->setPlace(mara_, {0, "Office & Co", "work", 50.2, -3.1, 200.0, true}));
+    now_ += 10;
+    const auto set = [&](const server::FencePlace& place, bool arrives) {
+        std::promise<server::FenceOutcome> outcome;
+        store_->setFence({lea_, mara_, place, arrives, true}, now_,
+                         [&](server::FenceOutcome what, const server::Fence&) { outcome.set_value(what); });
+        return outcome.get_future().get();
+    };
+    ASSERT_EQ(set({"work", std::nullopt}, false), server::FenceOutcome::Set);
+    ASSERT_EQ(set({"", server::FenceCircle{50.3, -3.2, 150.0}}, true), server::FenceOutcome::Set);
+    const std::string page = get("/me/fences").body;
+    EXPECT_NE(page.find("When I leave: \u2068Office &amp; Co\u2069"), std::string::npos) << page;
+    EXPECT_NE(page.find("When I arrive: \u206850.3000"), std::string::npos) << page;
+    const auto fences = *store_->fencesAbout(mara_);
+    for (const auto& one : fences) {
+        EXPECT_EQ(post("/me/fences/" + std::to_string(one.fence.id) + "/end", "").status, 303);
+    }
+    EXPECT_TRUE(store_->fencesBy(lea_)->empty());
+    EXPECT_EQ(post("/me/fences/1/end", "").status, 303) << "one that has ended is what was wanted";
+}
+
 TEST_F(OwnPagesTest, KeepSharing_IsAskedAfter90Days_AndAnswersForAnother90) {
     constexpr std::int64_t kDay = 86400;
     ASSERT_TRUE(store_->grant(mara_, lea_, {Precision::Exact, now_, std::nullopt}));
