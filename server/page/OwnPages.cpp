@@ -325,18 +325,14 @@ HttpResponse OwnPages::makePhone(const PageRequest& request, const Reader& reade
     const PageContext& context = reader.context;
     const auto secret = Secret::make();
     const auto link = Secret::make();
-    bool failed = false;
-    if (!secret || !link || !store_.addDevice(reader.person.id, DeviceKind::Phone, *secret, "", context.now) ||
-        !store_.addSignIn(reader.person.id, *link, context.now)) {
-        return notKept(context);
-    }
-    const auto device = store_.deviceOf(*secret, failed);
-    if (!device) {
+    const std::int64_t device =
+        secret && link ? store_.addPhoneWithLink(reader.person.id, *secret, *link, context.now) : 0;
+    if (device == 0) {
         return notKept(context);
     }
     const std::string origin = "https://" + request.host;
     return PageAnswer::html(200, PhonePage::html(context, {origin + "/pub", origin + "/?id=" + *secret, *secret,
-                                                           origin + "/me/in?link=" + *link, device->id, context.now}));
+                                                           origin + "/me/in?link=" + *link, device, context.now}));
 }
 
 HttpResponse OwnPages::endDevice(const PageRequest& request, const Reader& reader) {

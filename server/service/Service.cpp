@@ -108,7 +108,9 @@ void Service::stop(std::chrono::milliseconds grace) {
 void Service::sweep() {
     // Through the edge's threads and the store's: whichever stands still, nobody hears of life.
     store_->deleteOld(now_(), [this](bool isWell) {
-        noteStore(isWell);
+        const std::int64_t failures = counters_.storeFailures;
+        noteStore(isWell && failures == failuresBefore_);
+        failuresBefore_ = failures;
         if (alive_) {
             alive_();
         }
@@ -150,9 +152,10 @@ void Service::route(const HttpRequest& request, const HttpReply& reply) {
 }
 
 void Service::answerOperator(const HttpRequest& request, const HttpReply& reply) {
+    const bool isWell = storeIsWell_ && counters_.storeFailures == failuresBefore_;
     if (request.path == "/health") {
-        return reply.send(HttpResponse::json(storeIsWell_ ? 200 : 503,
-                                             storeIsWell_ ? R"({"store":"ok"})" : R"({"store":"failing"})"));
+        return reply.send(
+            HttpResponse::json(isWell ? 200 : 503, isWell ? R"({"store":"ok"})" : R"({"store":"failing"})"));
     }
     HttpResponse response;
     response.headers.emplace_back("Content-Type", "text/plain; version=0.0.4");
@@ -166,7 +169,7 @@ void Service::answerOperator(const HttpRequest& request, const HttpReply& reply)
                     number("event_streams", "gauge", events_->size()) +
                     number("held_answers", "gauge", held_ ? held_->size() : 0) +
                     number("fixes_read_total", "counter", store_->fixesRead()) +
-                    "# TYPE ktr_service_store_ok gauge\nktr_service_store_ok " + (storeIsWell_ ? "1" : "0") + "\n";
+                    "# TYPE ktr_service_store_ok gauge\nktr_service_store_ok " + (isWell ? "1" : "0") + "\n";
     reply.send(response);
 }
 

@@ -91,7 +91,8 @@ class Service {
     const std::function<void()> alive_;
     const std::shared_ptr<ServiceLog> log_;
     Traffic traffic_;
-    std::atomic<bool> storeIsWell_ = true;  ///< as the last sweep found it
+    std::atomic<bool> storeIsWell_ = true;          ///< as the last sweep found it, and whoever asked before it
+    std::atomic<std::int64_t> failuresBefore_ = 0;  ///< answers that could not be given until then
     ServiceCounters counters_;
     FailureDelays delays_;
     std::shared_ptr<Store> store_;

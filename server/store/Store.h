@@ -107,6 +107,9 @@ class Store {
     bool addPerson(const std::string& name, const std::vector<std::string>& handles, std::int64_t now);
     bool addDevice(std::int64_t person, DeviceKind kind, std::string_view secret, std::string_view key,
                    std::int64_t now, bool shared = false);
+    /// A phone, and a link that signs in on it: both or neither. The phone's number; 0 when it failed.
+    std::int64_t addPhoneWithLink(std::int64_t person, std::string_view secret, std::string_view link,
+                                  std::int64_t now);
     /// Replaces an earlier grant. Who saw as exactly until then goes on seeing; else nothing is seen from before
     /// `grant.from`, nor from before this call.
     bool grant(std::int64_t owner, std::int64_t viewer, const Grant& grant);
@@ -288,6 +291,15 @@ class Store {
     LastRest knownRest(const Sight& sight);
     void keepRest(const Sight& sight, const LastRest& rest);
     void forgetRests();
+    struct NewDevice {
+        std::int64_t person;
+        DeviceKind kind;
+        std::string_view secret;
+        std::string_view key;
+        bool shared;
+    };
+    static void addDeviceIn(Database& database, std::int64_t device, const NewDevice& made, std::int64_t now);
+    void addSignInIn(Database& database, std::int64_t person, std::string_view link, std::int64_t now);
     static void endBrowsersIn(Database& database, std::int64_t person);
 
     std::atomic<std::uint64_t> readFailures_ = 0;

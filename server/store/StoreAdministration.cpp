@@ -29,23 +29,37 @@ bool Store::addPerson(const std::string& name, const std::vector<std::string>& h
            });
 }
 
+void Store::addDeviceIn(Database& database, std::int64_t device, const NewDevice& made, std::int64_t now) {
+    database
+        .statement(
+            "INSERT INTO device (id, person, kind, secret, key, made, shared) "
+            "VALUES ($1, $2, $3, $4, $5, $6, $7)")
+        .bind(device)
+        .bind(made.person)
+        .bind(static_cast<std::int64_t>(made.kind))
+        .bindBytes(Secret::hash(made.secret))
+        .bind(made.key)
+        .bind(now)
+        .bind(std::int64_t{made.shared})
+        .run();
+}
+
 bool Store::addDevice(std::int64_t person, DeviceKind kind, std::string_view secret, std::string_view key,
                       std::int64_t now, bool shared) {
     const std::int64_t device = Secret::number();
     return device != 0 && writeNow([&](Database& database) {
-               database
-                   .statement(
-                       "INSERT INTO device (id, person, kind, secret, key, made, shared) "
-                       "VALUES ($1, $2, $3, $4, $5, $6, $7)")
-                   .bind(device)
-                   .bind(person)
-                   .bind(static_cast<std::int64_t>(kind))
-                   .bindBytes(Secret::hash(secret))
-                   .bind(key)
-                   .bind(now)
-                   .bind(std::int64_t{shared})
-                   .run();
+               addDeviceIn(database, device, {person, kind, secret, key, shared}, now);
            });
+}
+
+std::int64_t Store::addPhoneWithLink(std::int64_t person, std::string_view secret, std::string_view link,
+                                     std::int64_t now) {
+    const std::int64_t device = Secret::number();
+    const bool good = device != 0 && writeNow([&](Database& database) {
+                          addDeviceIn(database, device, {person, DeviceKind::Phone, secret, "", false}, now);
+                          addSignInIn(database, person, link, now);
+                      });
+    return good ? device : 0;
 }
 
 int Store::revokeDevices(std::int64_t person, std::int64_t now) {

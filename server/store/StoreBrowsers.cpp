@@ -4,16 +4,18 @@
 
 namespace ktr::server {
 
+void Store::addSignInIn(Database& database, std::int64_t person, std::string_view link, std::int64_t now) {
+    const std::int64_t latest = present(now);
+    database.statement("DELETE FROM sign_in WHERE until <= $1").bind(latest).run();
+    database.statement("INSERT INTO sign_in (link, person, until) VALUES ($1, $2, $3)")
+        .bindBytes(Secret::hash(link))
+        .bind(person)
+        .bind(latest + kSignInLasts)
+        .run();
+}
+
 bool Store::addSignIn(std::int64_t person, std::string_view link, std::int64_t now) {
-    return writeNow([&](Database& database) {
-        const std::int64_t latest = present(now);
-        database.statement("DELETE FROM sign_in WHERE until <= $1").bind(latest).run();
-        database.statement("INSERT INTO sign_in (link, person, until) VALUES ($1, $2, $3)")
-            .bindBytes(Secret::hash(link))
-            .bind(person)
-            .bind(latest + kSignInLasts)
-            .run();
-    });
+    return writeNow([&](Database& database) { addSignInIn(database, person, link, now); });
 }
 
 SignIn Store::signIn(std::string_view link, std::string_view session, std::int64_t now) {

@@ -121,8 +121,7 @@ class OperationTest(unittest.TestCase):
         other.execute("BEGIN IMMEDIATE")
         status, _ = service.post("Ann", secret, True, _type="location", lat=1, lon=2, tst=int(time.time()))
         self.assertEqual(status, 503)
-        # Its health is what the last sweep found.
-        self.wait_for_health(503)
+        self.assertEqual(service.request("GET", "/health", by_socket=True)[0], 503, "at once")
         other.execute("ROLLBACK")
         self.wait_for_health(200)
         log = service.log()
@@ -141,9 +140,11 @@ class OperationTest(unittest.TestCase):
             other.execute(f"ALTER TABLE {table} RENAME TO gone")
             if table != "fix":  # which is read of those alone who are seen
                 self.assertEqual(service.ask("Ann", reader, "nobody@x.example", by_socket=True)[0], 503, table)
+                self.assertEqual(service.request("GET", "/health", by_socket=True)[0], 503, table)
             status = service.post("Ann", secret, True, _type="location", lat=1, lon=2, tst=int(time.time()))[0]
             self.assertEqual(status, 503, table)
             other.execute(f"ALTER TABLE gone RENAME TO {table}")
+        self.wait_for_health(200)
         status, text = service.ask("Ann", reader, "a\0@x.example", "nobody@x.example", by_socket=True)
         self.assertEqual((status, len(json.loads(text)["emails"])), (200, 2), "no text of a handle is a failure")
         self.assertEqual(service.ask("Ann", reader, "nobody@x.example", by_socket=True)[0], 200)

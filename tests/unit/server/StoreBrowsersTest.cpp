@@ -36,6 +36,18 @@ TEST_P(StoreBrowsers, Link_EndsAfterItsQuarterOfAnHour_WhateverTheClockSaysThen)
     EXPECT_EQ(store_->signIn("second", "session", kNow + Store::kSignInLasts + 899), SignIn::Done);
 }
 
+TEST_P(StoreBrowsers, PhoneWithItsLink_IsThereAsAWhole_OrNotAtAll) {
+    const std::int64_t phone = store_->addPhoneWithLink(mara_, "mara's", "link", kNow);
+    bool failed = false;
+    ASSERT_TRUE(store_->deviceOf("mara's", failed));
+    EXPECT_EQ(store_->deviceOf("mara's", failed)->id, phone);
+    // This link is there already.
+    EXPECT_EQ(store_->addPhoneWithLink(mara_, "another", "link", kNow), 0);
+    EXPECT_FALSE(store_->deviceOf("another", failed));
+    EXPECT_EQ(store_->devicesOf(mara_).size(), 1U);
+    EXPECT_EQ(store_->signIn("link", "session", kNow + 1), SignIn::Done);
+}
+
 TEST_P(StoreBrowsers, Browser_EndsAfterItsTime_AndWhenItIsEnded) {
     for (const char* name : {"first", "second"}) {
         ASSERT_TRUE(store_->addSignIn(ann_, name, kNow));
