@@ -57,7 +57,7 @@ std::optional<FenceRequest> FenceRequest::read(const Dictionary& body, std::stri
     request.handle = fields.string("handle").value_or("");
     const std::string trigger = fields.string("trigger").value_or("");
     request.once = fields.boolean("once").value_or(true);
-    fields.object("place", [&](FieldReader& place) { readPlace(place, request.place); });
+    fields.object("place", [&](FieldReader& there) { readPlace(there, request.place); });
     if (!complaints && request.handle.empty()) {
         fields.complain("handle", "expected the handle of a friend");
     }

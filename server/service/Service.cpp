@@ -345,8 +345,14 @@ void Service::answerLocations(const Device& device, const Dictionary& body, cons
     for (const std::string& handle : request->handles) {
         client += '\n' + handle;
     }
-    held_->give(
-        client, [this, device, asked = *request] { return locationsNow(device, asked); }, reply);
+    const auto now = [this, device = device, asked = *request]() -> HeldAnswers::Answer {
+        // While it was held its secret may have ended.
+        if (!store_->isInUse(device.id).value_or(true)) {
+            return {"", {}, [] { return refusal(401, "the credentials are missing or wrong"); }};
+        }
+        return locationsNow(device, asked);
+    };
+    held_->give(client, now, reply);
 }
 
 HttpResponse Service::locations(const Device& device, const Dictionary& body) {

@@ -1,5 +1,6 @@
 // The part of the store that the service writes while it runs: nobody waits for it.
 #include <algorithm>
+#include <utility>
 
 #include "server/store/Store.h"
 
@@ -9,6 +10,16 @@ namespace {
 
 /// More than this at a step makes those who post wait.
 constexpr std::int64_t kPeopleAStep = 10;
+
+/// Whether there are fences around a person, and grants that end where they arrive: one way to the database for the
+/// many of whom there is neither.
+std::pair<bool, bool> whatWaitsFor(Database& database, std::int64_t person) {
+    auto row = database.statement(
+        "SELECT (SELECT count(*) FROM fence WHERE subject = $1), "
+        "(SELECT count(*) FROM share WHERE owner = $1 AND arrival <> 0)");
+    row.bind(person);
+    return row.next() ? std::pair(row.integer(0) != 0, row.integer(1) != 0) : std::pair(false, false);
+}
 
 }  // namespace
 
@@ -41,8 +52,13 @@ void Store::keep(std::int64_t device, std::int64_t person, std::vector<Fix> fixe
             }
             if (!all.empty()) {
                 moves(person);
-                watchFences(database, person, all, now);
-                endOnArrival(database, person, all, now);
+                const auto [fences, arrivals] = whatWaitsFor(database, person);
+                if (fences) {
+                    watchFences(database, person, all, now);
+                }
+                if (arrivals) {
+                    endOnArrival(database, person, all, now);
+                }
             }
             database
                 .statement(

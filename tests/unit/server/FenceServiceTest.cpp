@@ -283,6 +283,15 @@ TEST_F(FenceServiceTest, HeldAnswer_EndsWithARevocation_InTheBytesOfAStranger) {
     EXPECT_EQ(body(now), body(other.read(end)));
 }
 
+TEST_F(FenceServiceTest, HeldAnswer_EndsWithItsSecret_AndSaysNothing) {
+    post(10.0);
+    const auto client = held("otto", "ann@x.example");
+    ASSERT_GT(store_->revokeDevices(ids_["otto"], now_), 0);
+    const std::string answer = client->read("}");
+    EXPECT_NE(answer.find("401"), std::string::npos) << answer;
+    EXPECT_EQ(answer.find("latitude"), std::string::npos) << answer;
+}
+
 TEST_F(FenceServiceTest, SomebodyHidden_IsHeldLikeNobody) {
     post(10.0);
     ASSERT_TRUE(store_->setHidden(ids_["ann"], true, now_));
