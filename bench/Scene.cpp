@@ -41,8 +41,10 @@ long residentKilobytes() {
     return 0;
 }
 
+/// With large blocks, which the C library maps by themselves or not, as it has learnt.
 long heapKilobytes() {
-    return static_cast<long>(mallinfo2().uordblks / 1024);
+    const auto known = mallinfo2();
+    return static_cast<long>((known.uordblks + known.hblkhd) / 1024);
 }
 
 QImage imageFor(const Scene& scene, const RowsFile& file) {

@@ -77,7 +77,10 @@ QString cleaned(const std::string& utf8) {
 
 PreparedText::PreparedText(const platform::AttributedString& source, Options options) {
     for (const auto& run : source.runs()) {
-        QString piece = JapanesePhrases::joined(cleaned(run.text));
+        QString piece = cleaned(run.text);
+        if (options.joinsPhrases) {
+            piece = JapanesePhrases::joined(piece);
+        }
         if (!options.keepsSoftHyphens) {
             piece.remove(QChar(QChar::SoftHyphen));
         }

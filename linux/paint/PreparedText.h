@@ -22,12 +22,13 @@ struct PreparedText {
     };
 
     /// What the container's limits change: without one on the lines, line ends at the very end count; without
-    /// hyphenation soft hyphens are left out.
+    /// hyphenation soft hyphens are left out; on a single line no phrase needs holding together.
     struct Options {
         bool keepsLineEnds = false;
         bool keepsSoftHyphens = true;
+        bool joinsPhrases = true;
         static Options of(const platform::TextContainer& container) {
-            return {container.maximumLines <= 0, container.hyphenationFactor > 0.0};
+            return {container.maximumLines <= 0, container.hyphenationFactor > 0.0, container.maximumLines != 1};
         }
     };
 

@@ -128,15 +128,16 @@ void QtTextEngine::dropOldest() {
 
 std::shared_ptr<const QtTextLayout> QtTextEngine::layOutOnce(const platform::AttributedString& text,
                                                              const TextContainer& container) {
+    // Moving a line that is kept costs no more than finding it moved.
+    if (auto moved = aligned(text, container)) {
+        return moved;
+    }
     const TextKey key(text, container);
     const std::size_t hash = key.hash();
     if (auto kept = find(hash, key)) {
         return kept;
     }
-    auto layout = aligned(text, container);
-    if (!layout) {
-        layout = shape(key, text, container);
-    }
+    auto layout = shape(key, text, container);
     keep({key, hash, layout, costOf(text)});
     return layout;
 }
@@ -175,10 +176,37 @@ std::shared_ptr<const QtTextLayout> QtTextEngine::shape(const TextKey& key, cons
     if (prepared.runs.empty()) {
         return std::make_shared<QtTextLayout>(nullptr, 0.0, std::vector<platform::TextLayout::Line>(), 0.0, false);
     }
+    if (auto label = shapedAsLabel(key, prepared, container, fonts)) {
+        return label;
+    }
     BrokenText broken = LineBreaker(prepared, container, fonts).run();
     auto shaped = std::make_shared<ShapedText>(key, std::move(fonts), broken);
     return std::make_shared<QtTextLayout>(std::move(shaped), 0.0, std::move(broken.lines),
                                           container.lineFragmentPadding, broken.isTruncated);
+}
+
+/// The text out of words that are kept, where it is measured on one line in the thread that keeps them.
+std::shared_ptr<const QtTextLayout> QtTextEngine::shapedAsLabel(const TextKey& key, const PreparedText& prepared,
+                                                                const TextContainer& container,
+                                                                const FontChoice& fonts) {
+    const auto& run = prepared.runs.front();
+    const double size = run.font.size;
+    if (!ShapedText::keepsGlyphsHere() || !(container == natural(container)) || !container.exclusionPaths.empty() ||
+        container.lineFragmentPadding != 0.0 || run.color ||
+        run.paragraph.writingDirection != platform::WritingDirection::Natural || !(size >= 1.0)) {
+        return nullptr;
+    }
+    const double pixels = std::round(size);
+    const double scale = size / pixels;
+    const bool rightToLeft = prepared.isRightToLeft(0, prepared.text.size(), container.rightToLeft);
+    const double ascent = run.font.ascent();
+    auto line = labels_.shaped(prepared, fonts, static_cast<int>(pixels), rightToLeft, ascent / scale);
+    if (!line) {
+        return nullptr;
+    }
+    auto shaped = std::make_shared<ShapedText>(key, fonts, scale, std::move(line->glyphs));
+    std::vector<platform::TextLayout::Line> lines = {{{0.0, 0.0, line->width * scale, run.font.lineHeight()}, ascent}};
+    return std::make_shared<QtTextLayout>(std::move(shaped), 0.0, std::move(lines), 0.0, false);
 }
 
 }  // namespace ktr::linux_

@@ -7,6 +7,7 @@
 #include <unordered_map>
 
 #include "linux/paint/FontChoice.h"
+#include "linux/paint/LineShaper.h"
 #include "linux/paint/QtTextImage.h"
 #include "linux/paint/QtTextLayout.h"
 #include "linux/paint/TextKey.h"
@@ -19,7 +20,7 @@ namespace ktr::linux_ {
 /// - With a limit of lines only as much text is shaped as can fit, however long it is. No line is measured wider than
 ///   32,000 points: a longer one counts as cut.
 /// - Words are hyphenated at soft hyphens alone: a hyphenation factor above 0 has no dictionary to use.
-/// - Layouts are kept, the least recently used ones are dropped.
+/// - What was shaped is kept, the least recently used layouts are dropped.
 /// Any thread, while a QGuiApplication exists.
 class QtTextEngine final : public platform::TextEngine {
   public:
@@ -53,6 +54,9 @@ class QtTextEngine final : public platform::TextEngine {
                                                 const platform::TextContainer& container);
     std::shared_ptr<const QtTextLayout> shape(const TextKey& key, const platform::AttributedString& text,
                                               const platform::TextContainer& container);
+    std::shared_ptr<const QtTextLayout> shapedAsLabel(const TextKey& key, const PreparedText& prepared,
+                                                      const platform::TextContainer& container,
+                                                      const FontChoice& fonts);
     std::shared_ptr<const QtTextLayout> find(std::size_t hash, const TextKey& key);
     void keep(Entry entry);
 
@@ -66,6 +70,8 @@ class QtTextEngine final : public platform::TextEngine {
     std::unordered_multimap<std::size_t, Entries::iterator> index_;
     std::size_t cost_ = 0;
     std::size_t shaped_ = 0;
+    /// The main thread's.
+    LineShaper labels_;
 };
 
 }  // namespace ktr::linux_

@@ -27,6 +27,15 @@ TEST(PreparedTextTest, JapanesePhrases_AreHeldTogether) {
     EXPECT_EQ(prepared("を探しています"), QStringLiteral("を探\u2060し\u2060て\u2060い\u2060ま\u2060す"));
 }
 
+TEST(PreparedTextTest, JapanesePhrasesOnASingleLine_NeedNoHolding) {
+    platform::TextContainer container;
+    container.maximumLines = 1;
+    const AttributedString text("を探しています", Font());
+    EXPECT_EQ(PreparedText(text, PreparedText::Options::of(container)).text, QStringLiteral("を探しています"));
+    container.maximumLines = 2;
+    EXPECT_TRUE(PreparedText(text, PreparedText::Options::of(container)).text.contains(QChar(0x2060)));
+}
+
 TEST(PreparedTextTest, LineEndsAtTheEnd_AreDropped) {
     EXPECT_EQ(prepared("a\n\n"), QStringLiteral("a"));
     EXPECT_TRUE(PreparedText(AttributedString("\n", Font()), {}).runs.empty());
