@@ -20,7 +20,7 @@ ScenePainter::Paint part(const std::shared_ptr<platform::Window>& window, double
     return [window, top, height](QtCanvas& canvas) {
         canvas.save();
         canvas.translate(0.0, -top);
-        window->paint(canvas, {0.0, top, window->bounds().width, height});
+        window->paint(canvas, canvas.seen({0.0, top, window->bounds().width, height}));
         canvas.restore();
     };
 }

@@ -49,6 +49,17 @@ QtCanvas::Grid QtCanvas::grid() const {
     return {t.m11() * k, t.m22() * k, t.dx() * k, t.dy() * k};
 }
 
+platform::Rect QtCanvas::seen(const platform::Rect& rect) const {
+    const auto* engine = painter_.paintEngine();
+    if (engine == nullptr || engine->type() != QPaintEngine::Raster) {
+        return rect;
+    }
+    const QRectF device(0.0, 0.0, painter_.device()->width(), painter_.device()->height());
+    const QRectF points = painter_.deviceTransform().inverted().mapRect(device);
+    const QRectF seen = points.intersected(QRectF(rect.x, rect.y, rect.width, rect.height));
+    return {seen.x(), seen.y(), seen.width(), seen.height()};
+}
+
 double QtCanvas::pixel() const {
     return 1.0 / std::max(grid().scaleY, 1e-6);
 }

@@ -43,6 +43,8 @@ class QtCanvas final : public platform::Canvas {
     const Palette& palette() const { return palette_; }
     /// The rectangle that `rect` becomes on the grid of device pixels, in points.
     QRectF snapped(const platform::Rect& rect) const;
+    /// What of `rect`, both in points, is on the device at all; all of it on a vector device.
+    platform::Rect seen(const platform::Rect& rect) const;
     /// The size of a device pixel, points.
     double pixel() const;
 

@@ -2,11 +2,11 @@
 
 #include <QBuffer>
 #include <QHashFunctions>
-#include <QImageWriter>
 #include <QPageSize>
 #include <QPainter>
 #include <QPdfWriter>
 #include <QSvgGenerator>
+#include <algorithm>
 #include <cmath>
 
 #include "linux/paint/PngEncoder.h"
@@ -14,6 +14,10 @@
 namespace ktr::linux_ {
 
 namespace {
+
+/// Of a picture that is painted band by band: some 4 MB each.
+constexpr int kBandPixels = 1000000;
+constexpr int kLeastBand = 64;
 
 int pixels(double points, double scale) {
     return static_cast<int>(std::ceil(points * scale - 1e-6));
@@ -67,9 +71,10 @@ std::optional<std::string> ScenePainter::refusal() const {
     return std::nullopt;
 }
 
-void ScenePainter::paintOn(QPaintDevice& device, double painterScale, double pixelsPerDeviceUnit,
-                           const Paint& paint) const {
+void ScenePainter::paintOn(QPaintDevice& device, double painterScale, double pixelsPerDeviceUnit, const Paint& paint,
+                           int top) const {
     QPainter painter(&device);
+    painter.translate(0.0, -top);
     painter.setRenderHints(QPainter::Antialiasing | QPainter::TextAntialiasing | QPainter::SmoothPixmapTransform);
     painter.scale(painterScale, painterScale);
     QtCanvas canvas(painter, palette_, pixelsPerDeviceUnit);
@@ -129,16 +134,18 @@ QByteArray ScenePainter::pdf(const Paint& paint) const {
     return withoutDates(std::move(data));
 }
 
-QByteArray ScenePainter::png(const QImage& picture) {
-    QByteArray data = encodedAsPng(picture);
-    if (data.isEmpty()) {
-        QBuffer buffer(&data);
-        buffer.open(QIODevice::WriteOnly);
-        if (!QImageWriter(&buffer, "png").write(picture)) {
-            data.clear();
-        }
+QByteArray ScenePainter::png(const Paint& paint) const {
+    const int width = pixels(size_.width, scale_);
+    const int height = pixels(size_.height, scale_);
+    const int most = std::clamp(kBandPixels / width, kLeastBand, std::max(kLeastBand, height));
+    PngEncoder encoder(width, height, background_.alpha() == 0xFF);
+    QImage band(width, std::min(most, height), QImage::Format_ARGB32_Premultiplied);
+    for (int top = 0; !band.isNull() && top < height; top += most) {
+        band.fill(Qt::transparent);
+        paintOn(band, scale_, 1.0, paint, top);
+        encoder.add(band, std::min(most, height - top));
     }
-    return data;
+    return encoder.file();
 }
 
 std::optional<std::string> ScenePainter::add(const std::string& path, const Paint& paint,
@@ -156,7 +163,7 @@ std::optional<std::string> ScenePainter::add(const std::string& path, const Pain
     if (auto problem = documents::StagedFiles::refusal(path); !problem.empty()) {
         return problem;
     }
-    const QByteArray data = format == u"png" ? png(image(paint)) : format == u"svg" ? svg(paint) : pdf(paint);
+    const QByteArray data = format == u"png" ? png(paint) : format == u"svg" ? svg(paint) : pdf(paint);
     if (data.isEmpty()) {
         return path + ": there is not enough memory for the picture";
     }

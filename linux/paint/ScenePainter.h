@@ -20,7 +20,8 @@ namespace ktr::linux_ {
 /// thread, while a QGuiApplication exists.
 class ScenePainter {
   public:
-    /// Paints the scene on a canvas whose coordinates are points.
+    /// Paints the scene on a canvas whose coordinates are points. A PNG is painted band by band, so that it is called
+    /// for each: QtCanvas::seen says which part is wanted.
     using Paint = std::function<void(QtCanvas&)>;
 
     /// Neither side of a picture may have more pixels.
@@ -49,10 +50,12 @@ class ScenePainter {
     static Paint view(const std::shared_ptr<platform::View>& view);
 
   private:
-    void paintOn(QPaintDevice& device, double painterScale, double pixelsPerDeviceUnit, const Paint& paint) const;
+    /// From `top` pixels below the picture's top on, where the device is a band of it.
+    void paintOn(QPaintDevice& device, double painterScale, double pixelsPerDeviceUnit, const Paint& paint,
+                 int top = 0) const;
     QByteArray svg(const Paint& paint) const;
     QByteArray pdf(const Paint& paint) const;
-    static QByteArray png(const QImage& picture);
+    QByteArray png(const Paint& paint) const;
 
     platform::Size size_;
     double scale_;

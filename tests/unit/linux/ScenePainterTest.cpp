@@ -85,6 +85,41 @@ TEST_F(ScenePainterTest, PngFile_IsTheImage) {
     EXPECT_EQ(read.convertToFormat(QImage::Format_RGB32), painter_.image(paint).convertToFormat(QImage::Format_RGB32));
 }
 
+// Its bands are painted one by one: what stands on their edges must not show it.
+TEST_F(ScenePainterTest, TallPngFile_IsTheImage) {
+    const ScenePainter tall({4000, 700}, 1.0, Palette::of(ColorScheme::Light));
+    int bands = 0;
+    const auto scene = [&bands](QtCanvas& canvas) {
+        ++bands;
+        for (int i = 0; i < 100; ++i) {
+            platform::Path circle;
+            circle.addEllipse({13.3 * i, 7.1 * i, 90.0, 90.0});
+            canvas.fill(circle, platform::Color::ofRole(platform::ColorRole::Highlight));
+            canvas.fill(platform::Rect{20.0 * i, 6.9 * i, 15.0, 0.5},
+                        platform::Color::ofRole(platform::ColorRole::StandardText));
+        }
+    };
+    ASSERT_EQ(tall.write(path("a.png"), scene), std::nullopt);
+    EXPECT_GE(bands, 3);
+    const QImage read(QString::fromStdString(path("a.png")));
+    EXPECT_EQ(read.convertToFormat(QImage::Format_RGB32), tall.image(scene).convertToFormat(QImage::Format_RGB32));
+}
+
+TEST_F(ScenePainterTest, TallPngFile_IsNeverInMemoryAsAWhole) {
+    const ScenePainter tall({400, 30000}, 1.0, Palette::of(ColorScheme::Light));
+    double most = 0.0;
+    double sum = 0.0;
+    const auto scene = [&](QtCanvas& canvas) {
+        const platform::Rect seen = canvas.seen({0.0, 0.0, 400.0, 30000.0});
+        most = std::max(most, seen.height);
+        sum += seen.height;
+    };
+    ASSERT_EQ(tall.write(path("a.png"), scene), std::nullopt);
+    EXPECT_LE(most, 2500.0);
+    EXPECT_GE(sum, 30000.0);
+    EXPECT_LE(sum, 32500.0);
+}
+
 TEST_F(ScenePainterTest, PictureBeyondTheLimit_IsRefusedByName) {
     const ScenePainter tall({100, 20000}, 2.0, Palette::of(ColorScheme::Light));
     EXPECT_TRUE(tall.image(paint).isNull());
