@@ -25,6 +25,18 @@ struct MonogramSize {
 constexpr std::array<MonogramSize, 5> kMonogramSizes = {{{42, 19}, {58, 27}, {72, 41}, {89, 50}, {89, 38}}};
 constexpr int kFilledCircle = 1;
 
+/// They are asked for with each contact, and are the same for as long as a platform is installed.
+struct SharedContactKeys {
+    static std::shared_ptr<SharedContactKeys> makeShared() {
+        return std::make_shared<SharedContactKeys>(SharedContactKeys{ContactsUtilities::contactKeys()});
+    }
+    ContactKeys keys;
+};
+
+const ContactKeys& sharedKeys() {
+    return platform::shared<SharedContactKeys>()->keys;
+}
+
 }  // namespace
 
 std::shared_ptr<ContactStore> ContactsUtilities::contactStore() {
@@ -78,7 +90,7 @@ std::shared_ptr<Contact> ContactsUtilities::contactForEmail(const std::optional<
     if (!store || !email || email->empty()) {
         return nullptr;
     }
-    return findOptimalContactInContacts(store->unifiedContactsMatchingEmailAddress(*email, contactKeys()).result);
+    return findOptimalContactInContacts(store->unifiedContactsMatchingEmailAddress(*email, sharedKeys()).result);
 }
 
 std::shared_ptr<Contact> ContactsUtilities::contactForPhone(const std::optional<std::string>& phone) {
@@ -87,7 +99,7 @@ std::shared_ptr<Contact> ContactsUtilities::contactForPhone(const std::optional<
     if (!store || !phone || phone->empty()) {
         return nullptr;
     }
-    return findOptimalContactInContacts(store->unifiedContactsMatchingPhoneNumber(*phone, contactKeys()).result);
+    return findOptimalContactInContacts(store->unifiedContactsMatchingPhoneNumber(*phone, sharedKeys()).result);
 }
 
 std::shared_ptr<Contact> ContactsUtilities::contactForAssistantId(const std::optional<std::string>& identifier) {
@@ -101,7 +113,7 @@ std::shared_ptr<Contact> ContactsUtilities::contactForAssistantId(const std::opt
     if (!contactIdentifier) {
         return nullptr;
     }
-    const auto fetch = store->unifiedContactWithIdentifier(*contactIdentifier, contactKeys());
+    const auto fetch = store->unifiedContactWithIdentifier(*contactIdentifier, sharedKeys());
     if (fetch.error) {
         LogCategory_Unspecified()->write(platform::LogLevel::Error, "Could not find contact for assistant ID %@ : %@",
                                          *identifier, fetch.error);

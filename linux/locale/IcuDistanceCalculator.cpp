@@ -1,9 +1,12 @@
 #include "linux/locale/IcuDistanceCalculator.h"
 
+#include <algorithm>
+#include <array>
 #include <cmath>
 #include <functional>
 #include <string_view>
 #include <utility>
+#include <vector>
 
 #include <unicode/locid.h>
 #include <unicode/numberformatter.h>
@@ -34,6 +37,19 @@ constexpr std::size_t kHashFactor = 0x9E3779B97F4A7C15U;
 bool isShortUnit(const icu::MeasureUnit& unit) {
     const std::string_view name = unit.getIdentifier();
     return name == "meter" || name == "yard" || name == "foot";
+}
+
+/// 0 for a unit that no region measures its roads in.
+double metresIn(std::string_view unit) {
+    constexpr std::array<std::pair<std::string_view, double>, 6> kUnits = {{{"meter", 1.0},
+                                                                            {"kilometer", 1000.0},
+                                                                            {"foot", 0.3048},
+                                                                            {"yard", 0.9144},
+                                                                            {"mile", 1609.344},
+                                                                            {"mile-scandinavian", 10000.0}}};
+    const auto* found =
+        std::find_if(kUnits.begin(), kUnits.end(), [unit](const auto& known) { return known.first == unit; });
+    return found == kUnits.end() ? 0.0 : found->second;
 }
 
 icu::Locale localeOf(const std::string& tag) {
@@ -127,12 +143,55 @@ icu::Locale withDigitsOf(icu::Locale language, const std::string& region) {
 
 }  // namespace
 
+/// Asking for the unit costs four times as much as writing in one that is known. From which distance to which a unit
+/// serves is learnt from the answers: units follow each other, so that what lies between two distances in one unit is
+/// in it too.
 struct IcuDistanceCalculator::Formatter {
+    struct Stretch {
+        std::string unit;
+        double metres = 1.0;  ///< in the unit
+        double from = 0.0;
+        double to = 0.0;
+        icu::number::LocalizedNumberFormatter format;
+    };
+
+    std::optional<icu::number::FormattedNumber> known(double metres, UErrorCode& status) const;
+    void learn(const icu::MeasureUnit& unit, double metres);
+
+    /// Chooses the unit.
     icu::number::LocalizedNumberFormatter road;
-    /// The same in whole tens, for the units in which roads are rounded to fifties.
+    /// For the units in which roads are rounded to fifties: whole tens. For the others what `road` does of itself.
     icu::number::LocalizedNumberFormatter tens;
+    icu::number::LocalizedNumberFormatter twoDigits;
+    std::vector<Stretch> stretches;
     bool usable = false;
 };
+
+std::optional<icu::number::FormattedNumber> IcuDistanceCalculator::Formatter::known(double metres,
+                                                                                    UErrorCode& status) const {
+    const auto found = std::find_if(stretches.begin(), stretches.end(), [metres](const Stretch& stretch) {
+        return metres >= stretch.from && metres <= stretch.to;
+    });
+    return found == stretches.end() ? std::nullopt
+                                    : std::optional(found->format.formatDouble(metres / found->metres, status));
+}
+
+void IcuDistanceCalculator::Formatter::learn(const icu::MeasureUnit& unit, double metres) {
+    const std::string_view name = unit.getIdentifier();
+    auto found = std::find_if(stretches.begin(), stretches.end(),
+                              [name](const Stretch& stretch) { return stretch.unit == name; });
+    if (found == stretches.end()) {
+        const double size = metresIn(name);
+        if (size == 0.0) {
+            return;
+        }
+        const auto& format = isShortUnit(unit) ? tens : twoDigits;
+        stretches.push_back({std::string(name), size, metres, metres, format.unit(unit)});
+        return;
+    }
+    found->from = std::min(found->from, metres);
+    found->to = std::max(found->to, metres);
+}
 
 IcuDistanceCalculator::IcuDistanceCalculator(Settings settings, std::optional<UnitSystem> override,
                                              std::shared_ptr<platform::Geodesy> geodesy)
@@ -150,11 +209,13 @@ IcuDistanceCalculator::IcuDistanceCalculator(Settings settings, std::optional<Un
         withDigitsOf(localeOf(settings_.languageLocale.value_or(settings_.measurementSystemLocale)),
                      settings_.measurementSystemLocale);
     UErrorCode status = U_ZERO_ERROR;
-    const auto road = icu::number::NumberFormatter::forSkeleton(u"unit/meter usage/road", status)
-                          .unitWidth(UnitWidth::inRow(language));
     const icu::Locale locale = withRegionOverride(language, region);
-    formatter_->road = road.locale(locale);
-    formatter_->tens = road.precision(icu::number::Precision::increment(kStep)).locale(locale);
+    const auto plain = icu::number::NumberFormatter::withLocale(locale).unitWidth(UnitWidth::inRow(language));
+    formatter_->road = icu::number::NumberFormatter::forSkeleton(u"unit/meter usage/road", status)
+                           .unitWidth(UnitWidth::inRow(language))
+                           .locale(locale);
+    formatter_->tens = plain.precision(icu::number::Precision::increment(kStep));
+    formatter_->twoDigits = plain.precision(icu::number::Precision::integer().withMinDigits(2));
     formatter_->usable = U_SUCCESS(status);
 }
 
@@ -195,12 +256,19 @@ std::string IcuDistanceCalculator::worded(double metres) const {
         return {};
     }
     UErrorCode status = U_ZERO_ERROR;
-    auto formatted = formatter_->road.formatDouble(metres, status);
-    if (metres >= kLeastInTens && isShortUnit(formatted.getOutputUnit(status))) {
-        formatted = formatter_->tens.formatDouble(metres, status);
+    auto formatted = formatter_->known(metres, status);
+    if (!formatted) {
+        formatted = formatter_->road.formatDouble(metres, status);
+        const icu::MeasureUnit unit = formatted->getOutputUnit(status);
+        if (U_SUCCESS(status) && metres >= kLeastInTens) {
+            formatter_->learn(unit, metres);
+            if (auto direct = formatter_->known(metres, status)) {
+                formatted = std::move(direct);
+            }
+        }
     }
     std::string text;
-    formatted.toString(status).toUTF8String(text);
+    formatted->toTempString(status).toUTF8String(text);
     if (U_FAILURE(status)) {
         return {};
     }

@@ -4,9 +4,14 @@
 
 #include <cmath>
 #include <limits>
+#include <random>
+
+#include <unicode/locid.h>
+#include <unicode/numberformatter.h>
 
 #include "linux/locale/IcuNumberFormatter.h"
 #include "linux/locale/LocaleRegion.h"
+#include "linux/locale/UnitWidth.h"
 #include "linux/positions/GeographicLibGeodesy.h"
 #include "tests/support/Doubles.h"
 
@@ -67,6 +72,36 @@ TEST_F(IcuDistanceCalculatorTest, Digits_AreThoseOfTheNumbersBesideIt) {
 
 TEST_F(IcuDistanceCalculatorTest, WithoutALanguage_TheRegionsOwnIsUsed) {
     EXPECT_EQ(text(std::nullopt, "de-AT", 950.0), "0,95\u00a0km");
+}
+
+// Once a unit is known to serve a distance it is not asked for again: the words must stay those that ICU chooses.
+TEST_F(IcuDistanceCalculatorTest, ManyDistances_AreWordedAsIcuWordsRoads) {
+    std::mt19937 random(5);
+    std::uniform_real_distribution<double> exponent(0.0, 7.2);
+    for (const char* tag :
+         {"ar-EG", "de-DE", "el-GR", "en-GB", "en-US", "es-ES", "fa-IR", "fr-FR", "he-IL", "hi-IN", "it-IT",
+          "ja-JP", "ko-KR", "nl-NL", "pl-PL", "pt-BR", "ru-RU", "sv-SE", "tr-TR", "uk-UA", "zh-CN", "zh-TW"}) {
+        UErrorCode status = U_ZERO_ERROR;
+        const auto locale = icu::Locale::forLanguageTag(tag, status);
+        const auto road = icu::number::NumberFormatter::forSkeleton(u"unit/meter usage/road", status)
+                              .unitWidth(UnitWidth::inRow(locale));
+        const auto whole = road.locale(locale);
+        const auto tens = road.precision(icu::number::Precision::increment(10.0)).locale(locale);
+        const auto wording = calculator(std::nullopt, tag);
+        for (int i = 0; i < 400; ++i) {
+            const double metres =
+                i % 4 == 0 ? std::round(std::pow(10.0, exponent(random))) : std::pow(10.0, exponent(random));
+            auto expected = whole.formatDouble(metres, status);
+            const std::string unit = expected.getOutputUnit(status).getIdentifier();
+            if (metres >= 10.0 && (unit == "meter" || unit == "yard" || unit == "foot")) {
+                expected = tens.formatDouble(metres, status);
+            }
+            std::string text;
+            expected.toString(status).findAndReplace(u" ", u"\u00a0").toUTF8String(text);
+            ASSERT_EQ(wording.localizedDistance(metres).value_or("(none)"), text) << tag << ", " << metres << " m";
+        }
+        ASSERT_TRUE(U_SUCCESS(status));
+    }
 }
 
 TEST_F(IcuDistanceCalculatorTest, SamePlacesAgain_AreNotMeasuredAgain) {
