@@ -147,6 +147,7 @@ struct Parser {
                                ->type_name("FILE")
                                ->needs(hook);
         hook->needs(key);
+        watch->footer("Example: ktr watch --print");
         show->footer(kShowExamples);
         render->footer(kRenderExamples);
         describe->footer(kDescribeExamples);

@@ -27,6 +27,7 @@ constexpr std::pair<const char*, const char*> kExamples[] = {
     {"places", "places Ann"},
     {"zone", "zone Ann Europe/Berlin"},
     {"looks", "looks Ann"},
+    {"fences", "fences Ann --end 2"},
     {"backup", "backup /var/backups/ktr-service.backup"},
     {"restore", "restore /var/backups/ktr-service.backup"},
     {"confirm", "confirm Mara"},
