@@ -90,7 +90,7 @@ SeenRequests::~SeenRequests() {
 SeenRequests::Keys SeenRequests::keysOf(const HttpRequest& request) {
     std::string common = request.scheme + '\n' + request.host + '\n' + request.fallbackHost + '\n' + request.path;
     for (const auto& [name, value] : request.headers) {
-        common += '\n' + name + ':' + value;
+        common.append(1, '\n').append(name).append(1, ':').append(value);
     }
     common += '\n';
     const auto read = documents::JsonReader::read(request.body);
