@@ -44,7 +44,7 @@ class CameraTest(unittest.TestCase):
         return done.stdout.strip()
 
     def test_code_of_a_phone_is_read(self):
-        for name in ("Ann", "Z", "Otto with a name of forty letters or so.."):
+        for name in ("Ann", "Z", "Otto with a name of forty letters or so."):
             output = self.service.command("add", name, "--handle", f"p{len(name)}@x.example", "--code")
             code = [line for line in output.splitlines() if re.fullmatch("[█▀▄ ]{20,}", line)]
             self.assertGreater(len(code), 10, output)
