@@ -21,8 +21,8 @@ struct VCardText {
     static constexpr std::size_t kMostProperties = 1'000;
     /// A property in more parts (between semicolons and commas) is left out.
     static constexpr std::size_t kMostParts = 100;
-    /// So is one that is longer, but for pictures: a name of a row's that long takes the main thread seconds to measure.
-    /// Bytes.
+    /// So is one that is longer, but for pictures: a name of a row's that long takes the main thread seconds to
+    /// measure. Bytes.
     static constexpr std::size_t kLongestProperty = std::size_t{4} << 10;
 
     struct Card {
