@@ -64,6 +64,19 @@ const char* const kDescribeExamples = R"(Examples:
   ktr describe dinner.json --language ar
   ktr describe --live 10s --ask "Where is Ann?")";
 
+const char* const kAskExamples = R"(Examples:
+  ktr ask "Where is Ann?"
+  ktr ask "Who is near the harbour?" --json
+  ktr ask "Wo ist Otto?" --language de --speak
+  ktr ask "Where is Ann?" -o ann.png
+
+Exit status, beside those of every command:
+  0   found, or done            10  nobody of those asked for can be seen
+  11  several have that name    12  nobody has that name
+  13  you are hidden            14  the service gave no answer
+  15  not signed in             16  not understood
+  17  the computer is locked    18  not done: it cannot be done as it was said)";
+
 /// Texts as they were given; read into Options once the parser is content.
 struct Words {
     std::string language, textSize, idiom, at, live;
@@ -91,6 +104,7 @@ struct Parser {
     CLI::App* show = nullptr;
     CLI::App* render = nullptr;
     CLI::App* describe = nullptr;
+    CLI::App* ask = nullptr;
     std::unique_ptr<ServeArguments> serve;
     CLI::App* watch = nullptr;
     Options options;
@@ -103,6 +117,16 @@ struct Parser {
         show = app.add_subcommand("show", "Opens a window on the conversation that scenarios tell");
         render = app.add_subcommand("render", "Draws a scenario to a PNG, SVG or PDF file, without a display");
         describe = app.add_subcommand("describe", "Prints what a screen reader would say, in reading order");
+        ask = app.add_subcommand("ask", "Asks one question and prints the answer");
+        ask->add_option("question", options.questions, "The question, in words")
+            ->required()
+            ->expected(1)
+            ->type_name("QUESTION");
+        ask->add_flag("--json", options.json, "Print all of the answer, as one line of JSON");
+        ask->add_flag("--speak", options.speak, "Say the sentence aloud, through speech-dispatcher");
+        ask->add_option("-o,--output", options.output, "Draw the answer, too")->type_name("FILE.png|.svg|.pdf");
+        addCommon(*ask);
+        ask->footer(kAskExamples);
         show->add_option("scenarios", options.scenarios,
                          "Scenario files; one turn of the conversation each. Without one the window is live")
             ->type_name("SCENARIO");
@@ -241,6 +265,10 @@ std::string readLive(const Words& words, Options& options) {
         }
         options.liveSeconds = *seconds;
     }
+    if (options.command == Options::Command::Ask) {
+        options.live = true;
+        return "";
+    }
     if (!options.live && !options.questions.empty()) {
         return "--ask: nobody answers in a scenario; add --live";
     }
@@ -326,7 +354,8 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
         }
         return parser.options;
     }
-    parser.options.command = parser.show->parsed()     ? Options::Command::Show
+    parser.options.command = parser.ask->parsed()      ? Options::Command::Ask
+                             : parser.show->parsed()   ? Options::Command::Show
                              : parser.render->parsed() ? Options::Command::Render
                                                        : Options::Command::Describe;
     if (const std::string complaint = readWords(parser.words, parser.options); !complaint.empty()) {
@@ -336,8 +365,8 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
         return misuse(complaint);
     }
     const std::string& output = parser.options.output;
-    if (parser.render->parsed() && !endsWith(output, ".png") && !endsWith(output, ".svg") &&
-        !endsWith(output, ".pdf")) {
+    const bool draws = parser.render->parsed() || !output.empty();
+    if (draws && !endsWith(output, ".png") && !endsWith(output, ".svg") && !endsWith(output, ".pdf")) {
         return misuse(wrong("--output", "a file name that ends in .png, .svg or .pdf", output));
     }
     return parser.options;

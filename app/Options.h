@@ -11,7 +11,7 @@ namespace ktr::app {
 
 /// What the command line asks for. Members that are none leave the decision to the scenario, then to the session.
 struct Options : host::HostOptions {
-    enum class Command { Show, Render, Describe, Serve, Watch };
+    enum class Command { Show, Render, Describe, Ask, Serve, Watch };
 
     Command command = Command::Show;
     std::vector<std::string> scenarios;  ///< never empty where nothing is live, but for serve
@@ -20,6 +20,8 @@ struct Options : host::HostOptions {
     double liveSeconds = 0.0;            ///< of a live render and describe: how long it goes on
     std::vector<std::string> questions;  ///< of what is live: asked at the start, in this order
     std::string output;                  ///< of render: a file ending in .png, .svg or .pdf
+    bool json = false;                   ///< of ask: all of the answer, as JSON
+    bool speak = false;                  ///< of ask: say it aloud
     std::string plugin;                  ///< empty: looked for
     serve::ServeOptions serve;           ///< of serve
     WatchCommand::Options watch;         ///< of watch

@@ -8,6 +8,7 @@
 #include <memory>
 #include <vector>
 
+#include "app/AskCommand.h"
 #include "app/CommandLine.h"
 #include "app/Description.h"
 #include "app/LiveRun.h"
@@ -90,6 +91,10 @@ host::ExitCode runHeadless(const Options& options, const host::HostSettings& set
         return fail(*failure);
     }
     host::Host& host = *std::get<std::unique_ptr<host::Host>>(made);
+    if (options.command == Options::Command::Ask) {
+        // Its own numbers, beside those of an attempt.
+        return static_cast<host::ExitCode>(AskCommand(host, options).run());
+    }
     const host::ExitCode code = options.live ? LiveRun(host, options).run(scenarios) : host::ExitCode::Ok;
     if (options.command == Options::Command::Render) {
         const auto failure = RenderCommand(host).write(options.output);

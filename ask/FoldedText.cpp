@@ -57,6 +57,20 @@ bool joins(char32_t c) {
     return c == U'.' || c == U'-' || c == U':';
 }
 
+bool isHebrew(char32_t c) {
+    return c >= 0x590 && c <= 0x5FF;
+}
+
+/// The hyphen with which Hebrew joins a preposition to a name in other letters says nothing.
+bool isPrepositionsHyphen(char32_t c, char32_t before, char32_t after) {
+    return (c == U'-' || c == 0x5BE) && isHebrew(before) && !isHebrew(after);
+}
+
+/// The joiner inside Persian words stands where others write a blank.
+bool isBlankInside(char32_t c, char32_t before) {
+    return c == 0x200C && before >= 0x600 && before <= 0x6FF;
+}
+
 std::u32string decomposed(char32_t c, const icu::Normalizer2& compatibility) {
     UErrorCode status = U_ZERO_ERROR;
     const icu::UnicodeString folded = compatibility.normalize(icu::UnicodeString(static_cast<UChar32>(c)), status);
@@ -145,6 +159,14 @@ bool FoldedText::isWithoutBlanks(char32_t letter) {
 FoldedText::FoldedText(std::string_view text) : text_(text) {
     for (std::size_t at = 0; at < text_.size();) {
         const auto [letter, next] = letterAt(text_, at);
+        const char32_t before = letters_.empty() ? U' ' : letters_.back();
+        if (next < text_.size() && isPrepositionsHyphen(letter, before, letterAt(text_, next).first)) {
+            at = next;
+            continue;
+        }
+        if (isBlankInside(letter, before)) {
+            append(U' ', at);
+        }
         const bool joining = joins(letter) && !letters_.empty() && letters_.back() != U' ' && next < text_.size() &&
                              u_isalnum(static_cast<UChar32>(letters_.back())) &&
                              u_isalnum(static_cast<UChar32>(letterAt(text_, next).first));

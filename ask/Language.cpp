@@ -176,7 +176,10 @@ void Language::readQuestions(FieldReader& fields) {
 
 void Language::readWords(FieldReader& fields) {
     for (const std::string& word : fields.texts("and")) {
-        conjunctions_.push_back(foldedWithBlanks(word));
+        // A comma is folded away, and parts names in every language.
+        if (const std::u32string folded = foldedWithBlanks(word); !folded.empty()) {
+            conjunctions_.push_back(folded);
+        }
     }
     fields.object("relations", [&](FieldReader& relations) {
         for (const auto& [name, value] : relations.dictionary()) {

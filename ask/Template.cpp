@@ -114,6 +114,10 @@ class Reader {
         const std::string_view written = text_.substr(begin, at_ - begin);
         Part part{Part::Kind::Words};
         part.text = FoldedText::of(written);
+        // Between an hour's slot and a minute's it is no punctuation.
+        if (written == ":" || written == ".") {
+            part.text.assign(1, static_cast<char32_t>(written.front()));
+        }
         if (isBlank(written.front())) {
             part.text.insert(part.text.begin(), U' ');
         }

@@ -1,0 +1,83 @@
+#include "app/AskCommand.h"
+
+#include <QEventLoop>
+#include <QProcess>
+#include <QTimer>
+#include <cstdio>
+#include <optional>
+
+#include "app/Messages.h"
+#include "app/RenderCommand.h"
+#include "host/asking/QuestionDesk.h"
+#include "platform/base/Json.h"
+
+namespace ktr::app {
+
+namespace {
+
+/// How long a keyring may take before the question is asked without a secret, and an answer may be spoken,
+/// milliseconds.
+constexpr int kAccountWait = 10000;
+constexpr int kSpeechWait = 60000;
+
+/// Through speech-dispatcher; waits for the end. Whether it was said.
+bool speak(const std::string& sentence, const std::string& language) {
+    QProcess speech;
+    // After "--" nothing is an option, whatever a name begins with.
+    speech.start(QStringLiteral("spd-say"),
+                 {QStringLiteral("--wait"), QStringLiteral("--application-name"), QStringLiteral("ktr"),
+                  QStringLiteral("--language"), QString::fromStdString(language.substr(0, language.find('-'))),
+                  QStringLiteral("--"), QString::fromStdString(sentence)});
+    return speech.waitForFinished(kSpeechWait) && speech.exitStatus() == QProcess::NormalExit && speech.exitCode() == 0;
+}
+
+}  // namespace
+
+int AskCommand::run() {
+    host::QuestionDesk desk(host_);
+    QEventLoop loop;
+    std::optional<ask::Answer> answer;
+    const std::string& text = options_.questions.front();
+    const auto ask = [&] {
+        desk.ask(desk.question(text, false), [&](ask::Answer given) {
+            answer = std::move(given);
+            loop.quit();
+        });
+    };
+    bool isAsked = false;
+    const auto askOnce = [&] {
+        if (!std::exchange(isAsked, true)) {
+            ask();
+        }
+    };
+    QTimer::singleShot(kAccountWait, &loop, askOnce);
+    host_.live()->start(askOnce);
+    if (!answer) {
+        loop.exec();
+    }
+    return write(text, *answer);
+}
+
+int AskCommand::write(const std::string& question, const ask::Answer& answer) {
+    const std::string text = options_.json ? platform::writeJson(ask::objectOf(answer)) : answer.sentence;
+    if (std::fputs((text + "\n").c_str(), stdout) == EOF || std::fflush(stdout) != 0) {
+        tell("the answer cannot be written");
+        return static_cast<int>(host::ExitCode::Failure);
+    }
+    if (!options_.output.empty()) {
+        host::QuestionDesk desk(host_);
+        host_.answer(*host_.addQuestion(question), desk.scenarioOf(answer));
+        host_.layOut(host_.settings().width);
+        if (const auto failure = RenderCommand(host_).write(options_.output)) {
+            tell(failure->line);
+            return static_cast<int>(failure->code);
+        }
+    }
+    if (options_.speak && !speak(answer.sentence, host_.settings().language)) {
+        tell("the answer cannot be said: speech-dispatcher (spd-say) does not answer");
+        return static_cast<int>(host::ExitCode::Failure);
+    }
+    return ask::exitCodeOf(answer.outcome);
+}
+
+}  // namespace ktr::app

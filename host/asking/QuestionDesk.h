@@ -1,0 +1,39 @@
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "ask/Engine.h"
+#include "host/Host.h"
+#include "host/asking/ServiceRequests.h"
+#include "platform/location/PlatformLocationManager.h"
+
+namespace ktr::host {
+
+/// The engine that answers questions, on a live host's contacts, service, units, position and lock. Main thread.
+class QuestionDesk {
+  public:
+    /// The host is a live one and outlives this.
+    explicit QuestionDesk(Host& host);
+
+    /// A question with what the host knows of the asker. `isLive`: its card goes on changing.
+    ask::Question question(const std::string& text, bool isLive);
+    /// Calls the completion exactly once, perhaps inside the call, and not after this is gone.
+    void ask(const ask::Question& question, const ask::Engine::Completion& completion);
+    /// The same as a turn for the conversation: the sentence, and its snippet when there is one.
+    Scenario scenarioOf(const ask::Answer& answer) const;
+    ask::Engine& engine() { return engine_; }
+
+  private:
+    void readPeople();
+
+    Host& host_;
+    ServiceRequests requests_;
+    ask::Engine engine_;
+    /// Whose contacts the engine has.
+    std::weak_ptr<platform::ContactStore> contacts_;
+    std::shared_ptr<platform::PlatformLocationManager> positions_;
+    std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);
+};
+
+}  // namespace ktr::host

@@ -1,0 +1,158 @@
+#include "ask/Language.h"
+
+#include <gtest/gtest.h>
+
+#include <chrono>
+#include <filesystem>
+#include <random>
+#include <set>
+
+#include "ask/Languages.h"
+#include "ask/Sentences.h"
+#include "ask/Understanding.h"
+
+namespace ktr::ask {
+namespace {
+
+std::filesystem::path folder() {
+    return std::filesystem::path(KTR_SOURCE_DIR) / "resources/questions";
+}
+
+std::vector<std::string> tags() {
+    std::vector<std::string> tags;
+    for (const auto& entry : std::filesystem::directory_iterator(folder())) {
+        tags.push_back(entry.path().stem().string());
+    }
+    return tags;
+}
+
+TEST(LanguageTest, EveryLanguageHasEverySentenceOfEnglishAndNoOther) {
+    Languages languages(folder());
+    const auto english = languages.language("en");
+    ASSERT_TRUE(english) << languages.problem();
+    for (const std::string& tag : tags()) {
+        const auto language = languages.language(tag);
+        ASSERT_TRUE(language) << languages.problem();
+        for (const auto& [key, text] : english->sentences()) {
+            EXPECT_TRUE(language->sentences().count(key) == 1 && !language->sentence(key).empty())
+                << tag << ": " << key;
+        }
+        EXPECT_EQ(language->sentences().size(), english->sentences().size()) << tag;
+        EXPECT_GE(language->suggestions().size(), 6U) << tag;
+        EXPECT_EQ(language->relations().size() >= 10, true) << tag;
+    }
+}
+
+TEST(LanguageTest, EverySentenceNamesWhatItIsAboutAndLeavesNothingUnfilled) {
+    Languages languages(folder());
+    const Sentences::Arguments arguments{{"name", "NNN"},     {"names", "MMM"},   {"place", "PPP"}, {"where", "WWW"},
+                                         {"distance", "DDD"}, {"far", "yes"},     {"when", "then"}, {"time", "TTT"},
+                                         {"count", "4"},      {"choices", "CCC"}, {"which", "yes"}, {"every", "no"},
+                                         {"end", "yes"}};
+    const std::map<std::string, std::vector<std::string>> wanted{{"found", {"NNN", "WWW", "DDD", "TTT"}},
+                                                                 {"foundNoWords", {"NNN", "TTT", "DDD"}},
+                                                                 {"notSeen", {"NNN"}},
+                                                                 {"ambiguous", {"NNN"}},
+                                                                 {"unknownPerson", {"NNN"}},
+                                                                 {"unknownPersonNear", {"NNN", "CCC"}},
+                                                                 {"howFar", {"NNN", "DDD", "TTT"}},
+                                                                 {"howFarUnknown", {"NNN"}},
+                                                                 {"near", {"PPP", "MMM", "TTT"}},
+                                                                 {"closest", {"PPP", "MMM", "TTT"}},
+                                                                 {"nobodyNear", {"PPP"}},
+                                                                 {"unknownPlace", {"PPP"}},
+                                                                 {"fenceArrives", {"NNN", "PPP"}},
+                                                                 {"fenceLeaves", {"NNN", "PPP"}},
+                                                                 {"sharedWith", {"MMM", "TTT"}},
+                                                                 {"hiddenFrom", {"MMM"}},
+                                                                 {"whoSees", {"MMM"}},
+                                                                 {"asked", {"NNN"}},
+                                                                 {"askedBefore", {"NNN"}},
+                                                                 {"askToShare", {"NNN"}},
+                                                                 {"seenMore", {"MMM", "4"}}};
+    for (const std::string& tag : tags()) {
+        const auto language = languages.language(tag);
+        ASSERT_TRUE(language) << languages.problem();
+        const Sentences sentences(*language, 0.0);
+        for (const auto& [key, pattern] : language->sentences()) {
+            const std::string text = sentences.text(key, arguments);
+            EXPECT_EQ(text.find_first_of("{}|"), std::string::npos) << tag << ": " << key << ": " << text;
+            EXPECT_EQ(text.find('!'), std::string::npos) << tag << ": " << key << ": " << text;
+        }
+        for (const auto& [key, words] : wanted) {
+            const std::string text = sentences.text(key, arguments);
+            for (const std::string& word : words) {
+                EXPECT_NE(text.find(word), std::string::npos) << tag << ": " << key << ": " << text;
+            }
+        }
+    }
+}
+
+TEST(LanguageTest, FileFor_NeverLeavesItsFolder) {
+    EXPECT_FALSE(Language::fileFor("../questions/en", folder()));
+    EXPECT_FALSE(Language::fileFor("", folder()));
+    EXPECT_EQ(Language::fileFor("pt-BR", folder()), folder() / "pt.json");
+    EXPECT_EQ(Language::fileFor("zh-TW", folder()), folder() / "zh-Hant.json");
+    EXPECT_EQ(Language::fileFor("zh-CN", folder()), folder() / "zh-Hans.json");
+    EXPECT_EQ(Language::fileFor("iw", folder()), folder() / "he.json");
+    EXPECT_FALSE(Language::fileFor("tlh", folder()));
+}
+
+// Whoever is found was named: every word of a friend's name, in one of its forms, stands in the question.
+TEST(LanguageTest, RandomQuestionsNeverNameTheWrongPerson) {
+    Languages languages(folder());
+    const auto english = languages.language("en");
+    ASSERT_TRUE(english);
+    Person ann;
+    ann.fullName = ann.firstName = "Annabel";
+    ann.emails = {"ann@harbour.example"};
+    Person otto;
+    otto.fullName = otto.firstName = "Ottokar";
+    otto.emails = {"otto@mail.example"};
+    const People people({ann, otto});
+    const std::vector<std::string> words{
+        "where",  "is",  "Annabel", "Ottokar", "Annabell", "Otto", "near",  "me", "tell",     "when", "leaves",
+        "work",   "and", ",",       "until",   "six",      "hide", "share", "my", "location", "with", "\xff\xfe",
+        "\u202e", "家",  "は",      "в",       "{name}",   "[",    "|",     "?",  "   ",      "'s"};
+    std::mt19937 random(20261122);  // NOLINT: the same questions every time
+    const auto all = tags();
+    for (int i = 0; i < 10000; ++i) {
+        std::string text;
+        for (std::size_t n = random() % 12; n > 0; --n) {
+            text += words[random() % words.size()] + (random() % 5 == 0 ? "" : " ");
+        }
+        Question question;
+        question.text = text;
+        const auto language = languages.language(all[random() % all.size()]);
+        const auto result = Understanding(*language, *english, people).understand(question);
+        if (const auto* understood = std::get_if<Understood>(&result)) {
+            for (const Person* person : understood->people) {
+                EXPECT_NE(text.find(person->fullName), std::string::npos) << text;
+            }
+        }
+    }
+}
+
+TEST(LanguageTest, HostileQuestionsEndSoon) {
+    Languages languages(folder());
+    const People people({});
+    const auto english = languages.language("en");
+    for (const std::string& tag : tags()) {
+        const auto language = languages.language(tag);
+        for (const std::string& piece : {std::string("where is "), std::string("a "), std::string("a and "),
+                                         std::string("家"), std::string(" ")}) {
+            Question question;
+            while (question.text.size() < 5000) {
+                question.text += piece;
+            }
+            const auto begin = std::chrono::steady_clock::now();
+            Understanding(*language, *english, people).understand(question);
+            question.text.resize(200);
+            Understanding(*language, *english, people).understand(question);
+            EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::seconds(2)) << tag << ": " << piece;
+        }
+    }
+}
+
+}  // namespace
+}  // namespace ktr::ask
