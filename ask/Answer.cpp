@@ -14,8 +14,7 @@ const char* nameOf(Outcome outcome) {
 }
 
 const char* nameOf(Action::Kind kind) {
-    constexpr std::array<const char*, 9> kNames{"none",     "chooseOne", "didYouMean",   "askToShare", "signIn",
-                                                "tryAgain", "unlock",    "askOtherwise", "shareBack"};
+    constexpr std::array<const char*, 7> kNames{"none", "chooseOne", "didYouMean", "signIn", "tryAgain", "unlock", "askOtherwise"};
     return kNames.at(static_cast<std::size_t>(kind));
 }
 
@@ -42,11 +41,7 @@ Dictionary objectOf(const Answer& answer) {
         object.set("suggestions", Value::Array(answer.suggestions.begin(), answer.suggestions.end()));
     }
     if (answer.action.kind != Action::Kind::None) {
-        Dictionary action{{"kind", nameOf(answer.action.kind)}, {"label", answer.action.label}};
-        if (!answer.action.handle.empty()) {
-            action.set("handle", answer.action.handle);
-        }
-        object.set("action", action);
+        object.set("action", Dictionary{{"kind", nameOf(answer.action.kind)}, {"label", answer.action.label}});
     }
     if (!answer.snippet.isNull()) {
         object.set("snippet", answer.snippet);

@@ -33,10 +33,9 @@ struct Choice {
 
 /// What can be done about an answer.
 struct Action {
-    enum class Kind { None, ChooseOne, DidYouMean, AskToShare, SignIn, TryAgain, Unlock, AskOtherwise, ShareBack };
+    enum class Kind { None, ChooseOne, DidYouMean, SignIn, TryAgain, Unlock, AskOtherwise };
     Kind kind = Kind::None;
     std::string label;   ///< in the answer's language; empty for none
-    std::string handle;  ///< of AskToShare: of whom
 };
 
 /// One honest answer. The host makes the picture of the snippet.

@@ -36,7 +36,7 @@ Answer Asking::failed(ServiceReply::Failure failure) const {
     Answer failed = answer(isSignedOut ? Outcome::NotSignedIn : Outcome::Unreachable,
                            sentences().text(isSignedOut ? "notSignedIn" : "unreachable"));
     failed.action = {isSignedOut ? Action::Kind::SignIn : Action::Kind::TryAgain,
-                     sentences().text(isSignedOut ? "signIn" : "tryAgain"), ""};
+                     sentences().text(isSignedOut ? "signIn" : "tryAgain")};
     return failed;
 }
 
@@ -54,7 +54,7 @@ Answer Asking::notUnderstood(const std::string& key) const {
             answer.suggestions.push_back(replaced(suggestion, "{name}", name));
         }
     }
-    answer.action = {Action::Kind::AskOtherwise, sentences().text("youCouldAsk"), ""};
+    answer.action = {Action::Kind::AskOtherwise, sentences().text("youCouldAsk")};
     return answer;
 }
 
@@ -80,9 +80,9 @@ Answer Asking::unknownPerson(const Understanding::UnknownPerson& unknown) const 
     answer.meaning = unknown.meaning;
     addChoices(answer, unknown.name, unknown.near);
     if (!near.empty()) {
-        answer.action = {Action::Kind::DidYouMean, near.front(), ""};
+        answer.action = {Action::Kind::DidYouMean, near.front()};
     } else {
-        answer.action = {Action::Kind::AskOtherwise, sentences().text("seeAll"), ""};
+        answer.action = {Action::Kind::AskOtherwise, sentences().text("seeAll")};
     }
     return answer;
 }
@@ -91,14 +91,14 @@ Answer Asking::ambiguous(const Understanding::Ambiguous& several) const {
     Answer answer = this->answer(Outcome::Ambiguous, sentences().text("ambiguous", {{"name", several.name}}));
     answer.meaning = several.meaning;
     addChoices(answer, several.name, several.people);
-    answer.action = {Action::Kind::ChooseOne, sentences().text("chooseOne"), ""};
+    answer.action = {Action::Kind::ChooseOne, sentences().text("chooseOne")};
     return answer;
 }
 
 Answer Asking::locked() const {
     Answer answer = this->answer(Outcome::Locked, sentences().text("locked"));
     answer.meaning.reset();
-    answer.action = {Action::Kind::Unlock, sentences().text("unlock"), ""};
+    answer.action = {Action::Kind::Unlock, sentences().text("unlock")};
     return answer;
 }
 

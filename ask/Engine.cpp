@@ -183,36 +183,4 @@ void Engine::wish(const Shared& asking, const Completion& completion) {
     });
 }
 
-void Engine::askToShare(const std::string& handle, const Question& question, const Completion& completion) {
-    const auto asking = std::make_shared<Asking>();
-    asking->question = question;
-    asking->people = people_;
-    asking->world = world_;
-    asking->language = languages_->language(question.language);
-    if (!asking->language) {
-        Answer answer;
-        answer.outcome = Outcome::Unreachable;
-        answer.sentence = languages_->problem();
-        return completion(answer);
-    }
-    for (const Person& person : people_->all()) {
-        const auto is = [&](const std::string& own) { return own == handle; };
-        if (std::any_of(person.emails.begin(), person.emails.end(), is) ||
-            std::any_of(person.phones.begin(), person.phones.end(), is)) {
-            asking->understood.people = {&person};
-        }
-    }
-    service_.send("askToShare", {{"handle", handle}}, [asking, handle, completion](const ServiceReply& reply) {
-        if (reply.failure == ServiceReply::Failure::NotSignedIn || reply.failure == ServiceReply::Failure::Unreachable) {
-            return completion(asking->failed(reply.failure));
-        }
-        const auto& people = asking->understood.people;
-        const std::string name = people.empty() ? handle : people.front()->shownName();
-        // Refused: it was asked today.
-        const bool isAgain = reply.failure == ServiceReply::Failure::Refused;
-        completion(asking->answer(Outcome::Found, asking->sentences().text(isAgain ? "askedBefore" : "asked",
-                                                                          {{"name", name}})));
-    });
-}
-
 }  // namespace ktr::ask

@@ -36,9 +36,6 @@ class Engine {
     /// The answer as far as it needs no service: not understood, unknown, ambiguous, locked, refused. None: the service has
     /// to be asked.
     std::optional<Answer> answerHere(const Question& question);
-    /// Asks somebody, once a day, to share where they are; the answer is the same whether or not the service knows them. The
-    /// language, the moment and the position are the question's.
-    void askToShare(const std::string& handle, const Question& question, const Completion& completion);
 
   private:
     using Shared = std::shared_ptr<const Asking>;

@@ -132,17 +132,24 @@ bool Sight::isCalled(const std::u32string& name) const {
     return std::any_of(labels.begin(), labels.end(), is) || is(street) || is(city);
 }
 
+std::string Sight::sort(const Language& language) const {
+    for (const std::string& label : labels) {
+        const std::string kind = kindOf(label);
+        const std::string sort = kind.empty() ? language.placeWord(label) : kind;
+        if (language.kindOf(sort) != nullptr) {
+            return sort;
+        }
+    }
+    return {};
+}
+
 std::string Sight::where(const Sentences& sentences) const {
-    if (!labels.empty()) {
-        const std::string kind = kindOf(labels.front());
-        if (const auto* known = sentences.language().kindOf(kind)) {
-            return known->said;
-        }
-        // A sort of place without words here: the name beside it, if there is one.
-        const std::string& name = kind.empty() ? labels.front() : labels.back();
-        if (kindOf(name).empty()) {
-            return sentences.text("atPlace", {{"place", name}});
-        }
+    if (const auto* known = sentences.language().kindOf(sort(sentences.language()))) {
+        return known->said;
+    }
+    // A sort of place without words here: the name beside it, if there is one.
+    if (!labels.empty() && kindOf(labels.back()).empty()) {
+        return sentences.text("atPlace", {{"place", kindOf(labels.front()).empty() ? labels.front() : labels.back()}});
     }
     if (!street.empty()) {
         return sentences.text("onStreet", {{"place", street}});

@@ -31,6 +31,8 @@ struct Sight {
     double from(const World& world, double otherLatitude, double otherLongitude) const;
     /// Whether one of its names is this one, folded: a label, its street, its town.
     bool isCalled(const std::u32string& name) const;
+    /// The sort of place by its labels: "home", "work"; empty: of none that the language has a word for.
+    std::string sort(const Language& language) const;
     /// "at home", "at Fish Market", "in Brinmouth"; empty: it has no words.
     std::string where(const Sentences& sentences) const;
     /// The sentence "Ann is at Fish Market, 310 m away.", with the time where it may not hold any more.

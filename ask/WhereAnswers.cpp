@@ -74,11 +74,6 @@ Answer WhereAnswers::nobodySeen() const {
     const auto& people = asking_.understood.people;
     Answer answer =
         asking_.answer(Outcome::NotSeen, people.empty() ? sentences_.text("nobodySeen") : unseenSentences());
-    if (people.size() == 1) {
-        answer.action = {Action::Kind::AskToShare,
-                         sentences_.text("askToShare", {{"name", people.front()->shownName()}}),
-                         people.front()->handle()};
-    }
     return answer;
 }
 
@@ -183,13 +178,13 @@ Answer WhereAnswers::isAt(const std::vector<Place>& ownPlaces) const {
     const auto known = place(ownPlaces);
     std::vector<std::string> told;
     for (const Sight& sight : sights_) {
-        const std::string kind = "_$!<" + understood.placeWord + ">!$_";
-        const bool isOwnKind = !understood.placeWord.empty() && std::find(sight.labels.begin(), sight.labels.end(), kind) != sight.labels.end();
-        const bool isCalled = isOwnKind || (understood.placeWord.empty() && sight.isCalled(name));
-        const bool canTell = understood.placeWord.empty() || understood.placeWord == "me" ? known.has_value()
-                                                                                         : !sight.labels.empty();
-        const bool isThere = isCalled || (known && (understood.placeWord.empty() || understood.placeWord == "me") &&
-                                          sight.from(asking_.world, known->latitude, known->longitude) <= kAt);
+        const std::string sort = sight.sort(*asking_.language);
+        const bool isSort = !understood.placeWord.empty() && understood.placeWord != "me";
+        const bool isCalled = isSort ? sort == understood.placeWord : understood.placeWord.empty() && sight.isCalled(name);
+        // Whoever is at a place of another sort is not there; of one without a sort nobody can tell.
+        const bool canTell = isSort ? !sort.empty() : known.has_value();
+        const bool isThere =
+            isCalled || (!isSort && known && sight.from(asking_.world, known->latitude, known->longitude) <= kAt);
         const char* key = isThere ? "yes" : canTell ? "no" : "cannotTell";
         told.push_back(sentences_.text(key, {{"name", nameOf(sight)}, {"place", understood.meaning.place}}));
         told.push_back(sight.sentence(sentences_, asking_.question, asking_.world));

@@ -48,6 +48,9 @@ std::string WishAnswers::names() const {
 std::optional<Answer> WishAnswers::impossible() const {
     const Understood& understood = asking_.understood;
     const Wish wish = understood.meaning.wish;
+    if (isFence() && understood.placeWord == "me" && !asking_.question.position) {
+        return asking_.answer(Outcome::Refused, sentences_.text("noPosition"));
+    }
     if (isFence() && understood.people.size() != 1) {
         return asking_.answer(Outcome::Refused, sentences_.text("oneAtATime"));
     }
@@ -72,14 +75,15 @@ std::pair<std::string, Dictionary> WishAnswers::request() const {
     if (isFence()) {
         members.set("handle", understood.people.front()->handle());
         members.set("trigger", meaning.wish == Wish::TellArrives ? "OnArrival" : "OnDeparture");
-        if (!meaning.place.empty() || !understood.placeWord.empty()) {
-            members.set("place", understood.placeWord.empty() ? meaning.place : "_$!<" + understood.placeWord + ">!$_");
+        if (understood.placeWord == "me") {
+            if (const auto& position = asking_.question.position) {
+                members.set("place", Dictionary{{"latitude", position->latitude}, {"longitude", position->longitude}});
+            }
+        } else if (!meaning.place.empty() || !understood.placeWord.empty()) {
+            // A person's own place goes by its sort.
+            members.set("place", Dictionary{{"name", understood.placeWord.empty() ? meaning.place : understood.placeWord}});
         }
-        if (const auto& position = asking_.question.position; position && understood.placeWord == "me") {
-            members.remove("place");
-            members.set("location", Dictionary{{"latitude", position->latitude}, {"longitude", position->longitude}});
-        }
-        members.set("always", meaning.everyTime);
+        members.set("once", !meaning.everyTime);
         return {"setFence", members};
     }
     members.set("wish", meaning.wish == Wish::Hide ? "hide" : meaning.wish == Wish::Share ? "share" : "read");
@@ -156,10 +160,21 @@ Answer WishAnswers::fence(const Dictionary& answer) const {
     const Understood& understood = asking_.understood;
     const Person& person = *understood.people.front();
     const Dictionary* kept = objectIn(answer, "fence");
-    if (kept == nullptr || objectIn(*kept, "location") == nullptr) {
+    const Dictionary* place = kept == nullptr ? nullptr : objectIn(*kept, "place");
+    if (place == nullptr) {
         return asking_.failed(ServiceReply::Failure::Unreachable);
     }
-    const Dictionary& location = *objectIn(*kept, "location");
+    // What is kept may be wider than what was asked for: that is what is drawn.
+    const auto number = [&](const char* name) {
+        const Value* value = place->find(name);
+        return value == nullptr ? 0.0 : value->number().value_or(0.0);
+    };
+    Dictionary location{{"latitude", number("latitude")}, {"longitude", number("longitude")}, {"accuracy", number("radius")}};
+    for (const char* name : {"name", "label"}) {
+        if (const std::string text = textIn(*place, name); !text.empty()) {
+            location.set("label", text);
+        }
+    }
     const bool leaves = understood.meaning.wish == Wish::TellLeaves;
     const auto* kind = asking_.language->kindOf(understood.placeWord);
     Answer done = asking_.answer(
@@ -168,8 +183,7 @@ Answer WishAnswers::fence(const Dictionary& answer) const {
                                          {"place", kind != nullptr ? kind->said : understood.meaning.place},
                                          {"which", kind == nullptr && understood.meaning.place.empty() ? "no" : "yes"},
                                          {"every", understood.meaning.everyTime ? "yes" : "no"}}));
-    const Value* radius = location.find("accuracy");
-    const double metres = radius != nullptr ? radius->number().value_or(100.0) : 100.0;
+    const double metres = number("radius");
     done.snippet = Dictionary{
         {"kind", "VAKtrGeoFenceSnippet"},
         {"searchContext", contextOf(answer, {{"geoFenceZoomLevel", Value(metres * kZoomByRadius).description()}})},

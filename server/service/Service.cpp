@@ -48,6 +48,7 @@ Service::Service(Setup setup)
           [this](double seconds, std::function<void()> work) { http_.later(seconds, std::move(work)); }})),
       fences_(std::make_unique<FenceCommands>(FenceCommands::Setup{
           *store_, now_, [this](const Device& device, const Dictionary& body) { return locations(device, body); }})),
+      asks_(std::make_unique<AskCommands>(AskCommands::Setup{*store_, now_})),
       held_(setup.holdsAnswers ? std::make_unique<HeldAnswers>([this](double seconds, std::function<void()> work) {
           http_.later(seconds, std::move(work));
       })
@@ -97,6 +98,7 @@ void Service::stop(std::chrono::milliseconds grace) {
     http_.stop(grace);
     events_.reset();
     fences_.reset();
+    asks_.reset();
     page_.reset();
     // Its last commits still answer through the edge; and the store may be somebody else's, too.
     if (store_) {
@@ -313,7 +315,8 @@ void Service::answerCommand(const HttpRequest& request, const HttpReply& reply) 
         answerLocations(*device, *value->dictionary(), reply);
     } else if (command == "showHideLocation") {
         changeSharing(*device, *value->dictionary(), reply);
-    } else if (!fences_->answer(command, *device, *value->dictionary(), reply)) {
+    } else if (!fences_->answer(command, *device, *value->dictionary(), reply) &&
+               !asks_->answer(command, *device, *value->dictionary(), reply)) {
         reply.send(refusal(404, "there is no such path"));
     }
 }

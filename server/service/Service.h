@@ -14,6 +14,7 @@
 #include "server/ingest/Report.h"
 #include "server/outbox/EventStreams.h"
 #include "server/page/PeoplesPage.h"
+#include "server/service/AskCommands.h"
 #include "server/service/FailureDelays.h"
 #include "server/service/FenceCommands.h"
 #include "server/service/HeldAnswers.h"
@@ -99,6 +100,7 @@ class Service {
     HttpServer http_;
     std::unique_ptr<PeoplesPage> page_;
     std::unique_ptr<FenceCommands> fences_;
+    std::unique_ptr<AskCommands> asks_;
     std::unique_ptr<EventStreams> events_;
     std::unique_ptr<HeldAnswers> held_;  ///< none: no answer is held
     std::shared_ptr<void> listening_;

@@ -66,9 +66,7 @@ TEST(LanguageTest, EverySentenceNamesWhatItIsAboutAndLeavesNothingUnfilled) {
                                                                  {"sharedWith", {"MMM", "TTT"}},
                                                                  {"hiddenFrom", {"MMM"}},
                                                                  {"whoSees", {"MMM"}},
-                                                                 {"asked", {"NNN"}},
-                                                                 {"askedBefore", {"NNN"}},
-                                                                 {"askToShare", {"NNN"}},
+
                                                                  {"seenMore", {"MMM", "4"}}};
     for (const std::string& tag : tags()) {
         const auto language = languages.language(tag);

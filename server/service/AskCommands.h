@@ -1,0 +1,50 @@
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "platform/base/Value.h"
+#include "server/http/HttpReply.h"
+#include "server/rules/Grant.h"
+#include "server/store/Store.h"
+
+namespace ktr::server {
+
+/// The commands with which a person asks about, and changes, what they share, and hears of their own places
+/// (docs/service-protocol.md). Any thread.
+class AskCommands {
+  public:
+    struct Setup {
+        Store& store;
+        std::function<std::int64_t()> now;
+    };
+
+    explicit AskCommands(Setup setup) : setup_(std::move(setup)) {}
+
+    /// False: this is none of these commands.
+    bool answer(const std::string& command, const Device& device, const platform::Dictionary& body,
+                const HttpReply& reply) const;
+
+  private:
+    struct Wish {
+        enum class Kind { Read, Hide, Share };
+        Kind kind = Kind::Read;
+        std::vector<std::string> with;  ///< handles; none: everybody whom a rule names
+        std::optional<std::int64_t> until;
+        std::optional<Precision> precision;
+    };
+    static std::optional<Wish> read(const platform::Dictionary& body, std::string& complaint);
+
+    void sharing(const Device& device, const Wish& wish, const HttpReply& reply) const;
+    /// Changes the rules for those who are named; all of them or, where somebody is not known, none.
+    void changeRules(const Device& device, const Wish& wish, const HttpReply& reply) const;
+    void tell(const Device& device, const HttpReply& reply) const;
+    void places(const Device& device, const HttpReply& reply) const;
+
+    const Setup setup_;
+};
+
+}  // namespace ktr::server

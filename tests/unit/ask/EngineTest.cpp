@@ -1,0 +1,269 @@
+#include "ask/Engine.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <filesystem>
+#include <functional>
+
+#include "platform/base/Json.h"
+
+namespace ktr::ask {
+namespace {
+
+using platform::Dictionary;
+using platform::Value;
+
+constexpr double kNow = 800000000.0;
+
+/// Writes down what it is asked, and answers as it is told.
+class ServiceDouble : public ServicePort {
+  public:
+    struct Sent {
+        std::string command;
+        Dictionary members;
+    };
+    void send(const std::string& command, Dictionary members, Completion completion) override {
+        sent.push_back({command, members});
+        completion(answer ? answer(command, members) : ServiceReply{ServiceReply::Failure::Unreachable});
+    }
+    std::vector<Sent> sent;
+    std::function<ServiceReply(const std::string&, const Dictionary&)> answer;
+};
+
+Person person(const char* first, const char* last, const char* email) {
+    Person one;
+    one.firstName = first;
+    one.lastName = last;
+    one.fullName = std::string(first) + " " + last;
+    one.emails = {email};
+    return one;
+}
+
+Dictionary entry(double latitude, double longitude, double age, const char* label = nullptr) {
+    Dictionary location{{"latitude", latitude},
+                        {"longitude", longitude},
+                        {"timestamp", (kNow - age + platform::kSecondsFrom1970ToReferenceDate) * 1000.0}};
+    if (label != nullptr) {
+        location.set("labels", Value::Array{Dictionary{{"label", label}}});
+    }
+    return {{"status", 200}, {"location", location}};
+}
+
+ServiceReply locations(Dictionary entries) {
+    return {ServiceReply::Failure::None, Dictionary{{"statusCode", 200}, {"locations", std::move(entries)}}};
+}
+
+class EngineTest : public ::testing::Test {
+  protected:
+    EngineTest() {
+        World world;
+        world.isLocked = [this] { return isLocked; };
+        world.distance = [](double metres) { return std::to_string(std::lround(metres)) + " m"; };
+        // Degrees near the equator, as if the earth were flat.
+        world.metres = [](double a, double b, double c, double d) { return std::hypot(a - c, b - d) * 111320.0; };
+        engine = std::make_unique<Engine>(
+            std::make_shared<Languages>(std::filesystem::path(KTR_SOURCE_DIR) / "resources/questions"), service, world);
+        engine->setPeople({person("Ann", "Marsh", "ann@harbour.example"), person("Otto", "Brandt", "otto@mail.example"),
+                           person("Max", "Weber", "weber@mail.example"), person("Max", "Stone", "stone@mail.example")});
+    }
+
+    Answer ask(const std::string& text) {
+        question.text = text;
+        question.now = {kNow};
+        std::optional<Answer> answer;
+        engine->ask(question, [&](Answer given) { answer = std::move(given); });
+        EXPECT_TRUE(answer);
+        EXPECT_FALSE(answer->sentence.empty());
+        return *answer;
+    }
+
+    ServiceDouble service;
+    std::unique_ptr<Engine> engine;
+    Question question;
+    bool isLocked = false;
+};
+
+TEST_F(EngineTest, SomebodySeen_IsSaidWithPlaceAndDistanceAndDrawn) {
+    question.position = Position{1.0, 1.0, {}};
+    service.answer = [](const std::string&, const Dictionary&) {
+        Dictionary ann = entry(1.001, 1.0, 10.0, "Fish Market");
+        ann.set("distanceInMeters", "310.52");
+        return locations({{"ann@harbour.example", ann}});
+    };
+    const Answer answer = ask("Where is Ann?");
+    EXPECT_EQ(answer.outcome, Outcome::Found);
+    EXPECT_EQ(answer.sentence, "Ann Marsh is at Fish Market, 311 m away.");
+    EXPECT_NE(platform::writeJson(answer.snippet).find("VAKtrLocationSnippet"), std::string::npos);
+    ASSERT_EQ(service.sent.size(), 1U);
+    EXPECT_EQ(service.sent.front().command, "getlocations");
+    EXPECT_EQ(platform::writeJson(*service.sent.front().members.find("handles")), R"(["ann@harbour.example"])");
+}
+
+TEST_F(EngineTest, WhereTheRowGoesOnChanging_TheSentenceSaysWhenItWasTrue) {
+    service.answer = [](const std::string&, const Dictionary&) {
+        return locations({{"ann@harbour.example", entry(1.0, 1.0, 10.0, "Fish Market")}});
+    };
+    question.isLive = true;
+    EXPECT_EQ(ask("Where is Ann?").sentence.rfind("At ", 0), 0U);
+    question.isLive = false;
+    EXPECT_EQ(ask("Where is Ann?").sentence, "Ann Marsh is at Fish Market.");
+}
+
+TEST_F(EngineTest, AnOldPlace_IsSaidWithItsTime) {
+    service.answer = [](const std::string&, const Dictionary&) {
+        return locations({{"ann@harbour.example", entry(1.0, 1.0, 3000.0, "Fish Market")}});
+    };
+    const Answer answer = ask("Where is Ann?");
+    EXPECT_NE(answer.sentence.find("was at Fish Market"), std::string::npos) << answer.sentence;
+    EXPECT_DOUBLE_EQ(answer.ageSeconds.value_or(0.0), 3000.0);
+}
+
+TEST_F(EngineTest, WhoeverIsNotSeen_IsNotToldApartFromWhomNobodyKnows) {
+    std::vector<std::string> answers;
+    for (const Dictionary& entries :
+         {Dictionary(), Dictionary{{"ann@harbour.example", Dictionary{{"status", 411}, {"location", Value()}}}},
+          Dictionary{{"ann@harbour.example", Dictionary{{"status", 200}, {"location", Value()}}}},
+          Dictionary{{"ann@harbour.example", entry(0.0, 0.0, 1.0)}}}) {
+        service.answer = [&](const std::string&, const Dictionary&) { return locations(entries); };
+        const Answer answer = ask("Where is Ann?");
+        EXPECT_EQ(answer.outcome, Outcome::NotSeen);
+        EXPECT_TRUE(answer.snippet.isNull());
+        answers.push_back(platform::writeJson(objectOf(answer)));
+    }
+    EXPECT_EQ(answers, std::vector<std::string>(answers.size(), answers.front()));
+}
+
+TEST_F(EngineTest, OfSeveral_ThoseNotSeenAreNamed) {
+    service.answer = [](const std::string&, const Dictionary&) {
+        return locations({{"ann@harbour.example", entry(1.0, 1.0, 10.0, "Fish Market")}});
+    };
+    const Answer answer = ask("Where are Ann and Otto?");
+    EXPECT_EQ(answer.outcome, Outcome::Found);
+    EXPECT_NE(answer.sentence.find("I can’t see where Otto Brandt is."), std::string::npos) << answer.sentence;
+}
+
+TEST_F(EngineTest, WhatTheContactsDecide_AsksNobody) {
+    EXPECT_EQ(ask("Where is Xyzzy?").outcome, Outcome::UnknownPerson);
+    EXPECT_EQ(ask("Where is Max?").outcome, Outcome::Ambiguous);
+    EXPECT_EQ(ask("Tell me a joke").outcome, Outcome::NotUnderstood);
+    isLocked = true;
+    EXPECT_EQ(ask("Where is Ann?").outcome, Outcome::Locked);
+    EXPECT_TRUE(service.sent.empty());
+}
+
+TEST_F(EngineTest, AChoice_AnswersWithItsOwnQuestion) {
+    const Answer several = ask("Where is Max?");
+    ASSERT_EQ(several.choices.size(), 2U);
+    service.answer = [](const std::string&, const Dictionary&) {
+        return locations({{"stone@mail.example", entry(1.0, 1.0, 1.0, "Fish Market")}});
+    };
+    EXPECT_EQ(ask(several.choices.back().question).outcome, Outcome::Found);
+    EXPECT_EQ(platform::writeJson(*service.sent.back().members.find("handles")), R"(["stone@mail.example"])");
+    const Answer near = ask("Where is Anne?");
+    EXPECT_EQ(near.outcome, Outcome::UnknownPerson);
+    ASSERT_EQ(near.choices.size(), 1U);
+    EXPECT_EQ(near.choices.front().name, "Ann Marsh");
+}
+
+TEST_F(EngineTest, FailuresOfTheService_AreToldApart) {
+    EXPECT_EQ(ask("Where is Ann?").outcome, Outcome::Unreachable);
+    service.answer = [](const std::string&, const Dictionary&) {
+        return ServiceReply{ServiceReply::Failure::NotSignedIn};
+    };
+    EXPECT_EQ(ask("Where is Ann?").outcome, Outcome::NotSignedIn);
+    EXPECT_EQ(ask("Hide my location").outcome, Outcome::NotSignedIn);
+}
+
+TEST_F(EngineTest, AWish_IsOnePost) {
+    service.answer = [](const std::string&, const Dictionary&) {
+        return ServiceReply{ServiceReply::Failure::None, Dictionary{{"statusCode", 200}, {"hidden", true}}};
+    };
+    const Answer answer = ask("Hide my location");
+    EXPECT_EQ(answer.sentence, "Friends can’t see where you are.");
+    ASSERT_EQ(service.sent.size(), 1U);
+    EXPECT_EQ(service.sent.front().command, "sharing");
+    EXPECT_EQ(platform::writeJson(service.sent.front().members), R"({"wish":"hide"})");
+    EXPECT_EQ(ask("Who can see me?").outcome, Outcome::Hidden);
+}
+
+TEST_F(EngineTest, WhoOnlyReads_ChangesNothing) {
+    question.mayChange = false;
+    for (const char* text :
+         {"Hide my location", "Share my location with Ann", "Tell me when Ann leaves", "Who sees me?"}) {
+        EXPECT_EQ(ask(text).outcome, Outcome::Refused) << text;
+    }
+    EXPECT_TRUE(service.sent.empty());
+}
+
+TEST_F(EngineTest, AFence_IsPromisedOnlyWhenTheServiceKeepsIt) {
+    service.answer = [](const std::string&, const Dictionary&) { return ServiceReply{ServiceReply::Failure::Refused}; };
+    const Answer refused = ask("Tell me when Otto leaves work");
+    EXPECT_EQ(refused.outcome, Outcome::Refused);
+    EXPECT_EQ(refused.sentence, "I can’t tell you when Otto Brandt comes or goes.");
+    EXPECT_EQ(platform::writeJson(service.sent.back().members),
+              R"({"handle":"otto@mail.example","trigger":"OnDeparture","place":{"name":"work"},"once":true})");
+    service.answer = [](const std::string&, const Dictionary&) {
+        return ServiceReply{ServiceReply::Failure::None,
+                            Dictionary{{"fence", Dictionary{{"place", Dictionary{{"latitude", 1.0},
+                                                                                 {"longitude", 2.0},
+                                                                                 {"radius", 150.0},
+                                                                                 {"name", "Work"}}}}}}};
+    };
+    const Answer kept = ask("Tell me when Otto leaves work");
+    EXPECT_EQ(kept.outcome, Outcome::Found);
+    const std::string snippet = platform::writeJson(kept.snippet);
+    EXPECT_NE(snippet.find(R"("accuracy":150)"), std::string::npos) << snippet;
+    EXPECT_NE(snippet.find("OnDeparture"), std::string::npos);
+}
+
+TEST_F(EngineTest, NearAPlace_ListsWhoIsNearItNearestFirst) {
+    service.answer = [](const std::string& command, const Dictionary&) {
+        if (command == "places") {
+            return ServiceReply{
+                ServiceReply::Failure::None,
+                Dictionary{
+                    {"places", Value::Array{Dictionary{{"name", "Harbour"}, {"latitude", 1.0}, {"longitude", 1.0}}}}}};
+        }
+        return locations({{"ann@harbour.example", entry(1.01, 1.0, 1.0)},
+                          {"otto@mail.example", entry(1.001, 1.0, 1.0)},
+                          {"stone@mail.example", entry(3.0, 1.0, 1.0)}});
+    };
+    EXPECT_EQ(ask("Who is near the harbour?").sentence, "Near harbour: Otto Brandt (111 m) and Ann Marsh (1113 m).");
+    EXPECT_EQ(ask("Who is near Atlantis?").outcome, Outcome::NotSeen);
+    EXPECT_EQ(ask("Who is closest to the harbour?").sentence, "Closest to harbour: Otto Brandt (111 m).");
+}
+
+TEST_F(EngineTest, WhetherSomebodyIsAtWork_IsSaidAsFarAsItCanBeTold) {
+    const char* label = "Work";
+    service.answer = [&](const std::string& command, const Dictionary&) {
+        return command == "places" ? ServiceReply{ServiceReply::Failure::Refused}
+                                   : locations({{"otto@mail.example", entry(1.0, 1.0, 1.0, label)}});
+    };
+    EXPECT_EQ(ask("Is Otto at work?").sentence, "Yes. Otto Brandt is at work.");
+    label = "_$!<home>!$_";
+    EXPECT_EQ(ask("Is Otto at work?").sentence, "No. Otto Brandt is at home.");
+    label = "Fish Market";
+    EXPECT_EQ(ask("Is Otto at work?").sentence.rfind("I can’t tell", 0), 0U);
+}
+
+TEST_F(EngineTest, ManyContacts_AreAskedForInSeveralRequestsAndNoneIsLeftOut) {
+    std::vector<Person> people;
+    for (int i = 0; i < 2500; ++i) {
+        people.push_back(
+            person(("P" + std::to_string(i)).c_str(), "X", ("p" + std::to_string(i) + "@x.example").c_str()));
+    }
+    engine->setPeople(people);
+    service.answer = [](const std::string&, const Dictionary& members) {
+        const auto& handles = *members.find("handles")->array();
+        EXPECT_LE(handles.size(), Engine::kMostHandles);
+        return locations({{*handles.back().string(), entry(1.0, 1.0, 1.0)}});
+    };
+    const Answer answer = ask("Where are my friends?");
+    EXPECT_EQ(service.sent.size(), 3U);
+    EXPECT_NE(answer.sentence.find("P2499"), std::string::npos) << answer.sentence;
+    EXPECT_NE(answer.sentence.find("P999 "), std::string::npos) << answer.sentence;
+}
+
+}  // namespace
+}  // namespace ktr::ask
