@@ -1,0 +1,125 @@
+#include <gtest/gtest.h>
+
+#include <map>
+#include <memory>
+#include <string>
+
+#include "server/http/BasicCredentials.h"
+#include "server/service/Service.h"
+#include "tests/support/RawClient.h"
+
+namespace ktr::test {
+
+using server::BasicCredentials;
+using server::DeviceKind;
+using server::Grant;
+using server::Precision;
+using server::Service;
+using server::Store;
+
+/// A service over plain HTTP on this machine: ann, otto and mara have readers, and nobody sees anybody.
+class AskServiceTest : public ::testing::Test {
+  protected:
+    static constexpr std::int64_t kNow = 1763760000;
+
+    void SetUp() override {
+        std::string complaint;
+        store_ = Store::open(server::StoreAddress::inMemory(), true, complaint);
+        ASSERT_TRUE(store_) << complaint;
+        for (const char* name : {"ann", "otto", "mara"}) {
+            ASSERT_TRUE(store_->addPerson(name, {std::string(name) + "@x.example"}, kNow));
+            ids_[name] = store_->personNamed(name)->id;
+            ASSERT_TRUE(store_->addDevice(ids_[name], DeviceKind::Reader, std::string(name) + "'s ktr", "", kNow));
+        }
+        Service::Setup setup;
+        setup.store = store_;
+        setup.now = [] { return kNow; };
+        service_ = std::make_unique<Service>(std::move(setup));
+        ASSERT_EQ(service_->start(), "");
+    }
+    void TearDown() override { service_->stop(); }
+    /// Status line and body.
+    std::string ask(const std::string& who, const std::string& path, const std::string& members) {
+        const std::string body = R"({"clientContext":{})" + members + "}";
+        const RawClient client(service_->port());
+        client.send("POST /qloxservice/friends/va/" + path +
+                    " HTTP/1.1\r\nHost: localhost\r\nAuthorization: " + BasicCredentials{who, who + "'s ktr"}.header() +
+                    "\r\nX-Orcha-Seek-API-Ver: 4.0\r\nX-Orcha-AuthScheme: Forever\r\nContent-Type: application/json\r\n"
+                    "Content-Length: " +
+                    std::to_string(body.size()) + "\r\nConnection: close\r\n\r\n" + body);
+        return client.read("\x01");
+    }
+    static bool holds(const std::string& text, const std::string& part) { return text.find(part) != std::string::npos; }
+
+    std::shared_ptr<Store> store_;
+    std::unique_ptr<Service> service_;
+    std::map<std::string, std::int64_t> ids_;
+};
+
+TEST_F(AskServiceTest, ARuleForOne_IsMadeWithItsEndAndPrecisionAndTaken) {
+    const std::string shared =
+        ask("ann", "sharing", R"(,"wish":"share","with":["otto@x.example"],"until":1763763600000,"precision":"town")");
+    EXPECT_TRUE(holds(shared, R"("viewers":[{"name":"otto","precision":"town","until":1763763600000}])")) << shared;
+    const auto rules = store_->grantsOf(ids_["ann"]);
+    ASSERT_EQ(rules.size(), 1U);
+    EXPECT_EQ(rules.front().second.precision, Precision::Town);
+    EXPECT_EQ(rules.front().second.until, 1763763600);
+    const std::string ended = ask("ann", "sharing", R"(,"wish":"hide","with":["otto@x.example"])");
+    EXPECT_TRUE(holds(ended, R"("viewers":[])")) << ended;
+    EXPECT_TRUE(store_->grantsOf(ids_["ann"]).empty());
+}
+
+TEST_F(AskServiceTest, WhatAWishDoesNotName_StaysAsItWasAgreed) {
+    Grant grant{Precision::Kilometre, kNow - 500, std::nullopt};
+    grant.aloud = true;
+    ASSERT_TRUE(store_->grant(ids_["ann"], ids_["otto"], grant));
+    ask("ann", "sharing", R"(,"wish":"share","with":["otto@x.example"],"until":1763763600000)");
+    const auto rules = store_->grantsOf(ids_["ann"]);
+    ASSERT_EQ(rules.size(), 1U);
+    EXPECT_EQ(rules.front().second.precision, Precision::Kilometre);
+    EXPECT_TRUE(rules.front().second.aloud);
+}
+
+TEST_F(AskServiceTest, OneWhomTheServiceDoesNotHave_ChangesNothingForAnybody) {
+    const std::string answer = ask("ann", "sharing", R"(,"wish":"share","with":["otto@x.example","nobody@x.example"])");
+    EXPECT_TRUE(holds(answer, "404")) << answer;
+    EXPECT_TRUE(store_->grantsOf(ids_["ann"]).empty());
+    EXPECT_TRUE(holds(ask("ann", "sharing", R"(,"wish":"share","with":["ann@x.example"])"), "404"));
+}
+
+TEST_F(AskServiceTest, Hiding_HoldsBeforeTheAnswerUntilOneIsShownAgain) {
+    EXPECT_TRUE(holds(ask("ann", "sharing", R"(,"wish":"hide")"), R"("hidden":true)"));
+    EXPECT_TRUE(store_->person(ids_["ann"])->hidden);
+    EXPECT_TRUE(holds(ask("ann", "sharing", R"(,"wish":"read")"), R"("hidden":true)"));
+    EXPECT_TRUE(holds(ask("ann", "sharing", R"(,"wish":"share")"), R"("hidden":false)"));
+    EXPECT_FALSE(store_->person(ids_["ann"])->hidden);
+}
+
+TEST_F(AskServiceTest, AskingChangesNothing_AndWhatIsNoWishIsRefused) {
+    ask("ann", "sharing", R"(,"wish":"read","with":["otto@x.example"])");
+    EXPECT_TRUE(store_->grantsOf(ids_["ann"]).empty());
+    for (const char* members :
+         {"", R"(,"wish":"destroy")", R"(,"wish":"share","until":1763763600000)",
+          R"(,"wish":"share","with":["otto@x.example"],"precision":"close")",
+          R"(,"wish":"share","with":"otto@x.example")", R"(,"wish":"hide","with":["otto@x.example"],"until":1)"}) {
+        EXPECT_TRUE(holds(ask("ann", "sharing", members), " 400 ")) << members;
+    }
+    EXPECT_TRUE(store_->grantsOf(ids_["ann"]).empty());
+}
+
+TEST_F(AskServiceTest, Places_AreTheAskersOwnAlone) {
+    server::NamedPlace place;
+    place.name = "Our house";
+    place.label = "home";
+    place.latitude = 50.2;
+    place.longitude = -3.1;
+    place.said = true;
+    ASSERT_TRUE(store_->setPlace(ids_["ann"], place));
+    ASSERT_TRUE(store_->grant(ids_["ann"], ids_["otto"], Grant{Precision::Exact, kNow - 1000, std::nullopt}));
+    const std::string own = ask("ann", "places", "");
+    EXPECT_TRUE(holds(own, R"({"name":"Our house","latitude":50.2,"longitude":-3.1})")) << own;
+    EXPECT_TRUE(holds(own, R"({"name":"_$!<home>!$_")")) << own;
+    EXPECT_TRUE(holds(ask("otto", "places", ""), R"("places":[])"));
+}
+
+}  // namespace ktr::test
