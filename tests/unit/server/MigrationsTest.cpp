@@ -4,7 +4,9 @@
 #include <sqlite3.h>
 #include <sys/stat.h>
 
+#include <filesystem>
 #include <fstream>
+#include <sstream>
 #include <thread>
 
 #include "tests/unit/server/StoreContract.h"
@@ -74,6 +76,34 @@ class FileStoreTest : public ::testing::Test {
     std::unique_ptr<Store> open(std::string& complaint, bool make = false) const {
         return Store::open({folder_.path().string()}, make, complaint);
     }
+    static std::string contents(const std::string& path) {
+        const std::ifstream stream(path);
+        std::ostringstream text;
+        text << stream.rdbuf();
+        return text.str();
+    }
+    /// All columns of all tables, a line each.
+    static std::string columns(const std::string& path) {
+        sqlite3* handle = nullptr;
+        EXPECT_EQ(sqlite3_open(path.c_str(), &handle), SQLITE_OK);
+        std::string text;
+        const auto add = [](void* all, int, char** values, char**) {
+            *static_cast<std::string*>(all) += std::string(values[0]) + "\n";
+            return 0;
+        };
+        sqlite3_exec(
+            handle,
+            "SELECT m.name || ' ' || c.name || ' ' || c.type FROM sqlite_schema m, pragma_table_info(m.name) c "
+            "WHERE m.type = 'table' ORDER BY 1",
+            add, &text, nullptr);
+        sqlite3_close(handle);
+        return text;
+    }
+    std::string columnsOfNewStore() const {
+        std::string complaint;
+        EXPECT_TRUE(open(complaint, true)) << complaint;
+        return columns(file());
+    }
     TemporaryFolder folder_;
 };
 
@@ -105,6 +135,36 @@ TEST_F(FileStoreTest, StoreOfTheFirstVersion_IsBroughtToToday_WithAllThatIsInIt)
     // And again: nothing is left to do.
     store = open(complaint);
     EXPECT_TRUE(store) << complaint;
+}
+
+TEST_F(FileStoreTest, StoreOfEveryVersion_IsBroughtToToday_WithAllThatIsInIt) {
+    const std::string today = columnsOfNewStore();
+    for (int version = 1; version < Migrations::latest(); ++version) {
+        std::filesystem::remove_all(folder_.path());
+        std::filesystem::create_directory(folder_.path());
+        run(file(), kFirst);
+        for (int step = 2; step <= version; ++step) {
+            run(file(),
+                contents(std::string(KTR_TEST_DATA) + "/unit/server/stores/step" + std::to_string(step) + ".sql")
+                    .c_str());
+        }
+        std::string complaint;
+        const auto store = open(complaint);
+        ASSERT_TRUE(store) << version << ": " << complaint;
+        EXPECT_EQ(columns(file()), today) << version;
+        EXPECT_EQ(store->check(), "") << version;
+        const auto sharing = store->sharing(2, 1);
+        ASSERT_TRUE(sharing && sharing->grant) << version;
+        EXPECT_EQ(sharing->fixes.size(), 2U) << version;
+        EXPECT_EQ(sharing->grant->aloud, version >= 3);
+        EXPECT_EQ(sharing->grant->fences, version >= 6);
+        EXPECT_EQ(store->browsersOf(1, 1763760000).size(), version >= 2 ? 1U : 0U);
+        EXPECT_EQ(store->person(1)->zone, version >= 3 ? "Europe/Berlin" : "");
+        EXPECT_EQ(store->placesOf(1).size(), version >= 3 ? 1U : 0U);
+        EXPECT_EQ(store->retention(1)->looks, version >= 4 ? 86400 : 30 * 86400);
+        EXPECT_EQ(store->face(1).has_value(), version >= 5);
+        EXPECT_EQ(store->fencesAbout(1).value().size(), version >= 6 ? 1U : 0U);
+    }
 }
 
 TEST_F(FileStoreTest, NewerStore_AndForeignFiles_AreRefusedWithASentence) {
