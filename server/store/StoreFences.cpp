@@ -105,6 +105,56 @@ bool isCalled(const NamedPlace& place, const std::string& name) {
     return place.said && (place.name == name || (!place.label.empty() && place.label == name));
 }
 
+void use(const NamedPlace& place, Fence& fence) {
+    fence.name = place.name;
+    fence.label = place.label;
+    fence.circle = {place.latitude, place.longitude, place.radius};
+}
+
+/// Where a fence lies. False: there is no such place, or nobody knows where the subject is.
+bool placeFence(const FencePlace& wish, const std::vector<NamedPlace>& places, const std::vector<Fix>& fixes,
+                Fence& fence) {
+    if (!wish.name.empty()) {
+        const auto place =
+            std::find_if(places.begin(), places.end(), [&](const NamedPlace& one) { return isCalled(one, wish.name); });
+        if (place != places.end()) {
+            use(*place, fence);
+        }
+        return place != places.end();
+    }
+    if (wish.circle) {
+        fence.circle = *wish.circle;
+        return true;
+    }
+    if (fixes.empty()) {
+        return false;
+    }
+    fence.circle = {fixes.back().latitude, fixes.back().longitude};
+    if (const NamedPlace* place = NamedPlace::saidAt(places, fixes.back())) {
+        use(*place, fence);
+    }
+    return true;
+}
+
+void insert(Database& database, const Fence& fence) {
+    database
+        .statement(
+            "INSERT INTO fence (id, watcher, subject, name, label, latitude, longitude, radius, arrives, once, made) "
+            "VALUES ($1, $2, $3, $4, $5, $6, $7, $8, $9, $10, $11)")
+        .bind(fence.id)
+        .bind(fence.watcher)
+        .bind(fence.subject)
+        .bind(fence.name)
+        .bind(fence.label)
+        .bind(fence.circle.latitude)
+        .bind(fence.circle.longitude)
+        .bind(fence.circle.radius)
+        .bind(std::int64_t{fence.arrives})
+        .bind(std::int64_t{fence.once})
+        .bind(fence.made)
+        .run();
+}
+
 }  // namespace
 
 void Store::setFence(const FenceWish& wish, std::int64_t now, FenceDone done) {
@@ -133,25 +183,7 @@ FenceOutcome Store::setFenceIn(Database& database, const FenceWish& wish, std::i
     fence = {0, wish.watcher, wish.subject, "", "", {}, wish.arrives, wish.once, latest};
     const auto places = readPlaces(database, wish.subject);
     const auto fixes = fixesAfter(database, wish.subject, 0, since);
-    if (!wish.place.name.empty()) {
-        const auto place = std::find_if(places.begin(), places.end(),
-                                        [&](const NamedPlace& one) { return isCalled(one, wish.place.name); });
-        if (place == places.end()) {
-            return FenceOutcome::NoPlace;
-        }
-        fence.name = place->name;
-        fence.label = place->label;
-        fence.circle = {place->latitude, place->longitude, place->radius};
-    } else if (wish.place.circle) {
-        fence.circle = *wish.place.circle;
-    } else if (!fixes.empty()) {
-        fence.circle = {fixes.back().latitude, fixes.back().longitude};
-        if (const NamedPlace* place = NamedPlace::saidAt(places, fixes.back())) {
-            fence.name = place->name;
-            fence.label = place->label;
-            fence.circle = {place->latitude, place->longitude, place->radius};
-        }
-    } else {
+    if (!placeFence(wish.place, places, fixes, fence)) {
         return FenceOutcome::NoPlace;
     }
     fence.circle.radius = std::clamp(fence.circle.radius, FenceCircle::kLeastRadius, FenceCircle::kMostRadius);
@@ -173,22 +205,7 @@ FenceOutcome Store::setFenceIn(Database& database, const FenceWish& wish, std::i
         return FenceOutcome::TooMany;
     }
     fence.id = Secret::number();
-    database
-        .statement(
-            "INSERT INTO fence (id, watcher, subject, name, label, latitude, longitude, radius, arrives, once, made) "
-            "VALUES ($1, $2, $3, $4, $5, $6, $7, $8, $9, $10, $11)")
-        .bind(fence.id)
-        .bind(fence.watcher)
-        .bind(fence.subject)
-        .bind(fence.name)
-        .bind(fence.label)
-        .bind(fence.circle.latitude)
-        .bind(fence.circle.longitude)
-        .bind(fence.circle.radius)
-        .bind(std::int64_t{fence.arrives})
-        .bind(std::int64_t{fence.once})
-        .bind(fence.made)
-        .run();
+    insert(database, fence);
     // It begins on the side where the subject is: what it says first is a crossing, not where somebody has been.
     FenceState state;
     for (const Fix& fix : fixes) {
