@@ -145,6 +145,7 @@ std::variant<serve::DevelopmentServer::Setup, documents::DocumentError> readSetu
         setup.faults.add(fault);
     }
     tell(warnings);
+    setup.maps = {resource("../maps/brinmouth.mbtiles").string()};
     setup.port = options.port;
     setup.personId = options.personId;
     return setup;

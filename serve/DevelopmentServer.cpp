@@ -110,6 +110,7 @@ class DevelopmentServer::Server {
         service.http.limits.connectionsPerAddress = kMostClients;
         service.store = made_.people().store();
         service.now = presentTime;
+        service.names.maps = setup_.maps;
         service.around = [this](HttpRequest request, HttpReply reply, const HttpHandler& inner) {
             route(std::move(request), std::move(reply), inner);
         };

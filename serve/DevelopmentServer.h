@@ -3,6 +3,7 @@
 #include <functional>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "serve/DevelopmentCertificates.h"
 #include "serve/FaultScript.h"
@@ -21,6 +22,7 @@ class DevelopmentServer {
         FriendsFile friends;
         FaultScript faults;
         DevelopmentCertificates::Pair certificate;
+        std::vector<std::string> maps = {};  ///< by which the service names what the friends file does not
         /// Gets one line a request, without handles, positions and credentials. Any thread, one call at a time.
         std::function<void(const std::string&)> report;
     };

@@ -2,6 +2,7 @@
 
 #include <GeographicLib/Geodesic.hpp>
 #include <algorithm>
+#include <array>
 #include <cmath>
 #include <future>
 
@@ -21,14 +22,23 @@ constexpr int kNotReported = 411;
 constexpr double kInStreet = 75.0;
 constexpr double kInTown = 10000.0;
 
+/// The members that say what a place is called.
+constexpr std::array kNames = {"streetAddress", "address", "labels"};
+
 void setWhenPresent(Dictionary& dictionary, const char* name, const std::optional<std::string>& text) {
     if (text) {
         dictionary.set(name, *text);
     }
 }
 
-/// What the place is called.
+/// What the place is called, where the friends file says anything of that; else it is what the service calls it.
 void addWords(Dictionary& location, const Waypoint& place) {
+    if (!place.street && !place.city && !place.stateCode && !place.label) {
+        return;
+    }
+    for (const char* name : kNames) {
+        location.remove(name);
+    }
     Dictionary address;
     setWhenPresent(address, "locality", place.city);
     setWhenPresent(address, "stateCode", place.stateCode);
@@ -157,6 +167,12 @@ void LocationService::completeSharing(Dictionary& answer, const Dictionary& requ
                             {"longitude", position->longitude},
                             {"horizontalAccuracy", position->accuracy},
                             {"timestamp", std::floor(moment.millisecondsSince1970)}};
+        const Dictionary named = memberOf(myInfo, "location");
+        for (const char* name : kNames) {
+            if (const Value* value = named.find(name)) {
+                location.set(name, *value);
+            }
+        }
         addWords(location, placeAt(position->latitude, position->longitude));
         myInfo.set("location", location);
     }

@@ -5,7 +5,9 @@
 #include <array>
 #include <chrono>
 #include <cstddef>
+#include <filesystem>
 #include <string_view>
+#include <system_error>
 #include <utility>
 
 #include "documents/ComputingTime.h"
@@ -64,6 +66,26 @@ struct Budget {
         return !isExceeded;
     }
 };
+
+/// Why a database is not opened; empty when it may be. A pipe would be waited for, also in the place of one of the
+/// files that the library looks for beside the database, wherever a link to it leads.
+std::string objection(const std::string& path) {
+    std::error_code failed;
+    const std::filesystem::path file = std::filesystem::canonical(path, failed);
+    if (failed) {
+        return failed.message();
+    }
+    if (!std::filesystem::is_regular_file(file, failed)) {
+        return failed ? failed.message() : "not a file";
+    }
+    for (const char* end : {"-journal", "-wal", "-shm"}) {
+        const std::string beside = file.string() + end;
+        if (std::filesystem::exists(beside, failed) && !std::filesystem::is_regular_file(beside, failed)) {
+            return "not a file: " + beside;
+        }
+    }
+    return "";
+}
 
 class OpenMbtiles final : public MbtilesFile {
   public:
@@ -229,6 +251,9 @@ std::optional<platform::Bytes> OpenMbtiles::tile(const TileKey& key) {
 }  // namespace
 
 std::shared_ptr<MbtilesFile> SqliteMbtiles::open(const std::string& path, std::string& error) {
+    if (error = objection(path); !error.empty()) {
+        return nullptr;
+    }
     auto opened = std::make_shared<OpenMbtiles>();
     return opened->open(path, error) ? opened : nullptr;
 }

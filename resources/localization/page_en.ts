@@ -578,5 +578,90 @@
         <extracomment>In a row with somebody's name: that person is told when the reader arrives at %@, a place</extracomment>
         <translation>When I arrive: %@</translation>
     </message>
+    <message>
+        <source>PLACE_CHANGE</source>
+        <extracomment>Button beside a place of the reader’s own: opens a page that changes it</extracomment>
+        <translation>Change</translation>
+    </message>
+    <message>
+        <source>PLACE_CHANGE_ONE</source>
+        <extracomment>Title of that page, and the spoken name of that button; %@ is the place’s name</extracomment>
+        <translation>Change %@</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND</source>
+        <extracomment>Label of a choice: what kind of place it is; below it PLACE_KIND_NONE, PLACE_KIND_HOME and so on</extracomment>
+        <translation>Kind</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND_NONE</source>
+        <extracomment>In the choice PLACE_KIND: no kind</extracomment>
+        <translation>None</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND_HOME</source>
+        <extracomment>In the choice PLACE_KIND</extracomment>
+        <translation>Home</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND_WORK</source>
+        <extracomment>In the choice PLACE_KIND</extracomment>
+        <translation>Work</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND_SCHOOL</source>
+        <extracomment>In the choice PLACE_KIND</extracomment>
+        <translation>School</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND_GYM</source>
+        <extracomment>In the choice PLACE_KIND</extracomment>
+        <translation>Gym</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND_OTHER</source>
+        <extracomment>In the choice PLACE_KIND</extracomment>
+        <translation>Other</translation>
+    </message>
+    <message>
+        <source>PLACE_TAKEN</source>
+        <extracomment>Complaint when a place is given a name that another one has</extracomment>
+        <translation>Another place of yours has this name.</translation>
+    </message>
+    <message>
+        <source>NEAR_TOWN</source>
+        <extracomment>Where somebody is: %1$@ is the nearest town in the nominative, %2$@ how far away it is (“40 km”)</extracomment>
+        <translation>near %1$@, %2$@</translation>
+    </message>
+    <message>
+        <source>STREET_IN_TOWN</source>
+        <extracomment>Where somebody is: %1$@ is a street, %2$@ its town; change their order where the language does</extracomment>
+        <translation>%1$@, %2$@</translation>
+    </message>
+    <message>
+        <source>COORDINATES</source>
+        <extracomment>Where somebody is, where nothing has a name: %1$@ is DEGREES_NORTH or DEGREES_SOUTH, %2$@ DEGREES_EAST or DEGREES_WEST</extracomment>
+        <translation>%1$@, %2$@</translation>
+    </message>
+    <message>
+        <source>DEGREES_NORTH</source>
+        <extracomment>A latitude; %@ is a number with two decimals</extracomment>
+        <translation>%@° north</translation>
+    </message>
+    <message>
+        <source>DEGREES_SOUTH</source>
+        <extracomment>A latitude; %@ is a number with two decimals</extracomment>
+        <translation>%@° south</translation>
+    </message>
+    <message>
+        <source>DEGREES_EAST</source>
+        <extracomment>A longitude; %@ is a number with two decimals</extracomment>
+        <translation>%@° east</translation>
+    </message>
+    <message>
+        <source>DEGREES_WEST</source>
+        <extracomment>A longitude; %@ is a number with two decimals</extracomment>
+        <translation>%@° west</translation>
+    </message>
 </context>
 </TS>

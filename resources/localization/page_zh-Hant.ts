@@ -578,5 +578,90 @@
         <extracomment>In a row with somebody's name: that person is told when the reader arrives at %@, a place. English: “When I arrive: %@”</extracomment>
         <translation>抵達時：%@</translation>
     </message>
+    <message>
+        <source>PLACE_CHANGE</source>
+        <extracomment>Button beside a place of the reader’s own: opens a page that changes it. English: “Change”</extracomment>
+        <translation>更改</translation>
+    </message>
+    <message>
+        <source>PLACE_CHANGE_ONE</source>
+        <extracomment>Title of that page, and the spoken name of that button; %@ is the place’s name. English: “Change %@”</extracomment>
+        <translation>更改%@</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND</source>
+        <extracomment>Label of a choice: what kind of place it is; below it PLACE_KIND_NONE, PLACE_KIND_HOME and so on. English: “Kind”</extracomment>
+        <translation>類型</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND_NONE</source>
+        <extracomment>In the choice PLACE_KIND: no kind. English: “None”</extracomment>
+        <translation>無</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND_HOME</source>
+        <extracomment>In the choice PLACE_KIND. English: “Home”</extracomment>
+        <translation>住家</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND_WORK</source>
+        <extracomment>In the choice PLACE_KIND. English: “Work”</extracomment>
+        <translation>工作地點</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND_SCHOOL</source>
+        <extracomment>In the choice PLACE_KIND. English: “School”</extracomment>
+        <translation>學校</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND_GYM</source>
+        <extracomment>In the choice PLACE_KIND. English: “Gym”</extracomment>
+        <translation>健身房</translation>
+    </message>
+    <message>
+        <source>PLACE_KIND_OTHER</source>
+        <extracomment>In the choice PLACE_KIND. English: “Other”</extracomment>
+        <translation>其他地點</translation>
+    </message>
+    <message>
+        <source>PLACE_TAKEN</source>
+        <extracomment>Complaint when a place is given a name that another one has. English: “Another place of yours has this name.”</extracomment>
+        <translation>您的另一個地點已使用此名稱。</translation>
+    </message>
+    <message>
+        <source>NEAR_TOWN</source>
+        <extracomment>Where somebody is: %1$@ is the nearest town in the nominative, %2$@ how far away it is (“40 km”). English: “near %1$@, %2$@”</extracomment>
+        <translation>%1$@附近，%2$@</translation>
+    </message>
+    <message>
+        <source>STREET_IN_TOWN</source>
+        <extracomment>Where somebody is: %1$@ is a street, %2$@ its town; change their order where the language does. English: “%1$@, %2$@”</extracomment>
+        <translation>%2$@ %1$@</translation>
+    </message>
+    <message>
+        <source>COORDINATES</source>
+        <extracomment>Where somebody is, where nothing has a name: %1$@ is DEGREES_NORTH or DEGREES_SOUTH, %2$@ DEGREES_EAST or DEGREES_WEST. English: “%1$@, %2$@”</extracomment>
+        <translation>%1$@，%2$@</translation>
+    </message>
+    <message>
+        <source>DEGREES_NORTH</source>
+        <extracomment>A latitude; %@ is a number with two decimals. English: “%@° north”</extracomment>
+        <translation>北緯%@°</translation>
+    </message>
+    <message>
+        <source>DEGREES_SOUTH</source>
+        <extracomment>A latitude; %@ is a number with two decimals. English: “%@° south”</extracomment>
+        <translation>南緯%@°</translation>
+    </message>
+    <message>
+        <source>DEGREES_EAST</source>
+        <extracomment>A longitude; %@ is a number with two decimals. English: “%@° east”</extracomment>
+        <translation>東經%@°</translation>
+    </message>
+    <message>
+        <source>DEGREES_WEST</source>
+        <extracomment>A longitude; %@ is a number with two decimals. English: “%@° west”</extracomment>
+        <translation>西經%@°</translation>
+    </message>
 </context>
 </TS>

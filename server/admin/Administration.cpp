@@ -68,7 +68,7 @@ std::string Administration::init(const std::string& host, int port, const std::s
     if (!complaint.empty()) {
         return complaint;
     }
-    const ServiceSettings settings{host, port, store};
+    const ServiceSettings settings{host, port, store, {}};
     store_ = Store::open(settings.storeAddress(folder_), true, complaint);
     if (!store_) {
         return complaint;
@@ -294,8 +294,13 @@ std::string Administration::check() {
     if (!CertificateAuthority::read(folder_, complaint)) {
         return complaint.empty() ? folder_ + "/ca.pem: is missing, damaged or about to expire" : complaint;
     }
-    out_ << "the store is whole; the service is " << settings->origin() << "\n";
-    return "";
+    for (const std::string& broken : PlaceNames(settings->names()).complaints()) {
+        complaint += (complaint.empty() ? "" : "; ") + broken;
+    }
+    if (complaint.empty()) {
+        out_ << "the store is whole; the service is " << settings->origin() << "\n";
+    }
+    return complaint;
 }
 
 }  // namespace ktr::server

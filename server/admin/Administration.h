@@ -62,10 +62,11 @@ class Administration {
     /// What a command line says of a place. A value.
     struct PlaceWords {
         std::string name;
-        std::string at;  ///< "50.21,-3.12"
-        std::string label;
-        double radius = 150.0;
-        bool said = false;
+        std::string at = {};                 ///< "50.21,-3.12"; empty: where it is
+        std::optional<std::string> label{};  ///< "none": not any more; none given: as it is
+        std::optional<double> radius{};
+        std::optional<bool> said{};
+        std::string rename = {};  ///< empty: its name stays
         bool remove = false;
     };
     /// Names a place of a person, changes the one of that name, or removes it.

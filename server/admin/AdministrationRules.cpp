@@ -18,23 +18,34 @@ std::optional<double> degrees(std::string_view text, double most) {
     return whole && std::abs(number) <= most ? std::optional(number) : std::nullopt;
 }
 
-/// Empty when the words were understood.
+/// Changes a place by what the words say; empty when they were understood.
 std::string readPlace(const Administration::PlaceWords& words, NamedPlace& place) {
-    const std::string_view at = words.at;
-    const std::size_t comma = std::min(at.find(','), at.size());
-    const auto latitude = degrees(at.substr(0, comma), 90.0);
-    const auto longitude = degrees(at.substr(std::min(comma + 1, at.size())), 180.0);
-    if (!latitude || !longitude) {
-        return "--at: expected a latitude and a longitude in degrees, such as 50.21,-3.12";
+    if (!words.at.empty() || place.id == 0) {
+        const std::string_view at = words.at;
+        const std::size_t comma = std::min(at.find(','), at.size());
+        const auto latitude = degrees(at.substr(0, comma), 90.0);
+        const auto longitude = degrees(at.substr(std::min(comma + 1, at.size())), 180.0);
+        if (!latitude || !longitude) {
+            return "--at: expected a latitude and a longitude in degrees, such as 50.21,-3.12";
+        }
+        place.latitude = *latitude;
+        place.longitude = *longitude;
     }
-    if (!words.label.empty() && !NamedPlace::isLabel(words.label)) {
-        return "--label: expected home, work, school, gym or other, found " + documents::inQuotes(words.label);
+    place.label = words.label.value_or(place.label);
+    place.label = place.label == "none" ? "" : place.label;
+    if (!place.label.empty() && !NamedPlace::isLabel(place.label)) {
+        return "--label: expected home, work, school, gym, other or none, found " + documents::inQuotes(place.label);
     }
-    if (!(words.radius >= NamedPlace::kLeastRadius && words.radius <= NamedPlace::kMostRadius)) {
+    place.radius = words.radius.value_or(place.radius);
+    if (!(place.radius >= NamedPlace::kLeastRadius && place.radius <= NamedPlace::kMostRadius)) {
         return "--radius: expected 100 to 5000 metres: below that a phone cannot tell in from out";
     }
-    place = {0, words.name, words.label, *latitude, *longitude, words.radius, words.said};
-    return "";
+    place.said = words.said.value_or(place.said);
+    place.name = words.rename.empty() ? words.name : words.rename;
+    return NamedPlace::isName(place.name)
+               ? std::string()
+               : std::string(words.rename.empty() ? "--name" : "--rename") +
+                     ": expected 1 to 40 letters on one line, found " + documents::inQuotes(place.name);
 }
 
 }  // namespace
@@ -55,16 +66,18 @@ std::string Administration::setPlace(const std::string& name, const PlaceWords& 
         }
         return complaint;
     }
-    if (!NamedPlace::isName(words.name)) {
-        return "--name: expected 1 to 40 letters on one line, found " + documents::inQuotes(words.name);
+    std::string isNew;
+    NamedPlace place = placeNamed(*who, words.name, isNew).value_or(NamedPlace());
+    if (place.id == 0 && !words.rename.empty()) {
+        return isNew;
     }
-    NamedPlace place;
     complaint = readPlace(words, place);
     if (!complaint.empty()) {
         return complaint;
     }
-    if (!store_->setPlace(who->id, place)) {
-        return "the place could not be written";
+    if (!(place.id == 0 ? store_->setPlace(who->id, place) : store_->changePlace(who->id, place))) {
+        return words.rename.empty() ? "the place could not be written"
+                                    : "--rename: there is a place of that name already, or it could not be written";
     }
     out_ << name << " has a place " << documents::inQuotes(place.name)
          << (place.said ? ", which may be said\n" : ", which is not said\n");

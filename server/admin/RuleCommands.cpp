@@ -11,9 +11,12 @@ RuleCommands::RuleCommands(CLI::App& program) {
     setPlace_ = named("place", "Names a place of a person, changes it, or removes it");
     setPlace_->add_option("--name", place_.name, "What its owner calls it")->required();
     setPlace_->add_option("--at", place_.at, "Where it is: LATITUDE,LONGITUDE in degrees")->type_name("LAT,LON");
-    setPlace_->add_option("--label", place_.label, "home, work, school, gym or other: clients have words for these");
+    setPlace_->add_option("--label", place_.label,
+                          "home, work, school, gym or other: clients have words for these; none");
     setPlace_->add_option("--radius", place_.radius, "Metres from there that belong to it (150)");
-    setPlace_->add_flag("--said", place_.said, "Those who see the person may hear its name");
+    CLI::Option* said = setPlace_->add_flag("--said", said_, "Those who see the person may hear its name");
+    setPlace_->add_flag("--unsaid", unsaid_, "Nobody hears its name any more")->excludes(said);
+    setPlace_->add_option("--rename", place_.rename, "Another name for one that is there");
     setPlace_->add_flag("--remove", place_.remove, "It has no name any more; grants that end there end now");
     places_ = named("places", "Lists a person's places");
     zone_ = named("zone", "Sets where a person's day ends");
@@ -28,7 +31,9 @@ RuleCommands::RuleCommands(CLI::App& program) {
 
 std::optional<std::string> RuleCommands::run(Administration& administration) const {
     if (*setPlace_) {
-        return administration.setPlace(name_, place_);
+        Administration::PlaceWords place = place_;
+        place.said = said_ || unsaid_ ? std::optional(said_) : std::nullopt;
+        return administration.setPlace(name_, place);
     }
     if (*places_) {
         return administration.places(name_);

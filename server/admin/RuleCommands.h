@@ -23,6 +23,8 @@ class RuleCommands {
     std::string name_;
     std::string other_;
     Administration::PlaceWords place_;
+    bool said_ = false;
+    bool unsaid_ = false;
     CLI::App* setPlace_;
     CLI::App* places_;
     CLI::App* zone_;

@@ -24,6 +24,10 @@ bool isAddress(const std::string& host, int family) {
     return ::inet_pton(family, host.c_str(), bytes.data()) == 1;
 }
 
+bool isPath(const std::string& text) {
+    return text.front() == '/';
+}
+
 std::string fileOf(const std::string& folder) {
     return folder + "/settings.json";
 }
@@ -52,6 +56,11 @@ std::optional<ServiceSettings> ServiceSettings::read(const std::string& folder, 
         if (!isHost(settings.host)) {
             fields.complain("host", "expected a host name or an address");
         }
+        settings.maps = fields.texts("maps");
+        if (std::any_of(settings.maps.begin(), settings.maps.end(),
+                        [](const std::string& map) { return !isPath(map); })) {
+            fields.complain("maps", "expected whole paths of files, such as /srv/maps/region.mbtiles");
+        }
         settings.store = fields.text("store").value_or("");
         if (!settings.store.empty() && !StoreAddress::isServer(settings.store)) {
             fields.complain("store", "expected an address such as postgresql:///ktr");
@@ -70,7 +79,14 @@ std::string ServiceSettings::write(const std::string& folder) const {
     if (!store.empty()) {
         fields.set("store", store);
     }
+    if (!maps.empty()) {
+        fields.set("maps", platform::Value::Array(maps.begin(), maps.end()));
+    }
     return documents::AtomicFile::write(fileOf(folder), platform::writeJson(fields) + "\n", 0600);
+}
+
+PlaceNames::Setup ServiceSettings::names() const {
+    return {maps, {}};
 }
 
 StoreAddress ServiceSettings::storeAddress(const std::string& folder) const {

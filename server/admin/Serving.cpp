@@ -85,6 +85,7 @@ std::string Administration::serve(const Serving& where) {
     setup.hosts = {isSix ? "[" + settings->host + "]" : settings->host};
     setup.now = presentTime;
     setup.holdsAnswers = true;
+    setup.names = settings->names();
     setup.alive = ServiceManager::tellAlive;
     const auto log = std::make_shared<ServiceLog>(STDERR_FILENO);
     setup.log = log;

@@ -39,7 +39,11 @@ std::optional<LocationsRequest> LocationsRequest::read(const Dictionary& body, s
     Complaints complaints;
     FieldReader fields(body, {}, complaints);
     LocationsRequest request;
-    if (!fields.object("clientContext", [](FieldReader& context) { context.leaveOthers(); })) {
+    const bool hasContext = fields.object("clientContext", [&](FieldReader& context) {
+        context.leaveOthers();
+        request.viewer = ViewerLocale::of(context.dictionary());
+    });
+    if (!hasContext) {
         fields.complain("clientContext", "expected an object, found nothing");
     }
     request.handles = fields.stringOrStrings("handles");
@@ -59,6 +63,7 @@ std::optional<SharingRequest> SharingRequest::read(const Dictionary& body, std::
     SharingRequest request;
     const bool hasContext = fields.object("clientContext", [&](FieldReader& context) {
         context.leaveOthers();
+        request.viewer = ViewerLocale::of(context.dictionary());
         request.place = readPlace(context, "location");
     });
     if (!hasContext) {

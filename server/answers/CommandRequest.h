@@ -7,6 +7,7 @@
 #include "platform/base/Value.h"
 #include "server/http/HttpRequest.h"
 #include "server/http/HttpResponse.h"
+#include "server/names/ViewerLocale.h"
 
 namespace ktr::server {
 
@@ -23,6 +24,7 @@ struct LocationsRequest {
     std::optional<CommandPlace> mine;     ///< where the user is; 0/0 reads as none
     std::optional<CommandPlace> wanted;   ///< whether friends are there
     std::optional<std::string> clientId;  ///< comes back
+    ViewerLocale viewer;                  ///< in what words places are named
 
     /// None, with the reason in `complaint`, for a request that is not one.
     static std::optional<LocationsRequest> read(const platform::Dictionary& body, std::string& complaint);
@@ -32,6 +34,7 @@ struct LocationsRequest {
 struct SharingRequest {
     bool hides = false;
     std::optional<CommandPlace> place;
+    ViewerLocale viewer;
 
     static std::optional<SharingRequest> read(const platform::Dictionary& body, std::string& complaint);
 };

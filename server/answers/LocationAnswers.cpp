@@ -22,7 +22,20 @@ double distance(const CommandPlace& place, const Seen& seen) {
     return metres;
 }
 
-Dictionary locationOf(const Seen& seen) {
+/// Clients show the first label as it stands, or else the town.
+void addName(Dictionary& location, const PlaceName& name) {
+    if (!name.street.empty()) {
+        location.set("streetAddress", name.street);
+    }
+    if (!name.town.empty()) {
+        location.set("address", Dictionary{{"locality", name.town}});
+    }
+    if (!name.words.empty()) {
+        location.set("labels", Value::Array{Dictionary{{"label", name.words}}});
+    }
+}
+
+Dictionary locationOf(const Seen& seen, const PlaceName& name) {
     Dictionary location{{"latitude", seen.latitude}, {"longitude", seen.longitude}};
     if (seen.accuracy) {
         location.set("horizontalAccuracy", *seen.accuracy);
@@ -36,12 +49,15 @@ Dictionary locationOf(const Seen& seen) {
         }
         labels.emplace_back(Dictionary{{"label", seen.place}});
         location.set("labels", std::move(labels));
+    } else {
+        addName(location, name);
     }
     return location;
 }
 
-Dictionary entryOf(const Seen& seen, const LocationsRequest& request) {
-    Dictionary entry{{"status", 200}, {"location", locationOf(seen)}};
+Dictionary entryOf(const AskedFriend& one, const LocationsRequest& request) {
+    const Seen& seen = *one.seen;
+    Dictionary entry{{"status", 200}, {"location", locationOf(seen, one.name)}};
     if (request.mine) {
         // Whole centimetres, as decimal text.
         entry.set("distanceInMeters", Value(std::round(distance(*request.mine, seen) * 100.0) / 100.0).description());
@@ -67,7 +83,7 @@ std::string LocationAnswers::said(const AskedFriend& friend_) {
     if (!friend_.seen) {
         return "";
     }
-    return platform::writeJson(locationOf(*friend_.seen));
+    return platform::writeJson(locationOf(*friend_.seen, {}));
 }
 
 Dictionary LocationAnswers::locations(const LocationsRequest& request, std::vector<AskedFriend> friends,
@@ -92,7 +108,7 @@ Dictionary LocationAnswers::locations(const LocationsRequest& request, std::vect
     Dictionary locations;
     Value::Array order;
     for (const AskedFriend& one : found) {
-        locations.set(one.handle, entryOf(*one.seen, request));
+        locations.set(one.handle, entryOf(one, request));
         order.emplace_back(one.handle);
     }
     order.insert(order.end(), rest.begin(), rest.end());
@@ -105,7 +121,7 @@ Dictionary LocationAnswers::locations(const LocationsRequest& request, std::vect
 }
 
 Dictionary LocationAnswers::sharing(bool hidden, const std::string& preferredHandle,
-                                    const std::optional<CommandPlace>& place, std::int64_t now) {
+                                    const std::optional<CommandPlace>& place, const PlaceName& name, std::int64_t now) {
     Dictionary myInfo;
     if (!preferredHandle.empty()) {
         myInfo.set("preferredEmail", preferredHandle);
@@ -113,7 +129,7 @@ Dictionary LocationAnswers::sharing(bool hidden, const std::string& preferredHan
     myInfo.set("hidden", hidden);
     myInfo.set("location", hidden || !place
                                ? Value()
-                               : Value(locationOf({place->latitude, place->longitude, place->accuracy, now})));
+                               : Value(locationOf({place->latitude, place->longitude, place->accuracy, now}, name)));
     return {{"statusCode", 200}, {"serverContext", serverContext(kInterval)}, {"myInfo", myInfo}};
 }
 

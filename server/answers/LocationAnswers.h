@@ -8,6 +8,7 @@
 
 #include "platform/base/Value.h"
 #include "server/answers/CommandRequest.h"
+#include "server/names/PlaceNames.h"
 #include "server/rules/Visibility.h"
 
 namespace ktr::server {
@@ -17,6 +18,7 @@ struct AskedFriend {
     std::string handle;       ///< as it was asked for
     std::int64_t person = 0;  ///< 0: nobody has this handle
     std::optional<Seen> seen;
+    PlaceName name = {};  ///< of where they are seen; of a place that its owner named nothing
 };
 
 /// Words the protocol's answers, of what `Visibility` lets through and of nothing else. Any thread.
@@ -39,7 +41,8 @@ class LocationAnswers {
 
     /// The answer to a command about the user's own sharing. `place` serves the answer and is kept nowhere.
     static platform::Dictionary sharing(bool hidden, const std::string& preferredHandle,
-                                        const std::optional<CommandPlace>& place, std::int64_t now);
+                                        const std::optional<CommandPlace>& place, const PlaceName& name,
+                                        std::int64_t now);
 };
 
 }  // namespace ktr::server

@@ -49,7 +49,33 @@ std::optional<double> numberIn(const UrlQuery& query, std::initializer_list<cons
 }
 
 Report withPosition(const RawFix& fix) {
-    return {Report::Kind::Position, {fix}, {}, false, {}};
+    return {Report::Kind::Position, {fix}, {}, false, {}, {}};
+}
+
+/// What an app calls a waypoint: a place with a name, unless it is a beacon's or one that follows its phone.
+std::optional<RawPlace> placeIn(const Dictionary& message) {
+    const std::string* name = textIn(message, "desc");
+    const auto latitude = numberIn(message, "lat");
+    const auto longitude = numberIn(message, "lon");
+    if (name == nullptr || name->starts_with('+') || message.find("uuid") != nullptr || !latitude || !longitude) {
+        return std::nullopt;
+    }
+    return RawPlace{*name, *latitude, *longitude, numberIn(message, "rad")};
+}
+
+std::vector<RawPlace> placesIn(const Dictionary& message) {
+    std::vector<RawPlace> places;
+    const auto add = [&](const Dictionary* one) {
+        if (auto place = one == nullptr ? std::nullopt : placeIn(*one)) {
+            places.push_back(std::move(*place));
+        }
+    };
+    add(&message);
+    const Value* list = message.find("waypoints");
+    for (const Value& one : list == nullptr || list->array() == nullptr ? Value::Array() : *list->array()) {
+        add(one.dictionary());
+    }
+    return places;
 }
 
 Report readOwnTracks(const Dictionary& message, std::string_view key, bool maySeal) {
@@ -73,6 +99,11 @@ Report readOwnTracks(const Dictionary& message, std::string_view key, bool maySe
         Report report = Report::alive();
         const std::string* face = textIn(message, "face");
         report.face = face == nullptr ? std::nullopt : Base64::decode(*face);
+        return report;
+    }
+    if (*type == "waypoint" || *type == "waypoints") {
+        Report report = Report::alive();
+        report.places = placesIn(message);
         return report;
     }
     if (*type != "location") {

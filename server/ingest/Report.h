@@ -17,8 +17,17 @@ struct RawFix {
     bool operator==(const RawFix&) const = default;
 };
 
-/// What a phone's message says. Whatever else is in it (networks, regions, motion, tags, topics, waypoints, battery) is
-/// not read.
+/// A place to which a phone's owner gave a name in its app, before the rules of NamedPlace. Numbers may be anything.
+struct RawPlace {
+    std::string name;
+    double latitude = 0.0;
+    double longitude = 0.0;
+    std::optional<double> radius;  ///< metres
+
+    bool operator==(const RawPlace&) const = default;
+};
+
+/// What a phone's message says. Whatever else is in it (networks, regions, motion, tags, topics, battery) is not read.
 struct Report {
     enum class Kind {
         Position,  ///< `fixes` has some
@@ -32,8 +41,9 @@ struct Report {
     bool sealed = false;  ///< it came encrypted, and wants its answer so
     /// The bytes of the picture that its owner's card brings, before the rules of `Face`; none: it brings none.
     std::optional<std::string> face;
+    std::vector<RawPlace> places;
 
-    static Report alive() { return {Kind::Alive, {}, {}, false, {}}; }
+    static Report alive() { return {Kind::Alive, {}, {}, false, {}, {}}; }
     bool operator==(const Report&) const = default;
 };
 

@@ -89,8 +89,8 @@ HttpResponse OwnPages::show(const PageRequest& request, const Reader& reader) {
     if (request.is({"places"})) {
         return placesPage(reader, 200, "", nullptr);
     }
-    if (request.is({"places", "*", "remove"})) {
-        return showPlaceRemoval(request, reader);
+    if (request.is({"places", "*"}) || request.is({"places", "*", "remove"})) {
+        return showPlace(request, reader);
     }
     if (request.is({"sees", "*"}) || request.is({"sees", "*", "stop"})) {
         return showRule(request, reader);
@@ -141,6 +141,9 @@ HttpResponse OwnPages::change(const PageRequest& request, const Reader& reader) 
         return store_.endFence(reader.person.id, request.number(1)) == FenceOutcome::Failed
                    ? notKept(reader.context)
                    : PageAnswer::seeOther("/me/fences");
+    }
+    if (request.is({"places", "*"})) {
+        return changePlace(request, reader);
     }
     if (request.is({"delete"})) {
         return deleteAll(reader);

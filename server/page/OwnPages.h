@@ -41,7 +41,9 @@ class OwnPages {
     HttpResponse changeSettings(const PageRequest& request, const Reader& reader);
     HttpResponse deleteAll(const Reader& reader);
     HttpResponse placesPage(const Reader& reader, int status, const std::string& typed, const char* complaint);
-    HttpResponse showPlaceRemoval(const PageRequest& request, const Reader& reader);
+    /// The page that changes it, or the one that asks before its name goes.
+    HttpResponse showPlace(const PageRequest& request, const Reader& reader);
+    HttpResponse changePlace(const PageRequest& request, const Reader& reader);
     HttpResponse changePlaces(const PageRequest& request, const Reader& reader);
 
     SharingPage::Data sharingOf(const Reader& reader);

@@ -7,7 +7,8 @@
 
 namespace ktr::server {
 
-/// The places to which the reader gave names, and the page that asks before a name goes. Any thread.
+/// The places to which the reader gave names, the page that changes one, and the page that asks before a name goes. Any
+/// thread.
 class PlacesPage {
   public:
     struct Data {
@@ -18,6 +19,8 @@ class PlacesPage {
     };
 
     static std::string html(const PageContext& context, const Data& data);
+    /// `complaint`: why what was typed was not taken; else empty.
+    static std::string changeHtml(const PageContext& context, const NamedPlace& place, const std::string& complaint);
     static std::string removeHtml(const PageContext& context, const NamedPlace& place);
 };
 

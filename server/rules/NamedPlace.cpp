@@ -16,8 +16,30 @@ constexpr std::size_t kLongestName = 40;
 /// A degree of latitude is nowhere shorter, metres.
 constexpr double kShortestDegree = 110000.0;
 constexpr double kEnoughAccuracy = 200.0;
+constexpr double kMostLatitude = 90.0;
+constexpr double kMostLongitude = 180.0;
 
 }  // namespace
+
+std::optional<NamedPlace> NamedPlace::of(const RawPlace& raw) {
+    std::string name = raw.name;
+    name.erase(0, std::min(name.find_first_not_of(' '), name.size()));
+    name.erase(name.find_last_not_of(' ') + 1);
+    const bool isOnEarth = std::abs(raw.latitude) <= kMostLatitude && std::abs(raw.longitude) <= kMostLongitude;
+    if (!isName(name) || !isOnEarth) {
+        return std::nullopt;
+    }
+    NamedPlace place;
+    const std::string label = platform::asciiLowercased(name);
+    place.label = isLabel(label) ? label : "";
+    place.name = std::move(name);
+    place.latitude = raw.latitude;
+    place.longitude = raw.longitude;
+    if (raw.radius && *raw.radius > 0.0) {
+        place.radius = std::clamp(*raw.radius, kLeastRadius, kMostRadius);
+    }
+    return place;
+}
 
 bool NamedPlace::holds(const Fix& fix) const {
     if ((fix.accuracy && *fix.accuracy > std::max(radius, kEnoughAccuracy)) ||

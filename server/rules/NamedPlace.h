@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "server/ingest/Fix.h"
+#include "server/ingest/Report.h"
 
 namespace ktr::server {
 
@@ -14,6 +15,7 @@ namespace ktr::server {
 struct NamedPlace {
     static constexpr double kLeastRadius = 100.0;  ///< metres: below it a phone's fixes do not tell in from out
     static constexpr double kMostRadius = 5000.0;
+    static constexpr int kMost = 100;  ///< of one person, by what phones send
 
     std::int64_t id = 0;
     std::string name;   ///< the owner's word for it
@@ -23,6 +25,9 @@ struct NamedPlace {
     double radius = 150.0;  ///< metres
     bool said = false;      ///< viewers may hear its name
 
+    /// Of a place to which a phone's owner gave a name in its app: not said to anybody until its owner allows that. A
+    /// radius outside of what makes sense is the nearest that does. None: no name, or no place on earth.
+    static std::optional<NamedPlace> of(const RawPlace& raw);
     /// Whether a fix lies in it, and is exact enough to tell: its accuracy, if it has one, is no worse than the radius
     /// or 200 m, whichever is more.
     bool holds(const Fix& fix) const;

@@ -89,6 +89,7 @@ std::optional<Seen> Visibility::visible(const Sharing& sharing, std::int64_t now
             seen.place = place->name;
             seen.label = place->label;
         }
+        seen.isExact = true;
         return seen;
     }
     const std::int64_t time = slotOf(last.time, length) * length;

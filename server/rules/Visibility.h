@@ -31,6 +31,7 @@ struct Seen {
     std::int64_t time = 0;           ///< seconds since 1970
     std::string place = {};          ///< the owner's name for where that is, if it may be said; else empty
     std::string label = {};          ///< what sort of place it is, as `NamedPlace::label`
+    bool isExact = false;            ///< the fix as it is; else nothing finer than a town is said of it
 
     bool operator==(const Seen&) const = default;
 };

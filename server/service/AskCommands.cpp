@@ -144,7 +144,7 @@ void AskCommands::tell(const Device& device, const HttpReply& reply) const {
     const auto handle = std::find_if(person->handles.begin(), person->handles.end(),
                                      [](const std::string& one) { return one.find('@') != std::string::npos; });
     Dictionary answer =
-        LocationAnswers::sharing(person->hidden, handle == person->handles.end() ? "" : *handle, std::nullopt, 0);
+        LocationAnswers::sharing(person->hidden, handle == person->handles.end() ? "" : *handle, std::nullopt, {}, 0);
     answer.set("hidden", person->hidden);
     Value::Array viewers;
     for (const auto& [name, rule] : rules) {

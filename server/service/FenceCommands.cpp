@@ -46,7 +46,7 @@ void FenceCommands::set(const Device& device, const Dictionary& body, const Http
         // To be told where somebody is now is to look.
         Dictionary asks = body;
         asks.set("handles", Value::Array{request->handle});
-        return reply.send(setup_.locations(device, asks));
+        return setup_.locations(device, asks, reply);
     }
     const std::uint64_t failures = setup_.store.readFailures();
     const FenceWish wish{device.person, setup_.store.personOf(request->handle).value_or(0), request->place,

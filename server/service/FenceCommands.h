@@ -19,7 +19,7 @@ class FenceCommands {
         Store& store;
         std::function<std::int64_t()> now;
         /// Answers as to a get-locations command.
-        std::function<HttpResponse(const Device&, const platform::Dictionary& body)> locations;
+        std::function<void(const Device&, const platform::Dictionary& body, const HttpReply&)> locations;
     };
 
     explicit FenceCommands(Setup setup) : setup_(std::move(setup)) {}

@@ -83,7 +83,7 @@ void HeldAnswers::answer(const std::string& client, const Answer& answer, const 
         }
         last_[client] = {answer.said, now};
     }
-    reply.send(answer.response());
+    answer.give(reply);
 }
 
 void HeldAnswers::look(const std::string& client, const std::shared_ptr<Held>& held, bool isOver) {

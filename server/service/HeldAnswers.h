@@ -32,7 +32,7 @@ class HeldAnswers {
     struct Answer {
         std::string said;               ///< of what the viewer sees: alike when nothing has changed
         std::set<std::int64_t> people;  ///< a change of one of them may change it: the viewer, and who was asked for
-        std::function<HttpResponse()> response;
+        std::function<void(const HttpReply&)> give;  ///< sends it, now or a little later
     };
     /// Makes an answer; a reply of its own kind when it cannot, with `people` empty.
     using Maker = std::function<Answer()>;

@@ -46,13 +46,17 @@ Service::Service(Setup setup)
       page_(std::make_unique<PeoplesPage>(PeoplesPage::Setup{
           *store_, now_, delays_,
           [this](double seconds, std::function<void()> work) { http_.later(seconds, std::move(work)); }})),
-      fences_(std::make_unique<FenceCommands>(FenceCommands::Setup{
-          *store_, now_, [this](const Device& device, const Dictionary& body) { return locations(device, body); }})),
+      fences_(std::make_unique<FenceCommands>(
+          FenceCommands::Setup{*store_, now_,
+                               [this](const Device& device, const Dictionary& body, const HttpReply& reply) {
+                                   answerNow(device, body, reply);
+                               }})),
       asks_(std::make_unique<AskCommands>(AskCommands::Setup{*store_, now_})),
       held_(setup.holdsAnswers ? std::make_unique<HeldAnswers>([this](double seconds, std::function<void()> work) {
           http_.later(seconds, std::move(work));
       })
-                               : nullptr) {
+                               : nullptr),
+      names_(std::make_unique<NameDesk>(std::move(setup.names))) {
     if (held_) {
         listening_ = store_->listen([this](const Change& change) { held_->concerns(change); });
     }
@@ -96,6 +100,7 @@ void Service::stop(std::chrono::milliseconds grace) {
         held_->release();
     }
     http_.stop(grace);
+    names_.reset();
     events_.reset();
     fences_.reset();
     asks_.reset();
@@ -237,12 +242,16 @@ void Service::takeOwnTracks(const HttpRequest& request, const HttpReply& reply) 
     }
     // Written before the rest of the post, so that its fate is known when the rest is on the disk.
     const auto faceKept = std::make_shared<bool>(true);
+    const auto placesKept = std::make_shared<bool>(true);
     if (const auto face = cleanedFace(report)) {
         store_->keepFace(device->person, *face, [faceKept](bool good) { *faceKept = good; });
     }
+    if (auto places = namedPlaces(report); !places.empty()) {
+        store_->keepPlaces(device->person, std::move(places), [placesKept](bool good) { *placesKept = good; });
+    }
     store_->keep(device->id, device->person, admitted(*device, report), store_->present(now_()),
-                 [this, device = *device, report, faceKept, reply](bool good) {
-                     if (!good || !*faceKept) {
+                 [this, device = *device, report, faceKept, placesKept, reply](bool good) {
+                     if (!good || !*faceKept || !*placesKept) {
                          // A phone keeps what got a 5xx and sends it again.
                          ++counters_.storeFailures;
                          return reply.send(refusal(503, "the store cannot be written"));
@@ -257,6 +266,17 @@ void Service::takeOwnTracks(const HttpRequest& request, const HttpReply& reply) 
                          reply.send(HttpResponse::json(200, friends));
                      });
                  });
+}
+
+std::vector<NamedPlace> Service::namedPlaces(const Report& report) {
+    std::vector<NamedPlace> places;
+    for (const RawPlace& raw : report.places) {
+        auto place = places.size() < NamedPlace::kMost ? NamedPlace::of(raw) : std::nullopt;
+        if (place) {
+            places.push_back(std::move(*place));
+        }
+    }
+    return places;
 }
 
 void Service::takeTooLong(const HttpRequest& request, const HttpReply& reply) {
@@ -342,7 +362,7 @@ void Service::answerLocations(const Device& device, const Dictionary& body, cons
         return reply.send(refusal(400, complaint));
     }
     if (!held_) {
-        return reply.send(locationsNow(device, *request).response());
+        return locationsNow(device, *request).give(reply);
     }
     std::string client = std::to_string(device.id) + '\n' + request->clientId.value_or("");
     for (const std::string& handle : request->handles) {
@@ -351,17 +371,21 @@ void Service::answerLocations(const Device& device, const Dictionary& body, cons
     const auto now = [this, device = device, asked = *request]() -> HeldAnswers::Answer {
         // While it was held its secret may have ended.
         if (!store_->isInUse(device.id).value_or(true)) {
-            return {"", {}, [] { return refusal(401, "the credentials are missing or wrong"); }};
+            return {
+                "", {}, [](const HttpReply& late) { late.send(refusal(401, "the credentials are missing or wrong")); }};
         }
         return locationsNow(device, asked);
     };
     held_->give(client, now, reply);
 }
 
-HttpResponse Service::locations(const Device& device, const Dictionary& body) {
+void Service::answerNow(const Device& device, const Dictionary& body, const HttpReply& reply) {
     std::string complaint;
     const auto request = LocationsRequest::read(body, complaint);
-    return request ? locationsNow(device, *request).response() : refusal(400, complaint);
+    if (!request) {
+        return reply.send(refusal(400, complaint));
+    }
+    locationsNow(device, *request).give(reply);
 }
 
 HeldAnswers::Answer Service::locationsNow(const Device& device, const LocationsRequest& request) {
@@ -372,7 +396,7 @@ HeldAnswers::Answer Service::locationsNow(const Device& device, const LocationsR
     const auto people = store_->asked(device.person, lookedUp, now);
     if (!people) {
         ++counters_.storeFailures;
-        return {"", {}, [] { return refusal(503, "the store cannot be read"); }};
+        return {"", {}, [](const HttpReply& reply) { reply.send(refusal(503, "the store cannot be read")); }};
     }
     HeldAnswers::Answer answer{"", {device.person}, {}};
     std::vector<AskedFriend> asked;
@@ -393,12 +417,12 @@ HeldAnswers::Answer Service::locationsNow(const Device& device, const LocationsR
         }
         answer.said += LocationAnswers::said(asked.back()) + '\n';
     }
-    answer.response = [this, device, request, now, asked = std::move(asked), seen = std::move(seen)] {
+    answer.give = [this, device, request, now, asked = std::move(asked),
+                   seen = std::move(seen)](const HttpReply& reply) {
         if (!seen.empty()) {
             store_->noteLooks(device.person, seen, true, now, nullptr);
         }
-        const double interval = held_ ? HeldAnswers::kAskAgain : LocationAnswers::kInterval;
-        return HttpResponse::json(200, platform::writeJson(LocationAnswers::locations(request, asked, interval)));
+        nameAndAnswer(request, asked, reply);
     };
     return answer;
 }
@@ -409,25 +433,12 @@ void Service::changeSharing(const Device& device, const Dictionary& body, const 
     if (!request) {
         return reply.send(refusal(400, complaint));
     }
-    const auto answer = [this, device, place = request->place, reply](bool hides) {
-        const auto person = store_->person(device.person);
-        if (!person) {
-            ++counters_.storeFailures;
-            return reply.send(refusal(503, "the store cannot be read"));
-        }
-        // What is said to be an e-mail address is one.
-        const auto handle = std::find_if(person->handles.begin(), person->handles.end(),
-                                         [](const std::string& one) { return one.find('@') != std::string::npos; });
-        reply.send(HttpResponse::json(
-            200, platform::writeJson(LocationAnswers::sharing(
-                     hides || person->hidden, handle == person->handles.end() ? "" : *handle, place, now_()))));
-    };
-    const auto written = [this, answer, reply, hides = request->hides](bool good) {
+    const auto written = [this, device, request = *request, reply](bool good) {
         if (!good) {
             ++counters_.storeFailures;
             return reply.send(refusal(503, "the store cannot be written"));
         }
-        http_.later(0.0, [answer, hides] { answer(hides); });
+        http_.later(0.0, [this, device, request, reply] { answerSharing(device, request, reply); });
     };
     if (request->hides) {
         store_->hide(device.person, now_(), written);

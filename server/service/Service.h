@@ -10,8 +10,10 @@
 
 #include "platform/base/Value.h"
 #include "server/answers/CommandRequest.h"
+#include "server/answers/LocationAnswers.h"
 #include "server/http/HttpServer.h"
 #include "server/ingest/Report.h"
+#include "server/names/NameDesk.h"
 #include "server/outbox/EventStreams.h"
 #include "server/page/PeoplesPage.h"
 #include "server/service/AskCommands.h"
@@ -44,6 +46,7 @@ class Service {
         /// Sees each request before the service does, and answers it or hands it on: for a service whose answers go
         /// wrong on purpose. On the edge's threads; none: nobody does.
         std::function<void(HttpRequest, HttpReply, const HttpHandler& service)> around = {};
+        PlaceNames::Setup names = {};  ///< by which places are called something
     };
 
     explicit Service(Setup setup);
@@ -77,13 +80,19 @@ class Service {
     void takeTooLong(const HttpRequest& request, const HttpReply& reply);
     /// What of a report is kept; counts the rest.
     std::vector<Fix> admitted(const Device& device, const Report& report);
+    /// The places that a report names, as many as are kept.
+    static std::vector<NamedPlace> namedPlaces(const Report& report);
     /// The face that a report brings, if it is one; counts what is none.
     std::optional<std::string> cleanedFace(const Report& report);
     void answerCommand(const HttpRequest& request, const HttpReply& reply);
     void answerLocations(const Device& device, const platform::Dictionary& body, const HttpReply& reply);
     void openEvents(const HttpRequest& request, const HttpReply& reply);
-    HttpResponse locations(const Device& device, const platform::Dictionary& body);
+    /// The same, without holding it.
+    void answerNow(const Device& device, const platform::Dictionary& body, const HttpReply& reply);
     HeldAnswers::Answer locationsNow(const Device& device, const LocationsRequest& request);
+    /// Looks up what the places are called, and answers then.
+    void nameAndAnswer(LocationsRequest request, std::vector<AskedFriend> friends, const HttpReply& reply);
+    void answerSharing(const Device& device, const SharingRequest& request, const HttpReply& reply);
     void changeSharing(const Device& device, const platform::Dictionary& body, const HttpReply& reply);
     void sweep();
 
@@ -104,6 +113,7 @@ class Service {
     std::unique_ptr<EventStreams> events_;
     std::unique_ptr<HeldAnswers> held_;  ///< none: no answer is held
     std::shared_ptr<void> listening_;
+    std::unique_ptr<NameDesk> names_;
 };
 
 }  // namespace ktr::server

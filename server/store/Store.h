@@ -66,6 +66,9 @@ class Store {
     void askToShare(std::int64_t device, Done done);
     /// Shows the owner of a device that asked so after the newest hiding, wherever that came from; else does nothing.
     void shareAsAsked(std::int64_t device, std::int64_t now, Done done);
+    /// Keeps places that a person named on a phone. One that has this name already is where it is now, and keeps its
+    /// label and whether it is said. Beyond `NamedPlace::kMost` nothing is kept that is new.
+    void keepPlaces(std::int64_t owner, std::vector<NamedPlace> places, Done done);
     /// Deletes what is too old, of a few people in turn: to be called again and again.
     void deleteOld(std::int64_t now, Done done);
 
@@ -125,6 +128,8 @@ class Store {
     bool setZone(std::int64_t person, const std::string& zone);
     /// Names a place, or changes the one of that name; its id is not used.
     bool setPlace(std::int64_t owner, const NamedPlace& place);
+    /// The one with this id. False also when there is none, or another one has its new name.
+    bool changePlace(std::int64_t owner, const NamedPlace& place);
     /// Whether there was one. Grants that were to end there end now.
     bool removePlace(std::int64_t owner, std::int64_t place, std::int64_t now);
     std::vector<std::pair<std::string, Grant>> grantsOf(std::int64_t owner);

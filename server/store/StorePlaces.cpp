@@ -56,6 +56,56 @@ bool Store::setPlace(std::int64_t owner, const NamedPlace& place) {
            });
 }
 
+bool Store::changePlace(std::int64_t owner, const NamedPlace& place) {
+    int changed = 0;
+    const bool good = writeNow([&](Database& database) {
+        changes(owner);
+        database
+            .statement(
+                "UPDATE place SET name = $3, label = $4, latitude = $5, longitude = $6, radius = $7, said = $8 "
+                "WHERE owner = $1 AND id = $2 AND "
+                "NOT EXISTS (SELECT 1 FROM place WHERE owner = $1 AND name = $3 AND id <> $2)")
+            .bind(owner)
+            .bind(place.id)
+            .bind(place.name)
+            .bind(place.label)
+            .bind(place.latitude)
+            .bind(place.longitude)
+            .bind(place.radius)
+            .bind(std::int64_t{place.said})
+            .run();
+        changed = database.changes();
+    });
+    return good && changed > 0;
+}
+
+void Store::keepPlaces(std::int64_t owner, std::vector<NamedPlace> places, Done done) {
+    write(
+        [this, owner, places = std::move(places)](Database& database) {
+            changes(owner);
+            for (const NamedPlace& place : places) {
+                database
+                    .statement(
+                        "INSERT INTO place (id, owner, name, label, latitude, longitude, radius, said) "
+                        "SELECT $1, $2, $3, $4, $5, $6, $7, 0 FROM person WHERE id = $2 AND $1 <> 0 AND "
+                        "((SELECT COUNT(*) FROM place WHERE owner = $2) < $8 OR "
+                        "EXISTS (SELECT 1 FROM place WHERE owner = $2 AND name = $3)) "
+                        "ON CONFLICT (owner, name) DO UPDATE SET latitude = excluded.latitude, "
+                        "longitude = excluded.longitude, radius = excluded.radius")
+                    .bind(Secret::number())
+                    .bind(owner)
+                    .bind(place.name)
+                    .bind(place.label)
+                    .bind(place.latitude)
+                    .bind(place.longitude)
+                    .bind(place.radius)
+                    .bind(std::int64_t{NamedPlace::kMost})
+                    .run();
+            }
+        },
+        std::move(done));
+}
+
 bool Store::removePlace(std::int64_t owner, std::int64_t place, std::int64_t now) {
     int removed = 0;
     const bool good = writeNow([&](Database& database) {

@@ -188,7 +188,7 @@ class Phone:
 def other_messages(number):
     """Everything else that trackers send, one after the other."""
     now = int(time.time())
-    waypoint = {"_type": "waypoint", "desc": PRIVATE[2], "lat": 50.2, "lon": -3.1, "rad": 100, "tst": now - 9000, "rid": "a1"}
+    waypoint = {"_type": "waypoint", "desc": "Allotment", "lat": 50.2, "lon": -3.1, "rad": 100, "tst": now - 9000, "rid": "a1"}
     kinds = [
         {"_type": "transition", "event": random.choice(("enter", "leave")), "wtst": now - 9000, "tst": now, "acc": 20,
          "lat": 50.2, "lon": -3.1, "desc": PRIVATE[2], "tid": "an", "t": "c", "rid": "a1"},

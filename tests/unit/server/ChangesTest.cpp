@@ -129,6 +129,10 @@ TEST_P(StoreChanges, WhatDecidesWhatIsSeen_IsToldBeforeTheWriterHears) {
               (People{ann_, mara_}));
     EXPECT_EQ(toldBy([&] { return store_->revokeGrant(ann_, mara_); }), (People{ann_, mara_}));
     EXPECT_EQ(toldBy([&] { return store_->setPlace(ann_, {0, "work", "", 50.0, 8.0, 200.0, true}); }), People{ann_});
+    const server::NamedPlace place = store_->placesOf(ann_).front();
+    EXPECT_EQ(toldBy([&] { return store_->changePlace(ann_, place); }), People{ann_});
+    EXPECT_EQ(toldBy([&] { return finished([&](auto done) { store_->keepPlaces(ann_, {place}, done); }); }),
+              People{ann_});
     EXPECT_EQ(toldBy([&] { return store_->setHidden(ann_, true, kNow); }), People{ann_});
     EXPECT_EQ(toldBy([&] { return finished([&](auto done) { store_->hide(ann_, kNow, done); }); }), People{ann_});
     EXPECT_EQ(toldBy([&] { return store_->setHidden(ann_, false, kNow); }), People{ann_});

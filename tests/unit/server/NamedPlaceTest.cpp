@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cmath>
+
 namespace ktr::test {
 
 using server::Fix;
@@ -39,6 +41,26 @@ TEST(NamedPlaceTest, FixThatIsTooVague_IsHeldByNone) {
 TEST(NamedPlaceTest, DateLine_IsNoEdge) {
     const NamedPlace place{1, "Pier", "", 0.0, 180.0, 150.0, true};
     EXPECT_TRUE(place.holds({0, 0, 0.0, -179.9995, std::nullopt}));
+}
+
+TEST(NamedPlaceTest, APhonesPlace_IsNotSaid) {
+    const auto place = NamedPlace::of({" Allotment ", 50.2, -3.1, 80.0});
+    EXPECT_EQ(place, (NamedPlace{0, "Allotment", "", 50.2, -3.1, NamedPlace::kLeastRadius, false}));
+    EXPECT_EQ(NamedPlace::of({"Home", 50.2, -3.1, 300.0}), (NamedPlace{0, "Home", "home", 50.2, -3.1, 300.0, false}));
+    EXPECT_EQ(NamedPlace::of({"A", 1.0, 2.0, 1.0e9})->radius, NamedPlace::kMostRadius);
+    for (const std::optional<double> radius : {std::optional<double>(), std::optional(0.0), std::optional(-5.0)}) {
+        EXPECT_EQ(NamedPlace::of({"A", 1.0, 2.0, radius})->radius, 150.0);
+    }
+}
+
+TEST(NamedPlaceTest, WhatIsNoPlaceOnAPhone_IsNone) {
+    EXPECT_FALSE(NamedPlace::of({"", 1.0, 2.0, 100.0}));
+    EXPECT_FALSE(NamedPlace::of({"   ", 1.0, 2.0, 100.0}));
+    EXPECT_FALSE(NamedPlace::of({"A\nB", 1.0, 2.0, 100.0}));
+    EXPECT_FALSE(NamedPlace::of({std::string(41, 'a'), 1.0, 2.0, 100.0}));
+    EXPECT_FALSE(NamedPlace::of({"A", 91.0, 2.0, 100.0}));
+    EXPECT_FALSE(NamedPlace::of({"A", 1.0, 181.0, 100.0}));
+    EXPECT_FALSE(NamedPlace::of({"A", std::nan(""), 2.0, 100.0}));
 }
 
 TEST(NamedPlaceTest, Labels_AreTheFiveThatClientsWord) {

@@ -315,6 +315,33 @@ TEST_F(OwnPagesTest, PlaceWhereThePhoneIs_IsNamed_AndItsNameTakenBack) {
     EXPECT_EQ(get(removal).status, 404);
 }
 
+TEST_F(OwnPagesTest, Place_IsChanged_ByItsOwnerAlone) {
+    signIn();
+    ASSERT_TRUE(store_->setPlace(mara_, {0, "Pool", "", 50.0, 8.0, 250.0, false}));
+    ASSERT_TRUE(store_->setPlace(mara_, {0, "Attic", "", 50.1, 8.0, 150.0, false}));
+    ASSERT_TRUE(store_->setPlace(lea_, {0, "Lea's", "", 51.0, 8.0, 150.0, false}));
+    const auto pool = [&] { return store_->placesOf(mara_).back(); };
+    const std::string page = "/me/places/" + std::to_string(pool().id);
+    EXPECT_TRUE(has(get("/me/places"), page));
+    EXPECT_TRUE(has(get(page), "Change \u2068Pool\u2069"));
+    EXPECT_FALSE(has(get(page), R"(value="yes" checked)"));
+    EXPECT_EQ(post(page, "name=Swimming&kind=gym&said=yes").status, 303);
+    EXPECT_EQ(pool(), (server::NamedPlace{pool().id, "Swimming", "gym", 50.0, 8.0, 250.0, true}));
+    EXPECT_TRUE(has(get(page), R"(value="yes" checked)"));
+    EXPECT_EQ(post(page, "name=Swimming&kind=").status, 303) << "without the box it is not said";
+    EXPECT_EQ(pool(), (server::NamedPlace{pool().id, "Swimming", "", 50.0, 8.0, 250.0, false}));
+    const server::NamedPlace before = pool();
+    EXPECT_EQ(post(page, "name=&kind=gym").status, 400);
+    EXPECT_EQ(post(page, "name=Swimming&kind=palace").status, 400);
+    EXPECT_TRUE(has(post(page, "name=Attic&kind="), "Another place of yours has this name."));
+    EXPECT_EQ(pool(), before);
+    const std::string leas = "/me/places/" + std::to_string(store_->placesOf(lea_).front().id);
+    EXPECT_EQ(get(leas).status, 404);
+    EXPECT_EQ(post(leas, "name=Mine&kind=&said=yes").status, 404);
+    EXPECT_EQ(store_->placesOf(lea_).front().name, "Lea's");
+    EXPECT_FALSE(store_->placesOf(lea_).front().said);
+}
+
 TEST_F(OwnPagesTest, PhonesFirstPlace_ShowsUp) {
     signIn();
     bool failed = false;

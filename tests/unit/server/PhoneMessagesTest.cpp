@@ -42,14 +42,32 @@ TEST_F(PhoneMessagesTest, OwnTracksPing_IsNotAFix) {
 }
 
 TEST_F(PhoneMessagesTest, OwnTracksOtherTypes_SayThatThePhoneLives) {
-    for (const char* type : {"transition", "waypoint", "waypoints", "card", "status", "lwt", "steps", "beacon",
-                             "request", "cmd", "configuration", "dump", "one from the future"}) {
+    for (const char* type : {"transition", "card", "status", "lwt", "steps", "beacon", "request", "cmd",
+                             "configuration", "dump", "one from the future"}) {
         EXPECT_EQ(
             PhoneMessages::ownTracks(std::string(R"({"_type":")") + type + R"(","lat":1,"lon":2,"tst":3,"acc":4})"),
             Report::alive())
             << type;
     }
     EXPECT_EQ(PhoneMessages::ownTracks(""), Report::alive()) << "a friend was deleted in the app";
+}
+
+TEST_F(PhoneMessagesTest, OwnTracksWaypoints_AreNamedPlacesAndNoFixes) {
+    const std::string work = R"({"_type":"waypoint","desc":"Work","lat":50.2,"lon":-3.1,"rad":120,"tst":1763760000})";
+    Report expected = Report::alive();
+    expected.places = {{"Work", 50.2, -3.1, 120.0}};
+    EXPECT_EQ(PhoneMessages::ownTracks(work), expected);
+    expected.places.push_back({"Pool", 50.3, -3.2, std::nullopt});
+    EXPECT_EQ(PhoneMessages::ownTracks(R"({"_type":"waypoints","_creator":"phone","waypoints":[)" + work +
+                                       R"(,{"_type":"waypoint","desc":"Pool","lat":50.3,"lon":-3.2},7,null,{}]})"),
+              expected);
+    for (const char* odd :
+         {R"({"_type":"waypoint","lat":50.2,"lon":-3.1})", R"({"_type":"waypoint","desc":"Work","lat":50.2})",
+          R"({"_type":"waypoint","desc":"+follow","lat":50.2,"lon":-3.1,"rad":50})",
+          R"({"_type":"waypoint","desc":"Keys","lat":50.2,"lon":-3.1,"uuid":"0000","major":1})",
+          R"({"_type":"waypoint","desc":7,"lat":50.2,"lon":-3.1})", R"({"_type":"waypoints","waypoints":7})"}) {
+        EXPECT_EQ(PhoneMessages::ownTracks(odd), Report::alive()) << odd;
+    }
 }
 
 TEST_F(PhoneMessagesTest, OwnTracksCard_BringsAFaceAndNoName) {

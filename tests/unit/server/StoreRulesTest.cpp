@@ -354,6 +354,55 @@ TEST_P(StoreRules, NewestFix_IsTheOneWithTheGreatestTime) {
     EXPECT_EQ(store_->newestFix(otto_), std::nullopt);
 }
 
+TEST_P(StoreRules, PlacesOfAPhone_AreKeptUnsaidAndMovedButNotSaidAnew) {
+    const auto keepPlaces = [&](std::vector<NamedPlace> places) {
+        return finished([&](auto done) { store_->keepPlaces(ann_, std::move(places), done); });
+    };
+    EXPECT_TRUE(keepPlaces({{0, "Pool", "", 50.4, -3.1, 200.0, true}}));
+    ASSERT_EQ(store_->placesOf(ann_).size(), 1U);
+    EXPECT_FALSE(store_->placesOf(ann_).front().said) << "only its owner says that";
+    NamedPlace said = store_->placesOf(ann_).front();
+    said.said = true;
+    said.label = "gym";
+    EXPECT_TRUE(store_->setPlace(ann_, said));
+    EXPECT_TRUE(keepPlaces({{0, "Pool", "", 50.5, -3.2, 300.0, false}}));
+    ASSERT_EQ(store_->placesOf(ann_).size(), 1U);
+    said.latitude = 50.5;
+    said.longitude = -3.2;
+    said.radius = 300.0;
+    EXPECT_EQ(store_->placesOf(ann_).front(), said);
+    EXPECT_TRUE(store_->placesOf(otto_).empty());
+}
+
+TEST_P(StoreRules, PlacesOfAPhone_AreAHundredAtMost) {
+    std::vector<NamedPlace> many;
+    for (int number = 0; number < NamedPlace::kMost + 20; ++number) {
+        many.push_back({0, "Place " + std::to_string(1000 + number), "", 50.4, -3.1, 200.0, false});
+    }
+    EXPECT_TRUE(finished([&](auto done) { store_->keepPlaces(ann_, many, done); }));
+    EXPECT_EQ(store_->placesOf(ann_).size(), std::size_t{NamedPlace::kMost});
+    many.front().latitude = 51.0;
+    EXPECT_TRUE(finished([&](auto done) { store_->keepPlaces(ann_, {many.front()}, done); }));
+    EXPECT_EQ(store_->placesOf(ann_).front().latitude, 51.0) << "those that are there still move";
+}
+
+TEST_P(StoreRules, APlace_IsChangedByItsOwnerAndKeepsWhatRefersToIt) {
+    const Grant grant = untilHome();
+    ASSERT_TRUE(store_->setPlace(ann_, {0, "Pool", "", 50.4, -3.1, 200.0, false}));
+    NamedPlace place = store_->placesOf(ann_).front();
+    ASSERT_EQ(place.id, grant.arrival);
+    place.name = "Cottage";
+    place.said = false;
+    EXPECT_FALSE(store_->changePlace(otto_, place));
+    EXPECT_TRUE(store_->changePlace(ann_, place));
+    EXPECT_EQ(store_->placesOf(ann_).front(), place);
+    place.name = "Pool";
+    EXPECT_FALSE(store_->changePlace(ann_, place)) << "another one has that name";
+    EXPECT_EQ(store_->placesOf(ann_).front().name, "Cottage");
+    place.id += 1;
+    EXPECT_FALSE(store_->changePlace(ann_, place));
+}
+
 INSTANTIATE_TEST_SUITE_P(Sqlite, StoreRules, ::testing::Values(false));
 INSTANTIATE_TEST_SUITE_P(Postgres, StoreRules, ::testing::Values(true));
 

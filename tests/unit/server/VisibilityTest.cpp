@@ -77,7 +77,7 @@ TEST_F(VisibilityTest, Exact_IsTheFixWithTheGreatestTime) {
     Sharing sharing = shared(Precision::Exact);
     sharing.fixes = {fix(kNow - 600, 50.0, -3.0), fix(kNow - 60, 50.2, -3.1)};
     sharing.fixes[0].heard = kNow;
-    EXPECT_EQ(Visibility::visible(sharing, kNow), (Seen{50.2, -3.1, 12.0, kNow - 60}));
+    EXPECT_EQ(Visibility::visible(sharing, kNow), (Seen{50.2, -3.1, 12.0, kNow - 60, "", "", true}));
 }
 
 TEST_F(VisibilityTest, NothingIsSeen_OfWhoIsStrangeHiddenExpiredOrSilent) {
@@ -180,7 +180,7 @@ TEST_F(VisibilityTest, Exact_SaysTheOwnersPlace_OnlyIfThatMayBeSaid) {
     Sharing sharing = shared(Precision::Exact);
     sharing.fixes = {fix(kNow - 60, 50.2, -3.1)};
     sharing.places = {{1, "Work", "work", 50.2, -3.1, 150.0, true}, {2, "Clinic", "", 50.2, -3.1, 100.0, false}};
-    EXPECT_EQ(Visibility::visible(sharing, kNow), (Seen{50.2, -3.1, 12.0, kNow - 60, "Work", "work"}));
+    EXPECT_EQ(Visibility::visible(sharing, kNow), (Seen{50.2, -3.1, 12.0, kNow - 60, "Work", "work", true}));
     sharing.places.push_back({3, "Canteen", "", 50.2, -3.1, 110.0, true});
     EXPECT_EQ(Visibility::visible(sharing, kNow)->place, "Canteen") << "the smaller one";
     sharing.fixes[0].accuracy = 201.0;

@@ -1,0 +1,57 @@
+#pragma once
+
+#include <array>
+#include <cstddef>
+#include <map>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "server/names/MessageCatalogue.h"
+
+namespace ktr::server {
+
+/// The towns of the world by position, with their names in many languages: those of libgweather's "Locations.xml" where
+/// that is installed. One thread at a time.
+class Gazetteer {
+  public:
+    struct Files {
+        std::string towns = "/usr/share/libgweather-4/Locations.xml";
+        std::string translations = "/usr/share/locale";  ///< LANGUAGE/LC_MESSAGES/libgweather-4.0-locations.mo
+    };
+    struct Town {
+        double latitude = 0.0;  ///< degrees
+        double longitude = 0.0;
+        std::string name;     ///< in English
+        std::string context;  ///< what tells it from towns of the same name; mostly empty
+    };
+    struct Nearest {
+        const Town* town = nullptr;
+        double metres = 0.0;
+    };
+
+    /// The files are read when they are asked for first; one that is missing or damaged knows no towns, or no names.
+    explicit Gazetteer(Files files) : files_(std::move(files)) {}
+
+    /// None: it knows no towns.
+    std::optional<Nearest> nearest(double latitude, double longitude);
+    /// In a language (BCP 47), or in English where it has none.
+    std::string name(const Town& town, const std::string& language);
+    std::size_t count();
+    std::size_t bytes() const;
+
+  private:
+    using Direction = std::array<double, 3>;  ///< from the earth's middle, of length 1
+
+    void load();
+    const MessageCatalogue* catalogue(const std::string& language);
+
+    const Files files_;
+    bool isLoaded_ = false;
+    std::vector<Town> towns_;
+    std::vector<Direction> directions_;  ///< of the towns
+    std::map<std::string, std::shared_ptr<const MessageCatalogue>> catalogues_;
+};
+
+}  // namespace ktr::server
