@@ -6,6 +6,7 @@
 #include <cmath>
 
 #include "app/CrossingHook.h"
+#include "app/KeepingArguments.h"
 #include "app/ServeArguments.h"
 #include "documents/NearestName.h"
 #include "documents/Words.h"
@@ -107,6 +108,7 @@ struct Parser {
     CLI::App* ask = nullptr;
     std::unique_ptr<ServeArguments> serve;
     CLI::App* watch = nullptr;
+    std::unique_ptr<KeepingArguments> keeping;
     Options options;
     Words words;
 
@@ -172,6 +174,7 @@ struct Parser {
                                ->needs(hook);
         hook->needs(key);
         watch->footer("Example: ktr watch --print");
+        keeping = std::make_unique<KeepingArguments>(app, options.config, options.doctor);
         show->footer(kShowExamples);
         render->footer(kRenderExamples);
         describe->footer(kDescribeExamples);
@@ -352,6 +355,10 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
             !objection.empty()) {
             return misuse("--hook: " + objection);
         }
+        return parser.options;
+    }
+    if (parser.keeping->isConfig() || parser.keeping->isDoctor()) {
+        parser.options.command = parser.keeping->isDoctor() ? Options::Command::Doctor : Options::Command::Config;
         return parser.options;
     }
     parser.options.command = parser.ask->parsed()      ? Options::Command::Ask

@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "app/KeepingOptions.h"
 #include "app/WatchCommand.h"
 #include "host/HostOptions.h"
 #include "serve/ServeOptions.h"
@@ -11,7 +12,7 @@ namespace ktr::app {
 
 /// What the command line asks for. Members that are none leave the decision to the scenario, then to the session.
 struct Options : host::HostOptions {
-    enum class Command { Show, Render, Describe, Ask, Serve, Watch };
+    enum class Command { Show, Render, Describe, Ask, Serve, Watch, Config, Doctor };
 
     Command command = Command::Show;
     std::vector<std::string> scenarios;  ///< never empty where nothing is live, but for serve
@@ -25,6 +26,8 @@ struct Options : host::HostOptions {
     std::string plugin;                  ///< empty: looked for
     serve::ServeOptions serve;           ///< of serve
     WatchCommand::Options watch;         ///< of watch
+    ConfigOptions config;                ///< of config
+    DoctorOptions doctor;                ///< of doctor
     bool reducedMotion = false;          ///< of show
     bool printUrls = false;              ///< of show: URLs go to the standard output instead of the desktop
 };

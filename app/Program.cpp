@@ -10,7 +10,9 @@
 
 #include "app/AskCommand.h"
 #include "app/CommandLine.h"
+#include "app/ConfigCommand.h"
 #include "app/Description.h"
+#include "app/DoctorCommand.h"
 #include "app/LiveRun.h"
 #include "app/Messages.h"
 #include "app/RenderCommand.h"
@@ -179,6 +181,15 @@ void tellOfLanguage(const std::string& language) {
     }
 }
 
+/// Which letters there are only an application knows.
+host::ExitCode runDoctor(const DoctorOptions& options, int argc, char** argv) {
+    qputenv("QT_QPA_PLATFORM", "offscreen");
+    qInstallMessageHandler(passOnQtMessage);
+    int count = argc > 0 ? 1 : 0;
+    const QGuiApplication application(count, argv);
+    return DoctorCommand::run(options);
+}
+
 host::ExitCode run(const Options& options, int argc, char** argv) {
     const documents::IsoTime now = sessionNow();
     const auto read = readScenarios(options, options.at ? options.at->date : now.date);
@@ -243,10 +254,18 @@ host::ExitCode runProgram(int argc, char** argv) {
     if (const auto failure = wantDescriptors(isLive ? Descriptors::kForLive : Descriptors::kForOthers)) {
         return fail(*failure);
     }
-    if (options.command == Options::Command::Watch) {
-        return WatchCommand::run(options.watch, argc, argv);
+    switch (options.command) {
+        case Options::Command::Serve:
+            return ServeCommand::run(options.serve);
+        case Options::Command::Watch:
+            return WatchCommand::run(options.watch, argc, argv);
+        case Options::Command::Config:
+            return ConfigCommand::run(options.config, linux_::XdgFolders::configurationFile());
+        case Options::Command::Doctor:
+            return runDoctor(options.doctor, argc, argv);
+        default:
+            return run(options, argc, argv);
     }
-    return options.command == Options::Command::Serve ? ServeCommand::run(options.serve) : run(options, argc, argv);
 }
 
 }  // namespace ktr::app

@@ -6,7 +6,9 @@
 #include <algorithm>
 #include <cmath>
 #include <initializer_list>
+#include <utility>
 
+#include "app/window/pages/SignInPage.h"
 #include "host/conversation/WideColumns.h"
 #include "platform/base/LogArea.h"
 
@@ -111,8 +113,27 @@ void ConversationWindow::start(const std::vector<host::Scenario>& scenarios,
     }
 }
 
+void ConversationWindow::offerSignIn() {
+    const auto account = host_.live()->configuration().account.value_or(linux_::Configuration::Account());
+    auto page = std::make_unique<SignInPage>(
+        host_, std::make_unique<linux_::SignIn>(host_.settings().liveConfiguration.value_or("")),
+        SignInPage::Before{account.host.value_or(""), account.personId});
+    page->setDone([this] { pages_->closeAll(); });
+    pages_->closeAll();
+    pages_->open(std::move(page));
+}
+
 void ConversationWindow::showStatus() {
-    status_->setStatus(live_->status());
+    const host::LiveStatus now = live_->status();
+    status_->setStatus(now);
+    if (std::exchange(wantsSignIn_, now.wantsSignIn) != now.wantsSignIn) {
+        if (now.wantsSignIn) {
+            offerSignIn();
+        } else if (dynamic_cast<SignInPage*>(pages_->current()) != nullptr) {
+            // Somebody signed in another way.
+            pages_->closeAll();
+        }
+    }
     if (!status_->isPlaced()) {
         place();
     }

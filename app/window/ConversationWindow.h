@@ -47,6 +47,8 @@ class ConversationWindow : public PlainWidget {
     void addField();
     void choosePalette();
     void chooseMotion();
+    /// Asks for the account where that is missing.
+    void offerSignIn();
     void showStatus();
     /// Whether anybody sees the window has become another.
     void sightChanged();
@@ -68,6 +70,8 @@ class ConversationWindow : public PlainWidget {
     StatusLine* status_ = nullptr;
     PageStack* pages_;
     QTimer statusTimer_;
+    /// What the status said last: a page that was answered is not shown again before the answer counts.
+    bool wantsSignIn_ = false;
     WindowSight sight_;
     CaretRest caretRest_;
     linux_::DesktopSettings* desktop_ = nullptr;

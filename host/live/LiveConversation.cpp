@@ -185,6 +185,7 @@ LiveStatus::Facts LiveConversation::facts() const {
     LiveStatus::Facts facts;
     facts.ready = ready_;
     facts.signedIn = host_.live()->isSignedIn();
+    facts.hasAccount = host_.live()->configuration().account.has_value();
     facts.unusable = host_.live()->isUnusable();
     facts.asking = askedAt_;
     facts.assistant = assistant_;

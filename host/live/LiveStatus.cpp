@@ -105,7 +105,7 @@ LiveStatus LiveStatus::of(const Facts& facts, const Words& words) {
         return {Mark::Warning, words.text("STATUS_UNREADABLE")};
     }
     if (!facts.signedIn || trouble == Trouble::SignedOut) {
-        return {Mark::Warning, words.text("STATUS_SIGN_IN")};
+        return {Mark::Warning, words.text(facts.hasAccount ? "STATUS_SIGN_IN" : "STATUS_SIGN_IN_FIRST"), true};
     }
     if (facts.asking && since(*facts.asking, facts.now) >= kPatience) {
         return {Mark::Waiting, words.text("STATUS_ASKING")};

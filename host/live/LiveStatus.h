@@ -18,9 +18,10 @@ struct LiveStatus {
 
     /// What there is to know.
     struct Facts {
-        bool ready = false;     ///< the account has been read
-        bool signedIn = false;  ///< there is an account with a token
-        bool unusable = false;  ///< the configuration is broken
+        bool ready = false;       ///< the account has been read
+        bool signedIn = false;    ///< there is an account with a token
+        bool hasAccount = false;  ///< somebody was signed in here, with a token or without
+        bool unusable = false;    ///< the configuration is broken
         /// Since when a question waits for its answer.
         std::optional<platform::Date> asking;
         /// How the last question ended, and when.
@@ -55,7 +56,8 @@ struct LiveStatus {
     static std::optional<double> changesIn(const Facts& facts);
 
     Mark mark = Mark::None;
-    std::string words;  ///< empty: the line is empty
+    std::string words;         ///< empty: the line is empty
+    bool wantsSignIn = false;  ///< nothing is told until somebody signs in
     bool operator==(const LiveStatus&) const = default;
 };
 

@@ -17,6 +17,10 @@ class SecretModule {
     /// of one when `givesUp` becomes true.
     virtual std::optional<std::string> lookUp(const std::string& person, const std::string& host, double seconds,
                                               const std::atomic<bool>& givesUp, std::string& error) const = 0;
+    /// Keeps the secret with these attributes, in place of one that is there; a locked keyring asks the user to unlock
+    /// it. False when it is not kept; then `error` says why, and is never empty.
+    virtual bool store(const std::string& person, const std::string& host, const std::string& secret, double seconds,
+                       const std::atomic<bool>& givesUp, std::string& error) const = 0;
 };
 
 /// The module's only symbol, of type `SecretModuleEntry`: makes the module's object; null when it cannot be made.

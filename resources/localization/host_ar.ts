@@ -139,6 +139,156 @@
         <translation>سجّل الدخول من جديد لرؤية أصدقائك.</translation>
     </message>
     <message>
+        <source>STATUS_SIGN_IN_FIRST</source>
+        <extracomment>Status line: nobody has signed in on this computer yet</extracomment>
+        <translation>سجّل الدخول لترى أصدقاءك.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_TITLE</source>
+        <extracomment>Title of the page for signing in</extracomment>
+        <translation>أين أصدقاؤك؟</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINE</source>
+        <extracomment>Below that title</extracomment>
+        <translation>سجّل الدخول إلى الخدمة التي تتشاركون الأماكن عليها. ويمكن أن تكون خدمتك أنت.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_ADDRESS</source>
+        <extracomment>Label of a field: the address of the service</extracomment>
+        <translation>عنوان الخدمة</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_YOU</source>
+        <extracomment>Label of a field: who signs in</extracomment>
+        <translation>أنت</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_SECRET</source>
+        <extracomment>Label of a field: the password</extracomment>
+        <translation>كلمة السر</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_GO</source>
+        <extracomment>Button: signs in</extracomment>
+        <translation>تسجيل الدخول</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_CHECKING</source>
+        <extracomment>On that button while the service is asked</extracomment>
+        <translation>جارٍ التحقق…</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_CANCEL</source>
+        <extracomment>Button: ends the asking</extracomment>
+        <translation>إلغاء</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_RETRY</source>
+        <extracomment>Button: asks again after nothing answered</extracomment>
+        <translation>المحاولة مجددًا</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_SHOW</source>
+        <extracomment>Spoken: a button that shows the letters of the secret</extracomment>
+        <translation>إظهار كلمة السر</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_HIDE</source>
+        <extracomment>Spoken: a button that hides them again</extracomment>
+        <translation>إخفاء كلمة السر</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_KEYRING</source>
+        <extracomment>Small, below the fields</extracomment>
+        <translation>تبقى كلمة سرك في حلقة مفاتيح هذا الحاسوب.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_UNKNOWN</source>
+        <extracomment>Below the secret; does not tell which of the two is wrong</extracomment>
+        <translation>لا تعرف الخدمة هذا الشخص بكلمة السر هذه. تحقق من كليهما أو اطلب كلمة سر جديدة.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOTHING_ANSWERS</source>
+        <extracomment>Below the address, which is %@</extracomment>
+        <translation>لا أحد يجيب على %@. تحقق من العنوان ومن اتصال هذا الحاسوب.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOT_TRUSTED</source>
+        <extracomment>Below the address, which is %@: its certificate is not valid</extracomment>
+        <translation>ما يجيب على %@ لا يستطيع إثبات أنه خدمتك، لذلك لم يُرسل شيء.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NO_SERVICE</source>
+        <extracomment>Below the address, which is %@: it is some other web server</extracomment>
+        <translation>شيء آخر يجيب على %@. تحقق من العنوان.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_FAILING</source>
+        <extracomment>Below the address, which is %@: the service reports a failure of its own</extracomment>
+        <translation>لا يستطيع %@ المساعدة الآن.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_BAD_ADDRESS</source>
+        <extracomment>Below the address; keep brin.example as it is</extracomment>
+        <translation>يبدو عنوان الخدمة هكذا: brin.example.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LOCKED</source>
+        <extracomment>The system's keyring is locked or missing</extracomment>
+        <translation>حلقة المفاتيح مغلقة. افتحها أو احفظ كلمة سرك في ملف لا يقرؤه غيرك.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_UNLOCK</source>
+        <extracomment>Button: tries the keyring again</extracomment>
+        <translation>فتح حلقة المفاتيح</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_IN_FILE</source>
+        <extracomment>Button: keeps the secret in a file instead of the keyring</extracomment>
+        <translation>الحفظ في ملف</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOT_WRITTEN</source>
+        <extracomment>The configuration cannot be written</extracomment>
+        <translation>لا يمكن حفظ إعداداتك على هذا الحاسوب.</translation>
+    </message>
+    <message>
+        <source>GREETING_MORNING</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>صباح الخير.</translation>
+    </message>
+    <message>
+        <source>GREETING_AFTERNOON</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>نهارك سعيد.</translation>
+    </message>
+    <message>
+        <source>GREETING_EVENING</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>مساء الخير.</translation>
+    </message>
+    <message>
+        <source>GREETING_LINE</source>
+        <extracomment>Below that title</extracomment>
+        <translation>اسأل عن أصدقائك أو المس سؤالًا.</translation>
+    </message>
+    <message>
+        <source>SUGGEST_FRIENDS</source>
+        <extracomment>A question that is asked by a tap</extracomment>
+        <translation>أين أصدقائي؟</translation>
+    </message>
+    <message>
+        <source>SUGGEST_NEAR</source>
+        <extracomment>A question that is asked by a tap</extracomment>
+        <translation>من القريب مني؟</translation>
+    </message>
+    <message>
+        <source>SUGGEST_HIDE</source>
+        <extracomment>A wish that is asked for by a tap</extracomment>
+        <translation>إخفاء موقعي</translation>
+    </message>
+    <message>
         <source>ANSWER_UNREACHABLE</source>
         <extracomment>Below a question that nobody answered. English: “Your assistant is out of reach right now.”</extracomment>
         <translation>يتعذّر الوصول إلى مساعدك حاليًا.</translation>

@@ -139,6 +139,156 @@
         <translation>Melde dich wieder an, um deine Freunde zu sehen.</translation>
     </message>
     <message>
+        <source>STATUS_SIGN_IN_FIRST</source>
+        <extracomment>Status line: nobody has signed in on this computer yet</extracomment>
+        <translation>Anmelden, um Freunde zu sehen.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_TITLE</source>
+        <extracomment>Title of the page for signing in</extracomment>
+        <translation>Wo sind deine Freunde?</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINE</source>
+        <extracomment>Below that title</extracomment>
+        <translation>Melde dich bei dem Dienst an, auf dem ihr Orte teilt. Es kann dein eigener sein.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_ADDRESS</source>
+        <extracomment>Label of a field: the address of the service</extracomment>
+        <translation>Adresse des Dienstes</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_YOU</source>
+        <extracomment>Label of a field: who signs in</extracomment>
+        <translation>Du</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_SECRET</source>
+        <extracomment>Label of a field: the password</extracomment>
+        <translation>Geheimnis</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_GO</source>
+        <extracomment>Button: signs in</extracomment>
+        <translation>Anmelden</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_CHECKING</source>
+        <extracomment>On that button while the service is asked</extracomment>
+        <translation>Wird geprüft…</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_CANCEL</source>
+        <extracomment>Button: ends the asking</extracomment>
+        <translation>Abbrechen</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_RETRY</source>
+        <extracomment>Button: asks again after nothing answered</extracomment>
+        <translation>Noch einmal versuchen</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_SHOW</source>
+        <extracomment>Spoken: a button that shows the letters of the secret</extracomment>
+        <translation>Geheimnis zeigen</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_HIDE</source>
+        <extracomment>Spoken: a button that hides them again</extracomment>
+        <translation>Geheimnis verbergen</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_KEYRING</source>
+        <extracomment>Small, below the fields</extracomment>
+        <translation>Dein Geheimnis bleibt im Schlüsselbund dieses Computers.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_UNKNOWN</source>
+        <extracomment>Below the secret; does not tell which of the two is wrong</extracomment>
+        <translation>Der Dienst kennt diese Person mit diesem Geheimnis nicht. Prüfe beides oder bitte um ein neues Geheimnis.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOTHING_ANSWERS</source>
+        <extracomment>Below the address, which is %@</extracomment>
+        <translation>Unter %@ antwortet niemand. Prüfe die Adresse und ob dieser Computer online ist.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOT_TRUSTED</source>
+        <extracomment>Below the address, which is %@: its certificate is not valid</extracomment>
+        <translation>Was unter %@ antwortet, kann nicht beweisen, dass es dein Dienst ist. Es wurde nichts gesendet.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NO_SERVICE</source>
+        <extracomment>Below the address, which is %@: it is some other web server</extracomment>
+        <translation>Unter %@ antwortet etwas anderes. Prüfe die Adresse.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_FAILING</source>
+        <extracomment>Below the address, which is %@: the service reports a failure of its own</extracomment>
+        <translation>%@ kann gerade nicht helfen.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_BAD_ADDRESS</source>
+        <extracomment>Below the address; keep brin.example as it is</extracomment>
+        <translation>Eine Adresse sieht so aus: brin.example.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LOCKED</source>
+        <extracomment>The system's keyring is locked or missing</extracomment>
+        <translation>Der Schlüsselbund ist geschlossen. Entsperre ihn oder bewahre dein Geheimnis in einer Datei auf, die nur du lesen kannst.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_UNLOCK</source>
+        <extracomment>Button: tries the keyring again</extracomment>
+        <translation>Schlüsselbund entsperren</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_IN_FILE</source>
+        <extracomment>Button: keeps the secret in a file instead of the keyring</extracomment>
+        <translation>In einer Datei aufbewahren</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOT_WRITTEN</source>
+        <extracomment>The configuration cannot be written</extracomment>
+        <translation>Deine Einstellungen lassen sich auf diesem Computer nicht sichern.</translation>
+    </message>
+    <message>
+        <source>GREETING_MORNING</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>Guten Morgen.</translation>
+    </message>
+    <message>
+        <source>GREETING_AFTERNOON</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>Guten Tag.</translation>
+    </message>
+    <message>
+        <source>GREETING_EVENING</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>Guten Abend.</translation>
+    </message>
+    <message>
+        <source>GREETING_LINE</source>
+        <extracomment>Below that title</extracomment>
+        <translation>Frag nach deinen Freunden oder tippe auf eine Frage.</translation>
+    </message>
+    <message>
+        <source>SUGGEST_FRIENDS</source>
+        <extracomment>A question that is asked by a tap</extracomment>
+        <translation>Wo sind meine Freunde?</translation>
+    </message>
+    <message>
+        <source>SUGGEST_NEAR</source>
+        <extracomment>A question that is asked by a tap</extracomment>
+        <translation>Wer ist in meiner Nähe?</translation>
+    </message>
+    <message>
+        <source>SUGGEST_HIDE</source>
+        <extracomment>A wish that is asked for by a tap</extracomment>
+        <translation>Meinen Standort verbergen</translation>
+    </message>
+    <message>
         <source>ANSWER_UNREACHABLE</source>
         <extracomment>Below a question that nobody answered. English: “Your assistant is out of reach right now.”</extracomment>
         <translation>Dein Assistent ist gerade nicht erreichbar.</translation>

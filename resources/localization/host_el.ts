@@ -139,6 +139,156 @@
         <translation>Συνδεθείτε ξανά για να δείτε τους φίλους σας.</translation>
     </message>
     <message>
+        <source>STATUS_SIGN_IN_FIRST</source>
+        <extracomment>Status line: nobody has signed in on this computer yet</extracomment>
+        <translation>Συνδεθείτε για να δείτε τους φίλους σας.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_TITLE</source>
+        <extracomment>Title of the page for signing in</extracomment>
+        <translation>Πού είναι οι φίλοι σας;</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINE</source>
+        <extracomment>Below that title</extracomment>
+        <translation>Συνδεθείτε στην υπηρεσία όπου μοιράζεστε μέρη. Μπορεί να είναι δική σας.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_ADDRESS</source>
+        <extracomment>Label of a field: the address of the service</extracomment>
+        <translation>Διεύθυνση υπηρεσίας</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_YOU</source>
+        <extracomment>Label of a field: who signs in</extracomment>
+        <translation>Εσείς</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_SECRET</source>
+        <extracomment>Label of a field: the password</extracomment>
+        <translation>Μυστικό</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_GO</source>
+        <extracomment>Button: signs in</extracomment>
+        <translation>Σύνδεση</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_CHECKING</source>
+        <extracomment>On that button while the service is asked</extracomment>
+        <translation>Έλεγχος…</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_CANCEL</source>
+        <extracomment>Button: ends the asking</extracomment>
+        <translation>Ακύρωση</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_RETRY</source>
+        <extracomment>Button: asks again after nothing answered</extracomment>
+        <translation>Νέα προσπάθεια</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_SHOW</source>
+        <extracomment>Spoken: a button that shows the letters of the secret</extracomment>
+        <translation>Εμφάνιση του μυστικού</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_HIDE</source>
+        <extracomment>Spoken: a button that hides them again</extracomment>
+        <translation>Απόκρυψη του μυστικού</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_KEYRING</source>
+        <extracomment>Small, below the fields</extracomment>
+        <translation>Το μυστικό σας μένει στην κλειδοθήκη αυτού του υπολογιστή.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_UNKNOWN</source>
+        <extracomment>Below the secret; does not tell which of the two is wrong</extracomment>
+        <translation>Η υπηρεσία δεν γνωρίζει αυτό το άτομο με αυτό το μυστικό. Ελέγξτε και τα δύο ή ζητήστε νέο μυστικό.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOTHING_ANSWERS</source>
+        <extracomment>Below the address, which is %@</extracomment>
+        <translation>Κανείς δεν απαντά στο %@. Ελέγξτε τη διεύθυνση και τη σύνδεση του υπολογιστή.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOT_TRUSTED</source>
+        <extracomment>Below the address, which is %@: its certificate is not valid</extracomment>
+        <translation>Ό,τι απαντά στο %@ δεν μπορεί να αποδείξει ότι είναι η υπηρεσία σας, οπότε δεν στάλθηκε τίποτα.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NO_SERVICE</source>
+        <extracomment>Below the address, which is %@: it is some other web server</extracomment>
+        <translation>Κάτι άλλο απαντά στο %@. Ελέγξτε τη διεύθυνση.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_FAILING</source>
+        <extracomment>Below the address, which is %@: the service reports a failure of its own</extracomment>
+        <translation>Το %@ δεν μπορεί να βοηθήσει τώρα.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_BAD_ADDRESS</source>
+        <extracomment>Below the address; keep brin.example as it is</extracomment>
+        <translation>Μια διεύθυνση μοιάζει έτσι: brin.example.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LOCKED</source>
+        <extracomment>The system's keyring is locked or missing</extracomment>
+        <translation>Η κλειδοθήκη είναι κλειστή. Ξεκλειδώστε την ή φυλάξτε το μυστικό σε αρχείο που διαβάζετε μόνο εσείς.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_UNLOCK</source>
+        <extracomment>Button: tries the keyring again</extracomment>
+        <translation>Ξεκλείδωμα κλειδοθήκης</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_IN_FILE</source>
+        <extracomment>Button: keeps the secret in a file instead of the keyring</extracomment>
+        <translation>Φύλαξη σε αρχείο</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOT_WRITTEN</source>
+        <extracomment>The configuration cannot be written</extracomment>
+        <translation>Οι ρυθμίσεις σας δεν μπορούν να αποθηκευτούν σε αυτόν τον υπολογιστή.</translation>
+    </message>
+    <message>
+        <source>GREETING_MORNING</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>Καλημέρα.</translation>
+    </message>
+    <message>
+        <source>GREETING_AFTERNOON</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>Καλό απόγευμα.</translation>
+    </message>
+    <message>
+        <source>GREETING_EVENING</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>Καλησπέρα.</translation>
+    </message>
+    <message>
+        <source>GREETING_LINE</source>
+        <extracomment>Below that title</extracomment>
+        <translation>Ρωτήστε για τους φίλους σας ή αγγίξτε μια ερώτηση.</translation>
+    </message>
+    <message>
+        <source>SUGGEST_FRIENDS</source>
+        <extracomment>A question that is asked by a tap</extracomment>
+        <translation>Πού είναι οι φίλοι μου;</translation>
+    </message>
+    <message>
+        <source>SUGGEST_NEAR</source>
+        <extracomment>A question that is asked by a tap</extracomment>
+        <translation>Ποιος είναι κοντά μου;</translation>
+    </message>
+    <message>
+        <source>SUGGEST_HIDE</source>
+        <extracomment>A wish that is asked for by a tap</extracomment>
+        <translation>Απόκρυψη της τοποθεσίας μου</translation>
+    </message>
+    <message>
         <source>ANSWER_UNREACHABLE</source>
         <extracomment>Below a question that nobody answered. English: “Your assistant is out of reach right now.”</extracomment>
         <translation>Ο βοηθός σας δεν είναι διαθέσιμος αυτή τη στιγμή.</translation>

@@ -139,6 +139,156 @@
         <translation>Sign in again to see your friends.</translation>
     </message>
     <message>
+        <source>STATUS_SIGN_IN_FIRST</source>
+        <extracomment>Status line: nobody has signed in on this computer yet</extracomment>
+        <translation>Sign in to see your friends.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_TITLE</source>
+        <extracomment>Title of the page for signing in</extracomment>
+        <translation>Where are your friends?</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINE</source>
+        <extracomment>Below that title</extracomment>
+        <translation>Sign in to the service you share places on. It can be your own.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_ADDRESS</source>
+        <extracomment>Label of a field: the address of the service</extracomment>
+        <translation>Service address</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_YOU</source>
+        <extracomment>Label of a field: who signs in</extracomment>
+        <translation>You</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_SECRET</source>
+        <extracomment>Label of a field: the password</extracomment>
+        <translation>Secret</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_GO</source>
+        <extracomment>Button: signs in</extracomment>
+        <translation>Sign in</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_CHECKING</source>
+        <extracomment>On that button while the service is asked</extracomment>
+        <translation>Checking…</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_CANCEL</source>
+        <extracomment>Button: ends the asking</extracomment>
+        <translation>Cancel</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_RETRY</source>
+        <extracomment>Button: asks again after nothing answered</extracomment>
+        <translation>Try again</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_SHOW</source>
+        <extracomment>Spoken: a button that shows the letters of the secret</extracomment>
+        <translation>Show the secret</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_HIDE</source>
+        <extracomment>Spoken: a button that hides them again</extracomment>
+        <translation>Hide the secret</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_KEYRING</source>
+        <extracomment>Small, below the fields</extracomment>
+        <translation>Your secret stays in this computer’s keyring.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_UNKNOWN</source>
+        <extracomment>Below the secret; does not tell which of the two is wrong</extracomment>
+        <translation>The service doesn’t know this person and secret together. Check both, or ask for a new secret.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOTHING_ANSWERS</source>
+        <extracomment>Below the address, which is %@</extracomment>
+        <translation>Nothing answers at %@. Check the address, and that this computer is online.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOT_TRUSTED</source>
+        <extracomment>Below the address, which is %@: its certificate is not valid</extracomment>
+        <translation>What answers at %@ can’t prove that it is your service, so nothing was sent.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NO_SERVICE</source>
+        <extracomment>Below the address, which is %@: it is some other web server</extracomment>
+        <translation>Something else answers at %@. Check the address.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_FAILING</source>
+        <extracomment>Below the address, which is %@: the service reports a failure of its own</extracomment>
+        <translation>%@ can’t help just now.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_BAD_ADDRESS</source>
+        <extracomment>Below the address; keep brin.example as it is</extracomment>
+        <translation>A service address looks like brin.example.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LOCKED</source>
+        <extracomment>The system's keyring is locked or missing</extracomment>
+        <translation>The keyring is closed. Unlock it, or keep your secret in a file that only you can read.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_UNLOCK</source>
+        <extracomment>Button: tries the keyring again</extracomment>
+        <translation>Unlock keyring</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_IN_FILE</source>
+        <extracomment>Button: keeps the secret in a file instead of the keyring</extracomment>
+        <translation>Keep it in a file</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOT_WRITTEN</source>
+        <extracomment>The configuration cannot be written</extracomment>
+        <translation>Your settings can’t be saved on this computer.</translation>
+    </message>
+    <message>
+        <source>GREETING_MORNING</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>Good morning.</translation>
+    </message>
+    <message>
+        <source>GREETING_AFTERNOON</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>Good afternoon.</translation>
+    </message>
+    <message>
+        <source>GREETING_EVENING</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>Good evening.</translation>
+    </message>
+    <message>
+        <source>GREETING_LINE</source>
+        <extracomment>Below that title</extracomment>
+        <translation>Ask about your friends, or tap a question.</translation>
+    </message>
+    <message>
+        <source>SUGGEST_FRIENDS</source>
+        <extracomment>A question that is asked by a tap</extracomment>
+        <translation>Where are my friends?</translation>
+    </message>
+    <message>
+        <source>SUGGEST_NEAR</source>
+        <extracomment>A question that is asked by a tap</extracomment>
+        <translation>Who is near me?</translation>
+    </message>
+    <message>
+        <source>SUGGEST_HIDE</source>
+        <extracomment>A wish that is asked for by a tap</extracomment>
+        <translation>Hide my location</translation>
+    </message>
+    <message>
         <source>ANSWER_UNREACHABLE</source>
         <extracomment>Below a question that nobody answered</extracomment>
         <translation>Your assistant is out of reach right now.</translation>

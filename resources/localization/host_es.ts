@@ -139,6 +139,156 @@
         <translation>Vuelve a iniciar sesión para ver a tus amigos.</translation>
     </message>
     <message>
+        <source>STATUS_SIGN_IN_FIRST</source>
+        <extracomment>Status line: nobody has signed in on this computer yet</extracomment>
+        <translation>Inicia sesión para ver a tus amigos.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_TITLE</source>
+        <extracomment>Title of the page for signing in</extracomment>
+        <translation>¿Dónde están tus amigos?</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINE</source>
+        <extracomment>Below that title</extracomment>
+        <translation>Inicia sesión en el servicio donde compartís lugares. Puede ser el tuyo.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_ADDRESS</source>
+        <extracomment>Label of a field: the address of the service</extracomment>
+        <translation>Dirección del servicio</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_YOU</source>
+        <extracomment>Label of a field: who signs in</extracomment>
+        <translation>Tú</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_SECRET</source>
+        <extracomment>Label of a field: the password</extracomment>
+        <translation>Secreto</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_GO</source>
+        <extracomment>Button: signs in</extracomment>
+        <translation>Iniciar sesión</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_CHECKING</source>
+        <extracomment>On that button while the service is asked</extracomment>
+        <translation>Comprobando…</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_CANCEL</source>
+        <extracomment>Button: ends the asking</extracomment>
+        <translation>Cancelar</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_RETRY</source>
+        <extracomment>Button: asks again after nothing answered</extracomment>
+        <translation>Intentar de nuevo</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_SHOW</source>
+        <extracomment>Spoken: a button that shows the letters of the secret</extracomment>
+        <translation>Mostrar el secreto</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_HIDE</source>
+        <extracomment>Spoken: a button that hides them again</extracomment>
+        <translation>Ocultar el secreto</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_KEYRING</source>
+        <extracomment>Small, below the fields</extracomment>
+        <translation>Tu secreto se queda en el llavero de este equipo.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_UNKNOWN</source>
+        <extracomment>Below the secret; does not tell which of the two is wrong</extracomment>
+        <translation>El servicio no conoce a esta persona con este secreto. Revisa ambos o pide un secreto nuevo.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOTHING_ANSWERS</source>
+        <extracomment>Below the address, which is %@</extracomment>
+        <translation>Nada responde en %@. Revisa la dirección y que este equipo tenga conexión.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOT_TRUSTED</source>
+        <extracomment>Below the address, which is %@: its certificate is not valid</extracomment>
+        <translation>Lo que responde en %@ no puede demostrar que es tu servicio, así que no se envió nada.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NO_SERVICE</source>
+        <extracomment>Below the address, which is %@: it is some other web server</extracomment>
+        <translation>En %@ responde otra cosa. Revisa la dirección.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_FAILING</source>
+        <extracomment>Below the address, which is %@: the service reports a failure of its own</extracomment>
+        <translation>%@ no puede ayudar ahora mismo.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_BAD_ADDRESS</source>
+        <extracomment>Below the address; keep brin.example as it is</extracomment>
+        <translation>Una dirección tiene esta forma: brin.example.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LOCKED</source>
+        <extracomment>The system's keyring is locked or missing</extracomment>
+        <translation>El llavero está cerrado. Desbloquéalo o guarda tu secreto en un archivo que solo tú puedas leer.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_UNLOCK</source>
+        <extracomment>Button: tries the keyring again</extracomment>
+        <translation>Desbloquear el llavero</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_IN_FILE</source>
+        <extracomment>Button: keeps the secret in a file instead of the keyring</extracomment>
+        <translation>Guardar en un archivo</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_NOT_WRITTEN</source>
+        <extracomment>The configuration cannot be written</extracomment>
+        <translation>Tus ajustes no se pueden guardar en este equipo.</translation>
+    </message>
+    <message>
+        <source>GREETING_MORNING</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>Buenos días.</translation>
+    </message>
+    <message>
+        <source>GREETING_AFTERNOON</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>Buenas tardes.</translation>
+    </message>
+    <message>
+        <source>GREETING_EVENING</source>
+        <extracomment>Title of an empty conversation</extracomment>
+        <translation>Buenas noches.</translation>
+    </message>
+    <message>
+        <source>GREETING_LINE</source>
+        <extracomment>Below that title</extracomment>
+        <translation>Pregunta por tus amigos o toca una pregunta.</translation>
+    </message>
+    <message>
+        <source>SUGGEST_FRIENDS</source>
+        <extracomment>A question that is asked by a tap</extracomment>
+        <translation>¿Dónde están mis amigos?</translation>
+    </message>
+    <message>
+        <source>SUGGEST_NEAR</source>
+        <extracomment>A question that is asked by a tap</extracomment>
+        <translation>¿Quién está cerca de mí?</translation>
+    </message>
+    <message>
+        <source>SUGGEST_HIDE</source>
+        <extracomment>A wish that is asked for by a tap</extracomment>
+        <translation>Ocultar mi ubicación</translation>
+    </message>
+    <message>
         <source>ANSWER_UNREACHABLE</source>
         <extracomment>Below a question that nobody answered. English: “Your assistant is out of reach right now.”</extracomment>
         <translation>No se puede acceder a tu asistente en este momento.</translation>

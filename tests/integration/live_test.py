@@ -301,7 +301,7 @@ class LiveTest(unittest.TestCase):
         result = self.run_live(environment, "describe", 0.3)
         self.assertEqual(result.returncode, 1)
         self.assertIn("Sign in to ask about your friends.", result.stdout)
-        self.assertIn("Sign in again to see your friends.", result.stderr)
+        self.assertIn("Sign in to see your friends.", result.stderr)
 
     def test_assistant_of_another_certificate_is_not_believed(self):
         result = self.describe(MOVING, 0.3, "--certificate", "foreign")

@@ -15,6 +15,7 @@ constexpr int kMarkGap = 8;
 Words::Words(BlockStyle style, Tone tone, QWidget* parent)
     : Block(parent), style_(style), tone_(tone), isBalanced_(style == BlockStyle::Title) {
     setFocusPolicy(Qt::NoFocus);
+    setAttribute(Qt::WA_TransparentForMouseEvents);
 }
 
 void Words::setText(const QString& text) {
@@ -45,6 +46,10 @@ int Words::markRoom() const {
     return isWarning_ ? static_cast<int>(grown(iconSide(Icon::Warning))) + kMarkGap : 0;
 }
 
+int Words::around() const {
+    return static_cast<int>(BlockText::fontOf(style_).lineHeight() / 4.0);
+}
+
 int Words::shapeHeight(int width) const {
     return text_.heightFor(width - markRoom());
 }
@@ -55,13 +60,14 @@ int Words::naturalWidth() const {
 
 void Words::paintEvent(QPaintEvent*) {
     QPainter painter(this);
-    const QRectF box = mirrored(QRectF(markRoom(), 0, width() - markRoom(), height()));
+    const QRectF inside = shape();
+    const QRectF box = mirrored(inside.adjusted(markRoom(), 0, 0, 0));
     text_.paint(painter, box, tone_ == Tone::Soft ? colors().inkSoft : colors().ink, colors(), isMirrored(),
                 alignment_);
     if (isWarning_) {
         const double side = grown(iconSide(Icon::Warning));
         const double top = (BlockText::fontOf(style_).lineHeight() - side) / 2.0;
-        paintIcon(painter, Icon::Warning, mirrored({0.0, std::max(top, 0.0), side, side}), colors().warning, false);
+        paintIcon(painter, Icon::Warning, mirrored({inside.x(), inside.y() + std::max(top, 0.0), side, side}), colors().warning, false);
     }
 }
 

@@ -19,6 +19,8 @@ class Words : public Block {
     /// A warning before the first line.
     void setWarning(bool isWarning);
 
+    /// Letters that are higher or deeper than a line reach beyond it, above and below.
+    int around() const override;
     int shapeHeight(int width) const override;
     int naturalWidth() const override;
     QAccessible::Role role() const override {

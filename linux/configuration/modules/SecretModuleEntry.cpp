@@ -89,6 +89,30 @@ class LibSecretModule : public SecretModule {
         secret_password_free(found);
         return secret;
     }
+
+    bool store(const std::string& person, const std::string& host, const std::string& secret, double seconds,
+               const std::atomic<bool>& givesUp, std::string& error) const override {
+        GCancellable* cancellable = g_cancellable_new();
+        GError* failure = nullptr;
+        gboolean isKept = FALSE;
+        try {
+            const Deadline deadline(cancellable, seconds, givesUp);
+            isKept = secret_password_store_sync(schema(), SECRET_COLLECTION_DEFAULT, "ktr", secret.c_str(), cancellable,
+                                                &failure, "application", "ktr", "person", person.c_str(), "host",
+                                                host.c_str(), nullptr);
+        } catch (const std::exception& problem) {
+            error = problem.what();
+        }
+        g_object_unref(cancellable);
+        if (failure != nullptr) {
+            error = failure->message;
+            g_error_free(failure);
+        }
+        if (isKept == FALSE && error.empty()) {
+            error = "the keyring was not unlocked";
+        }
+        return isKept != FALSE;
+    }
 };
 
 }  // namespace

@@ -37,6 +37,9 @@ TEST_F(SecretModuleTest, WithoutABus_AnError_WithAKeyring_TheToken) {
     std::string error;
     EXPECT_EQ(module->lookUp("7", "f.example", 5.0, false, error), std::nullopt);
     EXPECT_FALSE(error.empty());
+    error.clear();
+    EXPECT_FALSE(module->store("7", "f.example", "s3cret", 5.0, false, error));
+    EXPECT_FALSE(error.empty()) << "what is not kept has a reason";
 
     const TemporaryFolder home;
     const PrivateBus bus;
@@ -64,6 +67,10 @@ TEST_F(SecretModuleTest, WithoutABus_AnError_WithAKeyring_TheToken) {
     EXPECT_EQ(error, "");
     EXPECT_EQ(module->lookUp("8", "f.example", 20.0, false, error), std::nullopt);
     EXPECT_EQ(error, "") << "a missing item is no error";
+    EXPECT_TRUE(module->store("8", "f.example", "first", 20.0, false, error)) << error;
+    EXPECT_TRUE(module->store("8", "f.example", "second", 20.0, false, error)) << error;
+    EXPECT_EQ(module->lookUp("8", "f.example", 20.0, false, error), "second") << "in place of the first";
+    EXPECT_EQ(module->lookUp("7", "f.example", 20.0, false, error), "s3cret");
     keyring.terminate();
     EXPECT_TRUE(keyring.waitForFinished(10000));
 }

@@ -1,0 +1,169 @@
+#include "linux/configuration/SignIn.h"
+
+#include <QCoreApplication>
+#include <QMetaObject>
+#include <thread>
+
+#include "documents/AtomicFile.h"
+#include "linux/configuration/ConfigurationFile.h"
+#include "linux/configuration/ConfigurationReader.h"
+#include "linux/configuration/SecretModule.h"
+#include "linux/configuration/TokenFile.h"
+#include "linux/device/Buses.h"
+#include "linux/device/LoadableModule.h"
+
+namespace ktr::linux_ {
+
+namespace {
+
+using Outcome = SignIn::Outcome;
+
+bool storeInKeyring(const std::string& person, const std::string& host, const std::string& secret,
+                    const std::atomic<bool>& givesUp, std::string& problem) {
+    void* entry = LoadableModule::entry("libktr-secret.so", kSecretModuleEntry, problem);
+    if (entry == nullptr) {
+        return false;
+    }
+    const std::unique_ptr<SecretModule> module(reinterpret_cast<SecretModuleEntry>(entry)());
+    return module && module->store(person, host, secret, Buses::kSecretAlone, givesUp, problem);
+}
+
+Outcome outcomeOf(ServiceCheck::Outcome outcome) {
+    switch (outcome) {
+        case ServiceCheck::Outcome::Fine:
+            return Outcome::Done;
+        case ServiceCheck::Outcome::BadAddress:
+            return Outcome::BadAddress;
+        case ServiceCheck::Outcome::NothingAnswers:
+            return Outcome::NothingAnswers;
+        case ServiceCheck::Outcome::NotTrusted:
+            return Outcome::NotTrusted;
+        case ServiceCheck::Outcome::Unknown:
+            return Outcome::Unknown;
+        case ServiceCheck::Outcome::NoService:
+            return Outcome::NoService;
+        case ServiceCheck::Outcome::Failing:
+            break;
+    }
+    return Outcome::Failing;
+}
+
+std::vector<std::string> certificatesOf(const std::filesystem::path& file) {
+    const auto read = ConfigurationReader::readFile(file);
+    const auto* configuration = std::get_if<Configuration>(&read);
+    return configuration == nullptr ? std::vector<std::string>() : configuration->certificates;
+}
+
+/// What the account of another service or person says does not hold for this one.
+std::vector<ConfigurationFile::Change> changesFor(const std::filesystem::path& file, const std::string& person,
+                                                  const std::string& host) {
+    std::vector<ConfigurationFile::Change> changes = {{"account.personId", platform::Value(person)},
+                                                      {"account.host", platform::Value(host)},
+                                                      // Where the secret is now is found without being told.
+                                                      {"account.tokenFile", std::nullopt}};
+    const auto read = ConfigurationReader::readFile(file);
+    const auto* before = std::get_if<Configuration>(&read);
+    if (before != nullptr && before->account) {
+        if (before->account->host != host) {
+            changes.push_back({"account.domains", std::nullopt});
+        }
+        if (before->account->personId != person) {
+            changes.push_back({"account.userName", std::nullopt});
+        }
+    }
+    return changes;
+}
+
+}  // namespace
+
+struct SignIn::Attempt {
+    std::filesystem::path file;
+    Store store;
+    Wish wish;
+    std::string host;
+    std::function<void(const Result&)> done;  ///< of the main thread
+    std::atomic<bool> givesUp = false;
+};
+
+SignIn::SignIn(std::filesystem::path configurationFile) : SignIn(std::move(configurationFile), storeInKeyring) {}
+
+SignIn::SignIn(std::filesystem::path configurationFile, Store store)
+    : file_(std::filesystem::absolute(configurationFile)), store_(std::move(store)) {}
+
+SignIn::~SignIn() {
+    cancel();
+}
+
+void SignIn::cancel() {
+    if (attempt_) {
+        attempt_->givesUp = true;
+        attempt_ = nullptr;
+    }
+}
+
+void SignIn::begin(const Wish& wish, std::function<void(const Result&)> done) {
+    cancel();
+    attempt_ = std::make_shared<Attempt>();
+    attempt_->file = file_;
+    attempt_->store = store_;
+    attempt_->wish = wish;
+    attempt_->done = [this, done = std::move(done)](const Result& result) {
+        attempt_ = nullptr;
+        done(result);
+    };
+    const auto host = ServiceCheck::hostOf(wish.address);
+    if (!host || wish.person.empty() || wish.person.find(':') != std::string::npos) {
+        end(attempt_, {host ? Outcome::Unknown : Outcome::BadAddress, host.value_or(""), "it cannot be asked for"});
+        return;
+    }
+    attempt_->host = *host;
+    ServiceCheck::run(client_, {*host, wish.person, wish.secret, certificatesOf(file_)},
+                      [attempt = attempt_](const ServiceCheck::Result& found) { checked(attempt, found); });
+}
+
+void SignIn::checked(const std::shared_ptr<Attempt>& attempt, const ServiceCheck::Result& found) {
+    if (found.outcome != ServiceCheck::Outcome::Fine) {
+        end(attempt, {outcomeOf(found.outcome), attempt->host, found.reason});
+        return;
+    }
+    // A keyring may ask its owner for a password, for as long as that takes.
+    std::thread([attempt] { end(attempt, keep(*attempt)); }).detach();
+}
+
+SignIn::Result SignIn::keep(Attempt& attempt) {
+    Result result{Outcome::Done, attempt.host, {}};
+    const std::filesystem::path token = attempt.file.parent_path() / "token";
+    if (!TokenFile::tokenIn(attempt.wish.secret)) {
+        return {Outcome::Unknown, attempt.host, "no service gives such a secret"};
+    }
+    if (attempt.wish.place == Place::File) {
+        result.reason = documents::AtomicFile::makeFolder(token.parent_path());
+        if (result.reason.empty()) {
+            result.reason = documents::AtomicFile::write(token, attempt.wish.secret + "\n");
+        }
+    } else if (!attempt.store(attempt.wish.person, attempt.host, attempt.wish.secret, attempt.givesUp, result.reason)) {
+        result.outcome = Outcome::NoKeyring;
+        return result;
+    } else {
+        result.reason.clear();
+    }
+    if (result.reason.empty() && !attempt.givesUp) {
+        const ConfigurationFile file(attempt.file);
+        result.reason = file.change(changesFor(attempt.file, attempt.wish.person, attempt.host));
+    }
+    result.outcome = result.reason.empty() ? Outcome::Done : Outcome::NotWritten;
+    return result;
+}
+
+void SignIn::end(const std::shared_ptr<Attempt>& attempt, Result result) {
+    QMetaObject::invokeMethod(
+        QCoreApplication::instance(),
+        [attempt, result = std::move(result)] {
+            if (!attempt->givesUp) {
+                attempt->done(result);
+            }
+        },
+        Qt::QueuedConnection);
+}
+
+}  // namespace ktr::linux_

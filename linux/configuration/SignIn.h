@@ -1,0 +1,77 @@
+#pragma once
+
+#include <atomic>
+#include <filesystem>
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "linux/net/HttpsClient.h"
+#include "linux/net/ServiceCheck.h"
+
+namespace ktr::linux_ {
+
+/// Signs somebody in: asks the service whether it knows them, keeps the secret, and writes the configuration, in this
+/// order; what is not the case leaves everything as it was. Main thread, which never waits.
+class SignIn {
+  public:
+    /// Where the secret is kept.
+    enum class Place {
+        Keyring,  ///< the Secret Service
+        File,     ///< the file "token" beside the configuration, for its owner alone
+    };
+    struct Wish {
+        std::string address;  ///< as it was typed
+        std::string person;
+        std::string secret;
+        Place place = Place::Keyring;
+    };
+    enum class Outcome {
+        Done,
+        BadAddress,
+        NothingAnswers,
+        NotTrusted,
+        Unknown,    ///< the service does not know person and secret together
+        NoService,  ///< something else answers there
+        Failing,    ///< the service cannot help now
+        NoKeyring,  ///< the Secret Service does not keep the secret: locked, not there, or silent
+        NotWritten,
+    };
+    struct Result {
+        Outcome outcome = Outcome::NothingAnswers;
+        std::string host;    ///< as the address was understood; empty where it was not
+        std::string reason;  ///< in words for a log line, without anything private; empty when done
+    };
+    /// Keeps a secret; false with a reason when it does not. It may wait for the user. Any thread.
+    using Store = std::function<bool(const std::string& person, const std::string& host, const std::string& secret,
+                                     const std::atomic<bool>& givesUp, std::string& problem)>;
+
+    /// With the user's Secret Service.
+    explicit SignIn(std::filesystem::path configurationFile);
+    SignIn(std::filesystem::path configurationFile, Store store);
+    /// As `cancel`.
+    ~SignIn();
+    SignIn(const SignIn&) = delete;
+    SignIn& operator=(const SignIn&) = delete;
+
+    /// Calls `done` on the main thread, never inside the call, unless it is cancelled or begun again before.
+    void begin(const Wish& wish, std::function<void(const Result&)> done);
+    /// Nothing is written any more, unless that has begun.
+    void cancel();
+    bool isUnderWay() const { return attempt_ != nullptr; }
+
+  private:
+    struct Attempt;
+    static void checked(const std::shared_ptr<Attempt>& attempt, const ServiceCheck::Result& found);
+    /// On a thread of its own.
+    static Result keep(Attempt& attempt);
+    static void end(const std::shared_ptr<Attempt>& attempt, Result result);
+
+    const std::filesystem::path file_;
+    const Store store_;
+    HttpsClient client_;
+    std::shared_ptr<Attempt> attempt_;
+};
+
+}  // namespace ktr::linux_

@@ -1,0 +1,156 @@
+// Signing in against servers of this process: what is sent, what is kept, and the true cause when nothing is.
+#include <QCoreApplication>
+#include <QDeadlineTimer>
+
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <optional>
+
+#include "linux/configuration/ConfigurationReader.h"
+#include "linux/configuration/SignIn.h"
+#include "linux/configuration/TokenFile.h"
+#include "tests/support/TemporaryFolder.h"
+#include "tests/transport/TransportTest.h"
+
+namespace ktr::test {
+namespace {
+
+using linux_::ServiceCheck;
+using linux_::SignIn;
+using Outcome = SignIn::Outcome;
+
+class SignInTest : public TransportTest {
+  protected:
+    void trustTheServers() {
+        std::ofstream(file) << R"({"certificates": [")" << certificates->authority().toStdString()
+                            << R"("], "textSize": "XL"})";
+        std::filesystem::permissions(file, std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
+    }
+    SignIn::Store keyring(bool isOpen = true) {
+        return [this, isOpen](const std::string& person, const std::string& host, const std::string& secret,
+                              const std::atomic<bool>&, std::string& problem) {
+            kept = person + "@" + host + "=" + secret;
+            problem = isOpen ? "" : "locked";
+            return isOpen;
+        };
+    }
+    SignIn::Result signIn(const SignIn::Wish& wish, bool isOpen = true) {
+        SignIn one(file, keyring(isOpen));
+        std::optional<SignIn::Result> result;
+        one.begin(wish, [&result](const SignIn::Result& got) { result = got; });
+        EXPECT_FALSE(result.has_value()) << "inside the call";
+        const QDeadlineTimer deadline(30000);
+        while (!result && !deadline.hasExpired()) {
+            QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents, 50);
+        }
+        return result.value_or(SignIn::Result{});
+    }
+    linux_::Configuration configuration() const {
+        auto read = linux_::ConfigurationReader::readFile(file);
+        const auto* found = std::get_if<linux_::Configuration>(&read);
+        return found == nullptr ? linux_::Configuration() : *found;
+    }
+
+    TemporaryFolder folder;
+    const std::filesystem::path file = std::filesystem::path(folder.path()) / "config.json";
+    std::string kept;
+};
+
+TEST_F(SignInTest, RightSecret_IsKeptAndTheAccountWritten) {
+    serve(answering(200));
+    trustTheServers();
+    const auto result = signIn({" https://" + server->host() + "/ ", "mara", "s3cret"});
+    EXPECT_EQ(result.outcome, Outcome::Done) << result.reason;
+    EXPECT_EQ(kept, "mara@" + server->host() + "=s3cret");
+    const auto now = configuration();
+    ASSERT_TRUE(now.account);
+    EXPECT_EQ(now.account->personId, "mara");
+    EXPECT_EQ(now.account->host, server->host());
+    EXPECT_TRUE(now.textSize) << "the rest stays";
+    std::ifstream stream(file);
+    EXPECT_EQ(std::string(std::istreambuf_iterator<char>(stream), {}).find("s3cret"), std::string::npos);
+    ASSERT_EQ(server->requests().size(), 1U);
+    EXPECT_NE(server->requests()[0].head.find("POST /qloxservice/friends/va/getlocations "), std::string::npos);
+    EXPECT_EQ(server->requests()[0].body, R"({"clientContext":{},"handles":[]})") << "nobody is shown or asked for";
+}
+
+TEST_F(SignInTest, WrongSecret_SaysSoAndKeepsNothing) {
+    serve(answering(401, "", R"({"statusCode":401})"));
+    trustTheServers();
+    EXPECT_EQ(signIn({server->host(), "mara", "wrong"}).outcome, Outcome::Unknown);
+    EXPECT_EQ(kept, "");
+    EXPECT_FALSE(configuration().account);
+}
+
+TEST_F(SignInTest, EachOtherTrouble_HasItsOwnCause) {
+    trustTheServers();
+    serve(answering(401, "WWW-Authenticate: Basic\r\n", "<html>Router</html>"));
+    EXPECT_EQ(signIn({server->host(), "mara", "s"}).outcome, Outcome::NoService) << "a page of somebody else's";
+    serve(answering(404));
+    EXPECT_EQ(signIn({server->host(), "mara", "s"}).outcome, Outcome::NoService);
+    serve(answering(200, "", "<html>Welcome</html>"));
+    EXPECT_EQ(signIn({server->host(), "mara", "s"}).outcome, Outcome::NoService);
+    serve(answering(503, "", R"({"statusCode":503})"));
+    EXPECT_EQ(signIn({server->host(), "mara", "s"}).outcome, Outcome::Failing);
+    serve(tls("wrongname"), answering(200));
+    EXPECT_EQ(signIn({server->host(), "mara", "s"}).outcome, Outcome::NotTrusted);
+    EXPECT_EQ(server->posts(), 0U) << "the secret did not leave";
+    const std::string gone = server->host();
+    server = nullptr;
+    EXPECT_EQ(signIn({gone, "mara", "s"}).outcome, Outcome::NothingAnswers);
+    EXPECT_EQ(signIn({"http://" + gone, "mara", "s"}).outcome, Outcome::BadAddress) << "never plain text";
+    EXPECT_EQ(signIn({"no host at all", "mara", "s"}).outcome, Outcome::BadAddress);
+    EXPECT_EQ(kept, "");
+    EXPECT_FALSE(configuration().account);
+}
+
+TEST_F(SignInTest, ClosedKeyring_IsSaidAndAFileIsTheChoice) {
+    serve(answering(200));
+    trustTheServers();
+    EXPECT_EQ(signIn({server->host(), "mara", "s3cret"}, false).outcome, Outcome::NoKeyring);
+    EXPECT_FALSE(configuration().account);
+    const auto token = file.parent_path() / "token";
+    EXPECT_FALSE(std::filesystem::exists(token)) << "only where it is wished";
+    const auto result = signIn({server->host(), "mara", "s3cret", SignIn::Place::File}, false);
+    EXPECT_EQ(result.outcome, Outcome::Done) << result.reason;
+    const auto read = linux_::TokenFile::read(token);
+    ASSERT_TRUE(std::holds_alternative<std::string>(read));
+    EXPECT_EQ(std::get<std::string>(read), "s3cret");
+    EXPECT_TRUE(configuration().account);
+}
+
+TEST_F(SignInTest, CancelledSignIn_SaysAndKeepsNothing) {
+    serve([](QSslSocket&, const TestServer::Request&) {});
+    trustTheServers();
+    {
+        SignIn one(file, keyring());
+        one.begin({server->host(), "mara", "s3cret"},
+                  [](const SignIn::Result&) { FAIL() << "after it was cancelled"; });
+        EXPECT_TRUE(one.isUnderWay());
+        one.cancel();
+        EXPECT_FALSE(one.isUnderWay());
+    }
+    QCoreApplication::processEvents();
+    EXPECT_EQ(kept, "");
+}
+
+TEST_F(SignInTest, ClockOfTheService_IsComparedWithOurs) {
+    linux_::HttpsAnswer answer;
+    answer.status = 200;
+    answer.body = "{}";
+    answer.field = [](std::string_view name) {
+        return name == "Date" ? std::string("Thu, 01 Jan 2026 00:00:00 GMT") : std::string();
+    };
+    // 2026-01-01 in seconds since 2001-01-01.
+    constexpr double kThen = 9131.0 * 86400.0;
+    const auto found = ServiceCheck::of(answer, 0.0, {kThen + 240.0});
+    EXPECT_EQ(found.outcome, ServiceCheck::Outcome::Fine);
+    ASSERT_TRUE(found.ahead);
+    EXPECT_NEAR(*found.ahead, 240.0, 1.0);
+    answer.field = [](std::string_view) { return std::string(); };
+    EXPECT_FALSE(ServiceCheck::of(answer, 0.0, {kThen}).ahead);
+}
+
+}  // namespace
+}  // namespace ktr::test

@@ -1,0 +1,205 @@
+// The page for signing in: when it can be used, what it says of each trouble, and how it looks. KTR_GALLERY names a
+// folder for pictures.
+#include "app/window/pages/SignInPage.h"
+
+#include <QApplication>
+#include <QDeadlineTimer>
+#include <QDir>
+#include <QImage>
+#include <QTcpServer>
+#include <memory>
+
+#include "host/HostOptions.h"
+#include "tests/support/TemporaryFolder.h"
+
+#include <gtest/gtest.h>
+
+namespace ktr::app {
+
+namespace {
+
+using linux_::ColorScheme;
+using linux_::Palette;
+using platform::ContentSizeCategory;
+
+class KTRSignInPageTest : public ::testing::Test {
+  protected:
+    void open(const std::string& language = "en-GB", ContentSizeCategory size = ContentSizeCategory::L,
+              SignInPage::Before before = {}, QSize window = {400, 780}) {
+        page = nullptr;
+        host = nullptr;
+        host::HostOptions options;
+        options.language = language;
+        options.textSize = size;
+        const auto settings = host::HostSettings::decide(options, {}, {});
+        ASSERT_TRUE(std::holds_alternative<host::HostSettings>(settings));
+        auto made =
+            host::Host::make(std::get<host::HostSettings>(settings), host::Host::Time::Virtual, KTR_PLUGIN_FILE);
+        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made));
+        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
+        page = std::make_unique<SignInPage>(
+            *host,
+            std::make_unique<linux_::SignIn>(std::filesystem::path(folder.path()) / "config.json",
+                                             [](const std::string&, const std::string&, const std::string&,
+                                                const std::atomic<bool>&, std::string& problem) {
+                                                 problem = "locked";
+                                                 return false;
+                                             }),
+            before);
+        page->setLayoutDirection(host->rightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
+        page->resize(window);
+        page->setLook({&Palette::of(ColorScheme::Light), true});
+        page->refresh();
+        page->show();
+        QApplication::processEvents();
+    }
+    void TearDown() override {
+        page = nullptr;
+        host = nullptr;
+    }
+    static void type(FormField& field, const QString& text) {
+        field.edit().setText(text);
+        Q_EMIT field.edit().textEdited(text);
+    }
+    void fill(const QString& address) {
+        type(page->address(), address);
+        type(page->person(), QStringLiteral("mara"));
+        type(page->secret(), QStringLiteral("s3cret"));
+    }
+    /// Waits until it is no longer checking.
+    void waitForTheEnd() {
+        const QDeadlineTimer deadline(30000);
+        while (page->cancel().isVisible() && !deadline.hasExpired()) {
+            QApplication::processEvents(QEventLoop::WaitForMoreEvents, 50);
+        }
+    }
+    void keep(const char* name) {
+        if (const QString where = qEnvironmentVariable("KTR_GALLERY"); !where.isEmpty()) {
+            QApplication::processEvents();
+            QImage picture(page->size() * 2, QImage::Format_RGB32);
+            picture.setDevicePixelRatio(2.0);
+            page->render(&picture);
+            EXPECT_TRUE(picture.save(
+                QDir(where).filePath(QLatin1String("sign-in-") + QLatin1String(name) + QLatin1String(".png"))));
+        }
+    }
+    /// A port at which nobody listens.
+    static QString nobody() {
+        QTcpServer server;
+        server.listen(QHostAddress::LocalHost);
+        return QStringLiteral("127.0.0.1:%1").arg(server.serverPort());
+    }
+
+    test::TemporaryFolder folder;
+    std::unique_ptr<host::Host> host;
+    std::unique_ptr<SignInPage> page;
+};
+
+}  // namespace
+
+TEST_F(KTRSignInPageTest, EmptyPage_IsNotReadyAndBeginsInTheFirstEmptyField) {
+    open();
+    EXPECT_FALSE(page->go().isEnabled());
+    EXPECT_EQ(page->firstFocus(), &page->address().edit());
+    EXPECT_FALSE(page->canBeLeft());
+    keep("empty");
+    fill(QStringLiteral("brin.example"));
+    EXPECT_TRUE(page->go().isEnabled());
+    type(page->secret(), QString());
+    EXPECT_FALSE(page->go().isEnabled());
+    EXPECT_EQ(page->secret().edit().echoMode(), QLineEdit::Password);
+}
+
+TEST_F(KTRSignInPageTest, WhoWasSignedInBefore_IsFilledInAndOnlyThenItSaysAgain) {
+    open("en-GB", ContentSizeCategory::L, {"brin.example", "mara"});
+    EXPECT_EQ(page->address().text(), QStringLiteral("brin.example"));
+    EXPECT_EQ(page->person().text(), QStringLiteral("mara"));
+    EXPECT_EQ(page->firstFocus(), &page->secret().edit());
+    const auto says = [this](const QString& part) {
+        for (const QWidget* widget : page->findChildren<QWidget*>()) {
+            if (dynamic_cast<const Words*>(widget) != nullptr && widget->isVisible() &&
+                widget->accessibleName().contains(part)) {
+                return true;
+            }
+        }
+        return false;
+    };
+    EXPECT_TRUE(says(QStringLiteral("again")));
+    open();
+    EXPECT_FALSE(says(QStringLiteral("again")));
+}
+
+TEST_F(KTRSignInPageTest, NobodyThere_IsSaidAtTheAddressWhichStaysAndCanBeTriedAgain) {
+    open();
+    const QString gone = nobody();
+    fill(gone);
+    page->go().press();
+    EXPECT_TRUE(page->cancel().isVisible());
+    EXPECT_TRUE(page->address().edit().isReadOnly()) << "fields cannot be changed meanwhile";
+    keep("checking");
+    waitForTheEnd();
+    EXPECT_TRUE(page->address().note().contains(gone)) << page->address().note().toStdString();
+    EXPECT_EQ(page->secret().note(), QString());
+    EXPECT_EQ(page->go().words(), QStringLiteral("Try again"));
+    EXPECT_TRUE(page->go().isEnabled());
+    EXPECT_EQ(page->secret().text(), QStringLiteral("s3cret"));
+    EXPECT_FALSE(page->address().edit().isReadOnly());
+    keep("unreachable");
+    type(page->address(), QStringLiteral("brin.example"));
+    EXPECT_EQ(page->address().note(), QString()) << "another address is not wrong yet";
+    EXPECT_EQ(page->go().words(), QStringLiteral("Sign in"));
+}
+
+TEST_F(KTRSignInPageTest, PlainTextAddress_IsRefusedWithoutAsking) {
+    open();
+    QTcpServer server;
+    ASSERT_TRUE(server.listen(QHostAddress::LocalHost));
+    fill(QStringLiteral("http://127.0.0.1:%1").arg(server.serverPort()));
+    page->go().press();
+    waitForTheEnd();
+    EXPECT_FALSE(page->address().note().isEmpty());
+    EXPECT_FALSE(server.waitForNewConnection(200));
+}
+
+TEST_F(KTRSignInPageTest, Cancel_StopsAtOnceAndKeepsWhatWasTyped) {
+    open();
+    QTcpServer silent;
+    ASSERT_TRUE(silent.listen(QHostAddress::LocalHost));
+    fill(QStringLiteral("127.0.0.1:%1").arg(silent.serverPort()));
+    page->go().press();
+    ASSERT_TRUE(page->cancel().isVisible());
+    page->cancel().press();
+    EXPECT_FALSE(page->cancel().isVisible());
+    EXPECT_TRUE(page->go().isEnabled());
+    EXPECT_EQ(page->secret().text(), QStringLiteral("s3cret"));
+    EXPECT_EQ(page->address().note(), QString());
+}
+
+TEST_F(KTRSignInPageTest, EveryWindow_ShowsAllOfItWithoutCuttingAndScrolls) {
+    struct Case {
+        const char* name;
+        const char* language;
+        ContentSizeCategory size;
+        QSize window;
+    };
+    const Case cases[] = {{"wide", "de", ContentSizeCategory::L, {1000, 760}},
+                          {"low", "de", ContentSizeCategory::L, {320, 240}},
+                          {"rtl", "ar", ContentSizeCategory::L, {400, 780}},
+                          {"japanese", "ja", ContentSizeCategory::L, {400, 780}},
+                          {"ax3", "en-GB", ContentSizeCategory::AX3, {400, 780}}};
+    for (const Case& one : cases) {
+        open(one.language, one.size, {}, one.window);
+        keep(one.name);
+        EXPECT_GE(page->column().height(), page->column().shapeHeight(page->column().width())) << one.name;
+        for (const QWidget* widget : page->findChildren<QWidget*>()) {
+            const auto* block = dynamic_cast<const Block*>(widget);
+            if (block != nullptr && block->isVisible()) {
+                const QPoint at = block->mapTo(page.get(), block->shape().topLeft());
+                EXPECT_GE(at.x(), 0) << one.name;
+                EXPECT_LE(at.x() + block->shape().width(), one.window.width()) << one.name;
+            }
+        }
+    }
+}
+
+}  // namespace ktr::app
