@@ -105,7 +105,9 @@ LiveStatus LiveStatus::of(const Facts& facts, const Words& words) {
         return {Mark::Warning, words.text("STATUS_UNREADABLE")};
     }
     if (!facts.signedIn || trouble == Trouble::SignedOut) {
-        return {Mark::Warning, words.text(facts.hasAccount ? "STATUS_SIGN_IN" : "STATUS_SIGN_IN_FIRST"), true};
+        // "Again" is for who was signed in before.
+        const bool isAgain = facts.hasAccount || trouble == Trouble::SignedOut;
+        return {Mark::Warning, words.text(isAgain ? "STATUS_SIGN_IN" : "STATUS_SIGN_IN_FIRST"), true};
     }
     if (facts.asking && since(*facts.asking, facts.now) >= kPatience) {
         return {Mark::Waiting, words.text("STATUS_ASKING")};

@@ -49,7 +49,17 @@ TEST_F(LiveStatusTest, TroubleGoesBeforeHiding) {
     facts.assistant = Trouble::Unreachable;
     EXPECT_EQ(status().mark, LiveStatus::Mark::Warning);
     facts.signedIn = false;
+    facts.hasAccount = true;
     EXPECT_EQ(words(), "STATUS_SIGN_IN");
+    EXPECT_TRUE(status().wantsSignIn);
+}
+
+TEST_F(LiveStatusTest, WhoWasNeverSignedIn_IsNotToldToDoItAgain) {
+    facts.signedIn = false;
+    EXPECT_EQ(words(), "STATUS_SIGN_IN_FIRST");
+    EXPECT_TRUE(status().wantsSignIn);
+    facts.signedIn = true;
+    EXPECT_FALSE(status().wantsSignIn);
 }
 
 TEST_F(LiveStatusTest, EachTroubleHasItsOwnWords) {
