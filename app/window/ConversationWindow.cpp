@@ -3,6 +3,7 @@
 #include <QGuiApplication>
 #include <QKeyEvent>
 #include <QPainter>
+#include <QTime>
 #include <algorithm>
 #include <cmath>
 #include <initializer_list>
@@ -44,6 +45,12 @@ ConversationWindow::ConversationWindow(host::Host& host)
                 part->setVisible(isSeen);
             }
         }
+        if (greeting_ != nullptr) {
+            greeting_->hide();
+        }
+        if (isSeen && live_) {
+            greet(live_->status());
+        }
     });
     conversation_->setPaletteChanged([this] { choosePalette(); });
     host_.setRemade([this] { remade(); });
@@ -74,7 +81,13 @@ void ConversationWindow::addField() {
     setTabOrder(conversation_, &field_->button());
     setFocusProxy(&field_->edit());
     field_->edit().setFocus();
-    live_->setHandlers({[this](host::TurnView& turn) { conversation_->turnCame(turn); },
+    greeting_ = new Greeting(host_, this);
+    greeting_->hide();
+    greeting_->setAsked([this](const std::string& question) { live_->ask(question); });
+    live_->setHandlers({[this](host::TurnView& turn) {
+                            greetNoMore();
+                            conversation_->turnCame(turn);
+                        },
                         [this](host::TurnView& turn) { conversation_->answerCame(turn); },
                         [this] {
                             showStatus();
@@ -99,6 +112,9 @@ void ConversationWindow::remade() {
         showStatus();
     }
     pages_->refresh();
+    if (greeting_ != nullptr) {
+        greeting_->refresh();
+    }
     place();
 }
 
@@ -110,6 +126,29 @@ void ConversationWindow::start(const std::vector<host::Scenario>& scenarios,
             live_->ask(question);
         }
         live_->start(scenarios);
+    }
+}
+
+void ConversationWindow::greet(const host::LiveStatus& now) {
+    const bool isMeant = greeting_ != nullptr && !now.wantsSignIn && !live_->isWaiting() && !pages_->isOpen() &&
+                         !host_.live()->isUnusable() && !host_.isRestricted();
+    if (isMeant && greeting_->isHidden()) {
+        greeting_->setHour(QTime::currentTime().hour());
+        greeting_->refresh();
+        greeting_->show();
+        place();
+    }
+}
+
+void ConversationWindow::greetNoMore() {
+    if (greeting_ != nullptr) {
+        // Perhaps it is one of its questions that was pressed.
+        greeting_->hide();
+        greeting_->deleteLater();
+        greeting_ = nullptr;
+        if (field_->isVisible()) {
+            field_->edit().setFocus();
+        }
     }
 }
 
@@ -134,6 +173,7 @@ void ConversationWindow::showStatus() {
             pages_->closeAll();
         }
     }
+    greet(now);
     if (!status_->isPlaced()) {
         place();
     }
@@ -160,6 +200,9 @@ void ConversationWindow::choosePalette() {
         status_->setColors(conversation_->colors());
     }
     chooseMotion();
+    if (greeting_ != nullptr) {
+        greeting_->setLook({&conversation_->colors(), true});
+    }
     update();
 }
 
@@ -189,6 +232,9 @@ void ConversationWindow::place() {
     const int bar = barHeight();
     conversation_->setGeometry(0, 0, width(), std::max(height() - bar, 0));
     pages_->setGeometry(rect());
+    if (greeting_ != nullptr) {
+        greeting_->setGeometry(conversation_->geometry());
+    }
     if (field_ == nullptr) {
         return;
     }

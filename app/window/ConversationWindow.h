@@ -8,6 +8,7 @@
 #include "app/window/AskField.h"
 #include "app/window/CaretRest.h"
 #include "app/window/ConversationWidget.h"
+#include "app/window/Greeting.h"
 #include "app/window/PlainWidget.h"
 #include "app/window/StatusLine.h"
 #include "app/window/WindowSight.h"
@@ -47,6 +48,9 @@ class ConversationWindow : public PlainWidget {
     void addField();
     void choosePalette();
     void chooseMotion();
+    /// Shows the greeting while nothing was asked in this window.
+    void greet(const host::LiveStatus& now);
+    void greetNoMore();
     /// Asks for the account where that is missing.
     void offerSignIn();
     void showStatus();
@@ -69,6 +73,8 @@ class ConversationWindow : public PlainWidget {
     AskField* field_ = nullptr;
     StatusLine* status_ = nullptr;
     PageStack* pages_;
+    /// None where nothing is live, and once something was asked.
+    Greeting* greeting_ = nullptr;
     QTimer statusTimer_;
     /// What the status said last: a page that was answered is not shown again before the answer counts.
     bool wantsSignIn_ = false;

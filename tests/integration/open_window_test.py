@@ -174,7 +174,7 @@ class PseudoLanguageTest(OpenWindow):
     """What has no accents in a pseudo-language, and is nobody's own, was not looked up."""
 
     OWN = ("Zofia Zabek", "Ferry Pier", "zofia@harbour.example", "where are my friends", "hide my location",
-           "Zofia Zabek is here: Ferry Pier.", "Done. Friends can’t see where you are.", "Mara Lind", "ktr")
+           "Zofia Zabek is here: Ferry Pier.", "Done. Friends can’t see where you are.", "Mara Lind", "ktr", "brin.example")
     PLAIN = re.compile("[AaCcDdEeGgIiLlNnOoRrSsTtUuWwYyZz]+")
 
     def texts(self):

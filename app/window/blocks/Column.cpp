@@ -3,6 +3,7 @@
 #include <QEvent>
 #include <QPainter>
 #include <algorithm>
+#include <utility>
 
 namespace ktr::app {
 
@@ -20,8 +21,10 @@ void Column::beginBottom(int below) {
 }
 
 void Column::setMostWidth(int width) {
-    mostWidth_ = width;
-    askForRoom();
+    // Whoever lays a page out says it each time: only news may ask for another layout.
+    if (std::exchange(mostWidth_, width) != width) {
+        askForRoom();
+    }
 }
 
 void Column::setMargins(int top, int bottom) {
@@ -32,11 +35,10 @@ void Column::setMargins(int top, int bottom) {
 
 void Column::setAbove(const Block* block, int above) {
     for (Item& item : items_) {
-        if (item.block == block) {
-            item.place.above = above;
+        if (item.block == block && std::exchange(item.place.above, above) != above) {
+            askForRoom();
         }
     }
-    askForRoom();
 }
 
 int Column::columnWidth(int width) const {

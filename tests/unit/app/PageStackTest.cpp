@@ -162,6 +162,30 @@ TEST_F(KTRPageStackTest, MovingPage_IsThereInTheEndAndGoneInTheEnd) {
     EXPECT_FALSE(stack.isVisible());
 }
 
+TEST_F(KTRPageStackTest, PageAtRest_LaysNothingOut) {
+    class Counter : public QObject {
+      public:
+        int count = 0;
+        bool eventFilter(QObject*, QEvent* event) override {
+            count += event->type() == QEvent::LayoutRequest ? 1 : 0;
+            return false;
+        }
+    } counter;
+    TestPage& page = open(QStringLiteral("Settings"));
+    for (int i = 0; i < 20; ++i) {
+        QApplication::processEvents();
+    }
+    page.installEventFilter(&counter);
+    page.column().installEventFilter(&counter);
+    page.column().parentWidget()->installEventFilter(&counter);
+    page.first->setNote(QStringLiteral("Nothing answers."));
+    for (int i = 0; i < 100; ++i) {
+        QApplication::processEvents();
+    }
+    EXPECT_GE(counter.count, 1);
+    EXPECT_LE(counter.count, 8) << "one layout asks for the next";
+}
+
 TEST_F(KTRPageStackTest, PageThatLeavesFromItsOwnButton_IsNotUsedAfterwards) {
     TestPage& page = open(QStringLiteral("Settings"));
     bool went = false;
