@@ -67,7 +67,8 @@ void Words::paintEvent(QPaintEvent*) {
     if (isWarning_) {
         const double side = grown(iconSide(Icon::Warning));
         const double top = (BlockText::fontOf(style_).lineHeight() - side) / 2.0;
-        paintIcon(painter, Icon::Warning, mirrored({inside.x(), inside.y() + std::max(top, 0.0), side, side}), colors().warning, false);
+        paintIcon(painter, Icon::Warning, mirrored({inside.x(), inside.y() + std::max(top, 0.0), side, side}),
+                  colors().warning, false);
     }
 }
 
