@@ -83,6 +83,22 @@ TEST_F(ContactsUtilitiesTest, EveryFetchAsksForTheKeys) {
     EXPECT_EQ(contacts->lastKeys, keys);
 }
 
+TEST_F(ContactsUtilitiesTest, KeysOfAThousandFetches_AreMadeOnce) {
+    struct CountingFormatter : FakeContactFormatter {
+        std::string descriptorForRequiredKeys(platform::ContactFormatterStyle style) const override {
+            ++asked;
+            return FakeContactFormatter::descriptorForRequiredKeys(style);
+        }
+        mutable int asked = 0;
+    };
+    const auto formatter = std::make_shared<CountingFormatter>();
+    platform::Platform::installed()->contactFormatter = formatter;
+    for (int i = 0; i < 1000; ++i) {
+        ContactsUtilities::contactForEmail("a@b");
+    }
+    EXPECT_EQ(formatter->asked, 1);
+}
+
 TEST_F(ContactsUtilitiesTest, ByEmail_TheFirstWithAPictureWins) {
     add("1", "ann@example.com", "1");
     const auto pictured = add("2", "Ann@Example.com", "2", true);
