@@ -19,6 +19,9 @@ namespace {
 /// milliseconds.
 constexpr int kAccountWait = 10000;
 constexpr int kSpeechWait = 60000;
+/// What a picture waits for until faces, region and map are there, milliseconds.
+constexpr int kSettling = 1500;
+constexpr int kTick = 100;
 
 /// Through speech-dispatcher; waits for the end. Whether it was said.
 bool speak(const std::string& sentence, const std::string& language) {
@@ -58,6 +61,18 @@ int AskCommand::run() {
     return write(text, *answer);
 }
 
+void AskCommand::settle() {
+    QEventLoop loop;
+    QTimer tick;
+    const auto layOut = [this] { host_.layOut(host_.settings().width); };
+    QObject::connect(&tick, &QTimer::timeout, layOut);
+    QTimer::singleShot(kSettling, &loop, &QEventLoop::quit);
+    layOut();
+    tick.start(kTick);
+    loop.exec();
+    layOut();
+}
+
 int AskCommand::write(const std::string& question, const ask::Answer& answer) {
     const std::string text = options_.json ? platform::writeJson(ask::objectOf(answer)) : answer.sentence;
     if (std::fputs((text + "\n").c_str(), stdout) == EOF || std::fflush(stdout) != 0) {
@@ -67,7 +82,7 @@ int AskCommand::write(const std::string& question, const ask::Answer& answer) {
     if (!options_.output.empty()) {
         host::QuestionDesk desk(host_);
         host_.answer(*host_.addQuestion(question), desk.scenarioOf(answer));
-        host_.layOut(host_.settings().width);
+        settle();
         if (const auto failure = RenderCommand(host_).write(options_.output)) {
             tell(failure->line);
             return static_cast<int>(failure->code);

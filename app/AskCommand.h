@@ -16,6 +16,8 @@ class AskCommand {
     int run();
 
   private:
+    /// Lets what the answer still waits for happen: faces, and the map.
+    void settle();
     int write(const std::string& question, const ask::Answer& answer);
 
     host::Host& host_;
