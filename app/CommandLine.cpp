@@ -10,6 +10,7 @@
 #include "app/ServeArguments.h"
 #include "documents/NearestName.h"
 #include "documents/Words.h"
+#include "host/links/LinkPolicy.h"
 #include "host/scenario/Scenario.h"
 #include "linux/device/LinuxDevice.h"
 
@@ -106,6 +107,8 @@ struct Parser {
     CLI::App* render = nullptr;
     CLI::App* describe = nullptr;
     CLI::App* ask = nullptr;
+    CLI::App* open = nullptr;
+    CLI::App* addMap = nullptr;
     std::unique_ptr<ServeArguments> serve;
     CLI::App* watch = nullptr;
     std::unique_ptr<KeepingArguments> keeping;
@@ -160,6 +163,15 @@ struct Parser {
                 ->type_name("QUESTION");
             addCommon(*command);
         }
+        open = app.add_subcommand("open", "Opens a link to a friend, in the window that is there or in a new one");
+        open->add_option("link", options.link, "wayloc://friend/HANDLE, or wayloc://friends/; none: the window alone")
+            ->type_name("LINK");
+        CLI::App* maps = app.add_subcommand("maps", "Maps of one's own");
+        maps->require_subcommand(1);
+        addMap = maps->add_subcommand("add", "Checks a map (MBTiles), sees to its index and adds it");
+        addMap->add_option("file", options.map, "The file with the map; it stays where it is")
+            ->required()
+            ->type_name("FILE");
         serve = std::make_unique<ServeArguments>(app);
         watch =
             app.add_subcommand("watch", "Shows a notification when somebody comes or goes, as the service tells it");
@@ -178,6 +190,15 @@ struct Parser {
         show->footer(kShowExamples);
         render->footer(kRenderExamples);
         describe->footer(kDescribeExamples);
+    }
+
+    /// A window that is live, at a link; false for one that is opened by nobody.
+    bool readOpen() {
+        options.command = Options::Command::Open;
+        options.live = true;
+        using host::LinkPolicy;
+        return options.link.empty() || !std::holds_alternative<LinkPolicy::Refused>(
+                                           LinkPolicy::decide(options.link, LinkPolicy::From::Outside));
     }
 
     void addCommon(CLI::App& command) {
@@ -360,6 +381,15 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
     if (parser.keeping->isConfig() || parser.keeping->isDoctor()) {
         parser.options.command = parser.keeping->isDoctor() ? Options::Command::Doctor : Options::Command::Config;
         return parser.options;
+    }
+    if (parser.addMap->parsed()) {
+        parser.options.command = Options::Command::AddMap;
+        return parser.options;
+    }
+    if (parser.open->parsed()) {
+        return parser.readOpen() ? std::variant<Options, Ending>(parser.options)
+                                 : misuse(wrong("LINK", "a link such as wayloc://friend/ann@harbour.example, or https",
+                                                parser.options.link));
     }
     parser.options.command = parser.ask->parsed()      ? Options::Command::Ask
                              : parser.show->parsed()   ? Options::Command::Show

@@ -12,7 +12,7 @@ namespace ktr::app {
 
 /// What the command line asks for. Members that are none leave the decision to the scenario, then to the session.
 struct Options : host::HostOptions {
-    enum class Command { Show, Render, Describe, Ask, Serve, Watch, Config, Doctor };
+    enum class Command { Show, Open, Render, Describe, Ask, Serve, AddMap, Watch, Config, Doctor };
 
     Command command = Command::Show;
     std::vector<std::string> scenarios;  ///< never empty where nothing is live, but for serve
@@ -29,6 +29,8 @@ struct Options : host::HostOptions {
     ConfigOptions config;                ///< of config
     DoctorOptions doctor;                ///< of doctor
     bool reducedMotion = false;          ///< of show
+    std::string map;                     ///< of maps add: the file
+    std::string link;                    ///< of a window: opened once it is there; empty for none
     bool printUrls = false;              ///< of show: URLs go to the standard output instead of the desktop
 };
 

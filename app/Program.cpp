@@ -14,6 +14,7 @@
 #include "app/Description.h"
 #include "app/DoctorCommand.h"
 #include "app/LiveRun.h"
+#include "app/MapsCommand.h"
 #include "app/Messages.h"
 #include "app/RenderCommand.h"
 #include "app/ServeCommand.h"
@@ -26,6 +27,7 @@
 #include "linux/configuration/XdgFolders.h"
 #include "linux/device/Buses.h"
 #include "linux/device/Descriptors.h"
+#include "linux/device/DesktopActivation.h"
 #include "linux/device/SystemClock.h"
 #include "linux/locale/LocaleRegion.h"
 #include "linux/locale/QtLocalization.h"
@@ -68,6 +70,30 @@ linux_::Configuration configurationOf(const std::filesystem::path& file) {
     tell(warnings);
     auto* configuration = std::get_if<linux_::Configuration>(&read);
     return configuration == nullptr ? linux_::Configuration() : std::move(*configuration);
+}
+
+/// The configured maps for a conversation that stands for itself: those in files, since nothing is fetched for it. What
+/// is not used is said.
+linux_::Configuration::Maps mapsIn(const std::filesystem::path& file) {
+    std::error_code failed;
+    if (!std::filesystem::exists(file, failed)) {
+        return {};
+    }
+    auto read = linux_::ConfigurationReader::readFile(file, nullptr);
+    if (const auto* error = std::get_if<linux_::ConfigurationReader::Error>(&read)) {
+        tell("warning: the configured maps are not used: " + error->text);
+        return {};
+    }
+    auto maps = std::get<linux_::Configuration>(std::move(read)).maps;
+    std::erase_if(maps.sources, [](const linux_::Configuration::Maps::Source& source) {
+        if (!source.url.empty()) {
+            tell("warning: the map " + documents::inQuotes(source.url) + " is not used: nothing is fetched here");
+        } else if (std::error_code missing; !std::filesystem::is_regular_file(source.file, missing)) {
+            tell("warning: the map " + documents::inQuotes(source.file) + " is not there");
+        }
+        return !source.url.empty();
+    });
+    return maps;
 }
 
 std::variant<std::unique_ptr<host::Host>, host::Failure> makeHost(const Options& options,
@@ -209,8 +235,14 @@ host::ExitCode run(const Options& options, int argc, char** argv) {
     tellOfLanguage(settings.language);
     if (options.live) {
         settings.liveConfiguration = configuration;
+    } else {
+        settings.maps = mapsIn(configuration);
     }
-    const bool window = options.command == Options::Command::Show;
+    constexpr double kVectorDensity = 3.0;
+    if (options.output.ends_with(".svg") || options.output.ends_with(".pdf")) {
+        settings.mapDensity = kVectorDensity;
+    }
+    const bool window = options.command == Options::Command::Show || options.command == Options::Command::Open;
     if (window && !hasDisplay()) {
         return fail(
             {host::ExitCode::Failure, "there is no display to open a window on; `ktr render` draws without one"});
@@ -232,6 +264,10 @@ host::ExitCode run(const Options& options, int argc, char** argv) {
                                                               : new QGuiApplication(count, argv));
     if (const auto failure = loadFonts()) {
         return fail(*failure);
+    }
+    if (options.command == Options::Command::Open &&
+        linux_::DesktopActivation::handOver(qEnvironmentVariable("DBUS_SESSION_BUS_ADDRESS"), options.link)) {
+        return host::ExitCode::Ok;
     }
     return window ? runShow(options, settings, scenarios) : runHeadless(options, settings, scenarios);
 }
@@ -257,6 +293,8 @@ host::ExitCode runProgram(int argc, char** argv) {
     switch (options.command) {
         case Options::Command::Serve:
             return ServeCommand::run(options.serve);
+        case Options::Command::AddMap:
+            return MapsCommand::add(options.map);
         case Options::Command::Watch:
             return WatchCommand::run(options.watch, argc, argv);
         case Options::Command::Config:

@@ -91,9 +91,13 @@ void addMaps(Platform& platform, const HostSettings& settings, LiveServices* liv
         platform.maps = earlier->maps;
         return;
     }
-    const auto maps =
-        linux_::ConfiguredMaps::make(live ? live->configuration() : linux_::Configuration{}, resourceFolder(),
-                                     platform.mainLoop, live ? live->network() : nullptr);
+    linux_::Configuration configuration = live ? live->configuration() : linux_::Configuration{};
+    if (!live) {
+        configuration.maps = settings.maps;
+    }
+    const auto maps = linux_::ConfiguredMaps::make(configuration, resourceFolder(), platform.mainLoop,
+                                                   live ? live->network() : nullptr);
+    maps->setDensity(settings.mapDensity);
     platform.maps = maps;
     if (live) {
         live->drawConfiguredMaps(maps);

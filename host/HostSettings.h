@@ -51,6 +51,10 @@ struct HostSettings {
     /// The desktop's: 1 is its usual size. Null where no desktop was asked, or none answered.
     std::optional<double> desktopTextScale;
     bool desktopHighContrast = false;  ///< the desktop's wish
+    /// Of a conversation that is not live: the maps that it is drawn on, besides the built-in ones.
+    linux_::Configuration::Maps maps;
+    /// Pixels of its maps a pixel of everything else: more than 1 where the picture is not one of pixels.
+    double mapDensity = 1.0;
 
     /// Where anybody wishes it.
     bool drawsHighContrast() const { return highContrast || desktopHighContrast; }

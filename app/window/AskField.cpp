@@ -62,7 +62,7 @@ AskField::AskField(const Texts& texts, QWidget* parent)
 
 void AskField::setTexts(const Texts& texts) {
     edit_->setPlaceholderText(QString::fromStdString(texts.placeholder));
-    edit_->setAccessibleName(QString::fromStdString(texts.placeholder));
+    edit_->setAccessibleName(QString::fromStdString(texts.name.empty() ? texts.placeholder : texts.name));
     button_->setAccessibleName(QString::fromStdString(texts.send));
     button_->setToolTip(QString::fromStdString(texts.send));
 }

@@ -21,6 +21,7 @@ class AskField : public PlainWidget {
     struct Texts {
         std::string placeholder;
         std::string send;
+        std::string name = {};  ///< spoken, of the field; empty: the placeholder
     };
 
     explicit AskField(const Texts& texts, QWidget* parent = nullptr);

@@ -1,5 +1,9 @@
 // What the conversation makes of wheel, mouse, finger and keys.
+#include <QClipboard>
+#include <QContextMenuEvent>
+#include <QGuiApplication>
 #include <QKeyEvent>
+#include <QMenu>
 #include <QMouseEvent>
 #include <QTouchEvent>
 #include <algorithm>
@@ -86,6 +90,7 @@ bool ConversationWidget::touch(QTouchEvent& event) {
             kinetic_.press(at.y(), seconds());
             if (tap_) {
                 touches_->press(inTree(at), seconds());
+                holdTimer_.start();
             }
             break;
         case QEvent::TouchUpdate: {
@@ -93,6 +98,7 @@ bool ConversationWidget::touch(QTouchEvent& event) {
             if (tap_ && std::hypot(at.x() - tap_->x(), at.y() - tap_->y()) > platform::TouchDispatcher::kSlop) {
                 touches_->cancel(seconds());
                 tap_.reset();
+                holdTimer_.stop();
             }
             if (!tap_) {
                 scrollTo(scrolled() + moved);
@@ -100,6 +106,7 @@ bool ConversationWidget::touch(QTouchEvent& event) {
             break;
         }
         case QEvent::TouchEnd:
+            holdTimer_.stop();
             if (tap_) {
                 kinetic_.stop();
                 touches_->release(inTree(at), seconds());
@@ -112,6 +119,7 @@ bool ConversationWidget::touch(QTouchEvent& event) {
             tap_.reset();
             break;
         default:
+            holdTimer_.stop();
             touches_->cancel(seconds());
             tap_.reset();
             break;
@@ -132,6 +140,64 @@ void ConversationWidget::fling() {
     if (!kinetic_.isFlinging()) {
         wheelRest_ = 0.0;
         flingTimer_.stop();
+    }
+}
+
+// Copying
+
+namespace {
+
+/// The text of the innermost element at a point.
+std::string textIn(const platform::AccessibilityNode& node, const platform::Point& at) {
+    for (const auto& child : node.children) {
+        if (child.frame.contains(at)) {
+            if (std::string text = textIn(child, at); !text.empty()) {
+                return text;
+            }
+        }
+    }
+    return node.children.empty() && node.role != platform::AccessibilityRole::Group ? node.text : "";
+}
+
+}  // namespace
+
+std::string ConversationWidget::textAt(QPointF point) const {
+    return textIn(platform::accessibilityTree(host_.window(), host_.rightToLeft()), inTree(point));
+}
+
+void ConversationWidget::offerCopy(const std::string& text, QPoint at) {
+    if (text.empty()) {
+        return;
+    }
+    auto* menu = new QMenu(this);
+    menu->setAttribute(Qt::WA_DeleteOnClose);
+    const QString copied = QString::fromStdString(text);
+    connect(menu->addAction(QString::fromStdString(host_.text("MENU_COPY"))), &QAction::triggered, menu,
+            [copied] { QGuiApplication::clipboard()->setText(copied); });
+    menu->popup(at);
+}
+
+void ConversationWidget::contextMenuEvent(QContextMenuEvent* event) {
+    const bool isByKey = event->reason() == QContextMenuEvent::Keyboard;
+    const auto focused = isByKey ? rows_.focusedRect() : std::nullopt;
+    if (isByKey && !focused) {
+        return;
+    }
+    // Inside the row: at its very edge another one may begin.
+    const QPointF at = isByKey
+                           ? QPointF(focused->x + focused->width / 2.0, focused->y + focused->height / 2.0 - scrolled())
+                           : QPointF(event->pos());
+    offerCopy(textAt(at), mapToGlobal(at.toPoint()));
+}
+
+void ConversationWidget::held() {
+    if (tap_) {
+        const QPointF at = *tap_;
+        // What began as a tap on a row is none any more.
+        touches_->cancel(seconds());
+        tap_.reset();
+        kinetic_.stop();
+        offerCopy(textAt(at), mapToGlobal(at.toPoint()));
     }
 }
 
@@ -212,6 +278,13 @@ void ConversationWidget::keyPressEvent(QKeyEvent* event) {
     // Taken here and not as shortcuts: those need a window manager that says which window is active.
     if (event->modifiers() == Qt::ControlModifier && (event->key() == Qt::Key_Q || event->key() == Qt::Key_W)) {
         window()->close();
+        return;
+    }
+    if (event->matches(QKeySequence::Copy)) {
+        if (const auto row = rows_.focusedRect()) {
+            QGuiApplication::clipboard()->setText(
+                QString::fromStdString(textAt({row->x + row->width / 2.0, row->y + row->height / 2.0 - scrolled()})));
+        }
         return;
     }
     if (moveAmongRows(event->key())) {

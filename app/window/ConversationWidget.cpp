@@ -22,6 +22,8 @@ namespace {
 constexpr int kFrame = 16;  // milliseconds
 /// Scrolling rests after so long: what only passes by is told nothing. Milliseconds.
 constexpr int kRest = 250;
+/// A lower window shows no times.
+constexpr int kLowestWithTimes = 300;
 
 }  // namespace
 
@@ -72,6 +74,10 @@ ConversationWidget::ConversationWidget(host::Host& host, QWidget* parent)
     connect(&flingTimer_, &QTimer::timeout, this, [this] { fling(); });
     motionTimer_.setInterval(kFrame);
     connect(&motionTimer_, &QTimer::timeout, this, [this] { move(); });
+    constexpr int kHold = 600;  // milliseconds
+    holdTimer_.setSingleShot(true);
+    holdTimer_.setInterval(kHold);
+    connect(&holdTimer_, &QTimer::timeout, this, [this] { held(); });
     host_.window()->setClient(client_);
     host_.delegate().resize = [this](platform::HostSnippetViewController& controller, bool pinTop) {
         resizeCard(controller, pinTop);
@@ -126,6 +132,7 @@ void ConversationWidget::layOut() {
     const auto turn = anchor();
     const double before = turn ? host_.conversation()->topOf(*turn) : 0.0;
     host_.conversation()->advance(seconds());
+    host_.conversation()->setShowsTimes(window()->height() >= kLowestWithTimes);
     contentHeight_ = host_.layOut(width());
     layingOut_ = false;
     updateBar();

@@ -75,6 +75,7 @@ class ConversationWidget : public QWidget {
     void focusOutEvent(QFocusEvent* event) override;
     void keyPressEvent(QKeyEvent* event) override;
     void changeEvent(QEvent* event) override;
+    void contextMenuEvent(QContextMenuEvent* event) override;
     bool focusNextPrevChild(bool next) override;
 
   private:
@@ -108,6 +109,12 @@ class ConversationWidget : public QWidget {
     void choosePalette();
     bool touch(QTouchEvent& event);
     void fling();
+    /// A finger has rested for as long as it takes to ask for a menu.
+    void held();
+    /// What can be copied at a point of the widget; empty where nothing is said.
+    std::string textAt(QPointF point) const;
+    /// A menu to copy a text; none for an empty one.
+    void offerCopy(const std::string& text, QPoint at);
     void showFocus();
     /// False for a key that means nothing to rows, as all do while none has the focus.
     bool moveAmongRows(int key);
@@ -126,6 +133,7 @@ class ConversationWidget : public QWidget {
     QScrollBar* bar_;
     RingTurner rings_;
     QTimer flingTimer_;
+    QTimer holdTimer_;
     QTimer motionTimer_;
     QTimer restTimer_;
     /// Where the way to the newest turn began; none: nothing scrolls by itself.

@@ -21,6 +21,8 @@ constexpr int kAboveField = 10;
 constexpr int kFieldToStatus = 8;
 constexpr int kBelowStatus = 11;
 constexpr double kMillisecondsASecond = 1000.0;
+/// A lower window has no status line.
+constexpr int kLowestWithStatus = 240;
 
 }  // namespace
 
@@ -42,7 +44,7 @@ ConversationWindow::ConversationWindow(host::Host& host)
     pages_->setBelow([this](bool isSeen) {
         for (QWidget* part : std::initializer_list<QWidget*>{conversation_, field_, status_}) {
             if (part != nullptr) {
-                part->setVisible(isSeen);
+                part->setVisible(isSeen && (part != status_ || !isVeryLow()));
             }
         }
         if (greeting_ != nullptr) {
@@ -52,7 +54,9 @@ ConversationWindow::ConversationWindow(host::Host& host)
             greet(live_->status());
         }
     });
+    notice_ = new Notice(this);
     conversation_->setPaletteChanged([this] { choosePalette(); });
+    host_.setRemaking([this] { pages_->letGo(); });
     host_.setRemade([this] { remade(); });
     sight_.setChanged([this] { sightChanged(); });
     choosePalette();
@@ -61,6 +65,10 @@ ConversationWindow::ConversationWindow(host::Host& host)
 ConversationWindow::~ConversationWindow() {
     conversation_->setPaletteChanged(nullptr);
     host_.setRemade(nullptr);
+    host_.setRemaking(nullptr);
+    if (links_) {
+        host_.delegate().open = nullptr;
+    }
     if (desktop_ != nullptr) {
         desktop_->setChanged(nullptr);
     }
@@ -72,7 +80,8 @@ ConversationWindow::~ConversationWindow() {
 
 void ConversationWindow::addField() {
     live_ = host::LiveConversation::make(host_);
-    field_ = new AskField(fieldTexts(), this);
+    field_ = new AskField({host_.text("ASK_FIELD"), host_.text("ASK_SEND")}, this);
+    field_->edit().setMenuTexts(menuTexts());
     field_->setAsked([this](const std::string& question) { live_->ask(question); });
     field_->edit().installEventFilter(this);
     status_ = new StatusLine(this);
@@ -99,7 +108,15 @@ void ConversationWindow::addField() {
 }
 
 AskField::Texts ConversationWindow::fieldTexts() const {
-    return {host_.text("ASK_FIELD"), host_.text("ASK_SEND")};
+    // Where there is no room for a status line, an empty field says what it would say.
+    const bool isWaiting = isVeryLow() && !field_->edit().hasFocus();
+    const std::string status = isWaiting ? live_->status().words : "";
+    return {status.empty() ? host_.text("ASK_FIELD") : status, host_.text("ASK_SEND"), host_.text("ASK_FIELD")};
+}
+
+QuestionEdit::MenuTexts ConversationWindow::menuTexts() const {
+    const auto text = [this](const char* key) { return QString::fromStdString(host_.text(key)); };
+    return {text("MENU_CUT"), text("MENU_COPY"), text("MENU_PASTE"), text("MENU_SELECT_ALL")};
 }
 
 void ConversationWindow::remade() {
@@ -107,6 +124,7 @@ void ConversationWindow::remade() {
     conversation_->remade();
     if (field_ != nullptr) {
         field_->setTexts(fieldTexts());
+        field_->edit().setMenuTexts(menuTexts());
         field_->refreshFont();
         status_->refreshFont();
         showStatus();
@@ -174,7 +192,8 @@ void ConversationWindow::showStatus() {
         }
     }
     greet(now);
-    if (!status_->isPlaced()) {
+    field_->setTexts(fieldTexts());
+    if (!isVeryLow() && !status_->isPlaced()) {
         place();
     }
     // A line that nobody sees is written when somebody does.
@@ -211,6 +230,7 @@ void ConversationWindow::chooseMotion() {
     conversation_->setReducedMotion(isReduced);
     pages_->setMotion(isReduced ? host::MotionStyle::Reduced : host::MotionStyle::Full);
     pages_->setLook({&conversation_->colors(), isReduced});
+    notice_->setLook({&conversation_->colors(), isReduced});
 }
 
 int ConversationWindow::fieldWidth() const {
@@ -219,13 +239,22 @@ int ConversationWindow::fieldWidth() const {
 }
 
 int ConversationWindow::barHeight() const {
-    return field_ == nullptr ? 0
-                             : kAboveField + AskField::shapeHeight() + kFieldToStatus +
-                                   status_->heightForWidth(fieldWidth()) + kBelowStatus;
+    if (field_ == nullptr) {
+        return 0;
+    }
+    const int status = isVeryLow() ? 0 : kFieldToStatus + status_->heightForWidth(fieldWidth());
+    return kAboveField + AskField::shapeHeight() + status + kBelowStatus;
+}
+
+bool ConversationWindow::isVeryLow() const {
+    return height() < kLowestWithStatus;
 }
 
 void ConversationWindow::resizeEvent(QResizeEvent*) {
     place();
+    if (field_ != nullptr) {
+        showStatus();
+    }
 }
 
 void ConversationWindow::place() {
@@ -235,6 +264,7 @@ void ConversationWindow::place() {
     if (greeting_ != nullptr) {
         greeting_->setGeometry(conversation_->geometry());
     }
+    notice_->place(pages_->isOpen() ? 0 : bar);
     if (field_ == nullptr) {
         return;
     }
@@ -248,6 +278,7 @@ void ConversationWindow::place() {
     const int fieldHeight = AskField::shapeHeight();
     field_->setGeometry(x - kAround, y - kAround, across + 2 * kAround, fieldHeight + 2 * kAround);
     status_->place({x, y + fieldHeight + kFieldToStatus, across, status_->heightForWidth(across)});
+    status_->setVisible(!isVeryLow() && !conversation_->isHidden());
     field_->raise();
 }
 
@@ -335,6 +366,11 @@ bool ConversationWindow::changeTextSize(const QKeyEvent& key) {
 }
 
 bool ConversationWindow::eventFilter(QObject* object, QEvent* event) {
+    if (event->type() == QEvent::FocusIn || event->type() == QEvent::FocusOut) {
+        // After it has the focus, or has it no more.
+        QMetaObject::invokeMethod(
+            this, [this] { field_->setTexts(fieldTexts()); }, Qt::QueuedConnection);
+    }
     if (event->type() == QEvent::KeyPress) {
         // Keys that mean nothing in a field of one line scroll the conversation.
         auto* key = static_cast<QKeyEvent*>(event);

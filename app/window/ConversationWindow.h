@@ -9,6 +9,8 @@
 #include "app/window/CaretRest.h"
 #include "app/window/ConversationWidget.h"
 #include "app/window/Greeting.h"
+#include "app/window/LinkOpener.h"
+#include "app/window/Notice.h"
 #include "app/window/PlainWidget.h"
 #include "app/window/StatusLine.h"
 #include "app/window/WindowSight.h"
@@ -31,6 +33,12 @@ class ConversationWindow : public PlainWidget {
     /// Where the window is live: shows the scenarios and asks the questions once the account is read.
     void start(const std::vector<host::Scenario>& scenarios, const std::vector<std::string>& questions);
 
+    /// Links lead to pages of this window from now on, or to the desktop, whose opener outlives the window.
+    void openLinks(linux_::DesktopOpener& desktop);
+    /// A link that somebody sent; nothing before `openLinks`.
+    void open(const std::string& url, host::LinkPolicy::From from);
+    Notice& notice() const { return *notice_; }
+
     ConversationWidget& conversation() const { return *conversation_; }
     /// None where nothing is live.
     AskField* field() const { return field_; }
@@ -46,6 +54,10 @@ class ConversationWindow : public PlainWidget {
 
   private:
     void addField();
+    void showFriend(const host::KnownFriends::Known& known, FriendPage::Asks asks);
+    void showSelf();
+    void showFriends();
+    void say(const std::string& sentence);
     void choosePalette();
     void chooseMotion();
     /// Shows the greeting while nothing was asked in this window.
@@ -60,6 +72,8 @@ class ConversationWindow : public PlainWidget {
     /// Puts conversation, field and status line where they belong.
     void place();
     AskField::Texts fieldTexts() const;
+    QuestionEdit::MenuTexts menuTexts() const;
+    bool isVeryLow() const;
     int barHeight() const;
     int fieldWidth() const;
     void desktopChanged();
@@ -75,6 +89,8 @@ class ConversationWindow : public PlainWidget {
     PageStack* pages_;
     /// None where nothing is live, and once something was asked.
     Greeting* greeting_ = nullptr;
+    Notice* notice_;
+    std::unique_ptr<LinkOpener> links_;
     QTimer statusTimer_;
     /// What the status said last: a page that was answered is not shown again before the answer counts.
     bool wantsSignIn_ = false;

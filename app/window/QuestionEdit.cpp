@@ -1,10 +1,15 @@
 #include "app/window/QuestionEdit.h"
 
+#include <QClipboard>
+#include <QContextMenuEvent>
 #include <QEvent>
 #include <QFocusEvent>
 #include <QFontMetricsF>
+#include <QGestureEvent>
 #include <QGuiApplication>
 #include <QInputMethodEvent>
+#include <QMenu>
+#include <QMimeData>
 #include <QPainter>
 #include <QProxyStyle>
 #include <QStyleHints>
@@ -32,6 +37,7 @@ QuestionEdit::QuestionEdit(QWidget* parent) : QLineEdit(parent), style_(std::mak
     setFrame(false);
     setTextMargins(0, 0, 0, 0);
     alignToStart();
+    grabGesture(Qt::TapAndHoldGesture);
     connect(&blink_, &QTimer::timeout, this, [this] {
         caretShown_ = !caretShown_;
         update(caret());
@@ -114,6 +120,39 @@ QFont QuestionEdit::hintFont() const {
         small.setPixelSize(small.pixelSize() - 1);
     }
     return small;
+}
+
+bool QuestionEdit::event(QEvent* event) {
+    if (event->type() == QEvent::Gesture) {
+        auto* gestures = static_cast<QGestureEvent*>(event);
+        if (const QGesture* hold = gestures->gesture(Qt::TapAndHoldGesture);
+            hold != nullptr && hold->state() == Qt::GestureFinished) {
+            showMenu(static_cast<const QTapAndHoldGesture*>(hold)->position().toPoint());
+        }
+        return true;
+    }
+    return QLineEdit::event(event);
+}
+
+void QuestionEdit::contextMenuEvent(QContextMenuEvent* event) {
+    showMenu(event->globalPos());
+}
+
+/// The toolkit's own menu is in the toolkit's language.
+void QuestionEdit::showMenu(QPoint at) {
+    auto* menu = new QMenu(this);
+    menu->setAttribute(Qt::WA_DeleteOnClose);
+    const auto add = [&](const QString& words, bool isPossible, auto done) {
+        QAction* action = menu->addAction(words);
+        action->setEnabled(isPossible);
+        connect(action, &QAction::triggered, this, done);
+    };
+    const QMimeData* there = QGuiApplication::clipboard()->mimeData();
+    add(menuTexts_.cut, hasSelectedText(), &QLineEdit::cut);
+    add(menuTexts_.copy, hasSelectedText(), &QLineEdit::copy);
+    add(menuTexts_.paste, there != nullptr && there->hasText(), &QLineEdit::paste);
+    add(menuTexts_.selectAll, !text().isEmpty(), &QLineEdit::selectAll);
+    menu->popup(at);
 }
 
 void QuestionEdit::inputMethodEvent(QInputMethodEvent* event) {

@@ -2,6 +2,8 @@
 
 #include <QLineEdit>
 #include <QTimer>
+#include <memory>
+#include <utility>
 
 #include "linux/paint/Palette.h"
 
@@ -15,6 +17,11 @@ class QuestionEdit : public QLineEdit {
     ~QuestionEdit() override;
 
     void setColors(const linux_::Palette& palette);
+    /// Of its menu.
+    struct MenuTexts {
+        QString cut, copy, paste, selectAll;
+    };
+    void setMenuTexts(MenuTexts texts) { menuTexts_ = std::move(texts); }
     /// What the placeholder is written in: small enough for all of it.
     QFont hintFont() const;
 
@@ -24,15 +31,19 @@ class QuestionEdit : public QLineEdit {
     void focusOutEvent(QFocusEvent* event) override;
     void changeEvent(QEvent* event) override;
     void inputMethodEvent(QInputMethodEvent* event) override;
+    void contextMenuEvent(QContextMenuEvent* event) override;
+    bool event(QEvent* event) override;
 
   private:
     class CaretlessStyle;
 
+    void showMenu(QPoint at);
     void showCaret();
     void alignToStart();
     QRect caret() const;
 
     std::unique_ptr<CaretlessStyle> style_;
+    MenuTexts menuTexts_;
     QTimer blink_;
     bool caretShown_ = false;
     bool composing_ = false;

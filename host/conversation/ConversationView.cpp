@@ -34,6 +34,7 @@ void ConversationView::removeTurn(const std::shared_ptr<TurnView>& turn) {
 
 double ConversationView::layOut(double width) {
     for (const auto& turn : turns_) {
+        turn->setShowsTime(showsTimes_);
         turn->layOut(width, turn == turns_.front());
     }
     stack(width);

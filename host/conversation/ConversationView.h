@@ -22,6 +22,8 @@ class ConversationView : public platform::View {
     /// Lays everything out for a width and takes the height that it needs, which is returned; points.
     double layOut(double width);
 
+    /// Whether a narrow conversation has room for its times; laid out with the next width.
+    void setShowsTimes(bool shows) { showsTimes_ = shows; }
     /// What may move from now on; no turn does, until this is called. Pins and maps do not glide in reduced motion.
     void setMotionStyle(MotionStyle style);
     MotionStyle motionStyle() const { return style_; }
@@ -42,6 +44,7 @@ class ConversationView : public platform::View {
 
     MotionStyle style_ = MotionStyle::None;
     bool moves_ = false;
+    bool showsTimes_ = true;
     std::vector<std::shared_ptr<TurnView>> turns_;
     std::optional<platform::Color> softColor_;
     /// Painting keeps what it blurred.

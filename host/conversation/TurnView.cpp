@@ -111,8 +111,13 @@ void TurnView::setController(const std::shared_ptr<HostSnippetViewController>& c
     card_->setHidden(false);
 }
 
-double TurnView::sentenceHeight(double width) const {
-    return wrappedSize(sentence_->text(), sentence_->font(), width).size.height;
+Size TurnView::sentenceSize(double width) const {
+    const WrappedSize widest = wrappedSize(sentence_->text(), sentence_->font(), width);
+    if (widest.lines != 2 && widest.lines != 3) {
+        return {width, widest.size.height};
+    }
+    const double balanced = balancedWidth(sentence_->text(), sentence_->font(), width);
+    return {balanced, wrappedSize(sentence_->text(), sentence_->font(), balanced).size.height};
 }
 
 double TurnView::layOut(double width, bool first) {
@@ -206,11 +211,12 @@ void TurnView::draw(Canvas& canvas) const {
 
 double TurnView::layOutNarrowSpeech(double width, bool first) {
     double y = 0.0;
-    time_->setHidden(!first || texts_.longTime.empty());
+    const std::string& time = first ? texts_.longTime : texts_.shortTime;
+    time_->setHidden(!showsTime_ || time.empty());
     if (!time_->hidden()) {
-        time_->setText(texts_.longTime);
+        time_->setText(time);
         time_->setTextAlignment(TextAlignment::Center);
-        y += measures::kTimeAbove;
+        y += first ? measures::kTimeAbove : measures::kCardToQuestion;
         place(*time_, {measures::kGutter, y, width - 2.0 * measures::kGutter, time_->font().lineHeight()}, width);
         y += time_->font().lineHeight() + measures::kTimeBelow;
     } else {
@@ -224,11 +230,11 @@ double TurnView::layOutNarrowSpeech(double width, bool first) {
     }
     if (!sentence_->hidden()) {
         const double room = width - 2.0 * measures::kSentenceStart;
-        const double height = sentenceHeight(room);
+        const Size size = sentenceSize(room);
         sentence_->setTextAlignment(TextAlignment::Natural);
-        places_.sentence = {measures::kSentenceStart, y, room, height};
+        places_.sentence = {measures::kSentenceStart, y, size.width, size.height};
         places_.sentenceParent = width;
-        y += height + measures::kSentenceToCard;
+        y += size.height + measures::kSentenceToCard;
     }
     return y;
 }
@@ -251,11 +257,11 @@ double TurnView::layOutWideSpeech() {
         y += size.height + measures::kQuestionToSentence;
     }
     if (!sentence_->hidden()) {
-        const double height = sentenceHeight(kTextWidth);
+        const Size size = sentenceSize(kTextWidth);
         sentence_->setTextAlignment(endAlignment());
-        places_.sentence = {0.0, y, kTextWidth, height};
+        places_.sentence = {kTextWidth - size.width, y, size.width, size.height};
         places_.sentenceParent = kColumn;
-        y += height + measures::kSentenceToTime;
+        y += size.height + measures::kSentenceToTime;
     }
     time_->setHidden(texts_.shortTime.empty());
     if (!time_->hidden()) {

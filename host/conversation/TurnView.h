@@ -46,11 +46,13 @@ class TurnView : public platform::View {
         return texts_.question.empty() ? texts_.sentence : texts_.question;
     }
 
-    /// Lays the turn out in a conversation of this width; its height, points. Only the first turn of a narrow
-    /// conversation shows its time, above. A card that was laid out before grows or shrinks to its new height where
+    /// Lays the turn out in a conversation of this width; its height, points. In a narrow conversation the time stands
+    /// above, of the first turn with its day. A card that was laid out before grows or shrinks to its new height where
     /// everything may move; the height is the one of the moment.
     double layOut(double width, bool first);
 
+    /// Not in a window that has no room for it.
+    void setShowsTime(bool shows) { showsTime_ = shows; }
     void setMotionStyle(MotionStyle style) { style_ = style; }
     /// The turn comes now, or its answer does. Seconds.
     void arrive(double now);
@@ -78,7 +80,7 @@ class TurnView : public platform::View {
     /// The heights of what is said: the time, the question and the sentence.
     double layOutNarrowSpeech(double width, bool first);
     double layOutWideSpeech();
-    double sentenceHeight(double width) const;
+    platform::Size sentenceSize(double width) const;
 
     /// Where things stand once nothing moves, not mirrored.
     struct Places {
@@ -92,6 +94,7 @@ class TurnView : public platform::View {
     TurnTexts texts_;
     Places places_;
     double height_ = 0.0;
+    bool showsTime_ = true;
     MotionStyle style_ = MotionStyle::None;
     double now_ = 0.0;
     Motion arrival_{1.0};

@@ -48,9 +48,22 @@ std::vector<std::string> handlesOf(const VAKtrLocation& location) {
     return handles;
 }
 
+/// An answer's context without what it says of the answer as a whole: that there are more friends than it shows.
 std::optional<Url> contextOf(const std::shared_ptr<AssistantObject>& snippet) {
     const auto answer = std::dynamic_pointer_cast<VASnippet>(snippet);
-    return answer ? answer->searchContext : std::nullopt;
+    if (!answer || !answer->searchContext) {
+        return std::nullopt;
+    }
+    const std::string& text = answer->searchContext->text();
+    const auto query = text.find('?');
+    std::string kept = text.substr(0, query);
+    for (auto start = query; start != std::string::npos;) {
+        const auto end = text.find('&', start + 1);
+        const std::string part = text.substr(start, end == std::string::npos ? end : end - start);
+        kept += part.compare(1, 11, "incomplete=") == 0 ? part.substr(0, part[0] == '?' ? 1 : 0) : part;
+        start = end;
+    }
+    return Url(kept);
 }
 
 LocationList friendsIn(const std::shared_ptr<AssistantObject>& snippet) {

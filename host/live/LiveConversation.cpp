@@ -5,6 +5,7 @@
 
 #include "host/conversation/CutText.h"
 #include "host/scenario/ScenarioReader.h"
+#include "platform/assistant/VASnippet.h"
 #include "platform/base/Clock.h"
 #include "platform/base/MainLoop.h"
 
@@ -83,22 +84,29 @@ void LiveConversation::ask(const std::string& text) {
     }
     ++asking_;
     askedAt_ = now();
-    waiting_.emplace_back(turn, question);
+    waiting_.push_back({turn, question, nullptr});
     sendNext();
     tellChanged();
+}
+
+void LiveConversation::wishToBeSeen(std::optional<bool> isSeen, std::function<void(std::optional<bool>)> said) {
+    // The assistant's own words for it (docs/service-protocol.md).
+    const char* const words = !isSeen ? "Am I hidden?" : *isSeen ? "Share my location" : "Hide my location";
+    waiting_.push_back({{}, words, std::move(said)});
+    sendNext();
 }
 
 void LiveConversation::sendNext() {
     if (!ready_ || underWay_ || waiting_.empty()) {
         return;
     }
-    const auto [turn, question] = std::move(waiting_.front());
+    const Waiting asked = std::move(waiting_.front());
     waiting_.pop_front();
     underWay_ = true;
     if (host_.isRestricted()) {
         Scenario refusal;
         refusal.sentence = LocalizedText(host_.text("ANSWER_RESTRICTED"));
-        host_.platform()->mainLoop->post([weak = weak_from_this(), asked = turn, refusal] {
+        host_.platform()->mainLoop->post([weak = weak_from_this(), asked, refusal] {
             if (const auto self = weak.lock()) {
                 self->receive(asked, refusal);
             }
@@ -109,7 +117,7 @@ void LiveConversation::sendNext() {
     host_.endSharing();
     // The assistant's client ends before the loop does, and what it posts after this has gone does nothing.
     platform::MainLoop* const mainLoop = host_.platform()->mainLoop.get();
-    host_.live()->assistant().ask(question, [weak = weak_from_this(), mainLoop, asked = turn](auto answer) {
+    host_.live()->assistant().ask(asked.question, [weak = weak_from_this(), mainLoop, asked](auto answer) {
         mainLoop->post([weak, asked, answer = std::move(answer)] {
             if (const auto self = weak.lock()) {
                 self->receive(asked, self->read(answer));
@@ -118,12 +126,24 @@ void LiveConversation::sendNext() {
     });
 }
 
-void LiveConversation::receive(const std::weak_ptr<TurnView>& weakTurn, const Scenario& answer) {
+void LiveConversation::receiveWish(const Waiting& asked, const Scenario& answer) {
+    underWay_ = false;
+    const auto sharing = std::dynamic_pointer_cast<platform::VAKtrVisibilityView>(answer.snippet);
+    asked.said(sharing ? std::optional(sharing->visible) : std::nullopt);
+    sendNext();
+    tellChanged();
+}
+
+void LiveConversation::receive(const Waiting& asked, const Scenario& answer) {
+    if (asked.said) {
+        receiveWish(asked, answer);
+        return;
+    }
     underWay_ = false;
     if (--asking_ == 0) {
         askedAt_.reset();
     }
-    if (const auto turn = weakTurn.lock()) {
+    if (const auto turn = asked.turn.lock()) {
         host_.answer(*turn, answer);
         if (!turn->card()->hidden()) {
             shown(true);

@@ -36,6 +36,10 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
     /// Blanks at both ends do not count; a question of nothing else is none.
     void ask(const std::string& question);
 
+    /// Says to the assistant that friends shall see the user, or shall not, or with none asks how it is: one request,
+    /// in its turn among the questions. `said` hears once how it is then; none where nobody said.
+    void wishToBeSeen(std::optional<bool> isSeen, std::function<void(std::optional<bool>)> said);
+
     LiveStatus status() const;
     /// After how many seconds that may be another although nothing happens. None: never.
     std::optional<double> statusChangesIn() const;
@@ -48,11 +52,17 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
 
   private:
     LiveStatus::Facts facts() const;
+    struct Waiting {
+        std::weak_ptr<TurnView> turn;  ///< of a question; a wish has none
+        std::string question;
+        std::function<void(std::optional<bool>)> said;  ///< of a wish
+    };
     explicit LiveConversation(Host& host) : host_(host) {}
     void accountRead();
     /// Sends the question that waits longest, unless one is under way.
     void sendNext();
-    void receive(const std::weak_ptr<TurnView>& turn, const Scenario& answer);
+    void receive(const Waiting& asked, const Scenario& answer);
+    void receiveWish(const Waiting& asked, const Scenario& answer);
     /// What to show for an answer; sets `failure_`.
     Scenario read(const linux_::AssistantClient::Answer& answer);
     /// Something has come on screen: an answer of the assistant's, or a scenario.
@@ -65,7 +75,7 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
     bool ready_ = false;
     /// In the order they were asked. One at a time is sent: a question may be a wish, such as to hide, and the last one
     /// has to be honoured last.
-    std::deque<std::pair<std::weak_ptr<TurnView>, std::string>> waiting_;
+    std::deque<Waiting> waiting_;
     bool underWay_ = false;
     std::vector<Scenario> scenarios_;
     int asking_ = 0;  ///< under way, or waiting

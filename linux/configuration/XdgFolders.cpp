@@ -38,6 +38,10 @@ std::filesystem::path XdgFolders::cache() {
     return folder("XDG_CACHE_HOME", ".cache");
 }
 
+std::filesystem::path XdgFolders::data() {
+    return folder("XDG_DATA_HOME", ".local/share");
+}
+
 std::filesystem::path XdgFolders::configurationFile() {
     const char* path = std::getenv("KTR_CONFIG");
     return path != nullptr && *path != '\0' ? std::filesystem::path(path) : config() / "config.json";

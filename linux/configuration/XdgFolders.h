@@ -14,6 +14,8 @@ class XdgFolders {
     static std::filesystem::path state();
     /// $XDG_CACHE_HOME/ktr, else ~/.cache/ktr.
     static std::filesystem::path cache();
+    /// $XDG_DATA_HOME/ktr, else ~/.local/share/ktr.
+    static std::filesystem::path data();
     /// KTR_CONFIG when it is set, else config.json in the configuration folder.
     static std::filesystem::path configurationFile();
 };

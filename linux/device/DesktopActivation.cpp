@@ -64,8 +64,12 @@ bool DesktopActivation::handOver(const QString& busAddress, const std::string& u
         const QDBusConnection bus = QDBusConnection::connectToBus(busAddress, name);
         if (bus.isConnected()) {
             QDBusMessage open =
-                QDBusMessage::createMethodCall(QString::fromLatin1(kName), kPath, kInterface, QStringLiteral("Open"));
-            open << QStringList{QString::fromStdString(url)} << QVariantMap();
+                QDBusMessage::createMethodCall(QString::fromLatin1(kName), kPath, kInterface,
+                                               url.empty() ? QStringLiteral("Activate") : QStringLiteral("Open"));
+            if (!url.empty()) {
+                open << QStringList{QString::fromStdString(url)};
+            }
+            open << QVariantMap();
             open.setAutoStartService(false);
             taken = bus.call(open, QDBus::Block, kLongestHandOver).type() == QDBusMessage::ReplyMessage;
         }

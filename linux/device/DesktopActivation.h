@@ -28,8 +28,8 @@ class DesktopActivation : public QDBusVirtualObject {
     DesktopActivation(const QString& busAddress, Handlers handlers);
     ~DesktopActivation() override;
 
-    /// Gives a URL to the window that is there; false when there is none, or it does not answer in time. It waits for
-    /// two seconds at most: before anything is on screen.
+    /// Gives a URL to the window that is there, or with an empty one has it come to the front; false when there is
+    /// none, or it does not answer in time. It waits for two seconds at most: before anything is on screen.
     static bool handOver(const QString& busAddress, const std::string& url);
 
     QString introspect(const QString& path) const override;

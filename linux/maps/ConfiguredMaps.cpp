@@ -2,6 +2,7 @@
 
 #include "linux/configuration/XdgFolders.h"
 #include "linux/maps/AttributedGround.h"
+#include "linux/maps/FolderGround.h"
 #include "linux/maps/HttpsPictures.h"
 #include "linux/maps/MainlandArea.h"
 #include "linux/maps/MbtilesPictures.h"
@@ -62,6 +63,7 @@ ThreadedMapSource::Grounds ConfiguredMaps::grounds(const Configuration& configur
     for (const Configuration::Maps::Source& source : configuration.maps.sources) {
         addSource(grounds, source, configuration, network);
     }
+    grounds.push_back(std::make_shared<FolderGround>(XdgFolders::data() / "maps"));
     grounds.push_back(std::make_shared<WorldGround>(folder / "world.bin"));
     return grounds;
 }

@@ -9,8 +9,8 @@
 
 namespace ktr::linux_ {
 
-/// The maps that the configuration names, and behind them the built-in world, which draws whatever they leave. Main
-/// thread.
+/// The maps that the configuration names, behind them those that were added, and behind these the built-in world, which
+/// draws whatever they leave. Main thread.
 class ConfiguredMaps {
   public:
     /// `resourceFolder`: where "maps" with the built-in data stands. Pictures are fetched on `network`; none: each

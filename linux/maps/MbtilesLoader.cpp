@@ -26,4 +26,17 @@ std::shared_ptr<tiles::MbtilesFile> MbtilesLoader::open(const std::string& path,
     return loaded.open(path, file, error) ? file : nullptr;
 }
 
+std::string MbtilesLoader::index(const std::string& from, const std::string& to, bool& isCopied) {
+    std::string error;
+    const auto entry =
+        reinterpret_cast<MbtilesKeepEntry>(LoadableModule::entry("libktr-mbtiles.so", kMbtilesKeepEntry, error));
+    if (entry != nullptr && error.empty()) {
+        error = objection(from);
+    }
+    if (entry != nullptr && error.empty()) {
+        entry(from, to, isCopied, error);
+    }
+    return error;
+}
+
 }  // namespace ktr::linux_

@@ -289,7 +289,9 @@ ThreadedMapSource::~ThreadedMapSource() {
 }
 
 int ThreadedMapSource::requestPicture(const platform::MapPictureRequest& request, Completion completion) {
-    return core_->add(request, std::move(completion));
+    platform::MapPictureRequest dense = request;
+    dense.scale *= density_;
+    return core_->add(dense, std::move(completion));
 }
 
 void ThreadedMapSource::cancel(int request) {

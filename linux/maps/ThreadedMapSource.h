@@ -28,6 +28,9 @@ class ThreadedMapSource final : public platform::MapPictureSource {
         return gcj02_ && gcj02_->contains(coordinate);
     }
 
+    /// Pictures have so many times the pixels a point that they are asked for: where they are not shown on a screen,
+    /// but printed or enlarged.
+    void setDensity(double density) { density_ = density; }
     /// Draws from these from now on, and tells the observers. Drawings under way are made anew.
     void setGrounds(Grounds grounds);
 
@@ -35,6 +38,7 @@ class ThreadedMapSource final : public platform::MapPictureSource {
     class Core;
     std::shared_ptr<Core> core_;
     std::shared_ptr<const MainlandArea> gcj02_;
+    double density_ = 1.0;
 };
 
 }  // namespace ktr::linux_

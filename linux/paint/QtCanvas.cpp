@@ -121,8 +121,52 @@ void QtCanvas::clip(const platform::Rect& rect) {
     painter_.setClipRect(snapped(rect), Qt::IntersectClip);
 }
 
+bool QtCanvas::cutsItself() const {
+    const auto* engine = painter_.paintEngine();
+    return engine != nullptr && engine->type() == QPaintEngine::SVG && painter_.hasClipping();
+}
+
+void QtCanvas::fillCut(const QPainterPath& path, const QColor& color) {
+    painter_.fillPath(path.intersected(painter_.clipPath()), color);
+}
+
+/// As pixels, those outside the clip left out.
+void QtCanvas::drawCut(const QtImage& picture, const QRectF& rect) {
+    const QPainterPath clip = painter_.clipPath();
+    if (clip.contains(rect)) {
+        picture.draw(painter_, rect, palette_);
+        return;
+    }
+    constexpr double kPixels = 3.0;  // a point
+    constexpr double kMost = 8192.0;
+    const double scale = std::min(kPixels, kMost / std::max({rect.width(), rect.height(), 1.0}));
+    QImage pixels((rect.size() * scale).toSize().expandedTo({1, 1}), QImage::Format_ARGB32_Premultiplied);
+    if (pixels.isNull()) {
+        return;
+    }
+    pixels.fill(Qt::transparent);
+    QPainter painter(&pixels);
+    painter.setRenderHints(painter_.renderHints());
+    painter.scale(pixels.width() / rect.width(), pixels.height() / rect.height());
+    painter.translate(-rect.topLeft());
+    // Masked rather than clipped: a clip has no smooth edge.
+    picture.draw(painter, rect, palette_);
+    QPainterPath outside;
+    outside.addRect(rect);
+    painter.setCompositionMode(QPainter::CompositionMode_DestinationOut);
+    painter.fillPath(outside.subtracted(clip), Qt::black);
+    painter.end();
+    painter_.drawImage(rect, pixels);
+}
+
 void QtCanvas::fill(const platform::Rect& rect, const platform::Color& color) {
     if (color.isClear() || rect.width <= 0.0 || rect.height <= 0.0) {
+        return;
+    }
+    if (cutsItself()) {
+        QPainterPath path;
+        path.addRect(snapped(rect));
+        fillCut(path, palette_.resolve(color));
         return;
     }
     // The rectangle stands on whole pixels: smoothing its edges could only blur them by a rounding error.
@@ -177,7 +221,11 @@ void QtCanvas::draw(const platform::Image& image, const platform::Rect& rect) {
         return;
     }
     if (const auto* picture = dynamic_cast<const QtImage*>(&image); picture != nullptr && rect.width > 0.0) {
-        picture->draw(painter_, snapped(rect), palette_);
+        if (cutsItself()) {
+            drawCut(*picture, snapped(rect));
+        } else {
+            picture->draw(painter_, snapped(rect), palette_);
+        }
     }
 }
 
@@ -218,7 +266,12 @@ QPainterPath toQt(const platform::Path& path) {
 }  // namespace
 
 void QtCanvas::fill(const platform::Path& path, const platform::Color& color) {
-    if (!color.isClear() && !path.empty()) {
+    if (color.isClear() || path.empty()) {
+        return;
+    }
+    if (cutsItself()) {
+        fillCut(toQt(path), palette_.resolve(color));
+    } else {
         painter_.fillPath(toQt(path), palette_.resolve(color));
     }
 }

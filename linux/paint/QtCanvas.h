@@ -10,9 +10,11 @@
 #include "platform/ui/Canvas.h"
 
 class QPainter;
+class QPainterPath;
 
 namespace ktr::linux_ {
 
+class QtImage;
 class QtTextLayout;
 
 /// Paints views with a QPainter whose coordinates are points (its transformation, or its device's pixel ratio, makes
@@ -57,6 +59,10 @@ class QtCanvas final : public platform::Canvas {
     };
     Grid grid() const;
     void drawText(const platform::TextImage& image, const platform::Rect& rect);
+    /// SVG files are written without clips: what is cut is cut before it is written.
+    bool cutsItself() const;
+    void fillCut(const QPainterPath& path, const QColor& color);
+    void drawCut(const QtImage& picture, const QRectF& rect);
     /// A text's origin, moved so that its first baseline stands on a whole pixel.
     QPointF onBaseline(const QtTextLayout& text, platform::Point origin) const;
     void savePainter();

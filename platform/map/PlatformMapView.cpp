@@ -12,6 +12,7 @@
 #include "platform/map/MapBackdrop.h"
 #include "platform/map/MapChromeView.h"
 #include "platform/map/MapLocationManager.h"
+#include "platform/map/MapPlacelessView.h"
 #include "platform/map/Mercator.h"
 #include "platform/ui/Appearance.h"
 #include "platform/ui/Canvas.h"
@@ -34,6 +35,11 @@ Rect onGrid(const Rect& rect) {
     const double top = std::floor(rect.y / kClearGrid) * kClearGrid;
     return {left, top, std::ceil(rect.maxX() / kClearGrid) * kClearGrid - left,
             std::ceil(rect.maxY() / kClearGrid) * kClearGrid - top};
+}
+
+bool hasPlace(const std::vector<std::shared_ptr<MapAnnotation>>& annotations) {
+    return std::any_of(annotations.begin(), annotations.end(),
+                       [](const auto& annotation) { return annotation->hasKnownLocation(); });
 }
 
 /// On the way from one viewport to another: the scale changes evenly to the eye, and what is common to both stays put.
@@ -158,10 +164,23 @@ void PlatformMapView::updateNow() {
     }
     shown.insert(shown.end(), annotations_.begin(), annotations_.end());
     layer_->reconcile(shown);
+    showPlaceless();
     arrangeViews(shown);
     updateRenderers();
     updateViewport();
     requestGround();
+}
+
+void PlatformMapView::showPlaceless() {
+    hadPlace_ = hadPlace_ || hasPlace(annotations_);
+    const bool wanted = isPlaceless();
+    if (wanted && !placeless_) {
+        placeless_ = create<MapPlacelessView>(&MapPlacelessView::initWithFrame, bounds());
+        addSubview(placeless_);
+    } else if (!wanted && placeless_) {
+        placeless_->removeFromSuperview();
+        placeless_.reset();
+    }
 }
 
 /// The user behind the pins, these in their order, the corners in front.
@@ -172,6 +191,9 @@ void PlatformMapView::arrangeViews(const std::vector<std::shared_ptr<MapAnnotati
         wanted.push_back(layer_->viewFor(*annotation));
     }
     wanted.push_back(chrome_);
+    if (placeless_) {
+        wanted.push_back(placeless_);
+    }
     if (wanted != subviews()) {
         for (const auto& view : wanted) {
             bringSubviewToFront(view);
@@ -236,6 +258,10 @@ void PlatformMapView::setSurroundings(Surroundings surroundings) {
     }
 }
 
+bool PlatformMapView::isPlaceless() const {
+    return !held_ && !hasPlace(annotations_) && (hadPlace_ || !requested_);
+}
+
 MapViewport PlatformMapView::viewportAtRest() const {
     if (held_) {
         return {held_->centre, held_->zoom, bounds().size()};
@@ -295,6 +321,9 @@ Rect PlatformMapView::chromeFrame() const {
 }
 
 void PlatformMapView::placeChrome() {
+    if (placeless_) {
+        placeless_->setFrame(bounds());
+    }
     chrome_->setFrame(chromeFrame());
     MapViewport within = shown_;
     within.size = chrome_->bounds().size();
@@ -304,7 +333,7 @@ void PlatformMapView::placeChrome() {
 void PlatformMapView::requestGround() {
     const MapViewport target = viewportAtRest();
     const auto installed = Platform::installed();
-    if (!installed || !(target.size.width > 0.0) || !(target.size.height > 0.0)) {
+    if (isPlaceless() || !installed || !(target.size.width > 0.0) || !(target.size.height > 0.0)) {
         return;
     }
     MapPictureRequest request;

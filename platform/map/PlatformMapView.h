@@ -19,6 +19,7 @@ namespace ktr::platform {
 class MapAnnotationLayer;
 class MapChromeView;
 class MapBackdrop;
+class MapPlacelessView;
 class PlatformMapView;
 
 /// Chooses what a map draws. Main thread.
@@ -35,7 +36,8 @@ class KTR_API PlatformMapViewDelegate {
 
 /// A map. The ground comes as pictures from the installed source (`Platform::maps`), drawn elsewhere and asked for only
 /// when something has changed; over it the map draws overlays, the user, annotations, the scale and whose data it is.
-/// Before it is given a region it shows the world. Annotations and overlays take effect on the next turn of the main
+/// Without a region to show, or once the last annotation with a known place has gone, it is plain ground that says so.
+/// Annotations and overlays take effect on the next turn of the main
 /// loop, or at the next layout: what has left and come back by then has not moved. It takes no touches itself. Main
 /// thread.
 class KTR_API PlatformMapView : public View {
@@ -130,6 +132,9 @@ class KTR_API PlatformMapView : public View {
     void show(const MapViewport& viewport);
     void placeChrome();
     Rect chromeFrame() const;
+    /// There is no place to show.
+    bool isPlaceless() const;
+    void showPlaceless();
     void requestGround();
     void userMoved(const std::shared_ptr<PlatformLocation>& location);
 
@@ -155,6 +160,9 @@ class KTR_API PlatformMapView : public View {
     std::unique_ptr<MapBackdrop> backdrop_;
     std::unique_ptr<MapAnnotationLayer> layer_;
     std::shared_ptr<MapChromeView> chrome_;
+    std::shared_ptr<MapPlacelessView> placeless_;  ///< while it is seen
+    /// An annotation with a known place has been shown.
+    bool hadPlace_ = false;
     NotificationCenter::Token appearanceChanged_;
     bool updateIsPosted_ = false;
     bool overlaysChanged_ = false;

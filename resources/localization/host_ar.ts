@@ -572,6 +572,9 @@
         <source>WATCH_SOMEBODY_LEFT</source>
         <extracomment>A notification while the screen is locked: it says neither who nor where. English: “Somebody left”</extracomment>
         <translation>غادر أحدهم</translation>
+        <source>PAGE_BACK</source>
+        <extracomment>The way back from a page, spoken</extracomment>
+        <translation>رجوع</translation>
     </message>
 </context>
 </TS>

@@ -572,6 +572,9 @@
         <source>WATCH_SOMEBODY_LEFT</source>
         <extracomment>A notification while the screen is locked: it says neither who nor where. English: “Somebody left”</extracomment>
         <translation>Jemand ist aufgebrochen</translation>
+        <source>PAGE_BACK</source>
+        <extracomment>The way back from a page, spoken</extracomment>
+        <translation>Zurück</translation>
     </message>
 </context>
 </TS>

@@ -572,6 +572,9 @@
         <source>WATCH_SOMEBODY_LEFT</source>
         <extracomment>A notification while the screen is locked: it says neither who nor where. English: “Somebody left”</extracomment>
         <translation>Alguien se ha ido</translation>
+        <source>PAGE_BACK</source>
+        <extracomment>The way back from a page, spoken</extracomment>
+        <translation>Atrás</translation>
     </message>
 </context>
 </TS>

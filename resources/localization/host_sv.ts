@@ -572,6 +572,9 @@
         <source>WATCH_SOMEBODY_LEFT</source>
         <extracomment>A notification while the screen is locked: it says neither who nor where. English: “Somebody left”</extracomment>
         <translation>Någon har gått</translation>
+        <source>PAGE_BACK</source>
+        <extracomment>The way back from a page, spoken</extracomment>
+        <translation>Tillbaka</translation>
     </message>
 </context>
 </TS>

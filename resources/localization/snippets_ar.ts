@@ -126,12 +126,12 @@
     <message>
         <source>LEAVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
-        <translation>سيصلك إشعار عند مغادرة %@</translation>
+        <translation>إشعار عند مغادرة %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they reach %@”</extracomment>
-        <translation>سيصلك إشعار عند الوصول إلى %@</translation>
+        <translation>إشعار عند الوصول إلى %@</translation>
     </message>
     <message>
         <source>LEAVING_LABEL_ABSOLUTE</source>

@@ -121,17 +121,17 @@
     <message>
         <source>IMMEDIATE_LABEL</source>
         <extracomment>A promise about one friend, of any gender: the user is told at once where they are. English: “You’ll hear where they are now”</extracomment>
-        <translation>Du erfährst sofort den Standort</translation>
+        <translation>Du erfährst sofort den Ort</translation>
     </message>
     <message>
         <source>LEAVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
-        <translation>Nachricht beim Verlassen von „%@“</translation>
+        <translation>Meldung beim Aufbruch: %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they reach %@”</extracomment>
-        <translation>Nachricht bei Ankunft: %@</translation>
+        <translation>Meldung bei Ankunft: %@</translation>
     </message>
     <message>
         <source>LEAVING_LABEL_ABSOLUTE</source>

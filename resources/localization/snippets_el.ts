@@ -121,17 +121,17 @@
     <message>
         <source>IMMEDIATE_LABEL</source>
         <extracomment>A promise about one friend, of any gender: the user is told at once where they are. English: “You’ll hear where they are now”</extracomment>
-        <translation>Θα μάθετε αμέσως πού βρίσκεται</translation>
+        <translation>Θα μάθετε αμέσως πού είναι</translation>
     </message>
     <message>
         <source>LEAVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
-        <translation>Ειδοποίηση κατά την αναχώρηση: %@</translation>
+        <translation>Ειδοποίηση εξόδου: %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they reach %@”</extracomment>
-        <translation>Ειδοποίηση κατά την άφιξη: %@</translation>
+        <translation>Ειδοποίηση άφιξης: %@</translation>
     </message>
     <message>
         <source>LEAVING_LABEL_ABSOLUTE</source>

@@ -121,17 +121,17 @@
     <message>
         <source>IMMEDIATE_LABEL</source>
         <extracomment>A promise about one friend, of any gender: the user is told at once where they are. English: “You’ll hear where they are now”</extracomment>
-        <translation>همین حالا از مکان او باخبر می‌شوید</translation>
+        <translation>همین حالا باخبر می‌شوید</translation>
     </message>
     <message>
         <source>LEAVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
-        <translation>اعلان هنگام ترک این مکان: %@</translation>
+        <translation>اعلان هنگام ترک: %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they reach %@”</extracomment>
-        <translation>اعلان هنگام رسیدن به این مکان: %@</translation>
+        <translation>اعلان هنگام رسیدن: %@</translation>
     </message>
     <message>
         <source>LEAVING_LABEL_ABSOLUTE</source>

@@ -121,17 +121,17 @@
     <message>
         <source>IMMEDIATE_LABEL</source>
         <extracomment>A promise about one friend, of any gender: the user is told at once where they are. English: “You’ll hear where they are now”</extracomment>
-        <translation>Vous saurez tout de suite où est cette personne</translation>
+        <translation>Vous saurez aussitôt le lieu</translation>
     </message>
     <message>
         <source>LEAVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
-        <translation>Alerte au départ du lieu : %@</translation>
+        <translation>Alerte au départ : %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they reach %@”</extracomment>
-        <translation>Alerte à l’arrivée au lieu : %@</translation>
+        <translation>Alerte à l’arrivée : %@</translation>
     </message>
     <message>
         <source>LEAVING_LABEL_ABSOLUTE</source>

@@ -126,7 +126,7 @@
     <message>
         <source>LEAVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
-        <translation>Melding bij vertrek van deze plek: %@</translation>
+        <translation>Melding bij vertrek: %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>

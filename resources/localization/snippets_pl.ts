@@ -121,17 +121,17 @@
     <message>
         <source>IMMEDIATE_LABEL</source>
         <extracomment>A promise about one friend, of any gender: the user is told at once where they are. English: “You’ll hear where they are now”</extracomment>
-        <translation>Od razu dowiesz się, gdzie jest ta osoba</translation>
+        <translation>Miejsce poznasz od razu</translation>
     </message>
     <message>
         <source>LEAVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
-        <translation>Powiadomienie po opuszczeniu miejsca: %@</translation>
+        <translation>Wiadomość o wyjściu: %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they reach %@”</extracomment>
-        <translation>Powiadomienie po dotarciu do miejsca: %@</translation>
+        <translation>Wiadomość o dotarciu: %@</translation>
     </message>
     <message>
         <source>LEAVING_LABEL_ABSOLUTE</source>

@@ -121,7 +121,7 @@
     <message>
         <source>IMMEDIATE_LABEL</source>
         <extracomment>A promise about one friend, of any gender: the user is told at once where they are. English: “You’ll hear where they are now”</extracomment>
-        <translation>Nerede olduğunu hemen öğreneceksiniz</translation>
+        <translation>Yerini hemen öğreneceksiniz</translation>
     </message>
     <message>
         <source>LEAVING_LABEL</source>

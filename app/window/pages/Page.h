@@ -29,6 +29,9 @@ class Page : public Block {
         }
     }
 
+    /// Lets go of everything that is the installed platform's, which is about to go; `refresh` follows with another.
+    virtual void letGo() {}
+
     /// A page is as large as its window.
     int shapeHeight(int /*width*/) const override { return height(); }
     QAccessible::Role role() const override { return QAccessible::Grouping; }

@@ -59,6 +59,14 @@ void PageStack::focusOn(Page& page) {
     first->setFocus(Qt::OtherFocusReason);
 }
 
+void PageStack::letGo() {
+    // One that is going has nothing left to show.
+    finish();
+    for (const Open& open : open_) {
+        open.page->letGo();
+    }
+}
+
 void PageStack::back() {
     if (!open_.empty() && open_.back().page->canBeLeft() && !open_.back().page->stepBack()) {
         take(false);
@@ -146,6 +154,7 @@ void PageStack::finish() {
     page->setGraphicsEffect(nullptr);
     page->move(0, 0);
     if (isGoing_) {
+        page->letGo();
         page->hide();
         page->deleteLater();
         setVisible(isOpen());

@@ -28,6 +28,8 @@ class PageStack : public Block {
     void back();
     /// Leaves all pages, also one that cannot be left by itself.
     void closeAll();
+    /// The installed platform is about to go: all pages let go of it.
+    void letGo();
     bool isOpen() const { return !open_.empty(); }
     /// The newest page, or none.
     Page* current() const { return open_.empty() ? nullptr : open_.back().page; }

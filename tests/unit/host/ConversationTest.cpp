@@ -139,13 +139,26 @@ TEST_F(KTRConversationTest, Wide_BeginsAtNineHundred) {
     EXPECT_EQ(turn->card()->frameInRoot(), (Rect{380.0, 24.0, 480.0, 248.0}));
 }
 
+TEST_F(KTRConversationTest, AWindowWithoutRoomShowsNoTimes) {
+    const auto first = addTurn();
+    conversation->setShowsTimes(false);
+    conversation->layOut(400.0);
+    EXPECT_TRUE(first->subviews()[0]->subviews()[0]->hidden());
+    EXPECT_EQ(framesBelow(first->subviews()[0])[1].y, host::measures::kTimeAbove);
+    conversation->setShowsTimes(true);
+    conversation->layOut(400.0);
+    EXPECT_FALSE(first->subviews()[0]->subviews()[0]->hidden());
+}
+
 TEST_F(KTRConversationTest, Turns_FollowWithTheirGap) {
     const auto first = addTurn();
     const auto second = addTurn("and mara", "");
     conversation->layOut(400.0);
     const auto speech = framesBelow(second->subviews()[0]);
-    EXPECT_TRUE(second->subviews()[0]->subviews()[0]->hidden()) << "only the first turn shows its time";
-    EXPECT_EQ(speech[1].y, first->card()->frameInRoot().maxY() + 22.0);
+    // Each turn says when it was asked, and only the first one of which day.
+    EXPECT_FALSE(second->subviews()[0]->subviews()[0]->hidden());
+    EXPECT_EQ(speech[0].y, first->card()->frameInRoot().maxY() + 22.0);
+    EXPECT_EQ(speech[1].y, speech[0].maxY() + 12.0);
     EXPECT_EQ(second->card()->frameInRoot().y, speech[1].maxY() + 10.0);
 }
 

@@ -1,0 +1,35 @@
+#pragma once
+
+#include <filesystem>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "linux/maps/MapGround.h"
+
+namespace ktr::linux_ {
+
+/// Draws from all MBTiles files in a folder, in the order of their names: what somebody puts there is a map from the
+/// next picture on, and what they take away is none. A folder that is not there has no maps.
+class FolderGround final : public MapGround {
+  public:
+    /// Of more files the first ones are used.
+    static constexpr std::size_t kMostFiles = 64;
+
+    explicit FolderGround(std::filesystem::path folder) : folder_(std::move(folder)) {}
+    MapDrawn draw(const MapDrawing& drawing) override;
+
+  private:
+    struct File {
+        std::filesystem::path path;
+        /// Vector tiles and pictures: only the file itself says which it has, and the other finds nothing in it.
+        std::vector<std::shared_ptr<MapGround>> grounds;
+    };
+    void list();
+
+    const std::filesystem::path folder_;
+    std::vector<File> files_;
+};
+
+}  // namespace ktr::linux_

@@ -1,0 +1,318 @@
+#include "app/window/friend/FriendPage.h"
+
+#include <QApplication>
+#include <QClipboard>
+#include <QDeadlineTimer>
+#include <QKeyEvent>
+#include <QMouseEvent>
+#include <QPointingDevice>
+#include <QTouchEvent>
+#include <QWheelEvent>
+#include <memory>
+
+#include "app/window/ConversationWindow.h"
+#include "app/window/friend/FriendsPage.h"
+#include "app/window/friend/SelfPage.h"
+#include "host/scenario/ScenarioReader.h"
+#include "platform/map/Mercator.h"
+
+#include <gtest/gtest.h>
+
+namespace ktr::app {
+
+namespace {
+
+using host::LinkPolicy;
+
+/// A window on demo scenarios with the real plugin; the desktop opens nothing, or everything.
+class FriendPageTest : public ::testing::Test {
+  public:
+    void open(const std::vector<std::string>& names, const std::string& language = "en-GB", int width = 400,
+              int height = 700) {
+        std::vector<host::Scenario> scenarios;
+        for (const std::string& name : names) {
+            auto read = host::ScenarioReader({0.0}).readFile(KTR_SOURCE_DIR "/resources/scenarios/" + name + ".json");
+            ASSERT_TRUE(std::holds_alternative<host::Scenario>(read));
+            scenarios.push_back(std::get<host::Scenario>(read));
+        }
+        host::HostOptions options;
+        options.dark = false;
+        options.language = language;
+        const auto settings = host::HostSettings::decide(options, scenarios, {});
+        ASSERT_TRUE(std::holds_alternative<host::HostSettings>(settings));
+        auto made =
+            host::Host::make(std::get<host::HostSettings>(settings), host::Host::Time::Running, KTR_PLUGIN_FILE);
+        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made)) << std::get<host::Failure>(made).line;
+        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
+        for (const host::Scenario& scenario : scenarios) {
+            ASSERT_FALSE(host->addTurn(scenario));
+        }
+        desktop = std::make_unique<linux_::DesktopOpener>(QString(), [this](const std::string& url) {
+            opened.push_back(url);
+            return desktopOpens;
+        });
+        window = std::make_unique<ConversationWindow>(*host);
+        window->openLinks(*desktop);
+        window->pages().setMotion(host::MotionStyle::None);
+        window->resize(width, height);
+        window->show();
+        settle();
+    }
+    void TearDown() override {
+        window.reset();
+        desktop.reset();
+        host.reset();
+    }
+    static void settle() {
+        for (int i = 0; i < 5; ++i) {
+            QApplication::processEvents();
+        }
+    }
+    static bool eventually(const std::function<bool()>& condition) {
+        const QDeadlineTimer deadline(10000);
+        while (!condition() && !deadline.hasExpired()) {
+            QApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents, 20);
+        }
+        return condition();
+    }
+    FriendPage* page() const { return dynamic_cast<FriendPage*>(window->pages().current()); }
+    static platform::Coordinate middleOf(const FriendPage& page) {
+        return page.map().shown().coordinateAt({200.0, 200.0});
+    }
+    void mouse(QEvent::Type type, QPointF at) const {
+        QWidget* map = &page()->map();
+        const bool move = type == QEvent::MouseMove;
+        QMouseEvent event(type, at, map->mapToGlobal(at), move ? Qt::NoButton : Qt::LeftButton,
+                          type == QEvent::MouseButtonRelease ? Qt::NoButton : Qt::LeftButton, Qt::NoModifier);
+        QApplication::sendEvent(map, &event);
+    }
+    void touch(QEvent::Type type, const std::vector<QPointF>& at) {
+        QWidget* map = &page()->map();
+        const auto state = type == QEvent::TouchBegin    ? QEventPoint::Pressed
+                           : type == QEvent::TouchUpdate ? QEventPoint::Updated
+                                                         : QEventPoint::Released;
+        QList<QEventPoint> points;
+        for (std::size_t i = 0; i < at.size(); ++i) {
+            points.append(QEventPoint(static_cast<int>(i), state, at[i], map->mapToGlobal(at[i])));
+        }
+        QTouchEvent event(type, &finger, Qt::NoModifier, points);
+        QApplication::sendEvent(map, &event);
+    }
+
+    QPointingDevice finger{QStringLiteral("finger"),
+                           1,
+                           QInputDevice::DeviceType::TouchScreen,
+                           QPointingDevice::PointerType::Finger,
+                           QInputDevice::Capability::Position,
+                           2,
+                           0};
+    std::unique_ptr<host::Host> host;
+    std::unique_ptr<linux_::DesktopOpener> desktop;
+    std::unique_ptr<ConversationWindow> window;
+    std::vector<std::string> opened;
+    bool desktopOpens = true;
+};
+
+TEST_F(FriendPageTest, ATapOnARowOpensItsFriend_WithThePluginsOwnRow) {
+    open({"dinner"});
+    EXPECT_TRUE(host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example")));
+    ASSERT_NE(page(), nullptr);
+    EXPECT_EQ(page()->name(), QStringLiteral("Ann Marsh"));
+    EXPECT_TRUE(page()->sheet().hasPlace());
+    settle();
+    EXPECT_NE(page()->sheet().row().accessibleName().indexOf(QStringLiteral("Ann Marsh")), -1);
+    // One row: neither a second friend nor "Show all friends", which leads to where the user comes from.
+    EXPECT_NEAR(page()->sheet().row().shapeHeight(376), 78, 1);
+    ASSERT_TRUE(page()->map().place());
+    const auto tip = page()->map().shown().pointFor(page()->map().place()->coordinate);
+    EXPECT_NEAR(tip.x, 200.0, 1.0);
+    EXPECT_GT(tip.y, 100.0);
+    EXPECT_LT(tip.y, page()->sheet().geometry().top());
+    EXPECT_TRUE(opened.empty());
+}
+
+TEST_F(FriendPageTest, TheWayBackLeadsToTheConversation) {
+    open({"dinner"});
+    host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+    ASSERT_TRUE(window->pages().isOpen());
+    page()->back().press();
+    EXPECT_FALSE(window->pages().isOpen());
+    host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+    QKeyEvent escape(QEvent::KeyPress, Qt::Key_Escape, Qt::NoModifier);
+    QApplication::sendEvent(&page()->map(), &escape);
+    EXPECT_FALSE(window->pages().isOpen());
+}
+
+TEST_F(FriendPageTest, MouseWheelKeysAndButtonsMoveTheMap_AndShowBringsItBack) {
+    open({"single"});
+    host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+    ASSERT_NE(page(), nullptr);
+    FriendMap& map = page()->map();
+    const auto start = map.shown();
+    EXPECT_FALSE(map.isTouched());
+    mouse(QEvent::MouseButtonPress, {150.0, 150.0});
+    mouse(QEvent::MouseMove, {190.0, 130.0});
+    EXPECT_NEAR(start.pointFor(map.shown().centre).x, start.size.width / 2.0 - 40.0, 1e-6);
+    EXPECT_NEAR(start.pointFor(map.shown().centre).y, start.size.height / 2.0 + 20.0, 1e-6);
+    EXPECT_TRUE(map.isTouched());
+    EXPECT_TRUE(page()->showAgain().isVisible());
+    mouse(QEvent::MouseButtonRelease, {190.0, 130.0});
+    const QPointF at(120.0, 90.0);
+    const auto there = map.shown().coordinateAt({at.x(), at.y()});
+    QWheelEvent wheel(at, map.mapToGlobal(at), {}, {0, 240}, Qt::NoButton, Qt::NoModifier, Qt::NoScrollPhase, false);
+    QApplication::sendEvent(&map, &wheel);
+    EXPECT_NEAR(map.shown().zoom, start.zoom + 1.0, 1e-9);
+    EXPECT_NEAR(map.shown().pointFor(there).x, at.x(), 1e-6);
+    const auto before = map.shown();
+    QKeyEvent right(QEvent::KeyPress, Qt::Key_Right, Qt::NoModifier);
+    QApplication::sendEvent(&map, &right);
+    EXPECT_NEAR(before.pointFor(map.shown().centre).x, before.size.width / 2.0 + 60.0, 1e-6);
+    map.setColors(linux_::Palette::of(linux_::ColorScheme::Light), true);
+    map.step(false);
+    ASSERT_TRUE(eventually([&] { return map.shown().zoom < before.zoom - 0.99; }));
+    page()->showAgain().press();
+    ASSERT_TRUE(eventually([&] { return map.shown() == start; }));
+    EXPECT_FALSE(page()->showAgain().isVisible());
+}
+
+TEST_F(FriendPageTest, TwoFingersMakeTheMapLarger_AroundWhereTheyAre) {
+    open({"single"});
+    host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+    FriendMap& map = page()->map();
+    const auto start = map.shown();
+    const auto there = start.coordinateAt({150.0, 150.0});
+    touch(QEvent::TouchBegin, {{100.0, 150.0}, {200.0, 150.0}});
+    touch(QEvent::TouchUpdate, {{50.0, 150.0}, {250.0, 150.0}});
+    EXPECT_NEAR(map.shown().zoom, start.zoom + 1.0, 1e-9);
+    EXPECT_NEAR(map.shown().pointFor(there).x, 150.0, 1e-6);
+    EXPECT_NEAR(map.shown().pointFor(there).y, 150.0, 1e-6);
+    touch(QEvent::TouchEnd, {{50.0, 150.0}, {250.0, 150.0}});
+    EXPECT_TRUE(map.isTouched());
+}
+
+TEST_F(FriendPageTest, CallWriteMapsAndCopy_AreMadeOfTheContactAndThePlace) {
+    open({"single"});
+    host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+    auto& sheet = page()->sheet();
+    std::vector<QString> names;
+    for (std::size_t i = 0; sheet.action(i) != nullptr; ++i) {
+        names.push_back(sheet.action(i)->accessibleName());
+        sheet.action(i)->press();
+    }
+    ASSERT_TRUE(eventually([&] { return opened.size() >= names.size() - 1; }));
+    std::sort(opened.begin(), opened.end());
+    ASSERT_GE(opened.size(), 2u);
+    EXPECT_TRUE(opened[0].starts_with("geo:50.2")) << opened[0];
+    EXPECT_EQ(opened[1], "mailto:ann@harbour.example");
+    const QString copied = QApplication::clipboard()->text();
+    EXPECT_NE(copied.indexOf(QStringLiteral("50.2")), -1) << copied.toStdString();
+    EXPECT_EQ(sheet.action(names.size() - 1)->accessibleName(), QStringLiteral("Copied"));
+}
+
+TEST_F(FriendPageTest, WhereNobodyOpensAPlaceTheWindowSaysSo) {
+    open({"single"});
+    desktopOpens = false;
+    host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+    window->open("https://brin.example/", LinkPolicy::From::Outside);
+    ASSERT_TRUE(eventually([&] { return !window->notice().sentence().isEmpty(); }));
+    EXPECT_EQ(window->notice().sentence(), QStringLiteral("No program on this computer opens links."));
+}
+
+TEST_F(FriendPageTest, NothingElseIsOpened_AndThatIsSaid) {
+    open({"single"});
+    EXPECT_FALSE(host->delegate().open(platform::Url("tel:+441632960018")));
+    window->open("file:///etc/passwd", LinkPolicy::From::Outside);
+    settle();
+    EXPECT_TRUE(opened.empty());
+    EXPECT_FALSE(window->pages().isOpen());
+    EXPECT_EQ(window->notice().sentence(), QStringLiteral("This link isn’t opened here."));
+}
+
+TEST_F(FriendPageTest, ALinkFromOutside_ShowsAContactAndAsksOnlyOnATap) {
+    open({"dinner"});
+    window->open("wayloc://friend/ann@harbour.example", LinkPolicy::From::Outside);
+    ASSERT_NE(page(), nullptr);
+    EXPECT_EQ(page()->name(), QStringLiteral("Ann Marsh"));
+    // No controller: nobody asks the service.
+    EXPECT_EQ(page()->sheet().row().controller(), nullptr);
+    EXPECT_FALSE(page()->sheet().hasPlace());
+    EXPECT_FALSE(page()->map().place());
+    window->open("wayloc://friend/nobody@brin.example", LinkPolicy::From::Outside);
+    EXPECT_EQ(window->notice().sentence(), QStringLiteral("I don’t know who this link is about."));
+    EXPECT_EQ(page()->name(), QStringLiteral("Ann Marsh"));
+}
+
+TEST_F(FriendPageTest, NoHandleLeadsToOnesOwnPage_TheListToAll) {
+    open({"dinner"});
+    host->delegate().open(platform::Url("wayloc://friend/(null)"));
+    EXPECT_NE(dynamic_cast<SelfPage*>(window->pages().current()), nullptr);
+    window->pages().back();
+    host->delegate().open(platform::Url("wayloc://friends/"));
+    EXPECT_NE(dynamic_cast<FriendsPage*>(window->pages().current()), nullptr);
+    EXPECT_TRUE(opened.empty());
+}
+
+TEST_F(FriendPageTest, AFriendWithoutAPlaceHasNoPin_AndASentence) {
+    open({"single-unknown"});
+    host->delegate().open(platform::Url(
+        "wayloc://friend/" + host::KnownFriends::handleOf(*host::KnownFriends(*host).all().front().location)));
+    ASSERT_NE(page(), nullptr);
+    EXPECT_FALSE(page()->map().place());
+    EXPECT_FALSE(page()->sheet().hasPlace());
+}
+
+TEST_F(FriendPageTest, AnotherPlatformTakesThePlaceOfThisOne_AndThePageGoesOn) {
+    open({"dinner"});
+    host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+    settle();
+    host::HostSettings settings = host->settings();
+    settings.language = "de";
+    ASSERT_FALSE(host->remake(settings));
+    settle();
+    ASSERT_NE(page(), nullptr);
+    EXPECT_TRUE(page()->sheet().hasPlace());
+    EXPECT_EQ(page()->back().accessibleName(), QStringLiteral("Zurück"));
+    page()->back().press();
+    settle();
+    ASSERT_FALSE(host->remake(settings));
+}
+
+/// The picture of the page, for who looks at it: KTR_PICTURES names a folder.
+TEST_F(FriendPageTest, EveryShape_HasEverythingInPlace) {
+    struct Shape {
+        int width, height;
+        const char* language;
+    };
+    for (const Shape& shape :
+         {Shape{320, 640, "en-GB"}, Shape{400, 800, "de"}, Shape{400, 300, "en-GB"}, Shape{844, 390, "ar"},
+          Shape{900, 700, "ja"}, Shape{1600, 900, "en-GB"}, Shape{320, 200, "de"}}) {
+        open({"single"}, shape.language, shape.width, shape.height);
+        host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+        ASSERT_NE(page(), nullptr);
+        ASSERT_TRUE(eventually([&] { return page()->sheet().row().controller()->view() != nullptr; }));
+        const QRect sheet = page()->sheet().geometry();
+        const QRect whole = page()->rect();
+        EXPECT_TRUE(whole.contains(sheet)) << shape.width << "x" << shape.height;
+        EXPECT_TRUE(whole.contains(page()->back().parentWidget()->geometry()));
+        EXPECT_FALSE(sheet.intersects(page()->back().parentWidget()->geometry())) << shape.width << "x" << shape.height;
+        if (page()->zoom().isVisible()) {
+            EXPECT_FALSE(sheet.intersects(page()->zoom().geometry())) << shape.width << "x" << shape.height;
+            EXPECT_TRUE(whole.contains(page()->zoom().geometry()));
+        }
+        if (const QByteArray folder = qgetenv("KTR_PICTURES"); !folder.isEmpty()) {
+            const QDeadlineTimer drawn(1500);
+            while (!drawn.hasExpired()) {
+                QApplication::processEvents(QEventLoop::AllEvents, 20);
+            }
+            window->grab().save(QString::fromLocal8Bit(folder) + QStringLiteral("/friend-%1x%2-%3.png")
+                                                                     .arg(shape.width)
+                                                                     .arg(shape.height)
+                                                                     .arg(QLatin1String(shape.language)));
+        }
+        TearDown();
+    }
+}
+
+}  // namespace
+
+}  // namespace ktr::app
