@@ -25,8 +25,8 @@ void WindowPlace::restore(QWidget& window) const {
     int isMaximized = 0;
     constexpr int kNumbers = 5;
     constexpr int kMost = 16384;
-    const bool isRead = kept != nullptr && std::sscanf(kept->c_str(), "%d %d %d %d %d", &width, &height, &x, &y,
-                                                       &isMaximized) == kNumbers;
+    const bool isRead = kept != nullptr &&
+                        std::sscanf(kept->c_str(), "%d %d %d %d %d", &width, &height, &x, &y, &isMaximized) == kNumbers;
     if (!isRead || width < window.minimumWidth() || height < window.minimumHeight() || width > kMost ||
         height > kMost || std::abs(x) > kMost || std::abs(y) > kMost || width <= 0 || height <= 0) {
         return;

@@ -37,7 +37,8 @@ TEST_F(WindowPlaceTest, NothingKept_OrNonsense_ChangesNothing) {
     window.resize(250, 260);
     place.restore(window);
     std::filesystem::create_directories(file.parent_path());
-    for (const std::string& nonsense : {std::string("zz"), std::string("400 300"), std::string("-5 -5 0 0 0 "), std::string("99999999 99999999 0 0 0 "),
+    for (const std::string& nonsense : {std::string("zz"), std::string("400 300"), std::string("-5 -5 0 0 0 "),
+                                        std::string("99999999 99999999 0 0 0 "),
                                         std::string("99999999999999999999 1 1 1 1"), std::string(1 << 20, '4')}) {
         std::ofstream(file) << nonsense;
         place.restore(window);
