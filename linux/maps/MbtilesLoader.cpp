@@ -31,9 +31,6 @@ std::string MbtilesLoader::index(const std::string& from, const std::string& to,
     const auto entry =
         reinterpret_cast<MbtilesKeepEntry>(LoadableModule::entry("libktr-mbtiles.so", kMbtilesKeepEntry, error));
     if (entry != nullptr && error.empty()) {
-        error = objection(from);
-    }
-    if (entry != nullptr && error.empty()) {
         entry(from, to, isCopied, error);
     }
     return error;

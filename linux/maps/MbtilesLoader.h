@@ -14,7 +14,8 @@ class MbtilesLoader {
     /// disk: not on the main thread.
     static std::shared_ptr<tiles::MbtilesFile> open(const std::string& path, std::string& error);
     /// Sees to it that a file finds its tiles by an index: where it has none, a copy with one is made at `to`, which is
-    /// not there yet. Empty when done, else what failed. Waits for the disk: not on the main thread of a window.
+    /// not there yet. For a file that `open` has taken. Empty when done, else what failed. Waits for the disk: not on
+    /// the main thread of a window.
     static std::string index(const std::string& from, const std::string& to, bool& isCopied);
 };
 
