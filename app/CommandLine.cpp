@@ -112,6 +112,7 @@ struct Parser {
     std::unique_ptr<ServeArguments> serve;
     CLI::App* watch = nullptr;
     std::unique_ptr<KeepingArguments> keeping;
+    CLI::App* wyoming = nullptr;
     Options options;
     Words words;
 
@@ -187,6 +188,7 @@ struct Parser {
         hook->needs(key);
         watch->footer("Example: ktr watch --print");
         keeping = std::make_unique<KeepingArguments>(app, options.config, options.doctor);
+        addWyoming();
         show->footer(kShowExamples);
         render->footer(kRenderExamples);
         describe->footer(kDescribeExamples);
@@ -199,6 +201,22 @@ struct Parser {
         using host::LinkPolicy;
         return options.link.empty() || !std::holds_alternative<LinkPolicy::Refused>(
                                            LinkPolicy::decide(options.link, LinkPolicy::From::Outside));
+    }
+
+    void addWyoming() {
+        wyoming = app.add_subcommand("wyoming", "Answers voice assistants that speak that protocol");
+        wyoming->add_option("--listen", options.wyoming.address, "Address of this machine (127.0.0.1)")
+            ->type_name("ADDRESS");
+        wyoming->add_option("--port", options.wyoming.port, "Port (10390); 0: a free one")
+            ->type_name("NUMBER")
+            ->check(CLI::Range(0, 65535));
+        wyoming->add_option("--allow", options.wyoming.allowed, "Another machine, or a network, that may ask")
+            ->expected(1)
+            ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll)
+            ->type_name("ADDRESS");
+        wyoming->add_option("--language", words.language, "Language of questions that name none")->type_name("TAG");
+        wyoming->add_option("--plugin", options.plugin, "The plugin's library")->type_name("PATH");
+        wyoming->footer("Example: ktr wyoming --listen 0.0.0.0 --allow 192.168.1.20");
     }
 
     void addCommon(CLI::App& command) {
@@ -289,9 +307,9 @@ std::string readLive(const Words& words, Options& options) {
         }
         options.liveSeconds = *seconds;
     }
-    if (options.command == Options::Command::Ask) {
+    if (options.command == Options::Command::Ask || options.command == Options::Command::Wyoming) {
         options.live = true;
-        return "";
+        return options.command == Options::Command::Ask ? "" : WyomingCommand::objection(options.wyoming);
     }
     if (!options.live && !options.questions.empty()) {
         return "--ask: nobody answers in a scenario; add --live";
@@ -391,10 +409,11 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
                                  : misuse(wrong("LINK", "a link such as wayloc://friend/ann@harbour.example, or https",
                                                 parser.options.link));
     }
-    parser.options.command = parser.ask->parsed()      ? Options::Command::Ask
-                             : parser.show->parsed()   ? Options::Command::Show
-                             : parser.render->parsed() ? Options::Command::Render
-                                                       : Options::Command::Describe;
+    parser.options.command = parser.ask->parsed()       ? Options::Command::Ask
+                             : parser.wyoming->parsed() ? Options::Command::Wyoming
+                             : parser.show->parsed()    ? Options::Command::Show
+                             : parser.render->parsed()  ? Options::Command::Render
+                                                        : Options::Command::Describe;
     if (const std::string complaint = readWords(parser.words, parser.options); !complaint.empty()) {
         return misuse(complaint);
     }

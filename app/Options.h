@@ -5,6 +5,7 @@
 
 #include "app/KeepingOptions.h"
 #include "app/WatchCommand.h"
+#include "app/WyomingCommand.h"
 #include "host/HostOptions.h"
 #include "serve/ServeOptions.h"
 
@@ -12,7 +13,7 @@ namespace ktr::app {
 
 /// What the command line asks for. Members that are none leave the decision to the scenario, then to the session.
 struct Options : host::HostOptions {
-    enum class Command { Show, Open, Render, Describe, Ask, Serve, AddMap, Watch, Config, Doctor };
+    enum class Command { Show, Open, Render, Describe, Ask, Serve, AddMap, Watch, Wyoming, Config, Doctor };
 
     Command command = Command::Show;
     std::vector<std::string> scenarios;  ///< never empty where nothing is live, but for serve
@@ -28,6 +29,7 @@ struct Options : host::HostOptions {
     WatchCommand::Options watch;         ///< of watch
     ConfigOptions config;                ///< of config
     DoctorOptions doctor;                ///< of doctor
+    WyomingCommand::Options wyoming;     ///< of wyoming
     bool reducedMotion = false;          ///< of show
     std::string map;                     ///< of maps add: the file
     std::string link;                    ///< of a window: opened once it is there; empty for none

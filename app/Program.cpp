@@ -123,6 +123,9 @@ host::ExitCode runHeadless(const Options& options, const host::HostSettings& set
         // Its own numbers, beside those of an attempt.
         return static_cast<host::ExitCode>(AskCommand(host, options).run());
     }
+    if (options.command == Options::Command::Wyoming) {
+        return WyomingCommand(host, options.wyoming).run();
+    }
     const host::ExitCode code = options.live ? LiveRun(host, options).run(scenarios) : host::ExitCode::Ok;
     if (options.command == Options::Command::Render) {
         const auto failure = RenderCommand(host).write(options.output);

@@ -54,10 +54,12 @@ std::vector<std::string> valuesOf(const std::vector<platform::LabeledText>& text
 
 }  // namespace
 
-QuestionDesk::QuestionDesk(Host& host)
+QuestionDesk::QuestionDesk(Host& host, Audience audience)
     : host_(host),
+      audience_(audience),
       requests_([&host] { return host.platform(); }),
-      engine_(std::make_shared<ask::Languages>(resourceFolder() / "questions"), requests_, worldOf(host)) {}
+      engine_(std::make_shared<ask::Languages>(resourceFolder() / "questions"),
+              audience == Audience::User ? static_cast<ask::ServicePort&>(requests_) : aloud_, worldOf(host)) {}
 
 void QuestionDesk::readPeople() {
     const auto& platform = *host_.platform();
@@ -92,6 +94,7 @@ ask::Question QuestionDesk::question(const std::string& text, bool isLive) {
     question.now = host_.platform()->clock->now();
     question.secondsFromUtc = QDateTime::currentDateTime().offsetFromUtc();
     question.isLive = isLive;
+    question.mayChange = audience_ == Audience::User;
     if (!positions_ && host_.live() != nullptr && host_.live()->looksForPosition()) {
         positions_ = host_.platform()->locationManagers->makeManager(nullptr);
         positions_->setDesiredAccuracy(platform::kLocationAccuracyNearestTenMeters);

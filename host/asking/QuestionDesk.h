@@ -5,6 +5,7 @@
 
 #include "ask/Engine.h"
 #include "host/Host.h"
+#include "host/asking/AloudRequests.h"
 #include "host/asking/ServiceRequests.h"
 #include "platform/location/PlatformLocationManager.h"
 
@@ -13,8 +14,16 @@ namespace ktr::host {
 /// The engine that answers questions, on a live host's contacts, service, units, position and lock. Main thread.
 class QuestionDesk {
   public:
+    /// Who gets the answers.
+    enum class Audience {
+        User,
+        /// Whoever is in the room: only friends who may be said aloud, nothing about the user's sharing, and no wish is
+        /// honoured.
+        WhoeverHears,
+    };
+
     /// The host is a live one and outlives this.
-    explicit QuestionDesk(Host& host);
+    explicit QuestionDesk(Host& host, Audience audience = Audience::User);
 
     /// A question with what the host knows of the asker. `isLive`: its card goes on changing.
     ask::Question question(const std::string& text, bool isLive);
@@ -28,7 +37,9 @@ class QuestionDesk {
     void readPeople();
 
     Host& host_;
+    const Audience audience_;
     ServiceRequests requests_;
+    AloudRequests aloud_{requests_};
     ask::Engine engine_;
     /// Whose contacts the engine has.
     std::weak_ptr<platform::ContactStore> contacts_;

@@ -57,7 +57,12 @@ Dictionary locationOf(const Seen& seen, const PlaceName& name) {
 
 Dictionary entryOf(const AskedFriend& one, const LocationsRequest& request) {
     const Seen& seen = *one.seen;
-    Dictionary entry{{"status", 200}, {"location", locationOf(seen, one.name)}};
+    Dictionary location = locationOf(seen, one.name);
+    // Absent it may not.
+    if (one.aloud) {
+        location.set("aloud", true);
+    }
+    Dictionary entry{{"status", 200}, {"location", location}};
     if (request.mine) {
         // Whole centimetres, as decimal text.
         entry.set("distanceInMeters", Value(std::round(distance(*request.mine, seen) * 100.0) / 100.0).description());
@@ -83,7 +88,7 @@ std::string LocationAnswers::said(const AskedFriend& friend_) {
     if (!friend_.seen) {
         return "";
     }
-    return platform::writeJson(locationOf(*friend_.seen, {}));
+    return platform::writeJson(locationOf(*friend_.seen, {})) + (friend_.aloud ? "aloud" : "");
 }
 
 Dictionary LocationAnswers::locations(const LocationsRequest& request, std::vector<AskedFriend> friends,

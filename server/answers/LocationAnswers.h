@@ -19,6 +19,7 @@ struct AskedFriend {
     std::int64_t person = 0;  ///< 0: nobody has this handle
     std::optional<Seen> seen;
     PlaceName name = {};  ///< of where they are seen; of a place that its owner named nothing
+    bool aloud = false;   ///< whether that may be said aloud
 };
 
 /// Words the protocol's answers, of what `Visibility` lets through and of nothing else. Any thread.

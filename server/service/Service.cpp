@@ -413,6 +413,7 @@ HeldAnswers::Answer Service::locationsNow(const Device& device, const LocationsR
             answer.people.insert(one.person);
         }
         if (asked.back().seen) {
+            asked.back().aloud = one.sharing.grant->aloud;
             seen.push_back(one.person);
         }
         answer.said += LocationAnswers::said(asked.back()) + '\n';
