@@ -23,7 +23,11 @@ class Words : public Block {
     int around() const override;
     int shapeHeight(int width) const override;
     int naturalWidth() const override;
+    /// Words that are not there yet only keep a place.
     QAccessible::Role role() const override {
+        if (text().isEmpty()) {
+            return QAccessible::Filler;
+        }
         return style_ == BlockStyle::Title ? QAccessible::Heading : QAccessible::StaticText;
     }
 

@@ -82,11 +82,16 @@ class PlatformMapViewTest : public PlatformTest {
     std::shared_ptr<PlatformMapView> map_;
 };
 
-TEST_F(PlatformMapViewTest, WithoutARegion_ShowsTheWorld) {
+TEST_F(PlatformMapViewTest, WithoutARegion_PlainGroundAndWords) {
+    localization->set("org.ktr.host", "MAP_NO_PLACE", "No place to show");
     EXPECT_FALSE(map_->requestedRegion());
+    const auto canvas = painted();
     time->runPosted();
-    ASSERT_EQ(maps_->requests.size(), 1u);
-    EXPECT_NEAR(maps_->requests[0].viewport.zoom, std::log2(376.0 / 256.0), 1e-9);
+    EXPECT_EQ(maps_->requests.size(), 0u) << "no map of the world for somebody who has no place";
+    ASSERT_EQ(count(canvas, RecordingCanvas::Call::Kind::Text), 1u);
+    const auto words = std::find_if(canvas.calls.begin(), canvas.calls.end(),
+                                    [](const auto& call) { return call.kind == RecordingCanvas::Call::Kind::Text; });
+    EXPECT_NEAR(words->rect.x + words->rect.width / 2.0, 188.0, 0.01);
 }
 
 TEST_F(PlatformMapViewTest, FirstRegion_IsThereAtOnce) {
@@ -270,6 +275,7 @@ TEST_F(PlatformMapViewTest, WithoutASource_PlainLandAndWords) {
     platform->maps = nullptr;
     localization->set("org.ktr.host", "MAP_NOT_AVAILABLE", "Map not available");
     const auto bare = create<PlatformMapView>(&PlatformMapView::initWithFrame, Rect{0.0, 0.0, 376.0, 219.0});
+    bare->setRegion(kTown, false);
     bare->layoutIfNeeded();
     RecordingCanvas canvas;
     bare->paint(canvas, bare->bounds());
