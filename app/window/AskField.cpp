@@ -61,6 +61,11 @@ AskField::AskField(const Texts& texts, QWidget* parent)
 }
 
 void AskField::setTexts(const Texts& texts) {
+    // Each time that a name is set, who listens hears that it has changed.
+    if (texts == texts_) {
+        return;
+    }
+    texts_ = texts;
     edit_->setPlaceholderText(QString::fromStdString(texts.placeholder));
     edit_->setAccessibleName(QString::fromStdString(texts.name.empty() ? texts.placeholder : texts.name));
     button_->setAccessibleName(QString::fromStdString(texts.send));

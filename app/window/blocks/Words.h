@@ -26,7 +26,7 @@ class Words : public Block {
     /// Words that are not there yet only keep a place.
     QAccessible::Role role() const override {
         if (text().isEmpty()) {
-            return QAccessible::Filler;
+            return QAccessible::Whitespace;
         }
         return style_ == BlockStyle::Title ? QAccessible::Heading : QAccessible::StaticText;
     }
