@@ -19,6 +19,11 @@ constexpr int kBeside = 2;
 class Reading : public AccessiblePlain {
   public:
     explicit Reading(StatusWords& words) : AccessiblePlain(&words, QAccessible::StaticText) {}
+    /// A line that says nothing only keeps its place.
+    QAccessible::Role role() const override {
+        return static_cast<StatusWords*>(widget())->text().isEmpty() ? QAccessible::Whitespace
+                                                                     : QAccessible::StaticText;
+    }
     QString text(QAccessible::Text kind) const override {
         return kind == QAccessible::Name ? static_cast<StatusWords*>(widget())->text() : QString();
     }

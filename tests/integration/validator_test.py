@@ -5,6 +5,7 @@ read as it is installed; only its report is written down here instead of in its 
 import importlib.util
 import os
 import pathlib
+import pathlib
 import sys
 import tempfile
 import types
@@ -60,7 +61,11 @@ def apply(rule, step, acc, state, report):
     except Exception:  # as the validator itself takes it: the rule is not for this element
         return
     if concerned:
-        getattr(rule, step)(acc, state, report)
+        try:
+            getattr(rule, step)(acc, state, report)
+        except TypeError:
+            # The rule about names breaks down over what it is there to find.
+            report.note(f"{type(rule).__name__} breaks down", acc)
 
 
 def validate(acc, checks, state, report):
@@ -76,6 +81,8 @@ def validate(acc, checks, state, report):
 
 
 class ValidatorTest(accessibility.WindowTest):
+    maxDiff = None
+
     def check(self, tree):
         checks, report = rules(), Report()
         self.assertGreater(len(checks), 10)
@@ -92,6 +99,12 @@ class ValidatorTest(accessibility.WindowTest):
 
     def test_window_with_a_field(self):
         with tempfile.TemporaryDirectory() as folder:
+            configuration = pathlib.Path(folder) / "ktr" / "config.json"
+            configuration.parent.mkdir()
+            configuration.write_text('{"account": {"personId": "1000", "host": "localhost:9"}}', encoding="utf-8")
+            configuration.chmod(0o600)
+            (configuration.parent / "token").write_text("secret\n", encoding="utf-8")
+            (configuration.parent / "token").chmod(0o600)
             tree, _ = self.open(0, environment={"XDG_CONFIG_HOME": folder})
             self.assertIn("text", [node.getRoleName() for node in tree])
             self.check(tree)

@@ -17,7 +17,8 @@ class Picture : public Block {
 
     int shapeHeight(int /*width*/) const override { return side_; }
     int naturalWidth() const override { return side_; }
-    QAccessible::Role role() const override { return QAccessible::Graphic; }
+    /// It says nothing that the words beside it do not.
+    QAccessible::Role role() const override { return QAccessible::Whitespace; }
 
   protected:
     void paintEvent(QPaintEvent* event) override;

@@ -25,10 +25,7 @@ class Words : public Block {
     int naturalWidth() const override;
     /// Words that are not there yet only keep a place.
     QAccessible::Role role() const override {
-        if (text().isEmpty()) {
-            return QAccessible::Whitespace;
-        }
-        return style_ == BlockStyle::Title ? QAccessible::Heading : QAccessible::StaticText;
+        return text().isEmpty() ? QAccessible::Whitespace : QAccessible::StaticText;
     }
 
   protected:

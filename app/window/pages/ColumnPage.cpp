@@ -36,13 +36,13 @@ ColumnPage::ColumnPage(Bar bar, QWidget* parent)
     QScroller::grabGesture(area_->viewport(), QScroller::TouchGesture);
     handle_->setFocusPolicy(Qt::NoFocus);
     handle_->setCursor(Qt::ArrowCursor);
-    const QScrollBar* scrolled = area_->verticalScrollBar();
-    connect(scrolled, &QScrollBar::rangeChanged, handle_, [this](int least, int most) {
+    QScrollBar* scrolled = area_->verticalScrollBar();
+    connect(scrolled, &QScrollBar::rangeChanged, &listener_, [this](int least, int most) {
         handle_->setRange(least, most);
         handle_->setVisible(most > least);
     });
-    connect(scrolled, &QScrollBar::valueChanged, handle_, &QScrollBar::setValue);
-    connect(handle_, &QScrollBar::valueChanged, scrolled, &QScrollBar::setValue);
+    connect(scrolled, &QScrollBar::valueChanged, &listener_, [this](int value) { handle_->setValue(value); });
+    connect(handle_, &QScrollBar::valueChanged, &listener_, [scrolled](int value) { scrolled->setValue(value); });
     handle_->hide();
 }
 
@@ -107,7 +107,7 @@ void ColumnPage::place() {
     const int room = std::max(height() - above - below, 0);
     area_->setGeometry(0, above, width(), room);
     column_->resize(width(), std::max(column_->shapeHeight(width()), room));
-    const QScrollBar* scrolled = area_->verticalScrollBar();
+    QScrollBar* scrolled = area_->verticalScrollBar();
     handle_->setPageStep(room);
     handle_->setRange(scrolled->minimum(), scrolled->maximum());
     handle_->setVisible(scrolled->maximum() > scrolled->minimum());

@@ -42,6 +42,8 @@ class ColumnPage : public Page {
     QScrollBar* handle_;
     Column* column_;
     Block* lower_ = nullptr;
+    /// Hears what the scroll bars say: a widget that did would count as controlled by them for assistive technology.
+    QObject listener_;
 };
 
 }  // namespace ktr::app
