@@ -26,9 +26,8 @@ QAccessible::State AccessibleBlock::state() const {
 
 void* AccessibleBlock::interface_cast(QAccessible::InterfaceType type) {
     // What cannot be pressed has no actions, not an empty list of them.
-    return type == QAccessible::ActionInterface && block_.canBePressed() && block_.isEnabled()
-               ? QAccessibleWidget::interface_cast(type)
-               : AccessiblePlain::interface_cast(type);
+    return type == QAccessible::ActionInterface && block_.canBePressed() ? QAccessibleWidget::interface_cast(type)
+                                                                         : AccessiblePlain::interface_cast(type);
 }
 
 QStringList AccessibleBlock::actionNames() const {
