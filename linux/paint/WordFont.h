@@ -36,7 +36,7 @@ class WordFont {
     /// Whether the script's letters are glyphs one by one, or join by their font's rules alone; true for what belongs
     /// to every script.
     static bool isPlain(QChar::Script script);
-    /// The font for a plain script; none for others, and none where Qt takes another font than the spec's family. Kept
+    /// The font for a plain script; null for others, and where Qt takes another font than that of the family. Kept
     /// until the application ends; valid until then.
     static WordFont* of(const FontSpec& spec, QChar::Script script);
 
