@@ -162,7 +162,9 @@ class RulesTest(unittest.TestCase):
         entry = mara.ask("ann@x.example")["locations"]["ann@x.example"]
         self.assertEqual(entry["location"]["labels"], [{"label": "_$!<work>!$_"}, {"label": "Bergwerk"}])
         self.assertEqual(set(entry), {"status", "location"}, "no motion, battery or state of the phone")
-        self.assertEqual(set(entry["location"]), {"latitude", "longitude", "horizontalAccuracy", "timestamp", "labels"})
+        self.assertEqual(set(entry["location"]),
+                         {"latitude", "longitude", "horizontalAccuracy", "timestamp", "labels", "aloud"})
+        self.assertIs(entry["location"]["aloud"], True)
         self.assertEqual(self.service.command("places", "Ann"), "Bergwerk (work), 150 m, may be said\n")
         self.assertIn("seen by Mara: exact, may be said aloud", self.service.command("people"))
         self.service.command("share", "Ann", "Mara", "--precision", "town")
