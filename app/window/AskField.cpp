@@ -30,6 +30,14 @@ void strokeRound(QPainter& painter, const QRectF& rect, const QColor& color, dou
     painter.drawRoundedRect(inner, inner.height() / 2.0, inner.height() / 2.0);
 }
 
+/// Each time that a name is set, who listens hears that it has changed, also where it has not.
+void callIt(QWidget& widget, const std::string& name) {
+    const QString wanted = QString::fromStdString(name);
+    if (widget.accessibleName() != wanted) {
+        widget.setAccessibleName(wanted);
+    }
+}
+
 }  // namespace
 
 int AskField::shapeHeight() {
@@ -61,15 +69,10 @@ AskField::AskField(const Texts& texts, QWidget* parent)
 }
 
 void AskField::setTexts(const Texts& texts) {
-    // Each time that a name is set, who listens hears that it has changed.
-    if (texts == texts_) {
-        return;
-    }
-    texts_ = texts;
     edit_->setPlaceholderText(QString::fromStdString(texts.placeholder));
-    edit_->setAccessibleName(QString::fromStdString(texts.name.empty() ? texts.placeholder : texts.name));
-    button_->setAccessibleName(QString::fromStdString(texts.send));
     button_->setToolTip(QString::fromStdString(texts.send));
+    callIt(*edit_, texts.name.empty() ? texts.placeholder : texts.name);
+    callIt(*button_, texts.send);
 }
 
 void AskField::send() {

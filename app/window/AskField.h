@@ -22,8 +22,6 @@ class AskField : public PlainWidget {
         std::string placeholder;
         std::string send;
         std::string name = {};  ///< spoken, of the field; empty: the placeholder
-
-        bool operator==(const Texts&) const = default;
     };
 
     explicit AskField(const Texts& texts, QWidget* parent = nullptr);
@@ -54,7 +52,6 @@ class AskField : public PlainWidget {
     SendButton* button_;
     std::function<void(const std::string&)> asked_;
     const linux_::Palette* palette_;
-    Texts texts_;
     bool animated_ = true;
     bool marksFocus_ = false;
     /// Hears the edit and the button in the field's place: a widget that hears another counts for assistive technology
