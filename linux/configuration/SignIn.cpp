@@ -2,12 +2,13 @@
 
 #include <QCoreApplication>
 #include <QMetaObject>
+#include <optional>
 #include <thread>
 
-#include "documents/AtomicFile.h"
 #include "linux/configuration/ConfigurationFile.h"
 #include "linux/configuration/ConfigurationReader.h"
 #include "linux/configuration/SecretModule.h"
+#include "linux/configuration/TokenChange.h"
 #include "linux/configuration/TokenFile.h"
 #include "linux/device/Buses.h"
 #include "linux/device/LoadableModule.h"
@@ -54,22 +55,24 @@ std::vector<std::string> certificatesOf(const std::filesystem::path& file) {
     return configuration == nullptr ? std::vector<std::string>() : configuration->certificates;
 }
 
+std::optional<Configuration::Account> accountIn(const std::filesystem::path& file) {
+    const auto read = ConfigurationReader::readFile(file);
+    const auto* configuration = std::get_if<Configuration>(&read);
+    return configuration == nullptr ? std::nullopt : configuration->account;
+}
+
 /// What the account of another service or person says does not hold for this one.
-std::vector<ConfigurationFile::Change> changesFor(const std::filesystem::path& file, const std::string& person,
-                                                  const std::string& host) {
+std::vector<ConfigurationFile::Change> changesFor(const std::optional<Configuration::Account>& before,
+                                                  const std::string& person, const std::string& host) {
     std::vector<ConfigurationFile::Change> changes = {{"account.personId", platform::Value(person)},
                                                       {"account.host", platform::Value(host)},
                                                       // Where the secret is now is found without being told.
                                                       {"account.tokenFile", std::nullopt}};
-    const auto read = ConfigurationReader::readFile(file);
-    const auto* before = std::get_if<Configuration>(&read);
-    if (before != nullptr && before->account) {
-        if (before->account->host != host) {
-            changes.push_back({"account.domains", std::nullopt});
-        }
-        if (before->account->personId != person) {
-            changes.push_back({"account.userName", std::nullopt});
-        }
+    if (before && before->host != host) {
+        changes.push_back({"account.domains", std::nullopt});
+    }
+    if (before && before->personId != person) {
+        changes.push_back({"account.userName", std::nullopt});
     }
     return changes;
 }
@@ -117,7 +120,9 @@ void SignIn::begin(const Wish& wish, std::function<void(const Result&)> done) {
         return;
     }
     attempt_->host = *host;
-    ServiceCheck::run(client_, {*host, wish.person, wish.secret, certificatesOf(file_)},
+    const auto before = accountIn(file_);
+    const auto domains = before && before->host == *host ? before->domains : std::nullopt;
+    ServiceCheck::run(client_, {*host, wish.person, wish.secret, certificatesOf(file_), domains},
                       [attempt = attempt_](const ServiceCheck::Result& found) { checked(attempt, found); });
 }
 
@@ -132,24 +137,33 @@ void SignIn::checked(const std::shared_ptr<Attempt>& attempt, const ServiceCheck
 
 SignIn::Result SignIn::keep(Attempt& attempt) {
     Result result{Outcome::Done, attempt.host, {}};
-    const std::filesystem::path token = attempt.file.parent_path() / "token";
-    if (!TokenFile::tokenIn(attempt.wish.secret)) {
+    const Wish& wish = attempt.wish;
+    if (!TokenFile::tokenIn(wish.secret)) {
         return {Outcome::Unknown, attempt.host, "no service gives such a secret"};
     }
-    if (attempt.wish.place == Place::File) {
-        result.reason = documents::AtomicFile::makeFolder(token.parent_path());
-        if (result.reason.empty()) {
-            result.reason = documents::AtomicFile::write(token, attempt.wish.secret + "\n");
-        }
-    } else if (!attempt.store(attempt.wish.person, attempt.host, attempt.wish.secret, attempt.givesUp, result.reason)) {
+    TokenChange token(attempt.file.parent_path() / "token");
+    if (wish.place == Place::File) {
+        result.reason = token.prepare(wish.secret);
+    } else if (!attempt.store(wish.person, attempt.host, wish.secret, attempt.givesUp, result.reason)) {
         result.outcome = Outcome::NoKeyring;
         return result;
     } else {
         result.reason.clear();
     }
     if (result.reason.empty() && !attempt.givesUp) {
-        const ConfigurationFile file(attempt.file);
-        result.reason = file.change(changesFor(attempt.file, attempt.wish.person, attempt.host));
+        const auto before = accountIn(attempt.file);
+        const bool isSame =
+            before && before->personId == wish.person && before->host == attempt.host && !before->tokenFile;
+        // The same account's file is replaced in one step; any other would be sent to a service that it is not for.
+        if (!isSame || wish.place != Place::File) {
+            result.reason = token.takeAway();
+        }
+        if (result.reason.empty()) {
+            result.reason = ConfigurationFile(attempt.file).change(changesFor(before, wish.person, attempt.host));
+        }
+        if (result.reason.empty()) {
+            result.reason = token.finish();
+        }
     }
     result.outcome = result.reason.empty() ? Outcome::Done : Outcome::NotWritten;
     return result;

@@ -56,7 +56,7 @@ ServiceCheck::Result ask(const CheckUp::Places& places, const Configuration& con
     HttpsClient client;
     ServiceCheck::run(client,
                       {*configuration.account->host, configuration.account->personId, token.value_or("none"),
-                       configuration.certificates},
+                       configuration.certificates, configuration.account->domains},
                       [promise](ServiceCheck::Result result) { promise->set_value(std::move(result)); });
     return promise->get_future().get();
 }

@@ -8,6 +8,7 @@
 #include "documents/HttpTime.h"
 #include "documents/JsonReader.h"
 #include "linux/device/SystemClock.h"
+#include "linux/net/ServicePolicy.h"
 #include "platform/client/KTJSONCommand.h"
 
 namespace ktr::linux_ {
@@ -104,6 +105,9 @@ void ServiceCheck::run(HttpsClient& client, const Account& account, std::functio
                       {"X-Orcha-AuthScheme", "Forever"},
                       {"Authorization", header.value_or("")}};
     request.body = R"({"clientContext":{},"handles":[]})";
+    request.mayFollow = [policy = ServicePolicy(account.host, account.domains)](const Origin& origin) {
+        return policy.allows(origin);
+    };
     request.deadline = kDeadline;
     request.inactivityLimit = kDeadline;
     const auto began = std::chrono::steady_clock::now();

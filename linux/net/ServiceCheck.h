@@ -19,6 +19,8 @@ class ServiceCheck {
         std::string person;
         std::string secret;
         std::vector<std::string> certificateFiles;
+        /// As `account.domains` of the configuration: who else may be asked when the service says so.
+        std::optional<std::vector<std::string>> domains;
     };
     enum class Outcome {
         Fine,

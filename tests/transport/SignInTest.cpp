@@ -2,13 +2,18 @@
 #include <QCoreApplication>
 #include <QDeadlineTimer>
 
+#include <algorithm>
 #include <filesystem>
 #include <fstream>
 #include <iterator>
 #include <optional>
+#include <string>
+#include <vector>
 
+#include "linux/configuration/ConfigurationFile.h"
 #include "linux/configuration/ConfigurationReader.h"
 #include "linux/configuration/SignIn.h"
+#include "linux/configuration/TokenChange.h"
 #include "linux/configuration/TokenFile.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/transport/TransportTest.h"
@@ -54,6 +59,29 @@ class SignInTest : public TransportTest {
 
     TemporaryFolder folder;
     const std::filesystem::path file = std::filesystem::path(folder.path()) / "config.json";
+    /// Somebody is signed in already, with a token in a file.
+    void signInBefore(const std::string& host) {
+        trustTheServers();
+        linux_::ConfigurationFile(file).change(
+            {{"account.personId", platform::Value("otto")}, {"account.host", platform::Value(host)}});
+        std::ofstream(token) << "earlier\n";
+        std::filesystem::permissions(token, std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
+    }
+    std::string tokenInFile() const {
+        const auto read = linux_::TokenFile::read(token);
+        const auto* text = std::get_if<std::string>(&read);
+        return text == nullptr ? "" : *text;
+    }
+    std::vector<std::string> filesBesideIt() const {
+        std::vector<std::string> names;
+        for (const auto& entry : std::filesystem::directory_iterator(file.parent_path())) {
+            names.push_back(entry.path().filename().string());
+        }
+        std::sort(names.begin(), names.end());
+        return names;
+    }
+
+    const std::filesystem::path token = file.parent_path() / "token";
     std::string kept;
 };
 
@@ -110,7 +138,6 @@ TEST_F(SignInTest, ClosedKeyring_IsSaidAndAFileIsTheChoice) {
     trustTheServers();
     EXPECT_EQ(signIn({server->host(), "mara", "s3cret"}, false).outcome, Outcome::NoKeyring);
     EXPECT_FALSE(configuration().account);
-    const auto token = file.parent_path() / "token";
     EXPECT_FALSE(std::filesystem::exists(token)) << "only where it is wished";
     const auto result = signIn({server->host(), "mara", "s3cret", SignIn::Place::File}, false);
     EXPECT_EQ(result.outcome, Outcome::Done) << result.reason;
@@ -118,6 +145,58 @@ TEST_F(SignInTest, ClosedKeyring_IsSaidAndAFileIsTheChoice) {
     ASSERT_TRUE(std::holds_alternative<std::string>(read));
     EXPECT_EQ(std::get<std::string>(read), "s3cret");
     EXPECT_TRUE(configuration().account);
+}
+
+TEST_F(SignInTest, ConfigurationThatCannotBeWritten_LeavesTheEarlierTokenToItsAccount) {
+    serve(answering(200));
+    signInBefore("elsewhere.example");
+    std::filesystem::remove(file.string() + ".lock");
+    std::filesystem::create_directory(file.string() + ".lock");
+    const auto result = signIn({server->host(), "mara", "s3cret", SignIn::Place::File});
+    EXPECT_EQ(result.outcome, Outcome::NotWritten);
+    EXPECT_EQ(configuration().account->host, "elsewhere.example");
+    EXPECT_EQ(tokenInFile(), "earlier") << "the new service's secret would be sent to the earlier one";
+    EXPECT_EQ(filesBesideIt(), (std::vector<std::string>{"config.json", "config.json.lock", "token"}));
+}
+
+TEST_F(SignInTest, OtherAccount_DoesNotInheritTheTokenOfTheEarlierOne) {
+    serve(answering(200));
+    signInBefore("elsewhere.example");
+    EXPECT_EQ(signIn({server->host(), "mara", "s3cret"}).outcome, Outcome::Done);
+    EXPECT_FALSE(std::filesystem::exists(token)) << "a locked keyring would make it the new account's";
+    signInBefore("elsewhere.example");
+    EXPECT_EQ(signIn({server->host(), "mara", "s3cret", SignIn::Place::File}).outcome, Outcome::Done);
+    EXPECT_EQ(tokenInFile(), "s3cret");
+    EXPECT_EQ(filesBesideIt(), (std::vector<std::string>{"config.json", "config.json.lock", "token"}));
+}
+
+TEST_F(SignInTest, PreparedToken_IsNotFoundBeforeTheConfigurationIsThatAccounts) {
+    signInBefore("elsewhere.example");
+    {
+        linux_::TokenChange change(token);
+        EXPECT_EQ(change.prepare("s3cret"), "");
+        EXPECT_EQ(tokenInFile(), "earlier");
+        EXPECT_EQ(change.takeAway(), "");
+        EXPECT_FALSE(std::filesystem::exists(token));
+    }
+    EXPECT_EQ(tokenInFile(), "earlier") << "taken back";
+    linux_::TokenChange change(token);
+    EXPECT_EQ(change.prepare("s3cret"), "");
+    EXPECT_EQ(change.takeAway(), "");
+    EXPECT_EQ(change.finish(), "");
+    EXPECT_EQ(tokenInFile(), "s3cret");
+}
+
+TEST_F(SignInTest, ServiceThatRedirectsToItself_IsAService) {
+    serve([this](QSslSocket& socket, const TestServer::Request& request) {
+        const bool isFirst = request.head.find("?again") == std::string::npos;
+        isFirst ? answering(307, "Location: /qloxservice/friends/va/getlocations?again\r\n")(socket, request)
+                : answering(200)(socket, request);
+    });
+    trustTheServers();
+    EXPECT_EQ(signIn({server->host(), "mara", "s3cret"}).outcome, Outcome::Done);
+    serve(answering(307, "Location: https://elsewhere.example/\r\n"));
+    EXPECT_EQ(signIn({server->host(), "mara", "s3cret"}).outcome, Outcome::NoService) << "nobody else gets the secret";
 }
 
 TEST_F(SignInTest, CancelledSignIn_SaysAndKeepsNothing) {
