@@ -15,7 +15,9 @@
 #include <thread>
 #include <vector>
 
+#include "server/store/Database.h"
 #include "server/store/Store.h"
+#include "server/store/StoreAddress.h"
 
 namespace {
 
@@ -102,6 +104,24 @@ std::vector<std::int64_t> populate(Store& store) {
     return people;
 }
 
+double milliseconds(const std::function<void()>& call) {
+    const auto begin = Clock::now();
+    call();
+    return std::chrono::duration<double, std::milli>(Clock::now() - begin).count();
+}
+
+void lookBesideBare(const std::function<void()>& look, ktr::server::Database& database) {
+    std::vector<double> looks;
+    std::vector<double> bare;
+    const auto end = Clock::now() + std::chrono::duration<double>(kSeconds);
+    while (Clock::now() < end) {
+        looks.push_back(milliseconds(look));
+        bare.push_back(milliseconds([&] { database.statement("SELECT 1").next(); }));
+    }
+    print("looks at 100 friends, one after the other", looks, kSeconds);
+    print("a bare question after each of them", bare, kSeconds);
+}
+
 }  // namespace
 
 int main(int count, char** arguments) {
@@ -129,12 +149,9 @@ int main(int count, char** arguments) {
     }
     const auto look = [&](int thread) { storeOf(thread).asked(people.back(), handles, kNow); };
     for (int process = 0; process < processes; ++process) {
-        const auto begin = Clock::now();
-        look(process);
-        print("the first look of a process", {std::chrono::duration<double, std::milli>(Clock::now() - begin).count()},
-              1);
+        print("the first look of a process", {milliseconds([&] { look(process); })}, 1);
     }
-    print("looks at 100 friends, one after the other", times(1, look), kSeconds);
+    lookBesideBare([&] { look(0); }, *ktr::server::StoreAddress{address}.connect(complaint));
     std::atomic<std::int64_t> step = 0;
     std::atomic<int> failures = 0;
     // Of those at whom nobody looks.

@@ -2,12 +2,14 @@
 
 #include <libpq-fe.h>
 
+#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cstdlib>
 
 #include "server/store/PostgresHearing.h"
 #include "server/store/PostgresParameters.h"
+#include "server/store/PostgresQuestions.h"
 
 namespace ktr::server {
 
@@ -50,47 +52,59 @@ std::string bytesOf(std::string_view text) {
 
 }  // namespace
 
-/// A result that has arrived as a whole.
+/// Rows of a result that has arrived as a whole: all of them, or those that answer one of several questions.
 class PostgresDatabase::Table final : public Database::Rows {
   public:
-    explicit Table(Result result) : result_(std::move(result)) {}
-    bool next() override { return ++row_ < ::PQntuples(result_.get()); }
-    int columns() const override { return ::PQnfields(result_.get()); }
-    std::string nameOf(int column) const override { return ::PQfname(result_.get(), column); }
+    explicit Table(Result result) : Table(std::move(result), {}, 0) { last_ = ::PQntuples(result_.get()); }
+    /// `rows`: their numbers; what is before `first` is no column of theirs.
+    Table(std::shared_ptr<pg_result> result, std::vector<int> rows, int first)
+        : result_(std::move(result)), rows_(std::move(rows)), first_(first), last_(static_cast<int>(rows_.size())) {}
+
+    bool next() override { return ++row_ < last_; }
+    int columns() const override { return ::PQnfields(result_.get()) - first_; }
+    std::string nameOf(int column) const override { return ::PQfname(result_.get(), first_ + column); }
     DatabaseValue value(int column) const override {
-        const std::string_view text(::PQgetvalue(result_.get(), row_, column),
-                                    static_cast<std::size_t>(::PQgetlength(result_.get(), row_, column)));
-        const bool isNone = ::PQgetisnull(result_.get(), row_, column) != 0;
-        DatabaseValue value = DatabaseValue::none(Type::Text);
-        switch (::PQftype(result_.get(), column)) {
-            case kInteger2:
-            case kInteger4:
-            case kInteger8:
-                value.type = Type::Integer;
-                std::from_chars(text.data(), text.data() + text.size(), value.integer);
-                break;
-            case kReal4:
-            case kReal8:
-                value.type = Type::Real;
-                // Written by the server with as many digits as it takes, in the "C" locale's way. It ends with a zero.
-                std::from_chars(text.data(), text.data() + text.size(), value.real);
-                break;
-            case kBytes:
-                value.type = Type::Bytes;
-                value.text = bytesOf(text);
-                break;
-            default:
-                value.text = text;
-                break;
-        }
-        value.isNone = isNone;
-        return value;
+        const int row = rows_.empty() ? row_ : rows_[static_cast<std::size_t>(row_)];
+        return valueOf(result_.get(), row, first_ + column);
     }
+    static DatabaseValue valueOf(const pg_result* result, int row, int column);
 
   private:
-    Result result_;
+    std::shared_ptr<pg_result> result_;
+    std::vector<int> rows_;  ///< none: all
+    int first_;
+    int last_;
     int row_ = -1;
 };
+
+DatabaseValue PostgresDatabase::Table::valueOf(const pg_result* result, int row, int column) {
+    const std::string_view text(::PQgetvalue(result, row, column),
+                                static_cast<std::size_t>(::PQgetlength(result, row, column)));
+    DatabaseValue value = DatabaseValue::none(Type::Text);
+    switch (::PQftype(result, column)) {
+        case kInteger2:
+        case kInteger4:
+        case kInteger8:
+            value.type = Type::Integer;
+            std::from_chars(text.data(), text.data() + text.size(), value.integer);
+            break;
+        case kReal4:
+        case kReal8:
+            value.type = Type::Real;
+            // Written by the server with as many digits as it takes, in the "C" locale's way. It ends with a zero.
+            std::from_chars(text.data(), text.data() + text.size(), value.real);
+            break;
+        case kBytes:
+            value.type = Type::Bytes;
+            value.text = bytesOf(text);
+            break;
+        default:
+            value.text = text;
+            break;
+    }
+    value.isNone = ::PQgetisnull(result, row, column) != 0;
+    return value;
+}
 
 /// Values as the library wants them: numbers as text, text and bytes as they are.
 class PostgresDatabase::Parameters {
@@ -153,6 +167,8 @@ bool PostgresDatabase::setUp() {
     return execute(
         "SET client_encoding TO 'UTF8'; SET statement_timeout TO '30s'; SET lock_timeout TO '10s';"
         "SET idle_in_transaction_session_timeout TO '60s';"
+        // Every question here is short: compiling one takes longer than it does.
+        "SET jit TO off;"
         "SELECT set_config('synchronous_commit', 'on', false) "
         "WHERE current_setting('synchronous_commit') IN ('off', 'local')");
 }
@@ -311,16 +327,39 @@ std::unique_ptr<Database::Rows> PostgresDatabase::query(const char* sql, const s
     return result && !failed() ? std::make_unique<Table>(std::move(result)) : nullptr;
 }
 
-void PostgresDatabase::fetchOnce(std::deque<Run>& runs) {
-    for (const Run& run : runs) {
-        send(run.sql(), run.values());
+void PostgresDatabase::give(const std::vector<Run*>& runs, Result result) {
+    const std::shared_ptr<pg_result> shared(std::move(result));
+    std::vector<std::vector<int>> rows(runs.size());
+    for (int row = 0; row < ::PQntuples(shared.get()); ++row) {
+        rows[static_cast<std::size_t>(Table::valueOf(shared.get(), row, 0).integer) - 1].push_back(row);
     }
-    auto next = runs.begin();
-    const Each give = [&](Result result) { (next++)->give(std::make_unique<Table>(std::move(result))); };
+    for (std::size_t i = 0; i < runs.size(); ++i) {
+        runs[i]->give(std::make_unique<Table>(shared, std::move(rows[i]), 1));
+    }
+}
+
+void PostgresDatabase::fetchOnce(std::deque<Run>& runs) {
+    std::vector<std::vector<Run*>> alike;
+    for (Run& run : runs) {
+        const auto same = std::find_if(alike.begin(), alike.end(), [&](const std::vector<Run*>& some) {
+            return std::string_view(some.front()->sql()) == run.sql();
+        });
+        (same == alike.end() ? alike.emplace_back() : *same).push_back(&run);
+    }
+    for (const std::vector<Run*>& some : alike) {
+        std::vector<const std::vector<DatabaseValue>*> values;
+        for (const Run* run : some) {
+            values.push_back(&run->values());
+        }
+        const PostgresQuestions questions(some.front()->sql(), values);
+        send(questions.sql().c_str(), questions.values());
+    }
+    auto next = alike.begin();
+    const Each each = [&](Result result) { give(*next++, std::move(result)); };
     if (inTransaction_) {
-        drain(give);
+        drain(each);
     } else {
-        endPipeline(give);
+        endPipeline(each);
     }
 }
 

@@ -78,6 +78,8 @@ class PostgresDatabase final : public Database {
     /// Leaves the state in which statements are sent without waiting.
     void endPipeline(const Each& each = nullptr);
     void fetchOnce(std::deque<Run>& runs);
+    /// To each its rows of the answer to all of them.
+    static void give(const std::vector<Run*>& runs, Result result);
     Result ask(const char* sql, const std::vector<DatabaseValue>& values);
 
     pg_conn* connection_;

@@ -10,6 +10,8 @@
 #include <chrono>
 #include <cstdlib>
 #include <filesystem>
+#include <fstream>
+#include <sstream>
 #include <thread>
 
 namespace ktr::test {
@@ -107,6 +109,13 @@ void PrivatePostgres::stop(int signal) {
 void PrivatePostgres::restart() {
     stop(SIGQUIT);
     start();
+}
+
+std::string PrivatePostgres::log() const {
+    const std::ifstream stream(folder_ + "/log");
+    std::ostringstream text;
+    text << stream.rdbuf();
+    return text.str();
 }
 
 std::string PrivatePostgres::newStore() {

@@ -21,6 +21,8 @@ class PrivatePostgres {
     const std::string& complaint() const { return complaint_; }
     /// The address of a new, empty store.
     std::string newStore();
+    /// What it has written down.
+    std::string log() const;
     /// Ends it at once, as a crash would, and starts it again.
     void restart();
 
