@@ -229,13 +229,16 @@ class OwnServiceTest(unittest.TestCase):
         self.assertEqual(self.request("POST", "/pub", "Ann", ann, large), (200, b"[]"))
         self.assertEqual(self.request("POST", "/?id=" + ann, None, None, large), (200, b""))
         self.assertEqual(self.request("POST", "/pub", "Ann", "wrong", large)[0], 401)
-        self.assertEqual(self.request("POST", "/pub", None, None, large)[0], 413, "nobody's")
+        self.assertEqual(self.request("POST", "/?id=wrong", None, None, large)[0], 401)
+        # Who is named in the body alone cannot be known, and would send it for ever.
+        self.assertEqual(self.request("POST", "/", None, None, large), (200, b""))
+        self.assertEqual(self.request("POST", "/pub", None, None, large)[0], 401, "nobody's")
         self.assertEqual(self.request("POST", "/me/delete", "Ann", ann, large)[0], 413)
         now = int(time.time())
         for tst in (now - 400000, now + 400000, 0):
             self.assertEqual(self.post("Ann", ann, _type="location", lat=1, lon=2, tst=tst)[0], 200)
         numbers = self.request("GET", "/metrics", None, None)[1].decode()
-        self.assertIn("ktr_service_junk_total 7", numbers)
+        self.assertIn("ktr_service_junk_total 8", numbers)
         self.assertIn("ktr_service_dropped_too_old_total 1", numbers)
         self.assertNotIn("Ann", numbers)
 
