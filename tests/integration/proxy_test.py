@@ -5,6 +5,7 @@
 
 A proxy that is not installed is skipped, and so said; KTR_LONG_TESTS=1 (./test --all) demands both.
 """
+import concurrent.futures
 import http.client
 import json
 import os
@@ -18,9 +19,11 @@ import sys
 import time
 import unittest
 
+import postgres
 from service_program import COMMANDS, ServiceProgram, basic, free_port
 
 SERVICE = sys.argv.pop(1)
+API = {"Content-Type": "application/json", "X-Orcha-Seek-API-Ver": "4.0", "X-Orcha-AuthScheme": "Forever"}
 PACKAGING = pathlib.Path(os.environ["KTR_SOURCE"]) / "packaging"
 NGINX = """
 daemon off; master_process off; pid {folder}/nginx.pid; error_log {folder}/proxy-log;
@@ -46,21 +49,23 @@ class Bound(http.client.HTTPSConnection):
 
 
 class Proxied:
-    """What holds behind either proxy."""
-    name = program = ""
+    """A service behind either proxy, and what is asked through it."""
+    program = ""
 
     def setUp(self):
         if not shutil.which(self.program):
             self.assertFalse(os.environ.get("KTR_LONG_TESTS"), f"{self.program} is not installed")
             self.skipTest(f"{self.program} is not installed")
-        self.time = int(time.time())
-        self.service = ServiceProgram(self, SERVICE)
+        self.time = 0
+        self.service = ServiceProgram(self, SERVICE, store=self.store())
         self.folder = self.service.folder
         self.secret = self.service.add("Ann")
         self.service.add("Mara")
         self.reader = self.service.reader("Mara")
         self.service.command("share", "Ann", "Mara")
-        self.service.start("--socket", self.service.socket)
+        self.services = self.processes()
+        for service in self.services:
+            service.start("--socket", service.socket)
         self.certificate = self.folder / "proxy.pem"
         subprocess.run(["openssl", "req", "-x509", "-newkey", "ec", "-pkeyopt", "ec_paramgen_curve:prime256v1", "-nodes",
                         "-days", "2", "-subj", "/CN=localhost", "-addext", "subjectAltName=DNS:localhost", "-keyout",
@@ -72,6 +77,12 @@ class Proxied:
             if self.started():
                 return
         self.fail(self.proxy_log())
+
+    def store(self):
+        """None: a file."""
+
+    def processes(self):
+        return [self.service]
 
     def started(self):
         self.port = free_port()
@@ -110,8 +121,8 @@ class Proxied:
         return answer.status, text
 
     def next_time(self):
-        """Each later than the one before: a fix of the same second counts once."""
-        self.time += 1
+        """Each later than the one before: a fix of the same second counts once. None is from before a grant."""
+        self.time = max(self.time + 1, int(time.time()))
         return self.time
 
     def post(self, latitude, **more):
@@ -120,10 +131,13 @@ class Proxied:
 
     def ask(self):
         body = json.dumps({"clientContext": {}, "handles": ["ann@x.example"]})
-        status, text = self.request("POST", COMMANDS + "getlocations", body, credentials=("Mara", self.reader), **{
-            "Content-Type": "application/json", "X-Orcha-Seek-API-Ver": "4.0", "X-Orcha-AuthScheme": "Forever"})
+        status, text = self.request("POST", COMMANDS + "getlocations", body, credentials=("Mara", self.reader), **API)
         self.assertEqual(status, 200, text)
         return json.loads(text)["locations"]["ann@x.example"]["location"]["latitude"]
+
+
+class OneProcess(Proxied):
+    """What holds behind either proxy."""
 
     def test_phone_posts_and_reader_asks(self):
         self.assertEqual(self.post(50.25)[0], 200)
@@ -256,32 +270,141 @@ class Proxied:
         self.assertEqual(self.post(50.5)[0], 200)
 
 
-class CaddyTest(Proxied, unittest.TestCase):
+@unittest.skipUnless(os.environ.get("KTR_LONG_TESTS"), "starts a database server: KTR_LONG_TESTS=1 does")
+class TwoProcesses(Proxied):
+    """Two processes with one PostgreSQL server: it does not matter which of them one meets."""
+
+    def store(self):
+        return postgres.Postgres(self).address
+
+    def processes(self):
+        return [self.service, self.service.on_another_machine()]
+
+    def post_at(self, service, latitude):
+        status, text = service.post("Ann", self.secret, True, _type="location", lat=latitude, lon=-3, tst=self.next_time(), acc=9)
+        self.assertEqual(status, 200, text)
+
+    def seen_at(self, service):
+        """None: nothing is."""
+        status, text = service.ask("Mara", self.reader, "ann@x.example", by_socket=True)
+        self.assertEqual(status, 200, text)
+        entry = json.loads(text)["locations"].get("ann@x.example")
+        return entry and entry["location"]["latitude"]
+
+    def test_fix_that_one_took_is_told_by_the_other_and_the_proxy_asks_both(self):
+        first, second = self.services
+        for number in range(10):
+            self.post_at(first, 50 + number / 100)
+            self.assertEqual(self.seen_at(second), 50 + number / 100)
+            self.post_at(second, 51 + number / 100)
+            self.assertEqual(self.seen_at(first), 51 + number / 100)
+
+        def requests(service):
+            numbers = service.numbers(True)
+            return numbers["ktr_service_posts_total"] + numbers["ktr_service_commands_total"]
+
+        before = [requests(service) for service in self.services]
+        for number in range(30):
+            self.assertEqual(self.post(52 + number / 100)[0], 200)
+            self.assertEqual(self.ask(), 52 + number / 100)
+        for service, count in zip(self.services, before):
+            self.assertGreater(requests(service), count, "it met no request")
+
+    def test_what_is_taken_back_at_one_is_gone_at_both_at_once(self):
+        first, second = self.services
+        for number, (take, give) in enumerate(((("revoke", "Ann", "Mara"), ("share", "Ann", "Mara")),
+                                               (("hide", "Ann"), ("show", "Ann")))):
+            time.sleep(2)  # what was before a showing is not seen again
+            self.post_at(first, 50 + number)
+            self.assertEqual([self.seen_at(service) for service in self.services], [50 + number] * 2)
+            first.command(*take)
+            self.assertEqual([self.seen_at(service) for service in (second, first)], [None, None], take)
+            second.command(*give)
+        # By a command of a program's, in its owner's words.
+        owner = first.reader("Ann")
+        time.sleep(2)
+        self.post_at(second, 53)
+        self.assertEqual(self.seen_at(first), 53)
+        self.assertEqual(first.request("POST", COMMANDS + "sharing", json.dumps({"clientContext": {}, "wish": "hide"}), True,
+                                       ("Ann", owner), **API)[0], 200)
+        self.assertIsNone(self.seen_at(second))
+        # A secret that ended.
+        first.command("revoke", "Mara")
+        for service in (second, first):
+            self.assertEqual(service.ask("Mara", self.reader, "ann@x.example", by_socket=True)[0], 401)
+
+    def test_answer_that_waits_at_one_ends_with_what_is_taken_back_at_the_other(self):
+        first, second = self.services
+        self.post_at(first, 50)
+        self.assertEqual(self.seen_at(second), 50)
+        with concurrent.futures.ThreadPoolExecutor(1) as pool:
+            deadline = time.monotonic() + 20
+            while True:  # until one waits: the first ones are answered at once
+                waits = pool.submit(self.seen_at, second)
+                time.sleep(1.2)
+                if not waits.done():
+                    break
+                self.assertEqual(waits.result(), 50)
+                self.assertLess(time.monotonic(), deadline, "none was held")
+            begin = time.monotonic()
+            first.command("revoke", "Ann", "Mara")
+            self.assertIsNone(waits.result())
+            self.assertLess(time.monotonic() - begin, 5, "it ended by itself")
+
+    def test_one_that_ends_is_not_missed(self):
+        for gone, stays in (self.services, self.services[::-1]):
+            gone.stop()
+            for number in range(6):
+                deadline = time.monotonic() + 20
+                while self.post(50 + number / 10)[0] != 200:  # a phone tries again
+                    self.assertLess(time.monotonic(), deadline)
+                self.assertEqual(self.seen_at(stays), 50 + number / 10)
+            gone.start("--socket", gone.socket)
+
+
+class Caddy:
     program = "caddy"
 
     def line(self):
         text = self.replaced("Caddyfile", (r"^\{$", "{\n\tadmin off\n\tauto_https disable_redirects\n\tskip_install_trust"),
                              (r"^home\.example \{", f"localhost:{self.port} {{\n\ttls {self.certificate} "
                               f"{self.folder}/proxy-key.pem"),
-                             (r"^https:// \{", f"https://:{self.port} {{"), ("//run/ktr-service/http.sock",
-                                                                            "/" + self.service.socket))
+                             (r"^https:// \{", f"https://:{self.port} {{"),
+                             ("unix//run/ktr-service/http.sock", " ".join("unix/" + one.socket for one in self.services)))
         (self.folder / "Caddyfile").write_text(text)
         return ["caddy", "run", "--config", str(self.folder / "Caddyfile"), "--adapter", "caddyfile"]
 
 
-class NginxTest(Proxied, unittest.TestCase):
+class Nginx:
     program = "nginx"
 
     def line(self):
         text = self.replaced("nginx.conf", (r"listen 443 ssl", f"listen 127.0.0.1:{self.port} ssl"),
                              (r"server_name home\.example", "server_name localhost"),
-                             ("/run/ktr-service/http.sock", self.service.socket),
+                             ("server unix:/run/ktr-service/http.sock;",
+                              " ".join(f"server unix:{one.socket};" for one in self.services)),
                              ("/etc/ssl/home.example/fullchain.pem", str(self.certificate)),
                              ("/etc/ssl/home.example/privkey.pem", f"{self.folder}/proxy-key.pem"))
         (self.folder / "ktr-service.conf").write_text(text)
         (self.folder / "nginx-main.conf").write_text(NGINX.format(folder=self.folder))
         return ["nginx", "-p", str(self.folder), "-c", str(self.folder / "nginx-main.conf"), "-e",
                 str(self.folder / "proxy-log")]
+
+
+class CaddyTest(Caddy, OneProcess, unittest.TestCase):
+    pass
+
+
+class NginxTest(Nginx, OneProcess, unittest.TestCase):
+    pass
+
+
+class CaddyToTwoTest(Caddy, TwoProcesses, unittest.TestCase):
+    pass
+
+
+class NginxToTwoTest(Nginx, TwoProcesses, unittest.TestCase):
+    pass
 
 
 if __name__ == "__main__":

@@ -1,10 +1,12 @@
 """The service of one's own as tests run it: a folder, its commands, a process, requests."""
 import base64
+import copy
 import http.client
 import json
 import os
 import pathlib
 import re
+import shutil
 import signal
 import socket
 import ssl
@@ -48,6 +50,15 @@ class ServiceProgram:
         self.socket = str(self.folder / "http.sock")
         self.process = None
         self.command("init", "--host", host, "--port", str(self.port), *(("--store", store) if store else ()))
+
+    def on_another_machine(self):
+        """The same service, with a copy of its folder and a socket of its own."""
+        other = copy.copy(self)
+        other.folder = pathlib.Path(tempfile.mkdtemp(prefix="ktr-service-"))
+        self.case.addCleanup(lambda: subprocess.run(["rm", "-rf", os.fspath(other.folder)], check=True))
+        shutil.copytree(self.folder / "data", other.folder / "data")
+        other.port, other.socket, other.process = free_port(), str(other.folder / "http.sock"), None
+        return other
 
     def command(self, *words, fails=False):
         done = subprocess.run([self.program, "--data", str(self.folder / "data"), *words], capture_output=True,
