@@ -11,6 +11,7 @@ import json
 import os
 import pathlib
 import re
+import shutil
 import socket
 import ssl
 import subprocess
@@ -248,6 +249,32 @@ class PeoplePageTest(unittest.TestCase):
                 self.check(name, language)
                 self.assertEqual(self.browser.run("return document.documentElement.dir"),
                                  "rtl" if language in ("ar", "he", "fa") else "ltr")
+
+    def test_code_for_another_phone_is_read_by_a_camera_and_opens_the_page_there(self):
+        """From the picture of the page as it is drawn: narrow, wide, in light and in the dark."""
+        if not shutil.which("zbarimg"):
+            self.assertFalse(LONG, "zbarimg is not installed")
+            self.skipTest("zbarimg is not installed")
+        self.sign_in()
+        for language, width, dark in (("en", 320, False), ("en", 320, True), ("ar", 1280, True)):
+            self.browser.language(language)
+            self.browser.screen(width, dark=dark)
+            self.browser.open(self.origin + "/me/phone")
+            self.browser.run("document.querySelector('main form button').click()")
+            self.waitForWords("?id=")
+            picture = self.folder / "page.png"
+            self.browser.picture(picture)
+            done = subprocess.run(["zbarimg", "--quiet", "--raw", str(picture)], capture_output=True, text=True, timeout=60,
+                                  check=False)
+            link = done.stdout.strip()
+            self.assertTrue(link.startswith(self.origin + "/me/in?link="), (language, width, dark, done))
+            # The other phone's browser is not signed in, until its owner presses the button.
+            self.browser.protocol("Network.clearBrowserCookies")
+            self.browser.language("en")
+            self.browser.open(link)
+            self.browser.tab_to("Open my page")
+            self.browser.press("Enter")
+            self.waitFor("can see where you are.")
 
     def test_new_phone_is_shown_what_to_type_once(self):
         self.sign_in()
