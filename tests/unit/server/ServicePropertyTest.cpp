@@ -77,15 +77,37 @@ class World {
                     R"({"_type":"location","lat":10,"lon":10,"acc":9,"tst":)" + std::to_string(time) + "}");
     }
 
+    /// Signs otto's browser in.
+    void signIn() {
+        ASSERT_TRUE(store_->addSignIn(otto_, "link", kNow));
+        const std::string answer = exchange(
+            "POST /me/in HTTP/1.1\r\nHost: localhost\r\nConnection: close\r\nSec-Fetch-Site: same-origin\r\n"
+            "Content-Type: application/x-www-form-urlencoded\r\nContent-Length: 9\r\n\r\nlink=link");
+        std::smatch found;
+        ASSERT_TRUE(std::regex_search(answer, found, std::regex("Set-Cookie: ([^;]+);"))) << answer;
+        cookie_ = found[1];
+    }
+    /// A page of otto's, but for what is drawn by lot for the browser.
+    std::string page(const std::string& path) const {
+        const std::string answer = exchange(
+            "GET " + path + " HTTP/1.1\r\nHost: localhost\r\nConnection: close\r\nCookie: " + cookie_ + "\r\n\r\n");
+        EXPECT_EQ(answer.rfind("HTTP/1.1 200 OK\r\n", 0), 0U) << path << answer.substr(0, 300);
+        return std::regex_replace(answer, std::regex("\r\nDate: [^\r]*|value=\"[0-9a-f]{32}\""), "");
+    }
+
   private:
-    std::string send(const std::string& path, const std::string& secret, const std::string& body) const {
+    std::string exchange(const std::string& request) const {
         const RawClient client(service_->port());
-        client.send("POST " + path + " HTTP/1.1\r\nHost: localhost\r\nConnection: close\r\nAuthorization: " +
-                    BasicCredentials{"otto", secret}.header() +
-                    "\r\nX-Orcha-Seek-API-Ver: 4.0\r\nX-Orcha-AuthScheme: Forever\r\nContent-Type: application/json\r\n"
-                    "Content-Length: " +
-                    std::to_string(body.size()) + "\r\n\r\n" + body);
-        const std::string answer = client.read("(never)");
+        client.send(request);
+        return client.read("(never)");
+    }
+    std::string send(const std::string& path, const std::string& secret, const std::string& body) const {
+        const std::string answer = exchange(
+            "POST " + path + " HTTP/1.1\r\nHost: localhost\r\nConnection: close\r\nAuthorization: " +
+            BasicCredentials{"otto", secret}.header() +
+            "\r\nX-Orcha-Seek-API-Ver: 4.0\r\nX-Orcha-AuthScheme: Forever\r\nContent-Type: application/json\r\n"
+            "Content-Length: " +
+            std::to_string(body.size()) + "\r\n\r\n" + body);
         EXPECT_EQ(answer.rfind("HTTP/1.1 200 OK\r\n", 0), 0U) << answer.substr(0, 300);
         return std::regex_replace(answer, std::regex("\r\nDate: [^\r]*"), "");
     }
@@ -94,6 +116,34 @@ class World {
     std::unique_ptr<Service> service_;
     std::atomic<std::int64_t> now_ = kBegin;
     std::int64_t otto_ = 0;
+    std::string cookie_;
+};
+
+/// Two services that tell otto the same of everybody.
+struct Worlds {
+    World one;
+    World other;
+    std::vector<std::pair<std::int64_t, std::int64_t>> people;  ///< in the one, in the other
+
+    static std::string handle(std::size_t person) { return "\"p" + std::to_string(100 + person) + "@x.example\""; }
+    std::string allHandles() const {
+        std::string all;
+        for (std::size_t i = 0; i < people.size(); ++i) {
+            all += (i == 0 ? "" : ",") + handle(i);
+        }
+        return all;
+    }
+    /// What otto may see of a person; none where the two are not alike.
+    std::optional<std::optional<server::Seen>> seen(std::size_t person, std::int64_t now) {
+        const auto mine = Visibility::visible(*one.store().sharing(one.otto(), people[person].first), now);
+        const auto yours = Visibility::visible(*other.store().sharing(other.otto(), people[person].second), now);
+        using Alike = std::optional<std::optional<server::Seen>>;
+        return mine == yours ? Alike(std::in_place, mine) : Alike();
+    }
+    void setNow(std::int64_t now) {
+        one.setNow(now);
+        other.setNow(now);
+    }
 };
 
 }  // namespace
@@ -143,60 +193,77 @@ class ServicePropertyTest : public ::testing::Test {
         return fixes;
     }
 
+    /// A third at each precision but for named places; every eighth is hidden here and a stranger there.
+    void populate(Worlds& worlds) {
+        for (std::size_t i = 0; i < kPeople; ++i) {
+            const std::string name = "p" + std::to_string(100 + i);
+            const auto [mine, yours] = worlds.people.emplace_back(worlds.one.add(name), worlds.other.add(name));
+            const auto precision = static_cast<Precision>(i % 3);
+            const auto fixes = history(precision);
+            worlds.one.share(mine, precision);
+            worlds.one.keep(mine, fixes);
+            if (i % 8 == 7) {
+                ASSERT_TRUE(worlds.one.store().setHidden(mine, true, kNow));
+                worlds.other.keep(yours, fixes);
+                continue;
+            }
+            worlds.other.share(yours, precision);
+            // Of the past nothing is seen at exact precision.
+            worlds.other.keep(yours,
+                              precision == Precision::Exact ? std::vector<Fix>{fixes.back()} : alike(fixes, precision));
+        }
+    }
+
+    static constexpr std::size_t kPeople = 240;
     std::mt19937_64 random_{20261122};
 };
 
 TEST_F(ServicePropertyTest, HistoriesThatLookAlike_GiveTheSameBytes) {
-    constexpr int kPeople = 240;
-    World one;
-    World other;
-    std::string all;
+    Worlds worlds;
+    populate(worlds);
+    worlds.setNow(kNow);
     int seen = 0;
-    std::vector<std::pair<std::int64_t, std::int64_t>> people;
-    std::vector<Precision> precisions;
-    for (int i = 0; i < kPeople; ++i) {
-        const std::string name = "p" + std::to_string(100 + i);
-        people.emplace_back(one.add(name), other.add(name));
-        precisions.push_back(static_cast<Precision>(i % 3));
-        all += (i == 0 ? "\"" : ",\"") + name + "@x.example\"";
-        one.share(people.back().first, precisions.back());
-        if (i % 8 != 7) {
-            other.share(people.back().second, precisions.back());
-        }
-    }
-    for (int i = 0; i < kPeople; ++i) {
-        const auto [mine, yours] = people[static_cast<std::size_t>(i)];
-        const Precision precision = precisions[static_cast<std::size_t>(i)];
-        const auto fixes = history(precision);
-        one.keep(mine, fixes);
-        if (i % 8 == 7) {
-            // Hidden here, a stranger there.
-            ASSERT_TRUE(one.store().setHidden(mine, true, kNow));
-            other.keep(yours, fixes);
-        } else if (precision == Precision::Exact) {
-            other.keep(yours, {fixes.back()});  // of the past nothing is seen
-        } else {
-            other.keep(yours, alike(fixes, precision));
-        }
-    }
-    one.setNow(kNow);
-    other.setNow(kNow);
-    for (int i = 0; i < kPeople; ++i) {
-        const auto [mine, yours] = people[static_cast<std::size_t>(i)];
-        const auto what = Visibility::visible(*one.store().sharing(one.otto(), mine), kNow);
-        ASSERT_EQ(Visibility::visible(*other.store().sharing(other.otto(), yours), kNow), what) << i;
-        seen += what ? 1 : 0;
-        const std::string handle = "\"p" + std::to_string(100 + i) + "@x.example\"";
-        ASSERT_EQ(one.ask(handle), other.ask(handle)) << i;
+    for (std::size_t i = 0; i < kPeople; ++i) {
+        const auto what = worlds.seen(i, kNow);
+        ASSERT_TRUE(what) << i;
+        seen += *what ? 1 : 0;
+        ASSERT_EQ(worlds.one.ask(Worlds::handle(i)), worlds.other.ask(Worlds::handle(i))) << i;
     }
     EXPECT_GT(seen, kPeople / 2) << "else nothing was tried";
-    EXPECT_EQ(one.ask(all), other.ask(all));
+    EXPECT_EQ(worlds.one.ask(worlds.allHandles()), worlds.other.ask(worlds.allHandles()));
     for (int turn = 0; turn < 3; ++turn) {
-        EXPECT_EQ(one.post(kNow + turn), other.post(kNow + turn)) << turn;
+        EXPECT_EQ(worlds.one.post(kNow + turn), worlds.other.post(kNow + turn)) << turn;
     }
     // And what is seen does change the bytes.
-    one.keep(people.front().first, {{kNow - 1, kNow - 1, 51.0, 8.0, 12.0}});
-    EXPECT_NE(one.ask(all), other.ask(all));
+    worlds.one.keep(worlds.people.front().first, {{kNow - 1, kNow - 1, 51.0, 8.0, 12.0}});
+    EXPECT_NE(worlds.one.ask(worlds.allHandles()), worlds.other.ask(worlds.allHandles()));
+}
+
+TEST_F(ServicePropertyTest, WhileTheyLookAlike_AnswersTheirIntervalsAndThePagesAreTheSameBytes) {
+    Worlds worlds;
+    populate(worlds);
+    worlds.setNow(kNow);
+    worlds.one.signIn();
+    worlds.other.signIn();
+    int asked = 0;
+    for (std::int64_t now = kNow; now < kNow + 7200; now += 487) {
+        worlds.setNow(now);
+        std::string alike;
+        for (std::size_t i = 0; i < kPeople; ++i) {
+            // As time goes on, what came in the present slot comes to count; of them nothing is said here.
+            if (worlds.seen(i, now)) {
+                alike += (alike.empty() ? "" : ",") + Worlds::handle(i);
+                ++asked;
+            }
+        }
+        const std::string answer = worlds.one.ask(alike);
+        EXPECT_NE(answer.find("\"minCallbackIntervalInMS\""), std::string::npos) << answer.substr(0, 300);
+        ASSERT_EQ(answer, worlds.other.ask(alike)) << now;
+        for (const char* path : {"/me", "/me/looks", "/me/fences", "/me/places", "/me/settings"}) {
+            ASSERT_EQ(worlds.one.page(path), worlds.other.page(path)) << path << now;
+        }
+    }
+    EXPECT_GT(asked, 15 * static_cast<int>(kPeople) / 3) << "else little was tried";
 }
 
 }  // namespace ktr::test
