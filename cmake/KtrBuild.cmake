@@ -12,7 +12,9 @@ endif()
 
 find_program(KTR_CCACHE ccache)
 if(KTR_CCACHE)
-    set(CMAKE_CXX_COMPILER_LAUNCHER ${KTR_CCACHE})
+    # It looks at what a precompiled header was made of, not at its age.
+    set(CMAKE_CXX_COMPILER_LAUNCHER env CCACHE_SLOPPINESS=pch_defines,time_macros,include_file_mtime,include_file_ctime
+        ${KTR_CCACHE})
 endif()
 
 add_library(ktr_warnings INTERFACE)
