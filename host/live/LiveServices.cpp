@@ -118,7 +118,6 @@ void LiveServices::addTo(platform::Platform& platform, const std::string& langua
 }
 
 void LiveServices::start(std::function<void()> ready) {
-    // It watches before it reads: a keyring may wait a minute for its password, and the file may change meanwhile.
     watcher_ = std::make_unique<linux_::ConfigurationWatcher>(accounts_, mainLoop_, [this] { configurationChanged(); });
     watcher_->start([this, ready = std::move(ready)] {
         // Nothing has asked for the account before it is read for the first time.

@@ -1,10 +1,8 @@
 #include "linux/configuration/ConfigurationWatcher.h"
 
-#include <QFileSystemWatcher>
-#include <QString>
-#include <QStringList>
-#include <filesystem>
 #include <utility>
+
+#include "linux/device/FileWatch.h"
 
 namespace ktr::linux_ {
 
@@ -13,9 +11,17 @@ struct ConfigurationWatcher::State {
     std::shared_ptr<platform::MainLoop> mainLoop;
     std::function<void()> changed;
     std::function<void()> done;  ///< of the first reading
-    std::unique_ptr<QFileSystemWatcher> watcher;
+    std::unique_ptr<FileWatch> watch;
     bool reading = false;
     bool again = false;  ///< something changed while reading
+
+    FileWatch::Files files() const {
+        FileWatch::Files files{store->configurationFile()};
+        if (const auto token = store->tokenFile(); !token.empty()) {
+            files.push_back(token);
+        }
+        return files;
+    }
 };
 
 ConfigurationWatcher::ConfigurationWatcher(std::shared_ptr<ConfiguredAccountStore> store,
@@ -24,55 +30,45 @@ ConfigurationWatcher::ConfigurationWatcher(std::shared_ptr<ConfiguredAccountStor
     state_->store = std::move(store);
     state_->mainLoop = std::move(mainLoop);
     state_->changed = std::move(changed);
-    state_->watcher = std::make_unique<QFileSystemWatcher>();
     const std::weak_ptr<State> weak = state_;
-    const auto touched = [weak](const QString&) {
+    state_->watch = std::make_unique<FileWatch>([weak] {
         if (const auto state = weak.lock()) {
             reload(state);
         }
-    };
-    QObject::connect(state_->watcher.get(), &QFileSystemWatcher::fileChanged, state_->watcher.get(), touched);
-    QObject::connect(state_->watcher.get(), &QFileSystemWatcher::directoryChanged, state_->watcher.get(), touched);
-    watch(*state_);
+    });
 }
 
 ConfigurationWatcher::~ConfigurationWatcher() {
     // A reading under way may still hold the state; it must not call back, and the watcher belongs to this thread.
-    state_->watcher.reset();
+    state_->watch.reset();
     state_->changed = nullptr;
     state_->done = nullptr;
 }
 
 void ConfigurationWatcher::start(std::function<void()> done) {
     state_->done = std::move(done);
-    reload(state_);
+    // It watches before it reads, so that no change falls between the two.
+    state_->watch->watch(state_->files(), [weak = std::weak_ptr<State>(state_)](bool) {
+        if (const auto state = weak.lock()) {
+            reload(state);
+        }
+    });
 }
 
 void ConfigurationWatcher::reload() {
     reload(state_);
 }
 
-bool ConfigurationWatcher::watch(State& state) {
-    if (!state.watcher) {
-        return false;
+void ConfigurationWatcher::watch(const std::shared_ptr<State>& state) {
+    if (!state->watch) {
+        return;
     }
-    bool isFolderNew = false;
-    const QStringList known = state.watcher->files() + state.watcher->directories();
-    const auto add = [&](const std::filesystem::path& path) {
-        const QString name = QString::fromStdString(path.string());
-        return !known.contains(name) && state.watcher->addPath(name);
-    };
-    // Editors replace files: the folders tell of the new file, the files of changes in place.
-    for (const auto& file : {state.store->configurationFile(), state.store->tokenFile()}) {
-        std::error_code failure;
-        if (!file.empty() && std::filesystem::exists(file, failure)) {
-            add(file);
+    state->watch->watch(state->files(), [weak = std::weak_ptr<State>(state)](bool isFolderNew) {
+        // Nobody has looked whether anything changed there since it was read.
+        if (const auto later = weak.lock(); later && isFolderNew) {
+            reload(later);
         }
-        if (!file.empty() && std::filesystem::is_directory(file.parent_path(), failure)) {
-            isFolderNew = add(file.parent_path()) || isFolderNew;
-        }
-    }
-    return isFolderNew;
+    });
 }
 
 void ConfigurationWatcher::reload(const std::shared_ptr<State>& state) {
@@ -98,8 +94,7 @@ void ConfigurationWatcher::reload(const std::shared_ptr<State>& state) {
 void ConfigurationWatcher::taken(const std::shared_ptr<State>& state) {
     state->reading = false;
     const bool isNew = state->store->take();
-    // Nobody has looked whether anything changed there since it was read.
-    state->again = watch(*state) || state->again;
+    watch(state);
     if (const auto done = std::exchange(state->done, nullptr)) {
         done();
     } else if (isNew && state->changed) {

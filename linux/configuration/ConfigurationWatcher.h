@@ -1,18 +1,15 @@
 #pragma once
 
-#include <QObject>
 #include <functional>
 #include <memory>
 
 #include "linux/configuration/ConfiguredAccountStore.h"
 #include "platform/base/MainLoop.h"
 
-class QFileSystemWatcher;
-
 namespace ktr::linux_ {
 
 /// Has an account store read its files in the background, at the start and when its configuration or token file
-/// changes, and take what was read. Main thread.
+/// changes, and take what was read. Main thread, which looks at no disk.
 class ConfigurationWatcher {
   public:
     /// `changed` is called on the main thread when the store holds something new. The store is kept until a reading
@@ -33,8 +30,7 @@ class ConfigurationWatcher {
     struct State;
     static void reload(const std::shared_ptr<State>& state);
     static void taken(const std::shared_ptr<State>& state);
-    /// Whether another folder is watched from now on.
-    static bool watch(State& state);
+    static void watch(const std::shared_ptr<State>& state);
     std::shared_ptr<State> state_;
 };
 

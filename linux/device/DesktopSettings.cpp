@@ -3,7 +3,6 @@
 #include <QDBusMessage>
 #include <QDBusPendingCallWatcher>
 #include <QDBusPendingReply>
-#include <QFileInfo>
 #include <QProcess>
 #include <QStandardPaths>
 #include <QStringList>
@@ -66,13 +65,10 @@ DesktopSettings::DesktopSettings(Places places)
                              names.contains(QLatin1String("Phosh"), Qt::CaseInsensitive);
           return gnome ? Desktop::Gnome : Desktop::Other;
       }()),
+      files_([this] { followKdeFonts(); }),
       aside_(*this) {
     if (desktop_ == Desktop::Kde) {
-        // The folder too: files there are replaced, not written.
-        files_.addPath(QString::fromStdString(places_.configuration.string()));
-        connect(&files_, &QFileSystemWatcher::directoryChanged, this, [this] { readKdeFonts(); });
-        connect(&files_, &QFileSystemWatcher::fileChanged, this, [this] { readKdeFonts(); });
-        readKdeFonts();
+        followKdeFonts();
     }
     joinBus();
 }
@@ -162,14 +158,16 @@ void DesktopSettings::take(const QString& group, const QString& key, const QVari
     set(values);
 }
 
-void DesktopSettings::readKdeFonts() {
+void DesktopSettings::followKdeFonts() {
+    FileWatch::Files files;
     for (const char* name : KdeFonts::kFiles) {
-        const auto file = QString::fromStdString((places_.configuration / name).string());
-        // One that was replaced is not watched any more, and one that is not there cannot be.
-        if (!files_.files().contains(file) && QFileInfo::exists(file)) {
-            files_.addPath(file);
-        }
+        files.push_back(places_.configuration / name);
     }
+    // Watched before they are read, so that no change falls between the two.
+    files_.watch(std::move(files), [this](bool) { readKdeFonts(); });
+}
+
+void DesktopSettings::readKdeFonts() {
     aside_.run([this, folder = places_.configuration] {
         return [this, scale = KdeFonts::textScale(folder)] {
             Values values = values_;

@@ -2,7 +2,6 @@
 
 #include <QDBusConnection>
 #include <QDBusVariant>
-#include <QFileSystemWatcher>
 #include <QObject>
 #include <QString>
 #include <filesystem>
@@ -12,6 +11,7 @@
 #include <utility>
 
 #include "linux/device/Aside.h"
+#include "linux/device/FileWatch.h"
 
 namespace ktr::linux_ {
 
@@ -59,6 +59,7 @@ class DesktopSettings : public QObject {
     void ask(const QString& group, const QString& key);
     void askAll();
     void take(const QString& group, const QString& key, const QVariant& value);
+    void followKdeFonts();
     void readKdeFonts();
     void askGsettings();
     void set(const Values& values);
@@ -68,7 +69,7 @@ class DesktopSettings : public QObject {
     Values values_;
     std::function<void()> changed_;
     std::optional<QDBusConnection> bus_;
-    QFileSystemWatcher files_;
+    FileWatch files_;
     bool portalKnowsTextScale_ = false;
     /// Changes that were announced, by group and key of what is asked for: an answer that one of them overtook is
     /// older.

@@ -43,6 +43,7 @@ TEST_F(ConfigurationWatcherTest, MainThreadSeesNothingNewBeforeItIsTold) {
     configure("a.example");
     int done = 0;
     watcher.start([&] { ++done; });
+    ASSERT_EQ(readings(1), 1U);
     loop->run(0);
     EXPECT_EQ(host(), "");
     loop->runPosted();
@@ -64,6 +65,7 @@ TEST_F(ConfigurationWatcherTest, WhatChangesDuringTheFirstReading_IsReadAfterIt)
     configure("a.example");
     int done = 0;
     watcher.start([&] { ++done; });
+    ASSERT_EQ(readings(1), 1U);
     loop->run(0);
     configure("b.example");
     for (int round = 0; round < 20; ++round) {
@@ -84,6 +86,7 @@ TEST_F(ConfigurationWatcherTest, FolderOfATokenFileElsewhere_IsLookedAtOnceMore)
     folder.write("config.json", R"({"account": {"personId": "7", "host": "a.example", "tokenFile": ")" +
                                     (elsewhere.path() / "token").string() + R"("}})");
     watcher.start([] {});
+    ASSERT_EQ(readings(1), 1U);
     loop->run(0);
     // Nobody watches there yet.
     elsewhere.write("token", "made meanwhile\n");

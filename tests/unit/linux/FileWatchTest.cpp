@@ -1,0 +1,95 @@
+#include "linux/device/FileWatch.h"
+
+#include <gtest/gtest.h>
+
+#include <QCoreApplication>
+#include <chrono>
+#include <fstream>
+#include <optional>
+#include <thread>
+
+#include "tests/support/TemporaryFolder.h"
+
+namespace ktr::linux_ {
+
+class FileWatchTest : public ::testing::Test {
+  protected:
+    /// Whether it has come true within two seconds.
+    template <typename Condition>
+    static bool comes(Condition condition) {
+        for (int round = 0; round < 400 && !condition(); ++round) {
+            QCoreApplication::processEvents();
+            std::this_thread::sleep_for(std::chrono::milliseconds(5));
+        }
+        return condition();
+    }
+    static void settle() {
+        comes([round = 0]() mutable { return ++round > 20; });
+    }
+    /// What is told once it watches.
+    bool watch(FileWatch::Files files) {
+        std::optional<bool> isFolderNew;
+        files_.watch(std::move(files), [&](bool isNew) { isFolderNew = isNew; });
+        EXPECT_FALSE(isFolderNew.has_value()) << "it looked at the disk at once";
+        EXPECT_TRUE(comes([&] { return isFolderNew.has_value(); }));
+        return isFolderNew.value_or(false);
+    }
+    /// In place, as `echo >>` does.
+    static void append(const std::filesystem::path& file) { std::ofstream(file, std::ios::app) << "more"; }
+
+    test::TemporaryFolder folder;
+    int changes = 0;
+    FileWatch files_{[this] { ++changes; }};
+};
+
+TEST_F(FileWatchTest, FileThatAppears_IsTold) {
+    EXPECT_TRUE(watch({folder.path() / "config.json"}));
+    settle();
+    EXPECT_EQ(changes, 0);
+    folder.write("config.json", "{}");
+    EXPECT_TRUE(comes([this] { return changes > 0; }));
+}
+
+TEST_F(FileWatchTest, FileThatIsReplaced_IsToldAndToBeWatchedAgain) {
+    folder.write("config.json", "1");
+    watch({folder.path() / "config.json"});
+    folder.write("config.json.new", "2");
+    std::filesystem::rename(folder.path() / "config.json.new", folder.path() / "config.json");
+    EXPECT_TRUE(comes([this] { return changes > 0; }));
+    EXPECT_FALSE(watch({folder.path() / "config.json"})) << "the folder is the same";
+    settle();
+    changes = 0;
+    append(folder.path() / "config.json");
+    EXPECT_TRUE(comes([this] { return changes > 0; }));
+}
+
+// Dotfiles are links into a folder that nobody has named.
+TEST_F(FileWatchTest, FileBehindALink_IsToldWhenItIsWritten) {
+    test::TemporaryFolder elsewhere;
+    elsewhere.write("real.json", "1");
+    std::filesystem::create_symlink(elsewhere.path() / "real.json", folder.path() / "config.json");
+    watch({folder.path() / "config.json"});
+    append(elsewhere.path() / "real.json");
+    EXPECT_TRUE(comes([this] { return changes > 0; }));
+}
+
+TEST_F(FileWatchTest, FolderThatIsNotThere_IsNewOnceItIs) {
+    const auto file = folder.path() / "later" / "token";
+    EXPECT_FALSE(watch({file}));
+    std::filesystem::create_directory(folder.path() / "later");
+    EXPECT_TRUE(watch({file}));
+    EXPECT_FALSE(watch({file}));
+}
+
+TEST_F(FileWatchTest, WhoHasGone_IsToldNothing) {
+    auto mine = std::make_unique<FileWatch>([this] { ++changes; });
+    bool isTold = false;
+    mine->watch({folder.path() / "config.json"}, [&](bool) { isTold = true; });
+    mine.reset();
+    folder.write("config.json", "{}");
+    settle();
+    EXPECT_FALSE(isTold);
+    EXPECT_EQ(changes, 0);
+}
+
+}  // namespace ktr::linux_
