@@ -169,7 +169,7 @@ Finding maps(const Configuration& configuration) {
     }
     if (opened == 0) {
         return {"maps", State::NotUsed, "towns, borders and large roads alone: no streets are named",
-                "ktr config set maps.sources '[{\"file\": \"FILE.mbtiles\"}]'"};
+                "ktr maps add FILE.mbtiles"};
     }
     return fine("maps", std::to_string(opened) + (opened == 1 ? " map with streets" : " maps with streets"));
 }
