@@ -37,7 +37,8 @@ bool speak(const std::string& sentence, const std::string& language) {
 }  // namespace
 
 int AskCommand::run() {
-    host::QuestionDesk desk(host_);
+    using Audience = host::QuestionDesk::Audience;
+    host::QuestionDesk desk(host_, options_.aloud ? Audience::WhoeverHears : Audience::User);
     QEventLoop loop;
     std::optional<ask::Answer> answer;
     const std::string& text = options_.questions.front();

@@ -113,6 +113,7 @@ struct Parser {
     CLI::App* watch = nullptr;
     std::unique_ptr<KeepingArguments> keeping;
     CLI::App* wyoming = nullptr;
+    CLI::App* search = nullptr;
     Options options;
     Words words;
 
@@ -129,6 +130,8 @@ struct Parser {
             ->expected(1)
             ->type_name("QUESTION");
         ask->add_flag("--json", options.json, "Print all of the answer, as one line of JSON");
+        ask->add_flag("--aloud", options.aloud,
+                      "For whoever hears it: only friends who may be said aloud, and nothing is changed");
         ask->add_flag("--speak", options.speak, "Say the sentence aloud, through speech-dispatcher");
         ask->add_option("-o,--output", options.output, "Draw the answer, too")->type_name("FILE.png|.svg|.pdf");
         addCommon(*ask);
@@ -189,6 +192,12 @@ struct Parser {
         watch->footer("Example: ktr watch --print");
         keeping = std::make_unique<KeepingArguments>(app, options.config, options.doctor);
         addWyoming();
+        search = app.add_subcommand("search", "Answers the desktop's search, which starts it");
+        search->add_option("--language", words.language, "Language of questions and answers")->type_name("TAG");
+        search->add_option("--idle", options.searchIdle, "Seconds without a search until it ends (60)")
+            ->type_name("SECONDS")
+            ->check(CLI::Range(1, 86400));
+        search->add_option("--plugin", options.plugin, "The plugin's library")->type_name("PATH");
         show->footer(kShowExamples);
         render->footer(kRenderExamples);
         describe->footer(kDescribeExamples);
@@ -307,9 +316,10 @@ std::string readLive(const Words& words, Options& options) {
         }
         options.liveSeconds = *seconds;
     }
-    if (options.command == Options::Command::Ask || options.command == Options::Command::Wyoming) {
+    if (options.command == Options::Command::Ask || options.command == Options::Command::Wyoming ||
+        options.command == Options::Command::Search) {
         options.live = true;
-        return options.command == Options::Command::Ask ? "" : WyomingCommand::objection(options.wyoming);
+        return options.command == Options::Command::Wyoming ? WyomingCommand::objection(options.wyoming) : "";
     }
     if (!options.live && !options.questions.empty()) {
         return "--ask: nobody answers in a scenario; add --live";
@@ -411,6 +421,7 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
     }
     parser.options.command = parser.ask->parsed()       ? Options::Command::Ask
                              : parser.wyoming->parsed() ? Options::Command::Wyoming
+                             : parser.search->parsed()  ? Options::Command::Search
                              : parser.show->parsed()    ? Options::Command::Show
                              : parser.render->parsed()  ? Options::Command::Render
                                                         : Options::Command::Describe;

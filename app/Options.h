@@ -13,7 +13,7 @@ namespace ktr::app {
 
 /// What the command line asks for. Members that are none leave the decision to the scenario, then to the session.
 struct Options : host::HostOptions {
-    enum class Command { Show, Open, Render, Describe, Ask, Serve, AddMap, Watch, Wyoming, Config, Doctor };
+    enum class Command { Show, Open, Render, Describe, Ask, Serve, AddMap, Watch, Wyoming, Search, Config, Doctor };
 
     Command command = Command::Show;
     std::vector<std::string> scenarios;  ///< never empty where nothing is live, but for serve
@@ -24,6 +24,8 @@ struct Options : host::HostOptions {
     std::string output;                  ///< of render: a file ending in .png, .svg or .pdf
     bool json = false;                   ///< of ask: all of the answer, as JSON
     bool speak = false;                  ///< of ask: say it aloud
+    bool aloud = false;                  ///< of ask: whoever is in the room gets the answer
+    int searchIdle = 60;                 ///< of search: seconds without a call until it ends
     std::string plugin;                  ///< empty: looked for
     serve::ServeOptions serve;           ///< of serve
     WatchCommand::Options watch;         ///< of watch

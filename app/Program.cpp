@@ -17,6 +17,7 @@
 #include "app/MapsCommand.h"
 #include "app/Messages.h"
 #include "app/RenderCommand.h"
+#include "app/SearchCommand.h"
 #include "app/ServeCommand.h"
 #include "app/window/ShowCommand.h"
 #include "documents/Words.h"
@@ -125,6 +126,9 @@ host::ExitCode runHeadless(const Options& options, const host::HostSettings& set
     }
     if (options.command == Options::Command::Wyoming) {
         return WyomingCommand(host, options.wyoming).run();
+    }
+    if (options.command == Options::Command::Search) {
+        return SearchCommand(host, options.searchIdle).run();
     }
     const host::ExitCode code = options.live ? LiveRun(host, options).run(scenarios) : host::ExitCode::Ok;
     if (options.command == Options::Command::Render) {

@@ -1,6 +1,7 @@
 #include "ask/Engine.h"
 
 #include <algorithm>
+#include <string_view>
 #include <utility>
 
 #include "ask/Sight.h"
@@ -94,6 +95,26 @@ std::optional<Answer> Engine::answerHere(const Question& question) {
     auto begin = begun(question);
     auto* answer = std::get_if<Answer>(&begin);
     return answer == nullptr ? std::nullopt : std::optional(std::move(*answer));
+}
+
+std::variant<Answer, Understood> Engine::readHere(const Question& question) {
+    auto begin = begun(question);
+    if (auto* answer = std::get_if<Answer>(&begin)) {
+        return std::move(*answer);
+    }
+    return std::get<Shared>(begin)->understood;
+}
+
+std::string Engine::whereIs(const std::string& name, const std::string& language) const {
+    constexpr std::string_view kName = "{name}";
+    const auto known = languages_->language(language);
+    // The first suggestion with a name asks where somebody is.
+    for (const std::string& suggestion : known ? known->suggestions() : std::vector<std::string>()) {
+        if (const auto at = suggestion.find(kName); at != std::string::npos) {
+            return std::string(suggestion).replace(at, kName.size(), name);
+        }
+    }
+    return "";
 }
 
 void Engine::ask(const Question& question, const Completion& completion) {

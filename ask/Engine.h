@@ -4,6 +4,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <variant>
 #include <vector>
 
 #include "ask/Asking.h"
@@ -36,6 +37,10 @@ class Engine {
     /// The answer as far as it needs no service: not understood, unknown, ambiguous, locked, refused. None: the service has
     /// to be asked.
     std::optional<Answer> answerHere(const Question& question);
+    /// The same, or what the question says where the service has to be asked. What it points to is of `people`.
+    std::variant<Answer, Understood> readHere(const Question& question);
+    /// "Where is Ann?" in a language (BCP 47); empty where the languages cannot be read.
+    std::string whereIs(const std::string& name, const std::string& language) const;
 
   private:
     using Shared = std::shared_ptr<const Asking>;

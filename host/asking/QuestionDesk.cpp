@@ -87,14 +87,19 @@ void QuestionDesk::readPeople() {
     engine_.setPeople(std::move(people));
 }
 
-ask::Question QuestionDesk::question(const std::string& text, bool isLive) {
+ask::Question QuestionDesk::questionInWords(const std::string& text) const {
     ask::Question question;
     question.text = text;
     question.language = host_.settings().language;
     question.now = host_.platform()->clock->now();
     question.secondsFromUtc = QDateTime::currentDateTime().offsetFromUtc();
-    question.isLive = isLive;
     question.mayChange = audience_ == Audience::User;
+    return question;
+}
+
+ask::Question QuestionDesk::question(const std::string& text, bool isLive) {
+    ask::Question question = questionInWords(text);
+    question.isLive = isLive;
     if (!positions_ && host_.live() != nullptr && host_.live()->looksForPosition()) {
         positions_ = host_.platform()->locationManagers->makeManager(nullptr);
         positions_->setDesiredAccuracy(platform::kLocationAccuracyNearestTenMeters);
@@ -111,8 +116,7 @@ ask::Question QuestionDesk::question(const std::string& text, bool isLive) {
 }
 
 void QuestionDesk::ask(const ask::Question& question, const ask::Engine::Completion& completion) {
-    readPeople();
-    engine_.ask(question, [alive = std::weak_ptr<bool>(alive_), completion](ask::Answer answer) {
+    engine().ask(question, [alive = std::weak_ptr<bool>(alive_), completion](ask::Answer answer) {
         if (alive.lock()) {
             completion(std::move(answer));
         }

@@ -27,11 +27,17 @@ class QuestionDesk {
 
     /// A question with what the host knows of the asker. `isLive`: its card goes on changing.
     ask::Question question(const std::string& text, bool isLive);
+    /// The same without a look for the asker's position: for what is read here and not asked.
+    ask::Question questionInWords(const std::string& text) const;
     /// Calls the completion exactly once, perhaps inside the call, and not after this is gone.
     void ask(const ask::Question& question, const ask::Engine::Completion& completion);
     /// The same as a turn for the conversation: the sentence, and its snippet when there is one.
     Scenario scenarioOf(const ask::Answer& answer) const;
-    ask::Engine& engine() { return engine_; }
+    /// With the people of the contacts as they are now.
+    ask::Engine& engine() {
+        readPeople();
+        return engine_;
+    }
 
   private:
     void readPeople();

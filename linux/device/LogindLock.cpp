@@ -61,6 +61,7 @@ QDBusMessage getProperty(const QString& path, const QString& interface, const QS
 
 LogindLock::LogindLock(QDBusConnection bus) : bus_(std::move(bus)) {
     if (!bus_.isConnected()) {
+        isKnown_ = true;
         return;
     }
     auto* watcher = new QDBusServiceWatcher(kService, bus_, QDBusServiceWatcher::WatchForOwnerChange, this);
@@ -98,15 +99,16 @@ void LogindLock::findSessionOfUser() {
     call(bus_, this, message, [this](const QDBusPendingCall& answered) {
         const QDBusPendingReply<QDBusObjectPath> user = answered;
         if (!user.isValid()) {
-            return;
+            return setIsKnown();
         }
         call(bus_, this, getProperty(user.value().path(), kUser, QStringLiteral("Display")),
              [this](const QDBusPendingCall& display) {
                  const QDBusPendingReply<QDBusVariant> reply = display;
                  const QString path = reply.isValid() ? pathOfStructure(reply.value().variant()) : QString();
-                 if (!path.isEmpty()) {
-                     useSession(path);
+                 if (path.isEmpty()) {
+                     return setIsKnown();
                  }
+                 useSession(path);
              });
     });
 }
@@ -130,12 +132,19 @@ void LogindLock::setState(int state) {
     }
 }
 
+void LogindLock::setIsKnown() {
+    if (!std::exchange(isKnown_, true) && known_) {
+        known_();
+    }
+}
+
 void LogindLock::readHint() {
     call(bus_, this, getProperty(session_, kSession, kHint), [this](const QDBusPendingCall& answered) {
         const QDBusPendingReply<QDBusVariant> reply = answered;
         if (reply.isValid()) {
             setHint(reply.value().variant().toBool());
         }
+        setIsKnown();
     });
 }
 

@@ -28,6 +28,10 @@ class LogindLock : public QObject, public platform::DeviceLock {
     int lockState() const override { return state_; }
     /// Called after the state has become another.
     void setChanged(std::function<void()> changed) { changed_ = std::move(changed); }
+    /// Whether logind has answered, or there is none: before that nobody can tell.
+    bool isKnown() const { return isKnown_; }
+    /// Called once, when that has become so; not when it is so already.
+    void setKnown(std::function<void()> known) { known_ = std::move(known); }
 
   private Q_SLOTS:
     void propertiesChanged(const QString& interface, const QVariantMap& changed, const QStringList& invalidated);
@@ -38,12 +42,15 @@ class LogindLock : public QObject, public platform::DeviceLock {
     void useSession(const QString& path);
     void readHint();
     void setState(int state);
+    void setIsKnown();
     void setHint(bool locked) { setState(locked ? kLocked : kUnlocked); }
 
     QDBusConnection bus_;
     QString session_;
     int state_ = kWithoutLock;
+    bool isKnown_ = false;
     std::function<void()> changed_;
+    std::function<void()> known_;
 };
 
 }  // namespace ktr::linux_

@@ -265,5 +265,37 @@ TEST_F(EngineTest, ManyContacts_AreAskedForInSeveralRequestsAndNoneIsLeftOut) {
     EXPECT_NE(answer.sentence.find("P999 "), std::string::npos) << answer.sentence;
 }
 
+TEST_F(EngineTest, WhatIsReadHere_AsksNobody) {
+    question.text = "Where is Ann?";
+    const auto said = engine->readHere(question);
+    const auto* understood = std::get_if<Understood>(&said);
+    ASSERT_NE(understood, nullptr);
+    ASSERT_EQ(understood->people.size(), 1U);
+    EXPECT_EQ(understood->people.front()->handle(), "ann@harbour.example");
+    EXPECT_EQ(understood->people.front(), &engine->people()->all().front());
+    question.text = "Where is Xyzzy?";
+    const auto unknown = engine->readHere(question);
+    ASSERT_TRUE(std::holds_alternative<Answer>(unknown));
+    EXPECT_EQ(std::get<Answer>(unknown).outcome, Outcome::UnknownPerson);
+    EXPECT_TRUE(service.sent.empty());
+}
+
+TEST_F(EngineTest, QuestionWhereSomebodyIs_IsUnderstoodInItsLanguage) {
+    const auto folder = std::filesystem::path(KTR_SOURCE_DIR) / "resources/questions";
+    int languages = 0;
+    for (const auto& entry : std::filesystem::directory_iterator(folder)) {
+        question.language = entry.path().stem().string();
+        question.text = engine->whereIs("Ann Marsh", question.language);
+        const auto said = engine->readHere(question);
+        const auto* understood = std::get_if<Understood>(&said);
+        ASSERT_NE(understood, nullptr) << question.language << ": " << question.text;
+        EXPECT_EQ(understood->meaning.wish, Wish::WhereIs) << question.text;
+        ASSERT_EQ(understood->people.size(), 1U) << question.text;
+        EXPECT_EQ(understood->people.front()->fullName, "Ann Marsh");
+        ++languages;
+    }
+    EXPECT_EQ(languages, 21);
+}
+
 }  // namespace
 }  // namespace ktr::ask
