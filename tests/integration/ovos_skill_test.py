@@ -113,6 +113,7 @@ class OvosSkillTest(unittest.TestCase):
                      json.dumps({"type": "ovos.skills.fallback.ktr-skill.ktr.request", "data": {"utterances": [{}]}}),
                      "[" * 100_000, '{"type":"\\ud800"}', "x" * 1_000_000):
             self.bus.raw(junk)
+        self.assertIsNotNone(self.bus.wait_for_type("ovos.skills.fallback.ktr-skill.ktr.response"))
         self.assertTrue(self.bus.ask("where is ann")[1])
         since = len(self.bus.heard)
         self.bus.drop()

@@ -19,7 +19,7 @@ def language_tag(text):
     if not isinstance(text, str) or not LANGUAGE.fullmatch(text):
         return None
     first, *others = text.split("-")
-    return "-".join([first.lower(), *(part.upper() if len(part) == 2 else part for part in others)])
+    return "-".join([first.lower(), *(part.upper() if len(part) == 2 else part.title() for part in others)])
 
 
 class Pictures:
