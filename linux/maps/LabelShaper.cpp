@@ -6,6 +6,7 @@
 #include <QRawFont>
 #include <QTextLayout>
 
+#include "linux/maps/LabelHalo.h"
 #include "linux/paint/FontChoice.h"
 #include "platform/ui/Font.h"
 
@@ -42,16 +43,15 @@ bool standAlone(const QString& text) {
     });
 }
 
-/// Stroked once for each letter, not in each picture: the strokes of letters are most of what a name costs.
-QPainterPath haloOf(const QPainterPath& letter, double width) {
-    QPainterPathStroker stroker;
-    stroker.setWidth(width);
-    stroker.setCapStyle(Qt::RoundCap);
-    stroker.setJoinStyle(Qt::RoundJoin);
-    QPainterPath halo = stroker.createStroke(letter);
-    halo.addPath(letter);
-    halo.setFillRule(Qt::WindingFill);
-    return halo;
+/// A path of polygons, in sizes of the letters: curves are made straight once, not in each picture.
+QPainterPath pathOf(const QList<QPolygonF>& rings, double unit) {
+    QPainterPath path;
+    path.setFillRule(Qt::WindingFill);
+    for (const QPolygonF& ring : rings) {
+        path.addPolygon(QTransform::fromScale(unit, unit).map(ring));
+        path.closeSubpath();
+    }
+    return path;
 }
 
 QList<QTextLayout::FormatRange> formats(const QString& text, bool isBold, const std::string& language) {
@@ -115,21 +115,21 @@ std::shared_ptr<const LabelGlyphs> LabelShaper::shape(const std::string& name, c
         for (qsizetype index = 0; index < indexes.size(); ++index) {
             auto& letter = letters_[{fontName, indexes[index], style.haloWidth}];
             if (letter.outline.isEmpty()) {
-                const QPainterPath drawn = font.pathForGlyph(indexes[index]);
-                letter.outline = QTransform::fromScale(unit, unit).map(drawn);
-                letter.halo = QTransform::fromScale(unit, unit).map(haloOf(drawn, style.haloWidth * kShapedPixels));
+                const auto rings = font.pathForGlyph(indexes[index]).toSubpathPolygons();
+                letter.outline = pathOf(rings, unit);
+                letter.halo = pathOf(LabelHalo::around(rings, style.haloWidth * kShapedPixels / 2.0), unit);
             }
             LabelGlyphs::Glyph glyph;
             glyph.outline = letter.outline;
             glyph.halo = letter.halo;
+            glyph.ink = letter.outline.boundingRect();
             glyph.x = (positions[index].x() - left) * unit;
             glyph.y = (positions[index].y() - baseline) * unit;
             glyph.advance = index < advances.size() ? advances[index].x() * unit : 0.0;
-            const QRectF ink = letter.outline.boundingRect();
-            hasInk = hasInk || !ink.isEmpty();
-            made->width = std::max({made->width, glyph.x + glyph.advance, glyph.x + ink.right()});
-            made->ascent = std::max(made->ascent, -(glyph.y + ink.top()));
-            made->descent = std::max(made->descent, glyph.y + ink.bottom());
+            hasInk = hasInk || !glyph.ink.isEmpty();
+            made->width = std::max({made->width, glyph.x + glyph.advance, glyph.x + glyph.ink.right()});
+            made->ascent = std::max(made->ascent, -(glyph.y + glyph.ink.top()));
+            made->descent = std::max(made->descent, glyph.y + glyph.ink.bottom());
             made->glyphs.push_back(std::move(glyph));
         }
     }

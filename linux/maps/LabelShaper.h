@@ -10,6 +10,7 @@
 #include <vector>
 
 #include <QPainterPath>
+#include <QRectF>
 #include <QString>
 
 namespace ktr::linux_ {
@@ -17,8 +18,9 @@ namespace ktr::linux_ {
 /// A name as outlines, at a size of 1 point: the baseline begins at (0, 0). Immutable.
 struct LabelGlyphs {
     struct Glyph {
-        QPainterPath outline;  ///< from the glyph's own origin
+        QPainterPath outline;  ///< from the glyph's own origin; without curves
         QPainterPath halo;     ///< the outline made wider by half of the halo's width on each side
+        QRectF ink;            ///< around the outline
         double x = 0.0;        ///< of the origin
         double y = 0.0;
         double advance = 0.0;

@@ -132,12 +132,11 @@ std::vector<QRectF> MapLabels::boxes(const Text& text, const std::vector<Stand>&
     const double halo = MapStyle::kHaloWidth / 2.0;
     for (std::size_t index = 0; index < stands.size(); ++index) {
         const auto& glyph = text.glyphs->glyphs[index];
-        QRectF ink = glyph.outline.boundingRect();
-        if (ink.isEmpty()) {
+        if (glyph.ink.isEmpty()) {
             continue;
         }
         const double grown = halo / text.look.size;
-        made.push_back(transform(text, stands[index]).mapRect(ink.adjusted(-grown, -grown, grown, grown)));
+        made.push_back(transform(text, stands[index]).mapRect(glyph.ink.adjusted(-grown, -grown, grown, grown)));
     }
     return made;
 }

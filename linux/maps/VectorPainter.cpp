@@ -89,6 +89,26 @@ void VectorPainter::strokeEdges(tiles::MapKind kind, const QColor& color, double
     });
 }
 
+void VectorPainter::strokeBuildings() {
+    // Walls are straight and thin: side by side they are drawn four times as fast as one line that turns, and look
+    // alike.
+    constexpr double kWidth = MapStyle::kBuildingEdgeWidth;
+    painter_.setPen(QPen(style_.buildingEdge, kWidth, Qt::SolidLine, Qt::FlatCap));
+    QList<QLineF> walls;
+    each(tiles::MapKind::Building, tiles::MapTile::Shape::Areas,
+         [&](const TileGeometry& geometry, const tiles::MapTile::Feature& feature) {
+             geometry.eachEdge(feature, [&](const QPolygonF& piece, double /*from*/) {
+                 if (budget_.takeLine(piece, kWidth)) {
+                     walls.clear();
+                     for (qsizetype i = 1; i < piece.size(); ++i) {
+                         walls.append(QLineF(piece[i - 1], piece[i]));
+                     }
+                     painter_.drawLines(walls);
+                 }
+             });
+         });
+}
+
 void VectorPainter::strokeLines(const std::vector<QPolygonF>& pieces, const QColor& color, double width) {
     if (width > 0.0) {
         painter_.setPen(roundPen(color, width));
@@ -164,7 +184,7 @@ void VectorPainter::drawWater() {
 void VectorPainter::drawBuildings() {
     if (scale_.showsBuildings()) {
         fill(tiles::MapKind::Building, style_.building);
-        strokeEdges(tiles::MapKind::Building, style_.buildingEdge, MapStyle::kBuildingEdgeWidth);
+        strokeBuildings();
     }
 }
 

@@ -27,6 +27,7 @@ class VectorPainter {
     std::vector<QPolygonF> lines(tiles::MapKind kind) const;
     void fill(tiles::MapKind kind, const QColor& color);
     void strokeEdges(tiles::MapKind kind, const QColor& color, double width);
+    void strokeBuildings();
     void strokeLine(const QPolygonF& piece, double width);
     void strokeLines(const std::vector<QPolygonF>& pieces, const QColor& color, double width);
     void drawSurfaces();
