@@ -6,6 +6,7 @@
 #include <cstdlib>
 #include <limits>
 #include <optional>
+#include <utility>
 
 #include "model/KTRVALocation.h"
 #include "model/PluginBundle.h"
@@ -61,7 +62,7 @@ Band bandOf(std::int64_t seconds) {
 
 }  // namespace
 
-platform::Dictionary KTRVAUIUtils::dictionaryWithAgeStringsForDate(const platform::Date& date) {
+KTRVAUIUtils::AgeStrings KTRVAUIUtils::ageStringsForDate(const platform::Date& date) {
     KTR_ASSERT_MAIN_THREAD();
     const Band band = bandOf(ageInSeconds(date));
     std::string row = AssistantLocalizedString(band.rowKey);
@@ -71,7 +72,12 @@ platform::Dictionary KTRVAUIUtils::dictionaryWithAgeStringsForDate(const platfor
         row = platform::formatted(row, {number});
         spoken = platform::formatted(spoken, {number});
     }
-    return {{LabelStringKey, row}, {LabelAccessibilityStringKey, spoken}};
+    return {std::move(row), std::move(spoken)};
+}
+
+platform::Dictionary KTRVAUIUtils::dictionaryWithAgeStringsForDate(const platform::Date& date) {
+    auto strings = ageStringsForDate(date);
+    return {{LabelStringKey, std::move(strings.shown)}, {LabelAccessibilityStringKey, std::move(strings.spoken)}};
 }
 
 int KTRVAUIUtils::ageBandForDate(const platform::Date& date) {

@@ -1,6 +1,7 @@
 #include "plugin/VAKTRMultipleLocationsSnippetController.h"
 
 #include <string>
+#include <string_view>
 #include <unordered_map>
 #include <unordered_set>
 #include <utility>
@@ -97,13 +98,14 @@ void VAKTRMultipleLocationsSnippetController::createFriendViews() {
     }
     // A handle that comes again has one row, which stands, and is filled, at its last place: what the earlier places
     // would show of it is never seen.
-    std::unordered_map<std::string, std::size_t> lastPlaces;
     std::vector<std::string> keys;
     keys.reserve(known.size());
+    std::unordered_map<std::string_view, std::size_t> lastPlaces;
+    lastPlaces.reserve(known.size());
     std::size_t withoutHandle = 0;
     for (std::size_t i = 0; i < known.size(); ++i) {
-        const auto handle = known[i]->friendHandle();
-        keys.push_back(handle ? *handle : keyWithoutHandle(withoutHandle++));
+        auto handle = known[i]->friendHandle();
+        keys.push_back(handle ? *std::move(handle) : keyWithoutHandle(withoutHandle++));
         lastPlaces[keys.back()] = i;
     }
     FriendViews views;
@@ -117,8 +119,8 @@ void VAKTRMultipleLocationsSnippetController::createFriendViews() {
         auto row = rowForKey(keys[i]);
         row->setLocation(known[i]);
         row->setSeparatorEnabled(i + 1 < known.size() || displayShowAllRow_);
-        views[keys[i]] = row;
-        rows.push_back(std::move(row));
+        rows.push_back(row);
+        views.emplace(keys[i], std::move(row));
     }
     const FriendViews earlier = std::exchange(friendViews_, std::move(views));
     if (displayShowAllRow_ && singleLabelView_) {
@@ -146,7 +148,11 @@ std::shared_ptr<KTRVelaFriendView> VAKTRMultipleLocationsSnippetController::rowF
 
 void VAKTRMultipleLocationsSnippetController::arrange(Views rows, const FriendViews& earlier) {
     const auto container = containerView();
-    if (!container) {
+    if (displayShowAllRow_ && singleLabelView_) {
+        rows.push_back(singleLabelView_);
+    }
+    // The same friends as before, in the same order: nothing comes or goes.
+    if (!container || (earlier.size() == friendViews_.size() && rows == container->arrangedSubviews())) {
         return;
     }
     // Rows whose friends are gone leave the tree, wherever they wait; so does whatever else stands in the arrangement.
@@ -154,9 +160,6 @@ void VAKTRMultipleLocationsSnippetController::arrange(Views rows, const FriendVi
                                                       container->arrangedSubviews().end());
     for (const auto& [key, row] : earlier) {
         surplus.insert(row);
-    }
-    if (displayShowAllRow_ && singleLabelView_) {
-        rows.push_back(singleLabelView_);
     }
     for (const auto& view : rows) {
         surplus.erase(view);

@@ -6,7 +6,6 @@
 
 #include "model/ContactsUtilities.h"
 #include "model/KTRVATheme.h"
-#include "model/KTRVAUIUtils.h"
 #include "model/LabelUtil.h"
 #include "model/LogCategory.h"
 #include "model/PluginBundle.h"
@@ -43,11 +42,6 @@ void setSpokenText(const std::shared_ptr<Label>& label, std::optional<std::strin
     if (label) {
         label->setAccessibilityLabel(std::move(text));
     }
-}
-
-std::string entry(const platform::Dictionary& texts, const char* key) {
-    const platform::Value* value = texts.find(key);
-    return value ? value->description() : "";
 }
 
 }  // namespace
@@ -173,20 +167,16 @@ void KTRVelaFriendView::updatePlace() {
     setSpokenText(locationLabel_, std::move(spoken));
 }
 
-platform::Dictionary KTRVelaFriendView::ageTexts() const {
+KTRVAUIUtils::AgeStrings KTRVelaFriendView::ageTexts() const {
     const auto object = location_ ? location_->velaLocation() : nullptr;
     const double date = object ? object->locationDate.value_or(0.0) : 0.0;
-    return date > 0.0 ? KTRVAUIUtils::dictionaryWithAgeStringsForDate({date}) : platform::Dictionary();
-}
-
-std::string KTRVelaFriendView::ageText(const char* key) const {
-    return entry(ageTexts(), key);
+    return date > 0.0 ? KTRVAUIUtils::ageStringsForDate({date}) : KTRVAUIUtils::AgeStrings();
 }
 
 void KTRVelaFriendView::updateAge() {
-    const auto ages = ageTexts();
-    setText(timeLabel_, entry(ages, LabelStringKey));
-    setSpokenText(timeLabel_, entry(ages, LabelAccessibilityStringKey));
+    auto ages = ageTexts();
+    setText(timeLabel_, ages.shown);
+    setSpokenText(timeLabel_, std::move(ages.spoken));
 }
 
 std::shared_ptr<platform::PlatformLocation> KTRVelaFriendView::userLocation() const {
@@ -235,7 +225,7 @@ std::string KTRVelaFriendView::accessibilityText() const {
         const bool isPlaced = location_ && location_->hasCoordinate();
         parts.push_back(isPlaced ? filled("ACCESSIBILITY_AT_LABEL", placeText()) : placeText());
         parts.push_back(isVisibility_ ? "" : filled("ACCESSIBILITY_DISTANCE", distanceText()));
-        parts.push_back(ageText(LabelAccessibilityStringKey));
+        parts.push_back(ageTexts().spoken);
     }
     return SpokenRow::line(parts);
 }

@@ -5,6 +5,7 @@
 #include <string>
 
 #include "model/KTRVALocation.h"
+#include "model/KTRVAUIUtils.h"
 #include "platform/base/NotificationCenter.h"
 #include "platform/ui/AccessibilitySubject.h"
 #include "views/CurrentLocationDelegate.h"
@@ -67,13 +68,11 @@ class KTRVelaFriendView : public KTRVelaBaseView, public platform::Accessibility
     std::string nameText() const;
     std::string placeText() const;
     std::string distanceText() const;
-    /// An entry of the texts for the fix's age; "" without a date.
-    std::string ageText(const char* key) const;
+    /// Shown and spoken; both empty without a date.
+    KTRVAUIUtils::AgeStrings ageTexts() const;
 
   private:
     std::shared_ptr<platform::PlatformLocation> userLocation() const;
-    /// Shown and spoken; empty without a date.
-    platform::Dictionary ageTexts() const;
     void setupLabels();
     void setupConstraints();
     void updatePlace();

@@ -22,6 +22,8 @@ namespace ktr::linux_ {
 namespace {
 
 constexpr const char* kFrameKey = "DISTANCE_TEXT";
+/// The distance and nothing else.
+constexpr const char* kPlainFrame = "%@";
 constexpr std::string_view kNoBreakSpace = "\u00a0";
 
 /// A friend who walks towards the user should be seen to come nearer: tens where road signs count in fifties.
@@ -141,21 +143,51 @@ icu::Locale withDigitsOf(icu::Locale language, const std::string& region) {
     return language;
 }
 
+/// The number that is written, without its decimal point: one for all that are written alike. None where rounding goes
+/// by a hair, and for what is too small or large to be worth keeping.
+std::optional<std::int64_t> roundedNumber(double number, bool isInTens) {
+    constexpr double kMost = 1e5;
+    constexpr double kHair = 1e-6;
+    if (number < 0.1 || number >= kMost) {
+        return std::nullopt;
+    }
+    // Two digits at least: 0.57, 5.7, 57, 573.
+    const int decimals = number < 1.0 ? 2 : number < 10.0 ? 1 : 0;
+    const double scaled = isInTens ? number / kStep : number * (decimals == 2 ? 100.0 : decimals == 1 ? 10.0 : 1.0);
+    const double whole = std::floor(scaled + 0.5);
+    if (std::abs(scaled + 0.5 - std::round(scaled + 0.5)) < kHair) {
+        return std::nullopt;
+    }
+    return static_cast<std::int64_t>(whole) * 4 + (isInTens ? 3 : decimals);
+}
+
+std::string wordsOf(const icu::number::FormattedNumber& number, UErrorCode& status) {
+    std::string text;
+    number.toTempString(status).toUTF8String(text);
+    for (auto at = text.find(' '); at != std::string::npos; at = text.find(' ', at)) {
+        text.replace(at, 1, kNoBreakSpace);
+    }
+    return text;
+}
+
 }  // namespace
 
 /// Asking for the unit costs four times as much as writing in one that is known. From which distance to which a unit
 /// serves is learnt from the answers: units follow each other, so that what lies between two distances in one unit is
-/// in it too.
+/// in it too. There are few numbers once they are rounded: each is written once.
 struct IcuDistanceCalculator::Formatter {
     struct Stretch {
         std::string unit;
         double metres = 1.0;  ///< in the unit
         double from = 0.0;
         double to = 0.0;
+        bool isInTens = false;
         icu::number::LocalizedNumberFormatter format;
+        std::unordered_map<std::int64_t, std::string> words;  ///< by `roundedNumber`
     };
 
-    std::optional<icu::number::FormattedNumber> known(double metres, UErrorCode& status) const;
+    /// The words of a distance in a unit that serves for it, or none when no such unit is known.
+    std::optional<std::string> known(double metres, UErrorCode& status);
     void learn(const icu::MeasureUnit& unit, double metres);
 
     /// Chooses the unit.
@@ -167,13 +199,25 @@ struct IcuDistanceCalculator::Formatter {
     bool usable = false;
 };
 
-std::optional<icu::number::FormattedNumber> IcuDistanceCalculator::Formatter::known(double metres,
-                                                                                    UErrorCode& status) const {
+std::optional<std::string> IcuDistanceCalculator::Formatter::known(double metres, UErrorCode& status) {
     const auto found = std::find_if(stretches.begin(), stretches.end(), [metres](const Stretch& stretch) {
         return metres >= stretch.from && metres <= stretch.to;
     });
-    return found == stretches.end() ? std::nullopt
-                                    : std::optional(found->format.formatDouble(metres / found->metres, status));
+    if (found == stretches.end()) {
+        return std::nullopt;
+    }
+    const double number = metres / found->metres;
+    const auto rounded = roundedNumber(number, found->isInTens);
+    if (rounded) {
+        if (const auto words = found->words.find(*rounded); words != found->words.end()) {
+            return words->second;
+        }
+    }
+    auto words = wordsOf(found->format.formatDouble(number, status), status);
+    if (rounded && U_SUCCESS(status)) {
+        found->words.emplace(*rounded, words);
+    }
+    return words;
 }
 
 void IcuDistanceCalculator::Formatter::learn(const icu::MeasureUnit& unit, double metres) {
@@ -185,8 +229,9 @@ void IcuDistanceCalculator::Formatter::learn(const icu::MeasureUnit& unit, doubl
         if (size == 0.0) {
             return;
         }
-        const auto& format = isShortUnit(unit) ? tens : twoDigits;
-        stretches.push_back({std::string(name), size, metres, metres, format.unit(unit)});
+        const bool isInTens = isShortUnit(unit);
+        const auto& format = isInTens ? tens : twoDigits;
+        stretches.push_back({std::string(name), size, metres, metres, isInTens, format.unit(unit), {}});
         return;
     }
     found->from = std::min(found->from, metres);
@@ -256,33 +301,28 @@ std::string IcuDistanceCalculator::worded(double metres) const {
         return {};
     }
     UErrorCode status = U_ZERO_ERROR;
-    auto formatted = formatter_->known(metres, status);
-    if (!formatted) {
-        formatted = formatter_->road.formatDouble(metres, status);
-        const icu::MeasureUnit unit = formatted->getOutputUnit(status);
+    auto words = formatter_->known(metres, status);
+    if (!words) {
+        const auto number = formatter_->road.formatDouble(metres, status);
+        const icu::MeasureUnit unit = number.getOutputUnit(status);
         if (U_SUCCESS(status) && metres >= kLeastInTens) {
             formatter_->learn(unit, metres);
-            if (auto direct = formatter_->known(metres, status)) {
-                formatted = std::move(direct);
-            }
+            words = formatter_->known(metres, status);
+        }
+        if (!words) {
+            words = wordsOf(number, status);
         }
     }
-    std::string text;
-    formatted->toTempString(status).toUTF8String(text);
-    if (U_FAILURE(status)) {
-        return {};
-    }
-    for (auto at = text.find(' '); at != std::string::npos; at = text.find(' ', at)) {
-        text.replace(at, 1, kNoBreakSpace);
-    }
-    return text;
+    return U_SUCCESS(status) ? *std::move(words) : std::string();
 }
 
 std::string IcuDistanceCalculator::framed(const std::string& text) const {
     const auto& texts = settings_.localizationDelegate;
-    return texts
-               ? platform::formatted(texts->text(kFrameKey, texts->hostBundleIdentifier(), std::nullopt, "%@"), {text})
-               : text;
+    if (!texts) {
+        return text;
+    }
+    const std::string frame = texts->text(kFrameKey, texts->hostBundleIdentifier(), std::nullopt, kPlainFrame);
+    return frame == kPlainFrame ? text : platform::formatted(frame, {text});
 }
 
 long IcuDistanceCalculator::measurementSystem() const {

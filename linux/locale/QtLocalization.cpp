@@ -80,23 +80,42 @@ bool QtLocalization::addBundle(const std::string& bundleIdentifier, const std::f
             translators.push_back(std::move(translator));
         }
     }
-    bundles_[bundleIdentifier] = std::move(translators);
+    bundles_[bundleIdentifier] = Texts{std::move(translators), {}};
     return english;
+}
+
+std::optional<std::string> QtLocalization::find(const Translators& translators, const std::string& table,
+                                                const std::string& key) {
+    for (const auto& translator : translators) {
+        const QString found = translator->translate(table.c_str(), key.c_str());
+        if (!found.isNull()) {
+            return found.toStdString();
+        }
+    }
+    return std::nullopt;
 }
 
 std::string QtLocalization::text(const std::string& key, const std::string& bundleIdentifier,
                                  const std::optional<std::string>& table,
                                  const std::optional<std::string>& defaultValue) const {
-    const std::string context = table.value_or(kDefaultTable);
-    if (const auto bundle = bundles_.find(bundleIdentifier); bundle != bundles_.end()) {
-        for (const auto& translator : bundle->second) {
-            const QString found = translator->translate(context.c_str(), key.c_str());
-            if (!found.isNull()) {
-                return found.toStdString();
-            }
-        }
+    const auto bundle = bundles_.find(bundleIdentifier);
+    if (bundle == bundles_.end()) {
+        return defaultValue.value_or(key);
     }
-    return defaultValue.value_or(key);
+    const Texts& texts = bundle->second;
+    if (table) {
+        return find(texts.translators, *table, key).value_or(defaultValue.value_or(key));
+    }
+    if (const auto known = texts.known.find(key); known != texts.known.end()) {
+        return known->second;
+    }
+    auto found = find(texts.translators, kDefaultTable, key);
+    if (!found) {
+        // Not kept: such keys may be anybody's words, without end.
+        return defaultValue.value_or(key);
+    }
+    texts.known.emplace(key, *found);
+    return *std::move(found);
 }
 
 }  // namespace ktr::linux_

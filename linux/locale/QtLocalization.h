@@ -3,7 +3,9 @@
 #include <filesystem>
 #include <map>
 #include <memory>
+#include <optional>
 #include <string>
+#include <unordered_map>
 #include <vector>
 
 #include "platform/assistant/Localization.h"
@@ -45,11 +47,20 @@ class QtLocalization : public platform::Localization {
   private:
     using Translators = std::vector<std::unique_ptr<QTranslator>>;
 
+    struct Texts {
+        /// The most fitting language first, English last.
+        Translators translators;
+        /// Texts of the default table that were found: a row asks for the same few each time that it is filled.
+        mutable std::unordered_map<std::string, std::string> known;
+    };
+
+    static std::optional<std::string> find(const Translators& translators, const std::string& table,
+                                           const std::string& key);
+
     std::string language_;
     /// Of the bundle that was added last: the bundles of a project come in the same languages.
     std::string languageOfTexts_;
-    /// By bundle; the most fitting language first, English last.
-    std::map<std::string, Translators> bundles_;
+    std::map<std::string, Texts> bundles_;
 };
 
 }  // namespace ktr::linux_

@@ -90,14 +90,16 @@ Conversion conversionAt(std::string_view format) {
     const auto found = [&](Conversion::Kind kind, std::size_t length) {
         return Conversion{kind, at + length, position};
     };
-    if (rest.starts_with("%")) {
-        return found(Conversion::Kind::Percent, 1);
-    }
-    if (rest.starts_with("@")) {
-        return found(Conversion::Kind::Text, 1);
-    }
-    if (rest.starts_with("i") || rest.starts_with("d")) {
-        return found(Conversion::Kind::Whole, 1);
+    switch (rest.empty() ? '\0' : rest.front()) {
+        case '%':
+            return found(Conversion::Kind::Percent, 1);
+        case '@':
+            return found(Conversion::Kind::Text, 1);
+        case 'i':
+        case 'd':
+            return found(Conversion::Kind::Whole, 1);
+        default:
+            break;
     }
     if (rest.starts_with("li")) {
         return found(Conversion::Kind::Whole, 2);
@@ -108,16 +110,17 @@ Conversion conversionAt(std::string_view format) {
     return {};
 }
 
-std::string argumentText(const Conversion& conversion, const FormatArguments& arguments, std::size_t index,
-                         bool redact) {
+void appendArgument(const Conversion& conversion, const FormatArguments& arguments, std::size_t index, bool redact,
+                    std::string& out) {
     if (index >= arguments.size()) {
-        return "(null)";
+        out += "(null)";
+    } else if (redact && arguments[index].isPrivate()) {
+        out += "<private>";
+    } else if (conversion.kind == Conversion::Kind::Real) {
+        out += wholeText(arguments[index].number());
+    } else {
+        out += arguments[index].text();
     }
-    const FormatArgument& argument = arguments[index];
-    if (redact && argument.isPrivate()) {
-        return "<private>";
-    }
-    return conversion.kind == Conversion::Kind::Real ? wholeText(argument.number()) : argument.text();
 }
 
 /// The branch of a plural text that goes with the number in the first argument, by the rules of the texts' language.
@@ -165,7 +168,7 @@ std::string formatted(std::string_view format, const FormatArguments& arguments,
             out.push_back('%');
         } else {
             const std::size_t index = conversion.position > 0 ? conversion.position - 1 : next++;
-            out += argumentText(conversion, arguments, index, redact);
+            appendArgument(conversion, arguments, index, redact, out);
         }
         at += conversion.length;
     }

@@ -13,7 +13,9 @@ class ContactAvatarController::AvatarView : public View {
     AvatarView() { setUserInteractionEnabled(false); }
 
     void setContact(std::shared_ptr<Contact> contact) {
-        if (contact != contact_) {
+        // Whoever is in no address book is given another empty contact at each filling: it looks like the last one.
+        const bool isUnknownAgain = contact && contact_ && contact->isEmpty() && contact_->isEmpty();
+        if (contact != contact_ && !isUnknownAgain) {
             contact_ = std::move(contact);
             setNeedsDisplay();
         }

@@ -51,7 +51,7 @@ void KTRAXVelaFriendView::updateView() {
 
 AXRowTexts KTRAXVelaFriendView::texts() const {
     std::vector<std::string> pieces = {placeText()};
-    if (const std::string age = ageText(LabelStringKey); !age.empty()) {
+    if (const std::string age = ageTexts().shown; !age.empty()) {
         pieces.push_back(platform::formatted(" \u2014 %@", {age}));
     }
     if (const std::string distance = distanceText(); !distance.empty()) {

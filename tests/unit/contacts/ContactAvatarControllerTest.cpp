@@ -1,5 +1,6 @@
 #include "platform/contacts/ContactAvatarController.h"
 
+#include "platform/ui/Window.h"
 #include "tests/support/PlatformTest.h"
 #include "tests/support/RecordingCanvas.h"
 
@@ -33,6 +34,29 @@ TEST_F(ContactAvatarControllerTest, FirstContact_IsShown) {
 TEST_F(ContactAvatarControllerTest, EmptyContact_IsTheBlankFigure) {
     controller->setContacts({std::make_shared<Contact>()});
     EXPECT_EQ(painted(), "blank");
+}
+
+TEST_F(ContactAvatarControllerTest, AnotherEmptyContact_IsNotDrawnAgain) {
+    struct Screen : WindowClient {
+        void windowNeedsDisplay(const Rect&) override { ++redrawn; }
+        void windowNeedsLayout() override {}
+        int redrawn = 0;
+    };
+    const auto window = create<Window>(&Window::initWithFrame, Rect{0, 0, 54, 54});
+    window->addSubview(controller->view());
+    controller->view()->setFrame({0, 0, 54, 54});
+    const auto screen = std::make_shared<Screen>();
+    window->setClient(screen);
+    controller->setContacts({std::make_shared<Contact>()});
+    EXPECT_EQ(screen->redrawn, 1);
+    controller->setContacts({std::make_shared<Contact>()});
+    EXPECT_EQ(screen->redrawn, 1);
+    auto ann = std::make_shared<Contact>();
+    ann->identifier = "ann";
+    controller->setContacts({ann});
+    EXPECT_EQ(screen->redrawn, 2);
+    controller->setContacts({std::make_shared<Contact>()});
+    EXPECT_EQ(screen->redrawn, 3);
 }
 
 TEST_F(ContactAvatarControllerTest, View_TakesNoTouches) {

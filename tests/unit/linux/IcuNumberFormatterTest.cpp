@@ -3,6 +3,12 @@
 #include <gtest/gtest.h>
 
 #include <clocale>
+#include <cstdint>
+#include <random>
+#include <string>
+
+#include <unicode/locid.h>
+#include <unicode/numberformatter.h>
 
 namespace ktr::linux_ {
 
@@ -34,6 +40,26 @@ TEST(IcuNumberFormatterTest, Integers_AreWrittenInTheLanguagesDigitsWithoutGroup
     EXPECT_EQ(IcuNumberFormatter("fa-IR").plainStringFromInteger(59), "۵۹");
     EXPECT_EQ(IcuNumberFormatter("de-CH").plainStringFromInteger(1234567), "1234567");
     EXPECT_EQ(IcuNumberFormatter("hi-IN").plainStringFromInteger(12), "12");
+}
+
+// Numbers are put together from digits: they must stay what the library writes.
+TEST(IcuNumberFormatterTest, Integers_AreWrittenAsTheLibraryWritesThem) {
+    std::mt19937_64 random(7);
+    for (const char* tag : {"ar-EG", "bn-BD", "de-CH", "en-GB", "fa-IR", "hi-IN-u-nu-deva", "my-MM", "zh-TW",
+                            "zh-u-nu-hanidec", "zh-u-nu-hans", "he-u-nu-hebr", "en-u-nu-roman", "ta-u-nu-taml"}) {
+        UErrorCode status = U_ZERO_ERROR;
+        const auto library = icu::number::NumberFormatter::withLocale(icu::Locale::forLanguageTag(tag, status))
+                                 .grouping(UNUM_GROUPING_OFF)
+                                 .precision(icu::number::Precision::integer());
+        const IcuNumberFormatter numbers(tag);
+        for (int i = 0; i < 200; ++i) {
+            const auto number = static_cast<std::int64_t>(random() >> (i % 64)) * (i % 5 == 0 ? -1 : 1);
+            std::string expected;
+            library.formatInt(number, status).toString(status).toUTF8String(expected);
+            ASSERT_TRUE(U_SUCCESS(status)) << tag;
+            ASSERT_EQ(numbers.plainStringFromInteger(number), expected) << tag << ", " << number;
+        }
+    }
 }
 
 TEST(IcuNumberFormatterTest, AnUnknownLocale_StillWritesNumbers) {

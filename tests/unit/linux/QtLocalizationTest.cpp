@@ -263,6 +263,20 @@ TEST(QtLocalizationTextsTest, PosixNames_AreRead) {
     EXPECT_EQ(ProjectsTexts("de_AT").text("APPLICATION_NAME", platform::kSnippetsBundle), "Freunde");
 }
 
+// Texts that were found are kept, by table and bundle.
+TEST(QtLocalizationTextsTest, TextsThatAreAskedForAgain_AreTheSame_UntilTheBundleIsAnother) {
+    ProjectsTexts texts("de");
+    for (int i = 0; i < 2; ++i) {
+        EXPECT_EQ(texts.text("APPLICATION_NAME", platform::kSnippetsBundle), "Freunde");
+        EXPECT_EQ(texts.text("APPLICATION_NAME", platform::kSnippetsBundle, "NoSuchTable"), "APPLICATION_NAME");
+        EXPECT_EQ(texts.text("APPLICATION_NAME", "org.example", std::nullopt, "default"), "default");
+        EXPECT_EQ(texts.text("NO_SUCH_KEY", platform::kSnippetsBundle, std::nullopt, "default"), "default");
+        EXPECT_EQ(texts.text("NO_SUCH_KEY", platform::kSnippetsBundle), "NO_SUCH_KEY");
+    }
+    texts.addBundle(platform::kSnippetsBundle, "/nonexistent", "texts");
+    EXPECT_EQ(texts.text("APPLICATION_NAME", platform::kSnippetsBundle), "APPLICATION_NAME");
+}
+
 TEST(QtLocalizationTextsTest, AFolderWithoutTexts_IsNoBundle) {
     QtLocalization localization("en");
     EXPECT_FALSE(localization.addBundle("org.example", "/nonexistent", "texts"));
