@@ -8,6 +8,7 @@
 
 #include "app/Messages.h"
 #include "app/RenderCommand.h"
+#include "documents/Words.h"
 #include "host/asking/QuestionDesk.h"
 #include "platform/base/Json.h"
 
@@ -75,7 +76,8 @@ void AskCommand::settle() {
 }
 
 int AskCommand::write(const std::string& question, const ask::Answer& answer) {
-    const std::string text = options_.json ? platform::writeJson(ask::objectOf(answer)) : answer.sentence;
+    const std::string text = options_.json ? documents::jsonForTerminal(platform::writeJson(ask::objectOf(answer)))
+                                           : documents::withoutControls(answer.sentence);
     if (std::fputs((text + "\n").c_str(), stdout) == EOF || std::fflush(stdout) != 0) {
         tell("the answer cannot be written");
         return static_cast<int>(host::ExitCode::Failure);

@@ -17,7 +17,7 @@ using platform::Value;
 /// A text as it stands; everything else as JSON.
 std::string printed(const Value& value) {
     return value.string() != nullptr ? documents::forLine(*value.string(), std::string::npos)
-                                     : platform::writeJson(value);
+                                     : documents::jsonForTerminal(platform::writeJson(value));
 }
 
 host::ExitCode print(const std::string& text) {
@@ -51,7 +51,7 @@ host::ExitCode list(const linux_::ConfigurationFile& file, bool asJson) {
         text += name + " = " + printed(value) + "\n";
         object.set(name, value);
     }
-    return print(asJson ? platform::writeJson(object) + "\n" : text);
+    return print(asJson ? documents::jsonForTerminal(platform::writeJson(object)) + "\n" : text);
 }
 
 }  // namespace

@@ -10,6 +10,7 @@
 
 #include "documents/AtomicFile.h"
 #include "documents/FileReader.h"
+#include "linux/net/ServicePolicy.h"
 #include "platform/base/Json.h"
 
 namespace ktr::app {
@@ -31,17 +32,28 @@ linux_::HttpsRequest requestFor(const CrossingWatch::Account& account) {
     linux_::HttpsRequest request;
     request.url = QUrl(QStringLiteral("https://") + QString::fromStdString(account.host + kPath), QUrl::StrictMode);
     request.fields = {{"User-Agent", "ktr"}, {"Authorization", account.authorization}};
+    request.mayFollow = [policy = linux_::ServicePolicy(account.host, account.domains)](const linux_::Origin& origin) {
+        return policy.allows(origin);
+    };
     return request;
 }
 
 }  // namespace
 
 CrossingWatch::CrossingWatch(Setup setup) : setup_(std::move(setup)) {
+    readJournal();
+}
+
+void CrossingWatch::readJournal() {
     documents::FileReader::Terms terms;
     terms.most = kMostOfJournal;
     const auto read = documents::FileReader::read(setup_.journal, terms);
     if (const auto* text = std::get_if<std::string>(&read)) {
-        std::from_chars(text->data(), text->data() + text->size(), heard_);
+        const auto [end, error] = std::from_chars(text->data(), text->data() + text->size(), heard_);
+        if (error != std::errc() || heard_ < 0) {
+            heard_ = 0;
+            setup_.tell(setup_.journal.string() + ": expected the number of the last crossing that was told");
+        }
     } else if (const auto& error = std::get<documents::FileReader::Error>(read); !error.isMissing) {
         setup_.tell(setup_.journal.string() + ": " + error.reason);
     }
@@ -66,7 +78,8 @@ void CrossingWatch::listen() {
     request.maximumBytes = kMostBytes;
     const QPointer<CrossingWatch> self(this);
     const auto parser = std::make_shared<linux_::EventStreamParser>();
-    request.piece = [self, parser](const std::string& piece) {
+    isEnough_ = std::make_shared<std::atomic<bool>>(false);
+    request.piece = [self, parser, isEnough = isEnough_](const std::string& piece) {
         auto events = parser->feed(piece);
         QMetaObject::invokeMethod(
             qApp,
@@ -76,7 +89,7 @@ void CrossingWatch::listen() {
                 }
             },
             Qt::QueuedConnection);
-        return !parser->isBroken();
+        return !parser->isBroken() && !*isEnough;
     };
     client_.send(std::move(request), setup_.account.certificateFiles, [self](linux_::HttpsAnswer answer) {
         QMetaObject::invokeMethod(
@@ -91,7 +104,7 @@ void CrossingWatch::listen() {
 }
 
 void CrossingWatch::ended(const linux_::HttpsAnswer& answer) {
-    const bool isWell = answer.failure == platform::HttpFailure::None && answer.status == 200;
+    const bool isWell = *isEnough_ || (answer.failure == platform::HttpFailure::None && answer.status == 200);
     const std::string trouble = isWell                        ? ""
                                 : answer.status == kSignedOut ? "the service does not take the credentials"
                                 : answer.failure == platform::HttpFailure::None
@@ -101,8 +114,12 @@ void CrossingWatch::ended(const linux_::HttpsAnswer& answer) {
         setup_.tell(trouble);
     }
     trouble_ = trouble;
-    const double pause = std::exchange(pause_, std::min(pause_ * 2.0, kLastPause));
-    QTimer::singleShot(static_cast<int>(pause * 1000.0), this, [this] { listen(); });
+    listenLater(std::exchange(pause_, std::min(pause_ * 2.0, kLastPause)));
+}
+
+void CrossingWatch::listenLater(double pause) {
+    QTimer::singleShot(static_cast<int>(pause * 1000.0), this,
+                       [this] { waiting_.size() < kMostWaiting ? listen() : listenLater(kFirstPause); });
 }
 
 void CrossingWatch::take(std::vector<linux_::StreamEvent> events) {
@@ -111,6 +128,11 @@ void CrossingWatch::take(std::vector<linux_::StreamEvent> events) {
     for (const linux_::StreamEvent& event : events) {
         const auto crossing = event.type == "crossing" ? Crossing::read(event.data) : std::nullopt;
         const std::int64_t last = waiting_.empty() ? heard_ : waiting_.back().number;
+        // Whatever else this stream still says comes again with the next: nothing in between is passed over.
+        if (*isEnough_ || waiting_.size() >= kMostWaiting) {
+            *isEnough_ = true;
+            break;
+        }
         if (crossing && crossing->number > last) {
             waiting_.push_back(*crossing);
         }

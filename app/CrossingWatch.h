@@ -1,11 +1,13 @@
 #pragma once
 
 #include <QObject>
+#include <atomic>
 #include <cstdint>
 #include <deque>
 #include <filesystem>
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -23,6 +25,7 @@ class CrossingWatch : public QObject {
         std::string host;           ///< with ":port" when the port is not 443
         std::string authorization;  ///< the value of the field
         std::vector<std::string> certificateFiles;
+        std::optional<std::vector<std::string>> domains;  ///< as in the configuration
     };
     using Next = std::function<void()>;
     struct Setup {
@@ -36,6 +39,8 @@ class CrossingWatch : public QObject {
     /// Seconds between two attempts: from the first to the last of a row that fails.
     static constexpr double kFirstPause = 1.0;
     static constexpr double kLastPause = 60.0;
+    /// So many wait to be handed on; the service keeps the rest until they are asked for.
+    static constexpr std::size_t kMostWaiting = 1000;
 
     explicit CrossingWatch(Setup setup);
     ~CrossingWatch() override;
@@ -45,7 +50,9 @@ class CrossingWatch : public QObject {
     void start();
 
   private:
+    void readJournal();
     void listen();
+    void listenLater(double pause);
     void ended(const linux_::HttpsAnswer& answer);
     void take(std::vector<linux_::StreamEvent> events);
     void handOnNext();
@@ -55,6 +62,8 @@ class CrossingWatch : public QObject {
     const Setup setup_;
     std::int64_t heard_ = 0;
     std::deque<Crossing> waiting_;
+    /// Whether the stream under way ends since enough waits here; its thread looks at it.
+    std::shared_ptr<std::atomic<bool>> isEnough_;
     bool isBusy_ = false;
     double pause_ = kFirstPause;
     std::string trouble_;  ///< what was said of it last

@@ -15,6 +15,9 @@ using platform::Value;
 
 namespace {
 
+/// Milliseconds since 1970, on both sides: what is beyond is no moment (ECMA-262, 21.4.1.1).
+constexpr double kLastMoment = 8.64e15;
+
 std::string textOf(const Dictionary& dictionary, const char* name) {
     const Value* value = dictionary.find(name);
     // Somebody else chose it: nothing in it moves a line or turns its direction.
@@ -40,7 +43,7 @@ std::optional<Crossing> Crossing::read(const std::string& json) {
     crossing.arrives = trigger == "OnArrival";
     if (id.empty() || error != std::errc() || end != id.data() + id.size() || crossing.number <= 0 ||
         crossing.name.empty() || (!crossing.arrives && trigger != "OnDeparture") || time == nullptr ||
-        !time->number()) {
+        !time->number() || !(std::abs(*time->number()) <= kLastMoment)) {
         return std::nullopt;
     }
     crossing.time = static_cast<std::int64_t>(std::floor(*time->number() / 1000.0));

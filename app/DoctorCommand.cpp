@@ -33,6 +33,7 @@ host::ExitCode DoctorCommand::run(const DoctorOptions& options) {
     places.configuration = linux_::XdgFolders::configurationFile();
     places.preferences =
         linux_::XdgFolders::state() / "preferences" / (std::string(platform::kSnippetsBundle) + ".json");
+    places.maps = linux_::XdgFolders::data() / "maps";
     places.texts = host::resourceFolder() / "localization";
     places.language = linux_::LocaleRegion::sessionLanguage();
     places.sessionBus = environment("DBUS_SESSION_BUS_ADDRESS", usualSessionBus().c_str());

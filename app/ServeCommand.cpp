@@ -13,6 +13,7 @@
 
 #include "app/Messages.h"
 #include "documents/AtomicFile.h"
+#include "documents/FileSteps.h"
 #include "documents/Words.h"
 #include "linux/configuration/XdgFolders.h"
 #include "platform/base/Json.h"
@@ -47,9 +48,10 @@ std::string configuration(const serve::ServeOptions& options, const serve::Devel
                              {"userName", userName},
                              {"host", "localhost:" + std::to_string(port)},
                              {"tokenFile", certificates.tokenFile().string()}};
-    const std::string track = !options.positions.empty() ? fs::absolute(options.positions).lexically_normal().string()
-                              : options.friends.empty()  ? resource("walk.gpx").string()
-                                                         : std::string();
+    const std::string track = !options.positions.empty()
+                                  ? documents::FileSteps::absolute(options.positions).lexically_normal().string()
+                              : options.friends.empty() ? resource("walk.gpx").string()
+                                                        : std::string();
     const Dictionary positions =
         track.empty() ? Dictionary{{"source", "none"}} : Dictionary{{"source", "track"}, {"file", track}};
     return platform::writeJson(Dictionary{{"account", account},
@@ -77,9 +79,9 @@ std::string contactsFor(const serve::ServeOptions& options, const fs::path& fold
                         std::string& failure) {
     if (!options.contacts.empty()) {
         failure = complaintAbout("--contacts", options.contacts, true);
-        return fs::absolute(options.contacts).lexically_normal().string();
+        return documents::FileSteps::absolute(options.contacts).lexically_normal().string();
     }
-    const fs::path file = fs::absolute(folder / "contacts.vcf").lexically_normal();
+    const fs::path file = documents::FileSteps::absolute(folder / "contacts.vcf").lexically_normal();
     std::vector<serve::ServedFriend> people = friends.friends;
     people.push_back(friends.user);
     failure = documents::AtomicFile::write(file, serve::ServedContacts::vCards(people));
@@ -193,8 +195,8 @@ host::ExitCode ServeCommand::run(const serve::ServeOptions& options) {
         failure = documents::AtomicFile::write(options.writeConfig, config + "\n");
     }
     if (failure.empty()) {
-        std::cout << "ready https://localhost:" << server.port() << " " << certificates.authorityFile().string()
-                  << std::endl;
+        std::cout << "ready https://localhost:" << server.port() << " "
+                  << documents::forLine(certificates.authorityFile().string(), std::string::npos) << std::endl;
         if (options.printConfig) {
             std::cout << config << std::endl;
         }

@@ -15,6 +15,7 @@
 #include <map>
 #include <memory>
 #include <optional>
+#include <utility>
 
 #include "app/CrossingHook.h"
 #include "app/CrossingWatch.h"
@@ -40,6 +41,8 @@ namespace {
 
 /// So long after the start the lock's state is surely known: nothing is shown before.
 constexpr int kUntilLockIsKnown = 1500;  // milliseconds
+/// Between two attempts to show a notification that nobody has shown.
+constexpr int kUntilShownAgain = 10000;  // milliseconds
 constexpr std::size_t kMostOfKey = 1024;
 constexpr std::size_t kMostQuestions = 100;
 
@@ -61,7 +64,8 @@ std::optional<CrossingWatch::Account> readAccount(linux_::ConfiguredAccountStore
             accounts.problem().empty() ? "there is no account with a token in the configuration" : accounts.problem();
         return std::nullopt;
     }
-    return CrossingWatch::Account{*configuration.account->host, *authorization, configuration.certificates};
+    return CrossingWatch::Account{*configuration.account->host, *authorization, configuration.certificates,
+                                  configuration.account->domains};
 }
 
 std::optional<std::string> readKey(const std::string& file, std::string& complaint) {
@@ -111,8 +115,12 @@ class Teller {
 
     void tellOf(const Crossing& crossing, const CrossingWatch::Next& next) {
         if (options_.prints) {
-            print(crossing);
-            return post(crossing, next);
+            if (print(crossing)) {
+                return post(crossing, next);
+            }
+            // Nobody has heard of it: it is not the one that was told last.
+            tell("the crossings cannot be written");
+            return QCoreApplication::exit(static_cast<int>(host::ExitCode::Failure));
         }
         const auto text = [this](const std::string& key) {
             return texts_.text(key, linux_::QtLocalization::kHostBundle);
@@ -128,22 +136,29 @@ class Teller {
             questions_.erase(questions_.begin());
         }
         questions_[tag] = crossing.name;
-        notifier_.show({tag, words.title, words.body}, [this, crossing, next](bool isShown) {
-            if (!isShown) {
-                tell("there is nobody on the desktop who shows notifications");
-            }
-            post(crossing, next);
-        });
+        notifier_.show({tag, words.title, words.body},
+                       [this, crossing, next](bool isShown) { shown(crossing, next, isShown); });
     }
 
   private:
-    static void print(const Crossing& crossing) {
+    void shown(const Crossing& crossing, const CrossingWatch::Next& next, bool isShown) {
+        if (!isShown && !std::exchange(isNobodyThere_, true)) {
+            tell("there is nobody on the desktop who shows notifications");
+        }
+        if (isShown || hook_) {
+            isNobodyThere_ = !isShown;
+            return post(crossing, next);
+        }
+        // At a session's start whoever shows them may come later than this program; the service keeps what follows.
+        QTimer::singleShot(kUntilShownAgain, &notifier_, [this, crossing, next] { tellOf(crossing, next); });
+    }
+    /// Whether somebody has it.
+    static bool print(const Crossing& crossing) {
         const std::string time = QDateTime::fromSecsSinceEpoch(crossing.time).toString(Qt::ISODate).toStdString();
         const std::string line = std::to_string(crossing.number) + "  " + time + "  " + crossing.name +
                                  (crossing.arrives ? " arrived" : " left") +
                                  (crossing.place.empty() ? "" : ": " + crossing.place) + "\n";
-        std::fputs(line.c_str(), stdout);
-        std::fflush(stdout);
+        return std::fputs(line.c_str(), stdout) != EOF && std::fflush(stdout) == 0;
     }
     void post(const Crossing& crossing, const CrossingWatch::Next& next) {
         if (hook_) {
@@ -167,6 +182,7 @@ class Teller {
     linux_::QtLocalization texts_;
     linux_::LogindLock lock_;
     linux_::DesktopNotifier notifier_;
+    bool isNobodyThere_ = false;                    ///< it was said
     std::map<std::string, std::string> questions_;  ///< whom a notification is about, by its tag
 };
 
@@ -211,9 +227,9 @@ host::ExitCode WatchCommand::run(const Options& options, int argc, char** argv) 
     QTimer::singleShot(options.prints ? 0 : kUntilLockIsKnown, &application, [&] { watch.start(); });
     QSocketNotifier ending(signals, QSocketNotifier::Read);
     QObject::connect(&ending, &QSocketNotifier::activated, &application, &QCoreApplication::quit);
-    QCoreApplication::exec();
+    const int code = QCoreApplication::exec();
     ::close(signals);
-    return host::ExitCode::Ok;
+    return static_cast<host::ExitCode>(code);
 }
 
 }  // namespace ktr::app

@@ -51,6 +51,9 @@ std::optional<Error> wrongType(mode_t mode) {
 }
 
 std::string sizeInWords(std::size_t bytes) {
+    if (bytes < (std::size_t{1} << 10)) {
+        return std::to_string(bytes) + " bytes";
+    }
     const bool whole = bytes >= (std::size_t{1} << 20) && bytes % (std::size_t{1} << 20) == 0;
     return whole ? std::to_string(bytes >> 20) + " MiB" : std::to_string(bytes >> 10) + " KiB";
 }

@@ -6,6 +6,7 @@
 
 #include <cerrno>
 #include <cstring>
+#include <system_error>
 
 namespace ktr::documents {
 
@@ -68,6 +69,12 @@ int FileSteps::syncFolder(const std::filesystem::path& folder) {
     ::close(descriptor);
     // Not every file system can; those that cannot have nothing to bring there.
     return failure == EINVAL || failure == ENOTSUP ? 0 : failure;
+}
+
+std::filesystem::path FileSteps::absolute(const std::filesystem::path& file) {
+    std::error_code gone;
+    auto whole = std::filesystem::absolute(file, gone);
+    return gone ? file : whole;
 }
 
 std::filesystem::path FileSteps::folderOf(const std::filesystem::path& file) {

@@ -19,6 +19,8 @@ class FileSteps {
     /// `open`, closed in programs that are started later, and again where a signal came between. A descriptor, or -1
     /// and errno.
     static int open(const std::filesystem::path& file, int flags, mode_t mode = 0);
+    /// From the working folder on; as it stands where that has gone.
+    static std::filesystem::path absolute(const std::filesystem::path& file);
     static std::filesystem::path folderOf(const std::filesystem::path& file);
     /// "dinner.png: cannot be written: No space left on device".
     static std::string sentence(const std::filesystem::path& file, const char* what, int failure);

@@ -114,4 +114,21 @@ std::string withoutControls(std::string_view text) {
     return out;
 }
 
+std::string jsonForTerminal(std::string_view json) {
+    std::string out;
+    for (std::size_t at = 0; at < json.size();) {
+        const platform::Utf8Step step = platform::decodeUtf8(json, at);
+        const char32_t c = step.codePoint;
+        if (c == 0x7F) {
+            out += "\\u007f";
+        } else if (c > 0x7F && (isControl(c) || isOverride(c) || isMark(c) || isIsolate(c))) {
+            appendEscape(out, c);
+        } else {
+            platform::appendUtf8(out, c);
+        }
+        at += step.length;
+    }
+    return out;
+}
+
 }  // namespace ktr::documents

@@ -1,4 +1,5 @@
 #include "host/Plugin.h"
+#include "documents/FileSteps.h"
 
 #include <dlfcn.h>
 
@@ -32,7 +33,7 @@ std::variant<std::unique_ptr<Plugin>, std::string> Plugin::load(const std::strin
         return path + ": this is no plugin, not even a file";
     }
     // An absolute path: dlopen would look for a bare name in the system's folders.
-    void* library = dlopen(fs::absolute(path).c_str(), RTLD_NOW | RTLD_LOCAL | RTLD_NODELETE);
+    void* library = dlopen(documents::FileSteps::absolute(path).c_str(), RTLD_NOW | RTLD_LOCAL | RTLD_NODELETE);
     if (library == nullptr) {
         return "the plugin cannot be loaded: " + lastError();
     }

@@ -2,6 +2,7 @@
 
 #include "documents/AtomicFile.h"
 #include "documents/FileLock.h"
+#include "documents/FileSteps.h"
 #include "documents/FileTrust.h"
 #include "linux/configuration/TokenFile.h"
 #include "server/store/Secret.h"
@@ -37,7 +38,7 @@ std::variant<DevelopmentCertificates, std::string> DevelopmentCertificates::prep
         return folder.string() + ": cannot be locked: " + lock.problem();
     }
     DevelopmentCertificates certificates;
-    certificates.folder_ = std::filesystem::absolute(folder).lexically_normal();
+    certificates.folder_ = documents::FileSteps::absolute(folder).lexically_normal();
     std::string problem;
     auto authority = CertificateAuthority::read(folder, problem);
     if (!problem.empty()) {

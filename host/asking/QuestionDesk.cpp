@@ -116,6 +116,13 @@ ask::Question QuestionDesk::question(const std::string& text, bool isLive) {
 }
 
 void QuestionDesk::ask(const ask::Question& question, const ask::Engine::Completion& completion) {
+    if (host_.live() != nullptr && host_.live()->isUnusable()) {
+        // Who the contacts are is said there, too: "I don't know Ann" would be no honest answer.
+        ask::Answer unreadable;
+        unreadable.outcome = ask::Outcome::NotSignedIn;
+        unreadable.sentence = host_.text("STATUS_UNREADABLE");
+        return completion(std::move(unreadable));
+    }
     engine().ask(question, [alive = std::weak_ptr<bool>(alive_), completion](ask::Answer answer) {
         if (alive.lock()) {
             completion(std::move(answer));

@@ -1,10 +1,12 @@
 #include "linux/configuration/ConfigurationFile.h"
 
 #include <algorithm>
+#include <system_error>
 
 #include "documents/AtomicFile.h"
 #include "documents/DocumentReader.h"
 #include "documents/FileLock.h"
+#include "documents/FileSteps.h"
 #include "documents/FileTrust.h"
 #include "documents/JsonReader.h"
 #include "documents/NearestName.h"
@@ -83,6 +85,8 @@ void apply(Dictionary& members, const std::string& name, const std::optional<Val
 }
 
 }  // namespace
+
+ConfigurationFile::ConfigurationFile(const std::filesystem::path& file) : file_(documents::FileSteps::absolute(file)) {}
 
 const std::vector<std::string>& ConfigurationFile::names() {
     static const std::vector<std::string> kNames = {"account.personId",
@@ -179,7 +183,10 @@ std::string ConfigurationFile::change(const std::vector<Change>& changes) const 
     if (const auto* error = std::get_if<ConfigurationReader::Error>(&tried)) {
         return error->text;
     }
-    return documents::AtomicFile::write(file_, text);
+    // What a link leads to is changed; the link stays.
+    std::error_code isNone;
+    const auto place = std::filesystem::canonical(file_, isNone);
+    return documents::AtomicFile::write(isNone ? file_ : place, text);
 }
 
 std::string ConfigurationFile::set(const std::string& name, const std::string& typed) const {

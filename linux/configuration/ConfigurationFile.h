@@ -23,7 +23,7 @@ class ConfigurationFile {
         std::optional<platform::Value> value;
     };
 
-    explicit ConfigurationFile(std::filesystem::path file) : file_(std::move(file)) {}
+    explicit ConfigurationFile(const std::filesystem::path& file);
 
     /// What can be set, in the order in which it is described.
     static const std::vector<std::string>& names();

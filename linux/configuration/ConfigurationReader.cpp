@@ -5,8 +5,10 @@
 #include <string_view>
 
 #include "documents/DocumentReader.h"
+#include "documents/FileSteps.h"
 #include "documents/FileTrust.h"
 #include "documents/Words.h"
+#include "linux/configuration/XdgFolders.h"
 #include "linux/device/LinuxDevice.h"
 
 namespace ktr::linux_ {
@@ -18,7 +20,14 @@ using documents::FieldReader;
 constexpr std::size_t kLargestFile = std::size_t{1} << 20;
 
 std::string resolved(const std::string& path, const std::filesystem::path& file) {
-    const std::filesystem::path folder = std::filesystem::absolute(file).parent_path();
+    // As people write it, and a shell does not replace it within quotes.
+    if (path == "~") {
+        return XdgFolders::home().string();
+    }
+    if (path.starts_with("~/")) {
+        return (XdgFolders::home() / path.substr(2)).lexically_normal().string();
+    }
+    const std::filesystem::path folder = documents::FileSteps::absolute(file).parent_path();
     return (folder / path).lexically_normal().string();
 }
 

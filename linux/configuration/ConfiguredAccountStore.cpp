@@ -3,6 +3,7 @@
 #include <utility>
 #include <variant>
 
+#include "documents/FileSteps.h"
 #include "linux/configuration/ConfigurationReader.h"
 #include "linux/configuration/SecretModule.h"
 #include "linux/configuration/TokenFile.h"
@@ -53,7 +54,7 @@ ConfiguredAccountStore::ConfiguredAccountStore(const std::filesystem::path& conf
     : ConfiguredAccountStore(configurationFile, askSecretService) {}
 
 ConfiguredAccountStore::ConfiguredAccountStore(const std::filesystem::path& configurationFile, Secrets secrets)
-    : file_(std::filesystem::absolute(configurationFile)), secrets_(std::move(secrets)) {}
+    : file_(documents::FileSteps::absolute(configurationFile)), secrets_(std::move(secrets)) {}
 
 ConfiguredAccountStore::~ConfiguredAccountStore() = default;
 

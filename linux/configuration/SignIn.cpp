@@ -5,6 +5,7 @@
 #include <optional>
 #include <thread>
 
+#include "documents/FileSteps.h"
 #include "linux/configuration/ConfigurationFile.h"
 #include "linux/configuration/ConfigurationReader.h"
 #include "linux/configuration/SecretModule.h"
@@ -91,7 +92,7 @@ struct SignIn::Attempt {
 SignIn::SignIn(std::filesystem::path configurationFile) : SignIn(std::move(configurationFile), storeInKeyring) {}
 
 SignIn::SignIn(std::filesystem::path configurationFile, Store store)
-    : file_(std::filesystem::absolute(configurationFile)), store_(std::move(store)) {}
+    : file_(documents::FileSteps::absolute(configurationFile)), store_(std::move(store)) {}
 
 SignIn::~SignIn() {
     cancel();

@@ -9,22 +9,22 @@ namespace ktr::linux_ {
 
 namespace {
 
-std::filesystem::path home() {
+std::filesystem::path folder(const char* variable, const char* underHome) {
+    const char* path = std::getenv(variable);
+    const std::filesystem::path base =
+        path != nullptr && *path == '/' ? std::filesystem::path(path) : XdgFolders::home() / underHome;
+    return base / "ktr";
+}
+
+}  // namespace
+
+std::filesystem::path XdgFolders::home() {
     if (const char* path = std::getenv("HOME"); path != nullptr && *path == '/') {
         return path;
     }
     const passwd* entry = ::getpwuid(::geteuid());
     return entry != nullptr && entry->pw_dir != nullptr ? entry->pw_dir : "/";
 }
-
-std::filesystem::path folder(const char* variable, const char* underHome) {
-    const char* path = std::getenv(variable);
-    const std::filesystem::path base =
-        path != nullptr && *path == '/' ? std::filesystem::path(path) : home() / underHome;
-    return base / "ktr";
-}
-
-}  // namespace
 
 std::filesystem::path XdgFolders::config() {
     return folder("XDG_CONFIG_HOME", ".config");

@@ -8,6 +8,8 @@ namespace ktr::linux_ {
 /// holds a relative path counts as unset. Nothing is created. Any thread.
 class XdgFolders {
   public:
+    /// The user's own folder.
+    static std::filesystem::path home();
     /// $XDG_CONFIG_HOME/ktr, else ~/.config/ktr.
     static std::filesystem::path config();
     /// $XDG_STATE_HOME/ktr, else ~/.local/state/ktr.

@@ -64,7 +64,7 @@ ContactFiles::Paths ContactFiles::watched(const Paths& paths) {
             constexpr std::size_t kMost = 1000;
             for (std::filesystem::directory_iterator at(file, failure), end; at != end && wanted.size() < kMost;
                  at.increment(failure)) {
-                if (at->path().extension() == ".vcf") {
+                if (VCardReader::isCardFile(at->path())) {
                     add(at->path());
                 }
             }

@@ -125,6 +125,10 @@ class VCardReader::Reading {
     std::uintmax_t bytesRead_ = 0;
 };
 
+bool VCardReader::isCardFile(const std::filesystem::path& file) {
+    return platform::asciiLowercased(file.extension().string()) == ".vcf";
+}
+
 VCardReader::Result VCardReader::read(const std::filesystem::path& path) const {
     Reading reading;
     Result& result = reading.result;
@@ -149,7 +153,7 @@ VCardReader::Result VCardReader::read(const std::filesystem::path& path) const {
     for (std::filesystem::directory_iterator entry(path, failed), end; !failed && entry != end;
          entry.increment(failed)) {
         std::error_code ignored;
-        if (platform::asciiLowercased(entry->path().extension().string()) == ".vcf" && !entry->is_directory(ignored)) {
+        if (isCardFile(entry->path()) && !entry->is_directory(ignored)) {
             files.push_back(entry->path());
         }
     }

@@ -41,6 +41,8 @@ class VCardReader {
 
     /// Of a folder all its files named *.vcf (not of folders in it); of a file all its cards.
     Result read(const std::filesystem::path& path) const;
+    /// Whether a file of a folder is read: "*.vcf", whatever the case.
+    static bool isCardFile(const std::filesystem::path& file);
     /// The cards of one text; `file` names it in problems.
     Result readText(const std::string& text, const std::filesystem::path& file) const;
 

@@ -1,5 +1,6 @@
 #include "linux/device/DesktopNotifier.h"
 
+#include <QDBusError>
 #include <QDBusMessage>
 #include <QDBusPendingCallWatcher>
 #include <QDBusPendingReply>
@@ -38,6 +39,12 @@ DesktopNotifier::DesktopNotifier(QDBusConnection bus, std::function<void(std::st
 
 DesktopNotifier::~DesktopNotifier() = default;
 
+QDBusPendingCall DesktopNotifier::call(const QDBusMessage& message) const {
+    // What is asked of a bus that is not there would never end.
+    return bus_.isConnected() ? bus_.asyncCall(message, kLongestSilence)
+                              : QDBusPendingCall::fromError(QDBusError(QDBusError::Disconnected, QString()));
+}
+
 void DesktopNotifier::show(const Notification& notification, Done done) {
     QDBusMessage message =
         QDBusMessage::createMethodCall(kPortal, kPortalPath, kPortalInterface, QStringLiteral("AddNotification"));
@@ -47,7 +54,7 @@ void DesktopNotifier::show(const Notification& notification, Done done) {
                            {QStringLiteral("priority"), QStringLiteral("normal")},
                            {QStringLiteral("display-hint"), QStringList{QStringLiteral("hide-content-on-lockscreen")}},
                            {QStringLiteral("default-action"), kAction}};
-    auto* watcher = new QDBusPendingCallWatcher(bus_.asyncCall(message, kLongestSilence), this);
+    auto* watcher = new QDBusPendingCallWatcher(call(message), this);
     connect(watcher, &QDBusPendingCallWatcher::finished, this,
             [this, notification, done = std::move(done)](QDBusPendingCallWatcher* finished) {
                 finished->deleteLater();
@@ -66,7 +73,7 @@ void DesktopNotifier::askServer(const Notification& notification, const Done& do
             << QVariantMap{{QStringLiteral("desktop-entry"), QStringLiteral("org.ktr.ktr")},
                            {QStringLiteral("category"), QStringLiteral("presence")}}
             << -1;
-    auto* watcher = new QDBusPendingCallWatcher(bus_.asyncCall(message, kLongestSilence), this);
+    auto* watcher = new QDBusPendingCallWatcher(call(message), this);
     connect(watcher, &QDBusPendingCallWatcher::finished, this,
             [this, tag = notification.tag, done](QDBusPendingCallWatcher* finished) {
                 finished->deleteLater();

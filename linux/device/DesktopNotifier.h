@@ -1,6 +1,8 @@
 #pragma once
 
 #include <QDBusConnection>
+#include <QDBusMessage>
+#include <QDBusPendingCall>
 #include <QObject>
 #include <QString>
 #include <QVariantMap>
@@ -36,6 +38,8 @@ class DesktopNotifier : public QObject {
     void serverClosed(uint number, uint reason);
 
   private:
+    /// Its end is told whatever has become of the bus.
+    QDBusPendingCall call(const QDBusMessage& message) const;
     void askServer(const Notification& notification, const Done& done);
 
     QDBusConnection bus_;

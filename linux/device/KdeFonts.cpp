@@ -3,8 +3,11 @@
 #include <algorithm>
 #include <charconv>
 #include <cmath>
-#include <fstream>
 #include <string_view>
+#include <utility>
+#include <variant>
+
+#include "documents/FileReader.h"
 
 namespace ktr::linux_ {
 
@@ -40,15 +43,9 @@ std::optional<double> positiveNumber(std::string_view text) {
 
 /// A file that is not there says nothing, and neither does what is no plain file, or too large.
 std::string contentOf(const std::filesystem::path& file) {
-    std::error_code error;
-    if (!std::filesystem::is_regular_file(file, error) || std::filesystem::file_size(file, error) > kLargestFile) {
-        return "";
-    }
-    std::ifstream stream(file, std::ios::binary);
-    std::string text(kLargestFile, '\0');
-    stream.read(text.data(), static_cast<std::streamsize>(text.size()));
-    text.resize(static_cast<std::size_t>(stream.gcount()));
-    return text;
+    auto read = documents::FileReader::read(file, {kLargestFile, {}});
+    auto* text = std::get_if<std::string>(&read);
+    return text == nullptr ? "" : std::move(*text);
 }
 
 }  // namespace

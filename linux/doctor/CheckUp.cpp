@@ -68,7 +68,7 @@ std::vector<CheckUp::Check> CheckUp::checks(const Places& places) {
          "ktr config get contacts"},
         {"position", usual, [=] { return around::positions(places, configuration); },
          "whoever tells it does not answer", "sudo systemctl restart geoclue"},
-        {"maps", usual, [=] { return around::maps(configuration); }, "they cannot be read in time",
+        {"maps", usual, [=] { return around::maps(places, configuration); }, "they cannot be read in time",
          "ktr config get maps.sources"},
         {"locale", usual, [=] { return around::locale(places); }, "the disk does not answer", "check the disk"},
         {"screen reader", usual, [=] { return around::screenReader(places); }, "the session bus does not answer",
@@ -145,7 +145,8 @@ std::string CheckUp::json(const std::vector<Finding>& findings) {
                                            {"remedy", finding.remedy},
                                            {"milliseconds", std::round(finding.seconds * 1000.0)}});
     }
-    return platform::writeJson(platform::Dictionary{{"ok", isWell(findings)}, {"findings", std::move(all)}}) + "\n";
+    const platform::Dictionary object{{"ok", isWell(findings)}, {"findings", std::move(all)}};
+    return documents::jsonForTerminal(platform::writeJson(object)) + "\n";
 }
 
 }  // namespace ktr::linux_

@@ -30,6 +30,7 @@ class CheckUp {
     struct Places {
         std::filesystem::path configuration;
         std::filesystem::path preferences;  ///< the file of the plugin's preferences
+        std::filesystem::path maps;         ///< the folder of the maps that were added
         std::filesystem::path texts;        ///< the folder of the texts of each language
         std::string language;               ///< of the session, BCP 47
         std::string sessionBus;             ///< addresses; empty: none

@@ -18,6 +18,7 @@
 #include "linux/contacts/ContactFiles.h"
 #include "linux/device/Buses.h"
 #include "linux/locale/QtLocalization.h"
+#include "linux/maps/FolderGround.h"
 #include "linux/maps/MbtilesLoader.h"
 #include "linux/positions/TrackReader.h"
 #include "platform/contacts/ContactStore.h"
@@ -153,17 +154,26 @@ Finding positions(const CheckUp::Places& places, const Configuration& configurat
         case Source::Track:
             break;
     }
-    return ::access(positions.file.c_str(), R_OK) == 0
-               ? fine("position", "a track tells it")
-               : wrong("position", "the track cannot be read", "ktr config set positions.file FILE.gpx");
+    const auto track = TrackReader::readFile(positions.file);
+    if (const auto* error = std::get_if<documents::DocumentError>(&track)) {
+        return wrong("position", error->text(), "ktr config set positions.file FILE.gpx");
+    }
+    return fine("position", "a track tells it");
 }
 
-Finding maps(const Configuration& configuration) {
+Finding maps(const CheckUp::Places& places, const Configuration& configuration) {
     int opened = 0;
     for (const auto& source : configuration.maps.sources) {
         std::string error;
         if (!source.file.empty() && MbtilesLoader::open(source.file, error) == nullptr) {
             return wrong("maps", error, "ktr config get maps.sources");
+        }
+        ++opened;
+    }
+    for (const auto& file : FolderGround::filesIn(places.maps)) {
+        std::string error;
+        if (MbtilesLoader::open(file.string(), error) == nullptr) {
+            return wrong("maps", file.string() + ": " + error, "ktr maps add FILE.mbtiles");
         }
         ++opened;
     }

@@ -10,7 +10,7 @@ namespace session_checks {
 
 CheckUp::Finding contacts(const Configuration& configuration);
 CheckUp::Finding positions(const CheckUp::Places& places, const Configuration& configuration);
-CheckUp::Finding maps(const Configuration& configuration);
+CheckUp::Finding maps(const CheckUp::Places& places, const Configuration& configuration);
 /// By script, of the fonts that are installed. Main thread.
 CheckUp::Finding letters();
 CheckUp::Finding locale(const CheckUp::Places& places);

@@ -9,10 +9,10 @@
 
 namespace ktr::linux_ {
 
-void FolderGround::list() {
+std::vector<std::filesystem::path> FolderGround::filesIn(const std::filesystem::path& folder) {
     std::vector<std::filesystem::path> paths;
     std::error_code failed;
-    for (std::filesystem::directory_iterator entry(folder_, failed), end; !failed && entry != end;
+    for (std::filesystem::directory_iterator entry(folder, failed), end; !failed && entry != end;
          entry.increment(failed)) {
         if (entry->path().extension() == ".mbtiles") {
             paths.push_back(entry->path());
@@ -20,8 +20,12 @@ void FolderGround::list() {
     }
     std::sort(paths.begin(), paths.end());
     paths.resize(std::min(paths.size(), kMostFiles));
+    return paths;
+}
+
+void FolderGround::list() {
     std::vector<File> files;
-    for (const auto& path : paths) {
+    for (const auto& path : filesIn(folder_)) {
         const auto known =
             std::find_if(files_.begin(), files_.end(), [&](const File& file) { return file.path == path; });
         if (known != files_.end()) {

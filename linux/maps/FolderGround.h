@@ -18,6 +18,8 @@ class FolderGround final : public MapGround {
     static constexpr std::size_t kMostFiles = 64;
 
     explicit FolderGround(std::filesystem::path folder) : folder_(std::move(folder)) {}
+    /// The maps in a folder, in the order in which they are drawn. It looks at the disk.
+    static std::vector<std::filesystem::path> filesIn(const std::filesystem::path& folder);
     MapDrawn draw(const MapDrawing& drawing) override;
 
   private:

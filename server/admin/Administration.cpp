@@ -4,6 +4,7 @@
 #include <filesystem>
 
 #include "documents/AtomicFile.h"
+#include "documents/FileSteps.h"
 #include "documents/NearestName.h"
 #include "documents/Words.h"
 #include "platform/base/Json.h"
@@ -154,8 +155,8 @@ std::string Administration::makeReader(const std::string& name, const std::strin
     const Dictionary account{{"personId", name},
                              {"userName", who->handles.empty() ? name : who->handles.front()},
                              {"host", origin.substr(std::string("https://").size())},
-                             {"tokenFile", std::filesystem::absolute(tokenFile).lexically_normal().string()}};
-    const auto authority = std::filesystem::absolute(folder_ + "/ca.pem").lexically_normal().string();
+                             {"tokenFile", documents::FileSteps::absolute(tokenFile).lexically_normal().string()}};
+    const auto authority = documents::FileSteps::absolute(folder_ + "/ca.pem").lexically_normal().string();
     configuration = platform::writeJson(Dictionary{{"account", account}, {"certificates", Value::Array{authority}}});
     return "";
 }

@@ -16,6 +16,7 @@
 #include <filesystem>
 #include <utility>
 
+#include "documents/FileSteps.h"
 #include "documents/FileTrust.h"
 #include "server/http/ClientAddress.h"
 
@@ -77,7 +78,7 @@ sockaddr_storage nameOf(int descriptor) {
 
 /// Empty when a socket may be made at the path, else why not.
 std::string whyNotAt(const std::string& path, const Address& address) {
-    if (std::string problem = documents::FileTrust::problemOfFolder(std::filesystem::absolute(path).parent_path());
+    if (std::string problem = documents::FileTrust::problemOfFolder(documents::FileSteps::absolute(path).parent_path());
         !problem.empty()) {
         return problem;
     }

@@ -98,6 +98,26 @@ class AskTest(unittest.TestCase):
         self.assertIn("Fish Market", result.stdout)
         self.assertTrue(result.stdout.startswith("Ann Marsh："), result.stdout)
 
+    def test_nothing_in_an_answer_steers_the_terminal(self):
+        evil = "\x1b[31m\u009b5m\u202egnp"
+        (self.folder / "evil.vcf").write_text(
+            f"BEGIN:VCARD\nVERSION:3.0\nFN:Ann {evil}\nN:{evil};Ann;;;\nEMAIL:ann.marsh@mail.example\nEND:VCARD\n")
+        config = json.loads((self.folder / "config.json").read_text())
+        config["contacts"] = ["evil.vcf"]
+        (self.folder / "evil.json").write_text(json.dumps(config))
+        said = self.run_ask("Where is Ann?", config=self.folder / "evil.json")
+        told = self.run_ask("Where is Ann?", "--json", config=self.folder / "evil.json")
+        for text in (said.stdout, said.stderr, told.stdout, told.stderr):
+            self.assertEqual([c for c in text if c in "\x1b\x7f\u009b\u202e"], [], text)
+        self.assertIn("Fish Market", said.stdout)
+        self.assertIn(evil, json.loads(told.stdout)["sentence"])
+
+    def test_settings_that_cannot_be_read_are_the_answer(self):
+        (self.folder / "broken.json").write_text("{")
+        result = self.run_ask("Where is Ann?", config=self.folder / "broken.json")
+        self.assertEqual((result.returncode, result.stdout), (15, "Your settings cannot be read.\n"))
+        self.assertIn("broken.json:1:", result.stderr)
+
     def test_nobody_signed_in_and_nobody_there(self):
         self.assertEqual(self.run_ask("Where is Ann?", config=self.folder / "none.json").returncode, 12)
         config = json.loads((self.folder / "config.json").read_text())

@@ -90,6 +90,22 @@ class DoctorTest(unittest.TestCase):
         for thing in ("contacts", "maps", "position"):
             self.assertEqual(found[thing]["state"], "wrong", found[thing])
 
+    def test_track_is_read_and_added_maps_count(self):
+        track = self.folder / "walk.gpx"
+        os.mkfifo(track)
+        positions = {"positions": {"source": "track", "file": "walk.gpx"}}
+        self.assertIn("a pipe", self.findings(positions)["position"]["words"])
+        track.unlink()
+        track.write_text("hello")
+        self.assertEqual(self.findings(positions)["position"]["state"], "wrong")
+        track.write_text('<gpx><wpt lat="50.2" lon="-3.1"/></gpx>')
+        self.assertEqual(self.findings(positions)["position"]["state"], "fine")
+        data = {"XDG_DATA_HOME": str(self.folder / "data")}
+        self.assertEqual(self.findings({}, **data)["maps"]["state"], "not used")
+        town = pathlib.Path(PROGRAM).parent.parent / "share" / "ktr" / "maps" / "brinmouth.mbtiles"
+        subprocess.run([PROGRAM, "maps", "add", str(town)], env={**self.environment, **data}, check=True, capture_output=True)
+        self.assertEqual(self.findings({}, **data)["maps"]["words"], "1 map with streets")
+
     def test_silent_host_and_silent_bus_are_not_waited_for(self):
         # Both take every connection and say nothing.
         with socket.create_server(("127.0.0.1", 0)) as host, socket.socket(socket.AF_UNIX) as bus:

@@ -30,7 +30,9 @@ TEST(CrossingWordsTest, Event_IsRead_AndWhatIsNoneIsNot) {
                              R"({"id":"-1","name":"Ann","trigger":"OnArrival","timestamp":1})",
                              R"({"id":"1","trigger":"OnArrival","timestamp":1})",
                              R"({"id":"1","name":"Ann","trigger":"Immediate","timestamp":1})",
-                             R"({"id":"1","name":"Ann","trigger":"OnArrival"})"}) {
+                             R"({"id":"1","name":"Ann","trigger":"OnArrival"})",
+                             R"({"id":"1","name":"Ann","trigger":"OnArrival","timestamp":1e300})",
+                             R"({"id":"1","name":"Ann","trigger":"OnArrival","timestamp":-9e15})"}) {
         EXPECT_FALSE(Crossing::read(text)) << text;
     }
 }

@@ -52,4 +52,9 @@ TEST(WordsTest, WithoutControls_LeavesBlanks) {
     EXPECT_EQ(withoutControls("\u2068Ann\u2069 \u200f"), "\u2068Ann\u2069 \u200f");
 }
 
+TEST(WordsTest, JsonForTerminal_IsTheSameValueWithoutWhatSteers) {
+    EXPECT_EQ(documents::jsonForTerminal("{\"a\":\"x\u009b31m\x7f\u202e\u200f\u2068 Zoë\"}\n"),
+              "{\"a\":\"x\\u009b31m\\u007f\\u202e\\u200f\\u2068 Zoë\"}\n");
+}
+
 }  // namespace ktr::test

@@ -6,6 +6,7 @@
 
 #include "documents/FileLock.h"
 #include "linux/configuration/ConfigurationReader.h"
+#include "linux/configuration/XdgFolders.h"
 #include "tests/support/TemporaryFolder.h"
 
 #include <gtest/gtest.h>
@@ -119,6 +120,33 @@ TEST_F(ConfigurationFileTest, BrokenFile_IsNotReplaced) {
     std::filesystem::remove(path);
     std::filesystem::create_directory(path);
     EXPECT_NE(file.set("language", "fr"), "") << "a folder";
+}
+
+TEST_F(ConfigurationFileTest, Link_StaysAndWhatItLeadsToIsChanged) {
+    const auto kept = std::filesystem::path(folder.path()) / "kept.json";
+    std::filesystem::create_directories(path.parent_path());
+    std::filesystem::create_symlink(kept, path);
+    std::ofstream(kept) << "{}";
+    std::filesystem::permissions(kept, std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
+    EXPECT_EQ(file.set("textSize", "XL"), "");
+    EXPECT_TRUE(std::filesystem::is_symlink(path));
+    EXPECT_NE(text().find("XL"), std::string::npos);
+}
+
+TEST_F(ConfigurationFileTest, FileInTheWorkingFolder_IsWritten) {
+    const auto before = std::filesystem::current_path();
+    std::filesystem::current_path(folder.path());
+    EXPECT_EQ(ConfigurationFile("here.json").set("textSize", "XL"), "");
+    std::filesystem::current_path(before);
+    EXPECT_TRUE(std::filesystem::exists(std::filesystem::path(folder.path()) / "here.json"));
+}
+
+TEST_F(ConfigurationFileTest, TildeOfAPath_IsTheUsersOwnFolder) {
+    std::filesystem::create_directories(path.parent_path());
+    write(R"({"contacts": ["~/a.vcf", "~", "~b/c.vcf"]})");
+    const auto contacts = read().contacts;
+    EXPECT_EQ(contacts, (std::vector<std::string>{(XdgFolders::home() / "a.vcf").string(), XdgFolders::home().string(),
+                                                  (path.parent_path() / "~b" / "c.vcf").string()}));
 }
 
 }  // namespace ktr::linux_

@@ -1,5 +1,6 @@
 #include "linux/contacts/ContactFiles.h"
 
+#include <algorithm>
 #include <set>
 
 #include "linux/contacts/MemoryContactStore.h"
@@ -32,6 +33,18 @@ TEST_F(ContactFilesTest, MissingPath_IsAnErrorAndNoContacts) {
     std::string error;
     EXPECT_FALSE(ContactFiles::read({"/nonexistent/contacts"}, error));
     EXPECT_EQ(error, "/nonexistent/contacts: no such file or folder");
+}
+
+TEST_F(ContactFilesTest, EachCardFileThatIsRead_IsWatched) {
+    folder.write("ANN.VCF", "BEGIN:VCARD\nFN:Ann\nEND:VCARD\n");
+    folder.write("notes.txt", "");
+    std::string error;
+    const auto read = ContactFiles::read({folder.path().string()}, error);
+    ASSERT_TRUE(read) << error;
+    EXPECT_EQ(read->size(), 1U);
+    const auto watched = ContactFiles::watched({folder.path().string()});
+    EXPECT_EQ(std::count(watched.begin(), watched.end(), (folder.path() / "ANN.VCF").string()), 1);
+    EXPECT_EQ(std::count(watched.begin(), watched.end(), (folder.path() / "notes.txt").string()), 0);
 }
 
 TEST_F(ContactFilesTest, DemoContacts_AreAllReadAndFoundByTheirHandles) {
