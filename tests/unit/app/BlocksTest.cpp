@@ -2,8 +2,6 @@
 #include <QAccessible>
 #include <QAccessibleInterface>
 #include <QApplication>
-#include <QDir>
-#include <QImage>
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QPainter>
@@ -19,10 +17,9 @@
 #include "app/window/blocks/Pill.h"
 #include "app/window/blocks/StepRow.h"
 #include "app/window/blocks/Words.h"
-#include "host/Host.h"
-#include "host/HostOptions.h"
 #include "linux/paint/AvatarImage.h"
 #include "linux/paint/PersonColors.h"
+#include "tests/unit/app/TestHost.h"
 
 #include <gtest/gtest.h>
 
@@ -62,12 +59,8 @@ class KTRBlocksTest : public ::testing::Test {
         host::HostOptions options;
         options.language = language;
         options.textSize = size;
-        const auto settings = host::HostSettings::decide(options, {}, {});
-        ASSERT_TRUE(std::holds_alternative<host::HostSettings>(settings));
-        auto made =
-            host::Host::make(std::get<host::HostSettings>(settings), host::Host::Time::Virtual, KTR_PLUGIN_FILE);
-        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made));
-        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
+        host = testHost(options);
+        ASSERT_TRUE(host);
         paper = std::make_unique<Paper>();
         paper->setLayoutDirection(host->rightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
     }
@@ -212,12 +205,7 @@ TEST_F(KTRBlocksTest, Gallery_EveryAppearanceFitsItsWidth) {
             EXPECT_GE(block->shape().height(), block->shapeHeight(block->shape().width()) - 1)
                 << appearance.name << ": " << block->accessibleName().toStdString();
         }
-        if (const QString folder = qEnvironmentVariable("KTR_GALLERY"); !folder.isEmpty()) {
-            QImage picture(paper->size() * 2, QImage::Format_RGB32);
-            picture.setDevicePixelRatio(2.0);
-            paper->render(&picture);
-            EXPECT_TRUE(picture.save(QDir(folder).filePath(QLatin1String(appearance.name) + QLatin1String(".png"))));
-        }
+        keepPicture(*paper, appearance.name);
     }
 }
 

@@ -13,8 +13,8 @@
 #include "app/window/ConversationWindow.h"
 #include "app/window/friend/FriendsPage.h"
 #include "app/window/friend/SelfPage.h"
-#include "host/scenario/ScenarioReader.h"
 #include "platform/map/Mercator.h"
+#include "tests/unit/app/TestHost.h"
 
 #include <gtest/gtest.h>
 
@@ -29,24 +29,11 @@ class FriendPageTest : public ::testing::Test {
   public:
     void open(const std::vector<std::string>& names, const std::string& language = "en-GB", int width = 400,
               int height = 700) {
-        std::vector<host::Scenario> scenarios;
-        for (const std::string& name : names) {
-            auto read = host::ScenarioReader({0.0}).readFile(KTR_SOURCE_DIR "/resources/scenarios/" + name + ".json");
-            ASSERT_TRUE(std::holds_alternative<host::Scenario>(read));
-            scenarios.push_back(std::get<host::Scenario>(read));
-        }
         host::HostOptions options;
         options.dark = false;
         options.language = language;
-        const auto settings = host::HostSettings::decide(options, scenarios, {});
-        ASSERT_TRUE(std::holds_alternative<host::HostSettings>(settings));
-        auto made =
-            host::Host::make(std::get<host::HostSettings>(settings), host::Host::Time::Running, KTR_PLUGIN_FILE);
-        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made)) << std::get<host::Failure>(made).line;
-        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
-        for (const host::Scenario& scenario : scenarios) {
-            ASSERT_FALSE(host->addTurn(scenario));
-        }
+        host = testHost(options, demoScenarios(names), host::Host::Time::Running);
+        ASSERT_TRUE(host);
         desktop = std::make_unique<linux_::DesktopOpener>(QString(), [this](const std::string& url) {
             opened.push_back(url);
             return desktopOpens;

@@ -1,11 +1,9 @@
 #include "app/window/Greeting.h"
 
 #include <QApplication>
-#include <QDir>
-#include <QImage>
 #include <memory>
 
-#include "host/HostOptions.h"
+#include "tests/unit/app/TestHost.h"
 
 #include <gtest/gtest.h>
 
@@ -23,12 +21,8 @@ class KTRGreetingTest : public ::testing::Test {
         host = nullptr;
         host::HostOptions options;
         options.language = language;
-        const auto settings = host::HostSettings::decide(options, {}, {});
-        ASSERT_TRUE(std::holds_alternative<host::HostSettings>(settings));
-        auto made =
-            host::Host::make(std::get<host::HostSettings>(settings), host::Host::Time::Virtual, KTR_PLUGIN_FILE);
-        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made));
-        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
+        host = testHost(options);
+        ASSERT_TRUE(host);
         greeting = std::make_unique<Greeting>(*host);
         QPalette paper;
         paper.setColor(QPalette::Window, Palette::of(ColorScheme::Dark).window);
@@ -104,13 +98,7 @@ TEST_F(KTRGreetingTest, EveryWindow_HasRoomForWhatItShows) {
             }
         }
         EXPECT_EQ(seen, one.questions) << one.name;
-        if (const QString where = qEnvironmentVariable("KTR_GALLERY"); !where.isEmpty()) {
-            QImage picture(greeting->size() * 2, QImage::Format_RGB32);
-            picture.setDevicePixelRatio(2.0);
-            greeting->render(&picture);
-            EXPECT_TRUE(picture.save(
-                QDir(where).filePath(QLatin1String("greeting-") + QLatin1String(one.name) + QLatin1String(".png"))));
-        }
+        keepPicture(*greeting, std::string("greeting-") + one.name);
     }
 }
 

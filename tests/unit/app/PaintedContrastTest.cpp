@@ -9,8 +9,8 @@
 #include "app/window/AskField.h"
 #include "app/window/ConversationWidget.h"
 #include "app/window/StatusLine.h"
-#include "host/scenario/ScenarioReader.h"
 #include "platform/ui/Label.h"
+#include "tests/unit/app/TestHost.h"
 
 #include <gtest/gtest.h>
 
@@ -62,18 +62,11 @@ class KTRPaintedContrastTest : public ::testing::Test {
     void open(const std::string& name, bool dark, bool high) {
         widget.reset();
         host.reset();
-        auto read = host::ScenarioReader({0.0}).readFile(KTR_SOURCE_DIR "/resources/scenarios/" + name + ".json");
-        ASSERT_TRUE(std::holds_alternative<host::Scenario>(read));
-        const std::vector<host::Scenario> scenarios = {std::get<host::Scenario>(read)};
         host::HostOptions options;
         options.dark = dark;
         options.highContrast = high;
-        auto settings = host::HostSettings::decide(options, scenarios, {});
-        auto made =
-            host::Host::make(std::get<host::HostSettings>(settings), host::Host::Time::Virtual, KTR_PLUGIN_FILE);
-        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made));
-        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
-        ASSERT_FALSE(host->addTurn(scenarios.front()));
+        host = testHost(options, demoScenarios({name}));
+        ASSERT_TRUE(host);
         host->settle(400.0);
         widget = std::make_unique<ConversationWidget>(*host);
         widget->resize(400, 900);

@@ -4,13 +4,11 @@
 
 #include <QApplication>
 #include <QDeadlineTimer>
-#include <QDir>
-#include <QImage>
 #include <QTcpServer>
 #include <memory>
 
-#include "host/HostOptions.h"
 #include "tests/support/TemporaryFolder.h"
+#include "tests/unit/app/TestHost.h"
 
 #include <gtest/gtest.h>
 
@@ -31,12 +29,8 @@ class KTRSignInPageTest : public ::testing::Test {
         host::HostOptions options;
         options.language = language;
         options.textSize = size;
-        const auto settings = host::HostSettings::decide(options, {}, {});
-        ASSERT_TRUE(std::holds_alternative<host::HostSettings>(settings));
-        auto made =
-            host::Host::make(std::get<host::HostSettings>(settings), host::Host::Time::Virtual, KTR_PLUGIN_FILE);
-        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made));
-        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
+        host = testHost(options);
+        ASSERT_TRUE(host);
         page = std::make_unique<SignInPage>(
             *host,
             std::make_unique<linux_::SignIn>(std::filesystem::path(folder.path()) / "config.json",
@@ -73,16 +67,7 @@ class KTRSignInPageTest : public ::testing::Test {
             QApplication::processEvents(QEventLoop::WaitForMoreEvents, 50);
         }
     }
-    void keep(const char* name) {
-        if (const QString where = qEnvironmentVariable("KTR_GALLERY"); !where.isEmpty()) {
-            QApplication::processEvents();
-            QImage picture(page->size() * 2, QImage::Format_RGB32);
-            picture.setDevicePixelRatio(2.0);
-            page->render(&picture);
-            EXPECT_TRUE(picture.save(
-                QDir(where).filePath(QLatin1String("sign-in-") + QLatin1String(name) + QLatin1String(".png"))));
-        }
-    }
+    void keep(const char* name) { keepPicture(*page, std::string("sign-in-") + name); }
     /// A port at which nobody listens.
     static QString nobody() {
         QTcpServer server;

@@ -12,12 +12,11 @@
 
 #include "app/window/AskField.h"
 #include "app/window/StatusLine.h"
-#include "host/Host.h"
-#include "host/HostOptions.h"
 #include "host/scenario/ScenarioReader.h"
 #include "platform/base/Format.h"
 #include "platform/text/TextEngine.h"
 #include "platform/ui/Label.h"
+#include "tests/unit/app/TestHost.h"
 
 #include <gtest/gtest.h>
 
@@ -85,12 +84,8 @@ class KTRWindowTextsTest : public ::testing::Test {
         host::HostOptions options;
         options.language = language;
         options.textSize = size;
-        const auto settings = host::HostSettings::decide(options, scenarios, {});
-        ASSERT_TRUE(std::holds_alternative<host::HostSettings>(settings));
-        auto made =
-            host::Host::make(std::get<host::HostSettings>(settings), host::Host::Time::Virtual, KTR_PLUGIN_FILE);
-        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made));
-        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
+        host = testHost(options, scenarios);
+        ASSERT_TRUE(host);
     }
     /// The texts below a view that the room of their labels cuts, but for those that are to give way, as names are.
     void collectCut(const platform::View& view, std::vector<std::string>& cut) const {
@@ -193,7 +188,6 @@ TEST_F(KTRWindowTextsTest, Conversation_CutsNoTextOfItsOwn) {
         for (const char* language : {"qps", "qps-plocm", "el", "hi"}) {
             for (const double width : {320.0, 400.0}) {
                 open(language, ContentSizeCategory::L, {scenario});
-                ASSERT_FALSE(host->addTurn(scenario));
                 host->settle(width);
                 std::vector<std::string> cut;
                 collectCut(*host->window(), cut);

@@ -1,71 +1,14 @@
-// Longer than other tests: what one scope does with each kind of constraint and content stands here side by side.
+// Where what a scope holds comes to stand, and how large it wants to be.
 #include "platform/layout/LayoutScope.h"
 
-#include "platform/layout/LayoutConstraint.h"
 #include "platform/ui/Label.h"
-#include "platform/ui/View.h"
-#include "tests/support/PlatformTest.h"
-#include "tests/unit/layout/PrintRect.h"
+#include "tests/unit/layout/LayoutScopeFixture.h"
 
 namespace ktr::test {
 
 using namespace platform;
 
-namespace {
-
-/// A view with a content of a size that a test sets; counts how often it was asked for it.
-class Content : public View {
-  public:
-    IntrinsicSize size;
-    BaselineOffsets offsets;
-    mutable int asked = 0;
-
-    IntrinsicSize intrinsicContentSize(double) const override {
-        ++asked;
-        return size;
-    }
-    BaselineOffsets baselineOffsets() const override { return offsets; }
-    void setSize(IntrinsicSize newSize) {
-        size = newSize;
-        invalidateIntrinsicContentSize();
-    }
-};
-
-}  // namespace
-
-class LayoutScopeTest : public PlatformTest {
-  protected:
-    template <class T = View>
-    std::shared_ptr<T> subview(const std::shared_ptr<View>& of) {
-        auto view = create<T>(&View::initWithFrame, Rect{});
-        view->setTranslatesAutoresizingMaskIntoConstraints(false);
-        of->addSubview(view);
-        return view;
-    }
-    static std::shared_ptr<LayoutConstraint> constraint(const LayoutAnchor& first, LayoutRelation relation,
-                                                        const LayoutAnchor& second, double multiplier, double constant,
-                                                        double priority = 1000.0) {
-        return std::make_shared<LayoutConstraint>(first, relation, second, multiplier, constant, priority);
-    }
-    static void activate(std::initializer_list<std::shared_ptr<LayoutConstraint>> constraints) {
-        for (const auto& one : constraints) {
-            one->setActive(true);
-        }
-    }
-    /// Pinned at the top left with this size.
-    static void place(View& view, double x, double y, double width, double height) {
-        View& parent = *view.superview();
-        activate({view.leftAnchor().constraintEqualTo(parent.leftAnchor(), x),
-                  view.topAnchor().constraintEqualTo(parent.topAnchor(), y),
-                  view.widthAnchor().constraintEqualToConstant(width),
-                  view.heightAnchor().constraintEqualToConstant(height)});
-    }
-
-    std::shared_ptr<View> root = create<View>(&View::initWithFrame, Rect{10, 20, 300, 200});
-};
-
 // --- anchors
-// ----------------------------------------------------------------------------------------------------------
 
 TEST_F(LayoutScopeTest, EveryAnchor_IsAPlaceOfItsView) {
     const auto fixed = subview(root);
@@ -134,8 +77,8 @@ TEST_F(LayoutScopeTest, Multiplier_ScalesTheSecondAnchor) {
 }
 
 TEST_F(LayoutScopeTest, Baselines_CountFromContentThatIsCentred) {
-    const auto tall = subview<Content>(root);
-    const auto low = subview<Content>(root);
+    const auto tall = subview<LayoutContent>(root);
+    const auto low = subview<LayoutContent>(root);
     tall->size = {50.0, 40.0};
     tall->offsets = {30.0, 4.0};
     low->size = {50.0, 20.0};
@@ -149,8 +92,8 @@ TEST_F(LayoutScopeTest, Baselines_CountFromContentThatIsCentred) {
 }
 
 TEST_F(LayoutScopeTest, BaselineOffset_ThatChanges_IsFollowed) {
-    const auto a = subview<Content>(root);
-    const auto b = subview<Content>(root);
+    const auto a = subview<LayoutContent>(root);
+    const auto b = subview<LayoutContent>(root);
     a->size = b->size = {10.0, 20.0};
     a->offsets = b->offsets = {15.0, 5.0};
     activate({a->topAnchor().constraintEqualTo(root->topAnchor(), 10),
@@ -164,10 +107,9 @@ TEST_F(LayoutScopeTest, BaselineOffset_ThatChanges_IsFollowed) {
 }
 
 // --- content
-// ----------------------------------------------------------------------------------------------------------
 
 TEST_F(LayoutScopeTest, Content_GivesItsSizeWhereNothingElseDoes) {
-    const auto view = subview<Content>(root);
+    const auto view = subview<LayoutContent>(root);
     view->size = {120.0, 30.0};
     activate({view->rightAnchor().constraintEqualTo(root->rightAnchor()),
               view->bottomAnchor().constraintEqualTo(root->bottomAnchor())});
@@ -179,8 +121,8 @@ TEST_F(LayoutScopeTest, Content_GivesItsSizeWhereNothingElseDoes) {
 }
 
 TEST_F(LayoutScopeTest, HigherHugging_KeepsItsContentsSize) {
-    const auto a = subview<Content>(root);
-    const auto b = subview<Content>(root);
+    const auto a = subview<LayoutContent>(root);
+    const auto b = subview<LayoutContent>(root);
     a->size = b->size = {50.0, 10.0};
     activate({a->leftAnchor().constraintEqualTo(root->leftAnchor()),
               b->leftAnchor().constraintEqualTo(a->rightAnchor()),
@@ -194,8 +136,8 @@ TEST_F(LayoutScopeTest, HigherHugging_KeepsItsContentsSize) {
 }
 
 TEST_F(LayoutScopeTest, LowerResistance_GivesWayFirst) {
-    const auto a = subview<Content>(root);
-    const auto b = subview<Content>(root);
+    const auto a = subview<LayoutContent>(root);
+    const auto b = subview<LayoutContent>(root);
     a->size = b->size = {200.0, 10.0};
     activate({a->leftAnchor().constraintEqualTo(root->leftAnchor()),
               b->leftAnchor().constraintEqualTo(a->rightAnchor()),
@@ -207,7 +149,7 @@ TEST_F(LayoutScopeTest, LowerResistance_GivesWayFirst) {
 }
 
 TEST_F(LayoutScopeTest, ContentAtThousand_GivesWaySilently) {
-    const auto view = subview<Content>(root);
+    const auto view = subview<LayoutContent>(root);
     view->size = {500.0, 10.0};
     view->setContentCompressionResistancePriority(1000.0, LayoutAxis::Horizontal);
     view->setContentHuggingPriority(1000.0, LayoutAxis::Horizontal);
@@ -219,7 +161,7 @@ TEST_F(LayoutScopeTest, ContentAtThousand_GivesWaySilently) {
 }
 
 TEST_F(LayoutScopeTest, ContentAtThousand_WinsOverWishes) {
-    const auto view = subview<Content>(root);
+    const auto view = subview<LayoutContent>(root);
     view->size = {100.0, 10.0};
     view->setContentCompressionResistancePriority(1000.0, LayoutAxis::Horizontal);
     activate({view->leftAnchor().constraintEqualTo(root->leftAnchor()),
@@ -243,7 +185,6 @@ TEST_F(LayoutScopeTest, Priorities_HaveTheirDefaults) {
 }
 
 // --- the size that is assigned
-// ----------------------------------------------------------------------------------------
 
 TEST_F(LayoutScopeTest, AssignedSize_IsStrongerThanARequiredOne) {
     const auto view = subview(root);
@@ -295,10 +236,9 @@ TEST_F(LayoutScopeTest, DeeperView_CountsInItsOwnSuperviewsCoordinates) {
 }
 
 // --- fitting
-// ----------------------------------------------------------------------------------------------------------
 
 TEST_F(LayoutScopeTest, Fitting_ContentAgainstTheTarget) {
-    const auto view = subview<Content>(root);
+    const auto view = subview<LayoutContent>(root);
     view->size = {120.0, 30.0};
     activate({view->leftAnchor().constraintEqualTo(root->leftAnchor(), 10),
               root->rightAnchor().constraintEqualTo(view->rightAnchor(), 10),
@@ -316,7 +256,7 @@ TEST_F(LayoutScopeTest, Fitting_ContentAgainstTheTarget) {
 }
 
 TEST_F(LayoutScopeTest, Fitting_FollowsContentAndConstraints) {
-    const auto view = subview<Content>(root);
+    const auto view = subview<LayoutContent>(root);
     view->size = {120.0, 30.0};
     activate({view->topAnchor().constraintEqualTo(root->topAnchor()),
               root->bottomAnchor().constraintEqualTo(view->bottomAnchor())});
@@ -353,7 +293,6 @@ TEST_F(LayoutScopeTest, Fitting_AtRequiredPriority_GoesBeforeOwnRequiredConstrai
 }
 
 // --- scopes below scopes
-// ----------------------------------------------------------------------------------------------
 
 TEST_F(LayoutScopeTest, OwnSizeOfASubview_CountsInTheScopeAbove) {
     const auto a = subview(root);
@@ -376,7 +315,7 @@ TEST_F(LayoutScopeTest, OwnSizeOfASubview_CountsInTheScopeAbove) {
 
 TEST_F(LayoutScopeTest, SubviewThatArrangesOthers_HasWhatTheseNeedAsContent) {
     const auto box = subview(root);
-    const auto inner = subview<Content>(box);
+    const auto inner = subview<LayoutContent>(box);
     inner->size = {80.0, 20.0};
     for (const auto attribute :
          {LayoutAttribute::Top, LayoutAttribute::Bottom, LayoutAttribute::Left, LayoutAttribute::Right}) {
@@ -391,186 +330,6 @@ TEST_F(LayoutScopeTest, SubviewThatArrangesOthers_HasWhatTheseNeedAsContent) {
     root->layoutIfNeeded();
     EXPECT_EQ(box->frame(), (Rect{190, 0, 100, 20}));
     EXPECT_EQ(inner->frame(), (Rect{0, 0, 100, 20}));
-}
-
-// --- when
-// -------------------------------------------------------------------------------------------------------------
-
-TEST_F(LayoutScopeTest, IsSolvedAgain_OnlyWhenAnInputChanged) {
-    const auto label = subview<Label>(root);
-    label->setText("text");
-    const auto scope = std::make_unique<LayoutScope>(*root);
-    scope->add({&label->leftAnchor().constraintEqualTo(root->leftAnchor(), 5)->rule(), 1});
-    scope->layout();
-    EXPECT_EQ(scope->solves(), 1);
-    scope->layout();
-    label->setText("text");
-    label->setHidden(true);
-    scope->invalidate();
-    scope->layout();
-    EXPECT_EQ(scope->solves(), 1);
-    label->setText("texts");
-    scope->invalidate();  // a view tells its own scope
-    scope->layout();
-    EXPECT_EQ(scope->solves(), 2);
-    root->setFrame({0, 0, 300, 200});
-    scope->layout();
-    EXPECT_EQ(scope->solves(), 2);
-    root->setFrame({0, 0, 301, 200});
-    scope->layout();
-    EXPECT_EQ(scope->solves(), 3);
-}
-
-TEST_F(LayoutScopeTest, ChangedContentDeepDown_ReachesTheRootsLayout) {
-    const auto middle = subview(root);
-    const auto view = subview<Content>(middle);
-    view->size = {10.0, 10.0};
-    activate({view->leftAnchor().constraintEqualTo(middle->leftAnchor(), 3)});
-    root->layoutIfNeeded();
-    view->setSize({20.0, 10.0});
-    root->layoutIfNeeded();
-    EXPECT_EQ(view->frame(), (Rect{3, 0, 20, 10}));
-}
-
-// --- holding
-// ----------------------------------------------------------------------------------------------------------
-
-TEST_F(LayoutScopeTest, EqualConstraints_AreHeldOnce) {
-    const auto view = subview(root);
-    for (int i = 0; i < 100; ++i) {
-        root->addConstraint(view->leftAnchor().constraintEqualTo(root->leftAnchor(), 5));
-    }
-    EXPECT_EQ(root->constraints().size(), 1U);
-    root->addConstraint(view->leftAnchor().constraintEqualTo(root->leftAnchor(), 6));
-    root->addConstraint(constraint(view->leftAnchor(), LayoutRelation::Equal, root->leftAnchor(), 1.0, 5.0, 999.0));
-    EXPECT_EQ(root->constraints().size(), 3U);
-    root->removeConstraint(view->leftAnchor().constraintEqualTo(root->leftAnchor(), 5));
-    EXPECT_EQ(root->constraints().size(), 2U);
-    root->layoutIfNeeded();
-    EXPECT_EQ(view->frame().x, 6.0);
-}
-
-TEST_F(LayoutScopeTest, Active_IsHeldByTheNearestCommonAncestor) {
-    const auto middle = subview(root);
-    const auto a = subview(middle);
-    const auto b = subview(middle);
-    const auto inMiddle = a->leftAnchor().constraintEqualTo(b->leftAnchor());
-    const auto inRoot = a->leftAnchor().constraintEqualTo(root->leftAnchor());
-    const auto own = a->widthAnchor().constraintEqualToConstant(5);
-    EXPECT_FALSE(inMiddle->isActive());
-    activate({inMiddle, inRoot, own});
-    EXPECT_TRUE(inMiddle->isActive());
-    EXPECT_EQ(middle->constraints(), std::vector{inMiddle});
-    EXPECT_EQ(root->constraints(), std::vector{inRoot});
-    EXPECT_EQ(a->constraints(), std::vector{own});
-    inMiddle->setActive(false);
-    EXPECT_FALSE(inMiddle->isActive());
-    EXPECT_TRUE(middle->constraints().empty());
-}
-
-TEST_F(LayoutScopeTest, ConstraintsThatNobodyKeeps_StayHeldAndCanBeTakenAway) {
-    const auto view = subview(root);
-    root->addConstraint(view->leftAnchor().constraintEqualTo(root->leftAnchor(), 5));
-    root->addConstraint(view->topAnchor().constraintEqualTo(root->topAnchor(), 7));
-    root->layoutIfNeeded();
-    EXPECT_EQ(view->frame().x, 5.0);
-    const auto held = root->constraints();
-    ASSERT_EQ(held.size(), 2U);
-    EXPECT_TRUE(held[0]->isActive());
-    EXPECT_EQ(held[0]->constant(), 5.0);
-    EXPECT_EQ(held[0]->first().view(), view);
-    EXPECT_EQ(root->constraints(), held);
-    held[0]->setActive(false);
-    EXPECT_FALSE(held[0]->isActive());
-    EXPECT_TRUE(held[1]->isActive());
-    root->layoutIfNeeded();
-    EXPECT_EQ(view->frame().x, 0.0);
-    EXPECT_EQ(view->frame().y, 7.0);
-}
-
-TEST_F(LayoutScopeTest, ConstraintOutlivesItsViews) {
-    auto view = subview(root);
-    const auto inner = view->widthAnchor().constraintEqualToConstant(5);
-    const auto outer = view->leftAnchor().constraintEqualTo(root->leftAnchor());
-    activate({inner, outer});
-    root->layoutIfNeeded();
-    view->removeFromSuperview();
-    view.reset();
-    EXPECT_FALSE(inner->isActive());
-    EXPECT_EQ(inner->first().view(), nullptr);
-    root.reset();
-    EXPECT_FALSE(outer->isActive());
-    outer->setActive(true);
-    EXPECT_FALSE(outer->isActive());
-}
-
-TEST_F(LayoutScopeTest, Activation_WithoutCommonAncestor_IsADebugLine) {
-    const auto stranger = create<View>(&View::initWithFrame, Rect{});
-    const auto view = subview(root);
-    const auto lost = view->leftAnchor().constraintEqualTo(stranger->leftAnchor(), 3);
-    lost->setActive(true);
-    EXPECT_FALSE(lost->isActive());
-    EXPECT_TRUE(
-        log->has(LogLevel::Debug,
-                 "A constraint whose views have no common ancestor is not activated: first.left = second.left + "
-                 "3 @1000"));
-}
-
-TEST_F(LayoutScopeTest, ConstraintOnAViewThatLeft_SleepsUntilItIsBack) {
-    const auto a = subview(root);
-    const auto b = subview(root);
-    activate({b->leftAnchor().constraintEqualTo(a->leftAnchor(), 5),
-              a->leftAnchor().constraintEqualTo(root->leftAnchor(), 9)});
-    root->layoutIfNeeded();
-    EXPECT_EQ(b->frame().x, 14.0);
-    a->removeFromSuperview();
-    root->layoutIfNeeded();
-    EXPECT_EQ(b->frame().x, 14.0);  // nothing is said of it any more: it stays
-    root->addSubview(a);
-    root->setFrame({0, 0, 100, 100});
-    root->layoutIfNeeded();
-    EXPECT_EQ(b->frame().x, 14.0);
-}
-
-TEST_F(LayoutScopeTest, ConstraintOnAViewThatDied_IsForgotten) {
-    auto a = subview(root);
-    activate({a->leftAnchor().constraintEqualTo(root->leftAnchor(), 9)});
-    a->removeFromSuperview();
-    a.reset();
-    root->layoutIfNeeded();
-    EXPECT_TRUE(root->constraints().empty());
-}
-
-TEST_F(LayoutScopeTest, Dump_NamesOwnerAndViews) {
-    const auto view = subview(root);
-    LayoutScope scope(*root);
-    scope.add({&view->leftAnchor().constraintEqualTo(root->leftAnchor(), 5)->rule(), 1});
-    EXPECT_EQ(scope.dump(),
-              "level input\n"
-              "  owner.width = 300                                holds\n"
-              "  owner.height = 200                               holds\n"
-              "level required\n"
-              "  view1.x = 5                                      holds\n"
-              "level 999.9990234\n"
-              "  owner.width >= 0                                 room 300\n"
-              "  owner.height >= 0                                room 200\n"
-              "  view1.width >= 0                                 met\n"
-              "  view1.height >= 0                                met\n"
-              "variables\n"
-              "  owner.width = 300\n"
-              "  owner.height = 200\n"
-              "  view1.width = 0\n"
-              "  view1.height = 0\n"
-              "  view1.x = 5\n"
-              "  view1.y = 0\n");
-}
-
-TEST_F(LayoutScopeTest, WithoutAPlatform_LayoutWorks) {
-    platform::Platform::install(nullptr);
-    const auto view = subview(root);
-    place(*view, 1, 2, 3, 4);
-    root->layoutIfNeeded();
-    EXPECT_EQ(view->frame(), (Rect{1, 2, 3, 4}));
 }
 
 }  // namespace ktr::test
