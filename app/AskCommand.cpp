@@ -84,9 +84,11 @@ int AskCommand::write(const std::string& question, const ask::Answer& answer) {
     }
     if (!options_.output.empty()) {
         host::QuestionDesk desk(host_);
+        const RenderCommand render(host_);
+        render.choosePalette();
         host_.answer(*host_.addQuestion(question), desk.scenarioOf(answer));
         settle();
-        if (const auto failure = RenderCommand(host_).write(options_.output)) {
+        if (const auto failure = render.write(options_.output)) {
             tell(failure->line);
             return static_cast<int>(failure->code);
         }

@@ -130,9 +130,11 @@ host::ExitCode runHeadless(const Options& options, const host::HostSettings& set
     if (options.command == Options::Command::Search) {
         return SearchCommand(host, options.searchIdle).run();
     }
+    const RenderCommand render(host);
+    render.choosePalette();
     const host::ExitCode code = options.live ? LiveRun(host, options).run(scenarios) : host::ExitCode::Ok;
     if (options.command == Options::Command::Render) {
-        const auto failure = RenderCommand(host).write(options.output);
+        const auto failure = render.write(options.output);
         return failure ? fail(*failure) : code;
     }
     host.settle(settings.width);

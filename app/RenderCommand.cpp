@@ -32,11 +32,17 @@ std::string RenderCommand::pieceName(const std::string& output, int number) {
     return output.substr(0, dot) + "-" + std::to_string(number) + output.substr(dot);
 }
 
-std::optional<host::Failure> RenderCommand::write(const std::string& output) const {
+const Palette& RenderCommand::choosePalette() const {
     const host::HostSettings& settings = host_.settings();
     const Palette& palette = Palette::of(settings.dark.value_or(false) ? ColorScheme::Dark : ColorScheme::Light,
                                          settings.drawsHighContrast() ? Contrast::High : Contrast::Normal);
     host_.conversation()->setPalette(palette);
+    return palette;
+}
+
+std::optional<host::Failure> RenderCommand::write(const std::string& output) const {
+    const host::HostSettings& settings = host_.settings();
+    const Palette& palette = choosePalette();
     const double height = host_.settle(settings.width);
     const bool splits = output.ends_with(".png") && height * settings.scale > kMostPixels;
     // Whole points keep the pieces' edges on pixels at every usual scale.

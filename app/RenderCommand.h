@@ -6,6 +6,7 @@
 
 #include "host/Failure.h"
 #include "host/Host.h"
+#include "linux/paint/Palette.h"
 
 namespace ktr::app {
 
@@ -19,6 +20,9 @@ class RenderCommand {
     static std::string pieceName(const std::string& output, int number);
 
     explicit RenderCommand(host::Host& host) : host_(host) {}
+    /// Gives the conversation the colours that it is drawn in. What is live fetches and draws on its own time, maps
+    /// too: they have to be chosen before it begins.
+    const linux_::Palette& choosePalette() const;
     /// Writes the picture; a PNG that would be too high in pieces, each as high as allowed but the last:
     /// all of them or none.
     std::optional<host::Failure> write(const std::string& output) const;

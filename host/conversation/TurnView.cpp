@@ -1,6 +1,7 @@
 #include "host/conversation/TurnView.h"
 
 #include <QPainter>
+#include <QString>
 #include <algorithm>
 
 #include "host/conversation/CutText.h"
@@ -40,6 +41,25 @@ bool rightToLeft() {
 /// The end edge as an alignment: a natural one has no name for it.
 TextAlignment endAlignment() {
     return rightToLeft() ? TextAlignment::Left : TextAlignment::Right;
+}
+
+bool isRightToLeft(char32_t c) {
+    const QChar::Direction direction = QChar::direction(c);
+    return direction == QChar::DirR || direction == QChar::DirAL;
+}
+
+/// A sentence runs as its language does, whoever's name it begins with: a mark of that direction goes before one that
+/// would run the other way. One that has no letter of the language's direction is in another language.
+std::string inItsDirection(const std::string& sentence) {
+    const QString text = QString::fromStdString(sentence);
+    const QList<uint> letters = text.toUcs4();
+    const bool hasOwnLetters = std::any_of(letters.begin(), letters.end(), [](char32_t c) {
+        return rightToLeft() ? isRightToLeft(c) : QChar::direction(c) == QChar::DirL;
+    });
+    if (!hasOwnLetters || text.isRightToLeft() == rightToLeft()) {
+        return sentence;
+    }
+    return (rightToLeft() ? "\u200F" : "\u200E") + sentence;
 }
 
 void place(View& view, const Rect& rect, double parentWidth) {
@@ -101,7 +121,7 @@ void TurnView::setTexts(const TurnTexts& texts) {
 
 void TurnView::setSentence(const std::string& sentence) {
     texts_.sentence = cutText(sentence, kLongestText);
-    sentence_->setText(texts_.sentence);
+    sentence_->setText(inItsDirection(texts_.sentence));
     sentence_->setHidden(sentence.empty());
     sentenceFade_->setHidden(sentence.empty());
 }

@@ -4,9 +4,11 @@
 import json
 import os
 import pathlib
+import struct
 import subprocess
 import tempfile
 import unittest
+import zlib
 
 from serve import Service
 
@@ -88,6 +90,35 @@ class AskTest(unittest.TestCase):
         picture = self.folder / "ann.png"
         self.assertEqual(self.run_ask("Where is Ann?", "-o", picture).returncode, 0)
         self.assertEqual(picture.read_bytes()[:8], b"\x89PNG\r\n\x1a\n")
+
+    @staticmethod
+    def share_of_bright_pixels(picture):
+        """Of a PNG as the program writes it: eight bits a channel, rows without filters."""
+        data, at, packed, header = picture.read_bytes(), 8, b"", None
+        while at < len(data):
+            length, kind = struct.unpack(">I4s", data[at:at + 8])
+            content = data[at + 8:at + 8 + length]
+            header = struct.unpack(">IIBB", content[:10]) if kind == b"IHDR" else header
+            packed += content if kind == b"IDAT" else b""
+            at += 12 + length
+        width, height, depth, colour = header
+        channels = {2: 3, 6: 4}[colour]
+        assert depth == 8
+        pixels, row = zlib.decompress(packed), 1 + width * channels
+        assert all(pixels[line * row] == 0 for line in range(height))
+        bright = sum(sum(value > 200 for value in pixels[line * row + 2:(line + 1) * row:channels]) for line in range(height))
+        return bright / (width * height)
+
+    def test_what_is_drawn_in_the_dark_is_dark_with_its_map(self):
+        picture = self.folder / "dark.png"
+        self.assertEqual(self.run_ask("Where is Ann?", "-o", picture, "--dark").returncode, 0)
+        self.assertLess(self.share_of_bright_pixels(picture), 0.1)
+        self.assertEqual(self.run_ask("Where is Ann?", "-o", picture, "--light").returncode, 0)
+        self.assertGreater(self.share_of_bright_pixels(picture), 0.7)
+        environment = dict(os.environ, KTR_CONFIG=str(self.folder / "config.json"), XDG_STATE_HOME=str(self.folder / "state"))
+        subprocess.run([PROGRAM, "render", "--live", "2s", "--ask", "Where is Ann?", "--dark", "-o", picture], env=environment,
+                       check=True, capture_output=True, timeout=120)
+        self.assertLess(self.share_of_bright_pixels(picture), 0.1)
 
     def test_in_another_language(self):
         environment = dict(os.environ, KTR_CONFIG=str(self.folder / "config.json"), XDG_STATE_HOME=str(self.folder / "state"))

@@ -1,6 +1,7 @@
 #include "host/conversation/ConversationView.h"
 
 #include "host/conversation/Measures.h"
+#include "platform/ui/Label.h"
 #include "platform/ui/TapGestureRecognizer.h"
 #include "tests/support/PlatformTest.h"
 
@@ -184,6 +185,20 @@ TEST_F(KTRConversationTest, Question_NeverBreaksAWordForBalance) {
     const platform::Font body = platform::preferredFont(platform::TextStyle::Body);
     const double width = balancedWidth("aa bbbbbbbbbbbb", body, 13.0 * kEm);
     EXPECT_EQ(width, 12.0 * kEm);
+}
+
+TEST_F(KTRConversationTest, Sentence_RunsAsItsLanguageDoesWhoeverItBeginsWith) {
+    const auto said = [this](const std::string& sentence) {
+        const auto answer = addTurn("where", sentence)->subviews()[0]->subviews()[2];
+        return std::dynamic_pointer_cast<platform::Label>(answer->subviews()[0])->text();
+    };
+    EXPECT_EQ(said("Ann is here"), "Ann is here");
+    EXPECT_EQ(said("\u0644\u064A\u0644\u0649 is here"), "\u200E\u0644\u064A\u0644\u0649 is here");
+    EXPECT_EQ(said("\u0644\u064A\u0644\u0649"), "\u0644\u064A\u0644\u0649") << "in another language";
+    assistant->rightToLeft = true;
+    EXPECT_EQ(said("Ann \u0647\u0646\u0627"), "\u200FAnn \u0647\u0646\u0627");
+    EXPECT_EQ(said("\u0647\u0646\u0627 Ann"), "\u0647\u0646\u0627 Ann");
+    EXPECT_EQ(said("Ann is here"), "Ann is here");
 }
 
 TEST_F(KTRConversationTest, Ring_ShowsWhileTheControllerSearches) {
