@@ -123,7 +123,12 @@ void LiveServices::start(std::function<void()> ready) {
         // Nothing has asked for the account before it is read for the first time.
         account_ = accounts_->deviceOwnerAccount();
         configurationChanged();
-        ready();
+        // Before that a locked session would count as one without a lock.
+        if (deviceLock_->isKnown()) {
+            ready();
+        } else {
+            deviceLock_->setKnown(ready);
+        }
     });
 }
 

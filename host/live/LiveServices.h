@@ -45,7 +45,7 @@ class LiveServices {
     /// takes another's place, with what the configuration says by then: what did not change goes on.
     void addTo(platform::Platform& platform, const std::string& language, bool ownPositions);
     /// Reads the account in the background, and again whenever its files change. `ready` is called once, when the first
-    /// reading has ended, well or not.
+    /// reading has ended, well or not, and it is known whether the session is locked.
     void start(std::function<void()> ready);
     /// Called when account, token, language, contacts or anything else has changed that a platform is asked only once:
     /// it wants another platform, with the configuration as it is now.

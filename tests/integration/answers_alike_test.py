@@ -51,8 +51,8 @@ class AnswersAlikeTest(unittest.TestCase):
         self.assertEqual(status, 200, answer)
         system = PrivateBus(folder, "system")
         self.addCleanup(system.stop)
-        logind = Logind(system)
-        self.addCleanup(logind.stop)
+        self.logind = Logind(system)
+        self.addCleanup(self.logind.stop)
         self.session = PrivateBus(folder, "session")
         self.addCleanup(self.session.stop)
         (folder / "run").mkdir(mode=0o700)
@@ -141,6 +141,21 @@ class AnswersAlikeTest(unittest.TestCase):
                 time.sleep(0.02)
         self.assertEqual(self.bus.faults, [])
         self.assertIn("Ann", self.in_the_terminal("Where is Ann?", "en")[1], "no wish was granted on the way")
+
+    def test_a_locked_computer_says_nothing_of_anybody(self):
+        connection = self.session.connect()
+        self.logind.lock(True)
+        # Whoever asked before the lock was known would be answered now and then.
+        said = {self.in_the_terminal("Where is Ann?", "en") for _ in range(12)}
+        self.assertEqual(said, {("locked", "Unlock this computer, then I’ll tell you.")})
+        sentence = said.pop()[1]
+        self.assertEqual(self.by_voice("Where is Ann?", "en"), sentence)
+        self.assertEqual(self.on_the_bus("Where is Ann?", "en"), sentence)
+        self.start(KTR, "search", "--language", "en")
+        while not connection.name_has_owner(NAME):
+            time.sleep(0.02)
+        runner = dbus.Interface(connection.get_object(NAME, PATH, introspect=False), RUNNER)
+        self.assertEqual(list(runner.Match("Where is Ann?")), [])
 
 
 if __name__ == "__main__":
