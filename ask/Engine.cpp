@@ -141,6 +141,10 @@ void Engine::gather(const Shared& asking, std::shared_ptr<const std::vector<std:
         }
         members.set("myLocation", mine);
     }
+    // It makes a friend's phone work: not for whoever only reads.
+    if (asking->understood.meaning.thisMoment && asking->question.mayChange && !asking->understood.people.empty()) {
+        members.set("fresh", true);
+    }
     service_.send("getlocations", members, [this, asking, handles, end, gathered, then](ServiceReply reply) {
         if (reply.failure != ServiceReply::Failure::None) {
             return then(std::move(reply));

@@ -10,7 +10,7 @@ namespace ktr::ask {
 namespace {
 
 constexpr std::array<const char*, Grammar::kSlots> kSlotNames{"name", "place", "time", "hour", "minute", "count"};
-constexpr std::array<const char*, Grammar::kLists> kListNames{"precision", "every", "spot"};
+constexpr std::array<const char*, Grammar::kLists> kListNames{"precision", "every", "spot", "now"};
 /// Rules within rules, and brackets in them.
 constexpr std::size_t kDeepest = 64;
 

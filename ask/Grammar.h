@@ -21,8 +21,8 @@ class Grammar {
     enum class Slot : std::uint8_t { Name, Place, Time, Hour, Minute, Count };
     static constexpr std::size_t kSlots = 6;
     /// What a template has words for.
-    enum class List : std::uint8_t { Precision, Every, Spot };
-    static constexpr std::size_t kLists = 3;
+    enum class List : std::uint8_t { Precision, Every, Spot, Now };
+    static constexpr std::size_t kLists = 4;
 
     /// The longest text, and the longest slot, that is read, letters.
     static constexpr std::size_t kLongestText = 240;
@@ -41,14 +41,14 @@ class Grammar {
         std::uint32_t group = 0;  ///< of the template
         std::int32_t letters = 0;  ///< that the template named: the more, the surer
         std::array<Span, kSlots> slots;
-        std::array<std::int8_t, kLists> values{-1, -1, -1};  ///< which of a list's; -1: none
+        std::array<std::int8_t, kLists> values{-1, -1, -1, -1};  ///< which of a list's; -1: none
     };
     using Rules = std::map<std::string, Template::Part>;
     /// By list: a part for each value.
     using Lists = std::array<std::vector<Template::Part>, kLists>;
 
     /// Slots and lists are written by these names: "name", "place", "time", "hour", "minute", "count"; "precision", "every",
-    /// "spot".
+    /// "spot", "now".
     Grammar(Rules rules, Lists lists);
     /// Empty, or what is wrong: an unknown slot or rule, a rule that uses itself, too much of it.
     std::string add(std::uint32_t group, const Template::Part& part);

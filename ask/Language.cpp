@@ -150,6 +150,8 @@ void Language::readQuestions(FieldReader& fields) {
     });
     lists.at(static_cast<std::size_t>(Grammar::List::Every))
         .push_back(Templates(fields).read("every", fields.string("every").value_or("")));
+    lists.at(static_cast<std::size_t>(Grammar::List::Now))
+        .push_back(Templates(fields).read("now", fields.string("now").value_or("")));
     auto& spots = lists.at(static_cast<std::size_t>(Grammar::List::Spot));
     spots.push_back(Templates(fields).read(kMyPlace, fields.string(kMyPlace).value_or("")));
     fields.object("places", [&](FieldReader& places) {
@@ -226,6 +228,7 @@ std::vector<Meaning> Language::meanings(const std::string& question) const {
             meaning.spot = spotOf(static_cast<std::size_t>(value));
         }
         meaning.everyTime = reading.values.at(static_cast<std::size_t>(Grammar::List::Every)) >= 0;
+        meaning.thisMoment = reading.values.at(static_cast<std::size_t>(Grammar::List::Now)) >= 0;
         meaning.certainty = reading.letters;
         if (std::find(meanings.begin(), meanings.end(), meaning) == meanings.end()) {
             meanings.push_back(std::move(meaning));

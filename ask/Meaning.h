@@ -36,6 +36,7 @@ struct Meaning {
     std::string until;   ///< until when, as it was written; empty: without an end
     std::optional<Precision> precision;
     bool everyTime = false;  ///< of a wish to be told: not only once
+    bool thisMoment = false;  ///< where somebody is "right now": what was known before may not be enough
     /// Letters that a template named, and not only a slot took: a question that is nothing but a name has none.
     int certainty = 0;
 

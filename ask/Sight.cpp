@@ -160,9 +160,12 @@ std::string Sight::where(const Sentences& sentences) const {
     return {};
 }
 
+bool Sight::isOfNow(const Question& question) const {
+    return hasTime && question.now.secondsSinceReferenceDate - time.secondsSinceReferenceDate <= kPresent;
+}
+
 bool Sight::isPresent(const Question& question) const {
-    return !question.isLive && hasTime &&
-           question.now.secondsSinceReferenceDate - time.secondsSinceReferenceDate <= kPresent;
+    return !question.isLive && isOfNow(question);
 }
 
 std::string Sight::distance(const World& world) const {

@@ -37,6 +37,8 @@ struct Sight {
     std::string where(const Sentences& sentences) const;
     /// The sentence "Ann is at Fish Market, 310 m away.", with the time where it may not hold any more.
     std::string sentence(const Sentences& sentences, const Question& question, const World& world) const;
+    /// Whether it is so fresh that nothing newer is wanted.
+    bool isOfNow(const Question& question) const;
     /// Whether a sentence may say that it is so: else it says when it was.
     bool isPresent(const Question& question) const;
     std::string distance(const World& world) const;

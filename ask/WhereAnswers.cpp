@@ -12,6 +12,7 @@ namespace {
 /// So many friends are told in a sentence each; of more the names alone are listed.
 constexpr std::size_t kTold = 3;
 constexpr std::size_t kListed = 8;
+constexpr double kMillisecondsASecond = 1000.0;
 
 std::string joined(const std::vector<std::string>& sentences) {
     std::string all;
@@ -70,6 +71,25 @@ std::string WhereAnswers::unseenSentences() const {
     return joined(unseen);
 }
 
+std::string WhereAnswers::askedSentence() const {
+    const platform::Value* given = answer_.find("asked");
+    const platform::Dictionary* asked = given == nullptr ? nullptr : given->dictionary();
+    std::optional<platform::Date> since;
+    for (const Sight& sight : sights_) {
+        const platform::Value* one = asked == nullptr ? nullptr : asked->find(sight.handle);
+        const auto time = one == nullptr ? std::nullopt : one->number();
+        if (!time || sight.isOfNow(asking_.question)) {
+            continue;
+        }
+        const platform::Date moment{*time / kMillisecondsASecond - platform::kSecondsFrom1970ToReferenceDate};
+        if (!since || moment.secondsSinceReferenceDate < since->secondsSinceReferenceDate) {
+            since = moment;
+        }
+    }
+    return since ? sentences_.text("askedNewer", {{"time", sentences_.time(*since, asking_.question.now)}})
+                 : std::string();
+}
+
 Answer WhereAnswers::nobodySeen() const {
     const auto& people = asking_.understood.people;
     Answer answer =
@@ -98,6 +118,7 @@ Answer WhereAnswers::whereIs() const {
     for (const Sight& sight : sights_) {
         told.push_back(sight.sentence(sentences_, asking_.question, asking_.world));
     }
+    told.push_back(askedSentence());
     told.push_back(unseenSentences());
     return found(joined(told), sights_, asking_.understood.people.size() > 1);
 }
@@ -135,6 +156,7 @@ Answer WhereAnswers::howFar() const {
                                                                 {"when", sight.isPresent(asking_.question) ? "now" : "then"},
                                                                 {"time", sentences_.time(moment, asking_.question.now)}}));
     }
+    told.push_back(askedSentence());
     told.push_back(unseenSentences());
     return found(joined(told), sights_, asking_.understood.people.size() > 1);
 }
@@ -189,6 +211,7 @@ Answer WhereAnswers::isAt(const std::vector<Place>& ownPlaces) const {
         told.push_back(sentences_.text(key, {{"name", nameOf(sight)}, {"place", understood.meaning.place}}));
         told.push_back(sight.sentence(sentences_, asking_.question, asking_.world));
     }
+    told.push_back(askedSentence());
     told.push_back(unseenSentences());
     return found(joined(told), sights_, understood.people.size() > 1);
 }

@@ -39,6 +39,8 @@ class WhereAnswers {
 
     /// What is said of those whom nobody sees: one sentence each, empty for none.
     std::string unseenSentences() const;
+    /// Since when the service asks for a newer place of somebody whose place is not of now; empty where it does not.
+    std::string askedSentence() const;
     Answer nobodySeen() const;
     Answer found(std::string sentence, const std::vector<Sight>& sights, bool isList) const;
     std::string nameOf(const Sight& sight) const { return sight.person->shownName(); }

@@ -47,6 +47,7 @@ std::optional<LocationsRequest> LocationsRequest::read(const Dictionary& body, s
         fields.complain("clientContext", "expected an object, found nothing");
     }
     request.handles = fields.stringOrStrings("handles");
+    request.wantsNewer = fields.boolean("fresh").value_or(false);
     request.mine = readPlace(fields, "myLocation");
     request.wanted = readPlace(fields, "requestedLocation");
     fields.object("serverContext", [&](FieldReader& context) {

@@ -25,6 +25,7 @@ struct LocationsRequest {
     std::optional<CommandPlace> wanted;   ///< whether friends are there
     std::optional<std::string> clientId;  ///< comes back
     ViewerLocale viewer;                  ///< in what words places are named
+    bool wantsNewer = false;              ///< a newer fix than there is, if a phone can be asked for one
 
     /// None, with the reason in `complaint`, for a request that is not one.
     static std::optional<LocationsRequest> read(const platform::Dictionary& body, std::string& complaint);

@@ -96,7 +96,11 @@ Dictionary LocationAnswers::locations(const LocationsRequest& request, std::vect
     const bool partly = request.handles.size() > kMostHandles;
     std::vector<AskedFriend> found;
     Value::Array rest;
+    Dictionary asked;
     for (AskedFriend& one : friends) {
+        if (one.askedSince != 0) {
+            asked.set(one.handle, one.askedSince * 1000);
+        }
         if (!one.seen) {
             rest.emplace_back(one.handle);
             continue;
@@ -121,8 +125,12 @@ Dictionary LocationAnswers::locations(const LocationsRequest& request, std::vect
     if (request.clientId) {
         context.set("clientId", *request.clientId);
     }
-    return {
+    Dictionary answer{
         {"statusCode", partly ? 416 : 200}, {"serverContext", context}, {"locations", locations}, {"emails", order}};
+    if (asked.size() > 0) {
+        answer.set("asked", asked);
+    }
+    return answer;
 }
 
 Dictionary LocationAnswers::sharing(bool hidden, const std::string& preferredHandle,

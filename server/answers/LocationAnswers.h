@@ -20,6 +20,8 @@ struct AskedFriend {
     std::optional<Seen> seen;
     PlaceName name = {};  ///< of where they are seen; of a place that its owner named nothing
     bool aloud = false;   ///< whether that may be said aloud
+    /// Since when a newer fix is asked for, seconds since 1970; 0: it is not. The same for whoever is not seen.
+    std::int64_t askedSince = 0;
 };
 
 /// Words the protocol's answers, of what `Visibility` lets through and of nothing else. Any thread.

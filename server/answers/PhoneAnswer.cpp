@@ -90,6 +90,15 @@ bool PhoneAnswer::showsTransitions(const std::string& userAgent) {
     return userAgent.rfind("OwnTracks/", 0) == 0 && userAgent.find(" CFNetwork/") != std::string::npos;
 }
 
+Dictionary PhoneAnswer::reportNow() {
+    return {{"_type", "cmd"}, {"action", "reportLocation"}};
+}
+
+bool PhoneAnswer::reportsWhenTold(const std::string& userAgent) {
+    // "Owntracks-Android/gms/420506000".
+    return userAgent.rfind("Owntracks-Android/", 0) == 0;
+}
+
 Value::Array PhoneAnswer::transitions(const std::vector<FenceEvent>& events) {
     Value::Array messages;
     for (const FenceEvent& event : events) {

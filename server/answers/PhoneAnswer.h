@@ -22,7 +22,7 @@ struct PhoneFriend {
 };
 
 /// Words the answer to an OwnTracks post: friends as an array of messages. A single message that the app does not
-/// expect costs it the whole array: only cards and locations go out, and transitions to the app that takes them, each
+/// expect costs it the whole array: only cards and locations go out, and what one of the apps takes to that one, each
 /// checked before it is written. Any thread.
 class PhoneAnswer {
   public:
@@ -31,6 +31,10 @@ class PhoneAnswer {
     /// Who came and went, for the one app that shows it: the other makes a friend without a name of it.
     static platform::Value::Array transitions(const std::vector<FenceEvent>& events);
     static bool showsTransitions(const std::string& userAgent);
+    /// What makes a phone say where it is now: for the one app that does so unless its owner forbade it there. The
+    /// other takes no such message from a server without its owner's leave.
+    static platform::Dictionary reportNow();
+    static bool reportsWhenTold(const std::string& userAgent);
     /// What somebody's card says, as a short text that changes with it.
     static std::string cardHash(const std::string& name, const std::string& faceHash);
     /// Whether a phone is to be told: never before, something else, a week ago, or in the answer to this very post,

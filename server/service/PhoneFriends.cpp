@@ -71,7 +71,7 @@ std::vector<FenceEvent> PhoneFriends::eventsFor(const Device& device, const Repo
     return events;
 }
 
-std::string PhoneFriends::answer(const Device& device, const Report& report, std::int64_t now) {
+std::string PhoneFriends::answer(const Device& device, const Report& report, std::int64_t now, bool isToReport) {
     std::vector<PhoneFriend> friends;
     std::vector<std::int64_t> seen;
     std::map<std::int64_t, SentCard> told;
@@ -104,6 +104,9 @@ std::string PhoneFriends::answer(const Device& device, const Report& report, std
     auto messages = PhoneAnswer::messages(friends);
     for (platform::Value& transition : PhoneAnswer::transitions(eventsFor(device, report, now))) {
         messages.push_back(std::move(transition));
+    }
+    if (isToReport) {
+        messages.emplace_back(PhoneAnswer::reportNow());
     }
     std::string body = platform::writeJson(messages);
     if (report.sealed) {

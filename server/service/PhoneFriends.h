@@ -25,12 +25,13 @@ class PhoneFriends {
 
     /// The body of the answer to a report, sealed when the report was. Notes what the phone was told, and that its
     /// owner looked.
-    std::string answer(const Device& device, const Report& report, std::int64_t now);
+    /// `isToReport`: the phone is told to say where it is now, once.
+    std::string answer(const Device& device, const Report& report, std::int64_t now, bool isToReport = false);
 
   private:
-    /// "Ann, seen by Mara, Otto".
     /// Who came and went, of which this phone has not heard.
     std::vector<FenceEvent> eventsFor(const Device& device, const Report& report, std::int64_t now);
+    /// "Ann, seen by Mara, Otto".
     std::string titleOf(const Person& person, std::int64_t now);
     void addOwn(const Device& device, const Report& report, std::int64_t now, std::vector<PhoneFriend>& friends,
                 std::map<std::int64_t, SentCard>& told);

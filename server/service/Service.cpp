@@ -249,16 +249,22 @@ void Service::takeOwnTracks(const HttpRequest& request, const HttpReply& reply) 
     if (auto places = namedPlaces(report); !places.empty()) {
         store_->keepPlaces(device->person, std::move(places), [placesKept](bool good) { *placesKept = good; });
     }
-    store_->keep(device->id, device->person, admitted(*device, report), store_->present(now_()),
-                 [this, device = *device, report, faceKept, placesKept, reply](bool good) {
+    auto fixes = admitted(*device, report);
+    const auto reports = std::make_shared<bool>(false);
+    if (PhoneAnswer::reportsWhenTold(request.headerText("User-Agent"))) {
+        store_->takeWishes(device->person, fixes.empty() ? 0 : fixes.back().time, store_->present(now_()),
+                           [reports](bool isWanted) { *reports = isWanted; });
+    }
+    store_->keep(device->id, device->person, std::move(fixes), store_->present(now_()),
+                 [this, device = *device, report, faceKept, placesKept, reports, reply](bool good) {
                      if (!good || !*faceKept || !*placesKept) {
                          // A phone keeps what got a 5xx and sends it again.
                          ++counters_.storeFailures;
                          return reply.send(refusal(503, "the store cannot be written"));
                      }
-                     http_.later(0.0, [this, device, report, reply] {
+                     http_.later(0.0, [this, device, report, isToReport = *reports, reply] {
                          const std::uint64_t failures = store_->readFailures();
-                         const std::string friends = PhoneFriends(*store_).answer(device, report, now_());
+                         const std::string friends = PhoneFriends(*store_).answer(device, report, now_(), isToReport);
                          if (store_->readFailures() != failures) {
                              ++counters_.storeFailures;
                              return reply.send(refusal(503, "the store cannot be read"));
@@ -362,6 +368,9 @@ void Service::answerLocations(const Device& device, const Dictionary& body, cons
     if (!request) {
         return reply.send(refusal(400, complaint));
     }
+    if (request->wantsNewer) {
+        return wishAndAnswer(device, *request, reply);
+    }
     if (!held_) {
         return locationsNow(device, *request).give(reply);
     }
@@ -389,7 +398,23 @@ void Service::answerNow(const Device& device, const Dictionary& body, const Http
     locationsNow(device, *request).give(reply);
 }
 
-HeldAnswers::Answer Service::locationsNow(const Device& device, const LocationsRequest& request) {
+void Service::wishAndAnswer(const Device& device, const LocationsRequest& request, const HttpReply& reply) {
+    std::vector<std::string> handles = request.handles;
+    handles.resize(std::min(handles.size(), static_cast<std::size_t>(Store::kMostWishes)));
+    store_->wishForFix(device.person, handles, store_->present(now_()),
+                       [this, device, request, reply](const std::optional<std::vector<std::int64_t>>& since) {
+                           if (!since) {
+                               ++counters_.storeFailures;
+                               return reply.send(refusal(503, "the store cannot be written"));
+                           }
+                           http_.later(0.0, [this, device, request, since = *since, reply] {
+                               locationsNow(device, request, since).give(reply);
+                           });
+                       });
+}
+
+HeldAnswers::Answer Service::locationsNow(const Device& device, const LocationsRequest& request,
+                                          const std::vector<std::int64_t>& askedSince) {
     const std::int64_t now = now_();
     store_->present(now);
     std::vector<std::string> lookedUp = request.handles;
@@ -404,6 +429,7 @@ HeldAnswers::Answer Service::locationsNow(const Device& device, const LocationsR
     std::vector<std::int64_t> seen;
     for (const std::string& handle : request.handles) {
         asked.push_back({handle, 0, std::nullopt});
+        asked.back().askedSince = asked.size() > askedSince.size() ? 0 : askedSince[asked.size() - 1];
         if (asked.size() > people->size()) {
             continue;
         }

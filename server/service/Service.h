@@ -89,7 +89,11 @@ class Service {
     void openEvents(const HttpRequest& request, const HttpReply& reply);
     /// The same, without holding it.
     void answerNow(const Device& device, const platform::Dictionary& body, const HttpReply& reply);
-    HeldAnswers::Answer locationsNow(const Device& device, const LocationsRequest& request);
+    /// The same with the wish for newer fixes, which is on the disk before it is answered.
+    void wishAndAnswer(const Device& device, const LocationsRequest& request, const HttpReply& reply);
+    /// `askedSince`: by handle, as `AskedFriend` has it; empty: nothing newer was asked for.
+    HeldAnswers::Answer locationsNow(const Device& device, const LocationsRequest& request,
+                                     const std::vector<std::int64_t>& askedSince = {});
     /// Looks up what the places are called, and answers then.
     void nameAndAnswer(LocationsRequest request, std::vector<AskedFriend> friends, const HttpReply& reply);
     void answerSharing(const Device& device, const SharingRequest& request, const HttpReply& reply);

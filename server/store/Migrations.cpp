@@ -112,6 +112,16 @@ CREATE INDEX outbox_until ON outbox (until);
 ALTER TABLE person ADD COLUMN heard_late {integer} NOT NULL DEFAULT 0;
 ALTER TABLE device DROP COLUMN cards_sent;
 )",
+    // 8: who wants a newer fix of whom; by handle, since it is the same of somebody whom nobody knows. `told`: when a
+    // phone
+    // was told last.
+    R"(
+CREATE TABLE fix_wish (
+    handle {text} NOT NULL, viewer {integer} NOT NULL REFERENCES person ON DELETE CASCADE, since {integer} NOT NULL,
+    told {integer} NOT NULL DEFAULT 0, PRIMARY KEY (handle, viewer)) {strict by key};
+CREATE INDEX fix_wish_viewer ON fix_wish (viewer);
+CREATE INDEX fix_wish_since ON fix_wish (since);
+)",
 };
 
 }  // namespace

@@ -210,6 +210,21 @@ class Store {
     /// What nobody heard of in time is deleted and counted here: events that were dropped, in this process.
     std::uint64_t droppedEvents() const { return droppedEvents_; }
 
+    // Wishes for a newer fix than there is: a phone that can be asked reports with its next post.
+
+    static constexpr std::int64_t kWishLasts = std::int64_t{20} * 60;  ///< seconds; a phone at rest is heard within it
+    static constexpr int kMostWishes = 50;                             ///< handles of one viewer that wait at a time
+    /// For each handle since when a newer fix was asked for, seconds since 1970; 0: there are too many. None: the store
+    /// could not be written. On the writing thread.
+    using WishDone = std::function<void(std::optional<std::vector<std::int64_t>>)>;
+    /// Notes that somebody wants a newer fix of whoever has these handles. One that stands is not made again. It is the
+    /// same for everybody, strangers, hidden people and nobody as well: whether a phone was told cannot be told.
+    void wishForFix(std::int64_t viewer, const std::vector<std::string>& handles, std::int64_t now, WishDone done);
+    /// Whether a phone of this person is to be told to report: once for each wish of somebody who sees them exactly, no
+    /// more often than `kWishLasts` for each of these, and not when there is a fix from after the wish. `newest`: of
+    /// the fixes of its post, 0 without one.
+    void takeWishes(std::int64_t person, std::int64_t newest, std::int64_t now, std::function<void(bool)> done);
+
     static std::string normalisedHandle(std::string_view handle);
 
   private:
@@ -279,6 +294,7 @@ class Store {
     /// Puts what happened into the outbox of each device of the watcher's that can be told.
     void tellOf(Database& database, const Fence& fence, const FenceCrossing& crossing);
     void dropLateEvents(Database& database, std::int64_t now);
+    static void dropOldWishes(Database& database, std::int64_t now);
     /// Ends those of one pair; without a watcher, of all who watch. With what they have not told.
     void endFencesIn(Database& database, std::int64_t subject, std::optional<std::int64_t> watcher);
     std::optional<std::vector<FenceFacts>> fences(std::int64_t person, const char* sql);

@@ -18,6 +18,7 @@ constexpr std::array kTables = {
     StoreTable{"card", false, {"owner"}, {"hash"}},
     StoreTable{"fence", false, {"subject", "watcher"}, {}},
     StoreTable{"outbox", false, {"subject", "watcher"}, {}},
+    StoreTable{"fix_wish", false, {"viewer"}, {}},
     StoreTable{"clock", true, {}, {}},
     StoreTable{"forgotten", true, {}, {}},
 };

@@ -120,6 +120,7 @@ void Store::deleteOld(std::int64_t now, Done done) {
                 deleteOldOf(database, person, retention, now);
             }
             dropLateEvents(database, now);
+            dropOldWishes(database, now);
             lastSwept_ = people.size() < static_cast<std::size_t>(kPeopleAStep) ? 0 : people.back().first;
         },
         std::move(done));

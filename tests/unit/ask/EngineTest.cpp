@@ -119,6 +119,56 @@ TEST_F(EngineTest, AnOldPlace_IsSaidWithItsTime) {
     EXPECT_DOUBLE_EQ(answer.ageSeconds.value_or(0.0), 3000.0);
 }
 
+TEST_F(EngineTest, RightNow_AsksForANewerPlace_AndSaysSinceWhen) {
+    service.answer = [](const std::string&, const Dictionary&) {
+        ServiceReply reply = locations({{"ann@harbour.example", entry(1.0, 1.0, 600.0, "Fish Market")}});
+        reply.body.set("asked", Dictionary{{"ann@harbour.example",
+                                            (kNow - 120.0 + platform::kSecondsFrom1970ToReferenceDate) * 1000.0}});
+        return reply;
+    };
+    const std::string now = ask("Where is Ann right now?").sentence;
+    EXPECT_NE(now.find("was at Fish Market. A newer place was asked for at "), std::string::npos) << now;
+    ASSERT_EQ(service.sent.size(), 1U);
+    EXPECT_EQ(platform::writeJson(*service.sent.front().members.find("fresh")), "true");
+    EXPECT_NE(ask("How far away is Ann right now?").sentence.find("A newer place"), std::string::npos);
+    EXPECT_NE(ask("Is Ann at the Fish Market right now?").sentence.find("A newer place"), std::string::npos);
+}
+
+TEST_F(EngineTest, RightNow_OfAPlaceOfNow_SaysNothingOfANewerOne) {
+    service.answer = [](const std::string&, const Dictionary&) {
+        ServiceReply reply = locations({{"ann@harbour.example", entry(1.0, 1.0, 20.0, "Fish Market")}});
+        reply.body.set(
+            "asked", Dictionary{{"ann@harbour.example", (kNow + platform::kSecondsFrom1970ToReferenceDate) * 1000.0}});
+        return reply;
+    };
+    EXPECT_EQ(ask("Where is Ann right now?").sentence, "Ann Marsh is at Fish Market.");
+    question.isLive = true;
+    EXPECT_EQ(ask("Where is Ann right now?").sentence.find("newer"), std::string::npos);
+}
+
+TEST_F(EngineTest, ServiceThatAsksNobody_IsNotSaidToHaveAsked) {
+    service.answer = [](const std::string&, const Dictionary&) {
+        ServiceReply reply = locations({{"ann@harbour.example", entry(1.0, 1.0, 600.0, "Fish Market")}});
+        reply.body.set("asked", Dictionary{{"otto@mail.example", 1.0}, {"ann@harbour.example", "soon"}});
+        return reply;
+    };
+    EXPECT_EQ(ask("Where is Ann right now?").sentence.find("newer"), std::string::npos);
+}
+
+TEST_F(EngineTest, OnlyWhoMayChangeSomething_AndNamesSomebody_MakesAPhoneWork) {
+    service.answer = [](const std::string&, const Dictionary&) {
+        return locations({{"ann@harbour.example", entry(1.0, 1.0, 600.0, "Fish Market")}});
+    };
+    ask("Where is Ann now?");
+    ask("Where are my friends right now?");
+    question.mayChange = false;
+    EXPECT_EQ(ask("Where is Ann right now?").outcome, Outcome::Found);
+    ASSERT_EQ(service.sent.size(), 3U);
+    for (const auto& sent : service.sent) {
+        EXPECT_EQ(sent.members.find("fresh"), nullptr);
+    }
+}
+
 TEST_F(EngineTest, WhoeverIsNotSeen_IsNotToldApartFromWhomNobodyKnows) {
     std::vector<std::string> answers;
     for (const Dictionary& entries :

@@ -52,6 +52,7 @@ TEST(LanguageTest, EverySentenceNamesWhatItIsAboutAndLeavesNothingUnfilled) {
     const std::map<std::string, std::vector<std::string>> wanted{{"found", {"NNN", "WWW", "DDD", "TTT"}},
                                                                  {"foundNoWords", {"NNN", "TTT", "DDD"}},
                                                                  {"notSeen", {"NNN"}},
+                                                                 {"askedNewer", {"TTT"}},
                                                                  {"ambiguous", {"NNN"}},
                                                                  {"unknownPerson", {"NNN"}},
                                                                  {"unknownPersonNear", {"NNN", "CCC"}},

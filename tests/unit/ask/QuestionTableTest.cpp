@@ -78,6 +78,7 @@ std::vector<std::string> told(const Understanding::Result& result) {
         std::string more = meaning.until;
         more += meaning.precision ? std::string("=") + nameOf(*meaning.precision) : "";
         more += meaning.everyTime ? "*" : "";
+        more += meaning.thisMoment ? "!" : "";
         return {nameOf(meaning.wish), who(understood->people), place, more};
     }
     if (const auto* unknown = std::get_if<Understanding::UnknownPerson>(&result)) {

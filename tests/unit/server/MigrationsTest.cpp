@@ -163,6 +163,7 @@ TEST_F(FileStoreTest, StoreOfEveryVersion_IsBroughtToToday_WithAllThatIsInIt) {
         EXPECT_EQ(store->placesOf(1).size(), version >= 3 ? 1U : 0U);
         EXPECT_EQ(store->retention(1)->looks, version >= 4 ? 86400 : 30 * 86400);
         EXPECT_EQ(store->face(1).has_value(), version >= 5);
+        EXPECT_TRUE(store->everythingOf(1)->find("fix_wish")) << version;
         EXPECT_EQ(store->fencesAbout(1).value().size(), version >= 6 ? 1U : 0U);
     }
 }
