@@ -31,6 +31,8 @@ constexpr const char* kCommands = "/qloxservice/friends/va/";
 constexpr std::size_t kMostClients = 1000;
 /// How long answers under way keep the service from ending.
 constexpr std::chrono::milliseconds kGrace{200};
+/// Seconds between two posts of a phone that is watched.
+constexpr double kPostsEach = 5.0;
 constexpr std::size_t kDeepBrackets = 1000000;
 
 constexpr const char* kGetLocations = "getlocations";
@@ -117,7 +119,20 @@ class DevelopmentServer::Server {
         return service;
     }
 
+    /// The phones of those about whom the user wants to be told post where they are, every few seconds, as phones do.
+    void postBySelf() {
+        for (const HttpRequest& post : made_.watchedPosts(now())) {
+            phones_(post, HttpReply([](const std::optional<HttpResponse>&) {}));
+        }
+        service_->later(kPostsEach, [this] { postBySelf(); });
+    }
+
     void route(HttpRequest request, HttpReply reply, const HttpHandler& inner) {
+        // Nobody can be watched before somebody has asked for it.
+        std::call_once(begun_, [&] {
+            phones_ = inner;
+            postBySelf();
+        });
         if (!isForUs(request)) {
             return reply.send(server::refusal(421, "this service is for localhost alone"));
         }
@@ -312,6 +327,8 @@ class DevelopmentServer::Server {
     std::atomic<int> requests_ = 0;
     std::mutex reportMutex_;
     server::TlsContext::Context tls_;
+    std::once_flag begun_;
+    HttpHandler phones_;                        ///< the service, as phones reach it; from the first request on
     std::unique_ptr<server::Service> service_;  ///< from the start on
 };
 

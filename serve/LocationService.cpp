@@ -84,10 +84,28 @@ std::vector<server::HttpRequest> LocationService::posts(const std::vector<std::s
             asked.push_back(static_cast<std::size_t>(person - file_.friends.data()));
         }
     }
-    std::sort(asked.begin(), asked.end());
-    asked.erase(std::unique(asked.begin(), asked.end()), asked.end());
+    return postsOf(std::move(asked), moment);
+}
+
+std::vector<server::HttpRequest> LocationService::watchedPosts(const ServiceMoment& moment) const {
+    std::vector<std::size_t> watched;
+    for (const auto& [fence, name, handle] :
+         people_.store()->fencesBy(people_.owner()).value_or(std::vector<server::FenceFacts>())) {
+        for (std::size_t number = 0; number < file_.friends.size(); ++number) {
+            if (people_.friendAt(number) == fence.subject) {
+                watched.push_back(number);
+            }
+        }
+    }
+    return postsOf(std::move(watched), moment);
+}
+
+std::vector<server::HttpRequest> LocationService::postsOf(std::vector<std::size_t> friends,
+                                                          const ServiceMoment& moment) const {
+    std::sort(friends.begin(), friends.end());
+    friends.erase(std::unique(friends.begin(), friends.end()), friends.end());
     std::vector<server::HttpRequest> posts;
-    for (const std::size_t number : asked) {
+    for (const std::size_t number : friends) {
         const ServedFriend& person = file_.friends[number];
         people_.setHidden(number, person.hidesAt(moment.seconds), moment.wholeSeconds());
         if (const auto place = person.placeAt(moment.seconds)) {

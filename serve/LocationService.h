@@ -37,6 +37,8 @@ class LocationService {
     /// What the phones of those who are asked for send at this moment, as it reaches the service: of those who are
     /// found. Whoever hides from now on, or no longer, does so in the service first.
     std::vector<server::HttpRequest> posts(const std::vector<std::string>& handles, const ServiceMoment& moment) const;
+    /// The same of everybody whose coming or going the user wants to be told: their phones post by themselves.
+    std::vector<server::HttpRequest> watchedPosts(const ServiceMoment& moment) const;
     /// Adds to the service's answer to a get-locations command what the friends file says beyond positions, and what
     /// the fault asks for.
     void completeLocations(platform::Dictionary& answer, const ServiceMoment& moment, const Fault& fault) const;
@@ -54,6 +56,7 @@ class LocationService {
     static double distance(double latitude, double longitude, const Waypoint& place);
 
   private:
+    std::vector<server::HttpRequest> postsOf(std::vector<std::size_t> friends, const ServiceMoment& moment) const;
     const ServedFriend* friendWith(const std::string& handle) const;
     /// None: the friend has none.
     std::optional<platform::Dictionary> entryOf(const std::string& handle, const platform::Value* given,

@@ -90,6 +90,8 @@ class Administration {
     std::string forget(const std::string& name);
     /// Durations such as "24h" and "7d"; empty: as it is. Says what holds.
     std::string retention(const std::string& name, const std::string& fixes, const std::string& looks);
+    /// By which maps places are called something, the finer ones first; none: as it is, which is said. `none`: by none.
+    std::string maps(const std::vector<std::string>& files, bool none);
     std::string check();
     /// Where it serves. A value.
     struct Serving {

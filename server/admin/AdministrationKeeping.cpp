@@ -33,6 +33,32 @@ std::string wordsOfDuration(std::int64_t seconds) {
 
 }  // namespace
 
+std::string Administration::maps(const std::vector<std::string>& files, bool none) {
+    std::string complaint;
+    auto settings = ServiceSettings::read(folder_, complaint);
+    if (!settings) {
+        return complaint;
+    }
+    if (!files.empty() || none) {
+        settings->maps.clear();
+        for (const std::string& file : files) {
+            std::error_code error;
+            settings->maps.push_back(std::filesystem::absolute(file, error).lexically_normal().string());
+        }
+        for (const std::string& broken : PlaceNames(settings->names()).complaints()) {
+            complaint += (complaint.empty() ? "" : "; ") + broken;
+        }
+        complaint = complaint.empty() ? settings->write(folder_) : complaint;
+    }
+    for (const std::string& map : complaint.empty() ? settings->maps : std::vector<std::string>()) {
+        out_ << map << "\n";
+    }
+    if (complaint.empty() && settings->maps.empty()) {
+        out_ << "no map: places are called by the nearest town of the world\n";
+    }
+    return complaint;
+}
+
 std::string Administration::backup(const std::string& file) {
     std::string complaint = open();
     if (complaint.empty()) {

@@ -28,6 +28,7 @@ constexpr std::pair<const char*, const char*> kExamples[] = {
     {"zone", "zone Ann Europe/Berlin"},
     {"looks", "looks Ann"},
     {"fences", "fences Ann --end 2"},
+    {"maps", "maps /srv/maps/region.mbtiles"},
     {"backup", "backup /var/backups/ktr-service.backup"},
     {"restore", "restore /var/backups/ktr-service.backup"},
     {"confirm", "confirm Mara"},

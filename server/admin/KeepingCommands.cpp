@@ -8,6 +8,10 @@ KeepingCommands::KeepingCommands(CLI::App& program) {
         command->add_option("name", name_, "The person's name")->required();
         return command;
     };
+    maps_ = program.add_subcommand("maps", "Says, or sets, by which maps places get their streets and towns");
+    CLI::Option* maps =
+        maps_->add_option("file", files_, "MBTiles files with vector tiles, the finer ones first")->type_name("FILE");
+    maps_->add_flag("--none", none_, "By none any more")->excludes(maps);
     backup_ = program.add_subcommand("backup", "Writes all but places, looks and sessions to a file");
     backup_->add_option("file", file_, "Written as a whole or not at all")->required();
     restore_ = program.add_subcommand("restore", "Brings a backup back, with everybody hidden");
@@ -23,6 +27,9 @@ KeepingCommands::KeepingCommands(CLI::App& program) {
 }
 
 std::optional<std::string> KeepingCommands::run(Administration& administration) const {
+    if (*maps_) {
+        return administration.maps(files_, none_);
+    }
     if (*backup_) {
         return administration.backup(file_);
     }

@@ -3,6 +3,7 @@
 #include <CLI/CLI.hpp>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "server/admin/Administration.h"
 
@@ -23,7 +24,10 @@ class KeepingCommands {
     std::string file_;
     std::string fixes_;
     std::string looks_;
+    std::vector<std::string> files_;
+    bool none_ = false;
     bool replace_ = false;
+    CLI::App* maps_;
     CLI::App* backup_;
     CLI::App* restore_;
     CLI::App* confirm_;

@@ -85,8 +85,17 @@ std::string ServiceSettings::write(const std::string& folder) const {
     return documents::AtomicFile::write(fileOf(folder), platform::writeJson(fields) + "\n", 0600);
 }
 
+std::string ServiceSettings::stateOf(const std::string& folder) {
+    struct stat facts {};
+    if (::stat(fileOf(folder).c_str(), &facts) != 0) {
+        return "";
+    }
+    return std::to_string(facts.st_ino) + " " + std::to_string(facts.st_size) + " " +
+           std::to_string(facts.st_mtim.tv_sec) + " " + std::to_string(facts.st_mtim.tv_nsec);
+}
+
 PlaceNames::Setup ServiceSettings::names() const {
-    return {maps, {}};
+    return {maps, {}, {}};
 }
 
 StoreAddress ServiceSettings::storeAddress(const std::string& folder) const {

@@ -22,6 +22,8 @@ struct ServiceSettings {
     static std::optional<ServiceSettings> read(const std::string& folder, std::string& complaint);
     /// Empty when done.
     std::string write(const std::string& folder) const;
+    /// Of the file's present state: another text whenever it may have changed.
+    static std::string stateOf(const std::string& folder);
     /// A host name or an address, of letters that a certificate takes.
     static bool isHost(const std::string& text);
     StoreAddress storeAddress(const std::string& folder) const;

@@ -7,6 +7,9 @@
 #include <cerrno>
 #include <chrono>
 #include <csignal>
+#include <optional>
+#include <utility>
+#include <vector>
 
 #include "server/admin/Administration.h"
 #include "server/admin/ServiceManager.h"
@@ -60,6 +63,32 @@ std::shared_ptr<SSL_CTX> certified(const std::string& folder, const ServiceSetti
     return context;
 }
 
+/// Looks whether the settings name other maps.
+class MapsWatch {
+  public:
+    MapsWatch(std::string folder, std::vector<std::string> maps)
+        : folder_(std::move(folder)), maps_(std::move(maps)), state_(ServiceSettings::stateOf(folder_)) {}
+
+    /// Those that hold from now on; none: as before. Settings that cannot be read change nothing.
+    std::optional<std::vector<std::string>> changed() {
+        std::string complaint;
+        if (std::string state = ServiceSettings::stateOf(folder_); state != state_) {
+            state_ = std::move(state);
+            const auto settings = ServiceSettings::read(folder_, complaint);
+            if (settings && settings->maps != maps_) {
+                maps_ = settings->maps;
+                return maps_;
+            }
+        }
+        return std::nullopt;
+    }
+
+  private:
+    const std::string folder_;
+    std::vector<std::string> maps_;
+    std::string state_;
+};
+
 }  // namespace
 
 std::string Administration::serve(const Serving& where) {
@@ -86,6 +115,7 @@ std::string Administration::serve(const Serving& where) {
     setup.now = presentTime;
     setup.holdsAnswers = true;
     setup.names = settings->names();
+    setup.names.otherMaps = [maps = MapsWatch(folder_, settings->maps)]() mutable { return maps.changed(); };
     setup.alive = ServiceManager::tellAlive;
     const auto log = std::make_shared<ServiceLog>(STDERR_FILENO);
     setup.log = log;

@@ -2,11 +2,16 @@
 
 #include <expat.h>
 #include <unicode/locid.h>
+#include <unicode/tznames.h>
+#include <unicode/unistr.h>
 
 #include <GeographicLib/Geodesic.hpp>
+#include <algorithm>
 #include <charconv>
 #include <cmath>
+#include <limits>
 #include <numbers>
+#include <optional>
 #include <string_view>
 #include <utility>
 #include <variant>
@@ -14,6 +19,7 @@
 #include "documents/FileReader.h"
 #include "documents/Words.h"
 #include "platform/base/Utf8.h"
+#include "server/names/WorldTowns.h"
 
 namespace ktr::server {
 
@@ -23,6 +29,9 @@ constexpr std::size_t kMostBytes = std::size_t{16} << 20;
 constexpr std::size_t kMostTowns = 50'000;
 constexpr std::size_t kLongestName = 160;  ///< bytes; a longer one is no name
 constexpr std::size_t kMostCatalogues = 32;
+/// The earth is no ball: what is nearest by the angle may be farther than another that is so much farther by the angle.
+constexpr double kFlatter = 1.02;
+constexpr double kRounding = 1e-7;  ///< of angles that small, radians
 constexpr const char* kCatalogue = "/LC_MESSAGES/libgweather-4.0-locations.mo";
 
 std::array<double, 3> directionOf(double latitude, double longitude) {
@@ -127,6 +136,22 @@ std::vector<std::string> foldersFor(const std::string& language) {
     return {name + "_" + locale.getCountry(), name, name + "_" + likely.getCountry()};
 }
 
+/// What a language calls the town by which a time zone is called; empty where it has no name for it.
+std::string nameOfZone(const std::string& zone, const std::string& language) {
+    UErrorCode status = U_ZERO_ERROR;
+    const auto locale = icu::Locale::forLanguageTag(language, status);
+    const std::unique_ptr<icu::TimeZoneNames> zones(icu::TimeZoneNames::createInstance(locale, status));
+    // In English a zone has peculiarities that the town has not.
+    if (U_FAILURE(status) || !zones || std::string_view(locale.getLanguage()) == "en") {
+        return {};
+    }
+    icu::UnicodeString shown;
+    zones->getExemplarLocationName(icu::UnicodeString::fromUTF8(zone), shown);
+    std::string name;
+    shown.toUTF8String(name);
+    return name;
+}
+
 }  // namespace
 
 void Gazetteer::load() {
@@ -137,6 +162,11 @@ void Gazetteer::load() {
     const auto document = documents::FileReader::read(files_.towns, {kMostBytes, {}});
     if (const auto* text = std::get_if<std::string>(&document)) {
         towns_ = TownReader().read(*text);
+    }
+    if (towns_.empty()) {
+        for (const WorldTowns::Town& town : WorldTowns::all()) {
+            towns_.push_back({town.latitude, town.longitude, town.name, "", town.zone});
+        }
     }
     towns_.shrink_to_fit();
     directions_.reserve(towns_.size());
@@ -150,25 +180,29 @@ std::size_t Gazetteer::count() {
     return towns_.size();
 }
 
-std::optional<Gazetteer::Nearest> Gazetteer::nearest(double latitude, double longitude) {
+Gazetteer::Nearest Gazetteer::nearest(double latitude, double longitude) {
     load();
     const Direction here = directionOf(latitude, longitude);
-    std::size_t best = 0;
-    double most = -2.0;
-    for (std::size_t number = 0; number < directions_.size(); ++number) {
-        const Direction& there = directions_[number];
-        const double alike = here[0] * there[0] + here[1] * there[1] + here[2] * there[2];
-        if (alike > most) {
-            most = alike;
-            best = number;
+    std::vector<double> alike;  // cosines of the angles between here and there
+    alike.reserve(directions_.size());
+    for (const Direction& there : directions_) {
+        alike.push_back(here[0] * there[0] + here[1] * there[1] + here[2] * there[2]);
+    }
+    const double most = *std::max_element(alike.begin(), alike.end());
+    const double least =
+        std::cos(std::min(std::acos(std::clamp(most, -1.0, 1.0)) * kFlatter + kRounding, std::numbers::pi));
+    Nearest nearest{nullptr, std::numeric_limits<double>::infinity()};
+    for (std::size_t number = 0; number < towns_.size(); ++number) {
+        if (alike[number] < least) {
+            continue;
+        }
+        double metres = 0.0;
+        GeographicLib::Geodesic::WGS84().Inverse(latitude, longitude, towns_[number].latitude, towns_[number].longitude,
+                                                 metres);
+        if (metres < nearest.metres) {
+            nearest = {&towns_[number], metres};
         }
     }
-    if (directions_.empty()) {
-        return std::nullopt;
-    }
-    Nearest nearest{&towns_[best]};
-    GeographicLib::Geodesic::WGS84().Inverse(latitude, longitude, nearest.town->latitude, nearest.town->longitude,
-                                             nearest.metres);
     return nearest;
 }
 
@@ -189,8 +223,11 @@ const MessageCatalogue* Gazetteer::catalogue(const std::string& language) {
 
 std::string Gazetteer::name(const Town& town, const std::string& language) {
     const MessageCatalogue* names = catalogue(language);
-    const std::string_view found = names == nullptr ? std::string_view() : names->find(town.context, town.name);
-    return documents::withoutControls(isName(found) ? found : std::string_view(town.name));
+    std::string found(names == nullptr ? std::string_view() : names->find(town.context, town.name));
+    if (found.empty() && !town.zone.empty()) {
+        found = nameOfZone(town.zone, language);
+    }
+    return documents::withoutControls(isName(found) ? found : town.name);
 }
 
 std::size_t Gazetteer::bytes() const {

@@ -4,7 +4,6 @@
 #include <cstddef>
 #include <map>
 #include <memory>
-#include <optional>
 #include <string>
 #include <vector>
 
@@ -13,7 +12,7 @@
 namespace ktr::server {
 
 /// The towns of the world by position, with their names in many languages: those of libgweather's "Locations.xml" where
-/// that is installed. One thread at a time.
+/// that is installed, else the few hundred of the built-in world. One thread at a time.
 class Gazetteer {
   public:
     struct Files {
@@ -23,19 +22,20 @@ class Gazetteer {
     struct Town {
         double latitude = 0.0;  ///< degrees
         double longitude = 0.0;
-        std::string name;     ///< in English
-        std::string context;  ///< what tells it from towns of the same name; mostly empty
+        std::string name;       ///< in English
+        std::string context;    ///< what tells it from towns of the same name; mostly empty
+        std::string zone = {};  ///< the time zone that bears its name; mostly empty
     };
     struct Nearest {
         const Town* town = nullptr;
         double metres = 0.0;
     };
 
-    /// The files are read when they are asked for first; one that is missing or damaged knows no towns, or no names.
+    /// The files are read when they are asked for first; of one that is missing or damaged the built-in towns, or their
+    /// names, take the place.
     explicit Gazetteer(Files files) : files_(std::move(files)) {}
 
-    /// None: it knows no towns.
-    std::optional<Nearest> nearest(double latitude, double longitude);
+    Nearest nearest(double latitude, double longitude);
     /// In a language (BCP 47), or in English where it has none.
     std::string name(const Town& town, const std::string& language);
     std::size_t count();

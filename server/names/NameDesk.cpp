@@ -47,6 +47,7 @@ void NameDesk::run() {
         waiting_.pop_front();
         placesWaiting_ -= question.places.size();
         lock.unlock();
+        names_.renew();
         std::vector<PlaceName> names;
         for (const PlaceNames::Place& place : question.places) {
             names.push_back(names_.name(place, question.viewer, question.until));

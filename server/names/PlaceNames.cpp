@@ -12,7 +12,22 @@ constexpr std::size_t kMostLocales = 64;
 
 }  // namespace
 
-PlaceNames::PlaceNames(Setup setup) : maps_(std::move(setup.maps)), gazetteer_(std::move(setup.gazetteer)) {
+PlaceNames::PlaceNames(Setup setup) : otherMaps_(std::move(setup.otherMaps)), gazetteer_(std::move(setup.gazetteer)) {
+    setMaps(std::move(setup.maps));
+}
+
+void PlaceNames::renew() {
+    if (auto maps = otherMaps_ ? otherMaps_() : std::nullopt) {
+        setMaps(std::move(*maps));
+    }
+}
+
+void PlaceNames::setMaps(std::vector<std::string> maps) {
+    for (std::size_t number = 0; number < regions_.size(); ++number) {
+        cache_.forget(static_cast<int>(number));
+    }
+    regions_.clear();
+    maps_ = std::move(maps);
     for (const std::string& map : maps_) {
         regions_.push_back(std::make_unique<RegionNames>(map, static_cast<int>(regions_.size()), cache_));
     }
@@ -47,8 +62,7 @@ PlaceName PlaceNames::name(const Place& place, const ViewerLocale& viewer, Clock
         name.words = words.street(name.street, name.town);
     } else if (name.town.empty()) {
         const auto nearest = gazetteer_.nearest(place.latitude, place.longitude);
-        name.words = nearest ? words.near(gazetteer_.name(*nearest->town, words.language()), nearest->metres)
-                             : words.coordinates(place.latitude, place.longitude);
+        name.words = words.near(gazetteer_.name(*nearest.town, words.language()), nearest.metres);
     }
     return name;
 }

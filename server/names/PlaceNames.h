@@ -3,8 +3,10 @@
 #include <atomic>
 #include <chrono>
 #include <cstdint>
+#include <functional>
 #include <map>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -26,7 +28,7 @@ struct PlaceName {
 };
 
 /// What places are called, without a network: the nearest street and the town from maps of one's own region, else the
-/// nearest town of the world with its distance, else coordinates in words. There is always a name. Names are never
+/// nearest town of the world with its distance. There is always a name. Names are never
 /// logged. It waits for the disk; one thread at a time, but for `streetLookUps`.
 class PlaceNames {
   public:
@@ -40,6 +42,8 @@ class PlaceNames {
     struct Setup {
         std::vector<std::string> maps = {};  ///< MBTiles files, the first that knows goes first
         Gazetteer::Files gazetteer = {};
+        /// Gives other maps once there are others; may be empty.
+        std::function<std::optional<std::vector<std::string>>()> otherMaps = {};
     };
     struct Place {
         double latitude = 0.0;  ///< degrees
@@ -53,6 +57,8 @@ class PlaceNames {
 
     explicit PlaceNames(Setup setup);
 
+    /// Takes other maps where there are others.
+    void renew();
     /// After `until` nothing more is read from maps: names are coarser then.
     PlaceName name(const Place& place, const ViewerLocale& viewer, Clock::time_point until);
     /// What is wrong with the maps: a sentence for each that cannot be read.
@@ -65,11 +71,13 @@ class PlaceNames {
     std::size_t bytes() const { return cache_.bytes() + gazetteer_.bytes(); }
 
   private:
+    void setMaps(std::vector<std::string> maps);
     const PlaceWords& wordsFor(const ViewerLocale& viewer);
 
     TileNameCache cache_{kMostTileBytes};
     std::vector<std::unique_ptr<RegionNames>> regions_;
-    const std::vector<std::string> maps_;
+    std::vector<std::string> maps_;
+    const std::function<std::optional<std::vector<std::string>>()> otherMaps_;
     Gazetteer gazetteer_;
     std::map<ViewerLocale, std::unique_ptr<PlaceWords>> words_;
     std::atomic<std::uint64_t> streetLookUps_ = 0;

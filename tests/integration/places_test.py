@@ -166,6 +166,32 @@ class PlacesTest(unittest.TestCase):
             self.assertEqual(done.returncode, 1)
             self.assertIn(f'the map "{map_}" cannot be read: ', done.stderr)
 
+    def test_maps_are_set_by_a_command_while_the_service_runs(self):
+        self.service.command("maps", "--none")
+        self.assertIn("no map: ", self.service.command("maps"))
+        self.share()
+        self.service.start()
+        latitude, longitude, street = next(walk())
+        self.locate(latitude, longitude)
+        self.assertNotIn("streetAddress", self.location())
+        before = (self.service.folder / "data" / "settings.json").read_bytes()
+        fifo = self.service.folder / "fifo"
+        os.mkfifo(fifo)
+        for wrong in ("/nonexistent.mbtiles", str(self.service.folder), str(fifo), __file__):
+            done = subprocess.run([SERVICE, "--data", str(self.service.folder / "data"), "maps", MAP, wrong],
+                                  capture_output=True, text=True, timeout=60, check=False)
+            self.assertEqual(done.returncode, 1, wrong)
+            self.assertIn(f'the map "{wrong}" cannot be read: ', done.stderr)
+        self.assertEqual((self.service.folder / "data" / "settings.json").read_bytes(), before, "nothing was changed")
+        there = pathlib.Path(MAP).resolve()
+        done = subprocess.run([SERVICE, "--data", str(self.service.folder / "data"), "maps", there.name], cwd=there.parent,
+                              capture_output=True, text=True, timeout=60, check=False)
+        self.assertEqual((done.returncode, done.stdout), (0, f"{there}\n"), done.stderr)
+        self.assertEqual(self.location()["streetAddress"], street)
+        self.assertEqual(json.loads((self.service.folder / "data" / "settings.json").read_text())["host"], "localhost")
+        self.service.command("maps", "--none")
+        self.assertNotIn("streetAddress", self.location())
+
     def test_settings_that_name_no_whole_path_are_refused(self):
         for maps, words in ((["region.mbtiles"], "expected whole paths of files"), ("/region.mbtiles", "a list of strings"),
                             ([7], "a string"), ([""], "")):

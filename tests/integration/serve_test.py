@@ -39,9 +39,9 @@ def headers(service, **changes):
     return {name: value for name, value in all_headers.items() if value is not None}
 
 
-def post(service, body=BODY, connection=None, **changes):
+def post(service, body=BODY, connection=None, path=PATH, **changes):
     connection = connection or connect(service)
-    connection.request("POST", PATH, body, headers(service, **changes))
+    connection.request("POST", path, body, headers(service, **changes))
     answer = connection.getresponse()
     return answer, answer.read()
 
@@ -340,6 +340,35 @@ class SharingTest(unittest.TestCase):
             connection.request("POST", "/qloxservice/friends/va/showHideLocation", body, headers(service))
             self.assertEqual(connection.getresponse().status, 503)
             self.assertTrue(self.visible(service, "Can my friends see me?"), "a command that failed changed nothing")
+
+
+class FenceTest(unittest.TestCase):
+    """Being told when a made-up friend arrives, with nobody asking where they are."""
+
+    def test_phones_post_by_themselves_while_somebody_is_watched(self):
+        with tempfile.TemporaryDirectory() as folder:
+            friends = pathlib.Path(folder) / "friends.json"
+            track = [{"at": at, "latitude": latitude, "longitude": -3.12, "accuracy": 10}
+                     for at, latitude in ((0, 50.2104), (12, 50.2104), (40, 50.2154))]
+            friends.write_text(json.dumps({"friends": [{"fullName": "Ann Marsh", "emails": ["ann@harbour.example"],
+                                                        "repeats": False, "track": track}]}))
+            with Service(PROGRAM, "--friends", str(friends)) as service:
+                # Where she is now is known from the first question on.
+                self.assertEqual(post(service)[0].status, 200)
+                answer, text = post(service, json.dumps({
+                    "clientContext": {}, "handle": "ann@harbour.example", "trigger": "OnArrival",
+                    "place": {"latitude": 50.2154, "longitude": -3.12, "radius": 100}}), path=PATH.replace("getlocations", "setFence"))
+                self.assertEqual(answer.status, 200, text)
+                connection = connect(service)
+                connection.request("GET", "/qloxservice/friends/va/events", headers={"Authorization": service.credentials})
+                stream = connection.getresponse()
+                lines = []
+                while not lines or not lines[-1].startswith(b"data: "):
+                    lines.append(stream.readline())
+                    self.assertNotEqual(lines[-1], b"", lines)
+                self.assertIn(b"event: crossing\n", lines)
+                self.assertEqual(json.loads(lines[-1][6:])["trigger"], "OnArrival")
+                connection.close()
 
 
 class CertificateTest(unittest.TestCase):

@@ -70,6 +70,8 @@ void writeEquator(const std::string& path, const std::string& street) {
 
 /// Just south-east of (0, 0): in both tiles.
 const PlaceNames::Place kEquator{-0.0005, 0.01, true};
+/// What is said of it without a map, and without the world's towns.
+constexpr const char* kNearEquator = "near Accra, 615\u00a0km";
 
 }  // namespace
 
@@ -130,9 +132,9 @@ TEST(PlaceNamesTest, FarFromTheMap_TheNearestTownIsSaidWithItsDistance) {
     EXPECT_EQ(nameIn(names, {48.30, 11.90, true}, {"de", "DE"}).words.find("bei München, "), 0U);
 }
 
-TEST(PlaceNamesTest, WithoutATownOfTheWorld_CoordinatesAreSaid) {
+TEST(PlaceNamesTest, WithoutTheWorldsTowns_TheNearestBuiltInOneIsSaid) {
     PlaceNames names({{}, {"/nonexistent", "/nonexistent"}});
-    EXPECT_EQ(nameIn(names, {50.2104, -3.12, true}), (PlaceName{"", "", "50.21° north, 3.12° west"}));
+    EXPECT_EQ(nameIn(names, {50.2104, -3.12, true}), (PlaceName{"", "", "near Guernsey, 94\u00a0km"}));
 }
 
 TEST(PlaceNamesTest, EveryPlaceOnEarth_HasAName) {
@@ -194,7 +196,7 @@ TEST(PlaceNamesTest, AMapThatChangesOrGoes_IsSeenToAtOnce) {
     std::filesystem::rename(folder.path() / "new", map);
     EXPECT_EQ(nameIn(names, kEquator).street, "New Road");
     std::filesystem::remove(map);
-    EXPECT_EQ(nameIn(names, kEquator).words, "0.00° north, 0.01° east");
+    EXPECT_EQ(nameIn(names, kEquator).words, kNearEquator);
     EXPECT_EQ(names.complaints().size(), 1U);
 }
 
@@ -229,7 +231,7 @@ TEST(PlaceNamesTest, DamagedTiles_AreTilesWithoutNames) {
         file.putTile({11, 1024, 1024}, "\x1f\x8b\x08 not packed");
     }
     PlaceNames names({{map}, {"/nonexistent", "/nonexistent"}});
-    EXPECT_EQ(nameIn(names, kEquator).words, "0.00° north, 0.01° east");
+    EXPECT_EQ(nameIn(names, kEquator).words, kNearEquator);
 }
 
 TEST(PlaceNamesTest, AMapThatIsAQuestionWithoutEnd_IsGivenUp) {
@@ -247,7 +249,7 @@ TEST(PlaceNamesTest, AMapThatIsAQuestionWithoutEnd_IsGivenUp) {
     PlaceNames names({{map}, {"/nonexistent", "/nonexistent"}});
     const auto begun = std::chrono::steady_clock::now();
     for (int times = 0; times < 20; ++times) {
-        EXPECT_EQ(nameIn(names, kEquator).words, "0.00° north, 0.01° east");
+        EXPECT_EQ(nameIn(names, kEquator).words, kNearEquator);
     }
     // One question that uses its second of computing up, then none; on a busy machine that takes longer.
     EXPECT_LT(std::chrono::steady_clock::now() - begun, std::chrono::seconds(15));
@@ -286,6 +288,22 @@ TEST(NameDeskTest, EachWhoAsks_IsToldInTheirOrder) {
     ASSERT_EQ(names.size(), 2U);
     EXPECT_EQ(names[0].town, "Brinmouth");
     EXPECT_EQ(names[1].words, "near Exeter, 38\u00a0km");
+}
+
+TEST(NameDeskTest, OtherMaps_AreUsedFromTheNextQuestionOn) {
+    std::atomic<int> looks = 0;
+    NameDesk desk({{}, {}, [&looks] {
+                       return ++looks == 2 ? std::optional(std::vector<std::string>{kTown}) : std::nullopt;
+                   }});
+    const auto townNow = [&desk] {
+        std::promise<std::string> told;
+        desk.ask({{50.211378, -3.115092, false}}, kEnglish,
+                 [&](const std::vector<PlaceName>& names) { told.set_value(names.front().town); });
+        return told.get_future().get();
+    };
+    EXPECT_EQ(townNow(), "");
+    EXPECT_EQ(townNow(), "Brinmouth");
+    EXPECT_EQ(townNow(), "Brinmouth");
 }
 
 TEST(NameDeskTest, WhoComesToADeskThatIsOverrun_IsToldCoordinatesAtOnce) {
