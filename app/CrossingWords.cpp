@@ -6,6 +6,7 @@
 #include "documents/JsonReader.h"
 #include "documents/Words.h"
 #include "platform/base/Format.h"
+#include "platform/base/Json.h"
 #include "platform/base/Value.h"
 
 namespace ktr::app {
@@ -51,6 +52,18 @@ std::optional<Crossing> Crossing::read(const std::string& json) {
         crossing.place = textOf(*place->dictionary(), "name");
     }
     return crossing;
+}
+
+std::string Crossing::json() const {
+    Dictionary event{{"id", std::to_string(number)},
+                     {"name", name},
+                     {"handle", handle},
+                     {"trigger", arrives ? "OnArrival" : "OnDeparture"},
+                     {"timestamp", time * 1000}};
+    if (!place.empty()) {
+        event.set("place", Dictionary{{"name", place}});
+    }
+    return platform::writeJson(event);
 }
 
 CrossingWords CrossingWords::of(const Crossing& crossing, bool isLocked,

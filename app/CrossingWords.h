@@ -18,6 +18,8 @@ struct Crossing {
 
     /// None for what is no crossing.
     static std::optional<Crossing> read(const std::string& json);
+    /// In the form that `read` takes.
+    std::string json() const;
     bool operator==(const Crossing&) const = default;
 };
 

@@ -19,6 +19,7 @@
 
 #include "app/CrossingHook.h"
 #include "app/CrossingWatch.h"
+#include "app/HookQueue.h"
 #include "app/Messages.h"
 #include "documents/AtomicFile.h"
 #include "documents/FileLock.h"
@@ -45,6 +46,8 @@ constexpr int kUntilLockIsKnown = 1500;  // milliseconds
 constexpr int kUntilShownAgain = 10000;  // milliseconds
 constexpr std::size_t kMostOfKey = 1024;
 constexpr std::size_t kMostQuestions = 100;
+/// Where numbers of notifications begin: far beyond those that servers give out, which count from 1.
+constexpr std::uint32_t kFirstNumber = 0x6B740000;
 
 host::ExitCode complain(const std::string& line) {
     tell(line);
@@ -104,9 +107,10 @@ int endingSignals() {
 /// What becomes of a crossing.
 class Teller {
   public:
-    Teller(const WatchCommand::Options& options, std::unique_ptr<CrossingHook> hook)
+    /// `hook`: none: nobody else is told.
+    Teller(const WatchCommand::Options& options, HookQueue* hook)
         : options_(options),
-          hook_(std::move(hook)),
+          hook_(hook),
           language_(options.language.empty() ? linux_::LocaleRegion::sessionLanguage() : options.language),
           texts_(language_),
           notifier_(QDBusConnection::sessionBus(), [this](const std::string& tag) { open(tag); }) {
@@ -114,9 +118,12 @@ class Teller {
     }
 
     void tellOf(const Crossing& crossing, const CrossingWatch::Next& next) {
+        if (hook_ != nullptr) {
+            hook_->add(crossing);
+        }
         if (options_.prints) {
             if (print(crossing)) {
-                return post(crossing, next);
+                return next();
             }
             // Nobody has heard of it: it is not the one that was told last.
             tell("the crossings cannot be written");
@@ -136,7 +143,8 @@ class Teller {
             questions_.erase(questions_.begin());
         }
         questions_[tag] = crossing.name;
-        notifier_.show({tag, words.title, words.body},
+        const auto number = kFirstNumber + static_cast<std::uint32_t>(crossing.number % kFirstNumber);
+        notifier_.show({tag, words.title, words.body, number},
                        [this, crossing, next](bool isShown) { shown(crossing, next, isShown); });
     }
 
@@ -145,9 +153,9 @@ class Teller {
         if (!isShown && !std::exchange(isNobodyThere_, true)) {
             tell("there is nobody on the desktop who shows notifications");
         }
-        if (isShown || hook_) {
+        if (isShown || hook_ != nullptr) {
             isNobodyThere_ = !isShown;
-            return post(crossing, next);
+            return next();
         }
         // At a session's start whoever shows them may come later than this program; the service keeps what follows.
         QTimer::singleShot(kUntilShownAgain, &notifier_, [this, crossing, next] { tellOf(crossing, next); });
@@ -160,13 +168,6 @@ class Teller {
                                  (crossing.place.empty() ? "" : ": " + crossing.place) + "\n";
         return std::fputs(line.c_str(), stdout) != EOF && std::fflush(stdout) == 0;
     }
-    void post(const Crossing& crossing, const CrossingWatch::Next& next) {
-        if (hook_) {
-            hook_->post(crossing, next);
-        } else {
-            next();
-        }
-    }
     void open(const std::string& tag) {
         QStringList words{QStringLiteral("show")};
         if (const auto question = questions_.find(tag); question != questions_.end()) {
@@ -177,7 +178,7 @@ class Teller {
     }
 
     const WatchCommand::Options& options_;
-    const std::unique_ptr<CrossingHook> hook_;
+    HookQueue* const hook_;
     const std::string language_;
     linux_::QtLocalization texts_;
     linux_::LogindLock lock_;
@@ -219,12 +220,22 @@ host::ExitCode WatchCommand::run(const Options& options, int argc, char** argv) 
     if (!lock.isHeld()) {
         return complain("another ktr watch is running: " + lock.problem());
     }
-    Teller teller(options, std::move(hook));
+    std::unique_ptr<HookQueue> queue;
+    if (hook) {
+        queue = std::make_unique<HookQueue>(HookQueue::Setup{
+            folder / "watch-hook",
+            [&hook](const Crossing& crossing, std::function<void()> done) { hook->post(crossing, std::move(done)); },
+            [](const std::string& line) { tell(line); }, [] { return QDateTime::currentSecsSinceEpoch(); }});
+    }
+    Teller teller(options, queue.get());
     CrossingWatch watch(
         {*account, folder / "watch",
          [&](const Crossing& crossing, const CrossingWatch::Next& next) { teller.tellOf(crossing, next); },
          [](const std::string& line) { tell(line); }});
     QTimer::singleShot(options.prints ? 0 : kUntilLockIsKnown, &application, [&] { watch.start(); });
+    if (queue) {
+        queue->start();
+    }
     QSocketNotifier ending(signals, QSocketNotifier::Read);
     QObject::connect(&ending, &QSocketNotifier::activated, &application, &QCoreApplication::quit);
     const int code = QCoreApplication::exec();

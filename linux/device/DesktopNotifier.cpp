@@ -68,8 +68,8 @@ void DesktopNotifier::show(const Notification& notification, Done done) {
 
 void DesktopNotifier::askServer(const Notification& notification, const Done& done) {
     QDBusMessage message = QDBusMessage::createMethodCall(kServer, kServerPath, kServer, QStringLiteral("Notify"));
-    message << kProgram << 0U << QString() << QString::fromStdString(notification.title) << plain(notification.body)
-            << QStringList{kAction, QString()}
+    message << kProgram << notification.number << QString() << QString::fromStdString(notification.title)
+            << plain(notification.body) << QStringList{kAction, QString()}
             << QVariantMap{{QStringLiteral("desktop-entry"), QStringLiteral("org.ktr.ktr")},
                            {QStringLiteral("category"), QStringLiteral("presence")}}
             << -1;

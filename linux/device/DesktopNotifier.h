@@ -6,6 +6,7 @@
 #include <QObject>
 #include <QString>
 #include <QVariantMap>
+#include <cstdint>
 #include <functional>
 #include <map>
 #include <string>
@@ -14,7 +15,7 @@ namespace ktr::linux_ {
 
 /// Shows notifications on the desktop: by its portal (org.freedesktop.portal.Notification), which shows one of a tag
 /// once however often it is told, and where there is none by the notification server (org.freedesktop.Notifications,
-/// https://specifications.freedesktop.org/notification-spec). Nothing waits. Main thread.
+/// https://specifications.freedesktop.org/notification-spec), which does so by number. Nothing waits. Main thread.
 class DesktopNotifier : public QObject {
     Q_OBJECT
 
@@ -23,6 +24,9 @@ class DesktopNotifier : public QObject {
         std::string tag;  ///< tells it from others; letters, digits and hyphens
         std::string title;
         std::string body;  ///< plain text
+        /// Tells it from others to a server, over restarts of this program. A server that heeds the specification gives
+        /// back what it was given, and replaces what it shows so already. 0: the server chooses.
+        std::uint32_t number = 0;
     };
     using Done = std::function<void(bool shown)>;
 

@@ -141,7 +141,7 @@ class AccessibilityTest(WindowTest):
         self.assertLessEqual(focused, 1)
 
 
-def outside(file=__file__):
+def outside(file=__file__, seconds=120):
     """Starts a display and a session bus, and a file of tests again inside them."""
     for needed in ("Xvfb", "dbus-run-session", SYSTEM_PYTHON):
         if not shutil.which(needed):
@@ -153,7 +153,7 @@ def outside(file=__file__):
     with tempfile.TemporaryDirectory() as runtime, VirtualDisplay("900x900") as display:
         environment = {**os.environ, "DISPLAY": display.name, "XDG_RUNTIME_DIR": runtime, "KTR_INSIDE": "yes"}
         return subprocess.run(["dbus-run-session", "--", SYSTEM_PYTHON, file, *sys.argv[1:]], env=environment,
-                              timeout=120, check=False).returncode
+                              timeout=seconds, check=False).returncode
 
 
 if __name__ == "__main__":

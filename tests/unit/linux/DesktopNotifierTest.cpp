@@ -44,6 +44,7 @@ class DesktopNotifierTest : public ::testing::Test {
             if (message.member() != QLatin1String("Notify") || message.signature() != QLatin1String("susssasa{sv}i")) {
                 return false;
             }
+            numbers.push_back(arguments[1].toUInt());
             shown.push_back("server " + arguments[3].toString().toStdString() + ", " +
                             arguments[4].toString().toStdString());
             return connection.send(message.createReply(QVariant::fromValue(7U)));
@@ -68,6 +69,7 @@ class DesktopNotifierTest : public ::testing::Test {
     std::unique_ptr<FakeService> portal;
     std::unique_ptr<FakeService> server;
     std::vector<std::string> shown;
+    std::vector<std::uint32_t> numbers;  // that the server was given
     std::vector<std::string> clicked;
     std::vector<bool> ends;
     DesktopNotifier notifier;
@@ -94,6 +96,15 @@ TEST_F(DesktopNotifierTest, WithoutAPortal_TheServerShowsIt_WithNothingToBeReadA
     emitFrom(kServerPath, QStringLiteral("org.freedesktop.Notifications"), {7U, QStringLiteral("default")});
     ASSERT_TRUE(eventually([&] { return !clicked.empty(); }));
     EXPECT_EQ(clicked, std::vector<std::string>{"ktr-2"}) << "not somebody else's";
+}
+
+TEST_F(DesktopNotifierTest, ServerIsGivenTheNumber_ByWhichItShowsOneOnce) {
+    startServer();
+    notifier.show({"ktr-4", "Ann", "Left: Work", 1802764289U}, [this](bool good) { ends.push_back(good); });
+    ASSERT_TRUE(eventually([&] { return ends.size() == 1; }));
+    notifier.show({"ktr-5", "Ann", "Left: Work"}, [this](bool good) { ends.push_back(good); });
+    ASSERT_TRUE(eventually([&] { return ends.size() == 2; }));
+    EXPECT_EQ(numbers, (std::vector<std::uint32_t>{1802764289U, 0U}));
 }
 
 TEST_F(DesktopNotifierTest, WithNeither_ItIsSaid) {
