@@ -6,7 +6,7 @@
 #include <functional>
 #include <string>
 
-#include "app/CrossingHook.h"
+#include "app/CrossingWords.h"
 
 namespace ktr::app {
 

@@ -247,14 +247,21 @@ std::string PageLanguage::metres(double metres) const {
 
 std::string PageLanguage::coordinates(double latitude, double longitude, bool exact) const {
     UErrorCode status = U_ZERO_ERROR;
-    const auto degrees = [&](double value) {
-        return utf8(icu::number::NumberFormatter::withLocale(formats_->locale)
-                        .precision(icu::number::Precision::fixedFraction(exact ? 4 : 2))
-                        .formatDouble(value, status)
-                        .toString(status));
+    const auto degrees = [&](double value, const char* positive, const char* negative) {
+        const std::string number = utf8(icu::number::NumberFormatter::withLocale(formats_->locale)
+                                            .precision(icu::number::Precision::fixedFraction(exact ? 4 : 2))
+                                            .formatDouble(std::abs(value), status)
+                                            .toString(status));
+        std::string words = text(value < 0.0 ? negative : positive, {number});
+        // A line ends between the two and in neither.
+        for (auto at = words.find(' '); at != std::string::npos; at = words.find(' ', at)) {
+            words.replace(at, 1, "\u00a0");
+        }
+        return words;
     };
-    const std::string text = degrees(latitude) + " / " + degrees(longitude);
-    return U_FAILURE(status) ? "" : text;
+    const std::string north = degrees(latitude, "DEGREES_NORTH", "DEGREES_SOUTH");
+    const std::string all = text("COORDINATES", {north, degrees(longitude, "DEGREES_EAST", "DEGREES_WEST")});
+    return U_FAILURE(status) ? "" : all;
 }
 
 std::string PageLanguage::hours(std::int64_t count) const {

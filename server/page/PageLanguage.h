@@ -49,7 +49,7 @@ class PageLanguage {
     std::string age(std::int64_t seconds) const;
     /// "20 m" or "2.8 km".
     std::string metres(double metres) const;
-    /// "50.22 / -3.11", to some ten metres if `exact`, else to a kilometre.
+    /// "50.22° north, 3.11° west", to some ten metres if `exact`, else to a kilometre.
     std::string coordinates(double latitude, double longitude, bool exact) const;
     /// "48 hours", "30 days".
     std::string hours(std::int64_t count) const;

@@ -83,7 +83,7 @@ void Store::takeWishes(std::int64_t person, std::int64_t newest, std::int64_t no
                     wishes.push_back({row.integer(0), row.integer(1), row.integer(2), grantOf(row, 6)});
                     shown = row.integer(3);
                     seen = std::max(seen, row.integer(4));
-                    latest = present(row.integer(5));
+                    latest = present(std::max(now, row.integer(5)));
                 }
             }
             for (const Wish& wish : wishes) {

@@ -282,7 +282,8 @@ class NotificationTest(WatchCase):
         self.environment["DBUS_SYSTEM_BUS_ADDRESS"] = self.bus("system")
         self.shown = self.folder / "shown"
         # As the specification has it: what replaces one has its number.
-        self.mock("--session", NOTIFICATIONS, PATH, NOTIFICATIONS, stdout=self.shown.open("w"))
+        with self.shown.open("w") as out:
+            self.mock("--session", NOTIFICATIONS, PATH, NOTIFICATIONS, stdout=out)
         self.tell("session", NOTIFICATIONS, PATH, "AddMethod", NOTIFICATIONS, "Notify", "susssasa{sv}i", "u",
                   "ret = args[1] or 1")
         self.mock("--system", LOGIND, MANAGER, f"{LOGIND}.Manager", stdout=subprocess.DEVNULL)

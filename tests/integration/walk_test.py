@@ -66,7 +66,7 @@ class WalkTest(accessibility_test.WindowTest):
         (folder / "config.json").chmod(0o600)
         self.token = (folder / "token").read_text().strip()
         (folder / "ann.json").write_text(json.dumps({"question": "Where is Ann?", "snippet": {
-            "kind": "VAKtrLocationSnippet", "searchContext": "ktrServerContext://serverContext?clientId=own&minCallbackIntervalInMS=1000&",
+            "kind": "VAKtrLocationSnippet", "searchContext": "ktrServerContext://serverContext?clientId=own&minCallbackIntervalInMS=1000&callbackTimeoutIntervalInMS=600000&",
             "locations": [{"friend": {"data": "ann@x.example", "object": {
                 "fullName": "Ann", "emails": [{"emailAddress": "ann@x.example"}]}}}]}}))
         self.environment = {"KTR_CONFIG": str(folder / "config.json"), "XDG_STATE_HOME": str(folder / "state")}
@@ -126,14 +126,20 @@ class WalkTest(accessibility_test.WindowTest):
         found = re.search(r"Place: (.*?), (?:Located|Updated|\d)", self.row().replace("\u00a0", " "))
         return found.group(1) if found else self.row()
 
+    def wait_for_place(self, wanted):
+        try:
+            wait_for(wanted, lambda: self.place() == wanted, 15)
+        except AssertionError:
+            self.fail(f"the row says {self.row()!r}, and not {wanted!r}")
+
     def test_walk_from_work_to_home(self):
         self.at(*WORK)
         self.fence("OnDeparture", "work")
         self.fence("OnArrival", "home")
         self.start_watch()
-        tree, _ = self.open(2, str(self.service.folder / "ann.json"), "--language", "en-GB", environment=self.environment)
+        tree, _ = self.open(2, str(self.service.folder / "ann.json"), "--live", "--language", "en-GB", environment=self.environment)
         self.frame = tree[0]
-        wait_for("the place of work", lambda: self.place() == "Work")
+        self.wait_for_place("Work")
         # Nothing happens: each question waits at the service for ten seconds.
         before, began = self.requests(), time.monotonic()
         time.sleep(25)
@@ -149,12 +155,12 @@ class WalkTest(accessibility_test.WindowTest):
                 time.sleep(1.5)  # either is right
             else:
                 wanted = "Work" if edges[0] < 0 else "Home" if edges[1] < 0 else f"{street}, Brinmouth"
-                wait_for(f"{wanted} (the row says {self.row()})", lambda w=wanted: self.place() == w, 15)
+                self.wait_for_place(wanted)
                 self.assertLess(time.monotonic() - posted, 8.0, "live: below what a held answer waits at most")
             if self.place() != said[-1]:
                 said.append(self.place())
         self.at(*HOME)
-        wait_for("home", lambda: self.place() == "Home")
+        self.wait_for_place("Home")
         said += ["Home"] if said[-1] != "Home" else []
         self.assertEqual(said, ["Work", *(f"{street}, Brinmouth" for street in STREETS), "Home"])
         wait_for("two notifications", lambda: len(self.notifications()) >= 2)

@@ -54,6 +54,9 @@ class FreshFixTest : public ::testing::Test {
     static std::string bodyOf(const std::string& answer) {
         const std::size_t begin = answer.find("\r\n\r\n");
         std::string body = begin == std::string::npos ? answer : answer.substr(begin + 4);
+        // What the client notes of a connection that was closed.
+        const std::size_t end = body.rfind("(end)");
+        body.erase(end == std::string::npos ? body.size() : end);
         body.erase(body.find_last_not_of("\r\n") + 1);
         return body;
     }
@@ -120,8 +123,6 @@ TEST_F(FreshFixTest, OtherPhones_AreNeverTold) {
         ask("otto", R"("ann@x.example")");
         EXPECT_EQ(post(600, agent), "[]") << agent;
     }
-    const std::string tracker = "/?id=ann's&lat=50.2&lon=-3.1&timestamp=" + std::to_string(now_ - 300);
-    EXPECT_EQ(send(tracker, std::string("User-Agent: ") + kAndroid + "\r\n", ""), "");
 }
 
 TEST_F(FreshFixTest, WithoutTheWish_NobodyIsTold) {

@@ -82,7 +82,7 @@ TEST_F(OwnPagesTest, LeaveToBeTold_NeedsExact_AndEachFenceIsSeenAndEnded) {
     ASSERT_EQ(set({"", server::FenceCircle{50.3, -3.2, 150.0}}, true), server::FenceOutcome::Set);
     const std::string page = get("/me/fences").body;
     EXPECT_NE(page.find("When I leave: \u2068Office &amp; Co\u2069"), std::string::npos) << page;
-    EXPECT_NE(page.find("When I arrive: \u206850.3000"), std::string::npos) << page;
+    EXPECT_NE(page.find("When I arrive: \u2068\u2068\u206850.3000\u2069°\u00a0north"), std::string::npos) << page;
     const auto fences = *store_->fencesAbout(mara_);
     for (const auto& one : fences) {
         EXPECT_EQ(post("/me/fences/" + std::to_string(one.fence.id) + "/end", "").status, 303);
@@ -165,7 +165,7 @@ TEST_F(OwnPagesTest, WhatLeaSees_IsHerOwnReading) {
                  [&](bool good) { kept.set_value(good); });
     ASSERT_TRUE(kept.get_future().get());
     const HttpResponse exact = get(address());
-    EXPECT_TRUE(has(exact, "50.2213 / -3.1145")) << exact.body;
+    EXPECT_TRUE(has(exact, "50.2213\u2069°\u00a0north")) << exact.body;
     EXPECT_TRUE(has(exact, "4 min. ago"));
     EXPECT_EQ(post(address(), "exactness=town&until=changed").status, 303);
     now_ += 3600;

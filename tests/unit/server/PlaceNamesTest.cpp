@@ -292,9 +292,8 @@ TEST(NameDeskTest, EachWhoAsks_IsToldInTheirOrder) {
 
 TEST(NameDeskTest, OtherMaps_AreUsedFromTheNextQuestionOn) {
     std::atomic<int> looks = 0;
-    NameDesk desk({{}, {}, [&looks] {
-                       return ++looks == 2 ? std::optional(std::vector<std::string>{kTown}) : std::nullopt;
-                   }});
+    NameDesk desk(
+        {{}, {}, [&looks] { return ++looks == 2 ? std::optional(std::vector<std::string>{kTown}) : std::nullopt; }});
     const auto townNow = [&desk] {
         std::promise<std::string> told;
         desk.ask({{50.211378, -3.115092, false}}, kEnglish,

@@ -49,7 +49,10 @@ std::vector<Town> installedTowns() {
         std::istringstream degrees(all.substr(place, 40));
         Town town{all.substr(name, all.find('<', name) - name), 0.0, 0.0};
         degrees >> town.latitude >> town.longitude;
-        towns.push_back(std::move(town));
+        // One has a longitude of -565 degrees.
+        if (std::abs(town.latitude) <= 90.0 && std::abs(town.longitude) <= 180.0) {
+            towns.push_back(std::move(town));
+        }
     }
     return towns;
 }
