@@ -166,7 +166,7 @@ Finding maps(const CheckUp::Places& places, const Configuration& configuration) 
     for (const auto& source : configuration.maps.sources) {
         std::string error;
         if (!source.file.empty() && MbtilesLoader::open(source.file, error) == nullptr) {
-            return wrong("maps", error, "ktr config get maps.sources");
+            return wrong("maps", source.file + ": " + error, "ktr config get maps.sources");
         }
         ++opened;
     }

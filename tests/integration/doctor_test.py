@@ -11,6 +11,8 @@ import tempfile
 import time
 import unittest
 
+from serve import Service
+
 PROGRAM = os.environ["KTR_PROGRAM"]
 
 
@@ -25,19 +27,9 @@ class DoctorTest(unittest.TestCase):
 
     def serve(self):
         """A development service, and a configuration for it."""
-        server = subprocess.Popen([PROGRAM, "serve", "--port", "0", "--ca-dir", str(self.folder / "serve"), "--print-config",
-                                   "--until-stdin-closes"], stdin=subprocess.PIPE, stdout=subprocess.PIPE, text=True)
-        self.addCleanup(server.wait, 30)
-        self.addCleanup(server.stdout.close)
-        self.addCleanup(server.stdin.close)
-        server.stdout.readline()
-        text = ""
-        while True:
-            text += server.stdout.readline()
-            try:
-                return json.loads(text)
-            except ValueError:
-                self.assertLess(len(text), 10000)
+        service = Service(PROGRAM, "--write-config", self.folder / "served.json")
+        self.addCleanup(service.__exit__)
+        return json.loads((self.folder / "served.json").read_text())
 
     def doctor(self, configuration, *arguments, **environment):
         if configuration is not None:
@@ -89,6 +81,7 @@ class DoctorTest(unittest.TestCase):
                                "positions": {"source": "track", "file": "gone.gpx"}})
         for thing in ("contacts", "maps", "position"):
             self.assertEqual(found[thing]["state"], "wrong", found[thing])
+            self.assertIn(str(self.folder / "gone."), found[thing]["words"])
 
     def test_track_is_read_and_added_maps_count(self):
         track = self.folder / "walk.gpx"

@@ -11,12 +11,11 @@ import signal
 import struct
 import subprocess
 import sys
-import tempfile
 import time
 import unittest
 
 from serve import Service
-from virtual_display import VirtualDisplay
+from window_case import WindowCase, wait_for
 
 PROGRAM = os.environ["KTR_PROGRAM"]
 SOURCE = pathlib.Path(os.environ["KTR_SOURCE"])
@@ -34,16 +33,6 @@ PIN = (185, 312, 215, 340)
 GROUND = (60, 340, 130, 420)
 
 
-def wait_for(what, condition, seconds=20.0):
-    deadline = time.monotonic() + seconds
-    while time.monotonic() < deadline:
-        result = condition()
-        if result:
-            return result
-        time.sleep(0.05)
-    raise AssertionError(f"{what} did not come")
-
-
 def part_of(picture, part):
     """The bytes of a part of an xwd picture."""
     words = struct.unpack(">25I", picture[:100])
@@ -54,20 +43,9 @@ def part_of(picture, part):
                     for y in range(top, bottom))
 
 
-class LiveWindowTest(unittest.TestCase):
-    @classmethod
-    def setUpClass(cls):
-        display = VirtualDisplay("1300x900")
-        cls.addClassCleanup(display.stop)
-        cls.display = display.name
-
+class LiveWindowTest(WindowCase):
     def setUp(self):
-        folder = tempfile.TemporaryDirectory()
-        self.addCleanup(folder.cleanup)
-        self.folder = pathlib.Path(folder.name)
-        self.environment = {**os.environ, "DISPLAY": self.display, "XDG_RUNTIME_DIR": folder.name, "LANG": "C.UTF-8",
-                            "XDG_STATE_HOME": str(self.folder / "state"), "QT_QPA_PLATFORM": "xcb", "NO_AT_BRIDGE": "1"}
-        os.chmod(folder.name, 0o700)
+        super().setUp()
         self.output = self.folder / "output"
 
     def serve(self, *options, step=0.0):
@@ -83,13 +61,8 @@ class LiveWindowTest(unittest.TestCase):
         self.environment["KTR_CONFIG"] = str(config)
         return service
 
-    def xdotool(self, *arguments, check=True):
-        return subprocess.run(["xdotool", *map(str, arguments)], env=self.environment, capture_output=True, text=True,
-                              check=check).stdout.strip()
-
     def find_window(self):
-        self.window = wait_for("the window", lambda: self.xdotool("search", "--onlyvisible", "--name", "^ktr$",
-                                                                  check=False).split()[:1])[0]
+        super().find_window()
         self.xdotool("windowfocus", "--sync", self.window)
 
     def start(self, *command):

@@ -11,13 +11,12 @@ import shutil
 import socket
 import subprocess
 import sys
-import tempfile
 import threading
 import time
 import unittest
 
 from serve import Service
-from virtual_display import VirtualDisplay
+from window_case import WindowCase
 
 PROGRAM = os.environ["KTR_PROGRAM"]
 
@@ -58,17 +57,9 @@ class Listener:
         self.socket.close()
 
 
-class PrivacyTest(unittest.TestCase):
-    @classmethod
-    def setUpClass(cls):
-        display = VirtualDisplay("1300x900")
-        cls.addClassCleanup(display.stop)
-        cls.display = display.name
-
+class PrivacyTest(WindowCase):
     def setUp(self):
-        folder = tempfile.TemporaryDirectory()
-        self.addCleanup(folder.cleanup)
-        self.folder = pathlib.Path(folder.name)
+        super().setUp()
         self.listener = Listener()
         self.addCleanup(self.listener.close)
         self.given = self.folder / "given"
@@ -122,26 +113,18 @@ class PrivacyTest(unittest.TestCase):
         program = subprocess.Popen([PROGRAM, "show", "--ask", "Where are my friends?", "--language", "en-GB"],
                                    env={**self.environment, "KTR_LOG": level}, stdout=subprocess.PIPE, stderr=subprocess.STDOUT)
         try:
-            deadline = time.monotonic() + 30
-            window = []
-            while not window:
-                self.assertLess(time.monotonic(), deadline, "the window does not come")
-                time.sleep(0.1)
-                window = self.xdotool("search", "--onlyvisible", "--name", "^ktr$").split()
+            self.find_window()
             time.sleep(2)
-            self.xdotool("windowfocus", "--sync", window[0])
+            self.xdotool("windowfocus", "--sync", self.window)
             for words in (TYPED, "Share my location", "Where are my friends?"):
-                self.xdotool("type", "--window", window[0], words)
-                self.xdotool("key", "--window", window[0], "Return")
+                self.xdotool("type", "--window", self.window, words)
+                self.xdotool("key", "--window", self.window, "Return")
                 time.sleep(2)
             lines = self.command_lines(program)
         finally:
             program.terminate()
             said, _ = program.communicate(timeout=30)
         return said, lines
-
-    def xdotool(self, *arguments):
-        return subprocess.run(["xdotool", *arguments], env=self.environment, capture_output=True, text=True, check=False).stdout
 
     def assert_nothing_of(self, canaries, data, where):
         for canary in canaries:

@@ -4,34 +4,23 @@ behind it. Skipped without Xvfb, xdotool, xprop, gdbus and dbus-daemon."""
 
 import json
 import os
-import pathlib
 import shutil
 import subprocess
 import sys
-import tempfile
 import time
 import unittest
 
 from serve import Service
-from virtual_display import VirtualDisplay
+from window_case import WindowCase
 
 PROGRAM = os.environ["KTR_PROGRAM"]
 INTERVAL = 0.5
 LOGIND, MANAGER, SESSION = "org.freedesktop.login1", "/org/freedesktop/login1", "/org/freedesktop/login1/session/_31"
 
 
-class UnseenTest(unittest.TestCase):
-    @classmethod
-    def setUpClass(cls):
-        display = VirtualDisplay("1300x900")
-        cls.addClassCleanup(display.stop)
-        cls.display = display.name
-
+class UnseenTest(WindowCase):
     def setUp(self):
-        folder = tempfile.TemporaryDirectory()
-        self.addCleanup(folder.cleanup)
-        os.chmod(folder.name, 0o700)
-        self.folder = pathlib.Path(folder.name)
+        super().setUp()
         config = self.folder / "config.json"
         # The user walks on and on.
         walk = self.folder / "walk.json"
@@ -39,23 +28,13 @@ class UnseenTest(unittest.TestCase):
             {"at": n, "latitude": 50.2 + n * 1e-3, "longitude": -3.1} for n in range(300)]}))
         self.service = Service(PROGRAM, "--write-config", config, "--interval", str(INTERVAL), "--positions", walk)
         self.addCleanup(self.service.__exit__)
-        self.environment = {**os.environ, "DISPLAY": self.display, "XDG_RUNTIME_DIR": folder.name, "LANG": "C.UTF-8",
-                            "XDG_STATE_HOME": folder.name, "QT_QPA_PLATFORM": "xcb", "NO_AT_BRIDGE": "1",
-                            "KTR_CONFIG": str(config)}
+        self.environment["KTR_CONFIG"] = str(config)
 
     def open(self, question):
         program = subprocess.Popen([PROGRAM, "show", "--language", "en-GB", "--ask", question], env=self.environment)
         self.addCleanup(program.wait)
         self.addCleanup(program.terminate)
-        deadline = time.monotonic() + 30
-        while time.monotonic() < deadline:
-            found = subprocess.run(["xdotool", "search", "--onlyvisible", "--name", "^ktr$"], env=self.environment,
-                                   capture_output=True, text=True, check=False).stdout.split()
-            if found:
-                self.window = found[0]
-                return
-            time.sleep(0.05)
-        self.fail("the window does not come")
+        self.find_window()
 
     def xprop(self, *words):
         subprocess.run(["xprop", *words], env=self.environment, check=True, stdout=subprocess.DEVNULL)

@@ -6,52 +6,25 @@ import pathlib
 import shutil
 import subprocess
 import sys
-import tempfile
-import time
 import unittest
 
-from virtual_display import VirtualDisplay
+from window_case import WindowCase, wait_for
 
 PROGRAM = os.environ["KTR_PROGRAM"]
 SCENARIOS = pathlib.Path(os.environ["KTR_SOURCE"]) / "resources" / "scenarios"
 
 
-def wait_for(what, condition, seconds=30.0):
-    deadline = time.monotonic() + seconds
-    while time.monotonic() < deadline:
-        result = condition()
-        if result:
-            return result
-        time.sleep(0.05)
-    raise AssertionError(f"{what} did not come")
-
-
-class WindowTest(unittest.TestCase):
-    @classmethod
-    def setUpClass(cls):
-        display = VirtualDisplay("1300x900")
-        cls.addClassCleanup(display.stop)
-        cls.display = display.name
-
+class WindowTest(WindowCase):
     def setUp(self):
-        folder = tempfile.TemporaryDirectory()
-        self.addCleanup(folder.cleanup)
-        self.environment = {**os.environ, "DISPLAY": self.display, "XDG_RUNTIME_DIR": folder.name,
-                            "QT_QPA_PLATFORM": "xcb", "NO_AT_BRIDGE": "1"}
-        os.chmod(folder.name, 0o700)
-        self.output = pathlib.Path(folder.name) / "output"
-
-    def xdotool(self, *arguments, check=True):
-        return subprocess.run(["xdotool", *map(str, arguments)], env=self.environment, capture_output=True, text=True,
-                              check=check).stdout.strip()
+        super().setUp()
+        self.output = self.folder / "output"
 
     def open(self, *arguments):
         with self.output.open("w") as output:
             self.program = subprocess.Popen([PROGRAM, "show", *map(str, arguments), "--print-urls"], env=self.environment,
                                             stdout=output, stderr=subprocess.PIPE, text=True)
         self.addCleanup(self.kill)
-        self.window = wait_for("the window", lambda: self.xdotool("search", "--onlyvisible", "--name", "^ktr$",
-                                                                  check=False).split()[:1])[0]
+        self.find_window()
         # Without a window manager the focus follows the pointer.
         self.xdotool("mousemove", "--window", self.window, 200, 120)
 
