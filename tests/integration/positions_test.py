@@ -1,5 +1,5 @@
 #!/usr/bin/python3
-"""Where the user is, in the real program: from gpsd and from a GPX track, and without either, which is no failure."""
+"""Where the user is, in the real program: from GeoClue, from gpsd and from a GPX track, and without any, which is no failure."""
 
 import json
 import os
@@ -12,6 +12,7 @@ import tempfile
 import threading
 import unittest
 
+import mock_bus
 from serve import Service
 
 PROGRAM = os.environ["KTR_PROGRAM"]
@@ -113,6 +114,38 @@ class PositionsTest(unittest.TestCase):
     def test_geoclue_without_a_bus(self):
         told = self.told(self.start(None, DBUS_SYSTEM_BUS_ADDRESS="unix:path=/nonexistent"))
         self.assertIn("Ann Marsh, Place: Home, Located now", told)
+
+    @unittest.skipUnless(mock_bus.is_possible(), "python3-dbusmock is not installed")
+    def test_geoclue_tells(self):
+        self.play_geoclue("self.EmitSignal('org.freedesktop.GeoClue2.Client', 'LocationUpdated', 'oo', "
+                          "[dbus.ObjectPath('/'), dbus.ObjectPath('/org/freedesktop/GeoClue2/Location/1')])")
+        told = self.told(self.start({"source": "geoclue"}, DBUS_SYSTEM_BUS_ADDRESS=self.bus.address))
+        self.assertIn(f"Ann Marsh, Place: Home, {DISTANCE} away", told)
+
+    @unittest.skipUnless(mock_bus.is_possible(), "python3-dbusmock is not installed")
+    def test_geoclue_that_refuses(self):
+        self.play_geoclue("raise dbus.exceptions.DBusException('no', name='org.freedesktop.DBus.Error.AccessDenied')")
+        told = self.told(self.start({"source": "geoclue"}, DBUS_SYSTEM_BUS_ADDRESS=self.bus.address))
+        self.assertIn("Ann Marsh, Place: Home, Located now", told)
+
+    def play_geoclue(self, start):
+        """GeoClue with one client, which does this when it is started, and one place."""
+        name, manager = "org.freedesktop.GeoClue2", "/org/freedesktop/GeoClue2/Manager"
+        client, location = "/org/freedesktop/GeoClue2/Client/1", "/org/freedesktop/GeoClue2/Location/1"
+        self.bus = mock_bus.MockBus(self.folder)
+        self.addCleanup(self.bus.stop)
+        self.bus.play(name, manager, f"{name}.Manager")
+        for words in (
+                (manager, "AddMethod", f"{name}.Manager", "CreateClient", "", "o", f"ret = dbus.ObjectPath('{client}')"),
+                (manager, "AddMethod", f"{name}.Manager", "DeleteClient", "o", "", ""),
+                (manager, "AddObject", client, f"{name}.Client",
+                 "{'DesktopId': <''>, 'RequestedAccuracyLevel': <uint32 0>, 'Active': <false>}", "@a(ssss) []"),
+                (client, "AddMethod", f"{name}.Client", "Start", "", "", start),
+                (client, "AddMethod", f"{name}.Client", "Stop", "", "", ""),
+                (manager, "AddObject", location, f"{name}.Location",
+                 f"{{'Latitude': <{HERE[0]}>, 'Longitude': <{HERE[1]}>, 'Accuracy': <12.5>, 'Altitude': <-1.7976931348623157e308>, "
+                 "'Speed': <-1.0>, 'Heading': <-1.0>, 'Description': <''>}", "@a(ssss) []")):
+            self.assertTrue(self.bus.tell(name, *words), words)
 
     def test_none(self):
         self.assertIn("Ann Marsh, Place: Home, Located now", self.told(self.start({"source": "none"})))

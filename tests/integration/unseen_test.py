@@ -10,6 +10,7 @@ import sys
 import time
 import unittest
 
+import mock_bus
 from serve import Service
 from window_case import WindowCase
 
@@ -82,36 +83,18 @@ class UnseenTest(WindowCase):
 
     def start_logind(self):
         """A login manager on a system bus of the test's own, which says whether the session is locked."""
-        configuration = self.folder / "bus.conf"
-        configuration.write_text("""<busconfig><type>system</type><listen>unix:tmpdir=/tmp</listen>
-            <policy context="default"><allow send_destination="*"/><allow receive_sender="*"/><allow own="*"/></policy>
-            </busconfig>""")
-        daemon = subprocess.Popen(["dbus-daemon", f"--config-file={configuration}", "--nofork", "--print-address=1"],
-                                  stdout=subprocess.PIPE, text=True)
-        self.addCleanup(daemon.stdout.close)
-        self.addCleanup(daemon.wait)
-        self.addCleanup(daemon.terminate)
-        self.environment["DBUS_SYSTEM_BUS_ADDRESS"] = daemon.stdout.readline().strip()
-        mock = subprocess.Popen(["/usr/bin/python3", "-m", "dbusmock", "--system", LOGIND, MANAGER, f"{LOGIND}.Manager"],
-                                env=self.environment)
-        self.addCleanup(mock.wait)
-        self.addCleanup(mock.terminate)
-        deadline = time.monotonic() + 20
-        while self.tell_logind(MANAGER, "AddMethod", f"{LOGIND}.Manager", "GetSessionByPID", "u", "o",
-                               f"ret = dbus.ObjectPath('{SESSION}')") != 0:
-            self.assertLess(time.monotonic(), deadline, "no login manager")
-            time.sleep(0.1)
-        self.assertEqual(self.tell_logind(MANAGER, "AddObject", SESSION, f"{LOGIND}.Session", "{'LockedHint': <false>}",
-                                          "@a(ssss) []"), 0)
-
-    def tell_logind(self, path, method, *arguments):
-        return subprocess.run(["gdbus", "call", "--system", "-d", LOGIND, "-o", path, "-m",
-                               f"org.freedesktop.DBus.Mock.{method}", *arguments], env=self.environment,
-                              capture_output=True, check=False).returncode
+        self.bus = mock_bus.MockBus(self.folder)
+        self.addCleanup(self.bus.stop)
+        self.environment["DBUS_SYSTEM_BUS_ADDRESS"] = self.bus.address
+        self.bus.play(LOGIND, MANAGER, f"{LOGIND}.Manager")
+        self.assertTrue(self.bus.tell(LOGIND, MANAGER, "AddMethod", f"{LOGIND}.Manager", "GetSessionByPID", "u", "o",
+                                      f"ret = dbus.ObjectPath('{SESSION}')"))
+        self.assertTrue(self.bus.tell(LOGIND, MANAGER, "AddObject", SESSION, f"{LOGIND}.Session", "{'LockedHint': <false>}",
+                                      "@a(ssss) []"))
 
     def lock(self, locked):
-        self.assertEqual(self.tell_logind(SESSION, "UpdateProperties", f"{LOGIND}.Session",
-                                          f"{{'LockedHint': <{str(locked).lower()}>}}"), 0)
+        self.assertTrue(self.bus.tell(LOGIND, SESSION, "UpdateProperties", f"{LOGIND}.Session",
+                                      f"{{'LockedHint': <{str(locked).lower()}>}}"))
 
     def test_locked_session_asks_nothing_and_asks_when_it_is_unlocked(self):
         self.start_logind()
