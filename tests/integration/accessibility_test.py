@@ -141,9 +141,9 @@ class AccessibilityTest(WindowTest):
         self.assertLessEqual(focused, 1)
 
 
-def outside(file=__file__, seconds=120):
-    """Starts a display and a session bus, and a file of tests again inside them."""
-    for needed in ("Xvfb", "dbus-run-session", SYSTEM_PYTHON):
+def outside(file=__file__, *programs, seconds=120):
+    """Starts a display and a session bus, and a file of tests again inside them, where it has the programs that it needs."""
+    for needed in ("Xvfb", "dbus-run-session", SYSTEM_PYTHON, *programs):
         if not shutil.which(needed):
             print(needed, "is not installed")
             return 77

@@ -1,12 +1,16 @@
 #!/usr/bin/python3
-"""What a new user does, on a virtual display with keys and a mouse, without a terminal (docs/tasks.md). Skipped as the live window's
+"""What a new user does, on a virtual display with keys and a mouse, without a terminal (docs/tasks.md). What stands where is
+learnt from the accessibility bus of a session of its own, as the eye would. Skipped as the live window's and the accessibility
 tests are."""
 
 import json
+import os
 import pathlib
+import sys
 import time
 import unittest
 
+import accessibility_test
 import live_window_test
 from live_window_test import FIRST_ROW, wait_for
 
@@ -44,6 +48,104 @@ class TasksTest(live_window_test.LiveWindowTest):
             time.sleep(0.5)
             return self.account()
         return wait_for("the account", kept)
+
+    def open_spoken(self, *options):
+        """The window of somebody who is signed in, and who is on the accessibility bus."""
+        self.environment["QT_LINUX_ACCESSIBILITY_ALWAYS_ON"] = "1"
+        self.environment.pop("NO_AT_BRIDGE", None)
+        self.program = self.start(live_window_test.PROGRAM, "show", "--language", "en-GB", "--light", "--reduced-motion", *options)
+
+    def seen(self, name, *roles):
+        """What bears this name on screen now, or begins with it; none."""
+        import pyatspi
+        from gi.repository import GLib
+
+        desktop = pyatspi.Registry.getDesktop(0)
+        try:
+            for i in range(desktop.childCount):
+                application = desktop.getChildAtIndex(i)
+                if not application or application.name != "ktr" or application.get_process_id() != self.program.pid:
+                    continue
+                for node in accessibility_test.nodes(application):
+                    if ((node.name or "").startswith(name) and (not roles or node.getRoleName() in roles)
+                            and node.getState().contains(pyatspi.STATE_SHOWING)):
+                        return node
+        except (AttributeError, RuntimeError, LookupError, GLib.Error):
+            pass
+        return None
+
+    def await_seen(self, name, *roles):
+        return wait_for(repr(name), lambda: self.seen(name, *roles))
+
+    def click_on(self, name, *roles):
+        import pyatspi
+
+        place = self.await_seen(name, *roles).queryComponent().getExtents(pyatspi.DESKTOP_COORDS)
+        self.xdotool("mousemove", place.x + place.width // 2, place.y + place.height // 2, "click", 1)
+
+    def open_ann(self):
+        """The page that a tap on her row leads to."""
+        service = self.serve()
+        self.open_spoken("--ask", "where are my friends")
+        self.click_on("Ann Marsh", "link")
+        self.await_seen("Back", "push button")
+        return service
+
+    def test_task_tap(self):
+        self.open_ann()
+        self.await_seen("Copy place", "push button")
+        self.await_seen("Write", "push button")
+        self.click_on("Back", "push button")
+        self.await_seen("Otto Brandt", "link")
+
+    def test_task_zoom(self):
+        self.open_ann()
+        ground = (20, 60, 380, 400)
+        # Until the page is there and its map drawn.
+        wait_for("a map at rest", lambda: (one := self.picture(ground)) and not time.sleep(1.0) and one == self.picture(ground))
+        for hand in (lambda: self.click_on("Closer", "push button"), lambda: self.click_on("Further away", "push button"),
+                     lambda: self.xdotool("mousemove", "--window", self.window, 200, 150, "click", 4),
+                     lambda: self.key("minus")):
+            before = self.picture(ground)
+            hand()
+            wait_for("another map", lambda before=before: self.picture(ground) not in (before, None))
+
+    def test_task_copy(self):
+        self.open_ann()
+        self.click_on("Copy place", "push button")
+        self.await_seen("Copied", "push button")
+        self.key("Escape")
+        field = self.await_seen("Ask about your friends", "text")
+        self.click_on("Ask about your friends", "text")
+        self.key("ctrl+v")
+        copied = wait_for("the place", lambda: (text := field.queryText()).getText(0, text.characterCount))
+        self.assertRegex(copied, r"50\.2\d+, -3\.1\d+")
+
+    def test_task_hide(self):
+        service = self.serve()
+        self.open_spoken()
+        self.click_on("Ask about your friends", "text")
+        self.type("hide my location")
+        self.key("Return")
+        wait_for("nobody to see", lambda: service.ask("can my friends see me")["snippet"]["visible"] is False)
+        self.await_seen("Your location is hidden")
+
+    def test_task_change_text_size(self):
+        self.serve()
+        self.open_spoken("--ask", "where are my friends")
+        row = self.await_seen("Ann Marsh", "link")
+
+        def height():
+            import pyatspi
+            return row.queryComponent().getExtents(pyatspi.DESKTOP_COORDS).height
+
+        usual = wait_for("a row", height)
+        self.key("ctrl+plus", "ctrl+plus")
+        row = wait_for("a larger row", lambda: (one := self.seen("Ann Marsh", "link")) and
+                       one.queryComponent().getExtents(0).height > usual and one)
+        self.key("ctrl+0")
+        wait_for("the usual row", lambda: (one := self.seen("Ann Marsh", "link")) and
+                 one.queryComponent().getExtents(0).height == usual)
 
     def test_task_sign_in_and_ask(self):
         self.sign_in_page()
@@ -84,4 +186,6 @@ def load_tests(loader, _tests, _pattern):
 
 
 if __name__ == "__main__":
+    if "KTR_INSIDE" not in os.environ:
+        sys.exit(accessibility_test.outside(__file__, "xdotool", "xwd", seconds=560))
     unittest.main()
