@@ -27,6 +27,35 @@ std::string numbered(int width, int height) {
     return std::to_string(width) + " x " + std::to_string(height) + " pixels";
 }
 
+bool hasRightToLeft(const QString& text) {
+    return std::any_of(text.begin(), text.end(), [](QChar c) {
+        const QChar::Direction direction = c.direction();
+        return direction == QChar::DirR || direction == QChar::DirAL;
+    });
+}
+
+/// Each text stands for itself in an SVG file, where it is read from left to right: what is not begins with a mark that
+/// says so, or its full stop would come out at the wrong end.
+QByteArray withDirections(const QByteArray& svg) {
+    constexpr char16_t kRightToLeft = 0x202B;
+    constexpr char16_t kEnd = 0x202C;
+    QByteArray made;
+    made.reserve(svg.size());
+    qsizetype done = 0;
+    for (qsizetype at = svg.indexOf("<text"); at >= 0; at = svg.indexOf("<text", done)) {
+        const qsizetype begin = svg.indexOf('>', at) + 1;
+        const qsizetype end = svg.indexOf("</text>", begin);
+        if (begin <= 0 || end < 0) {
+            break;
+        }
+        const QString text = QString::fromUtf8(svg.mid(begin, end - begin));
+        made += svg.mid(done, begin - done);
+        made += hasRightToLeft(text) ? (QChar(kRightToLeft) + text + QChar(kEnd)).toUtf8() : text.toUtf8();
+        done = end;
+    }
+    return made + svg.mid(done);
+}
+
 class FixedHashes {
   public:
     FixedHashes() { QHashSeed::setDeterministicGlobalSeed(); }
@@ -109,7 +138,7 @@ QByteArray ScenePainter::svg(const Paint& paint) const {
     generator.setResolution(96);
     generator.setTitle(title_);
     paintOn(generator, 1.0, scale_, paint);
-    return data;
+    return withDirections(data);
 }
 
 QByteArray ScenePainter::pdf(const Paint& paint) const {

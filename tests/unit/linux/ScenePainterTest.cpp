@@ -4,11 +4,14 @@
 
 #include <QDir>
 #include <QFile>
+#include <QPainter>
+#include <QSvgRenderer>
 #include <QTemporaryDir>
 #include <limits>
 
 #include "linux/paint/AvatarImage.h"
 #include "linux/paint/QtTextEngine.h"
+#include "linux/paint/RasterImage.h"
 
 namespace ktr::linux_ {
 
@@ -77,6 +80,54 @@ TEST_F(ScenePainterTest, PdfFile_HoldsNoDate) {
     EXPECT_TRUE(pdf.startsWith("%PDF"));
     EXPECT_TRUE(pdf.contains("/CreationDate (D:00000000000000"));
     EXPECT_TRUE(pdf.contains("/MediaBox [0 0 200.000000 80.000000]"));
+}
+
+// Its text elements stand for themselves and are read from left to right, unless they say otherwise.
+TEST_F(ScenePainterTest, SvgFile_SaysWhichTextsRunFromRightToLeft) {
+    const auto words = [](QtCanvas& canvas) {
+        QtTextEngine engine(QStringLiteral("ar"));
+        const auto arabic = engine.layOut(AttributedString("سأتابع ذلك.", Font()), {});
+        canvas.draw(*arabic, {5, 5}, Color::ofRole(platform::ColorRole::StandardText));
+        const auto english = engine.layOut(AttributedString("I’ll look.", Font()), {});
+        canvas.draw(*english, {5, 40}, Color::ofRole(platform::ColorRole::StandardText));
+    };
+    ASSERT_EQ(painter_.write(path("a.svg"), words), std::nullopt);
+    const QString svg = QString::fromUtf8(read("a.svg"));
+    const auto marked = [](const QString& word) { return QChar(0x202B) + word + QChar(0x202C); };
+    EXPECT_TRUE(svg.contains(marked(QStringLiteral("سأتابع")))) << svg.toStdString();
+    EXPECT_TRUE(svg.contains(marked(QStringLiteral("ذلك"))));
+    EXPECT_EQ(svg.count(QChar(0x202B)), svg.count(QChar(0x202C)));
+    const QString english = svg.section(QStringLiteral("<text"), -1).section(u'>', 1).section(u'<', 0, 0);
+    EXPECT_TRUE(english.contains(QStringLiteral("look"))) << english.toStdString();
+    EXPECT_FALSE(english.contains(QChar(0x202B)));
+}
+
+// SVG files have no clips here: what is cut has to be cut before it is written.
+TEST_F(ScenePainterTest, SvgFile_KeepsTheRoundedCornersOfWhatIsCut) {
+    const auto scene = [](QtCanvas& canvas) {
+        platform::Path round;
+        round.addEllipse({10, 10, 60, 60});
+        canvas.save();
+        canvas.clip(round);
+        canvas.fill(platform::Rect{10, 10, 60, 60}, Color::rgb(1, 0, 0));
+        QImage blue(60, 60, QImage::Format_RGB32);
+        blue.fill(Qt::blue);
+        canvas.draw(RasterImage(blue, {60, 60}), {10, 40, 60, 30});
+        canvas.restore();
+    };
+    ASSERT_EQ(painter_.write(path("a.svg"), scene), std::nullopt);
+    QSvgRenderer drawn(read("a.svg"));
+    ASSERT_TRUE(drawn.isValid());
+    QImage pixels(200, 80, QImage::Format_RGB32);
+    pixels.fill(Qt::white);
+    QPainter painter(&pixels);
+    drawn.render(&painter, QRectF(0, 0, 200, 80));
+    painter.end();
+    EXPECT_EQ(pixels.pixelColor(40, 20), QColor(Qt::red));
+    EXPECT_EQ(pixels.pixelColor(40, 60), QColor(Qt::blue));
+    for (const QPoint& corner : {QPoint(12, 12), QPoint(68, 12), QPoint(12, 68), QPoint(68, 68)}) {
+        EXPECT_EQ(pixels.pixelColor(corner), Palette::of(ColorScheme::Light).window) << corner.x() << ' ' << corner.y();
+    }
 }
 
 TEST_F(ScenePainterTest, PngFile_IsTheImage) {
