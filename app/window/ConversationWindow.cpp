@@ -50,6 +50,7 @@ ConversationWindow::ConversationWindow(host::Host& host)
         if (greeting_ != nullptr) {
             greeting_->hide();
         }
+        cover(!isSeen);
         if (isSeen && live_) {
             greet(live_->status());
         }
@@ -75,6 +76,7 @@ ConversationWindow::~ConversationWindow() {
     if (live_) {
         live_->setHandlers({});
         host_.live()->setLockChanged(nullptr);
+        host_.live()->setCover(nullptr);
     }
 }
 
@@ -205,8 +207,20 @@ void ConversationWindow::showStatus() {
     }
 }
 
+void ConversationWindow::cover(bool isCovered) {
+    conversation_->setSeen(sight_.isSeen() && !isCovered);
+    if (host_.live() == nullptr) {
+        return;
+    }
+    host_.live()->setCover(!isCovered ? host::SeenRequests::IsThePages()
+                                      : [this](const std::vector<std::string>& handles) {
+                                            const auto* page = dynamic_cast<const FriendPage*>(pages_->current());
+                                            return page != nullptr && page->asksAbout(handles);
+                                        });
+}
+
 void ConversationWindow::sightChanged() {
-    conversation_->setSeen(sight_.isSeen());
+    conversation_->setSeen(sight_.isSeen() && !pages_->isOpen());
     if (live_) {
         host_.live()->setSeen(sight_.isSeen());
         showStatus();

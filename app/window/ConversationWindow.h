@@ -68,6 +68,8 @@ class ConversationWindow : public PlainWidget {
     void showStatus();
     /// Whether anybody sees the window has become another.
     void sightChanged();
+    /// Tells the cards, and what shows of them, whether a page covers them.
+    void cover(bool isCovered);
     void remade();
     /// Puts conversation, field and status line where they belong.
     void place();

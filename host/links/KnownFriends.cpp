@@ -25,29 +25,6 @@ std::string plain(const std::string& handle) {
     return text.empty() ? handle : text;
 }
 
-std::vector<std::string> handlesOf(const VAKtrLocation& location) {
-    std::vector<std::string> handles;
-    const auto& attribute = location.friend_;
-    if (!attribute) {
-        return handles;
-    }
-    if (attribute->data && !attribute->data->empty()) {
-        handles.push_back(*attribute->data);
-    }
-    const auto& person = attribute->object;
-    for (const auto& email : person ? person->emails : std::vector<std::shared_ptr<VAEmail>>()) {
-        if (email && email->emailAddress && !email->emailAddress->empty()) {
-            handles.push_back(*email->emailAddress);
-        }
-    }
-    for (const auto& phone : person ? person->phones : std::vector<std::shared_ptr<VAPhone>>()) {
-        if (phone && phone->number && !phone->number->empty()) {
-            handles.push_back(*phone->number);
-        }
-    }
-    return handles;
-}
-
 /// An answer's context without what it says of the answer as a whole: that there are more friends than it shows.
 std::optional<Url> contextOf(const std::shared_ptr<AssistantObject>& snippet) {
     const auto answer = std::dynamic_pointer_cast<VASnippet>(snippet);
@@ -111,6 +88,29 @@ std::shared_ptr<Contact> KnownFriends::contactOf(const VAKtrLocation& location) 
         }
     }
     return nullptr;
+}
+
+std::vector<std::string> KnownFriends::handlesOf(const VAKtrLocation& location) {
+    std::vector<std::string> handles;
+    const auto& attribute = location.friend_;
+    if (!attribute) {
+        return handles;
+    }
+    if (attribute->data && !attribute->data->empty()) {
+        handles.push_back(*attribute->data);
+    }
+    const auto& person = attribute->object;
+    for (const auto& email : person ? person->emails : std::vector<std::shared_ptr<VAEmail>>()) {
+        if (email && email->emailAddress && !email->emailAddress->empty()) {
+            handles.push_back(*email->emailAddress);
+        }
+    }
+    for (const auto& phone : person ? person->phones : std::vector<std::shared_ptr<VAPhone>>()) {
+        if (phone && phone->number && !phone->number->empty()) {
+            handles.push_back(*phone->number);
+        }
+    }
+    return handles;
 }
 
 std::string KnownFriends::handleOf(const VAKtrLocation& location) {

@@ -32,6 +32,8 @@ class KnownFriends {
     /// Null for a handle that no contact has.
     static std::shared_ptr<platform::Contact> contactOf(const std::string& handle);
 
+    /// All addresses and numbers that an answer has of a person, the service's own first.
+    static std::vector<std::string> handlesOf(const platform::VAKtrLocation& location);
     /// By which the service knows a friend, else the first address or number; empty for nobody.
     static std::string handleOf(const platform::VAKtrLocation& location);
     /// The contact behind what an answer says of a person; null where there is none.

@@ -60,6 +60,8 @@ class LiveServices {
     }
     /// Whether somebody sees the cards (`SeenRequests`); so it is at first.
     void setSeen(bool seen) { requests_->setSeen(seen); }
+    /// Whether a page covers the cards (`SeenRequests::setCover`); none: not.
+    void setCover(SeenRequests::IsThePages cover) { requests_->setCover(std::move(cover)); }
     /// Whether the session is locked; `changed` is called after that may have become another.
     bool isLocked() const { return deviceLock_->lockState() == platform::DeviceLock::kLocked; }
     void setLockChanged(std::function<void()> changed) { deviceLock_->setChanged(std::move(changed)); }

@@ -44,6 +44,21 @@ Dictionary withoutTimes(Dictionary body) {
     return body;
 }
 
+/// Of the friends that a question is about.
+std::vector<std::string> handlesIn(const HttpRequest& request) {
+    const auto read = documents::JsonReader::read(request.body);
+    const auto* body = std::get_if<Value>(&read);
+    const Dictionary* members = body != nullptr ? body->dictionary() : nullptr;
+    const Value* listed = members != nullptr ? members->find("handles") : nullptr;
+    std::vector<std::string> handles;
+    if (listed != nullptr && listed->array() != nullptr) {
+        for (const Value& handle : *listed->array()) {
+            handles.push_back(handle.string() != nullptr ? *handle.string() : "");
+        }
+    }
+    return handles;
+}
+
 }  // namespace
 
 struct SeenRequests::Asking {
@@ -139,7 +154,7 @@ void SeenRequests::send(const HttpRequest& request, Completion completion) {
         return;
     }
     Keys keys = keysOf(request);
-    if (isSeen_) {
+    if (!mustWait(request)) {
         ask(request, keys.question, {std::move(completion)});
         return;
     }
@@ -151,13 +166,27 @@ void SeenRequests::send(const HttpRequest& request, Completion completion) {
     held->completions.push_back(std::move(completion));
 }
 
+bool SeenRequests::mustWait(const HttpRequest& request) const {
+    return !isSeen_ || (cover_ && !cover_(handlesIn(request)));
+}
+
 void SeenRequests::setSeen(bool seen) {
     isSeen_ = seen;
-    if (!seen) {
-        return;
-    }
+    sendHeld();
+}
+
+void SeenRequests::setCover(IsThePages cover) {
+    cover_ = std::move(cover);
+    sendHeld();
+}
+
+void SeenRequests::sendHeld() {
     for (Held& held : std::exchange(held_, {})) {
-        ask(held.request, keysOf(held.request).question, std::move(held.completions));
+        if (mustWait(held.request)) {
+            held_.push_back(std::move(held));
+        } else {
+            ask(held.request, keysOf(held.request).question, std::move(held.completions));
+        }
     }
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <memory>
 #include <string>
 #include <unordered_map>
@@ -15,6 +16,8 @@ namespace ktr::host {
 /// card's earlier ones with its own answer; a command that shows the user to friends ends with `Cancelled` at once: it
 /// must not leave later, when the user may have thought better of it. Cards are told nothing of all this.
 ///
+/// Under a page that covers them, cards ask nothing either, but the page may. Sharing goes on: its user is there.
+///
 /// Texts of an answer are cut where they come in, so that no row gets a megabyte (`withShortTexts`).
 ///
 /// Two questions that differ only in times are one on the wire while the first is under way: a card starts twice and so
@@ -29,6 +32,10 @@ class SeenRequests : public platform::HttpTransport {
     /// Whether somebody sees the cards; so it is at first. What waited is sent, the earliest card's first.
     void setSeen(bool seen);
     bool isSeen() const { return isSeen_; }
+    /// Whether a page's question is about these friends' handles, and so is not a card's.
+    using IsThePages = std::function<bool(const std::vector<std::string>& handles)>;
+    /// A page covers the cards; none: no more, and what waited is sent. The page is asked at each question.
+    void setCover(IsThePages cover);
     /// Ends what waits, with `Cancelled`. What is under way is for those below to end.
     void cancelHeld();
     /// Of how many cards a question waits.
@@ -54,11 +61,14 @@ class SeenRequests : public platform::HttpTransport {
     static Keys keysOf(const platform::HttpRequest& request);
 
     void ask(const platform::HttpRequest& request, const std::string& question, std::vector<Completion> completions);
+    bool mustWait(const platform::HttpRequest& request) const;
+    void sendHeld();
     void refuse(std::vector<Completion> completions);
 
     std::shared_ptr<platform::HttpTransport> next_;
     std::shared_ptr<platform::MainLoop> mainLoop_;
     bool isSeen_ = true;
+    IsThePages cover_;
     std::vector<Held> held_;
     std::unordered_map<std::string, std::weak_ptr<Asking>> underWay_;
 };

@@ -147,6 +147,13 @@ void FriendPage::ask() {
     }
 }
 
+bool FriendPage::asksAbout(const std::vector<std::string>& handles) const {
+    const auto own = KnownFriends::handlesOf(*known_.location);
+    return isAsked_ && !handles.empty() && std::all_of(handles.begin(), handles.end(), [&](const std::string& handle) {
+               return std::find(own.begin(), own.end(), handle) != own.end();
+           });
+}
+
 void FriendPage::takeNewest() {
     const auto& controller = sheet_->row().controller();
     const auto newest =

@@ -4,6 +4,7 @@
 #include <functional>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "app/window/blocks/Button.h"
 #include "app/window/friend/FriendMap.h"
@@ -40,6 +41,8 @@ class FriendPage : public Page {
     IconButton& back() const { return *back_; }
     /// Lets go of everything that is the installed platform's; `refresh` makes it anew.
     void letGo() override;
+    /// Whether a question about these handles is this page's.
+    bool asksAbout(const std::vector<std::string>& handles) const;
 
   protected:
     void resizeEvent(QResizeEvent* event) override;

@@ -116,6 +116,39 @@ TEST_F(SeenRequestsTest, Unseen_WhatShowsTheUserFailsAndNeverWaits) {
     EXPECT_EQ(wire->requests.size(), 1U);
 }
 
+TEST_F(SeenRequestsTest, UnderAPage_ItsQuestionLeavesAndTheCardsWait) {
+    requests->setCover(
+        [](const std::vector<std::string>& handles) { return handles == std::vector<std::string>{"ann"}; });
+    send(question("otto", 1.0, 1), "otto");
+    send(question("ann", 1.0, 1), "ann");
+    ASSERT_EQ(wire->requests.size(), 1U);
+    EXPECT_EQ(wire->requests[0].body, question("ann", 1.0, 1).body);
+
+    requests->setCover(nullptr);
+    ASSERT_EQ(wire->requests.size(), 2U);
+    EXPECT_EQ(wire->requests[1].body, question("otto", 1.0, 1).body);
+    EXPECT_EQ(requests->held(), 0U);
+}
+
+TEST_F(SeenRequestsTest, UnderAPageInAnUnseenWindow_AllWaitAndEachLeavesWhenItMay) {
+    requests->setCover(
+        [](const std::vector<std::string>& handles) { return handles == std::vector<std::string>{"ann"}; });
+    requests->setSeen(false);
+    send(question("ann", 1.0, 1), "ann");
+    send(question("otto", 1.0, 1), "otto");
+    EXPECT_TRUE(wire->requests.empty());
+    requests->setSeen(true);
+    ASSERT_EQ(wire->requests.size(), 1U);
+    EXPECT_EQ(wire->requests[0].body, question("ann", 1.0, 1).body);
+    EXPECT_EQ(requests->held(), 1U) << "the card below";
+}
+
+TEST_F(SeenRequestsTest, UnderAPage_SharingGoesOn) {
+    requests->setCover([](const std::vector<std::string>&) { return false; });
+    send(sharing(), "sharing");
+    EXPECT_EQ(wire->requests.size(), 1U);
+}
+
 TEST_F(SeenRequestsTest, TwoThatShowTheUser_AreTwoOnTheWire) {
     send(sharing(), "one");
     send(sharing(), "two");
