@@ -120,8 +120,9 @@ void addUserInterface(Platform& platform, const HostSettings& settings, bool isW
         appearance->setReducesMotion(isWithoutWindow && settings.liveConfiguration.has_value());
         platform.appearance = appearance;
     }
-    platform.avatarImages = std::make_shared<linux_::QtAvatarImages>();
-    platform.monogramMakers = std::make_shared<linux_::QtMonogramMakerFactory>();
+    const auto faces = std::make_shared<linux_::QtAvatarImages>();
+    platform.avatarImages = faces;
+    platform.monogramMakers = std::make_shared<linux_::QtMonogramMakerFactory>(faces);
 }
 
 }  // namespace

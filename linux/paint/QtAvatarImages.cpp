@@ -1,6 +1,7 @@
 #include "linux/paint/QtAvatarImages.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "linux/paint/ImageDecoder.h"
 #include "linux/paint/PersonColors.h"
@@ -52,20 +53,44 @@ std::shared_ptr<platform::Image> QtAvatarImages::avatarForContact(const std::sha
         return entries_.front().image;
     }
     const std::string content = nobody ? std::string("nobody") : contentOf(*contact);
+    if (auto alike = kept(content, diameter)) {
+        entries_.front().contact = contact;
+        return alike;
+    }
+    auto image = nobody ? AvatarImage::blank(diameter) : make(*contact, diameter);
+    keep({contact, diameter, content, image});
+    return image;
+}
+
+std::shared_ptr<AvatarImage> QtAvatarImages::photoOf(const platform::Contact& contact, double diameter) {
+    if (!contact.imageData && !contact.thumbnailImageData) {
+        return nullptr;
+    }
+    const std::string content = contentOf(contact);
+    auto image = kept(content, diameter);
+    if (!image) {
+        image = make(contact, diameter);
+        keep({{}, diameter, content, image});
+    }
+    return image->isPhoto() ? image : nullptr;
+}
+
+std::shared_ptr<AvatarImage> QtAvatarImages::kept(const std::string& content, double diameter) {
     const auto alike = std::find_if(entries_.begin(), entries_.end(), [&](const Entry& entry) {
         return entry.diameter == diameter && entry.content == content;
     });
-    if (alike != entries_.end()) {
-        entries_.splice(entries_.begin(), entries_, alike);
-        entries_.front().contact = contact;
-        return entries_.front().image;
+    if (alike == entries_.end()) {
+        return nullptr;
     }
-    auto image = nobody ? AvatarImage::blank(diameter) : make(*contact, diameter);
-    entries_.push_front({contact, diameter, content, image});
+    entries_.splice(entries_.begin(), entries_, alike);
+    return entries_.front().image;
+}
+
+void QtAvatarImages::keep(Entry entry) {
+    entries_.push_front(std::move(entry));
     if (entries_.size() > kMostKept) {
         entries_.pop_back();
     }
-    return image;
 }
 
 }  // namespace ktr::linux_

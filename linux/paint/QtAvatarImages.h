@@ -16,6 +16,8 @@ class QtAvatarImages final : public platform::AvatarImages {
   public:
     std::shared_ptr<platform::Image> avatarForContact(const std::shared_ptr<platform::Contact>& contact,
                                                       double diameter) override;
+    /// The contact's photo; none where there is none that can be read.
+    std::shared_ptr<AvatarImage> photoOf(const platform::Contact& contact, double diameter);
 
   private:
     struct Entry {
@@ -26,6 +28,10 @@ class QtAvatarImages final : public platform::AvatarImages {
         std::string content;
         std::shared_ptr<AvatarImage> image;
     };
+
+    /// The one that was made of this, used now; none.
+    std::shared_ptr<AvatarImage> kept(const std::string& content, double diameter);
+    void keep(Entry entry);
 
     /// Most recently used first.
     std::list<Entry> entries_;

@@ -16,6 +16,9 @@ std::shared_ptr<platform::Image> QtMonogramMaker::monogramForContact(const platf
     if (contact.isEmpty()) {
         return AvatarImage::blank(diameter_);
     }
+    if (auto photo = faces_->photoOf(contact, diameter_)) {
+        return photo;
+    }
     // A tint is a colour of its own; a role would change with the appearance, which a monogram does not.
     const QColor color = tint_ ? Palette::of(ColorScheme::Light).resolve(*tint_) : PersonColors::colorOf(contact);
     return AvatarImage::letters(diameter_, Initials(contact), color, font_ ? font_->size : 0.0);

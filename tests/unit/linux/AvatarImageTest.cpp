@@ -182,6 +182,24 @@ TEST(QtMonogramMakerTest, Tint_MakesAnotherMaker) {
     EXPECT_TRUE(std::dynamic_pointer_cast<AvatarImage>(tinted->monogramForContact(Contact()))->isBlank());
 }
 
+TEST(QtMonogramMakerTest, ContactWithAPhoto_HasTheRowsFace) {
+    const auto faces = std::make_shared<QtAvatarImages>();
+    QtMonogramMakerFactory factory(faces);
+    auto ann = contact("Ann", "Marsh", "ann@harbour.example");
+    ann->thumbnailImageData = png(30, 30, Qt::red);
+    const auto monogramOf = [&](const Contact& one) {
+        return std::dynamic_pointer_cast<AvatarImage>(factory.makeMonogramMaker(1, 89)->monogramForContact(one));
+    };
+    const auto face = monogramOf(*ann);
+    ASSERT_NE(face, nullptr);
+    EXPECT_TRUE(face->isPhoto());
+    EXPECT_EQ(monogramOf(*ann), face) << "decoded once";
+    EXPECT_EQ(faces->avatarForContact(ann, 89), face) << "and for rows of its size too";
+    ann->thumbnailImageData = platform::Bytes{1, 2, 3};
+    EXPECT_FALSE(monogramOf(*ann)->isPhoto()) << "one that cannot be read gives way to the letters";
+    EXPECT_GT(monogramOf(*ann)->letterSize(), 0.0);
+}
+
 TEST(QtMonogramMakerTest, DiameterOfNone_DrawsNothing) {
     QtMonogramMakerFactory factory;
     const auto image = factory.makeMonogramMaker(1, 0)->monogramForContact(*kAnn);
