@@ -27,7 +27,6 @@
 #include "linux/locale/QtLocalization.h"
 #include "linux/locale/SettingsTelephony.h"
 #include "linux/maps/ConfiguredMaps.h"
-#include "linux/maps/DesktopMapsApplication.h"
 #include "linux/paint/QtAppearance.h"
 #include "linux/paint/QtAvatarImages.h"
 #include "linux/paint/QtImageSource.h"
@@ -85,8 +84,8 @@ platform::LengthSystem lengthSystem(const Platform& platform) {
 void addMaps(Platform& platform, const HostSettings& settings, LiveServices* live, const Platform* earlier) {
     platform.lengths = std::make_shared<linux_::IcuLengthFormatter>(
         linux_::LocaleRegion(settings.region).localeWithLanguage(settings.language), lengthSystem(platform));
-    platform.mapsApplication = std::make_shared<linux_::DesktopMapsApplication>();
     if (earlier != nullptr) {
+        platform.mapsApplication = earlier->mapsApplication;
         // What it has drawn and fetched is good in every language.
         platform.maps = earlier->maps;
         return;

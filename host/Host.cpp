@@ -7,6 +7,7 @@
 
 #include "host/ClockText.h"
 #include "host/PluginFinder.h"
+#include "linux/maps/DesktopMapsApplication.h"
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/assistant/Localization.h"
 #include "platform/assistant/VASnippet.h"
@@ -44,6 +45,12 @@ std::variant<std::unique_ptr<Host>, Failure> Host::make(const HostSettings& sett
     }
     host->delegate_ = std::make_shared<HostDelegate>(
         std::make_shared<platform::Bundle>(host->platform()->localization->hostBundleIdentifier()));
+    // What a plugin wants to see on a map goes the way of all its links: there is one policy for what they open.
+    host->platform()->mapsApplication = std::make_shared<linux_::DesktopMapsApplication>(
+        [delegate = std::weak_ptr<HostDelegate>(host->delegate_)](const std::string& url) {
+            const auto asked = delegate.lock();
+            return asked && asked->open && asked->open(platform::Url(url));
+        });
     host->window_ = platform::create<platform::Window>(&platform::Window::initWithFrame, platform::Rect{});
     host->conversation_ = platform::create<ConversationView>(&ConversationView::initWithFrame, platform::Rect{});
     host->window_->addSubview(host->conversation_);

@@ -1,8 +1,6 @@
 #include "linux/maps/DesktopMapsApplication.h"
 
-#include <QDesktopServices>
 #include <QUrl>
-#include <utility>
 
 namespace ktr::linux_ {
 
@@ -21,12 +19,6 @@ QString degrees(double value) {
 }
 
 }  // namespace
-
-DesktopMapsApplication::DesktopMapsApplication(Opener opener) : opener_(std::move(opener)) {
-    if (!opener_) {
-        opener_ = [](const std::string& url) { return QDesktopServices::openUrl(QUrl(QString::fromStdString(url))); };
-    }
-}
 
 std::string DesktopMapsApplication::urlFor(const platform::MapItem& item) {
     const QString place = degrees(item.coordinate.latitude) + u',' + degrees(item.coordinate.longitude);
