@@ -46,7 +46,7 @@ QByteArray drawn(const std::shared_ptr<linux_::MapGround>& ground, const Row& at
     QBuffer buffer(&data);
     buffer.open(QIODevice::WriteOnly);
     if (const auto picture = linux_::MapDrawer::draw(request, {ground}, {})) {
-        picture->pixels.save(&buffer, "PNG");
+        picture->whole().save(&buffer, "PNG");
     }
     return data;
 }

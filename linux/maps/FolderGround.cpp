@@ -49,7 +49,8 @@ MapDrawn FolderGround::draw(const MapDrawing& drawing) {
                 return all;
             }
             drawing.painter.save();
-            const MapDrawn drawn = ground->draw({drawing.request, drawing.painter, drawing.pixels, left, drawing.stop});
+            const MapDrawn drawn =
+                ground->draw({drawing.request, drawing.painter, drawing.labels, drawing.pixels, left, drawing.stop});
             drawing.painter.restore();
             const QRegion filled = drawn.filled & left;
             left -= filled;

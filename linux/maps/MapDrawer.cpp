@@ -37,6 +37,26 @@ platform::MapPictureRequest checked(platform::MapPictureRequest request) {
     return request;
 }
 
+/// Farther out than this nobody looks for streets; metres across.
+constexpr double kStreetsAcross = 60000.0;
+
+/// Whether what is left to draw has the picture's middle, where streets would be looked for.
+bool isMiddleLeft(const MapDrawing& drawing) {
+    const auto& viewport = drawing.request.viewport;
+    const double across = std::min(viewport.size.width, viewport.size.height) * viewport.metresPerPoint();
+    return across < kStreetsAcross &&
+           drawing.region.contains(QPoint(drawing.pixels.width() / 2, drawing.pixels.height() / 2));
+}
+
+/// An image of this size; none without memory.
+QImage clearImage(const QSize& size) {
+    QImage made(size, QImage::Format_ARGB32_Premultiplied);
+    if (!made.isNull()) {
+        made.fill(Qt::transparent);
+    }
+    return made;
+}
+
 MapDrawn drawGround(MapGround& ground, const MapDrawing& drawing) {
     drawing.painter.save();
     MapDrawn drawn;
@@ -52,10 +72,40 @@ MapDrawn drawGround(MapGround& ground, const MapDrawing& drawing) {
 
 }  // namespace
 
+QImage MapDrawer::Result::whole() const {
+    QImage made = pixels;
+    QPainter(&made).drawImage(0, 0, labels);
+    return made;
+}
+
+void MapDrawer::prepare(QPainter& painter, const platform::Size& points) {
+    painter.setRenderHint(QPainter::Antialiasing);
+    painter.scale(painter.device()->width() / points.width, painter.device()->height() / points.height);
+}
+
 std::optional<MapDrawer::Result> MapDrawer::draw(const platform::MapPictureRequest& asked,
                                                  const std::vector<std::shared_ptr<MapGround>>& grounds,
                                                  const std::stop_token& stop) {
-    const platform::MapPictureRequest request = checked(asked);
+    auto request = checked(asked);
+    auto result = drawAt(request, grounds, stop);
+    if (result && result->coarseZoom && request.beyond == platform::MapPictureRequest::Beyond::Widen) {
+        const double zoom = *result->coarseZoom;
+        request.viewport.zoom = zoom;
+        request.beyond = platform::MapPictureRequest::Beyond::AsAsked;
+        result = drawAt(request, grounds, stop);
+        if (result) {
+            // Also where a map of streets reaches farther when it is looked at from farther out.
+            result->hasStreets = false;
+            result->coarseZoom = zoom;
+        }
+    }
+    return result;
+}
+
+std::optional<MapDrawer::Result> MapDrawer::drawAt(const platform::MapPictureRequest& request,
+                                                   const std::vector<std::shared_ptr<MapGround>>& grounds,
+                                                   const std::stop_token& stop) {
+    using Beyond = platform::MapPictureRequest::Beyond;
     const auto side = [&](double points) { return std::max(1, static_cast<int>(std::lround(points * request.scale))); };
     Result result;
     result.pixels = QImage(side(request.viewport.size.width), side(request.viewport.size.height), QImage::Format_RGB32);
@@ -65,13 +115,27 @@ std::optional<MapDrawer::Result> MapDrawer::draw(const platform::MapPictureReque
     }
     const QSize pixels = result.pixels.size();
     result.pixels.fill(MapStyle::of(request.isDark, request.isHighContrast).land);
+    result.labels = clearImage(pixels);
     QPainter painter(&result.pixels);
-    painter.setRenderHint(QPainter::Antialiasing);
-    painter.scale(pixels.width() / request.viewport.size.width, pixels.height() / request.viewport.size.height);
-    MapDrawing drawing{request, painter, pixels, QRegion(QRect(QPoint(), pixels)), stop};
+    prepare(painter, request.viewport.size);
+    // Without memory for a second picture the names stand under the circles.
+    QPainter above;
+    if (!result.labels.isNull()) {
+        above.begin(&result.labels);
+        prepare(above, request.viewport.size);
+    }
+    MapDrawing drawing{request, painter, above.isActive() ? above : painter, pixels, QRegion(QRect(QPoint(), pixels)),
+                       stop};
     for (const auto& ground : grounds) {
         if (drawing.region.isEmpty() || stop.stop_requested()) {
             break;
+        }
+        if (ground->isCoarse() && result.isComplete && isMiddleLeft(drawing)) {
+            result.hasStreets = false;
+            result.coarseZoom = request.beyond == Beyond::AsAsked ? std::nullopt : ground->coarseZoom(drawing);
+            if (result.coarseZoom && request.beyond == Beyond::Widen) {
+                return result;  // drawn anew, farther out
+            }
         }
         const MapDrawn drawn = drawGround(*ground, drawing);
         drawing.region -= drawn.filled;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <functional>
+#include <optional>
 #include <stop_token>
 #include <string>
 
@@ -18,6 +19,8 @@ struct MapDrawing {
     /// Onto the picture, with antialiasing; its coordinates are points, the viewport's top left corner is (0, 0). A
     /// ground leaves it as it found it.
     QPainter& painter;
+    /// The same for names, which stand above what is drawn over the ground: onto a clear picture of the same size.
+    QPainter& labels;
     /// The picture's size in pixels: `request.viewport.size` × `request.scale`, rounded.
     QSize pixels;
     /// What no ground before has drawn, in pixels of the picture. A ground draws inside it only: it sets its own clip,
@@ -43,6 +46,11 @@ class MapGround {
   public:
     virtual ~MapGround();
     virtual MapDrawn draw(const MapDrawing& drawing) = 0;
+    /// Whether it shows outlines alone, and no streets at any scale.
+    virtual bool isCoarse() const { return false; }
+    /// For such a ground: the finest zoom at which it has a town to name, if that is farther out than what is asked
+    /// for; see `MapPicture::coarseZoom`. Called where `draw` is, before it.
+    virtual std::optional<double> coarseZoom(const MapDrawing& drawing);
     /// Called once, on the main thread, before anything is drawn. A ground that fetches in the background calls it, on
     /// any thread and as often as it likes, when pictures drawn earlier would now look different.
     virtual void setChangeHandler(std::function<void()> changed);

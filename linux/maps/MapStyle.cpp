@@ -23,7 +23,7 @@ MapStyle light() {
     style.path = 0xFFB4A78F;
     style.rail = 0xFFA2988B, style.railInner = 0xFFFFFDF8;
     style.boundary = faded(0xFF94799A, 0.75);
-    style.label = 0xFF574C3F, style.halo = 0xFFFBF8F1;
+    style.label = 0xFF574C3F, style.halo = 0xFFFBF8F1, style.town = 0xFFFFFDF8;
     style.waterLabel = 0xFF315963;
     style.parkLabel = 0xFF49663A;
     style.boundaryLabel = 0xFF7A5F80, style.pointOfInterest = 0xFF6A5238;
@@ -44,7 +44,7 @@ MapStyle dark() {
     style.path = 0xFF6C6355;
     style.rail = 0xFF7C7468, style.railInner = 0xFF282520;
     style.boundary = faded(0xFF8E7796, 0.75);
-    style.label = 0xFFD9CFC0, style.halo = 0xFF1E1C18;
+    style.label = 0xFFD9CFC0, style.halo = 0xFF1E1C18, style.town = 0xFF2E2A25;
     style.waterLabel = 0xFF8FB9C3;
     style.parkLabel = 0xFFA6C296;
     style.boundaryLabel = 0xFFB59CBC, style.pointOfInterest = 0xFFDCC9AE;
@@ -71,7 +71,7 @@ MapStyle stronger(MapStyle style) {
     }
     style.boundary = faded(further(style.boundary).rgb(), 1.0);
     const QColor letters(style.isDark ? 0xFFFFFFFF : 0xFF14110D);
-    style.halo = style.isDark ? 0xFF000000 : 0xFFFFFFFF;
+    style.halo = style.town = style.isDark ? 0xFF000000 : 0xFFFFFFFF;
     style.label = style.boundaryLabel = style.pointOfInterest = letters;
     style.waterLabel = style.isDark ? 0xFFC9E7EF : 0xFF0F3640;
     style.parkLabel = style.isDark ? 0xFFD5EFC6 : 0xFF1F3A12;

@@ -23,6 +23,7 @@ class MapStyle {
     QColor rail, railInner;
     QColor boundary;  ///< with its alpha
     QColor label, halo;
+    QColor town;        ///< the middle of its mark; the edge is `label`
     QColor waterLabel;  ///< its halo is the water
     QColor parkLabel;   ///< its halo is `halo`
     QColor boundaryLabel, pointOfInterest;

@@ -267,11 +267,19 @@ void ThreadedMapSource::Core::finished(std::optional<MapDrawer::Result> result) 
 void ThreadedMapSource::Core::deliver(const Job& job, const MapDrawer::Result& result) {
     platform::MapPicture picture;
     picture.viewport = job.request.viewport;
+    if (job.request.beyond == platform::MapPictureRequest::Beyond::Widen && result.coarseZoom) {
+        picture.viewport.zoom = *result.coarseZoom;
+    }
     picture.image = std::make_shared<RasterImage>(result.pixels, job.request.viewport.size);
+    if (!result.labels.isNull()) {
+        picture.labels = std::make_shared<RasterImage>(result.labels, job.request.viewport.size);
+    }
     picture.attribution = result.attribution;
     picture.isComplete = result.isComplete;
+    picture.hasStreets = result.hasStreets;
+    picture.coarseZoom = result.coarseZoom;
     if (job.generation == generation_) {
-        keep(job.request, picture, static_cast<std::size_t>(result.pixels.sizeInBytes()));
+        keep(job.request, picture, static_cast<std::size_t>(result.pixels.sizeInBytes() + result.labels.sizeInBytes()));
     }
     for (const auto& waiting : job.waiting) {
         answer(waiting, picture);

@@ -176,12 +176,12 @@ MapDrawn VectorGround::draw(const MapDrawing& drawing) {
     painter.setClipRegion(filled);
     painter.fillRect(QRect(QPoint(), drawing.pixels), MapStyle::of(request.isDark, request.isHighContrast).land);
     painter.setTransform(points);
-    const MapDrawing own{request, painter, drawing.pixels, filled, drawing.stop};
+    const MapDrawing own{request, painter, drawing.labels, drawing.pixels, filled, drawing.stop};
     const MapScale scale(request.viewport.metresPerPoint());
     VectorPainter(own, tiles, scale).draw();
     MapLabels labels(own, shaper_);
     VectorLabels(own, tiles, scale).place(labels);
-    labels.draw(painter);
+    labels.draw(drawing.labels);
     return {filled, facts_.attribution, true};
 }
 

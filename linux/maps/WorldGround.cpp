@@ -20,11 +20,21 @@ namespace {
 constexpr double kMargin = 16.0;
 constexpr double kDotRadius = 2.2;
 constexpr double kLabelGap = 4.0;
+/// What the shorter side of a map shows that is the finest with a town to name; metres.
+constexpr std::array<double, 5> kCoarseSides = {20000.0, 25000.0, 32000.0, 40000.0, 50000.0};
+/// On maps of up to this, the nearest town is named whatever stands on it, and towns have marks that are seen; metres.
+constexpr double kNearSide = 50500.0;
+constexpr double kTownRadius = 3.2;
+constexpr double kTownEdge = 1.6;
 /// A country's name goes when the country is this many zooms larger than its name.
 constexpr double kCountryZooms = 4.5;
 constexpr double kZoomsBeforeRounding = 1.5;
 /// Borders are dashed from this zoom on.
 constexpr double kDashedFrom = 4.0;
+
+double shorterSide(const platform::MapViewport& viewport) {
+    return std::min(viewport.size.width, viewport.size.height) * viewport.metresPerPoint();
+}
 
 /// Where the world stands in the picture.
 struct Frame {
@@ -139,7 +149,8 @@ class Drawer {
           style_(MapStyle::of(drawing.request.isDark, drawing.request.isHighContrast)),
           level_(map.levelFor(drawing.request.viewport.zoom + drawing.request.scale / 4.0)),
           names_(drawing.request.language),
-          language_(QString::fromStdString(drawing.request.language)) {
+          language_(QString::fromStdString(drawing.request.language)),
+          isNear_(shorterSide(drawing.request.viewport) <= kNearSide) {
         for (const platform::Rect& rect : drawing.request.clear) {
             taken_.emplace_back(rect.x, rect.y, rect.width, rect.height);
         }
@@ -152,6 +163,12 @@ class Drawer {
         drawBorders();
         drawCountries();
         drawTowns();
+    }
+    /// Whether a map of a few towns has the nearest of them in it, with room for its name. Nothing is drawn.
+    bool hasTown() {
+        isTrial_ = true;
+        forCopies([&](const QRectF& window, QPointF shift) { findNearest(window, shift); });
+        return nearest_ && drawNearest(*nearest_);
     }
 
   private:
@@ -283,36 +300,99 @@ class Drawer {
 
     void drawTowns() {
         const double zoom = drawing_.request.viewport.zoom;
+        if (isNear_) {
+            forCopies([&](const QRectF& window, QPointF shift) { findNearest(window, shift); });
+            if (nearest_) {
+                drawNearest(*nearest_);
+            }
+        }
         forCopies([&](const QRectF& window, QPointF shift) {
             for (const WorldMap::Town& town : map_.towns()) {
-                if (zoom >= town.zoom && window.contains(town.place)) {
+                const bool isNamed = nearest_ && nearest_->town == &town;
+                if (zoom >= town.zoom && window.contains(town.place) && !isNamed) {
                     drawTown(town, frame_.pointFor(town.place + shift));
                 }
             }
         });
     }
 
+    /// The town in the picture that is nearest to its middle.
+    struct Nearest {
+        const WorldMap::Town* town = nullptr;
+        QPointF spot;
+        double distance = 0.0;
+    };
+
+    void findNearest(const QRectF& window, QPointF shift) {
+        const QPointF middle(frame_.size.width() / 2.0, frame_.size.height() / 2.0);
+        for (const WorldMap::Town& town : map_.towns()) {
+            if (!window.contains(town.place)) {
+                continue;
+            }
+            const QPointF spot = frame_.pointFor(town.place + shift);
+            const double distance = std::hypot(spot.x() - middle.x(), spot.y() - middle.y());
+            if (QRectF(QPointF(), frame_.size).contains(spot) && (!nearest_ || distance < nearest_->distance)) {
+                nearest_ = Nearest{&town, spot, distance};
+            }
+        }
+    }
+
+    /// Its name beside it, or beside whatever stands on it: it is what says where the map is. Whether there was room.
+    bool drawNearest(const Nearest& nearest) {
+        constexpr double kFarthest = 60.0;
+        constexpr double kStep = 6.0;
+        const MapText text(QString::fromStdString(names_.town(*nearest.town)), language_, {14, true, false});
+        const QRectF dot = dotAt(nearest.spot);
+        const bool isSeen = !isTaken(dot);
+        for (double out = 0.0; out <= kFarthest; out += kStep) {
+            if (placeBeside(text, nearest.spot, kTownRadius + kTownEdge / 2.0 + out)) {
+                if (isSeen) {
+                    drawDot(nearest.spot);
+                    taken_.push_back(dot);
+                }
+                return true;
+            }
+        }
+        return false;
+    }
+
     void drawTown(const WorldMap::Town& town, QPointF spot) {
-        const QRectF dot(spot.x() - kDotRadius - 1.0, spot.y() - kDotRadius - 1.0, 2.0 * kDotRadius + 2.0,
-                         2.0 * kDotRadius + 2.0);
+        const QRectF dot = dotAt(spot);
         if (isTaken(dot)) {
             return;
         }
         const MapText text(QString::fromStdString(names_.town(town)), language_, {12, town.isCapital, false});
+        if (placeBeside(text, spot, isNear_ ? kTownRadius + kTownEdge / 2.0 : kDotRadius)) {
+            drawDot(spot);
+            taken_.push_back(dot);
+        }
+    }
+
+    QRectF dotAt(QPointF spot) const {
+        const double radius = (isNear_ ? kTownRadius + kTownEdge / 2.0 : kDotRadius) + 1.0;
+        return {spot.x() - radius, spot.y() - radius, 2.0 * radius, 2.0 * radius};
+    }
+
+    void drawDot(QPointF spot) {
+        if (isTrial_) {
+            return;
+        }
+        QPainter& painter = drawing_.labels;
+        const double radius = isNear_ ? kTownRadius : kDotRadius;
+        painter.setPen(isNear_ ? QPen(style_.label, kTownEdge) : QPen(style_.halo, 1.0));
+        painter.setBrush(isNear_ ? style_.town : style_.label);
+        painter.drawEllipse(spot, radius, radius);
+    }
+
+    /// Right of something round, left of it, above or below.
+    bool placeBeside(const MapText& text, QPointF spot, double radius) {
         const double middle = text.ascent() / 2.0 - text.descent() / 2.0;
-        const double side = kDotRadius + kLabelGap;
+        const double side = radius + kLabelGap;
         const std::array<QPointF, 4> places = {QPointF(side, middle), QPointF(-side - text.width(), middle),
                                                QPointF(-text.width() / 2.0, -side - text.descent() / 2.0),
                                                QPointF(-text.width() / 2.0, side + text.ascent())};
-        for (const QPointF& shift : places) {
-            if (place(text, spot + shift, style_.label)) {
-                drawing_.painter.setPen(QPen(style_.halo, 1.0));
-                drawing_.painter.setBrush(style_.label);
-                drawing_.painter.drawEllipse(spot, kDotRadius, kDotRadius);
-                taken_.push_back(dot);
-                return;
-            }
-        }
+        return std::any_of(places.begin(), places.end(),
+                           [&](const QPointF& shift) { return place(text, spot + shift, style_.label); });
     }
 
     /// Draws the text if nothing is in its way and the picture shows it whole.
@@ -322,7 +402,9 @@ class Drawer {
         if (box.isEmpty() || isTaken(box)) {
             return false;
         }
-        text.draw(drawing_.painter, baseline, ink, style_.halo, MapStyle::kHaloWidth);
+        if (!isTrial_) {
+            text.draw(drawing_.labels, baseline, ink, style_.halo, MapStyle::kHaloWidth);
+        }
         taken_.push_back(box.adjusted(-2.0, -1.0, 2.0, 1.0));
         return true;
     }
@@ -345,15 +427,42 @@ class Drawer {
     WorldNames names_;
     QString language_;
     std::vector<QRectF> taken_;
+    bool isNear_;
+    bool isTrial_ = false;
+    std::optional<Nearest> nearest_;
 };
 
 }  // namespace
 
-MapDrawn WorldGround::draw(const MapDrawing& drawing) {
+void WorldGround::read() {
     if (!isRead_) {
         isRead_ = true;
         map_ = WorldMap::readOrReport(file_, "Land without shores and names is drawn");
     }
+}
+
+std::optional<double> WorldGround::coarseZoom(const MapDrawing& drawing) {
+    read();
+    const auto& viewport = drawing.request.viewport;
+    const double asked = shorterSide(viewport);
+    if (asked > kNearSide) {
+        return std::nullopt;
+    }
+    auto wider = drawing.request;
+    for (const double side : kCoarseSides) {
+        wider.viewport.zoom = viewport.zoom - std::max(std::log2(side / asked), 0.0);
+        const MapDrawing trial{
+            wider,       drawing.painter, drawing.labels, drawing.pixels, QRegion(QRect(QPoint(), drawing.pixels)),
+            drawing.stop};
+        if (map_ && Drawer(trial, *map_).hasTown()) {
+            break;
+        }
+    }
+    return wider.viewport.zoom < viewport.zoom ? std::optional(wider.viewport.zoom) : std::nullopt;
+}
+
+MapDrawn WorldGround::draw(const MapDrawing& drawing) {
+    read();
     drawing.painter.save();
     QTransform toPixels = drawing.painter.transform();
     drawing.painter.resetTransform();

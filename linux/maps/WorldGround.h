@@ -18,8 +18,11 @@ class WorldGround final : public MapGround {
     /// The file is read when the first picture is drawn.
     explicit WorldGround(std::filesystem::path file) : file_(std::move(file)) {}
     MapDrawn draw(const MapDrawing& drawing) override;
+    bool isCoarse() const override { return true; }
+    std::optional<double> coarseZoom(const MapDrawing& drawing) override;
 
   private:
+    void read();
     std::filesystem::path file_;
     bool isRead_ = false;
     std::shared_ptr<const WorldMap> map_;

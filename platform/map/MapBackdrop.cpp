@@ -130,11 +130,22 @@ void MapBackdrop::draw(Canvas& canvas, const MapViewport& viewport) const {
             canvas.drawMoving(*first->image, placeOf(first->viewport, viewport));
         }
     }
+    drawLatest(canvas, *latest_->image, viewport);
+}
+
+void MapBackdrop::drawLabels(Canvas& canvas, const MapViewport& viewport) const {
+    if (latest_ && latest_->labels) {
+        drawLatest(canvas, *latest_->labels, viewport);
+    }
+}
+
+void MapBackdrop::drawLatest(Canvas& canvas, const Image& image, const MapViewport& viewport) const {
+    const Rect place = placeOf(latest_->viewport, viewport);
     // At rest every pixel of the picture is a pixel of the screen, and so it is while whole points are gone through.
-    if (isWhole(top) && latest_->viewport.zoom == viewport.zoom) {
-        canvas.draw(*latest_->image, {std::round(top.x), std::round(top.y), top.width, top.height});
+    if (isWhole(place) && latest_->viewport.zoom == viewport.zoom) {
+        canvas.draw(image, {std::round(place.x), std::round(place.y), place.width, place.height});
     } else {
-        canvas.drawMoving(*latest_->image, top);
+        canvas.drawMoving(image, place);
     }
 }
 

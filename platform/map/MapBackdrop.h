@@ -34,6 +34,12 @@ class MapBackdrop {
     bool covers(const MapViewport& viewport) const;
     /// The pictures that there are, the latest on top, as many as fill the map; beside them the land's colour.
     void draw(Canvas& canvas, const MapViewport& viewport) const;
+    /// The names of the latest picture, which stand above the circles.
+    void drawLabels(Canvas& canvas, const MapViewport& viewport) const;
+    /// False once a picture has shown that there are none where the map's middle is.
+    bool hasStreets() const { return !latest_ || latest_->hasStreets; }
+    /// Of the latest picture.
+    std::optional<double> coarseZoom() const { return latest_ ? latest_->coarseZoom : std::nullopt; }
     /// Of the latest picture; empty without one.
     const std::string& attribution() const { return attribution_; }
 
@@ -42,6 +48,7 @@ class MapBackdrop {
     void request();
     void arrived(const MapPicture& picture);
     void sourceChanged();
+    void drawLatest(Canvas& canvas, const Image& image, const MapViewport& viewport) const;
 
     std::function<void()> changed_;
     std::shared_ptr<MapPictureSource> source_;

@@ -2,6 +2,7 @@
 
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -13,21 +14,33 @@ namespace ktr::platform {
 
 /// What a map is to look like.
 struct MapPictureRequest {
+    /// What becomes of a picture whose middle lies beyond all streets, in the world's coarse outlines.
+    enum class Beyond {
+        AsAsked,  ///< it is drawn as asked for
+        Tell,     ///< the same, and the picture says what would show more (`MapPicture::coarseZoom`)
+        Widen     ///< it is drawn farther out around the same centre, where it shows more
+    };
     MapViewport viewport;
     double scale = 1.0;  ///< pixels a point, 1 to 3
     bool isDark = false;
     bool isHighContrast = false;
     std::string language;     ///< BCP 47, of the labels where the data has it; empty: the names of the place
     std::vector<Rect> clear;  ///< points in the viewport's rectangle where no label may stand (pins, scale bar, …)
+    Beyond beyond = Beyond::AsAsked;
     bool operator==(const MapPictureRequest&) const = default;
 };
 
-/// The ground of a map, drawn: everything below the circles and pins.
+/// The ground of a map, drawn: everything below the pins. Circles go between its two images.
 struct MapPicture {
-    MapViewport viewport;          ///< as requested
-    std::shared_ptr<Image> image;  ///< of the viewport's size
-    std::string attribution;       ///< what the data's owner wants to be shown; never empty
-    bool isComplete = true;        ///< false while parts are filled in from a coarser level; see `observeChanges`
+    MapViewport viewport;           ///< as requested, or farther out: `MapPictureRequest::Beyond::Widen`
+    std::shared_ptr<Image> image;   ///< of the viewport's size
+    std::string attribution;        ///< what the data's owner wants to be shown; never empty
+    bool isComplete = true;         ///< false while parts are filled in from a coarser level; see `observeChanges`
+    std::shared_ptr<Image> labels;  ///< over the circles, of the same size, clear elsewhere; none: there are none
+    bool hasStreets = true;         ///< false where the middle shows the world's coarse outlines alone
+    /// The finest zoom, from about 20 km to 50 km across, at which those outlines have a town to name. None where there
+    /// are streets, where the map is that far out already, and where nobody asked.
+    std::optional<double> coarseZoom;
 };
 
 /// Draws maps. One per installed platform. Main thread; decoding and drawing happen elsewhere.

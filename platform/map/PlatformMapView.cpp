@@ -118,8 +118,7 @@ bool PlatformMapView::initWithFrame(const Rect& frame) {
     layer_ = std::make_unique<MapAnnotationLayer>(*this);
     backdrop_ = std::make_unique<MapBackdrop>([target = weak(this)] {
         if (const auto self = target.lock()) {
-            self->setNeedsUpdate();
-            self->setNeedsDisplay();
+            self->groundArrived();
         }
     });
     chrome_ = create<MapChromeView>(&MapChromeView::initWithFrame, bounds());
@@ -263,10 +262,38 @@ bool PlatformMapView::isPlaceless() const {
 }
 
 MapViewport PlatformMapView::viewportAtRest() const {
+    MapViewport viewport = viewportAskedFor();
+    if (!held_ && coarseZoom_) {
+        viewport.zoom = std::min(viewport.zoom, *coarseZoom_);
+    }
+    return viewport;
+}
+
+MapViewport PlatformMapView::viewportAskedFor() const {
     if (held_) {
         return {held_->centre, held_->zoom, bounds().size()};
     }
     return requested_.value_or(kWorld).viewport(bounds().size());
+}
+
+void PlatformMapView::groundArrived() {
+    auto coarse = backdrop_->coarseZoom();
+    if (coarse && held_) {
+        // The picture reached beyond the view, where its town may be.
+        *coarse -= std::log2(1.0 + 2.0 * kBeyond);
+    }
+    const bool isOther = coarse != coarseZoom_ || backdrop_->hasStreets() != hasStreets_;
+    // Where something was seen before, nothing jumps.
+    glidesToRequested_ = glidesToRequested_ || (hadGround_ && coarse != coarseZoom_);
+    hadGround_ = true;
+    coarseZoom_ = coarse;
+    hasStreets_ = backdrop_->hasStreets();
+    setNeedsUpdate();
+    setNeedsDisplay();
+    const auto installed = Platform::installed();
+    if (isOther && installed && installed->notificationCenter) {
+        installed->notificationCenter->post({kMapStreetsChangedNotification, strong(this)});
+    }
 }
 
 MapRegion PlatformMapView::region() const {
@@ -336,8 +363,11 @@ void PlatformMapView::requestGround() {
     if (isPlaceless() || !installed || !(target.size.width > 0.0) || !(target.size.height > 0.0)) {
         return;
     }
+    using Beyond = MapPictureRequest::Beyond;
     MapPictureRequest request;
-    request.viewport = target;
+    // What is asked for stays the same, however far out it is shown: streets may come.
+    request.viewport = viewportAskedFor();
+    request.beyond = !held_ ? Beyond::Widen : isMoving_ ? Beyond::AsAsked : Beyond::Tell;
     // A map that is moved by hand is drawn beyond its edges, so that there is ground where it is moved to.
     const double beyondX = held_ ? std::floor(target.size.width * kBeyond) : 0.0;
     const double beyondY = held_ ? std::floor(target.size.height * kBeyond) : 0.0;
@@ -472,6 +502,7 @@ void PlatformMapView::draw(Canvas& canvas) const {
     for (const auto& renderer : renderers_) {
         renderer->draw(canvas, shown_);
     }
+    backdrop_->drawLabels(canvas, shown_);
 }
 
 }  // namespace ktr::platform

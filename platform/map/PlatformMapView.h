@@ -22,6 +22,9 @@ class MapBackdrop;
 class MapPlacelessView;
 class PlatformMapView;
 
+/// A map has learnt whether there are streets where it is; its sender is the map.
+inline constexpr const char* kMapStreetsChangedNotification = "platformMapStreetsChanged";
+
 /// Chooses what a map draws. Main thread.
 class KTR_API PlatformMapViewDelegate {
   public:
@@ -77,6 +80,12 @@ class KTR_API PlatformMapView : public View {
         bool operator==(const Surroundings&) const = default;
     };
     void setSurroundings(Surroundings surroundings);
+
+    // Beyond the streets
+    /// False once a picture of the ground has shown that there are no streets where the middle is.
+    bool hasStreets() const { return hasStreets_; }
+    /// The zoom at which a map without streets says more. A region is shown that far out; a host's hand decides itself.
+    const std::optional<double>& coarseZoom() const { return coarseZoom_; }
 
     // Annotations
     /// Without the user.
@@ -136,6 +145,9 @@ class KTR_API PlatformMapView : public View {
     bool isPlaceless() const;
     void showPlaceless();
     void requestGround();
+    void groundArrived();
+    /// As if there were streets everywhere.
+    MapViewport viewportAskedFor() const;
     void userMoved(const std::shared_ptr<PlatformLocation>& location);
 
     std::weak_ptr<PlatformMapViewDelegate> delegate_;
@@ -148,6 +160,9 @@ class KTR_API PlatformMapView : public View {
     /// Where a host's hand has left the map; none: the region holds.
     std::optional<Held> held_;
     bool isMoving_ = false;
+    bool hadGround_ = false;  ///< a picture has been there
+    bool hasStreets_ = true;
+    std::optional<double> coarseZoom_;
     Surroundings surroundings_;
     bool glidesToRequested_ = false;
     std::shared_ptr<Animation> glide_;

@@ -28,7 +28,11 @@ class FakeMaps : public platform::MapPictureSource {
             }
             const auto [asked, answer] = found->second;
             all->erase(found);
-            answer({asked.viewport, std::make_shared<Blank>(asked.viewport.size), "© Nobody", true});
+            platform::MapPicture picture;
+            picture.viewport = asked.viewport;
+            picture.image = std::make_shared<Blank>(asked.viewport.size);
+            picture.attribution = "© Nobody";
+            answer(picture);
         });
         return id;
     }

@@ -3,6 +3,7 @@
 #include <functional>
 #include <map>
 #include <memory>
+#include <optional>
 #include <vector>
 
 #include "platform/map/MapPictureSource.h"
@@ -22,6 +23,9 @@ struct PatientMaps : platform::MapPictureSource {
     std::vector<std::weak_ptr<std::function<void()>>> observers;
     std::string attribution = "Somebody";
     std::function<bool(const platform::Coordinate&)> isShifted;
+    std::shared_ptr<FakeImage> labels;
+    /// There are no streets, and this is where there is more to see.
+    std::optional<double> coarseZoom;
 
     int requestPicture(const platform::MapPictureRequest& request, Completion completion) override {
         requests.push_back(request);
@@ -47,7 +51,20 @@ struct PatientMaps : platform::MapPictureSource {
         for (auto& [number, asked] : std::map<int, Waiting>(std::move(waiting))) {
             image = std::make_shared<FakeImage>();
             image->points = asked.request.viewport.size;
-            asked.completion({asked.request.viewport, image, attribution, true});
+            platform::MapPicture picture;
+            picture.viewport = asked.request.viewport;
+            picture.image = image;
+            picture.attribution = attribution;
+            picture.labels = labels;
+            picture.hasStreets = !coarseZoom;
+            using Beyond = platform::MapPictureRequest::Beyond;
+            if (coarseZoom && asked.request.beyond != Beyond::AsAsked && *coarseZoom < asked.request.viewport.zoom) {
+                picture.coarseZoom = coarseZoom;
+                if (asked.request.beyond == Beyond::Widen) {
+                    picture.viewport.zoom = *coarseZoom;
+                }
+            }
+            asked.completion(picture);
         }
         return image;
     }

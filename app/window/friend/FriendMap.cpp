@@ -2,9 +2,11 @@
 
 #include <QPaintEvent>
 #include <QPainter>
+#include <algorithm>
 #include <cmath>
 
 #include "linux/paint/QtCanvas.h"
+#include "platform/base/Platform.h"
 #include "platform/map/LocationShifter.h"
 #include "platform/ui/Animation.h"
 
@@ -86,6 +88,15 @@ void FriendMap::build() {
     map_->setShowsUserLocation(true);
     window_->addSubview(map_);
     window_->setClient(client_);
+    coarse_.reset();
+    if (const auto installed = Platform::installed()) {
+        streets_ = installed->notificationCenter->addObserver(kMapStreetsChangedNotification,
+                                                              [this](const Notification& told) {
+                                                                  if (told.sender == map_) {
+                                                                      streetsChanged();
+                                                                  }
+                                                              });
+    }
     fit();
     show(PlatformMapView::Hand::Resting);
 }
@@ -93,6 +104,7 @@ void FriendMap::build() {
 void FriendMap::letGo() {
     frames_.stop();
     rest_.stop();
+    streets_.remove();
     if (window_) {
         window_->setClient({});
     }
@@ -164,7 +176,26 @@ Point FriendMap::pinPoint() const {
 double FriendMap::firstZoom() const {
     const double room = std::min(free_.width(), free_.height()) * kCircleShare;
     const double across = 2.0 * place_->accuracy.value_or(0.0);
-    return MapCamera::zoomFor(onMap_, std::max(kFirstMetres, room > 0.0 ? across / room : 0.0));
+    const double zoom = MapCamera::zoomFor(onMap_, std::max(kFirstMetres, room > 0.0 ? across / room : 0.0));
+    return coarse_ ? std::min(zoom, *coarse_) : zoom;
+}
+
+/// Where there are no streets, the map is first seen from as far as a town to name is; a hand may go anywhere.
+void FriendMap::streetsChanged() {
+    if (map_->hasStreets()) {
+        coarse_.reset();
+        return;
+    }
+    // Once: whoever looks closer then wants to.
+    if (coarse_ || !map_->coarseZoom()) {
+        return;
+    }
+    coarse_ = map_->coarseZoom();
+    if (isPlaced_ && place_ && !isTouched_) {
+        camera_.put(onMap_, pinPoint(), firstZoom());
+        show(PlatformMapView::Hand::Resting);
+        tell();
+    }
 }
 
 void FriendMap::setFree(const QRect& free, const std::vector<QRect>& taken) {

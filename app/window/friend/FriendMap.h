@@ -11,6 +11,8 @@
 #include "app/window/friend/FriendPin.h"
 #include "app/window/friend/MapCamera.h"
 #include "linux/paint/Palette.h"
+#include "platform/base/NotificationCenter.h"
+#include "platform/map/PlatformMapView.h"
 #include "platform/ui/Window.h"
 
 class QTouchEvent;
@@ -88,6 +90,7 @@ class FriendMap : public PlainWidget {
     void updateCircle();
     platform::Point pinPoint() const;
     double firstZoom() const;
+    void streetsChanged();
     double seconds() const { return static_cast<double>(clock_.nsecsElapsed()) * 1e-9; }
 
     std::shared_ptr<Client> client_;
@@ -101,7 +104,9 @@ class FriendMap : public PlainWidget {
     bool isStill_ = false;
     QRect free_;
     MapCamera camera_;
-    bool isPlaced_ = false;  ///< the camera has been brought to the pin
+    platform::NotificationCenter::Token streets_;
+    std::optional<double> coarse_;  ///< the zoom at which a map without streets is first seen
+    bool isPlaced_ = false;         ///< the camera has been brought to the pin
     bool isTouched_ = false;
     bool isRingShown_ = false;
     QElapsedTimer clock_;

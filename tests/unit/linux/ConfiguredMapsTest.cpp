@@ -75,6 +75,7 @@ class ConfiguredMapsTest : public test::PlatformTest {
         request.viewport = {kPlace, kZoom, {400.0, 219.0}};
         auto drawn = MapDrawer::draw(request, ConfiguredMaps::grounds(configuration, KTR_RESOURCES), {});
         EXPECT_TRUE(drawn.has_value());
+        drawn->pixels = drawn->whole();
         return *drawn;
     }
     MapDrawer::Result drawFile() {

@@ -68,6 +68,7 @@ class VectorGroundTest : public test::PlatformTest {
     MapDrawer::Result draw(const platform::MapPictureRequest& wanted) {
         auto result = MapDrawer::draw(wanted, {ground(), std::make_shared<PlainGround>()}, {});
         EXPECT_TRUE(result.has_value());
+        result->pixels = result->whole();
         return *result;
     }
     std::shared_ptr<VectorGround> ground() {

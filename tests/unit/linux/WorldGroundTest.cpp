@@ -20,7 +20,9 @@ class WorldGroundTest : public test::PlatformTest {
     MapDrawer::Result draw(const platform::MapPictureRequest& wanted) {
         const auto drawn = MapDrawer::draw(wanted, {ground}, {});
         EXPECT_TRUE(drawn.has_value());
-        return drawn.value_or(MapDrawer::Result());
+        auto result = drawn.value_or(MapDrawer::Result());
+        result.pixels = result.whole();
+        return result;
     }
     /// The colour of the ground at the picture's middle: the labels keep away from it.
     QColor middle(double latitude, double longitude, double zoom) {
@@ -91,6 +93,86 @@ TEST_F(WorldGroundTest, Labels_KeepOutOfWhatIsToBeClear) {
     EXPECT_TRUE(hasColor(draw(wanted).pixels, whole, style.label));
     wanted.clear = {{0.0, 0.0, 200.0, 120.0}};
     EXPECT_FALSE(hasColor(draw(wanted).pixels, whole, style.label));
+}
+
+TEST_F(WorldGroundTest, Names_StandInAPictureOfTheirOwn) {
+    auto wanted = request(52.52, 13.4, 6.0);
+    const auto drawn = MapDrawer::draw(wanted, {ground}, {});
+    ASSERT_TRUE(drawn.has_value());
+    const QRect whole(0, 0, 200, 120);
+    EXPECT_FALSE(hasColor(drawn->pixels, whole, style.label)) << "a circle would lie over it";
+    EXPECT_TRUE(hasColor(drawn->labels, whole, style.label));
+    EXPECT_EQ(drawn->labels.pixelColor(0, 0).alpha(), 0);
+}
+
+TEST_F(WorldGroundTest, BeyondTheStreets_TheMapGoesOutToATownThatItNames) {
+    using Beyond = platform::MapPictureRequest::Beyond;
+    // Some 30 km from a town that the world knows, and in the middle of one.
+    for (const platform::Coordinate& place :
+         {platform::Coordinate{52.5, 13.9}, {48.7, 2.6}, {-33.7, 150.95}, {52.52, 13.405}}) {
+        auto wanted = request(place.latitude, place.longitude, 13.0);
+        wanted.viewport.size = {376.0, 219.0};
+        wanted.clear = {{156.0, 20.0, 64.0, 92.0}};
+        const auto close = MapDrawer::draw(wanted, {ground}, {});
+        ASSERT_TRUE(close.has_value());
+        EXPECT_FALSE(close->hasStreets);
+        EXPECT_EQ(close->coarseZoom, std::nullopt) << "nobody asked";
+        wanted.beyond = Beyond::Tell;
+        const auto told = MapDrawer::draw(wanted, {ground}, {});
+        ASSERT_TRUE(told && told->coarseZoom);
+        EXPECT_EQ(told->pixels, close->pixels) << "drawn as asked for";
+        wanted.beyond = Beyond::Widen;
+        const auto wide = MapDrawer::draw(wanted, {ground}, {});
+        ASSERT_TRUE(wide && wide->coarseZoom);
+        EXPECT_EQ(wide->coarseZoom, told->coarseZoom);
+        platform::MapViewport shown = wanted.viewport;
+        shown.zoom = *wide->coarseZoom;
+        const double across = shown.metresPerPoint() * 219.0;
+        EXPECT_GE(across, 19999.0);
+        EXPECT_LE(across, 50001.0);
+        EXPECT_TRUE(hasColor(wide->labels, QRect(0, 0, 376, 219), style.label)) << place.latitude;
+        EXPECT_FALSE(hasColor(wide->labels, QRect(157, 21, 62, 90), style.label)) << "the pin stands there";
+    }
+}
+
+TEST_F(WorldGroundTest, InTheMiddleOfNowhere_TheMapGoesOutNoFartherThanFiftyKilometres) {
+    auto wanted = request(25.0, -40.0, 13.0);
+    wanted.beyond = platform::MapPictureRequest::Beyond::Widen;
+    const auto wide = MapDrawer::draw(wanted, {ground}, {});
+    ASSERT_TRUE(wide && wide->coarseZoom);
+    platform::MapViewport shown = wanted.viewport;
+    shown.zoom = *wide->coarseZoom;
+    EXPECT_NEAR(shown.metresPerPoint() * 120.0, 50000.0, 1.0);
+}
+
+TEST_F(WorldGroundTest, FarOut_NobodyMissesStreets) {
+    auto wanted = request(52.52, 13.4, 6.0);
+    wanted.beyond = platform::MapPictureRequest::Beyond::Widen;
+    const auto drawn = MapDrawer::draw(wanted, {ground}, {});
+    ASSERT_TRUE(drawn.has_value());
+    EXPECT_TRUE(drawn->hasStreets);
+    EXPECT_EQ(drawn->coarseZoom, std::nullopt);
+}
+
+TEST_F(WorldGroundTest, WhereAnotherGroundHasTheMiddle_NothingGoesOut_AndNotWhileItComes) {
+    class Middle final : public MapGround {
+      public:
+        explicit Middle(bool isThere) : isThere_(isThere) {}
+        MapDrawn draw(const MapDrawing&) override {
+            return {isThere_ ? QRegion(50, 30, 100, 60) : QRegion(), "Streets", isThere_};
+        }
+
+      private:
+        bool isThere_;
+    };
+    auto wanted = request(52.5, 13.9, 13.0);
+    wanted.beyond = platform::MapPictureRequest::Beyond::Widen;
+    for (const bool isThere : {true, false}) {
+        const auto drawn = MapDrawer::draw(wanted, {std::make_shared<Middle>(isThere), ground}, {});
+        ASSERT_TRUE(drawn.has_value());
+        EXPECT_TRUE(drawn->hasStreets);
+        EXPECT_EQ(drawn->coarseZoom, std::nullopt);
+    }
 }
 
 TEST_F(WorldGroundTest, InsideTheRegionOnly) {

@@ -569,4 +569,71 @@ TEST_F(PlatformMapViewTest, LabelsKeepClearOfWhatStandsOverTheMap_AndTheCornersM
     EXPECT_FALSE(covers({188.0, 60.0}));
 }
 
+TEST_F(PlatformMapViewTest, Names_StandOverTheCircles) {
+    maps_->labels = std::make_shared<FakeImage>();
+    map_->setRegion(kTown, false);
+    map_->addOverlay(std::make_shared<CircleOverlay>(Coordinate{50.21, -3.12}, 100.0));
+    time->runPosted();
+    const auto ground = maps_->answer();
+    const auto canvas = painted();
+    const auto placeOf = [&](const auto& isIt) {
+        return std::find_if(canvas.calls.begin(), canvas.calls.end(), isIt) - canvas.calls.begin();
+    };
+    const auto groundAt = placeOf([&](const auto& call) { return call.object == ground.get(); });
+    const auto circleAt = placeOf([](const auto& call) { return call.kind == RecordingCanvas::Call::Kind::Path; });
+    const auto namesAt = placeOf([&](const auto& call) { return call.object == maps_->labels.get(); });
+    ASSERT_LT(static_cast<std::size_t>(namesAt), canvas.calls.size());
+    EXPECT_LT(groundAt, circleAt);
+    EXPECT_LT(circleAt, namesAt);
+    EXPECT_EQ(canvas.calls[static_cast<std::size_t>(namesAt)].rect, (Rect{0.0, 0.0, 376.0, 219.0}));
+}
+
+TEST_F(PlatformMapViewTest, BeyondTheStreets_ARegionIsShownFromFartherOut_AndIsToldOnce) {
+    int told = 0;
+    const auto observer = platform->notificationCenter->addObserver(
+        kMapStreetsChangedNotification, [&](const Notification& one) { told += one.sender == map_ ? 1 : 0; });
+    map_->setRegion(kTown, false);
+    const double asked = map_->viewportAtRest().zoom;
+    maps_->coarseZoom = 9.0;
+    time->runPosted();
+    EXPECT_TRUE(map_->hasStreets());
+    maps_->answer();
+    time->runUntilIdle(1.0);
+    EXPECT_FALSE(map_->hasStreets());
+    EXPECT_EQ(map_->viewport().zoom, 9.0);
+    EXPECT_EQ(map_->viewport().centre, kTown.center);
+    EXPECT_EQ(map_->requestedRegion(), kTown) << "what was asked for is still that";
+    maps_->answer();
+    time->runUntilIdle(1.0);
+    EXPECT_EQ(told, 1);
+    EXPECT_EQ(maps_->requests.back().viewport.zoom, asked) << "streets may come";
+
+    // Streets have been added.
+    maps_->coarseZoom.reset();
+    maps_->change();
+    maps_->answer();
+    time->runPosted();
+    time->advance(0.2);
+    EXPECT_GT(map_->viewport().zoom, 9.0);
+    EXPECT_LT(map_->viewport().zoom, asked) << "it glides";
+    time->advance(0.4);
+    EXPECT_EQ(map_->viewport().zoom, asked);
+    EXPECT_TRUE(map_->hasStreets());
+    EXPECT_EQ(told, 2);
+}
+
+TEST_F(PlatformMapViewTest, BeyondTheStreets_AHandsMapStaysAndIsTold) {
+    maps_->coarseZoom = 9.0;
+    map_->showAt({50.21, -3.12}, 15.0, PlatformMapView::Hand::Moving);
+    time->runPosted();
+    EXPECT_EQ(maps_->requests.back().beyond, MapPictureRequest::Beyond::AsAsked);
+    map_->showAt({50.21, -3.12}, 15.0, PlatformMapView::Hand::Resting);
+    time->runPosted();
+    maps_->answer();
+    time->runUntilIdle(1.0);
+    EXPECT_EQ(map_->viewport().zoom, 15.0);
+    ASSERT_TRUE(map_->coarseZoom());
+    EXPECT_NEAR(*map_->coarseZoom(), 9.0 - std::log2(1.5), 1e-9) << "its town may stand beyond the edges";
+}
+
 }  // namespace ktr::test
