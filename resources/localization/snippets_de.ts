@@ -125,23 +125,23 @@
     </message>
     <message>
         <source>LEAVING_LABEL</source>
-        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
-        <translation>Meldung beim Aufbruch: %@</translation>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear as they leave %@”</extracomment>
+        <translation>Info bei Aufbruch: %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
-        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they reach %@”</extracomment>
-        <translation>Meldung bei Ankunft: %@</translation>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear as they reach %@”</extracomment>
+        <translation>Info bei Ankunft: %@</translation>
     </message>
     <message>
         <source>LEAVING_LABEL_ABSOLUTE</source>
         <extracomment>The same without a place. English: “You’ll hear when they leave”</extracomment>
-        <translation>Nachricht beim Aufbruch</translation>
+        <translation>Info bei Aufbruch</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL_ABSOLUTE</source>
         <extracomment>The same without a place. English: “You’ll hear when they arrive”</extracomment>
-        <translation>Nachricht bei Ankunft</translation>
+        <translation>Info bei Ankunft</translation>
     </message>
     <message>
         <source>_$!&lt;home&gt;!$_</source>

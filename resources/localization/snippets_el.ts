@@ -125,23 +125,23 @@
     </message>
     <message>
         <source>LEAVING_LABEL</source>
-        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they leave %@”</extracomment>
-        <translation>Ειδοποίηση εξόδου: %@</translation>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear as they leave %@”</extracomment>
+        <translation>Μήνυμα εξόδου: %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
-        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear when they reach %@”</extracomment>
-        <translation>Ειδοποίηση άφιξης: %@</translation>
+        <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit. English: “You’ll hear as they reach %@”</extracomment>
+        <translation>Μήνυμα άφιξης: %@</translation>
     </message>
     <message>
         <source>LEAVING_LABEL_ABSOLUTE</source>
         <extracomment>The same without a place. English: “You’ll hear when they leave”</extracomment>
-        <translation>Ειδοποίηση κατά την αναχώρηση</translation>
+        <translation>Μήνυμα κατά την αναχώρηση</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL_ABSOLUTE</source>
         <extracomment>The same without a place. English: “You’ll hear when they arrive”</extracomment>
-        <translation>Ειδοποίηση κατά την άφιξη</translation>
+        <translation>Μήνυμα κατά την άφιξη</translation>
     </message>
     <message>
         <source>_$!&lt;home&gt;!$_</source>

@@ -126,12 +126,12 @@
     <message>
         <source>LEAVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit</extracomment>
-        <translation>You’ll hear when they leave %@</translation>
+        <translation>You’ll hear as they leave %@</translation>
     </message>
     <message>
         <source>ARRIVING_LABEL</source>
         <extracomment>A promise about one friend, of any gender; %@ is a place with a name (“Work”) or a street: word it so that both fit</extracomment>
-        <translation>You’ll hear when they reach %@</translation>
+        <translation>You’ll hear as they reach %@</translation>
     </message>
     <message>
         <source>LEAVING_LABEL_ABSOLUTE</source>

@@ -93,7 +93,7 @@ class AccessibilityTest(WindowTest):
         tree, output = self.open(5, "fence-leaving.json", "sharing-visible.json", "sharing-hidden.json")
         links = [node for node in tree if node.getRoleName() == "link"]
         names = [link.name.replace("\u00a0", " ") for link in links]
-        self.assertEqual(names[0], "נועם ברק, You’ll hear when they leave Work")
+        self.assertEqual(names[0], "נועם ברק, You’ll hear as they leave Work")
         self.assertIn("Map: the area around Work", names[1])
         self.assertTrue(names[2].startswith("Mara Lind, Friends can see where you are"), names[2])
         self.assertIn("Map: you are here", names[3])

@@ -212,7 +212,7 @@ class SharingTest(unittest.TestCase):
         self.serve(track(1, 1))
         result = self.live(1, "Tell me when Ann leaves work")
         self.assertIn("I will tell you when Ann Marsh leaves.", result.stdout)
-        self.assertIn("Ann Marsh, You’ll hear when they leave Work (link)", result.stdout)
+        self.assertIn("Ann Marsh, You’ll hear as they leave Work (link)", result.stdout)
         result = self.live(1, "Tell me when Ann arrives")
         self.assertIn("Ann Marsh, You’ll hear when they arrive (link)", result.stdout)
         # The service is asked, and for nobody.

@@ -7,6 +7,7 @@
 
 #include "host/Host.h"
 #include "host/HostOptions.h"
+#include "host/conversation/BubbleView.h"
 #include "host/scenario/ScenarioReader.h"
 #include "platform/assistant/VAKtrGeoFence.h"
 #include "platform/assistant/VASnippet.h"
@@ -70,7 +71,8 @@ TEST_F(FenceWordsTest, PromisesOfUsualPlaces_FitTheirOneLineInEveryLanguage) {
                 ASSERT_EQ(found.size(), 2U) << "the name and the promise";
                 for (const auto& label : found) {
                     EXPECT_EQ(label->numberOfLines(), 1);
-                    EXPECT_LE(label->intrinsicContentSize().width, label->frame().width + 0.01)
+                    EXPECT_LE(host::wrappedSize(label->text(), label->font(), 1e6).size.width,
+                              label->frame().width + 0.01)
                         << language << ": " << label->text();
                 }
             }

@@ -218,7 +218,7 @@ TEST(QtLocalizationTextsTest, TheWordsReadAsTheyShould) {
     EXPECT_EQ(filled("CITY_STATE_LABEL", {"Brinmouth", "HB"}), "Brinmouth, HB");
     EXPECT_EQ(filled("LOCATED_MINUTES", {"4"}), "4\u00a0min ago");
     EXPECT_EQ(filled("LOCATED_LESS_THAN_30SECONDS", {"30"}), "Over 30\u00a0s ago");
-    EXPECT_EQ(filled("ARRIVING_LABEL", {"Work"}), "You’ll hear when they reach Work");
+    EXPECT_EQ(filled("ARRIVING_LABEL", {"Work"}), "You’ll hear as they reach Work");
     const ProjectsTexts arabic("ar-EG");
     EXPECT_EQ(platform::formatted(arabic.text("CITY_STATE_LABEL", platform::kSnippetsBundle), {"برينماوث", "HB"}),
               "برينماوث، HB");
