@@ -170,5 +170,5 @@ class WalkTest(accessibility_test.WindowTest):
 
 if __name__ == "__main__":
     if "KTR_INSIDE" not in os.environ:
-        sys.exit(outside(__file__, 400))
+        sys.exit(outside(__file__, seconds=400))
     unittest.main()
