@@ -6,12 +6,14 @@ tests are."""
 import json
 import os
 import pathlib
+import subprocess
 import sys
 import time
 import unittest
 
 import accessibility_test
 import live_window_test
+import mock_bus
 from live_window_test import FIRST_ROW, wait_for
 
 
@@ -120,6 +122,25 @@ class TasksTest(live_window_test.LiveWindowTest):
         self.key("ctrl+v")
         copied = wait_for("the place", lambda: (text := field.queryText()).getText(0, text.characterCount))
         self.assertRegex(copied, r"50\.2\d+, -3\.1\d+")
+
+    @unittest.skipUnless(mock_bus.is_possible(), "python3-dbusmock is not installed")
+    def test_task_open_in_maps(self):
+        """The desktop's portal is asked, and nobody else."""
+        name, path, interface = ("org.freedesktop.portal.Desktop", "/org/freedesktop/portal/desktop",
+                                 "org.freedesktop.portal.OpenURI")
+        told = self.folder / "portal"
+        with told.open("w") as stream:
+            portal = subprocess.Popen([mock_bus.PYTHON, "-u", "-m", "dbusmock", "--session", name, path, interface], stdout=stream)
+        self.addCleanup(portal.wait)
+        self.addCleanup(portal.terminate)
+        reply = "ret = dbus.ObjectPath('/org/freedesktop/portal/desktop/request/1_1/t')"
+        wait_for("the portal", lambda: subprocess.run(
+            ["gdbus", "call", "--session", "-d", name, "-o", path, "-m", "org.freedesktop.DBus.Mock.AddMethod", interface, "OpenURI",
+             "ssa{sv}", "o", reply], capture_output=True, check=False).returncode == 0)
+        self.open_ann()
+        self.click_on("Open in Maps", "push button")
+        wait_for("a place", lambda: "OpenURI" in told.read_text())
+        self.assertRegex(told.read_text(), r'OpenURI "" "geo:50\.2\d*,-3\.1\d*\?q=50\.2\d*,-3\.1\d*\(Ann%20Marsh\)"')
 
     def test_task_hide(self):
         service = self.serve()
