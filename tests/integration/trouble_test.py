@@ -115,6 +115,19 @@ class TroubleTest(unittest.TestCase):
         self.assertLess(result.seconds, 20, result.stderr)
         self.assertNotIn("Sign in", result.stdout + result.stderr)
 
+    def test_working_folder_that_has_gone_ends_nothing_with_a_signal(self):
+        words = dict(os.environ, KTR_CONFIG="config.json", XDG_STATE_HOME=str(self.folder / "state"),
+                     DBUS_SESSION_BUS_ADDRESS="disabled:", DBUS_SYSTEM_BUS_ADDRESS="disabled:")
+        words.pop("QT_QPA_PLATFORM", None)
+        for command, status in ((["config", "list"], 0), (["config", "set", "textSize", "XL"], 1), (["describe", "x.json"], 3),
+                                (["ask", "Hello"], 16), (["watch", "--print"], 1), (["serve", "--ca-dir", "x"], 1)):
+            with self.subTest(command):
+                gone = self.folder / "gone"
+                gone.mkdir()
+                result = subprocess.run(["sh", "-c", 'cd "$0" && rmdir "$0" && exec "$@"', gone, PROGRAM, *command], env=words,
+                                        capture_output=True, timeout=60, text=True, check=False)
+                self.assertEqual(result.returncode, status, result.stderr)
+
     def test_few_files_is_a_failure_that_says_so(self):
         for files in (6, 8, 10, 12, 15, 16, 24, 32):
             with self.subTest(files):
