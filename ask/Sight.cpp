@@ -85,6 +85,8 @@ std::optional<Sight> sightOf(const Dictionary& entry) {
     if (const Value* labels = location->find("labels"); labels != nullptr && labels->array() != nullptr) {
         for (const Value& label : *labels->array()) {
             if (label.dictionary() != nullptr && !textIn(*label.dictionary(), "label").empty()) {
+                const Value* phrase = label.dictionary()->find("phrase");
+                sight.isPhrase = sight.isPhrase || (sight.labels.empty() && phrase != nullptr && phrase->boolean() == true);
                 sight.labels.push_back(textIn(*label.dictionary(), "label"));
             }
         }
@@ -149,7 +151,10 @@ std::string Sight::where(const Sentences& sentences) const {
     }
     // A sort of place without words here: the name beside it, if there is one.
     if (!labels.empty() && kindOf(labels.back()).empty()) {
-        return sentences.text("atPlace", {{"place", kindOf(labels.front()).empty() ? labels.front() : labels.back()}});
+        const std::string& place = kindOf(labels.front()).empty() ? labels.front() : labels.back();
+        // "Quay Road, Brinmouth" is no place of its own.
+        const bool isStreet = !street.empty() && place.compare(0, street.size(), street) == 0;
+        return sentences.text(isPhrase ? "byItself" : isStreet ? "onStreet" : "atPlace", {{"place", place}});
     }
     if (!street.empty()) {
         return sentences.text("onStreet", {{"place", street}});

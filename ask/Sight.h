@@ -22,6 +22,7 @@ struct Sight {
     platform::Date time;
     bool hasTime = false;
     std::vector<std::string> labels;  ///< the first one is shown
+    bool isPhrase = false;            ///< that one says where by itself: "near Exeter, 40 km"
     std::string street;
     std::string city;
     std::string state;

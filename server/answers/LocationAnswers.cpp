@@ -31,7 +31,12 @@ void addName(Dictionary& location, const PlaceName& name) {
         location.set("address", Dictionary{{"locality", name.town}});
     }
     if (!name.words.empty()) {
-        location.set("labels", Value::Array{Dictionary{{"label", name.words}}});
+        Dictionary label{{"label", name.words}};
+        // "near Exeter, 40 km": whoever makes a sentence of it adds no "at".
+        if (name.street.empty()) {
+            label.set("phrase", true);
+        }
+        location.set("labels", Value::Array{label});
     }
 }
 

@@ -112,8 +112,8 @@ class PlacesTest(unittest.TestCase):
         self.locate(*FAR_AWAY)
         for language, region, words in (("en-GB", "GB", "near Exeter, 24\u00a0mi"), ("de", "DE", "bei Exeter, 38\u00a0km"),
                                         ("ja", "JP", "Exeter付近、38\u00a0km")):
-            label = self.location(language, region)["labels"][0]["label"]
-            self.assertEqual(label, words, language)
+            label = self.location(language, region)["labels"][0]
+            self.assertEqual(label, {"label": words, "phrase": True}, language)
 
     def test_below_exact_no_street_is_said(self):
         self.share("--precision", "town")

@@ -1,4 +1,5 @@
 """The desktop's search against the real `ktr search`, which a private bus starts, and a real service behind a relay that counts."""
+import configparser
 import json
 import os
 import pathlib
@@ -17,6 +18,7 @@ from service_program import ServiceProgram
 from virtual_display import VirtualDisplay
 
 SERVICE, KTR = sys.argv[1:3]
+SOURCE = pathlib.Path(os.environ["KTR_SOURCE"])
 NAME, PATH = "org.ktr.ktr.Search", "/org/ktr/ktr/Search"
 SHELL, RUNNER = "org.gnome.Shell.SearchProvider2", "org.kde.krunner1"
 FRIENDS = {"Ann": "Ann Marsh", "Otto": "Otto Brandt", "Lea": "Lea Vale", "Mara": "Mara Lind"}
@@ -299,6 +301,22 @@ class SearchTest(unittest.TestCase):
         self.addCleanup(os.kill, int(window), 9)
         words = pathlib.Path(f"/proc/{window}/cmdline").read_bytes().split(b"\0")
         self.assertEqual(words[1:3], [b"show", b"--ask=Where is Ann Marsh?"])
+
+    def test_what_is_installed_names_the_same_service(self):
+        def read(name):
+            parser = configparser.ConfigParser(interpolation=None)
+            parser.optionxform = str
+            parser.read_string((SOURCE / "packaging" / name).read_text())
+            return parser
+        started = read("org.ktr.ktr.Search.service.in")["D-BUS Service"]
+        self.assertEqual(started["Name"], NAME)
+        self.assertEqual(started["Exec"], "@CMAKE_INSTALL_FULL_BINDIR@/ktr search")
+        provider = read("org.ktr.ktr.search-provider.ini")["Shell Search Provider"]
+        self.assertEqual(dict(provider), {"DesktopId": "org.ktr.ktr.desktop", "BusName": NAME, "ObjectPath": PATH, "Version": "2"})
+        self.assertTrue((SOURCE / "packaging" / provider["DesktopId"]).exists(), "the shell shows only programs that it knows")
+        runner = read("org.ktr.ktr.runner.desktop")["Desktop Entry"]
+        self.assertEqual((runner["Type"], runner["X-KDE-ServiceTypes"]), ("Service", "Plasma/Runner"))
+        self.assertEqual((runner["X-Plasma-DBusRunner-Service"], runner["X-Plasma-DBusRunner-Path"]), (NAME, PATH))
 
     def test_answers_take_at_most_fifty_milliseconds(self):
         self.shell("ann")

@@ -94,6 +94,23 @@ TEST(KTRCommandLineTest, At_TakesAMoment) {
     EXPECT_EQ(options.at->offsetSeconds, 7200);
 }
 
+TEST(KTRCommandLineTest, Search_IsLiveAndEndsWhenItIsIdle) {
+    const Options options = parsed({"search", "--language", "de"});
+    EXPECT_EQ(options.command, Options::Command::Search);
+    EXPECT_TRUE(options.live);
+    EXPECT_EQ(options.language, "de");
+    EXPECT_EQ(options.searchIdle, 60);
+    EXPECT_EQ(parsed({"search", "--idle", "5"}).searchIdle, 5);
+    EXPECT_EQ(ending({"search", "--idle", "0"}).code, host::ExitCode::Usage);
+    EXPECT_EQ(ending({"search", "ann"}).code, host::ExitCode::Usage);
+}
+
+TEST(KTRCommandLineTest, Ask_IsAloudOnlyWhenItIsSaid) {
+    EXPECT_FALSE(parsed({"ask", "Where is Ann?"}).aloud);
+    EXPECT_TRUE(parsed({"ask", "Where is Ann?", "--aloud"}).aloud);
+    EXPECT_EQ(parsed({"ask", "--", "--help"}).questions, std::vector<std::string>{"--help"});
+}
+
 TEST(KTRCommandLineTest, Help_HasExamplesAndTheExitStatus) {
     const auto all = ending({"--help"});
     EXPECT_EQ(all.code, host::ExitCode::Ok);

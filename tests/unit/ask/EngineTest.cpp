@@ -315,6 +315,24 @@ TEST_F(EngineTest, ManyContacts_AreAskedForInSeveralRequestsAndNoneIsLeftOut) {
     EXPECT_NE(answer.sentence.find("P999 "), std::string::npos) << answer.sentence;
 }
 
+TEST_F(EngineTest, WordsThatSayWhereByThemselves_GetNoAt) {
+    Dictionary answer = entry(1.0, 1.0, 10.0);
+    const auto said = [&](const Dictionary& label, const char* street) {
+        Dictionary location = *answer.find("location")->dictionary();
+        location.set("labels", Value::Array{label});
+        location.set("streetAddress", street);
+        answer.set("location", location);
+        return ask("Where is Ann?").sentence;
+    };
+    service.answer = [&](const std::string&, const Dictionary&) {
+        return locations({{"ann@harbour.example", answer}});
+    };
+    EXPECT_EQ(said({{"label", "near Exeter, 40 km"}, {"phrase", true}}, ""), "Ann Marsh is near Exeter, 40 km.");
+    EXPECT_EQ(said({{"label", "near Exeter"}}, ""), "Ann Marsh is at near Exeter.") << "a place of that name";
+    EXPECT_EQ(said({{"label", "Quay Road, Brinmouth"}}, "Quay Road"), "Ann Marsh is on Quay Road, Brinmouth.");
+    EXPECT_EQ(said({{"label", "Fish Market"}}, "Quay Road"), "Ann Marsh is at Fish Market.");
+}
+
 TEST_F(EngineTest, WhatIsReadHere_AsksNobody) {
     question.text = "Where is Ann?";
     const auto said = engine->readHere(question);
