@@ -3,7 +3,10 @@
 #include <filesystem>
 
 #include "documents/AtomicFile.h"
+#include "documents/FileSteps.h"
+#include "documents/VCard.h"
 #include "documents/Words.h"
+#include "platform/base/Json.h"
 #include "server/admin/Administration.h"
 #include "server/admin/TerminalCode.h"
 #include "server/page/QrCode.h"
@@ -37,15 +40,37 @@ std::string Administration::add(const Newcomer& who) {
     if (!complaint.empty() || who.ktr.empty()) {
         return complaint;
     }
-    std::string configuration;
+    platform::Dictionary configuration;
     complaint = makeReader(who.name, (folder / "token").string(), configuration);
+    if (complaint.empty() && !who.friends.empty()) {
+        const auto cards = documents::FileSteps::absolute(who.ktr).lexically_normal() / "friends.vcf";
+        complaint = documents::AtomicFile::write(cards, contactsOf(who.friends), 0600);
+        configuration.set("contacts", platform::Value::Array{cards.string()});
+    }
     if (complaint.empty()) {
-        complaint = documents::AtomicFile::write(folder / "config.json", configuration + "\n");
+        complaint = documents::AtomicFile::write(folder / "config.json", platform::writeJson(configuration) + "\n");
     }
     if (complaint.empty()) {
         out_ << "ktr asks as " << who.name << " with " << (folder / "config.json").string() << "\n";
     }
     return complaint;
+}
+
+std::string Administration::contactsOf(const std::vector<std::string>& names) {
+    std::string cards;
+    for (const std::string& name : names) {
+        std::string complaint;
+        const auto someone = person(name, complaint);
+        if (!someone) {
+            continue;
+        }
+        documents::VCard card{someone->name, {}, someone->name, {}, {}};
+        for (const std::string& handle : someone->handles) {
+            (handle.find('@') != std::string::npos ? card.emails : card.phones).push_back(handle);
+        }
+        cards += card.text();
+    }
+    return cards;
 }
 
 void Administration::showPhone(const PhoneSetUp& phone, const Newcomer& who) {

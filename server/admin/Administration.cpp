@@ -127,16 +127,16 @@ std::string Administration::addWithPhone(const Newcomer& who) {
 }
 
 std::string Administration::reader(const std::string& name, const std::string& tokenFile) {
-    std::string configuration;
+    Dictionary configuration;
     std::string complaint = makeReader(name, tokenFile, configuration);
     if (complaint.empty()) {
-        out_ << configuration << "\n";
+        out_ << platform::writeJson(configuration) << "\n";
     }
     return complaint;
 }
 
 std::string Administration::makeReader(const std::string& name, const std::string& tokenFile,
-                                       std::string& configuration) {
+                                       Dictionary& configuration) {
     std::string complaint = open();
     const auto settings = complaint.empty() ? ServiceSettings::read(folder_, complaint) : std::nullopt;
     const auto who = settings ? person(name, complaint) : std::nullopt;
@@ -157,7 +157,7 @@ std::string Administration::makeReader(const std::string& name, const std::strin
                              {"host", origin.substr(std::string("https://").size())},
                              {"tokenFile", documents::FileSteps::absolute(tokenFile).lexically_normal().string()}};
     const auto authority = documents::FileSteps::absolute(folder_ + "/ca.pem").lexically_normal().string();
-    configuration = platform::writeJson(Dictionary{{"account", account}, {"certificates", Value::Array{authority}}});
+    configuration = Dictionary{{"account", account}, {"certificates", Value::Array{authority}}};
     return "";
 }
 

@@ -106,7 +106,9 @@ class Administration {
     /// What to type into a phone's app, and where.
     void showPhone(const PhoneSetUp& phone, const Newcomer& who);
     /// A new secret for ktr in that file, and the configuration that uses it.
-    std::string makeReader(const std::string& name, const std::string& tokenFile, std::string& configuration);
+    std::string makeReader(const std::string& name, const std::string& tokenFile, platform::Dictionary& configuration);
+    /// The cards of these people, by which whoever asks knows them.
+    std::string contactsOf(const std::vector<std::string>& names);
     /// Opens the store; an empty text when it is open.
     std::string open();
     std::optional<Person> person(const std::string& name, std::string& complaint);

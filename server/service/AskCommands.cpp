@@ -97,6 +97,16 @@ void AskCommands::sharing(const Device& device, const Wish& wish, const HttpRepl
     done ? tell(device, reply) : reply.send(notWritten());
 }
 
+bool AskCommands::isTakenBack(std::int64_t owner, std::int64_t viewer) const {
+    if (setup_.store.revokeGrant(owner, viewer)) {
+        return true;
+    }
+    // There was none, or it could not be ended.
+    const std::uint64_t failures = setup_.store.readFailures();
+    const auto left = setup_.store.sharing(viewer, owner);
+    return left && !left->grant && setup_.store.readFailures() == failures;
+}
+
 void AskCommands::changeRules(const Device& device, const Wish& wish, const HttpReply& reply) const {
     const std::uint64_t failures = setup_.store.readFailures();
     std::vector<std::int64_t> viewers;
@@ -110,22 +120,30 @@ void AskCommands::changeRules(const Device& device, const Wish& wish, const Http
         }
         viewers.push_back(*viewer);
     }
-    const auto now = setup_.now();
+    const auto now = setup_.store.present(setup_.now());
     const auto rules = setup_.store.grantsOf(device.person);
     for (const std::int64_t viewer : viewers) {
         if (wish.kind == Wish::Kind::Hide) {
-            setup_.store.revokeGrant(device.person, viewer);
+            if (!isTakenBack(device.person, viewer)) {
+                return reply.send(notWritten());
+            }
             continue;
         }
         const auto person = setup_.store.person(viewer);
         const auto before = std::find_if(rules.begin(), rules.end(),
                                          [&](const auto& rule) { return person && rule.first == person->name; });
         // What was agreed with this viewer before stays, but for what the wish names.
-        Grant rule = before == rules.end() ? Grant() : before->second;
+        Grant rule;
+        rule.from = now;
+        if (before != rules.end() && before->second.end() > now) {
+            rule = before->second;
+        } else if (before != rules.end()) {
+            // Of what is over no leave comes back by itself, and nothing from before is seen.
+            rule.precision = before->second.precision;
+        }
         rule.precision = wish.precision.value_or(rule.precision);
         rule.until = wish.until;
         rule.arrival = 0;
-        rule.from = before == rules.end() ? now : rule.from;
         rule.confirmed = now;
         if (!person || !setup_.store.grant(device.person, viewer, rule)) {
             return reply.send(notWritten());

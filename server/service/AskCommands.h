@@ -41,6 +41,8 @@ class AskCommands {
     void sharing(const Device& device, const Wish& wish, const HttpReply& reply) const;
     /// Changes the rules for those who are named; all of them or, where somebody is not known, none.
     void changeRules(const Device& device, const Wish& wish, const HttpReply& reply) const;
+    /// Ends a rule; false: it may still hold.
+    bool isTakenBack(std::int64_t owner, std::int64_t viewer) const;
     void tell(const Device& device, const HttpReply& reply) const;
     void places(const Device& device, const HttpReply& reply) const;
 

@@ -91,7 +91,7 @@ class DocumentTest(unittest.TestCase):
         database.close()
 
     def follow(self, kind):
-        server, question, asking, sister = section("From nothing to the first friend seen")
+        server, plain, question, asking, sister = section("From nothing to the first friend seen")
         lines = server.splitlines()
         self.assertLessEqual(len(lines), 4, "at most four commands on the server")
         self.assertTrue(all(line.startswith("ktr-service ") for line in lines))
@@ -112,6 +112,8 @@ class DocumentTest(unittest.TestCase):
         phone.locate(*ANN, time.time() - 130)
         self.assertTrue(phone.send())
 
+        # In plain words, with nothing but what `add` wrote.
+        self.assertRegex(self.type(plain), r"^At \d[^\n]* Ann was [^\n]*near [^\n]*\n$", "it is two minutes old")
         shows = [line for line in asking.splitlines() if "describe" in line]
         answer = self.type(shows[0])
         self.assertIn("Where is Ann?", answer)

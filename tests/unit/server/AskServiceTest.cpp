@@ -7,6 +7,9 @@
 #include "server/http/BasicCredentials.h"
 #include "server/service/Service.h"
 #include "tests/support/RawClient.h"
+#include "tests/support/TemporaryFolder.h"
+#include "tests/unit/server/FaultyDisk.h"
+#include "tests/unit/server/PrivatePostgres.h"
 
 namespace ktr::test {
 
@@ -17,14 +20,23 @@ using server::Precision;
 using server::Service;
 using server::Store;
 
-/// A service over plain HTTP on this machine: ann, otto and mara have readers, and nobody sees anybody.
-class AskServiceTest : public ::testing::Test {
+/// A service over plain HTTP on this machine, on either kind of store: ann, otto and mara have readers, and nobody sees
+/// anybody.
+class AskServiceTest : public ::testing::TestWithParam<bool> {
   protected:
     static constexpr std::int64_t kNow = 1763760000;
 
     void SetUp() override {
         std::string complaint;
-        store_ = Store::open(server::StoreAddress::inMemory(), true, complaint);
+        server::StoreAddress address{folder_.path().string()};
+        if (GetParam()) {
+            PrivatePostgres* const server = PrivatePostgres::shared();
+            if (server == nullptr) {
+                GTEST_SKIP() << "needs a PostgreSQL server: KTR_LONG_TESTS=1 starts one";
+            }
+            address = {server->newStore()};
+        }
+        store_ = Store::open(address, true, complaint);
         ASSERT_TRUE(store_) << complaint;
         for (const char* name : {"ann", "otto", "mara"}) {
             ASSERT_TRUE(store_->addPerson(name, {std::string(name) + "@x.example"}, kNow));
@@ -37,7 +49,11 @@ class AskServiceTest : public ::testing::Test {
         service_ = std::make_unique<Service>(std::move(setup));
         ASSERT_EQ(service_->start(), "");
     }
-    void TearDown() override { service_->stop(); }
+    void TearDown() override {
+        if (service_) {
+            service_->stop();
+        }
+    }
     /// Status line and body.
     std::string ask(const std::string& who, const std::string& path, const std::string& members) {
         const std::string body = R"({"clientContext":{})" + members + "}";
@@ -51,12 +67,17 @@ class AskServiceTest : public ::testing::Test {
     }
     static bool holds(const std::string& text, const std::string& part) { return text.find(part) != std::string::npos; }
 
+    TemporaryFolder folder_;
+    FaultyDisk disk_;
     std::shared_ptr<Store> store_;
     std::unique_ptr<Service> service_;
     std::map<std::string, std::int64_t> ids_;
 };
 
-TEST_F(AskServiceTest, ARuleForOne_IsMadeWithItsEndAndPrecisionAndTaken) {
+INSTANTIATE_TEST_SUITE_P(Sqlite, AskServiceTest, ::testing::Values(false));
+INSTANTIATE_TEST_SUITE_P(Postgres, AskServiceTest, ::testing::Values(true));
+
+TEST_P(AskServiceTest, ARuleForOne_IsMadeWithItsEndAndPrecisionAndTaken) {
     const std::string shared =
         ask("ann", "sharing", R"(,"wish":"share","with":["otto@x.example"],"until":1763763600000,"precision":"town")");
     EXPECT_TRUE(holds(shared, R"("viewers":[{"name":"otto","precision":"town","until":1763763600000}])")) << shared;
@@ -69,7 +90,7 @@ TEST_F(AskServiceTest, ARuleForOne_IsMadeWithItsEndAndPrecisionAndTaken) {
     EXPECT_TRUE(store_->grantsOf(ids_["ann"]).empty());
 }
 
-TEST_F(AskServiceTest, WhatAWishDoesNotName_StaysAsItWasAgreed) {
+TEST_P(AskServiceTest, WhatAWishDoesNotName_StaysAsItWasAgreed) {
     Grant grant{Precision::Kilometre, kNow - 500, std::nullopt};
     grant.aloud = true;
     ASSERT_TRUE(store_->grant(ids_["ann"], ids_["otto"], grant));
@@ -80,14 +101,27 @@ TEST_F(AskServiceTest, WhatAWishDoesNotName_StaysAsItWasAgreed) {
     EXPECT_TRUE(rules.front().second.aloud);
 }
 
-TEST_F(AskServiceTest, OneWhomTheServiceDoesNotHave_ChangesNothingForAnybody) {
+TEST_P(AskServiceTest, OfARuleThatIsOver_NoLeaveComesBackByItself) {
+    Grant grant{Precision::Town, kNow - 500, kNow - 100};
+    grant.aloud = grant.fences = true;
+    ASSERT_TRUE(store_->grant(ids_["ann"], ids_["otto"], grant));
+    ask("ann", "sharing", R"(,"wish":"share","with":["otto@x.example"])");
+    const auto rules = store_->grantsOf(ids_["ann"]);
+    ASSERT_EQ(rules.size(), 1U);
+    EXPECT_EQ(rules.front().second.precision, Precision::Town);
+    EXPECT_FALSE(rules.front().second.aloud);
+    EXPECT_FALSE(rules.front().second.fences);
+    EXPECT_GE(rules.front().second.from, kNow) << "nothing from before is seen";
+}
+
+TEST_P(AskServiceTest, OneWhomTheServiceDoesNotHave_ChangesNothingForAnybody) {
     const std::string answer = ask("ann", "sharing", R"(,"wish":"share","with":["otto@x.example","nobody@x.example"])");
     EXPECT_TRUE(holds(answer, "404")) << answer;
     EXPECT_TRUE(store_->grantsOf(ids_["ann"]).empty());
     EXPECT_TRUE(holds(ask("ann", "sharing", R"(,"wish":"share","with":["ann@x.example"])"), "404"));
 }
 
-TEST_F(AskServiceTest, Hiding_HoldsBeforeTheAnswerUntilOneIsShownAgain) {
+TEST_P(AskServiceTest, Hiding_HoldsBeforeTheAnswerUntilOneIsShownAgain) {
     EXPECT_TRUE(holds(ask("ann", "sharing", R"(,"wish":"hide")"), R"("hidden":true)"));
     EXPECT_TRUE(store_->person(ids_["ann"])->hidden);
     EXPECT_TRUE(holds(ask("ann", "sharing", R"(,"wish":"read")"), R"("hidden":true)"));
@@ -95,7 +129,7 @@ TEST_F(AskServiceTest, Hiding_HoldsBeforeTheAnswerUntilOneIsShownAgain) {
     EXPECT_FALSE(store_->person(ids_["ann"])->hidden);
 }
 
-TEST_F(AskServiceTest, AskingChangesNothing_AndWhatIsNoWishIsRefused) {
+TEST_P(AskServiceTest, AskingChangesNothing_AndWhatIsNoWishIsRefused) {
     ask("ann", "sharing", R"(,"wish":"read","with":["otto@x.example"])");
     EXPECT_TRUE(store_->grantsOf(ids_["ann"]).empty());
     for (const char* members :
@@ -107,7 +141,21 @@ TEST_F(AskServiceTest, AskingChangesNothing_AndWhatIsNoWishIsRefused) {
     EXPECT_TRUE(store_->grantsOf(ids_["ann"]).empty());
 }
 
-TEST_F(AskServiceTest, Places_AreTheAskersOwnAlone) {
+TEST_P(AskServiceTest, WhatCannotBeTakenBack_IsNotSaidToBe) {
+    if (GetParam()) {
+        GTEST_SKIP() << "the disk is that of a file";
+    }
+    const std::string hide = R"(,"wish":"hide","with":["otto@x.example"])";
+    EXPECT_TRUE(holds(ask("ann", "sharing", hide), " 200 ")) << "there is nothing to be ended";
+    ASSERT_TRUE(store_->grant(ids_["ann"], ids_["otto"], Grant{Precision::Exact, kNow, std::nullopt}));
+    disk_.setBroken(true);
+    EXPECT_TRUE(holds(ask("ann", "sharing", hide), " 503 "));
+    disk_.setBroken(false);
+    EXPECT_TRUE(holds(ask("ann", "sharing", hide), " 200 "));
+    EXPECT_TRUE(store_->grantsOf(ids_["ann"]).empty());
+}
+
+TEST_P(AskServiceTest, Places_AreTheAskersOwnAlone) {
     server::NamedPlace place;
     place.name = "Our house";
     place.label = "home";
