@@ -33,7 +33,9 @@ ConversationWindow::ConversationWindow(host::Host& host)
       saidTextSize_(host.settings().said.textSize) {
     setAttribute(Qt::WA_OpaquePaintEvent);
     setLayoutDirection(host.rightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
+    // The least size is the window's: with one of its own the conversation would reach under the field of a low window.
     setMinimumSize(conversation_->minimumSize());
+    conversation_->setMinimumSize(0, 0);
     if (host_.live() != nullptr) {
         addField();
     } else {

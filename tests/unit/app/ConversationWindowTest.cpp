@@ -126,7 +126,9 @@ TEST_F(KTRConversationWindowTest, EveryShape_FieldAndConversationNeverOverlap) {
             const QRect field = window->field()->geometry().adjusted(kAround, kAround, -kAround, -kAround);
             const QRect conversation = window->conversation().geometry();
             EXPECT_GT(conversation.height(), 0);
-            EXPECT_FALSE(field.intersects(conversation));
+            EXPECT_FALSE(field.intersects(conversation))
+                << shape.width() << "x" << shape.height() << ": field from " << field.y() << ", conversation to "
+                << conversation.bottom() << ", size " << static_cast<int>(size);
             EXPECT_TRUE(window->rect().contains(field));
             const bool isLow = shape.height() < 240;
             EXPECT_EQ(window->status()->isVisible(), !isLow) << shape.height();
