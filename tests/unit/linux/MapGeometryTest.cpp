@@ -43,7 +43,7 @@ std::vector<PlacedTile> tilesOf(const platform::MapPictureRequest& request, int 
     QPainter painter(&image);
     const QSize pixels(static_cast<int>(std::lround(request.viewport.size.width * request.scale)),
                        static_cast<int>(std::lround(request.viewport.size.height * request.scale)));
-    return MapTiles::of({request, painter, pixels, QRegion(QRect(QPoint(), pixels)), {}}, level);
+    return MapTiles::of({request, painter, painter, pixels, QRegion(QRect(QPoint(), pixels)), {}}, level);
 }
 
 }  // namespace

@@ -11,7 +11,9 @@ namespace ktr::linux_ {
 class PaintBudgetTest : public testing::Test {
   protected:
     PaintBudgetTest() { request.viewport.size = {400.0, 200.0}; }
-    PaintBudget budget() { return PaintBudget({request, painter, QSize(800, 400), QRegion(), stop.get_token()}); }
+    PaintBudget budget() {
+        return PaintBudget({request, painter, painter, QSize(800, 400), QRegion(), stop.get_token()});
+    }
     /// From top to bottom and back, again and again.
     static QPolygonF tangle(int points) {
         QPolygonF line;
