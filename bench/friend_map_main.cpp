@@ -46,7 +46,9 @@ void rest(int milliseconds) {
 
 void reportOne(const char* what, const char* kind, std::vector<double> times) {
     std::sort(times.begin(), times.end());
-    const auto at = [&](double share) { return times[static_cast<std::size_t>(share * (times.size() - 1))]; };
+    const auto at = [&](double share) {
+        return times[static_cast<std::size_t>(share * static_cast<double>(times.size() - 1))];
+    };
     const auto good = std::lower_bound(times.begin(), times.end(), kFrame) - times.begin();
     std::printf("%s, %s: %.1f %% of %zu frames under %.0f ms; p50 %.1f ms, p95 %.1f ms, p99 %.1f ms\n", what, kind,
                 100.0 * static_cast<double>(good) / static_cast<double>(times.size()), times.size(), kFrame, at(0.5),
