@@ -576,5 +576,455 @@
         <extracomment>The way back from a page, spoken</extracomment>
         <translation>رجوع</translation>
     </message>
+    <message>
+        <source>SETTINGS</source>
+        <extracomment>The name of the page with the user’s settings, and spoken of the button that opens it. English: “Settings”</extracomment>
+        <translation>الإعدادات</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SIGN_OUT</source>
+        <extracomment>A button on that page. English: “Sign out”</extracomment>
+        <translation>تسجيل الخروج</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SHARING</source>
+        <extracomment>The name of a section of that page. English: “Sharing”</extracomment>
+        <translation>المشاركة</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WHO</source>
+        <extracomment>Leads to the service’s own page in a browser. English: “Who sees what”</extracomment>
+        <translation>من يرى ماذا</translation>
+    </message>
+    <message>
+        <source>SETTINGS_READING</source>
+        <extracomment>The name of a section. English: “Reading”</extracomment>
+        <translation>القراءة</translation>
+    </message>
+    <message>
+        <source>SETTINGS_TEXT_SIZE</source>
+        <extracomment>A setting; its value is one of the sizes below. English: “Text size”</extracomment>
+        <translation>حجم النص</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SMALLER</source>
+        <extracomment>Spoken: a button beside it. English: “Smaller text”</extracomment>
+        <translation>نص أصغر</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LARGER</source>
+        <extracomment>Spoken: a button beside it. English: “Larger text”</extracomment>
+        <translation>نص أكبر</translation>
+    </message>
+    <message>
+        <source>SIZE_XS</source>
+        <extracomment>A text size. English: “Smallest”</extracomment>
+        <translation>الأصغر</translation>
+    </message>
+    <message>
+        <source>SIZE_S</source>
+        <extracomment>A text size. English: “Smaller”</extracomment>
+        <translation>أصغر</translation>
+    </message>
+    <message>
+        <source>SIZE_M</source>
+        <extracomment>A text size. English: “Small”</extracomment>
+        <translation>صغير</translation>
+    </message>
+    <message>
+        <source>SIZE_L</source>
+        <extracomment>A text size. English: “Standard”</extracomment>
+        <translation>عادي</translation>
+    </message>
+    <message>
+        <source>SIZE_XL</source>
+        <extracomment>A text size. English: “Large”</extracomment>
+        <translation>كبير</translation>
+    </message>
+    <message>
+        <source>SIZE_XXL</source>
+        <extracomment>A text size. English: “Larger”</extracomment>
+        <translation>أكبر</translation>
+    </message>
+    <message>
+        <source>SIZE_XXXL</source>
+        <extracomment>A text size. English: “Largest”</extracomment>
+        <translation>الأكبر</translation>
+    </message>
+    <message>
+        <source>SIZE_AX</source>
+        <extracomment>A text size beyond the largest; %@ is a number from 1 to 5. English: “Very large %@”</extracomment>
+        <translation>كبير جدًا %@</translation>
+    </message>
+    <message>
+        <source>SETTINGS_COLORS</source>
+        <extracomment>A setting; its value is one of the following. English: “Colours”</extracomment>
+        <translation>الألوان</translation>
+    </message>
+    <message>
+        <source>SETTINGS_AS_SYSTEM</source>
+        <extracomment>The value of a setting that follows the desktop. English: “As the system”</extracomment>
+        <translation>مثل النظام</translation>
+    </message>
+    <message>
+        <source>COLORS_LIGHT</source>
+        <extracomment>Of the colours. English: “Light”</extracomment>
+        <translation>فاتح</translation>
+    </message>
+    <message>
+        <source>COLORS_DARK</source>
+        <extracomment>Of the colours. English: “Dark”</extracomment>
+        <translation>داكن</translation>
+    </message>
+    <message>
+        <source>COLORS_HIGH</source>
+        <extracomment>Of the colours. English: “High contrast”</extracomment>
+        <translation>تباين عالٍ</translation>
+    </message>
+    <message>
+        <source>SETTINGS_DISTANCES</source>
+        <extracomment>A setting; its value is one of the following. English: “Distances”</extracomment>
+        <translation>المسافات</translation>
+    </message>
+    <message>
+        <source>DISTANCES_METRIC</source>
+        <extracomment>Of the distances. English: “Kilometres”</extracomment>
+        <translation>كيلومترات</translation>
+    </message>
+    <message>
+        <source>DISTANCES_MILES</source>
+        <extracomment>Of the distances. English: “Miles”</extracomment>
+        <translation>أميال</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LANGUAGE</source>
+        <extracomment>A setting; its value is the name of a language. English: “Language”</extracomment>
+        <translation>اللغة</translation>
+    </message>
+    <message>
+        <source>SETTINGS_CONTACTS</source>
+        <extracomment>The name of a section: what this computer adds to answers. English: “Contacts and position”</extracomment>
+        <translation>جهات الاتصال والموقع</translation>
+    </message>
+    <message>
+        <source>SETTINGS_BOOKS</source>
+        <extracomment>A switch: the desktop’s address books. English: “Address books”</extracomment>
+        <translation>دفاتر العناوين</translation>
+    </message>
+    <message>
+        <source>SETTINGS_BOOKS_LINE</source>
+        <extracomment>Under that switch. English: “Names and faces come from them.”</extracomment>
+        <translation>منها تأتي الأسماء والصور.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_POSITION</source>
+        <extracomment>A switch: where the user’s computer is. English: “My position”</extracomment>
+        <translation>موقعي</translation>
+    </message>
+    <message>
+        <source>SETTINGS_POSITION_LINE</source>
+        <extracomment>Under that switch. English: “Distances are counted from it.”</extracomment>
+        <translation>منه تُحسب المسافات.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_MAPS</source>
+        <extracomment>The name of a section. English: “Maps”</extracomment>
+        <translation>الخرائط</translation>
+    </message>
+    <message>
+        <source>MAPS_WORLD</source>
+        <extracomment>A map that is always there. English: “The world”</extracomment>
+        <translation>العالم</translation>
+    </message>
+    <message>
+        <source>MAPS_WORLD_LINE</source>
+        <extracomment>Under its name. English: “Towns, borders and large roads”</extracomment>
+        <translation>مدن وحدود وطرق كبيرة</translation>
+    </message>
+    <message>
+        <source>MAPS_STREETS</source>
+        <extracomment>Under the name of a map with streets; %@ is the size of its file, such as “12 MB”. English: “Streets, %@”</extracomment>
+        <translation>شوارع، %@</translation>
+    </message>
+    <message>
+        <source>MAPS_ADD</source>
+        <extracomment>Opens a dialog that chooses a file with a map. English: “Add a region”</extracomment>
+        <translation>إضافة منطقة</translation>
+    </message>
+    <message>
+        <source>MAPS_REMOVE</source>
+        <extracomment>A button: the map is not drawn any more. English: “Remove this map”</extracomment>
+        <translation>إزالة هذه الخريطة</translation>
+    </message>
+    <message>
+        <source>MAPS_REFUSED</source>
+        <extracomment>Said when a chosen file is no map. English: “This file isn’t a map that can be drawn.”</extracomment>
+        <translation>هذا الملف ليس خريطة يمكن رسمها.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_HELP</source>
+        <extracomment>The name of a section. English: “Help”</extracomment>
+        <translation>مساعدة</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SET_FOR_YOU</source>
+        <extracomment>Under a setting that an administrator or the command line holds. English: “Set for you”</extracomment>
+        <translation>مضبوط لك</translation>
+    </message>
+    <message>
+        <source>STATUS_TRY_NOW</source>
+        <extracomment>A button at the end of the status line while the service cannot be reached. English: “Try now”</extracomment>
+        <translation>حاول الآن</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS_SHARE</source>
+        <extracomment>On the page with the list of friends: a section with those who let the user see where they are. English: “They share with you”</extracomment>
+        <translation>يشاركونك</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_HAVE_LINK</source>
+        <extracomment>A button on the page for signing in: asks for a link instead. English: “I have a link”</extracomment>
+        <translation>لدي رابط</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_USE_SECRET</source>
+        <extracomment>A button there: asks for address, person and secret again. English: “Use address and secret”</extracomment>
+        <translation>استخدام العنوان وكلمة السر</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK</source>
+        <extracomment>Label of a field: a link that signs in. English: “Link”</extracomment>
+        <translation>الرابط</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK_LINE</source>
+        <extracomment>Below the title, above that field. English: “Paste the link you were given. It works once.”</extracomment>
+        <translation>ألصق الرابط الذي أُعطيته. يعمل مرة واحدة.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK_SPENT</source>
+        <extracomment>Below the link; the service does not tell which of the two it is. English: “This link was used, or is too old. Ask for a new one.”</extracomment>
+        <translation>استُخدم هذا الرابط أو قَدُم. اطلب رابطًا جديدًا.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_BAD_LINK</source>
+        <extracomment>Below the link. English: “This isn’t a link for signing in.”</extracomment>
+        <translation>هذا ليس رابطًا لتسجيل الدخول.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_ALREADY</source>
+        <extracomment>Said when a link that signs in comes while somebody is signed in. English: “You are signed in. Sign out first to use this link.”</extracomment>
+        <translation>سبق أن سجّلت الدخول. سجّل الخروج أولًا لاستخدام هذا الرابط.</translation>
+    </message>
+    <message>
+        <source>CHECK_UP</source>
+        <extracomment>The name of the page that says what is wrong and what mends it. English: “Check-up”</extracomment>
+        <translation>الفحص</translation>
+    </message>
+    <message>
+        <source>CHECK_WELL</source>
+        <extracomment>Title of that page when nothing is wrong. English: “All is well.”</extracomment>
+        <translation>كل شيء على ما يرام.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOW</source>
+        <extracomment>Below that title. English: “Checked just now.”</extracomment>
+        <translation>فُحص للتو.</translation>
+    </message>
+    <message>
+        <source>CHECK_REST</source>
+        <extracomment>Below the title when something is wrong. English: “Everything else is fine. Checked just now.”</extracomment>
+        <translation>كل ما عدا ذلك سليم. فُحص للتو.</translation>
+    </message>
+    <message>
+        <source>CHECK_HANDS</source>
+        <extracomment>Title when something is wrong; %@ is how many things. English: “{0, plural, one{One thing needs a hand.} other{%@ things need a hand.}}”</extracomment>
+        <translation>{0, plural, one{أمر واحد يحتاج إلى يد.} two{أمران يحتاجان إلى يد.} few{%@ أمور تحتاج إلى يد.} many{%@ أمرًا يحتاج إلى يد.} other{%@ أمر يحتاج إلى يد.}}</translation>
+    </message>
+    <message>
+        <source>CHECK_FINE</source>
+        <extracomment>The name of the section with what is in order. English: “Fine”</extracomment>
+        <translation>سليم</translation>
+    </message>
+    <message>
+        <source>CHECK_AGAIN</source>
+        <extracomment>A button. English: “Check again”</extracomment>
+        <translation>الفحص من جديد</translation>
+    </message>
+    <message>
+        <source>CHECK_REPORT</source>
+        <extracomment>A button. English: “Copy report”</extracomment>
+        <translation>نسخ التقرير</translation>
+    </message>
+    <message>
+        <source>CHECK_COMMAND</source>
+        <extracomment>A button: puts the command that mends a thing into the clipboard, for a terminal. English: “Copy the command”</extracomment>
+        <translation>نسخ الأمر</translation>
+    </message>
+    <message>
+        <source>CHECK_SIGN_IN_AGAIN</source>
+        <extracomment>A button. English: “Sign in again”</extracomment>
+        <translation>تسجيل الدخول من جديد</translation>
+    </message>
+    <message>
+        <source>CHECK_SET_CLOCK</source>
+        <extracomment>A button. English: “Set the clock”</extracomment>
+        <translation>ضبط الساعة</translation>
+    </message>
+    <message>
+        <source>CHECK_ASK_AGAIN</source>
+        <extracomment>A button: asks the address book again. English: “Ask it again”</extracomment>
+        <translation>اسأله من جديد</translation>
+    </message>
+    <message>
+        <source>CHECK_ACCOUNT</source>
+        <extracomment>A thing that is fine. English: “Account”</extracomment>
+        <translation>الحساب</translation>
+    </message>
+    <message>
+        <source>CHECK_SERVICE</source>
+        <extracomment>A thing that is fine. English: “Service”</extracomment>
+        <translation>الخدمة</translation>
+    </message>
+    <message>
+        <source>CHECK_CLOCK</source>
+        <extracomment>A thing that is fine. English: “Clock”</extracomment>
+        <translation>الساعة</translation>
+    </message>
+    <message>
+        <source>CHECK_CONTACTS</source>
+        <extracomment>A thing that is fine: files with contacts. English: “Contacts”</extracomment>
+        <translation>جهات الاتصال</translation>
+    </message>
+    <message>
+        <source>CHECK_LETTERS</source>
+        <extracomment>A thing that is fine: fonts for all scripts. English: “Letters”</extracomment>
+        <translation>الحروف</translation>
+    </message>
+    <message>
+        <source>CHECK_READER</source>
+        <extracomment>A thing that is fine. English: “Screen reader”</extracomment>
+        <translation>قارئ الشاشة</translation>
+    </message>
+    <message>
+        <source>CHECK_DESKTOP</source>
+        <extracomment>A thing that is fine: what the desktop offers to programs. English: “Desktop”</extracomment>
+        <translation>سطح المكتب</translation>
+    </message>
+    <message>
+        <source>CHECK_NOBODY</source>
+        <extracomment>A thing that is wrong. English: “Nobody is signed in.”</extracomment>
+        <translation>لم يسجل أحد الدخول.</translation>
+    </message>
+    <message>
+        <source>CHECK_LOCKED</source>
+        <extracomment>A thing that is wrong. English: “The keyring is locked.”</extracomment>
+        <translation>حلقة المفاتيح مقفلة.</translation>
+    </message>
+    <message>
+        <source>CHECK_LOCKED_LINE</source>
+        <extracomment>Its cause. English: “Your secret can’t be read, so nobody is asked until it is open.”</extracomment>
+        <translation>لا يمكن قراءة كلمة سرك، فلا يُسأل أحد حتى تُفتح.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNREACHABLE</source>
+        <extracomment>A thing that is wrong. English: “The service can’t be reached.”</extracomment>
+        <translation>لا يمكن الوصول إلى الخدمة.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNREACHABLE_LINE</source>
+        <extracomment>Its cause; %@ is an address. English: “Nothing answers at %@.”</extracomment>
+        <translation>لا أحد يجيب في %@.</translation>
+    </message>
+    <message>
+        <source>CHECK_REDIRECT_LINE</source>
+        <extracomment>Another cause. English: “An address is remembered that isn’t your service’s.”</extracomment>
+        <translation>يُحفظ عنوان ليس لخدمتك.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNKNOWN</source>
+        <extracomment>A thing that is wrong. English: “The service doesn’t know you any more.”</extracomment>
+        <translation>لم تعد الخدمة تعرفك.</translation>
+    </message>
+    <message>
+        <source>CHECK_CLOCKS</source>
+        <extracomment>A thing that is wrong. English: “The clocks disagree.”</extracomment>
+        <translation>الساعات لا تتفق.</translation>
+    </message>
+    <message>
+        <source>CHECK_AHEAD</source>
+        <extracomment>Its cause; %@ is a number of minutes. English: “This computer is %@ min ahead of the service, so ages are wrong.”</extracomment>
+        <translation>هذا الحاسوب يسبق الخدمة بـ %@ د، فالأعمار خاطئة.</translation>
+    </message>
+    <message>
+        <source>CHECK_BEHIND</source>
+        <extracomment>Its cause; %@ is a number of minutes. English: “This computer is %@ min behind the service, so ages are wrong.”</extracomment>
+        <translation>هذا الحاسوب يتأخر عن الخدمة بـ %@ د، فالأعمار خاطئة.</translation>
+    </message>
+    <message>
+        <source>CHECK_BOOKS_SILENT</source>
+        <extracomment>A thing that is wrong. English: “Your address book is silent.”</extracomment>
+        <translation>دفتر عناوينك صامت.</translation>
+    </message>
+    <message>
+        <source>CHECK_BOOKS_LINE</source>
+        <extracomment>Its cause. English: “It hasn’t answered. Names come from the service for now.”</extracomment>
+        <translation>لم يُجب. الأسماء تأتي من الخدمة حاليًا.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_CONTACTS</source>
+        <extracomment>A thing that is wrong. English: “Your contacts can’t be read.”</extracomment>
+        <translation>لا يمكن قراءة جهات اتصالك.</translation>
+    </message>
+    <message>
+        <source>CHECK_FILE_LINE</source>
+        <extracomment>A cause: of contacts, of a map, of the settings. English: “A file is missing or broken.”</extracomment>
+        <translation>ملف مفقود أو تالف.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOWHERE</source>
+        <extracomment>A thing that is wrong. English: “Nobody knows where you are.”</extracomment>
+        <translation>لا أحد يعرف أين أنت.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOWHERE_LINE</source>
+        <extracomment>Its cause. English: “This computer has no position, so there are no distances.”</extracomment>
+        <translation>لا موقع لهذا الحاسوب، فلا مسافات.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_MAP</source>
+        <extracomment>A thing that is wrong. English: “A map can’t be drawn.”</extracomment>
+        <translation>خريطة لا يمكن رسمها.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_LETTERS</source>
+        <extracomment>A thing that is wrong. English: “Letters are missing.”</extracomment>
+        <translation>حروف ناقصة.</translation>
+    </message>
+    <message>
+        <source>CHECK_LETTERS_LINE</source>
+        <extracomment>Its cause. English: “Some names show as boxes.”</extracomment>
+        <translation>تظهر بعض الأسماء مربعات.</translation>
+    </message>
+    <message>
+        <source>CHECK_DEAF</source>
+        <extracomment>A thing that is wrong. English: “Screen readers can’t listen.”</extracomment>
+        <translation>لا تستطيع قارئات الشاشة الاستماع.</translation>
+    </message>
+    <message>
+        <source>CHECK_DEAF_LINE</source>
+        <extracomment>Its cause. English: “What joins them to programs doesn’t answer.”</extracomment>
+        <translation>ما يصلها بالبرامج لا يجيب.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_DESKTOP</source>
+        <extracomment>A thing that is wrong. English: “The desktop doesn’t answer.”</extracomment>
+        <translation>سطح المكتب لا يجيب.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_DESKTOP_LINE</source>
+        <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
+        <translation>لا تُتبع ألوانه وتباينه، وقد لا تُفتح الروابط.</translation>
+    </message>
 </context>
 </TS>

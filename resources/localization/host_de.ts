@@ -576,5 +576,455 @@
         <extracomment>The way back from a page, spoken</extracomment>
         <translation>Zurück</translation>
     </message>
+    <message>
+        <source>SETTINGS</source>
+        <extracomment>The name of the page with the user’s settings, and spoken of the button that opens it. English: “Settings”</extracomment>
+        <translation>Einstellungen</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SIGN_OUT</source>
+        <extracomment>A button on that page. English: “Sign out”</extracomment>
+        <translation>Abmelden</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SHARING</source>
+        <extracomment>The name of a section of that page. English: “Sharing”</extracomment>
+        <translation>Teilen</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WHO</source>
+        <extracomment>Leads to the service’s own page in a browser. English: “Who sees what”</extracomment>
+        <translation>Wer was sieht</translation>
+    </message>
+    <message>
+        <source>SETTINGS_READING</source>
+        <extracomment>The name of a section. English: “Reading”</extracomment>
+        <translation>Lesen</translation>
+    </message>
+    <message>
+        <source>SETTINGS_TEXT_SIZE</source>
+        <extracomment>A setting; its value is one of the sizes below. English: “Text size”</extracomment>
+        <translation>Textgröße</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SMALLER</source>
+        <extracomment>Spoken: a button beside it. English: “Smaller text”</extracomment>
+        <translation>Kleinerer Text</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LARGER</source>
+        <extracomment>Spoken: a button beside it. English: “Larger text”</extracomment>
+        <translation>Größerer Text</translation>
+    </message>
+    <message>
+        <source>SIZE_XS</source>
+        <extracomment>A text size. English: “Smallest”</extracomment>
+        <translation>Am kleinsten</translation>
+    </message>
+    <message>
+        <source>SIZE_S</source>
+        <extracomment>A text size. English: “Smaller”</extracomment>
+        <translation>Kleiner</translation>
+    </message>
+    <message>
+        <source>SIZE_M</source>
+        <extracomment>A text size. English: “Small”</extracomment>
+        <translation>Klein</translation>
+    </message>
+    <message>
+        <source>SIZE_L</source>
+        <extracomment>A text size. English: “Standard”</extracomment>
+        <translation>Standard</translation>
+    </message>
+    <message>
+        <source>SIZE_XL</source>
+        <extracomment>A text size. English: “Large”</extracomment>
+        <translation>Groß</translation>
+    </message>
+    <message>
+        <source>SIZE_XXL</source>
+        <extracomment>A text size. English: “Larger”</extracomment>
+        <translation>Größer</translation>
+    </message>
+    <message>
+        <source>SIZE_XXXL</source>
+        <extracomment>A text size. English: “Largest”</extracomment>
+        <translation>Am größten</translation>
+    </message>
+    <message>
+        <source>SIZE_AX</source>
+        <extracomment>A text size beyond the largest; %@ is a number from 1 to 5. English: “Very large %@”</extracomment>
+        <translation>Sehr groß %@</translation>
+    </message>
+    <message>
+        <source>SETTINGS_COLORS</source>
+        <extracomment>A setting; its value is one of the following. English: “Colours”</extracomment>
+        <translation>Farben</translation>
+    </message>
+    <message>
+        <source>SETTINGS_AS_SYSTEM</source>
+        <extracomment>The value of a setting that follows the desktop. English: “As the system”</extracomment>
+        <translation>Wie das System</translation>
+    </message>
+    <message>
+        <source>COLORS_LIGHT</source>
+        <extracomment>Of the colours. English: “Light”</extracomment>
+        <translation>Hell</translation>
+    </message>
+    <message>
+        <source>COLORS_DARK</source>
+        <extracomment>Of the colours. English: “Dark”</extracomment>
+        <translation>Dunkel</translation>
+    </message>
+    <message>
+        <source>COLORS_HIGH</source>
+        <extracomment>Of the colours. English: “High contrast”</extracomment>
+        <translation>Hoher Kontrast</translation>
+    </message>
+    <message>
+        <source>SETTINGS_DISTANCES</source>
+        <extracomment>A setting; its value is one of the following. English: “Distances”</extracomment>
+        <translation>Entfernungen</translation>
+    </message>
+    <message>
+        <source>DISTANCES_METRIC</source>
+        <extracomment>Of the distances. English: “Kilometres”</extracomment>
+        <translation>Kilometer</translation>
+    </message>
+    <message>
+        <source>DISTANCES_MILES</source>
+        <extracomment>Of the distances. English: “Miles”</extracomment>
+        <translation>Meilen</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LANGUAGE</source>
+        <extracomment>A setting; its value is the name of a language. English: “Language”</extracomment>
+        <translation>Sprache</translation>
+    </message>
+    <message>
+        <source>SETTINGS_CONTACTS</source>
+        <extracomment>The name of a section: what this computer adds to answers. English: “Contacts and position”</extracomment>
+        <translation>Kontakte und Standort</translation>
+    </message>
+    <message>
+        <source>SETTINGS_BOOKS</source>
+        <extracomment>A switch: the desktop’s address books. English: “Address books”</extracomment>
+        <translation>Adressbücher</translation>
+    </message>
+    <message>
+        <source>SETTINGS_BOOKS_LINE</source>
+        <extracomment>Under that switch. English: “Names and faces come from them.”</extracomment>
+        <translation>Namen und Gesichter kommen daraus.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_POSITION</source>
+        <extracomment>A switch: where the user’s computer is. English: “My position”</extracomment>
+        <translation>Mein Standort</translation>
+    </message>
+    <message>
+        <source>SETTINGS_POSITION_LINE</source>
+        <extracomment>Under that switch. English: “Distances are counted from it.”</extracomment>
+        <translation>Von dort zählen die Entfernungen.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_MAPS</source>
+        <extracomment>The name of a section. English: “Maps”</extracomment>
+        <translation>Karten</translation>
+    </message>
+    <message>
+        <source>MAPS_WORLD</source>
+        <extracomment>A map that is always there. English: “The world”</extracomment>
+        <translation>Die Welt</translation>
+    </message>
+    <message>
+        <source>MAPS_WORLD_LINE</source>
+        <extracomment>Under its name. English: “Towns, borders and large roads”</extracomment>
+        <translation>Orte, Grenzen und große Straßen</translation>
+    </message>
+    <message>
+        <source>MAPS_STREETS</source>
+        <extracomment>Under the name of a map with streets; %@ is the size of its file, such as “12 MB”. English: “Streets, %@”</extracomment>
+        <translation>Straßen, %@</translation>
+    </message>
+    <message>
+        <source>MAPS_ADD</source>
+        <extracomment>Opens a dialog that chooses a file with a map. English: “Add a region”</extracomment>
+        <translation>Gegend hinzufügen</translation>
+    </message>
+    <message>
+        <source>MAPS_REMOVE</source>
+        <extracomment>A button: the map is not drawn any more. English: “Remove this map”</extracomment>
+        <translation>Diese Karte entfernen</translation>
+    </message>
+    <message>
+        <source>MAPS_REFUSED</source>
+        <extracomment>Said when a chosen file is no map. English: “This file isn’t a map that can be drawn.”</extracomment>
+        <translation>Diese Datei ist keine Karte, die gezeichnet werden kann.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_HELP</source>
+        <extracomment>The name of a section. English: “Help”</extracomment>
+        <translation>Hilfe</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SET_FOR_YOU</source>
+        <extracomment>Under a setting that an administrator or the command line holds. English: “Set for you”</extracomment>
+        <translation>Für dich festgelegt</translation>
+    </message>
+    <message>
+        <source>STATUS_TRY_NOW</source>
+        <extracomment>A button at the end of the status line while the service cannot be reached. English: “Try now”</extracomment>
+        <translation>Jetzt versuchen</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS_SHARE</source>
+        <extracomment>On the page with the list of friends: a section with those who let the user see where they are. English: “They share with you”</extracomment>
+        <translation>Sie teilen mit dir</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_HAVE_LINK</source>
+        <extracomment>A button on the page for signing in: asks for a link instead. English: “I have a link”</extracomment>
+        <translation>Ich habe einen Link</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_USE_SECRET</source>
+        <extracomment>A button there: asks for address, person and secret again. English: “Use address and secret”</extracomment>
+        <translation>Adresse und Geheimnis verwenden</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK</source>
+        <extracomment>Label of a field: a link that signs in. English: “Link”</extracomment>
+        <translation>Link</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK_LINE</source>
+        <extracomment>Below the title, above that field. English: “Paste the link you were given. It works once.”</extracomment>
+        <translation>Füge den Link ein, den du bekommen hast. Er gilt einmal.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK_SPENT</source>
+        <extracomment>Below the link; the service does not tell which of the two it is. English: “This link was used, or is too old. Ask for a new one.”</extracomment>
+        <translation>Dieser Link wurde benutzt oder ist zu alt. Bitte um einen neuen.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_BAD_LINK</source>
+        <extracomment>Below the link. English: “This isn’t a link for signing in.”</extracomment>
+        <translation>Das ist kein Link zum Anmelden.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_ALREADY</source>
+        <extracomment>Said when a link that signs in comes while somebody is signed in. English: “You are signed in. Sign out first to use this link.”</extracomment>
+        <translation>Du bist angemeldet. Melde dich erst ab, um diesen Link zu benutzen.</translation>
+    </message>
+    <message>
+        <source>CHECK_UP</source>
+        <extracomment>The name of the page that says what is wrong and what mends it. English: “Check-up”</extracomment>
+        <translation>Prüfung</translation>
+    </message>
+    <message>
+        <source>CHECK_WELL</source>
+        <extracomment>Title of that page when nothing is wrong. English: “All is well.”</extracomment>
+        <translation>Alles ist in Ordnung.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOW</source>
+        <extracomment>Below that title. English: “Checked just now.”</extracomment>
+        <translation>Gerade eben geprüft.</translation>
+    </message>
+    <message>
+        <source>CHECK_REST</source>
+        <extracomment>Below the title when something is wrong. English: “Everything else is fine. Checked just now.”</extracomment>
+        <translation>Alles andere ist in Ordnung. Gerade eben geprüft.</translation>
+    </message>
+    <message>
+        <source>CHECK_HANDS</source>
+        <extracomment>Title when something is wrong; %@ is how many things. English: “{0, plural, one{One thing needs a hand.} other{%@ things need a hand.}}”</extracomment>
+        <translation>{0, plural, one{Eine Sache braucht Hilfe.} other{%@ Dinge brauchen Hilfe.}}</translation>
+    </message>
+    <message>
+        <source>CHECK_FINE</source>
+        <extracomment>The name of the section with what is in order. English: “Fine”</extracomment>
+        <translation>In Ordnung</translation>
+    </message>
+    <message>
+        <source>CHECK_AGAIN</source>
+        <extracomment>A button. English: “Check again”</extracomment>
+        <translation>Noch einmal prüfen</translation>
+    </message>
+    <message>
+        <source>CHECK_REPORT</source>
+        <extracomment>A button. English: “Copy report”</extracomment>
+        <translation>Bericht kopieren</translation>
+    </message>
+    <message>
+        <source>CHECK_COMMAND</source>
+        <extracomment>A button: puts the command that mends a thing into the clipboard, for a terminal. English: “Copy the command”</extracomment>
+        <translation>Befehl kopieren</translation>
+    </message>
+    <message>
+        <source>CHECK_SIGN_IN_AGAIN</source>
+        <extracomment>A button. English: “Sign in again”</extracomment>
+        <translation>Wieder anmelden</translation>
+    </message>
+    <message>
+        <source>CHECK_SET_CLOCK</source>
+        <extracomment>A button. English: “Set the clock”</extracomment>
+        <translation>Uhr stellen</translation>
+    </message>
+    <message>
+        <source>CHECK_ASK_AGAIN</source>
+        <extracomment>A button: asks the address book again. English: “Ask it again”</extracomment>
+        <translation>Noch einmal fragen</translation>
+    </message>
+    <message>
+        <source>CHECK_ACCOUNT</source>
+        <extracomment>A thing that is fine. English: “Account”</extracomment>
+        <translation>Konto</translation>
+    </message>
+    <message>
+        <source>CHECK_SERVICE</source>
+        <extracomment>A thing that is fine. English: “Service”</extracomment>
+        <translation>Dienst</translation>
+    </message>
+    <message>
+        <source>CHECK_CLOCK</source>
+        <extracomment>A thing that is fine. English: “Clock”</extracomment>
+        <translation>Uhr</translation>
+    </message>
+    <message>
+        <source>CHECK_CONTACTS</source>
+        <extracomment>A thing that is fine: files with contacts. English: “Contacts”</extracomment>
+        <translation>Kontakte</translation>
+    </message>
+    <message>
+        <source>CHECK_LETTERS</source>
+        <extracomment>A thing that is fine: fonts for all scripts. English: “Letters”</extracomment>
+        <translation>Schriften</translation>
+    </message>
+    <message>
+        <source>CHECK_READER</source>
+        <extracomment>A thing that is fine. English: “Screen reader”</extracomment>
+        <translation>Bildschirmleser</translation>
+    </message>
+    <message>
+        <source>CHECK_DESKTOP</source>
+        <extracomment>A thing that is fine: what the desktop offers to programs. English: “Desktop”</extracomment>
+        <translation>Desktop</translation>
+    </message>
+    <message>
+        <source>CHECK_NOBODY</source>
+        <extracomment>A thing that is wrong. English: “Nobody is signed in.”</extracomment>
+        <translation>Niemand ist angemeldet.</translation>
+    </message>
+    <message>
+        <source>CHECK_LOCKED</source>
+        <extracomment>A thing that is wrong. English: “The keyring is locked.”</extracomment>
+        <translation>Der Schlüsselbund ist gesperrt.</translation>
+    </message>
+    <message>
+        <source>CHECK_LOCKED_LINE</source>
+        <extracomment>Its cause. English: “Your secret can’t be read, so nobody is asked until it is open.”</extracomment>
+        <translation>Dein Geheimnis kann nicht gelesen werden. Bis er offen ist, wird niemand gefragt.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNREACHABLE</source>
+        <extracomment>A thing that is wrong. English: “The service can’t be reached.”</extracomment>
+        <translation>Der Dienst ist nicht erreichbar.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNREACHABLE_LINE</source>
+        <extracomment>Its cause; %@ is an address. English: “Nothing answers at %@.”</extracomment>
+        <translation>Unter %@ antwortet nichts.</translation>
+    </message>
+    <message>
+        <source>CHECK_REDIRECT_LINE</source>
+        <extracomment>Another cause. English: “An address is remembered that isn’t your service’s.”</extracomment>
+        <translation>Gemerkt ist eine Adresse, die nicht zu deinem Dienst gehört.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNKNOWN</source>
+        <extracomment>A thing that is wrong. English: “The service doesn’t know you any more.”</extracomment>
+        <translation>Der Dienst kennt dich nicht mehr.</translation>
+    </message>
+    <message>
+        <source>CHECK_CLOCKS</source>
+        <extracomment>A thing that is wrong. English: “The clocks disagree.”</extracomment>
+        <translation>Die Uhren gehen verschieden.</translation>
+    </message>
+    <message>
+        <source>CHECK_AHEAD</source>
+        <extracomment>Its cause; %@ is a number of minutes. English: “This computer is %@ min ahead of the service, so ages are wrong.”</extracomment>
+        <translation>Dieser Computer geht dem Dienst %@ Min. vor, daher stimmen Altersangaben nicht.</translation>
+    </message>
+    <message>
+        <source>CHECK_BEHIND</source>
+        <extracomment>Its cause; %@ is a number of minutes. English: “This computer is %@ min behind the service, so ages are wrong.”</extracomment>
+        <translation>Dieser Computer geht dem Dienst %@ Min. nach, daher stimmen Altersangaben nicht.</translation>
+    </message>
+    <message>
+        <source>CHECK_BOOKS_SILENT</source>
+        <extracomment>A thing that is wrong. English: “Your address book is silent.”</extracomment>
+        <translation>Dein Adressbuch schweigt.</translation>
+    </message>
+    <message>
+        <source>CHECK_BOOKS_LINE</source>
+        <extracomment>Its cause. English: “It hasn’t answered. Names come from the service for now.”</extracomment>
+        <translation>Es hat nicht geantwortet. Namen kommen vorerst vom Dienst.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_CONTACTS</source>
+        <extracomment>A thing that is wrong. English: “Your contacts can’t be read.”</extracomment>
+        <translation>Deine Kontakte können nicht gelesen werden.</translation>
+    </message>
+    <message>
+        <source>CHECK_FILE_LINE</source>
+        <extracomment>A cause: of contacts, of a map, of the settings. English: “A file is missing or broken.”</extracomment>
+        <translation>Eine Datei fehlt oder ist beschädigt.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOWHERE</source>
+        <extracomment>A thing that is wrong. English: “Nobody knows where you are.”</extracomment>
+        <translation>Niemand weiß, wo du bist.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOWHERE_LINE</source>
+        <extracomment>Its cause. English: “This computer has no position, so there are no distances.”</extracomment>
+        <translation>Dieser Computer hat keinen Standort, daher gibt es keine Entfernungen.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_MAP</source>
+        <extracomment>A thing that is wrong. English: “A map can’t be drawn.”</extracomment>
+        <translation>Eine Karte kann nicht gezeichnet werden.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_LETTERS</source>
+        <extracomment>A thing that is wrong. English: “Letters are missing.”</extracomment>
+        <translation>Es fehlen Schriften.</translation>
+    </message>
+    <message>
+        <source>CHECK_LETTERS_LINE</source>
+        <extracomment>Its cause. English: “Some names show as boxes.”</extracomment>
+        <translation>Manche Namen erscheinen als Kästchen.</translation>
+    </message>
+    <message>
+        <source>CHECK_DEAF</source>
+        <extracomment>A thing that is wrong. English: “Screen readers can’t listen.”</extracomment>
+        <translation>Bildschirmleser können nicht zuhören.</translation>
+    </message>
+    <message>
+        <source>CHECK_DEAF_LINE</source>
+        <extracomment>Its cause. English: “What joins them to programs doesn’t answer.”</extracomment>
+        <translation>Was sie mit Programmen verbindet, antwortet nicht.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_DESKTOP</source>
+        <extracomment>A thing that is wrong. English: “The desktop doesn’t answer.”</extracomment>
+        <translation>Der Desktop antwortet nicht.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_DESKTOP_LINE</source>
+        <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
+        <translation>Seinen Farben und seinem Kontrast wird nicht gefolgt, und Links öffnen sich vielleicht nicht.</translation>
+    </message>
 </context>
 </TS>

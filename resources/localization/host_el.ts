@@ -576,5 +576,455 @@
         <extracomment>The way back from a page, spoken</extracomment>
         <translation>Πίσω</translation>
     </message>
+    <message>
+        <source>SETTINGS</source>
+        <extracomment>The name of the page with the user’s settings, and spoken of the button that opens it. English: “Settings”</extracomment>
+        <translation>Ρυθμίσεις</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SIGN_OUT</source>
+        <extracomment>A button on that page. English: “Sign out”</extracomment>
+        <translation>Αποσύνδεση</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SHARING</source>
+        <extracomment>The name of a section of that page. English: “Sharing”</extracomment>
+        <translation>Κοινή χρήση</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WHO</source>
+        <extracomment>Leads to the service’s own page in a browser. English: “Who sees what”</extracomment>
+        <translation>Ποιος βλέπει τι</translation>
+    </message>
+    <message>
+        <source>SETTINGS_READING</source>
+        <extracomment>The name of a section. English: “Reading”</extracomment>
+        <translation>Ανάγνωση</translation>
+    </message>
+    <message>
+        <source>SETTINGS_TEXT_SIZE</source>
+        <extracomment>A setting; its value is one of the sizes below. English: “Text size”</extracomment>
+        <translation>Μέγεθος κειμένου</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SMALLER</source>
+        <extracomment>Spoken: a button beside it. English: “Smaller text”</extracomment>
+        <translation>Μικρότερο κείμενο</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LARGER</source>
+        <extracomment>Spoken: a button beside it. English: “Larger text”</extracomment>
+        <translation>Μεγαλύτερο κείμενο</translation>
+    </message>
+    <message>
+        <source>SIZE_XS</source>
+        <extracomment>A text size. English: “Smallest”</extracomment>
+        <translation>Ελάχιστο</translation>
+    </message>
+    <message>
+        <source>SIZE_S</source>
+        <extracomment>A text size. English: “Smaller”</extracomment>
+        <translation>Μικρότερο</translation>
+    </message>
+    <message>
+        <source>SIZE_M</source>
+        <extracomment>A text size. English: “Small”</extracomment>
+        <translation>Μικρό</translation>
+    </message>
+    <message>
+        <source>SIZE_L</source>
+        <extracomment>A text size. English: “Standard”</extracomment>
+        <translation>Κανονικό</translation>
+    </message>
+    <message>
+        <source>SIZE_XL</source>
+        <extracomment>A text size. English: “Large”</extracomment>
+        <translation>Μεγάλο</translation>
+    </message>
+    <message>
+        <source>SIZE_XXL</source>
+        <extracomment>A text size. English: “Larger”</extracomment>
+        <translation>Μεγαλύτερο</translation>
+    </message>
+    <message>
+        <source>SIZE_XXXL</source>
+        <extracomment>A text size. English: “Largest”</extracomment>
+        <translation>Μέγιστο</translation>
+    </message>
+    <message>
+        <source>SIZE_AX</source>
+        <extracomment>A text size beyond the largest; %@ is a number from 1 to 5. English: “Very large %@”</extracomment>
+        <translation>Πολύ μεγάλο %@</translation>
+    </message>
+    <message>
+        <source>SETTINGS_COLORS</source>
+        <extracomment>A setting; its value is one of the following. English: “Colours”</extracomment>
+        <translation>Χρώματα</translation>
+    </message>
+    <message>
+        <source>SETTINGS_AS_SYSTEM</source>
+        <extracomment>The value of a setting that follows the desktop. English: “As the system”</extracomment>
+        <translation>Όπως το σύστημα</translation>
+    </message>
+    <message>
+        <source>COLORS_LIGHT</source>
+        <extracomment>Of the colours. English: “Light”</extracomment>
+        <translation>Φωτεινά</translation>
+    </message>
+    <message>
+        <source>COLORS_DARK</source>
+        <extracomment>Of the colours. English: “Dark”</extracomment>
+        <translation>Σκούρα</translation>
+    </message>
+    <message>
+        <source>COLORS_HIGH</source>
+        <extracomment>Of the colours. English: “High contrast”</extracomment>
+        <translation>Υψηλή αντίθεση</translation>
+    </message>
+    <message>
+        <source>SETTINGS_DISTANCES</source>
+        <extracomment>A setting; its value is one of the following. English: “Distances”</extracomment>
+        <translation>Αποστάσεις</translation>
+    </message>
+    <message>
+        <source>DISTANCES_METRIC</source>
+        <extracomment>Of the distances. English: “Kilometres”</extracomment>
+        <translation>Χιλιόμετρα</translation>
+    </message>
+    <message>
+        <source>DISTANCES_MILES</source>
+        <extracomment>Of the distances. English: “Miles”</extracomment>
+        <translation>Μίλια</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LANGUAGE</source>
+        <extracomment>A setting; its value is the name of a language. English: “Language”</extracomment>
+        <translation>Γλώσσα</translation>
+    </message>
+    <message>
+        <source>SETTINGS_CONTACTS</source>
+        <extracomment>The name of a section: what this computer adds to answers. English: “Contacts and position”</extracomment>
+        <translation>Επαφές και θέση</translation>
+    </message>
+    <message>
+        <source>SETTINGS_BOOKS</source>
+        <extracomment>A switch: the desktop’s address books. English: “Address books”</extracomment>
+        <translation>Βιβλία διευθύνσεων</translation>
+    </message>
+    <message>
+        <source>SETTINGS_BOOKS_LINE</source>
+        <extracomment>Under that switch. English: “Names and faces come from them.”</extracomment>
+        <translation>Από εκεί έρχονται ονόματα και πρόσωπα.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_POSITION</source>
+        <extracomment>A switch: where the user’s computer is. English: “My position”</extracomment>
+        <translation>Η θέση μου</translation>
+    </message>
+    <message>
+        <source>SETTINGS_POSITION_LINE</source>
+        <extracomment>Under that switch. English: “Distances are counted from it.”</extracomment>
+        <translation>Από εκεί μετριούνται οι αποστάσεις.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_MAPS</source>
+        <extracomment>The name of a section. English: “Maps”</extracomment>
+        <translation>Χάρτες</translation>
+    </message>
+    <message>
+        <source>MAPS_WORLD</source>
+        <extracomment>A map that is always there. English: “The world”</extracomment>
+        <translation>Ο κόσμος</translation>
+    </message>
+    <message>
+        <source>MAPS_WORLD_LINE</source>
+        <extracomment>Under its name. English: “Towns, borders and large roads”</extracomment>
+        <translation>Πόλεις, σύνορα και μεγάλοι δρόμοι</translation>
+    </message>
+    <message>
+        <source>MAPS_STREETS</source>
+        <extracomment>Under the name of a map with streets; %@ is the size of its file, such as “12 MB”. English: “Streets, %@”</extracomment>
+        <translation>Δρόμοι, %@</translation>
+    </message>
+    <message>
+        <source>MAPS_ADD</source>
+        <extracomment>Opens a dialog that chooses a file with a map. English: “Add a region”</extracomment>
+        <translation>Προσθήκη περιοχής</translation>
+    </message>
+    <message>
+        <source>MAPS_REMOVE</source>
+        <extracomment>A button: the map is not drawn any more. English: “Remove this map”</extracomment>
+        <translation>Αφαίρεση αυτού του χάρτη</translation>
+    </message>
+    <message>
+        <source>MAPS_REFUSED</source>
+        <extracomment>Said when a chosen file is no map. English: “This file isn’t a map that can be drawn.”</extracomment>
+        <translation>Αυτό το αρχείο δεν είναι χάρτης που σχεδιάζεται.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_HELP</source>
+        <extracomment>The name of a section. English: “Help”</extracomment>
+        <translation>Βοήθεια</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SET_FOR_YOU</source>
+        <extracomment>Under a setting that an administrator or the command line holds. English: “Set for you”</extracomment>
+        <translation>Ορίστηκε για εσάς</translation>
+    </message>
+    <message>
+        <source>STATUS_TRY_NOW</source>
+        <extracomment>A button at the end of the status line while the service cannot be reached. English: “Try now”</extracomment>
+        <translation>Δοκιμή τώρα</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS_SHARE</source>
+        <extracomment>On the page with the list of friends: a section with those who let the user see where they are. English: “They share with you”</extracomment>
+        <translation>Μοιράζονται μαζί σας</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_HAVE_LINK</source>
+        <extracomment>A button on the page for signing in: asks for a link instead. English: “I have a link”</extracomment>
+        <translation>Έχω σύνδεσμο</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_USE_SECRET</source>
+        <extracomment>A button there: asks for address, person and secret again. English: “Use address and secret”</extracomment>
+        <translation>Χρήση διεύθυνσης και μυστικού</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK</source>
+        <extracomment>Label of a field: a link that signs in. English: “Link”</extracomment>
+        <translation>Σύνδεσμος</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK_LINE</source>
+        <extracomment>Below the title, above that field. English: “Paste the link you were given. It works once.”</extracomment>
+        <translation>Επικολλήστε τον σύνδεσμο που σας δόθηκε. Ισχύει μία φορά.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK_SPENT</source>
+        <extracomment>Below the link; the service does not tell which of the two it is. English: “This link was used, or is too old. Ask for a new one.”</extracomment>
+        <translation>Ο σύνδεσμος χρησιμοποιήθηκε ή πάλιωσε. Ζητήστε νέον.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_BAD_LINK</source>
+        <extracomment>Below the link. English: “This isn’t a link for signing in.”</extracomment>
+        <translation>Αυτός δεν είναι σύνδεσμος για σύνδεση.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_ALREADY</source>
+        <extracomment>Said when a link that signs in comes while somebody is signed in. English: “You are signed in. Sign out first to use this link.”</extracomment>
+        <translation>Είστε συνδεδεμένοι. Αποσυνδεθείτε πρώτα για να χρησιμοποιήσετε τον σύνδεσμο.</translation>
+    </message>
+    <message>
+        <source>CHECK_UP</source>
+        <extracomment>The name of the page that says what is wrong and what mends it. English: “Check-up”</extracomment>
+        <translation>Έλεγχος</translation>
+    </message>
+    <message>
+        <source>CHECK_WELL</source>
+        <extracomment>Title of that page when nothing is wrong. English: “All is well.”</extracomment>
+        <translation>Όλα είναι καλά.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOW</source>
+        <extracomment>Below that title. English: “Checked just now.”</extracomment>
+        <translation>Ελέγχθηκε μόλις τώρα.</translation>
+    </message>
+    <message>
+        <source>CHECK_REST</source>
+        <extracomment>Below the title when something is wrong. English: “Everything else is fine. Checked just now.”</extracomment>
+        <translation>Όλα τα άλλα είναι καλά. Ελέγχθηκε μόλις τώρα.</translation>
+    </message>
+    <message>
+        <source>CHECK_HANDS</source>
+        <extracomment>Title when something is wrong; %@ is how many things. English: “{0, plural, one{One thing needs a hand.} other{%@ things need a hand.}}”</extracomment>
+        <translation>{0, plural, one{Ένα πράγμα θέλει ένα χέρι.} other{%@ πράγματα θέλουν ένα χέρι.}}</translation>
+    </message>
+    <message>
+        <source>CHECK_FINE</source>
+        <extracomment>The name of the section with what is in order. English: “Fine”</extracomment>
+        <translation>Εντάξει</translation>
+    </message>
+    <message>
+        <source>CHECK_AGAIN</source>
+        <extracomment>A button. English: “Check again”</extracomment>
+        <translation>Νέος έλεγχος</translation>
+    </message>
+    <message>
+        <source>CHECK_REPORT</source>
+        <extracomment>A button. English: “Copy report”</extracomment>
+        <translation>Αντιγραφή αναφοράς</translation>
+    </message>
+    <message>
+        <source>CHECK_COMMAND</source>
+        <extracomment>A button: puts the command that mends a thing into the clipboard, for a terminal. English: “Copy the command”</extracomment>
+        <translation>Αντιγραφή εντολής</translation>
+    </message>
+    <message>
+        <source>CHECK_SIGN_IN_AGAIN</source>
+        <extracomment>A button. English: “Sign in again”</extracomment>
+        <translation>Νέα σύνδεση</translation>
+    </message>
+    <message>
+        <source>CHECK_SET_CLOCK</source>
+        <extracomment>A button. English: “Set the clock”</extracomment>
+        <translation>Ρύθμιση ρολογιού</translation>
+    </message>
+    <message>
+        <source>CHECK_ASK_AGAIN</source>
+        <extracomment>A button: asks the address book again. English: “Ask it again”</extracomment>
+        <translation>Νέα ερώτηση</translation>
+    </message>
+    <message>
+        <source>CHECK_ACCOUNT</source>
+        <extracomment>A thing that is fine. English: “Account”</extracomment>
+        <translation>Λογαριασμός</translation>
+    </message>
+    <message>
+        <source>CHECK_SERVICE</source>
+        <extracomment>A thing that is fine. English: “Service”</extracomment>
+        <translation>Υπηρεσία</translation>
+    </message>
+    <message>
+        <source>CHECK_CLOCK</source>
+        <extracomment>A thing that is fine. English: “Clock”</extracomment>
+        <translation>Ρολόι</translation>
+    </message>
+    <message>
+        <source>CHECK_CONTACTS</source>
+        <extracomment>A thing that is fine: files with contacts. English: “Contacts”</extracomment>
+        <translation>Επαφές</translation>
+    </message>
+    <message>
+        <source>CHECK_LETTERS</source>
+        <extracomment>A thing that is fine: fonts for all scripts. English: “Letters”</extracomment>
+        <translation>Γράμματα</translation>
+    </message>
+    <message>
+        <source>CHECK_READER</source>
+        <extracomment>A thing that is fine. English: “Screen reader”</extracomment>
+        <translation>Αναγνώστης οθόνης</translation>
+    </message>
+    <message>
+        <source>CHECK_DESKTOP</source>
+        <extracomment>A thing that is fine: what the desktop offers to programs. English: “Desktop”</extracomment>
+        <translation>Επιφάνεια εργασίας</translation>
+    </message>
+    <message>
+        <source>CHECK_NOBODY</source>
+        <extracomment>A thing that is wrong. English: “Nobody is signed in.”</extracomment>
+        <translation>Κανείς δεν είναι συνδεδεμένος.</translation>
+    </message>
+    <message>
+        <source>CHECK_LOCKED</source>
+        <extracomment>A thing that is wrong. English: “The keyring is locked.”</extracomment>
+        <translation>Η κλειδοθήκη είναι κλειδωμένη.</translation>
+    </message>
+    <message>
+        <source>CHECK_LOCKED_LINE</source>
+        <extracomment>Its cause. English: “Your secret can’t be read, so nobody is asked until it is open.”</extracomment>
+        <translation>Το μυστικό σας δεν διαβάζεται, και κανείς δεν ερωτάται ώσπου να ανοίξει.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNREACHABLE</source>
+        <extracomment>A thing that is wrong. English: “The service can’t be reached.”</extracomment>
+        <translation>Η υπηρεσία δεν είναι προσβάσιμη.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNREACHABLE_LINE</source>
+        <extracomment>Its cause; %@ is an address. English: “Nothing answers at %@.”</extracomment>
+        <translation>Τίποτα δεν απαντά στο %@.</translation>
+    </message>
+    <message>
+        <source>CHECK_REDIRECT_LINE</source>
+        <extracomment>Another cause. English: “An address is remembered that isn’t your service’s.”</extracomment>
+        <translation>Απομνημονεύεται διεύθυνση που δεν ανήκει στην υπηρεσία σας.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNKNOWN</source>
+        <extracomment>A thing that is wrong. English: “The service doesn’t know you any more.”</extracomment>
+        <translation>Η υπηρεσία δεν σας γνωρίζει πια.</translation>
+    </message>
+    <message>
+        <source>CHECK_CLOCKS</source>
+        <extracomment>A thing that is wrong. English: “The clocks disagree.”</extracomment>
+        <translation>Τα ρολόγια διαφωνούν.</translation>
+    </message>
+    <message>
+        <source>CHECK_AHEAD</source>
+        <extracomment>Its cause; %@ is a number of minutes. English: “This computer is %@ min ahead of the service, so ages are wrong.”</extracomment>
+        <translation>Ο υπολογιστής προηγείται της υπηρεσίας κατά %@ λ., άρα οι ηλικίες είναι λάθος.</translation>
+    </message>
+    <message>
+        <source>CHECK_BEHIND</source>
+        <extracomment>Its cause; %@ is a number of minutes. English: “This computer is %@ min behind the service, so ages are wrong.”</extracomment>
+        <translation>Ο υπολογιστής υστερεί της υπηρεσίας κατά %@ λ., άρα οι ηλικίες είναι λάθος.</translation>
+    </message>
+    <message>
+        <source>CHECK_BOOKS_SILENT</source>
+        <extracomment>A thing that is wrong. English: “Your address book is silent.”</extracomment>
+        <translation>Το βιβλίο διευθύνσεων σιωπά.</translation>
+    </message>
+    <message>
+        <source>CHECK_BOOKS_LINE</source>
+        <extracomment>Its cause. English: “It hasn’t answered. Names come from the service for now.”</extracomment>
+        <translation>Δεν απάντησε. Τα ονόματα έρχονται προς το παρόν από την υπηρεσία.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_CONTACTS</source>
+        <extracomment>A thing that is wrong. English: “Your contacts can’t be read.”</extracomment>
+        <translation>Οι επαφές σας δεν διαβάζονται.</translation>
+    </message>
+    <message>
+        <source>CHECK_FILE_LINE</source>
+        <extracomment>A cause: of contacts, of a map, of the settings. English: “A file is missing or broken.”</extracomment>
+        <translation>Ένα αρχείο λείπει ή είναι χαλασμένο.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOWHERE</source>
+        <extracomment>A thing that is wrong. English: “Nobody knows where you are.”</extracomment>
+        <translation>Κανείς δεν ξέρει πού είστε.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOWHERE_LINE</source>
+        <extracomment>Its cause. English: “This computer has no position, so there are no distances.”</extracomment>
+        <translation>Ο υπολογιστής δεν έχει θέση, άρα δεν υπάρχουν αποστάσεις.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_MAP</source>
+        <extracomment>A thing that is wrong. English: “A map can’t be drawn.”</extracomment>
+        <translation>Ένας χάρτης δεν σχεδιάζεται.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_LETTERS</source>
+        <extracomment>A thing that is wrong. English: “Letters are missing.”</extracomment>
+        <translation>Λείπουν γράμματα.</translation>
+    </message>
+    <message>
+        <source>CHECK_LETTERS_LINE</source>
+        <extracomment>Its cause. English: “Some names show as boxes.”</extracomment>
+        <translation>Κάποια ονόματα φαίνονται ως κουτάκια.</translation>
+    </message>
+    <message>
+        <source>CHECK_DEAF</source>
+        <extracomment>A thing that is wrong. English: “Screen readers can’t listen.”</extracomment>
+        <translation>Οι αναγνώστες οθόνης δεν ακούν.</translation>
+    </message>
+    <message>
+        <source>CHECK_DEAF_LINE</source>
+        <extracomment>Its cause. English: “What joins them to programs doesn’t answer.”</extracomment>
+        <translation>Ό,τι τους συνδέει με τα προγράμματα δεν απαντά.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_DESKTOP</source>
+        <extracomment>A thing that is wrong. English: “The desktop doesn’t answer.”</extracomment>
+        <translation>Η επιφάνεια εργασίας δεν απαντά.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_DESKTOP_LINE</source>
+        <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
+        <translation>Τα χρώματα και η αντίθεσή της δεν ακολουθούνται, και ίσως δεν ανοίγουν σύνδεσμοι.</translation>
+    </message>
 </context>
 </TS>

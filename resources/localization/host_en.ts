@@ -576,5 +576,455 @@
         <extracomment>The way back from a page, spoken</extracomment>
         <translation>Back</translation>
     </message>
+    <message>
+        <source>SETTINGS</source>
+        <extracomment>The name of the page with the user’s settings, and spoken of the button that opens it</extracomment>
+        <translation>Settings</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SIGN_OUT</source>
+        <extracomment>A button on that page</extracomment>
+        <translation>Sign out</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SHARING</source>
+        <extracomment>The name of a section of that page</extracomment>
+        <translation>Sharing</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WHO</source>
+        <extracomment>Leads to the service’s own page in a browser</extracomment>
+        <translation>Who sees what</translation>
+    </message>
+    <message>
+        <source>SETTINGS_READING</source>
+        <extracomment>The name of a section</extracomment>
+        <translation>Reading</translation>
+    </message>
+    <message>
+        <source>SETTINGS_TEXT_SIZE</source>
+        <extracomment>A setting; its value is one of the sizes below</extracomment>
+        <translation>Text size</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SMALLER</source>
+        <extracomment>Spoken: a button beside it</extracomment>
+        <translation>Smaller text</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LARGER</source>
+        <extracomment>Spoken: a button beside it</extracomment>
+        <translation>Larger text</translation>
+    </message>
+    <message>
+        <source>SIZE_XS</source>
+        <extracomment>A text size</extracomment>
+        <translation>Smallest</translation>
+    </message>
+    <message>
+        <source>SIZE_S</source>
+        <extracomment>A text size</extracomment>
+        <translation>Smaller</translation>
+    </message>
+    <message>
+        <source>SIZE_M</source>
+        <extracomment>A text size</extracomment>
+        <translation>Small</translation>
+    </message>
+    <message>
+        <source>SIZE_L</source>
+        <extracomment>A text size</extracomment>
+        <translation>Standard</translation>
+    </message>
+    <message>
+        <source>SIZE_XL</source>
+        <extracomment>A text size</extracomment>
+        <translation>Large</translation>
+    </message>
+    <message>
+        <source>SIZE_XXL</source>
+        <extracomment>A text size</extracomment>
+        <translation>Larger</translation>
+    </message>
+    <message>
+        <source>SIZE_XXXL</source>
+        <extracomment>A text size</extracomment>
+        <translation>Largest</translation>
+    </message>
+    <message>
+        <source>SIZE_AX</source>
+        <extracomment>A text size beyond the largest; %@ is a number from 1 to 5</extracomment>
+        <translation>Very large %@</translation>
+    </message>
+    <message>
+        <source>SETTINGS_COLORS</source>
+        <extracomment>A setting; its value is one of the following</extracomment>
+        <translation>Colours</translation>
+    </message>
+    <message>
+        <source>SETTINGS_AS_SYSTEM</source>
+        <extracomment>The value of a setting that follows the desktop</extracomment>
+        <translation>As the system</translation>
+    </message>
+    <message>
+        <source>COLORS_LIGHT</source>
+        <extracomment>Of the colours</extracomment>
+        <translation>Light</translation>
+    </message>
+    <message>
+        <source>COLORS_DARK</source>
+        <extracomment>Of the colours</extracomment>
+        <translation>Dark</translation>
+    </message>
+    <message>
+        <source>COLORS_HIGH</source>
+        <extracomment>Of the colours</extracomment>
+        <translation>High contrast</translation>
+    </message>
+    <message>
+        <source>SETTINGS_DISTANCES</source>
+        <extracomment>A setting; its value is one of the following</extracomment>
+        <translation>Distances</translation>
+    </message>
+    <message>
+        <source>DISTANCES_METRIC</source>
+        <extracomment>Of the distances</extracomment>
+        <translation>Kilometres</translation>
+    </message>
+    <message>
+        <source>DISTANCES_MILES</source>
+        <extracomment>Of the distances</extracomment>
+        <translation>Miles</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LANGUAGE</source>
+        <extracomment>A setting; its value is the name of a language</extracomment>
+        <translation>Language</translation>
+    </message>
+    <message>
+        <source>SETTINGS_CONTACTS</source>
+        <extracomment>The name of a section: what this computer adds to answers</extracomment>
+        <translation>Contacts and position</translation>
+    </message>
+    <message>
+        <source>SETTINGS_BOOKS</source>
+        <extracomment>A switch: the desktop’s address books</extracomment>
+        <translation>Address books</translation>
+    </message>
+    <message>
+        <source>SETTINGS_BOOKS_LINE</source>
+        <extracomment>Under that switch</extracomment>
+        <translation>Names and faces come from them.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_POSITION</source>
+        <extracomment>A switch: where the user’s computer is</extracomment>
+        <translation>My position</translation>
+    </message>
+    <message>
+        <source>SETTINGS_POSITION_LINE</source>
+        <extracomment>Under that switch</extracomment>
+        <translation>Distances are counted from it.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_MAPS</source>
+        <extracomment>The name of a section</extracomment>
+        <translation>Maps</translation>
+    </message>
+    <message>
+        <source>MAPS_WORLD</source>
+        <extracomment>A map that is always there</extracomment>
+        <translation>The world</translation>
+    </message>
+    <message>
+        <source>MAPS_WORLD_LINE</source>
+        <extracomment>Under its name</extracomment>
+        <translation>Towns, borders and large roads</translation>
+    </message>
+    <message>
+        <source>MAPS_STREETS</source>
+        <extracomment>Under the name of a map with streets; %@ is the size of its file, such as “12 MB”</extracomment>
+        <translation>Streets, %@</translation>
+    </message>
+    <message>
+        <source>MAPS_ADD</source>
+        <extracomment>Opens a dialog that chooses a file with a map</extracomment>
+        <translation>Add a region</translation>
+    </message>
+    <message>
+        <source>MAPS_REMOVE</source>
+        <extracomment>A button: the map is not drawn any more</extracomment>
+        <translation>Remove this map</translation>
+    </message>
+    <message>
+        <source>MAPS_REFUSED</source>
+        <extracomment>Said when a chosen file is no map</extracomment>
+        <translation>This file isn’t a map that can be drawn.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_HELP</source>
+        <extracomment>The name of a section</extracomment>
+        <translation>Help</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SET_FOR_YOU</source>
+        <extracomment>Under a setting that an administrator or the command line holds</extracomment>
+        <translation>Set for you</translation>
+    </message>
+    <message>
+        <source>STATUS_TRY_NOW</source>
+        <extracomment>A button at the end of the status line while the service cannot be reached</extracomment>
+        <translation>Try now</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS_SHARE</source>
+        <extracomment>On the page with the list of friends: a section with those who let the user see where they are</extracomment>
+        <translation>They share with you</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_HAVE_LINK</source>
+        <extracomment>A button on the page for signing in: asks for a link instead</extracomment>
+        <translation>I have a link</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_USE_SECRET</source>
+        <extracomment>A button there: asks for address, person and secret again</extracomment>
+        <translation>Use address and secret</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK</source>
+        <extracomment>Label of a field: a link that signs in</extracomment>
+        <translation>Link</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK_LINE</source>
+        <extracomment>Below the title, above that field</extracomment>
+        <translation>Paste the link you were given. It works once.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK_SPENT</source>
+        <extracomment>Below the link; the service does not tell which of the two it is</extracomment>
+        <translation>This link was used, or is too old. Ask for a new one.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_BAD_LINK</source>
+        <extracomment>Below the link</extracomment>
+        <translation>This isn’t a link for signing in.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_ALREADY</source>
+        <extracomment>Said when a link that signs in comes while somebody is signed in</extracomment>
+        <translation>You are signed in. Sign out first to use this link.</translation>
+    </message>
+    <message>
+        <source>CHECK_UP</source>
+        <extracomment>The name of the page that says what is wrong and what mends it</extracomment>
+        <translation>Check-up</translation>
+    </message>
+    <message>
+        <source>CHECK_WELL</source>
+        <extracomment>Title of that page when nothing is wrong</extracomment>
+        <translation>All is well.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOW</source>
+        <extracomment>Below that title</extracomment>
+        <translation>Checked just now.</translation>
+    </message>
+    <message>
+        <source>CHECK_REST</source>
+        <extracomment>Below the title when something is wrong</extracomment>
+        <translation>Everything else is fine. Checked just now.</translation>
+    </message>
+    <message>
+        <source>CHECK_HANDS</source>
+        <extracomment>Title when something is wrong; %@ is how many things</extracomment>
+        <translation>{0, plural, one{One thing needs a hand.} other{%@ things need a hand.}}</translation>
+    </message>
+    <message>
+        <source>CHECK_FINE</source>
+        <extracomment>The name of the section with what is in order</extracomment>
+        <translation>Fine</translation>
+    </message>
+    <message>
+        <source>CHECK_AGAIN</source>
+        <extracomment>A button</extracomment>
+        <translation>Check again</translation>
+    </message>
+    <message>
+        <source>CHECK_REPORT</source>
+        <extracomment>A button</extracomment>
+        <translation>Copy report</translation>
+    </message>
+    <message>
+        <source>CHECK_COMMAND</source>
+        <extracomment>A button: puts the command that mends a thing into the clipboard, for a terminal</extracomment>
+        <translation>Copy the command</translation>
+    </message>
+    <message>
+        <source>CHECK_SIGN_IN_AGAIN</source>
+        <extracomment>A button</extracomment>
+        <translation>Sign in again</translation>
+    </message>
+    <message>
+        <source>CHECK_SET_CLOCK</source>
+        <extracomment>A button</extracomment>
+        <translation>Set the clock</translation>
+    </message>
+    <message>
+        <source>CHECK_ASK_AGAIN</source>
+        <extracomment>A button: asks the address book again</extracomment>
+        <translation>Ask it again</translation>
+    </message>
+    <message>
+        <source>CHECK_ACCOUNT</source>
+        <extracomment>A thing that is fine</extracomment>
+        <translation>Account</translation>
+    </message>
+    <message>
+        <source>CHECK_SERVICE</source>
+        <extracomment>A thing that is fine</extracomment>
+        <translation>Service</translation>
+    </message>
+    <message>
+        <source>CHECK_CLOCK</source>
+        <extracomment>A thing that is fine</extracomment>
+        <translation>Clock</translation>
+    </message>
+    <message>
+        <source>CHECK_CONTACTS</source>
+        <extracomment>A thing that is fine: files with contacts</extracomment>
+        <translation>Contacts</translation>
+    </message>
+    <message>
+        <source>CHECK_LETTERS</source>
+        <extracomment>A thing that is fine: fonts for all scripts</extracomment>
+        <translation>Letters</translation>
+    </message>
+    <message>
+        <source>CHECK_READER</source>
+        <extracomment>A thing that is fine</extracomment>
+        <translation>Screen reader</translation>
+    </message>
+    <message>
+        <source>CHECK_DESKTOP</source>
+        <extracomment>A thing that is fine: what the desktop offers to programs</extracomment>
+        <translation>Desktop</translation>
+    </message>
+    <message>
+        <source>CHECK_NOBODY</source>
+        <extracomment>A thing that is wrong</extracomment>
+        <translation>Nobody is signed in.</translation>
+    </message>
+    <message>
+        <source>CHECK_LOCKED</source>
+        <extracomment>A thing that is wrong</extracomment>
+        <translation>The keyring is locked.</translation>
+    </message>
+    <message>
+        <source>CHECK_LOCKED_LINE</source>
+        <extracomment>Its cause</extracomment>
+        <translation>Your secret can’t be read, so nobody is asked until it is open.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNREACHABLE</source>
+        <extracomment>A thing that is wrong</extracomment>
+        <translation>The service can’t be reached.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNREACHABLE_LINE</source>
+        <extracomment>Its cause; %@ is an address</extracomment>
+        <translation>Nothing answers at %@.</translation>
+    </message>
+    <message>
+        <source>CHECK_REDIRECT_LINE</source>
+        <extracomment>Another cause</extracomment>
+        <translation>An address is remembered that isn’t your service’s.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNKNOWN</source>
+        <extracomment>A thing that is wrong</extracomment>
+        <translation>The service doesn’t know you any more.</translation>
+    </message>
+    <message>
+        <source>CHECK_CLOCKS</source>
+        <extracomment>A thing that is wrong</extracomment>
+        <translation>The clocks disagree.</translation>
+    </message>
+    <message>
+        <source>CHECK_AHEAD</source>
+        <extracomment>Its cause; %@ is a number of minutes</extracomment>
+        <translation>This computer is %@ min ahead of the service, so ages are wrong.</translation>
+    </message>
+    <message>
+        <source>CHECK_BEHIND</source>
+        <extracomment>Its cause; %@ is a number of minutes</extracomment>
+        <translation>This computer is %@ min behind the service, so ages are wrong.</translation>
+    </message>
+    <message>
+        <source>CHECK_BOOKS_SILENT</source>
+        <extracomment>A thing that is wrong</extracomment>
+        <translation>Your address book is silent.</translation>
+    </message>
+    <message>
+        <source>CHECK_BOOKS_LINE</source>
+        <extracomment>Its cause</extracomment>
+        <translation>It hasn’t answered. Names come from the service for now.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_CONTACTS</source>
+        <extracomment>A thing that is wrong</extracomment>
+        <translation>Your contacts can’t be read.</translation>
+    </message>
+    <message>
+        <source>CHECK_FILE_LINE</source>
+        <extracomment>A cause: of contacts, of a map, of the settings</extracomment>
+        <translation>A file is missing or broken.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOWHERE</source>
+        <extracomment>A thing that is wrong</extracomment>
+        <translation>Nobody knows where you are.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOWHERE_LINE</source>
+        <extracomment>Its cause</extracomment>
+        <translation>This computer has no position, so there are no distances.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_MAP</source>
+        <extracomment>A thing that is wrong</extracomment>
+        <translation>A map can’t be drawn.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_LETTERS</source>
+        <extracomment>A thing that is wrong</extracomment>
+        <translation>Letters are missing.</translation>
+    </message>
+    <message>
+        <source>CHECK_LETTERS_LINE</source>
+        <extracomment>Its cause</extracomment>
+        <translation>Some names show as boxes.</translation>
+    </message>
+    <message>
+        <source>CHECK_DEAF</source>
+        <extracomment>A thing that is wrong</extracomment>
+        <translation>Screen readers can’t listen.</translation>
+    </message>
+    <message>
+        <source>CHECK_DEAF_LINE</source>
+        <extracomment>Its cause</extracomment>
+        <translation>What joins them to programs doesn’t answer.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_DESKTOP</source>
+        <extracomment>A thing that is wrong</extracomment>
+        <translation>The desktop doesn’t answer.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_DESKTOP_LINE</source>
+        <extracomment>Its cause</extracomment>
+        <translation>Its colours and contrast aren’t followed, and links may not open.</translation>
+    </message>
 </context>
 </TS>

@@ -576,5 +576,455 @@
         <extracomment>The way back from a page, spoken</extracomment>
         <translation>بازگشت</translation>
     </message>
+    <message>
+        <source>SETTINGS</source>
+        <extracomment>The name of the page with the user’s settings, and spoken of the button that opens it. English: “Settings”</extracomment>
+        <translation>تنظیمات</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SIGN_OUT</source>
+        <extracomment>A button on that page. English: “Sign out”</extracomment>
+        <translation>خروج</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SHARING</source>
+        <extracomment>The name of a section of that page. English: “Sharing”</extracomment>
+        <translation>هم‌رسانی</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WHO</source>
+        <extracomment>Leads to the service’s own page in a browser. English: “Who sees what”</extracomment>
+        <translation>چه کسی چه می‌بیند</translation>
+    </message>
+    <message>
+        <source>SETTINGS_READING</source>
+        <extracomment>The name of a section. English: “Reading”</extracomment>
+        <translation>خواندن</translation>
+    </message>
+    <message>
+        <source>SETTINGS_TEXT_SIZE</source>
+        <extracomment>A setting; its value is one of the sizes below. English: “Text size”</extracomment>
+        <translation>اندازهٔ متن</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SMALLER</source>
+        <extracomment>Spoken: a button beside it. English: “Smaller text”</extracomment>
+        <translation>متن کوچک‌تر</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LARGER</source>
+        <extracomment>Spoken: a button beside it. English: “Larger text”</extracomment>
+        <translation>متن بزرگ‌تر</translation>
+    </message>
+    <message>
+        <source>SIZE_XS</source>
+        <extracomment>A text size. English: “Smallest”</extracomment>
+        <translation>کوچک‌ترین</translation>
+    </message>
+    <message>
+        <source>SIZE_S</source>
+        <extracomment>A text size. English: “Smaller”</extracomment>
+        <translation>کوچک‌تر</translation>
+    </message>
+    <message>
+        <source>SIZE_M</source>
+        <extracomment>A text size. English: “Small”</extracomment>
+        <translation>کوچک</translation>
+    </message>
+    <message>
+        <source>SIZE_L</source>
+        <extracomment>A text size. English: “Standard”</extracomment>
+        <translation>معمولی</translation>
+    </message>
+    <message>
+        <source>SIZE_XL</source>
+        <extracomment>A text size. English: “Large”</extracomment>
+        <translation>بزرگ</translation>
+    </message>
+    <message>
+        <source>SIZE_XXL</source>
+        <extracomment>A text size. English: “Larger”</extracomment>
+        <translation>بزرگ‌تر</translation>
+    </message>
+    <message>
+        <source>SIZE_XXXL</source>
+        <extracomment>A text size. English: “Largest”</extracomment>
+        <translation>بزرگ‌ترین</translation>
+    </message>
+    <message>
+        <source>SIZE_AX</source>
+        <extracomment>A text size beyond the largest; %@ is a number from 1 to 5. English: “Very large %@”</extracomment>
+        <translation>خیلی بزرگ %@</translation>
+    </message>
+    <message>
+        <source>SETTINGS_COLORS</source>
+        <extracomment>A setting; its value is one of the following. English: “Colours”</extracomment>
+        <translation>رنگ‌ها</translation>
+    </message>
+    <message>
+        <source>SETTINGS_AS_SYSTEM</source>
+        <extracomment>The value of a setting that follows the desktop. English: “As the system”</extracomment>
+        <translation>مانند سامانه</translation>
+    </message>
+    <message>
+        <source>COLORS_LIGHT</source>
+        <extracomment>Of the colours. English: “Light”</extracomment>
+        <translation>روشن</translation>
+    </message>
+    <message>
+        <source>COLORS_DARK</source>
+        <extracomment>Of the colours. English: “Dark”</extracomment>
+        <translation>تیره</translation>
+    </message>
+    <message>
+        <source>COLORS_HIGH</source>
+        <extracomment>Of the colours. English: “High contrast”</extracomment>
+        <translation>کنتراست بالا</translation>
+    </message>
+    <message>
+        <source>SETTINGS_DISTANCES</source>
+        <extracomment>A setting; its value is one of the following. English: “Distances”</extracomment>
+        <translation>فاصله‌ها</translation>
+    </message>
+    <message>
+        <source>DISTANCES_METRIC</source>
+        <extracomment>Of the distances. English: “Kilometres”</extracomment>
+        <translation>کیلومتر</translation>
+    </message>
+    <message>
+        <source>DISTANCES_MILES</source>
+        <extracomment>Of the distances. English: “Miles”</extracomment>
+        <translation>مایل</translation>
+    </message>
+    <message>
+        <source>SETTINGS_LANGUAGE</source>
+        <extracomment>A setting; its value is the name of a language. English: “Language”</extracomment>
+        <translation>زبان</translation>
+    </message>
+    <message>
+        <source>SETTINGS_CONTACTS</source>
+        <extracomment>The name of a section: what this computer adds to answers. English: “Contacts and position”</extracomment>
+        <translation>مخاطبان و موقعیت</translation>
+    </message>
+    <message>
+        <source>SETTINGS_BOOKS</source>
+        <extracomment>A switch: the desktop’s address books. English: “Address books”</extracomment>
+        <translation>دفترهای نشانی</translation>
+    </message>
+    <message>
+        <source>SETTINGS_BOOKS_LINE</source>
+        <extracomment>Under that switch. English: “Names and faces come from them.”</extracomment>
+        <translation>نام‌ها و چهره‌ها از آن‌ها می‌آیند.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_POSITION</source>
+        <extracomment>A switch: where the user’s computer is. English: “My position”</extracomment>
+        <translation>موقعیت من</translation>
+    </message>
+    <message>
+        <source>SETTINGS_POSITION_LINE</source>
+        <extracomment>Under that switch. English: “Distances are counted from it.”</extracomment>
+        <translation>فاصله‌ها از آن شمرده می‌شوند.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_MAPS</source>
+        <extracomment>The name of a section. English: “Maps”</extracomment>
+        <translation>نقشه‌ها</translation>
+    </message>
+    <message>
+        <source>MAPS_WORLD</source>
+        <extracomment>A map that is always there. English: “The world”</extracomment>
+        <translation>جهان</translation>
+    </message>
+    <message>
+        <source>MAPS_WORLD_LINE</source>
+        <extracomment>Under its name. English: “Towns, borders and large roads”</extracomment>
+        <translation>شهرها، مرزها و راه‌های بزرگ</translation>
+    </message>
+    <message>
+        <source>MAPS_STREETS</source>
+        <extracomment>Under the name of a map with streets; %@ is the size of its file, such as “12 MB”. English: “Streets, %@”</extracomment>
+        <translation>خیابان‌ها، %@</translation>
+    </message>
+    <message>
+        <source>MAPS_ADD</source>
+        <extracomment>Opens a dialog that chooses a file with a map. English: “Add a region”</extracomment>
+        <translation>افزودن منطقه</translation>
+    </message>
+    <message>
+        <source>MAPS_REMOVE</source>
+        <extracomment>A button: the map is not drawn any more. English: “Remove this map”</extracomment>
+        <translation>برداشتن این نقشه</translation>
+    </message>
+    <message>
+        <source>MAPS_REFUSED</source>
+        <extracomment>Said when a chosen file is no map. English: “This file isn’t a map that can be drawn.”</extracomment>
+        <translation>این پرونده نقشه‌ای نیست که بتوان کشید.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_HELP</source>
+        <extracomment>The name of a section. English: “Help”</extracomment>
+        <translation>راهنما</translation>
+    </message>
+    <message>
+        <source>SETTINGS_SET_FOR_YOU</source>
+        <extracomment>Under a setting that an administrator or the command line holds. English: “Set for you”</extracomment>
+        <translation>برای شما تنظیم شده</translation>
+    </message>
+    <message>
+        <source>STATUS_TRY_NOW</source>
+        <extracomment>A button at the end of the status line while the service cannot be reached. English: “Try now”</extracomment>
+        <translation>اکنون امتحان کن</translation>
+    </message>
+    <message>
+        <source>PAGE_FRIENDS_SHARE</source>
+        <extracomment>On the page with the list of friends: a section with those who let the user see where they are. English: “They share with you”</extracomment>
+        <translation>با شما هم‌رسانی می‌کنند</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_HAVE_LINK</source>
+        <extracomment>A button on the page for signing in: asks for a link instead. English: “I have a link”</extracomment>
+        <translation>پیوندی دارم</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_USE_SECRET</source>
+        <extracomment>A button there: asks for address, person and secret again. English: “Use address and secret”</extracomment>
+        <translation>با نشانی و رمز</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK</source>
+        <extracomment>Label of a field: a link that signs in. English: “Link”</extracomment>
+        <translation>پیوند</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK_LINE</source>
+        <extracomment>Below the title, above that field. English: “Paste the link you were given. It works once.”</extracomment>
+        <translation>پیوندی را که گرفته‌اید بچسبانید. یک بار کار می‌کند.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_LINK_SPENT</source>
+        <extracomment>Below the link; the service does not tell which of the two it is. English: “This link was used, or is too old. Ask for a new one.”</extracomment>
+        <translation>این پیوند به کار رفته یا کهنه است. پیوند تازه‌ای بخواهید.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_BAD_LINK</source>
+        <extracomment>Below the link. English: “This isn’t a link for signing in.”</extracomment>
+        <translation>این پیوند ورود نیست.</translation>
+    </message>
+    <message>
+        <source>SIGN_IN_ALREADY</source>
+        <extracomment>Said when a link that signs in comes while somebody is signed in. English: “You are signed in. Sign out first to use this link.”</extracomment>
+        <translation>شما وارد شده‌اید. برای این پیوند نخست خارج شوید.</translation>
+    </message>
+    <message>
+        <source>CHECK_UP</source>
+        <extracomment>The name of the page that says what is wrong and what mends it. English: “Check-up”</extracomment>
+        <translation>بررسی</translation>
+    </message>
+    <message>
+        <source>CHECK_WELL</source>
+        <extracomment>Title of that page when nothing is wrong. English: “All is well.”</extracomment>
+        <translation>همه‌چیز خوب است.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOW</source>
+        <extracomment>Below that title. English: “Checked just now.”</extracomment>
+        <translation>همین حالا بررسی شد.</translation>
+    </message>
+    <message>
+        <source>CHECK_REST</source>
+        <extracomment>Below the title when something is wrong. English: “Everything else is fine. Checked just now.”</extracomment>
+        <translation>بقیه خوب است. همین حالا بررسی شد.</translation>
+    </message>
+    <message>
+        <source>CHECK_HANDS</source>
+        <extracomment>Title when something is wrong; %@ is how many things. English: “{0, plural, one{One thing needs a hand.} other{%@ things need a hand.}}”</extracomment>
+        <translation>{0, plural, one{%@ چیز به کمک نیاز دارد.} other{%@ چیز به کمک نیاز دارند.}}</translation>
+    </message>
+    <message>
+        <source>CHECK_FINE</source>
+        <extracomment>The name of the section with what is in order. English: “Fine”</extracomment>
+        <translation>خوب</translation>
+    </message>
+    <message>
+        <source>CHECK_AGAIN</source>
+        <extracomment>A button. English: “Check again”</extracomment>
+        <translation>بررسی دوباره</translation>
+    </message>
+    <message>
+        <source>CHECK_REPORT</source>
+        <extracomment>A button. English: “Copy report”</extracomment>
+        <translation>رونوشت گزارش</translation>
+    </message>
+    <message>
+        <source>CHECK_COMMAND</source>
+        <extracomment>A button: puts the command that mends a thing into the clipboard, for a terminal. English: “Copy the command”</extracomment>
+        <translation>رونوشت دستور</translation>
+    </message>
+    <message>
+        <source>CHECK_SIGN_IN_AGAIN</source>
+        <extracomment>A button. English: “Sign in again”</extracomment>
+        <translation>ورود دوباره</translation>
+    </message>
+    <message>
+        <source>CHECK_SET_CLOCK</source>
+        <extracomment>A button. English: “Set the clock”</extracomment>
+        <translation>تنظیم ساعت</translation>
+    </message>
+    <message>
+        <source>CHECK_ASK_AGAIN</source>
+        <extracomment>A button: asks the address book again. English: “Ask it again”</extracomment>
+        <translation>دوباره بپرس</translation>
+    </message>
+    <message>
+        <source>CHECK_ACCOUNT</source>
+        <extracomment>A thing that is fine. English: “Account”</extracomment>
+        <translation>حساب</translation>
+    </message>
+    <message>
+        <source>CHECK_SERVICE</source>
+        <extracomment>A thing that is fine. English: “Service”</extracomment>
+        <translation>سرویس</translation>
+    </message>
+    <message>
+        <source>CHECK_CLOCK</source>
+        <extracomment>A thing that is fine. English: “Clock”</extracomment>
+        <translation>ساعت</translation>
+    </message>
+    <message>
+        <source>CHECK_CONTACTS</source>
+        <extracomment>A thing that is fine: files with contacts. English: “Contacts”</extracomment>
+        <translation>مخاطبان</translation>
+    </message>
+    <message>
+        <source>CHECK_LETTERS</source>
+        <extracomment>A thing that is fine: fonts for all scripts. English: “Letters”</extracomment>
+        <translation>حروف</translation>
+    </message>
+    <message>
+        <source>CHECK_READER</source>
+        <extracomment>A thing that is fine. English: “Screen reader”</extracomment>
+        <translation>صفحه‌خوان</translation>
+    </message>
+    <message>
+        <source>CHECK_DESKTOP</source>
+        <extracomment>A thing that is fine: what the desktop offers to programs. English: “Desktop”</extracomment>
+        <translation>میزکار</translation>
+    </message>
+    <message>
+        <source>CHECK_NOBODY</source>
+        <extracomment>A thing that is wrong. English: “Nobody is signed in.”</extracomment>
+        <translation>کسی وارد نشده است.</translation>
+    </message>
+    <message>
+        <source>CHECK_LOCKED</source>
+        <extracomment>A thing that is wrong. English: “The keyring is locked.”</extracomment>
+        <translation>دسته‌کلید قفل است.</translation>
+    </message>
+    <message>
+        <source>CHECK_LOCKED_LINE</source>
+        <extracomment>Its cause. English: “Your secret can’t be read, so nobody is asked until it is open.”</extracomment>
+        <translation>رمزتان خوانده نمی‌شود؛ تا باز نشود از کسی پرسیده نمی‌شود.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNREACHABLE</source>
+        <extracomment>A thing that is wrong. English: “The service can’t be reached.”</extracomment>
+        <translation>سرویس در دسترس نیست.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNREACHABLE_LINE</source>
+        <extracomment>Its cause; %@ is an address. English: “Nothing answers at %@.”</extracomment>
+        <translation>در %@ چیزی پاسخ نمی‌دهد.</translation>
+    </message>
+    <message>
+        <source>CHECK_REDIRECT_LINE</source>
+        <extracomment>Another cause. English: “An address is remembered that isn’t your service’s.”</extracomment>
+        <translation>نشانی‌ای به یاد مانده که از سرویس شما نیست.</translation>
+    </message>
+    <message>
+        <source>CHECK_UNKNOWN</source>
+        <extracomment>A thing that is wrong. English: “The service doesn’t know you any more.”</extracomment>
+        <translation>سرویس دیگر شما را نمی‌شناسد.</translation>
+    </message>
+    <message>
+        <source>CHECK_CLOCKS</source>
+        <extracomment>A thing that is wrong. English: “The clocks disagree.”</extracomment>
+        <translation>ساعت‌ها یکی نیستند.</translation>
+    </message>
+    <message>
+        <source>CHECK_AHEAD</source>
+        <extracomment>Its cause; %@ is a number of minutes. English: “This computer is %@ min ahead of the service, so ages are wrong.”</extracomment>
+        <translation>این رایانه %@ دقیقه از سرویس جلوتر است؛ پس سن‌ها نادرست‌اند.</translation>
+    </message>
+    <message>
+        <source>CHECK_BEHIND</source>
+        <extracomment>Its cause; %@ is a number of minutes. English: “This computer is %@ min behind the service, so ages are wrong.”</extracomment>
+        <translation>این رایانه %@ دقیقه از سرویس عقب‌تر است؛ پس سن‌ها نادرست‌اند.</translation>
+    </message>
+    <message>
+        <source>CHECK_BOOKS_SILENT</source>
+        <extracomment>A thing that is wrong. English: “Your address book is silent.”</extracomment>
+        <translation>دفتر نشانی شما ساکت است.</translation>
+    </message>
+    <message>
+        <source>CHECK_BOOKS_LINE</source>
+        <extracomment>Its cause. English: “It hasn’t answered. Names come from the service for now.”</extracomment>
+        <translation>پاسخ نداده است. فعلاً نام‌ها از سرویس می‌آیند.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_CONTACTS</source>
+        <extracomment>A thing that is wrong. English: “Your contacts can’t be read.”</extracomment>
+        <translation>مخاطبان شما خوانده نمی‌شوند.</translation>
+    </message>
+    <message>
+        <source>CHECK_FILE_LINE</source>
+        <extracomment>A cause: of contacts, of a map, of the settings. English: “A file is missing or broken.”</extracomment>
+        <translation>پرونده‌ای نیست یا خراب است.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOWHERE</source>
+        <extracomment>A thing that is wrong. English: “Nobody knows where you are.”</extracomment>
+        <translation>کسی نمی‌داند کجایید.</translation>
+    </message>
+    <message>
+        <source>CHECK_NOWHERE_LINE</source>
+        <extracomment>Its cause. English: “This computer has no position, so there are no distances.”</extracomment>
+        <translation>این رایانه موقعیت ندارد؛ پس فاصله‌ای نیست.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_MAP</source>
+        <extracomment>A thing that is wrong. English: “A map can’t be drawn.”</extracomment>
+        <translation>نقشه‌ای کشیده نمی‌شود.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_LETTERS</source>
+        <extracomment>A thing that is wrong. English: “Letters are missing.”</extracomment>
+        <translation>حروفی نیست.</translation>
+    </message>
+    <message>
+        <source>CHECK_LETTERS_LINE</source>
+        <extracomment>Its cause. English: “Some names show as boxes.”</extracomment>
+        <translation>برخی نام‌ها خانه‌خانه دیده می‌شوند.</translation>
+    </message>
+    <message>
+        <source>CHECK_DEAF</source>
+        <extracomment>A thing that is wrong. English: “Screen readers can’t listen.”</extracomment>
+        <translation>صفحه‌خوان‌ها نمی‌شنوند.</translation>
+    </message>
+    <message>
+        <source>CHECK_DEAF_LINE</source>
+        <extracomment>Its cause. English: “What joins them to programs doesn’t answer.”</extracomment>
+        <translation>آنچه آن‌ها را به برنامه‌ها می‌پیوندد پاسخ نمی‌دهد.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_DESKTOP</source>
+        <extracomment>A thing that is wrong. English: “The desktop doesn’t answer.”</extracomment>
+        <translation>میزکار پاسخ نمی‌دهد.</translation>
+    </message>
+    <message>
+        <source>CHECK_NO_DESKTOP_LINE</source>
+        <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
+        <translation>رنگ و کنتراست آن دنبال نمی‌شود و شاید پیوندها باز نشوند.</translation>
+    </message>
 </context>
 </TS>
