@@ -27,9 +27,8 @@ std::string usualSessionBus() {
 
 }  // namespace
 
-host::ExitCode DoctorCommand::run(const DoctorOptions& options) {
-    using linux_::CheckUp;
-    CheckUp::Places places;
+linux_::CheckUp::Places DoctorCommand::places() {
+    linux_::CheckUp::Places places;
     places.configuration = linux_::XdgFolders::configurationFile();
     places.preferences =
         linux_::XdgFolders::state() / "preferences" / (std::string(platform::kSnippetsBundle) + ".json");
@@ -38,7 +37,12 @@ host::ExitCode DoctorCommand::run(const DoctorOptions& options) {
     places.language = linux_::LocaleRegion::sessionLanguage();
     places.sessionBus = environment("DBUS_SESSION_BUS_ADDRESS", usualSessionBus().c_str());
     places.systemBus = environment("DBUS_SYSTEM_BUS_ADDRESS", "unix:path=/run/dbus/system_bus_socket");
-    const auto findings = CheckUp::run(places);
+    return places;
+}
+
+host::ExitCode DoctorCommand::run(const DoctorOptions& options) {
+    using linux_::CheckUp;
+    const auto findings = CheckUp::run(places());
     const std::string text = options.json ? CheckUp::json(findings) : CheckUp::text(findings);
     auto code = CheckUp::isWell(findings) ? host::ExitCode::Ok : host::ExitCode::Failure;
     if (std::fputs(text.c_str(), stdout) == EOF || std::fflush(stdout) != 0) {

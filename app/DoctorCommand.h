@@ -2,6 +2,7 @@
 
 #include "app/KeepingOptions.h"
 #include "host/ExitCode.h"
+#include "linux/doctor/CheckUp.h"
 
 namespace ktr::app {
 
@@ -10,6 +11,8 @@ namespace ktr::app {
 class DoctorCommand {
   public:
     static host::ExitCode run(const DoctorOptions& options);
+    /// Where a check-up of this session looks.
+    static linux_::CheckUp::Places places();
 };
 
 }  // namespace ktr::app

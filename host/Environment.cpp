@@ -66,6 +66,21 @@ std::shared_ptr<linux_::QtLocalization> readTexts(const HostSettings& settings, 
     return texts;
 }
 
+/// None: the session's.
+std::optional<linux_::UnitSystem> chosenUnits(const HostSettings& settings) {
+    using Chosen = linux_::Configuration::Distances;
+    switch (settings.distances) {
+        case Chosen::Kilometres:
+            return linux_::UnitSystem::Metric;
+        case Chosen::Miles:
+            return linux_::LocaleRegion(settings.region).countryCode() == "GB" ? linux_::UnitSystem::ImperialUK
+                                                                               : linux_::UnitSystem::ImperialUS;
+        case Chosen::System:
+            break;
+    }
+    return std::nullopt;
+}
+
 /// Lengths on maps are shown in the units of the distances beside them, whatever decides those.
 platform::LengthSystem lengthSystem(const Platform& platform) {
     platform::DistanceCalculator::Settings settings;
@@ -138,7 +153,8 @@ std::optional<Failure> Environment::fill(Platform& made, const HostSettings& set
     // A picture or a text must not depend on whose session it is made in.
     using Distances = linux_::IcuDistanceCalculatorFactory;
     made.distanceCalculators = std::make_shared<Distances>(
-        made.geodesy, isVirtual_ ? std::nullopt : std::optional(Distances::sessionPreferences()));
+        made.geodesy, isVirtual_ ? std::nullopt : std::optional(Distances::sessionPreferences()),
+        chosenUnits(settings));
     if (earlier != nullptr) {
         // Whoever walks goes on from where they are.
         made.locationManagers = earlier->locationManagers;
@@ -174,7 +190,8 @@ std::optional<Environment::Contacts> Environment::readContacts(const HostSetting
     if (!isLive) {
         return linux_::ContactFiles::read(settings.contacts, error);
     }
-    userContacts = std::make_unique<linux_::UserContacts>(platform->mainLoop, settings.contacts);
+    userContacts =
+        std::make_unique<linux_::UserContacts>(platform->mainLoop, settings.contacts, "", settings.addressBooks);
     auto contacts = userContacts->first(linux_::UserContacts::kFirstWait, error);
     return error.empty() ? std::optional(std::move(contacts)) : std::nullopt;
 }

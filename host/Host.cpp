@@ -78,9 +78,17 @@ void Host::configurationChanged() {
         environment_.userContacts->setPaths(now.contacts);
         now.contacts = settings_.contacts;
     }
+    if (std::exchange(settings_.addressBooks, now.addressBooks) != now.addressBooks) {
+        environment_.userContacts->setUsesBooks(now.addressBooks);
+    }
     if (isMoreThanContacts) {
         remakeOrSay(now, nullptr);
     }
+}
+
+void Host::askAgain() {
+    // A copy: what is decided now becomes what it was decided of.
+    remakeOrSay(HostSettings(settings_), nullptr);
 }
 
 void Host::remakeOrSay(const HostSettings& settings, const Environment::Contacts* contacts) {

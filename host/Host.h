@@ -59,6 +59,8 @@ class Host {
     /// and what is in them do not; `remade` is called at the end, and whoever shows the conversation lays it out again.
     /// With a failure everything stays as it was, unless it is the plugin that fails: then there are no cards.
     std::optional<Failure> remake(const HostSettings& settings) { return remake(settings, nullptr); }
+    /// The same for what has not changed: each card asks at once, as it did when it came.
+    void askAgain();
     /// Called after `remake`.
     void setRemade(std::function<void()> remade) { remade_ = std::move(remade); }
     /// Called in `remake` while what is there is still whole: what belongs to its platform has to go now.

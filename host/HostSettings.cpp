@@ -50,9 +50,9 @@ std::variant<HostSettings, Failure> HostSettings::decide(const HostOptions& opti
     settings.said.textSize = either(options.textSize, firstOf(scenarios, &Scenario::textSize));
     settings.scale = options.scale;
     settings.width = options.width > 0.0 ? options.width : usualWidth(settings.idiom);
-    settings.dark = either(options.dark, firstOf(scenarios, &Scenario::dark));
+    settings.said.dark = either(options.dark, firstOf(scenarios, &Scenario::dark));
     settings.userName = firstOf(scenarios, &Scenario::userName);
-    settings.highContrast = options.highContrast;
+    settings.said.highContrast = options.highContrast;
     const documents::IsoTime start = firstOf(scenarios, &Scenario::clock).value_or(options.at.value_or(now));
     settings.start = start.date;
     settings.offsetSeconds = start.offsetSeconds;
@@ -97,6 +97,15 @@ void HostSettings::follow(const linux_::Configuration& configuration) {
     country = either(said.country, countryOf(region));
     configuredTextSize = configuration.textSize;
     decideTextSize();
+    using Colors = linux_::Configuration::Colors;
+    const Colors colors = configuration.colors;
+    dark = said.dark;
+    if (!dark && (colors == Colors::Light || colors == Colors::Dark)) {
+        dark = colors == Colors::Dark;
+    }
+    highContrast = said.highContrast || colors == Colors::HighContrast;
+    distances = configuration.distances;
+    addressBooks = configuration.addressBooks;
     contacts = said.contacts;
     contacts.insert(contacts.end(), configuration.contacts.begin(), configuration.contacts.end());
 }

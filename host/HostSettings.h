@@ -22,10 +22,12 @@ struct HostSettings {
     std::optional<std::string> country;  ///< of the phone numbers
     platform::ContentSizeCategory textSize = platform::ContentSizeCategory::L;
     platform::UserInterfaceIdiom idiom = platform::UserInterfaceIdiom::Phone;
-    double scale = 1.0;                 ///< pixels a point
-    double width = 400.0;               ///< points
-    std::optional<bool> dark;           ///< none: as the session has it
-    bool highContrast = false;          ///< as options say
+    double scale = 1.0;         ///< pixels a point
+    double width = 400.0;       ///< points
+    std::optional<bool> dark;   ///< none: as the session has it
+    bool highContrast = false;  ///< as options or the configuration say
+    linux_::Configuration::Distances distances = linux_::Configuration::Distances::System;
+    bool addressBooks = true;           ///< whether the desktop's are read, where something is live
     platform::Date start;               ///< the conversation's first moment
     int offsetSeconds = 0;              ///< of the clock face that is shown, east of UTC
     double runSeconds = 0.0;            ///< from the start to the moment of the picture
@@ -44,6 +46,8 @@ struct HostSettings {
         std::optional<std::string> country;
         std::optional<platform::ContentSizeCategory> textSize;
         std::vector<std::string> contacts;
+        std::optional<bool> dark;
+        bool highContrast = false;
     };
     Said said;
     /// The configuration's.
@@ -59,7 +63,8 @@ struct HostSettings {
     /// Where anybody wishes it.
     bool drawsHighContrast() const { return highContrast || desktopHighContrast; }
 
-    /// Decides again what a configuration has a word in: language, region, country, text size and contacts.
+    /// Decides again what a configuration has a word in: language, region, country, text size, colours, units and
+    /// contacts.
     void follow(const linux_::Configuration& configuration);
     /// Decides the text size again: as said, else configured, else the desktop's, else the idiom's usual one.
     void decideTextSize();

@@ -117,13 +117,14 @@ void AskField::mousePressEvent(QMouseEvent*) {
 
 void AskField::resizeEvent(QResizeEvent*) {
     const int buttonSize = button_->sizeHint().width();
-    const int editWidth = width() - 2 * kAround - kStart - kEnd - SendButton::kDiameter - kStart / 2;
+    const int editWidth =
+        width() - 2 * kAround - kStart - kEnd - SendButton::kDiameter - kStart / 2 + QuestionEdit::kBefore;
     const int editHeight = shapeHeight() - 8;
     const bool mirrored = layoutDirection() == Qt::RightToLeft;
     const int buttonX = kAround + kEnd - SendButton::kAround;
     button_->setGeometry(mirrored ? buttonX : width() - buttonX - buttonSize, (height() - buttonSize) / 2, buttonSize,
                          buttonSize);
-    const int editX = kAround + kStart;
+    const int editX = kAround + kStart - QuestionEdit::kBefore;
     edit_->setGeometry(mirrored ? width() - editX - editWidth : editX, (height() - editHeight) / 2, editWidth,
                        editHeight);
 }

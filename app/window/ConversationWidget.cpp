@@ -5,6 +5,7 @@
 #include <QStyle>
 #include <algorithm>
 #include <cmath>
+#include <utility>
 
 #include "app/window/AccessibleConversation.h"
 #include "app/window/ScrollBarStyle.h"
@@ -102,6 +103,7 @@ AccessibleConversation& ConversationWidget::accessible() {
 void ConversationWidget::remade() {
     setLayoutDirection(host_.rightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
     rows_.setRightToLeft(host_.rightToLeft());
+    choosePalette();
     // What it waits with has gone with the platform.
     voice_ = std::make_unique<Voice>(host_, *this);
     layOut();
@@ -112,7 +114,7 @@ double ConversationWidget::seconds() const {
 }
 
 void ConversationWidget::choosePalette() {
-    const bool systemIsDark = QApplication::palette().color(QPalette::Window).lightness() < 128;
+    const bool systemIsDark = desktopDark_.value_or(QApplication::palette().color(QPalette::Window).lightness() < 128);
     const host::HostSettings& settings = host_.settings();
     const bool highContrast = settings.drawsHighContrast();
     palette_ = &Palette::of(settings.dark.value_or(systemIsDark) ? ColorScheme::Dark : ColorScheme::Light,
@@ -315,6 +317,12 @@ void ConversationWidget::answerCame(host::TurnView& turn) {
     turn.answerArrives(seconds());
     layOut();
     voice_->answerCame(turn);
+}
+
+void ConversationWidget::setDesktopDark(std::optional<bool> dark) {
+    if (std::exchange(desktopDark_, dark) != dark) {
+        choosePalette();
+    }
 }
 
 void ConversationWidget::setHighContrast(bool high) {

@@ -46,6 +46,8 @@ class ConversationWidget : public QWidget {
     void setSeen(bool seen);
     /// The desktop's wish, besides that of the options; the host has it too, for its stills.
     void setHighContrast(bool high);
+    /// The desktop's colours; none: those of the toolkit.
+    void setDesktopDark(std::optional<bool> dark);
     const linux_::Palette& colors() const { return *palette_; }
     /// Called after the colours have become others.
     void setPaletteChanged(std::function<void()> changed) { paletteChanged_ = std::move(changed); }
@@ -126,6 +128,7 @@ class ConversationWidget : public QWidget {
     std::shared_ptr<Client> client_;
     std::shared_ptr<platform::TouchDispatcher> touches_;
     RowFocus rows_;
+    std::optional<bool> desktopDark_;
     const linux_::Palette* palette_;
     std::function<void()> paletteChanged_;
     std::unique_ptr<Voice> voice_;

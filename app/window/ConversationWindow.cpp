@@ -44,7 +44,7 @@ ConversationWindow::ConversationWindow(host::Host& host)
     }
     pages_ = new PageStack(this);
     pages_->setBelow([this](bool isSeen) {
-        for (QWidget* part : std::initializer_list<QWidget*>{conversation_, field_, status_}) {
+        for (QWidget* part : std::initializer_list<QWidget*>{conversation_, field_, status_, settings_}) {
             if (part != nullptr) {
                 part->setVisible(isSeen && (part != status_ || !isVeryLow()));
             }
@@ -89,9 +89,15 @@ void ConversationWindow::addField() {
     field_->setAsked([this](const std::string& question) { live_->ask(question); });
     field_->edit().installEventFilter(this);
     status_ = new StatusLine(this);
-    // From the field to the newest answer, and on to the button.
+    status_->setHelped([this] { help(); });
+    settings_ = new IconButton(Icon::Settings, IconButton::Tone::Soft, this);
+    settings_->setPressed([this] { showSettings(); });
+    settings_->setName(QString::fromStdString(host_.text("SETTINGS")));
+    // From the field to the newest answer, and on to the buttons.
     setTabOrder(&field_->edit(), conversation_);
     setTabOrder(conversation_, &field_->button());
+    setTabOrder(&field_->button(), &status_->help());
+    setTabOrder(&status_->help(), settings_);
     setFocusProxy(&field_->edit());
     field_->edit().setFocus();
     greeting_ = new Greeting(host_, this);
@@ -108,6 +114,9 @@ void ConversationWindow::addField() {
                         }});
     statusTimer_.setSingleShot(true);
     host_.live()->setLockChanged([this] { sight_.look(); });
+    // Ages and times of the day are others now, and what was known is old.
+    timeJumps_ = std::make_unique<linux_::TimeJumps>();
+    timeJumps_->setJumped([this] { host_.askAgain(); });
     connect(&statusTimer_, &QTimer::timeout, this, [this] { showStatus(); });
 }
 
@@ -131,6 +140,8 @@ void ConversationWindow::remade() {
         field_->edit().setMenuTexts(menuTexts());
         field_->refreshFont();
         status_->refreshFont();
+        settings_->setName(QString::fromStdString(host_.text("SETTINGS")));
+        settings_->refresh();
         showStatus();
     }
     pages_->refresh();
@@ -180,13 +191,30 @@ void ConversationWindow::offerSignIn() {
         host_, std::make_unique<linux_::SignIn>(host_.settings().liveConfiguration.value_or("")),
         SignInPage::Before{account.host.value_or(""), account.personId});
     page->setDone([this] { pages_->closeAll(); });
+    SignInPage& opened = *page;
     pages_->closeAll();
     pages_->open(std::move(page));
+    if (!linkToSignIn_.empty()) {
+        opened.offerLink(QString::fromStdString(std::exchange(linkToSignIn_, "")));
+    }
+}
+
+void ConversationWindow::help() {
+    if (live_->status().help == host::LiveStatus::Help::TryNow) {
+        live_->tryNow();
+    } else {
+        showCheckUp();
+    }
 }
 
 void ConversationWindow::showStatus() {
     const host::LiveStatus now = live_->status();
     status_->setStatus(now);
+    const char* const help = now.help == host::LiveStatus::Help::TryNow    ? "STATUS_TRY_NOW"
+                             : now.help == host::LiveStatus::Help::CheckUp ? "CHECK_UP"
+                                                                           : nullptr;
+    const QString helpBefore = status_->help().words();
+    status_->setHelp(help == nullptr ? QString() : QString::fromStdString(host_.text(help)));
     if (std::exchange(wantsSignIn_, now.wantsSignIn) != now.wantsSignIn) {
         if (now.wantsSignIn) {
             offerSignIn();
@@ -195,9 +223,12 @@ void ConversationWindow::showStatus() {
             pages_->closeAll();
         }
     }
+    if (!linkToSignIn_.empty() && host_.live()->isSignedIn()) {
+        offerLink(std::exchange(linkToSignIn_, ""));
+    }
     greet(now);
     field_->setTexts(fieldTexts());
-    if (!isVeryLow() && !status_->isPlaced()) {
+    if (!isVeryLow() && (!status_->isPlaced() || status_->help().words() != helpBefore)) {
         place();
     }
     // A line that nobody sees is written when somebody does.
@@ -233,6 +264,7 @@ void ConversationWindow::choosePalette() {
     if (field_ != nullptr) {
         field_->setColors(conversation_->colors());
         status_->setColors(conversation_->colors());
+        settings_->setLook({&conversation_->colors(), false});
     }
     chooseMotion();
     if (greeting_ != nullptr) {
@@ -296,6 +328,13 @@ void ConversationWindow::place() {
     status_->place({x, y + fieldHeight + kFieldToStatus, across, status_->heightForWidth(across)});
     status_->setVisible(!isVeryLow() && !conversation_->isHidden());
     field_->raise();
+    constexpr int kSettingsTop = 8;
+    const int side = IconButton::side();
+    const int end = static_cast<int>(host::measures::kGutter);
+    settings_->placeShape({host_.rightToLeft() ? end : width() - end - side, kSettingsTop, side, side});
+    settings_->raise();
+    pages_->raise();
+    notice_->raise();
 }
 
 void ConversationWindow::paintEvent(QPaintEvent* event) {
@@ -310,6 +349,10 @@ void ConversationWindow::keyPressEvent(QKeyEvent* event) {
         return;
     }
     if (changeTextSize(*event)) {
+        return;
+    }
+    if (event->modifiers() == Qt::ControlModifier && event->key() == Qt::Key_Comma && live_ && !pages_->isOpen()) {
+        showSettings();
         return;
     }
     if (event->key() == Qt::Key_Escape && field_ != nullptr) {
@@ -334,6 +377,7 @@ void ConversationWindow::follow(linux_::DesktopSettings& desktop, bool reducedMo
 void ConversationWindow::desktopChanged() {
     const auto& values = desktop_->values();
     chooseMotion();
+    conversation_->setDesktopDark(values.dark);
     conversation_->setHighContrast(values.highContrast.value_or(false));
     decideTextSize();
 }

@@ -14,9 +14,12 @@
 #include "app/window/PlainWidget.h"
 #include "app/window/StatusLine.h"
 #include "app/window/WindowSight.h"
+#include "app/window/blocks/IconButton.h"
+#include "app/window/friend/SharingRow.h"
 #include "app/window/pages/PageStack.h"
 #include "host/live/LiveConversation.h"
 #include "linux/device/DesktopSettings.h"
+#include "linux/device/TimeJumps.h"
 
 namespace ktr::app {
 
@@ -43,6 +46,8 @@ class ConversationWindow : public PlainWidget {
     /// None where nothing is live.
     AskField* field() const { return field_; }
     StatusLine* status() const { return status_; }
+    /// Opens the settings; none where nothing is live.
+    IconButton* settings() const { return settings_; }
     /// What covers the conversation: settings, a friend, signing in.
     PageStack& pages() const { return *pages_; }
 
@@ -54,8 +59,10 @@ class ConversationWindow : public PlainWidget {
 
   private:
     void addField();
+    void offerLink(const std::string& link);
     void showFriend(const host::KnownFriends::Known& known, FriendPage::Asks asks);
     void showSelf();
+    SharingRow::Wish sharingWish() const;
     void showFriends();
     void say(const std::string& sentence);
     void choosePalette();
@@ -66,6 +73,10 @@ class ConversationWindow : public PlainWidget {
     /// Asks for the account where that is missing.
     void offerSignIn();
     void showStatus();
+    /// What the status line's button promises.
+    void help();
+    void showSettings();
+    void showCheckUp();
     /// Whether anybody sees the window has become another.
     void sightChanged();
     /// Tells the cards, and what shows of them, whether a page covers them.
@@ -89,6 +100,7 @@ class ConversationWindow : public PlainWidget {
     AskField* field_ = nullptr;
     StatusLine* status_ = nullptr;
     PageStack* pages_;
+    IconButton* settings_ = nullptr;  ///< none where nothing is live
     /// None where nothing is live, and once something was asked.
     Greeting* greeting_ = nullptr;
     Notice* notice_;
@@ -96,6 +108,9 @@ class ConversationWindow : public PlainWidget {
     QTimer statusTimer_;
     /// What the status said last: a page that was answered is not shown again before the answer counts.
     bool wantsSignIn_ = false;
+    /// That somebody sent before it was known whether anybody is signed in.
+    std::string linkToSignIn_;
+    std::unique_ptr<linux_::TimeJumps> timeJumps_;  ///< none where nothing is live
     WindowSight sight_;
     CaretRest caretRest_;
     linux_::DesktopSettings* desktop_ = nullptr;

@@ -19,6 +19,10 @@ namespace ktr::app {
 namespace {
 
 constexpr int kCaretWidth = 2;
+/// From the caret on an empty line to the words that stand in for one.
+constexpr int kCaretBefore = 3;
+/// What Qt adds to the margins on both sides of a line's text.
+constexpr int kOwnMargin = 2;
 /// What Qt adds before the caret in the rectangle that it gives.
 constexpr int kCaretSlack = 5;
 
@@ -35,7 +39,6 @@ class QuestionEdit::CaretlessStyle : public QProxyStyle {
 QuestionEdit::QuestionEdit(QWidget* parent) : QLineEdit(parent), style_(std::make_unique<CaretlessStyle>()) {
     setStyle(style_.get());
     setFrame(false);
-    setTextMargins(0, 0, 0, 0);
     alignToStart();
     grabGesture(Qt::TapAndHoldGesture);
     connect(&blink_, &QTimer::timeout, this, [this] {
@@ -64,6 +67,9 @@ void QuestionEdit::setColors(const linux_::Palette& palette) {
 }
 
 void QuestionEdit::alignToStart() {
+    constexpr int kMargin = kBefore - kOwnMargin;
+    const bool isMirrored = layoutDirection() == Qt::RightToLeft;
+    setTextMargins(isMirrored ? 0 : kMargin, 0, isMirrored ? kMargin : 0, 0);
     // By itself, an empty line begins where the keyboard's language does, away from the words that stand in for a
     // question.
     setAlignment(layoutDirection() == Qt::RightToLeft ? Qt::AlignRight | Qt::AlignAbsolute | Qt::AlignVCenter
@@ -79,6 +85,11 @@ void QuestionEdit::changeEvent(QEvent* event) {
 
 QRect QuestionEdit::caret() const {
     const QRect around = cursorRect();
+    if (text().isEmpty() && !composing_) {
+        const int x = layoutDirection() == Qt::RightToLeft ? width() - kBefore + kCaretBefore - kCaretWidth
+                                                           : kBefore - kCaretBefore;
+        return {x, around.y(), kCaretWidth, around.height()};
+    }
     return {std::min(around.x() + kCaretSlack, width() - kCaretWidth), around.y(), kCaretWidth, around.height()};
 }
 
@@ -102,7 +113,9 @@ void QuestionEdit::paintEvent(QPaintEvent* event) {
         QPainter painter(this);
         painter.setFont(hintFont());
         painter.setPen(hint_);
-        painter.drawText(rect(), static_cast<int>(alignment()) | Qt::TextSingleLine, placeholderText());
+        const bool isMirrored = layoutDirection() == Qt::RightToLeft;
+        const QRect line = rect().adjusted(isMirrored ? 0 : kBefore, 0, isMirrored ? -kBefore : 0, 0);
+        painter.drawText(line, static_cast<int>(alignment()) | Qt::TextSingleLine, placeholderText());
     }
     if (hasFocus() && caretShown_ && !hasSelectedText()) {
         QPainter painter(this);
@@ -114,7 +127,7 @@ QFont QuestionEdit::hintFont() const {
     constexpr int kSmallest = 8;  // pixels
     QFont small = font();
     const auto fits = [this](const QFont& tried) {
-        return QFontMetricsF(tried).horizontalAdvance(placeholderText()) <= width();
+        return QFontMetricsF(tried).horizontalAdvance(placeholderText()) <= width() - kBefore;
     };
     while (!fits(small) && small.pixelSize() > kSmallest) {
         small.setPixelSize(small.pixelSize() - 1);

@@ -13,6 +13,9 @@ namespace ktr::app {
 /// in pine. Main thread.
 class QuestionEdit : public QLineEdit {
   public:
+    /// From its start edge to its text and its placeholder: room for the caret, which stands before an empty line.
+    static constexpr int kBefore = 5;
+
     explicit QuestionEdit(QWidget* parent = nullptr);
     ~QuestionEdit() override;
 

@@ -11,6 +11,8 @@ namespace ktr::app {
 
 namespace {
 
+/// From the line's end to the button, whose words end 15 from it.
+constexpr int kHelpEnd = 7;
 constexpr double kDot = 8.0;
 constexpr double kRingStroke = 1.5;
 constexpr double kWarning = 14.0;
@@ -46,11 +48,23 @@ QPainterPath hiddenPath() {
     return path;
 }
 
+/// Listeners meet it also while it is hidden, and take one without a name for a fault.
+void nameWithoutWords(Button& button) {
+    if (button.words().isEmpty()) {
+        button.setAccessibleName(QStringLiteral("-"));
+    }
+}
+
 }  // namespace
 
 StatusLine::StatusLine(QWidget* parent)
-    : PlainWidget(parent), words_(new StatusWords(this)), palette_(&linux_::Palette::of(linux_::ColorScheme::Light)) {
+    : PlainWidget(parent),
+      words_(new StatusWords(this)),
+      help_(new Button(Button::Kind::Line, {}, Icon::None, parent == nullptr ? this : parent)),
+      palette_(&linux_::Palette::of(linux_::ColorScheme::Light)) {
     words_->setTextFormat(Qt::PlainText);
+    help_->hide();
+    nameWithoutWords(*help_);
     refreshFont();
 }
 
@@ -58,10 +72,40 @@ void StatusLine::refreshFont() {
     lineHeight_ = static_cast<int>(std::ceil(platform::preferredFont(platform::TextStyle::Footnote).lineHeight()));
     words_->setContentsMargins(0, overhang(), 0, overhang());
     words_->update();
+    help_->refresh();
 }
 
 void StatusLine::place(const QRect& lines) {
     setGeometry(lines.adjusted(0, -overhang(), 0, overhang()));
+    const int across = help_->naturalWidth();
+    const int high = help_->shapeHeight(across);
+    const int x = layoutDirection() == Qt::RightToLeft ? lines.left() + kHelpEnd
+                                                       : lines.left() + lines.width() - kHelpEnd - across;
+    help_->placeShape({x, lines.top() + (lineHeight_ - high) / 2, across, high});
+}
+
+int StatusLine::helpRoom() const {
+    return help_->words().isEmpty() ? 0 : help_->naturalWidth() + kHelpEnd;
+}
+
+void StatusLine::setHelp(const QString& words) {
+    if (help_->words() != words) {
+        help_->setWords(words);
+        nameWithoutWords(*help_);
+        showHelp();
+    }
+}
+
+void StatusLine::showHelp() {
+    help_->setVisible(isVisible() && !help_->words().isEmpty());
+}
+
+void StatusLine::showEvent(QShowEvent*) {
+    showHelp();
+}
+
+void StatusLine::hideEvent(QHideEvent*) {
+    help_->hide();
 }
 
 bool StatusLine::isPlaced() const {
@@ -69,7 +113,7 @@ bool StatusLine::isPlaced() const {
 }
 
 int StatusLine::heightForWidth(int width) const {
-    return std::max(lineHeight_, words_->heightForWidth(width - kWords));
+    return std::max(lineHeight_, words_->heightForWidth(width - kWords - helpRoom()));
 }
 
 void StatusLine::setStatus(const host::LiveStatus& status) {
@@ -86,12 +130,14 @@ void StatusLine::setStatus(const host::LiveStatus& status) {
 void StatusLine::setColors(const linux_::Palette& palette) {
     palette_ = &palette;
     words_->setColors(palette);
+    help_->setLook({&palette, help_->look().isStill});
     update();
 }
 
 void StatusLine::resizeEvent(QResizeEvent*) {
     const bool mirrored = layoutDirection() == Qt::RightToLeft;
-    words_->setGeometry(mirrored ? 0 : kWords, 0, std::max(width() - kWords, 0), height());
+    const int room = helpRoom();
+    words_->setGeometry(mirrored ? room : kWords, 0, std::max(width() - kWords - room, 0), height());
 }
 
 void StatusLine::paintEvent(QPaintEvent*) {

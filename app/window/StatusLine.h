@@ -1,7 +1,10 @@
 #pragma once
 
+#include <functional>
+
 #include "app/window/PlainWidget.h"
 #include "app/window/StatusWords.h"
+#include "app/window/blocks/Button.h"
 #include "host/live/LiveStatus.h"
 #include "linux/paint/Palette.h"
 
@@ -17,6 +20,10 @@ class StatusLine : public PlainWidget {
     explicit StatusLine(QWidget* parent = nullptr);
 
     void setStatus(const host::LiveStatus& status);
+    /// What mends it stands at its end, a button of the parent's, since it is higher than a line. Empty: nothing.
+    void setHelp(const QString& words);
+    void setHelped(std::function<void()> helped) { help_->setPressed(std::move(helped)); }
+    Button& help() const { return *help_; }
     void setColors(const linux_::Palette& palette);
     QString words() const { return words_->text(); }
     /// Where the text size has become another.
@@ -32,11 +39,17 @@ class StatusLine : public PlainWidget {
   protected:
     void paintEvent(QPaintEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
+    void showEvent(QShowEvent* event) override;
+    void hideEvent(QHideEvent* event) override;
 
   private:
     int overhang() const { return lineHeight_ / 4; }
+    /// Of the words' end from the line's.
+    int helpRoom() const;
+    void showHelp();
 
     StatusWords* words_;
+    Button* help_;
     const linux_::Palette* palette_;
     host::LiveStatus::Mark mark_ = host::LiveStatus::Mark::None;
     int lineHeight_ = 0;

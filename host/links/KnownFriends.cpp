@@ -136,12 +136,16 @@ std::string KnownFriends::shortNameOf(const VAKtrLocation& location) {
     return person && person->firstName && !person->firstName->empty() ? *person->firstName : nameOf(location);
 }
 
+bool KnownFriends::isCalled(const VAKtrLocation& location, const std::string& handle) {
+    const auto handles = handlesOf(location);
+    return std::any_of(handles.begin(), handles.end(),
+                       [wanted = plain(handle)](const auto& one) { return plain(one) == wanted; });
+}
+
 std::optional<KnownFriends::Known> KnownFriends::find(const std::string& handle) const {
-    const std::string wanted = plain(handle);
     for (const auto& snippet : host_.snippets()) {
         for (const auto& location : friendsIn(snippet)) {
-            const auto handles = location ? handlesOf(*location) : std::vector<std::string>();
-            if (std::any_of(handles.begin(), handles.end(), [&](const auto& one) { return plain(one) == wanted; })) {
+            if (location && isCalled(*location, handle)) {
                 return Known{location, contextOf(snippet)};
             }
         }
@@ -169,9 +173,14 @@ std::optional<KnownFriends::Known> KnownFriends::fromContacts(const std::string&
     if (!contact) {
         return std::nullopt;
     }
+    Known known = named(fullNameOf(*contact), handle);
+    known.location->friend_->object->firstName = contact->givenName;
+    return known;
+}
+
+KnownFriends::Known KnownFriends::named(const std::string& name, const std::string& handle) {
     auto person = std::make_shared<VAPerson>();
-    person->fullName = fullNameOf(*contact);
-    person->firstName = contact->givenName;
+    person->fullName = name;
     if (handle.find('@') != std::string::npos) {
         person->emails.push_back(std::make_shared<VAEmail>());
         person->emails.back()->emailAddress = handle;

@@ -29,6 +29,10 @@ class KnownFriends {
     std::vector<Known> all() const;
     /// A friend of whom only a contact tells; none for a handle that no contact has.
     static std::optional<Known> fromContacts(const std::string& handle);
+    /// A friend of whom nothing is known but this; without a name the handle stands for one.
+    static Known named(const std::string& name, const std::string& handle);
+    /// Whether one of this friend's handles is that one, however it is written.
+    static bool isCalled(const platform::VAKtrLocation& location, const std::string& handle);
     /// Null for a handle that no contact has.
     static std::shared_ptr<platform::Contact> contactOf(const std::string& handle);
 

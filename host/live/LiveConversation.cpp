@@ -28,6 +28,8 @@ std::string trimmed(const std::string& text) {
 
 }  // namespace
 
+LiveConversation::LiveConversation(Host& host) : host_(host), requests_([&host] { return host.platform(); }) {}
+
 std::shared_ptr<LiveConversation> LiveConversation::make(Host& host) {
     std::shared_ptr<LiveConversation> live(new LiveConversation(host));
     host.live()->setChanged([weak = std::weak_ptr<LiveConversation>(live)] {
@@ -84,16 +86,48 @@ void LiveConversation::ask(const std::string& text) {
     }
     ++asking_;
     askedAt_ = now();
-    waiting_.push_back({turn, question, nullptr});
+    waiting_.push_back({turn, question, std::nullopt, nullptr});
     sendNext();
     tellChanged();
 }
 
-void LiveConversation::wishToBeSeen(std::optional<bool> isSeen, std::function<void(std::optional<bool>)> said) {
-    // The assistant's own words for it (docs/service-protocol.md).
-    const char* const words = !isSeen ? "Am I hidden?" : *isSeen ? "Share my location" : "Hide my location";
-    waiting_.push_back({{}, words, std::move(said)});
+void LiveConversation::wishToBeSeen(std::optional<bool> isSeen, std::function<void(const Sharing&)> said) {
+    waiting_.push_back({{}, {}, isSeen, std::move(said)});
     sendNext();
+}
+
+void LiveConversation::whoShares(std::function<void(const std::vector<Sharer>&)> told) {
+    if (!ready_) {
+        // Nobody is signed in before the account is read: this waits behind a question that does.
+        wishToBeSeen(std::nullopt, [weak = weak_from_this(), told = std::move(told)](const Sharing&) {
+            if (const auto self = weak.lock()) {
+                self->whoShares(told);
+            }
+        });
+        return;
+    }
+    requests_.send("friends", {}, [told = std::move(told)](const ask::ServiceReply& reply) {
+        const platform::Value* listed = reply.body.find("friends");
+        const auto* friends = listed != nullptr ? listed->array() : nullptr;
+        std::vector<Sharer> sharers;
+        for (const platform::Value& one : friends != nullptr ? *friends : platform::Value::Array()) {
+            const platform::Dictionary* members = one.dictionary();
+            const auto text = [members](const char* name) {
+                const platform::Value* member = members != nullptr ? members->find(name) : nullptr;
+                return member != nullptr && member->string() != nullptr ? *member->string() : std::string();
+            };
+            if (!text("handle").empty()) {
+                sharers.push_back({text("name"), text("handle")});
+            }
+        }
+        told(sharers);
+    });
+}
+
+void LiveConversation::tryNow() {
+    // What it answers counts as a sign of life, whatever is in it.
+    requests_.send("getlocations", {{"handles", platform::Value::Array()}}, [](const ask::ServiceReply&) {});
+    host_.askAgain();
 }
 
 void LiveConversation::sendNext() {
@@ -108,13 +142,20 @@ void LiveConversation::sendNext() {
         refusal.sentence = LocalizedText(host_.text("ANSWER_RESTRICTED"));
         host_.platform()->mainLoop->post([weak = weak_from_this(), asked, refusal] {
             if (const auto self = weak.lock()) {
-                self->receive(asked, refusal);
+                asked.said ? self->receiveWish(asked, {ask::ServiceReply::Failure::Refused})
+                           : self->receive(asked, refusal);
             }
         });
         return;
     }
-    // Whatever the question is: it may be a wish to hide, which only the assistant can tell.
-    host_.endSharing();
+    if (!asked.said || asked.isSeen) {
+        // Whatever the question is: it may be a wish to hide, which only the assistant can tell.
+        host_.endSharing();
+    }
+    if (asked.said) {
+        sendWish(asked);
+        return;
+    }
     // The assistant's client ends before the loop does, and what it posts after this has gone does nothing.
     platform::MainLoop* const mainLoop = host_.platform()->mainLoop.get();
     host_.live()->assistant().ask(asked.question, [weak = weak_from_this(), mainLoop, asked](auto answer) {
@@ -126,19 +167,31 @@ void LiveConversation::sendNext() {
     });
 }
 
-void LiveConversation::receiveWish(const Waiting& asked, const Scenario& answer) {
+void LiveConversation::sendWish(const Waiting& asked) {
+    const char* const wish = !asked.isSeen ? "read" : *asked.isSeen ? "share" : "hide";
+    requests_.send("sharing", {{"wish", wish}}, [weak = weak_from_this(), asked](const ask::ServiceReply& reply) {
+        if (const auto self = weak.lock()) {
+            self->receiveWish(asked, reply);
+        }
+    });
+}
+
+void LiveConversation::receiveWish(const Waiting& asked, const ask::ServiceReply& reply) {
     underWay_ = false;
-    const auto sharing = std::dynamic_pointer_cast<platform::VAKtrVisibilityView>(answer.snippet);
-    asked.said(sharing ? std::optional(sharing->visible) : std::nullopt);
+    const platform::Value* hidden = reply.body.find("hidden");
+    const auto isHidden = hidden != nullptr ? hidden->boolean() : std::nullopt;
+    Sharing sharing{std::nullopt, reply.failure};
+    if (isHidden) {
+        sharing.isSeen = !*isHidden;
+    } else if (reply.failure == ask::ServiceReply::Failure::None) {
+        sharing.failure = ask::ServiceReply::Failure::Unreachable;
+    }
+    asked.said(sharing);
     sendNext();
     tellChanged();
 }
 
 void LiveConversation::receive(const Waiting& asked, const Scenario& answer) {
-    if (asked.said) {
-        receiveWish(asked, answer);
-        return;
-    }
     underWay_ = false;
     if (--asking_ == 0) {
         askedAt_.reset();

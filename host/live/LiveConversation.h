@@ -8,7 +8,9 @@
 #include <variant>
 #include <vector>
 
+#include "ask/Ports.h"
 #include "host/Host.h"
+#include "host/asking/ServiceRequests.h"
 #include "host/live/LiveStatus.h"
 #include "platform/location/PlatformLocationManager.h"
 
@@ -36,9 +38,25 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
     /// Blanks at both ends do not count; a question of nothing else is none.
     void ask(const std::string& question);
 
-    /// Says to the assistant that friends shall see the user, or shall not, or with none asks how it is: one request,
-    /// in its turn among the questions. `said` hears once how it is then; none where nobody said.
-    void wishToBeSeen(std::optional<bool> isSeen, std::function<void(std::optional<bool>)> said);
+    /// What the service says of the user's own sharing.
+    struct Sharing {
+        std::optional<bool> isSeen;  ///< by those whom a rule allows; none: it did not say
+        ask::ServiceReply::Failure failure = ask::ServiceReply::Failure::None;
+    };
+    /// Says to the service that friends shall see the user, or shall not, or with none asks how it is: one request, in
+    /// its turn among the questions. `said` hears once how it is then.
+    void wishToBeSeen(std::optional<bool> isSeen, std::function<void(const Sharing&)> said);
+
+    /// Somebody who lets the user see where they are.
+    struct Sharer {
+        std::string name;
+        std::string handle;
+    };
+    /// Asks the service for all of them; nobody is told where it does not say.
+    void whoShares(std::function<void(const std::vector<Sharer>&)> told);
+
+    /// Asks at once whether the service is there again, and for what is on screen.
+    void tryNow();
 
     LiveStatus status() const;
     /// After how many seconds that may be another although nothing happens. None: never.
@@ -55,14 +73,16 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
     struct Waiting {
         std::weak_ptr<TurnView> turn;  ///< of a question; a wish has none
         std::string question;
-        std::function<void(std::optional<bool>)> said;  ///< of a wish
+        std::optional<bool> isSeen;                ///< of a wish
+        std::function<void(const Sharing&)> said;  ///< of a wish
     };
-    explicit LiveConversation(Host& host) : host_(host) {}
+    explicit LiveConversation(Host& host);
     void accountRead();
     /// Sends the question that waits longest, unless one is under way.
     void sendNext();
     void receive(const Waiting& asked, const Scenario& answer);
-    void receiveWish(const Waiting& asked, const Scenario& answer);
+    void sendWish(const Waiting& asked);
+    void receiveWish(const Waiting& asked, const ask::ServiceReply& reply);
     /// What to show for an answer; sets `failure_`.
     Scenario read(const linux_::AssistantClient::Answer& answer);
     /// Something has come on screen: an answer of the assistant's, or a scenario.
@@ -71,6 +91,7 @@ class LiveConversation : public platform::PlatformLocationManagerDelegate,
     platform::Date now() const;
 
     Host& host_;
+    ServiceRequests requests_;
     Handlers handlers_;
     bool ready_ = false;
     /// In the order they were asked. One at a time is sent: a question may be a wish, such as to hide, and the last one

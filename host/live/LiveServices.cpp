@@ -140,6 +140,7 @@ bool LiveServices::takeConfiguration() {
     const auto before = std::exchange(configuration_, accounts_->configuration());
     auto rest = configuration_;
     rest.contacts = before.contacts;
+    rest.addressBooks = before.addressBooks;
     return rest != before || accounts_->deviceOwnerAccount() != account_;
 }
 

@@ -47,6 +47,8 @@ class LiveServices {
     /// Reads the account in the background, and again whenever its files change. `ready` is called once, when the first
     /// reading has ended, well or not, and it is known whether the session is locked.
     void start(std::function<void()> ready);
+    /// Reads it again now, whether or not a file has changed: a keyring may hold something else.
+    void readAgain() { watcher_->reload(); }
     /// Called when account, token, language, contacts or anything else has changed that a platform is asked only once:
     /// it wants another platform, with the configuration as it is now.
     void setOutdated(std::function<void()> outdated) { outdated_ = std::move(outdated); }

@@ -102,7 +102,7 @@ LiveStatus LiveStatus::of(const Facts& facts, const Words& words) {
         return {};
     }
     if (facts.unusable) {
-        return {Mark::Warning, words.text("STATUS_UNREADABLE")};
+        return {Mark::Warning, words.text("STATUS_UNREADABLE"), false, Help::CheckUp};
     }
     if (!facts.signedIn || trouble == Trouble::SignedOut) {
         // "Again" is for who was signed in before.
@@ -115,7 +115,8 @@ LiveStatus LiveStatus::of(const Facts& facts, const Words& words) {
     const auto known = knownIn(facts);
     if (const char* key = keyOf(trouble); key != nullptr) {
         return {Mark::Warning,
-                known ? sentence(words, std::string(key) + "_SINCE", words.clock(*known)) : words.text(key)};
+                known ? sentence(words, std::string(key) + "_SINCE", words.clock(*known)) : words.text(key), false,
+                trouble == Trouble::Unreachable ? Help::TryNow : Help::CheckUp};
     }
     if (!known) {
         return {};

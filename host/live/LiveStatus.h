@@ -15,6 +15,12 @@ namespace ktr::host {
 struct LiveStatus {
     /// What stands before the words; the words carry the meaning alone.
     enum class Mark { None, Live, Waiting, Warning, Hidden };
+    /// What stands at the end of the line, for who wants to mend it.
+    enum class Help {
+        None,
+        TryNow,   ///< asks at once whether the service is there again
+        CheckUp,  ///< looks at everything that it stands on
+    };
 
     /// What there is to know.
     struct Facts {
@@ -58,6 +64,7 @@ struct LiveStatus {
     Mark mark = Mark::None;
     std::string words;         ///< empty: the line is empty
     bool wantsSignIn = false;  ///< nothing is told until somebody signs in
+    Help help = Help::None;
     bool operator==(const LiveStatus&) const = default;
 };
 

@@ -50,14 +50,22 @@ struct Configuration {
         bool operator==(const Maps&) const = default;
     };
 
+    enum class Colors { System, Light, Dark, HighContrast };
+    /// In which distances are told.
+    enum class Distances { System, Kilometres, Miles };
+
     std::optional<Account> account;
     /// Files with certificates (PEM) that are trusted besides the system's; absolute paths.
     std::vector<std::string> certificates;
     /// vCard files, or folders of them: the user's contacts; absolute paths.
     std::vector<std::string> contacts;
+    /// Whether the desktop's address books are read beside them.
+    bool addressBooks = true;
     std::optional<std::string> language;  ///< the assistant's, BCP 47
     /// Instead of the desktop's.
     std::optional<platform::ContentSizeCategory> textSize;
+    Colors colors = Colors::System;
+    Distances distances = Distances::System;
     /// The country of the geographic services: two letters in upper case.
     std::optional<std::string> geographicCountry;
     bool friendLocationRestricted = false;

@@ -168,6 +168,31 @@ void readMaps(FieldReader& members, const std::filesystem::path& file, Configura
     maps.cacheMegabytes = members.whole("cacheMegabytes", 1, 100000).value_or(maps.cacheMegabytes);
 }
 
+void readLook(FieldReader& members, Configuration& configuration) {
+    using Colors = Configuration::Colors;
+    using Distances = Configuration::Distances;
+    const std::string colors = members.text("colors").value_or("system");
+    if (colors == "light") {
+        configuration.colors = Colors::Light;
+    } else if (colors == "dark") {
+        configuration.colors = Colors::Dark;
+    } else if (colors == "high-contrast") {
+        configuration.colors = Colors::HighContrast;
+    } else if (colors != "system") {
+        members.complain("colors", R"(expected one of "system", "light", "dark", "high-contrast", found )" +
+                                       documents::inQuotes(colors));
+    }
+    const std::string distances = members.text("distances").value_or("system");
+    if (distances == "kilometres") {
+        configuration.distances = Distances::Kilometres;
+    } else if (distances == "miles") {
+        configuration.distances = Distances::Miles;
+    } else if (distances != "system") {
+        members.complain("distances",
+                         R"(expected one of "system", "kilometres", "miles", found )" + documents::inQuotes(distances));
+    }
+}
+
 void readAll(FieldReader& members, const std::filesystem::path& file, Configuration& configuration) {
     members.object("account", [&](FieldReader& account) { readAccount(account, file, configuration); });
     for (const std::string& certificate : members.texts("certificates")) {
@@ -176,6 +201,7 @@ void readAll(FieldReader& members, const std::filesystem::path& file, Configurat
     for (const std::string& contacts : members.texts("contacts")) {
         configuration.contacts.push_back(resolved(contacts, file));
     }
+    configuration.addressBooks = members.boolean("addressBooks").value_or(true);
     configuration.language = members.text("language");
     if (const auto size = members.text("textSize")) {
         configuration.textSize = LinuxDevice::categoryNamed(*size);
@@ -184,6 +210,7 @@ void readAll(FieldReader& members, const std::filesystem::path& file, Configurat
                              "expected XS, S, M, L, XL, XXL, XXXL or AX1 to AX5, found " + documents::inQuotes(*size));
         }
     }
+    readLook(members, configuration);
     configuration.geographicCountry = members.text("geographicCountry");
     if (configuration.geographicCountry) {
         const std::string& country = *configuration.geographicCountry;

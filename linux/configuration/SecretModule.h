@@ -21,6 +21,10 @@ class SecretModule {
     /// it. False when it is not kept; then `error` says why, and is never empty.
     virtual bool store(const std::string& person, const std::string& host, const std::string& secret, double seconds,
                        const std::atomic<bool>& givesUp, std::string& error) const = 0;
+    /// Forgets the secret with these attributes; one that is not there is forgotten. False when that cannot be done;
+    /// then `error` says why.
+    virtual bool forget(const std::string& person, const std::string& host, double seconds,
+                        const std::atomic<bool>& givesUp, std::string& error) const = 0;
 };
 
 /// The module's only symbol, of type `SecretModuleEntry`: makes the module's object; null when it cannot be made.

@@ -9,6 +9,7 @@
 #include "linux/configuration/ConfigurationFile.h"
 #include "linux/configuration/ConfigurationReader.h"
 #include "linux/configuration/SecretModule.h"
+#include "linux/configuration/SignInLink.h"
 #include "linux/configuration/TokenChange.h"
 #include "linux/configuration/TokenFile.h"
 #include "linux/device/Buses.h"
@@ -89,6 +90,12 @@ struct SignIn::Attempt {
     std::atomic<bool> givesUp = false;
 };
 
+struct SignIn::Spent {
+    std::string link;
+    std::string person;
+    std::string secret;
+};
+
 SignIn::SignIn(std::filesystem::path configurationFile) : SignIn(std::move(configurationFile), storeInKeyring) {}
 
 SignIn::SignIn(std::filesystem::path configurationFile, Store store)
@@ -113,8 +120,15 @@ void SignIn::begin(const Wish& wish, std::function<void(const Result&)> done) {
     attempt_->wish = wish;
     attempt_->done = [this, done = std::move(done)](const Result& result) {
         attempt_ = nullptr;
+        if (result.outcome == Outcome::Done) {
+            spent_ = nullptr;
+        }
         done(result);
     };
+    if (!wish.link.empty()) {
+        beginWithLink(wish);
+        return;
+    }
     const auto host = ServiceCheck::hostOf(wish.address);
     if (!host || wish.person.empty() || wish.person.find(':') != std::string::npos) {
         end(attempt_, {host ? Outcome::Unknown : Outcome::BadAddress, host.value_or(""), "it cannot be asked for"});
@@ -125,6 +139,41 @@ void SignIn::begin(const Wish& wish, std::function<void(const Result&)> done) {
     const auto domains = before && before->host == *host ? before->domains : std::nullopt;
     ServiceCheck::run(client_, {*host, wish.person, wish.secret, certificatesOf(file_), domains},
                       [attempt = attempt_](const ServiceCheck::Result& found) { checked(attempt, found); });
+}
+
+void SignIn::beginWithLink(const Wish& wish) {
+    const auto link = SignInLink::read(wish.link);
+    if (!link) {
+        end(attempt_, {Outcome::BadAddress, "", "it is no link for signing in"});
+        return;
+    }
+    attempt_->host = link->host();
+    const auto keepIt = [](const std::shared_ptr<Attempt>& attempt, const Spent& spent) {
+        attempt->wish.person = spent.person;
+        attempt->wish.secret = spent.secret;
+        checked(attempt, {ServiceCheck::Outcome::Fine, "", 0.0, std::nullopt});
+    };
+    if (spent_ && spent_->link == wish.link) {
+        keepIt(attempt_, *spent_);
+        return;
+    }
+    link->exchange(
+        client_, certificatesOf(file_), [this, keepIt, attempt = attempt_](const SignInLink::Exchanged& exchanged) {
+            QMetaObject::invokeMethod(
+                QCoreApplication::instance(),
+                [this, keepIt, attempt, exchanged] {
+                    if (attempt->givesUp) {
+                        return;
+                    }
+                    if (exchanged.outcome != ServiceCheck::Outcome::Fine) {
+                        end(attempt, {outcomeOf(exchanged.outcome), attempt->host, exchanged.reason});
+                        return;
+                    }
+                    spent_ = std::make_shared<Spent>(Spent{attempt->wish.link, exchanged.person, exchanged.secret});
+                    keepIt(attempt, *spent_);
+                },
+                Qt::QueuedConnection);
+        });
 }
 
 void SignIn::checked(const std::shared_ptr<Attempt>& attempt, const ServiceCheck::Result& found) {

@@ -12,8 +12,9 @@
 
 namespace ktr::linux_ {
 
-/// Signs somebody in: asks the service whether it knows them, keeps the secret, and writes the configuration, in this
-/// order; what is not the case leaves everything as it was. Main thread, which never waits.
+/// Signs somebody in: asks the service whether it knows them, or what a link stands for, keeps the secret, and writes
+/// the configuration, in this order; what is not the case leaves everything as it was, but that a link is spent. Main
+/// thread, which never waits.
 class SignIn {
   public:
     /// Where the secret is kept.
@@ -26,13 +27,14 @@ class SignIn {
         std::string person;
         std::string secret;
         Place place = Place::Keyring;
+        std::string link = {};  ///< as it was typed; not empty: in place of address, person and secret
     };
     enum class Outcome {
         Done,
-        BadAddress,
+        BadAddress,  ///< or a link that is none
         NothingAnswers,
         NotTrusted,
-        Unknown,    ///< the service does not know person and secret together
+        Unknown,    ///< the service does not know person and secret together, or the link is spent
         NoService,  ///< something else answers there
         Failing,    ///< the service cannot help now
         NoKeyring,  ///< the Secret Service does not keep the secret: locked, not there, or silent
@@ -63,6 +65,8 @@ class SignIn {
 
   private:
     struct Attempt;
+    struct Spent;
+    void beginWithLink(const Wish& wish);
     static void checked(const std::shared_ptr<Attempt>& attempt, const ServiceCheck::Result& found);
     /// On a thread of its own.
     static Result keep(Attempt& attempt);
@@ -72,6 +76,8 @@ class SignIn {
     const Store store_;
     HttpsClient client_;
     std::shared_ptr<Attempt> attempt_;
+    /// What the link that was spent last stands for, until it is kept: the service gives it once.
+    std::shared_ptr<Spent> spent_;
 };
 
 }  // namespace ktr::linux_

@@ -58,14 +58,9 @@ struct UserContacts::Shared {
 /// Reads, on the thread of its own.
 class UserContacts::Reader : public QObject {
   public:
-    Reader(std::shared_ptr<Shared> shared, Paths paths, std::string bus)
-        : shared_(std::move(shared)), paths_(std::move(paths)), address_(std::move(bus)) {}
-    ~Reader() override {
-        books_.reset();
-        if (!connection_.isEmpty()) {
-            QDBusConnection::disconnectFromBus(connection_);
-        }
-    }
+    Reader(std::shared_ptr<Shared> shared, Paths paths, std::string bus, bool usesBooks)
+        : shared_(std::move(shared)), paths_(std::move(paths)), address_(std::move(bus)), usesBooks_(usesBooks) {}
+    ~Reader() override { closeBooks(); }
 
     void begin() {
         watcher_ = std::make_unique<QFileSystemWatcher>();
@@ -76,8 +71,24 @@ class UserContacts::Reader : public QObject {
         connect(watcher_.get(), &QFileSystemWatcher::fileChanged, this, touched);
         connect(watcher_.get(), &QFileSystemWatcher::directoryChanged, this, touched);
         connect(quiet_.get(), &QTimer::timeout, this, [this] { readFiles(false); });
+        booksAreComplete_ = !usesBooks_;
         readFiles(true);
-        openBooks();
+        if (usesBooks_) {
+            openBooks();
+        }
+    }
+    void setUsesBooks(bool usesBooks) {
+        if (std::exchange(usesBooks_, usesBooks) == usesBooks) {
+            return;
+        }
+        if (usesBooks) {
+            openBooks();
+            return;
+        }
+        closeBooks();
+        read_.clear();
+        booksAreComplete_ = true;
+        tell();
     }
     void setPaths(Paths paths) {
         paths_ = std::move(paths);
@@ -125,6 +136,14 @@ class UserContacts::Reader : public QObject {
                 tell();
             });
         books_->start();
+    }
+
+    void closeBooks() {
+        books_.reset();
+        if (!connection_.isEmpty()) {
+            QDBusConnection::disconnectFromBus(connection_);
+            connection_.clear();
+        }
     }
 
     void takeBooks(const std::vector<AddressBooks::Book>& books) {
@@ -187,6 +206,7 @@ class UserContacts::Reader : public QObject {
     std::shared_ptr<Shared> shared_;
     Paths paths_;
     const std::string address_;
+    bool usesBooks_;
     QString connection_;
     std::unique_ptr<QFileSystemWatcher> watcher_;
     /// Runs out when a burst of changes is over.
@@ -197,10 +217,11 @@ class UserContacts::Reader : public QObject {
     bool booksAreComplete_ = false;
 };
 
-UserContacts::UserContacts(const std::shared_ptr<platform::MainLoop>& mainLoop, Paths paths, std::string bus)
+UserContacts::UserContacts(const std::shared_ptr<platform::MainLoop>& mainLoop, Paths paths, std::string bus,
+                           bool usesBooks)
     : shared_(std::make_shared<Shared>()), thread_(std::make_unique<QThread>()) {
     shared_->mainLoop = mainLoop.get();
-    reader_ = new Reader(shared_, std::move(paths), std::move(bus));
+    reader_ = new Reader(shared_, std::move(paths), std::move(bus), usesBooks);
     reader_->moveToThread(thread_.get());
     QObject::connect(thread_.get(), &QThread::finished, reader_, &QObject::deleteLater);
     thread_->start();
@@ -243,6 +264,11 @@ void UserContacts::follow(std::function<void(const Contacts&)> changed) {
 void UserContacts::setPaths(Paths paths) {
     QMetaObject::invokeMethod(
         reader_, [reader = reader_, paths = std::move(paths)] { reader->setPaths(paths); }, Qt::QueuedConnection);
+}
+
+void UserContacts::setUsesBooks(bool usesBooks) {
+    QMetaObject::invokeMethod(
+        reader_, [reader = reader_, usesBooks] { reader->setUsesBooks(usesBooks); }, Qt::QueuedConnection);
 }
 
 }  // namespace ktr::linux_

@@ -25,7 +25,8 @@ class UserContacts {
 
     /// Begins to read. `bus`: the address of the message bus on which the address books are; empty: the session's. The
     /// loop outlives this.
-    UserContacts(const std::shared_ptr<platform::MainLoop>& mainLoop, Paths paths, std::string bus = "");
+    UserContacts(const std::shared_ptr<platform::MainLoop>& mainLoop, Paths paths, std::string bus = "",
+                 bool usesBooks = true);
     /// What is under way ends; a disk that does not answer is left alone after two seconds.
     ~UserContacts();
     UserContacts(const UserContacts&) = delete;
@@ -39,6 +40,8 @@ class UserContacts {
     void follow(std::function<void(const Contacts&)> changed);
     /// Other files from now on; what they hold comes to `changed`, also if it is the same.
     void setPaths(Paths paths);
+    /// Whether address books are read from now on; without them nothing is said to whoever keeps them.
+    void setUsesBooks(bool usesBooks);
 
   private:
     class Reader;

@@ -19,6 +19,7 @@ const QString kPortal = QStringLiteral("org.freedesktop.portal.Desktop");
 const QString kPath = QStringLiteral("/org/freedesktop/portal/desktop");
 const QString kInterface = QStringLiteral("org.freedesktop.portal.Settings");
 const QString kAppearance = QStringLiteral("org.freedesktop.appearance");
+const QString kScheme = QStringLiteral("color-scheme");
 const QString kContrast = QStringLiteral("contrast");
 const QString kMotion = QStringLiteral("reduced-motion");
 const QString kGnome = QStringLiteral("org.gnome.desktop.interface");
@@ -111,6 +112,7 @@ void DesktopSettings::useBus(const QDBusConnection& bus) {
 }
 
 void DesktopSettings::askAll() {
+    ask(kAppearance, kScheme);
     ask(kAppearance, kContrast);
     ask(kAppearance, kMotion);
     if (desktop_ == Desktop::Gnome) {
@@ -147,7 +149,12 @@ void DesktopSettings::settingChanged(const QString& group, const QString& key, c
 void DesktopSettings::take(const QString& group, const QString& key, const QVariant& wrapped) {
     const QVariant value = unwrapped(wrapped);
     Values values = values_;
-    if (group == kAppearance && key == kContrast) {
+    if (group == kAppearance && key == kScheme) {
+        // 1: dark, 2: light; 0 and whatever a later day brings: no preference.
+        bool isNumber = false;
+        const uint scheme = value.toUInt(&isNumber);
+        values.dark = isNumber && (scheme == 1 || scheme == 2) ? std::optional(scheme == 1) : std::nullopt;
+    } else if (group == kAppearance && key == kContrast) {
         values.highContrast = wishOf(value);
     } else if (group == kAppearance && key == kMotion) {
         values.reducedMotion = wishOf(value);

@@ -15,17 +15,18 @@
 
 namespace ktr::linux_ {
 
-/// What the desktop's user has set for all programs: the size of texts, high contrast and less motion. The text size is
-/// KDE's, or else that of GNOME and Phosh, and each is asked for only on its own desktop: elsewhere its answer is a
-/// stale one. Contrast and motion are those of the desktop portal (org.freedesktop.portal.Settings). Nothing waits: the
-/// bus is joined and files are read in the background, and values are none until somebody has said them, for good where
-/// nobody does. Main thread.
+/// What the desktop's user has set for all programs: the size of texts, dark or light, high contrast and less motion.
+/// The text size is KDE's, or else that of GNOME and Phosh, and each is asked for only on its own desktop: elsewhere
+/// its answer is a stale one. Colours, contrast and motion are those of the desktop portal
+/// (org.freedesktop.portal.Settings). Nothing waits: the bus is joined and files are read in the background, and values
+/// are none until somebody has said them, for good where nobody does. Main thread.
 class DesktopSettings : public QObject {
     Q_OBJECT
 
   public:
     struct Values {
         std::optional<double> textScale;  ///< 1 is the desktop's usual size
+        std::optional<bool> dark;         ///< none: no preference
         std::optional<bool> highContrast;
         std::optional<bool> reducedMotion;
         bool operator==(const Values&) const = default;

@@ -2,6 +2,7 @@
 
 #include <netdb.h>
 
+#include <algorithm>
 #include <cmath>
 #include <future>
 #include <memory>
@@ -18,6 +19,7 @@ namespace {
 
 using Finding = CheckUp::Finding;
 using State = CheckUp::State;
+using Cause = CheckUp::Cause;
 
 constexpr double kMillisecondsASecond = 1000.0;
 /// Ages are said in minutes: from here on they are wrong ones.
@@ -28,8 +30,8 @@ Finding fine(std::string thing, std::string words) {
     return {std::move(thing), State::Fine, std::move(words), {}};
 }
 
-Finding wrong(std::string thing, std::string words, std::string remedy) {
-    return {std::move(thing), State::Wrong, std::move(words), std::move(remedy)};
+Finding wrong(std::string thing, Cause cause, std::string words, std::string remedy, std::string detail = {}) {
+    return {std::move(thing), State::Wrong, std::move(words), std::move(remedy), 0.0, cause, std::move(detail)};
 }
 
 bool hasHost(const Configuration& configuration) {
@@ -67,24 +69,26 @@ Finding configuration(const CheckUp::Places& places) {
     documents::DocumentWarnings warnings;
     const auto read = ConfigurationReader::readFile(places.configuration, &warnings);
     if (const auto* error = std::get_if<ConfigurationReader::Error>(&read)) {
-        return wrong("settings", error->text, "mend that line, or move the file away and sign in anew with: ktr show");
+        return wrong("settings", Cause::Settings, error->text,
+                     "mend that line, or move the file away and sign in anew with: ktr show");
     }
     if (!warnings.empty()) {
-        return wrong("settings", warnings.front().text(), "mend the name in that line");
+        return wrong("settings", Cause::Settings, warnings.front().text(), "mend the name in that line");
     }
     return fine("settings", "they can be read");
 }
 
 Finding account(const Configuration& configuration) {
     if (!configuration.account) {
-        return wrong("account", "nobody is signed in", "ktr show");
+        return wrong("account", Cause::Nobody, "nobody is signed in", "ktr show");
     }
     if (!configuration.account->host) {
-        return wrong("account", "it names no service", "ktr config set account.host HOST");
+        return wrong("account", Cause::Nobody, "it names no service", "ktr config set account.host HOST");
     }
     const ServicePolicy policy(*configuration.account->host, configuration.account->domains);
     if (!policy.entriesForNobody().empty()) {
-        return wrong("account", "an entry of account.domains allows nobody", "ktr config get account.domains");
+        return wrong("account", Cause::Settings, "an entry of account.domains allows nobody",
+                     "ktr config get account.domains");
     }
     return fine("account", "somebody is signed in");
 }
@@ -95,7 +99,7 @@ Finding secret(const CheckUp::Places& places, const Configuration& configuration
     }
     std::string problem;
     return tokenOf(places, problem) ? fine("secret", "it can be read")
-                                    : wrong("secret", problem.empty() ? "it cannot be read" : problem,
+                                    : wrong("secret", Cause::Locked, problem.empty() ? "it cannot be read" : problem,
                                             "unlock the keyring, or sign in again with: ktr show");
 }
 
@@ -105,13 +109,15 @@ Finding name(const Configuration& configuration) {
     }
     const auto origin = Origin::fromText(*configuration.account->host);
     if (!origin) {
-        return wrong("name", "the service's host is none", "ktr config set account.host HOST");
+        return wrong("name", Cause::Unreachable, "the service's host is none", "ktr config set account.host HOST",
+                     *configuration.account->host);
     }
     addrinfo* found = nullptr;
     const int failure = ::getaddrinfo(origin->host.c_str(), nullptr, nullptr, &found);
     if (failure != 0) {
-        return wrong("name", "the service's name has no address: " + std::string(::gai_strerror(failure)),
-                     "check the network, and the name with: ktr config get account.host");
+        return wrong("name", Cause::Unreachable,
+                     "the service's name has no address: " + std::string(::gai_strerror(failure)),
+                     "check the network, and the name with: ktr config get account.host", *configuration.account->host);
     }
     ::freeaddrinfo(found);
     return fine("name", origin->isAddress() ? "it is an address" : "it has an address");
@@ -122,27 +128,37 @@ Finding service(const CheckUp::Places& places, const Configuration& configuratio
         return withoutAccount("service");
     }
     using Outcome = ServiceCheck::Outcome;
+    const std::string& host = *configuration.account->host;
     const auto result = ask(places, configuration);
     const std::string why = result.reason.empty() ? std::string() : " (" + result.reason + ")";
     switch (result.outcome) {
         case Outcome::Fine:
-            return fine("service", "it answers after " +
-                                       std::to_string(std::lround(result.seconds * kMillisecondsASecond)) + " ms");
+            return {"service",
+                    State::Fine,
+                    "it answers after " + std::to_string(std::lround(result.seconds * kMillisecondsASecond)) + " ms",
+                    {},
+                    0.0,
+                    Cause::None,
+                    host + ", " + std::to_string(std::lround(result.seconds * kMillisecondsASecond)) + " ms"};
         case Outcome::BadAddress:
-            return wrong("service", "its address is none", "ktr config set account.host HOST");
+            return wrong("service", Cause::Unreachable, "its address is none", "ktr config set account.host HOST",
+                         host);
         case Outcome::NothingAnswers:
-            return wrong("service", "nothing answers there" + why, "check the network, or ask whoever runs it");
+            return wrong("service", Cause::Unreachable, "nothing answers there" + why,
+                         "check the network, or ask whoever runs it", host);
         case Outcome::NotTrusted:
-            return wrong("service", "it cannot prove who it is, so nothing is sent" + why,
-                         "ktr config set certificates FILE.pem, if it is your own; else ask whoever runs it");
+            return wrong("service", Cause::NotTrusted, "it cannot prove who it is, so nothing is sent" + why,
+                         "ktr config set certificates FILE.pem, if it is your own; else ask whoever runs it", host);
         case Outcome::Unknown:
-            return wrong("service", "it does not know person and secret together", "ktr show, and sign in again");
+            return wrong("service", Cause::Unknown, "it does not know person and secret together",
+                         "ktr show, and sign in again", host);
         case Outcome::NoService:
-            return wrong("service", "something else answers there" + why, "ktr config set account.host HOST");
+            return wrong("service", Cause::NoService, "something else answers there" + why,
+                         "ktr config set account.host HOST", host);
         case Outcome::Failing:
             break;
     }
-    return wrong("service", "it cannot help now" + why, "ask whoever runs it");
+    return wrong("service", Cause::Failing, "it cannot help now" + why, "ask whoever runs it", host);
 }
 
 Finding clock(const CheckUp::Places& places, const Configuration& configuration) {
@@ -155,10 +171,11 @@ Finding clock(const CheckUp::Places& places, const Configuration& configuration)
     }
     const long apart = std::lround(std::abs(*ahead));
     if (std::abs(*ahead) > kClocksApart) {
-        return wrong("clock",
+        constexpr double kMinute = 60.0;
+        return wrong("clock", *ahead > 0 ? Cause::ClockAhead : Cause::ClockBehind,
                      "this computer is " + std::to_string(apart) + " s " + (*ahead > 0 ? "ahead of" : "behind") +
                          " the service, so that ages are wrong",
-                     "timedatectl set-ntp true");
+                     "timedatectl set-ntp true", std::to_string(std::max(std::lround(std::abs(*ahead) / kMinute), 1L)));
     }
     return fine("clock", std::to_string(apart) + " s apart");
 }
@@ -169,7 +186,7 @@ Finding redirect(const CheckUp::Places& places, const Configuration& configurati
     }
     const auto read = PreferencesFile::read(places.preferences);
     if (const auto* error = std::get_if<PreferencesFile::Error>(&read)) {
-        return wrong("redirect", error->text, "rm '" + places.preferences.string() + "'");
+        return wrong("redirect", Cause::Redirect, error->text, "rm '" + places.preferences.string() + "'");
     }
     const auto& texts = std::get<PreferencesFile::Texts>(read);
     const auto host = texts.find(kRedirectedHost);
@@ -179,7 +196,7 @@ Finding redirect(const CheckUp::Places& places, const Configuration& configurati
     const auto origin = Origin::fromText(host->second);
     const ServicePolicy policy(*configuration.account->host, configuration.account->domains);
     if (!origin || !policy.allows(*origin)) {
-        return wrong("redirect", "a host is remembered that the account does not allow",
+        return wrong("redirect", Cause::Redirect, "a host is remembered that the account does not allow",
                      "rm '" + places.preferences.string() + "'");
     }
     return fine("redirect", "commands go to a host of the service's");

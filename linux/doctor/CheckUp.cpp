@@ -1,6 +1,7 @@
 #include "linux/doctor/CheckUp.h"
 
 #include <algorithm>
+#include <array>
 #include <chrono>
 #include <cmath>
 #include <condition_variable>
@@ -40,6 +41,20 @@ const char* nameOf(CheckUp::State state) {
     return "not used";
 }
 
+/// Where the service is; empty for none.
+std::string hostOf(const Configuration& configuration) {
+    return configuration.account ? configuration.account->host.value_or("") : "";
+}
+
+/// As JSON has it; empty for none.
+const char* nameOf(CheckUp::Cause cause) {
+    constexpr std::array kNames = {"",          "settings",   "nobody",        "locked",        "unreachable",
+                                   "untrusted", "no-service", "failing",       "unknown",       "redirect",
+                                   "ahead",     "behind",     "contacts",      "address-books", "position",
+                                   "map",       "letters",    "screen-reader", "desktop"};
+    return kNames[static_cast<std::size_t>(cause)];
+}
+
 }  // namespace
 
 std::vector<CheckUp::Check> CheckUp::checks(const Places& places) {
@@ -52,29 +67,34 @@ std::vector<CheckUp::Check> CheckUp::checks(const Places& places) {
     namespace own = account_checks;
     namespace around = session_checks;
     return {
-        {"settings", usual, [=] { return own::configuration(places); }, "the disk does not answer", "check the disk"},
-        {"account", usual, [=] { return own::account(configuration); }, "it takes too long", "check the disk"},
+        {"settings", usual, [=] { return own::configuration(places); }, "the disk does not answer", "check the disk",
+         Cause::Settings},
+        {"account", usual, [=] { return own::account(configuration); }, "it takes too long", "check the disk",
+         Cause::Settings},
         {"secret", usual, [=] { return own::secret(places, configuration); }, "the keyring does not answer",
-         "unlock the keyring, or keep the secret in a file: ktr show"},
+         "unlock the keyring, or keep the secret in a file: ktr show", Cause::Locked},
         {"name", usual, [=] { return own::name(configuration); }, "whoever knows names does not answer",
-         "check the network"},
+         "check the network", Cause::Unreachable, hostOf(configuration)},
         {"service", asking, [=] { return own::service(places, configuration); }, "it does not answer",
-         "check the network, or ask whoever runs it"},
+         "check the network, or ask whoever runs it", Cause::Unreachable, hostOf(configuration)},
         {"clock", asking, [=] { return own::clock(places, configuration); }, "the service does not answer",
-         "check the network, or ask whoever runs it"},
+         "check the network, or ask whoever runs it", Cause::Unreachable, hostOf(configuration)},
         {"redirect", usual, [=] { return own::redirect(places, configuration); }, "the disk does not answer",
-         "check the disk"},
+         "check the disk", Cause::Settings},
         {"contacts", usual, [=] { return around::contacts(configuration); }, "they cannot be read in time",
-         "ktr config get contacts"},
+         "ktr config get contacts", Cause::Contacts},
+        {"address books", usual, [=] { return around::addressBooks(places, configuration); }, "they do not answer",
+         "systemctl --user restart evolution-addressbook-factory evolution-source-registry", Cause::AddressBooks},
         {"position", usual, [=] { return around::positions(places, configuration); },
-         "whoever tells it does not answer", "sudo systemctl restart geoclue"},
+         "whoever tells it does not answer", "sudo systemctl restart geoclue", Cause::Position},
         {"maps", usual, [=] { return around::maps(places, configuration); }, "they cannot be read in time",
-         "ktr config get maps.sources"},
-        {"locale", usual, [=] { return around::locale(places); }, "the disk does not answer", "check the disk"},
+         "ktr config get maps.sources", Cause::Map},
+        {"locale", usual, [=] { return around::locale(places); }, "the disk does not answer", "check the disk",
+         Cause::Letters},
         {"screen reader", usual, [=] { return around::screenReader(places); }, "the session bus does not answer",
-         "log out and in again"},
+         "log out and in again", Cause::ScreenReader},
         {"portals", usual, [=] { return around::portals(places); }, "the portal does not answer",
-         "systemctl --user restart xdg-desktop-portal"},
+         "systemctl --user restart xdg-desktop-portal", Cause::Desktop},
     };
 }
 
@@ -98,9 +118,10 @@ std::vector<CheckUp::Finding> CheckUp::runAll(const std::vector<Check>& checks) 
         const auto until =
             began + std::chrono::duration_cast<Clock::duration>(std::chrono::duration<double>(checks[i].patience));
         board->changed.wait_until(lock, until, [&] { return board->findings[i].has_value(); });
+        const Check& check = checks[i];
         told.push_back(board->findings[i] ? *board->findings[i]
-                                          : Finding{checks[i].thing, State::Wrong, checks[i].silent, checks[i].remedy,
-                                                    checks[i].patience});
+                                          : Finding{check.thing, State::Wrong, check.silent, check.remedy,
+                                                    check.patience, check.cause, check.detail});
     }
     return told;
 }
@@ -109,8 +130,12 @@ std::vector<CheckUp::Finding> CheckUp::run(const Places& places) {
     std::vector<Finding> findings = runAll(checks(places));
     const auto beforeLocale = std::find_if(findings.begin(), findings.end(),
                                            [](const Finding& finding) { return finding.thing == "locale"; });
-    findings.insert(beforeLocale, session_checks::letters());
+    findings.insert(beforeLocale, letters());
     return findings;
+}
+
+CheckUp::Finding CheckUp::letters() {
+    return session_checks::letters();
 }
 
 bool CheckUp::isWell(const std::vector<Finding>& findings) {
@@ -143,7 +168,8 @@ std::string CheckUp::json(const std::vector<Finding>& findings) {
                                            {"state", nameOf(finding.state)},
                                            {"words", finding.words},
                                            {"remedy", finding.remedy},
-                                           {"milliseconds", std::round(finding.seconds * 1000.0)}});
+                                           {"milliseconds", std::round(finding.seconds * 1000.0)},
+                                           {"cause", nameOf(finding.cause)}});
     }
     const platform::Dictionary object{{"ok", isWell(findings)}, {"findings", std::move(all)}};
     return documents::jsonForTerminal(platform::writeJson(object)) + "\n";

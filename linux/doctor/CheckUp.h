@@ -17,6 +17,28 @@ class CheckUp {
         Wrong,
         NotUsed,  ///< nothing here asks for it
     };
+    /// What is wrong, for who words it in another language.
+    enum class Cause {
+        None,
+        Settings,
+        Nobody,  ///< is signed in
+        Locked,  ///< the secret cannot be read
+        Unreachable,
+        NotTrusted,
+        NoService,
+        Failing,
+        Unknown,  ///< the service does not know person and secret together
+        Redirect,
+        ClockAhead,
+        ClockBehind,
+        Contacts,
+        AddressBooks,
+        Position,
+        Map,
+        Letters,
+        ScreenReader,
+        Desktop,
+    };
     /// What came of looking at one thing. Its words hold no friend, no place and no secret; a file is named by its
     /// path.
     struct Finding {
@@ -25,6 +47,18 @@ class CheckUp {
         std::string words;   ///< one line, English
         std::string remedy;  ///< of what is wrong: a command, or whom to ask; else empty
         double seconds = 0.0;
+        Cause cause = Cause::None;  ///< of what is wrong
+        std::string detail = {};    ///< of the cause: a host, a number of minutes; what is told beside what is fine
+    };
+    /// One thing to look at.
+    struct Check {
+        std::string thing;
+        double patience = 0.0;
+        std::function<Finding()> look;
+        std::string silent;  ///< the words where it takes longer
+        std::string remedy;
+        Cause cause = Cause::None;  ///< of its silence
+        std::string detail = {};
     };
     /// Where everything is found; a test has its own.
     struct Places {
@@ -41,22 +75,21 @@ class CheckUp {
     /// In the order in which they are told. Waits no longer than the slowest thing may take; what has not ended by then
     /// goes on in the background and is told as silent. Any thread; a QGuiApplication exists.
     static std::vector<Finding> run(const Places& places);
+    /// The same by pieces, for who shows each finding as it comes: all but the letters, in the order in which they are
+    /// told. It reads the disk. Any thread.
+    static std::vector<Check> checks(const Places& places);
+    /// Looks, for as long as it may take. Any thread.
+    static Finding runOne(const Check& check) { return runAll({check}).front(); }
+    /// By script. Main thread.
+    static Finding letters();
 
     /// The findings as people read them, a line each and one for each remedy.
     static std::string text(const std::vector<Finding>& findings);
-    /// The same as JSON: {"ok": ..., "findings": [{"thing", "state", "words", "remedy", "milliseconds"}]}.
+    /// The same as JSON: {"ok": ..., "findings": [{"thing", "state", "words", "remedy", "milliseconds", "cause"}]}.
     static std::string json(const std::vector<Finding>& findings);
     static bool isWell(const std::vector<Finding>& findings);
 
   private:
-    struct Check {
-        std::string thing;
-        double patience = 0.0;
-        std::function<Finding()> look;
-        std::string silent;  ///< the words where it takes longer
-        std::string remedy;
-    };
-    static std::vector<Check> checks(const Places& places);
     static std::vector<Finding> runAll(const std::vector<Check>& checks);
 };
 

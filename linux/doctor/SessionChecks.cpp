@@ -10,6 +10,7 @@
 #include <QDBusMessage>
 #include <QDBusVariant>
 #include <QFontDatabase>
+#include <QRegularExpression>
 #include <QUuid>
 #include <array>
 #include <clocale>
@@ -29,6 +30,7 @@ namespace {
 
 using Finding = CheckUp::Finding;
 using State = CheckUp::State;
+using Cause = CheckUp::Cause;
 
 constexpr int kCallTimeout = 3000;  // milliseconds
 
@@ -36,8 +38,8 @@ Finding fine(std::string thing, std::string words) {
     return {std::move(thing), State::Fine, std::move(words), {}};
 }
 
-Finding wrong(std::string thing, std::string words, std::string remedy) {
-    return {std::move(thing), State::Wrong, std::move(words), std::move(remedy)};
+Finding wrong(std::string thing, Cause cause, std::string words, std::string remedy) {
+    return {std::move(thing), State::Wrong, std::move(words), std::move(remedy), 0.0, cause};
 }
 
 /// A connection of one check's own, ended with it.
@@ -75,18 +77,25 @@ class OwnBus {
         return value ? std::optional(value->value<QDBusVariant>().variant()) : std::nullopt;
     }
     /// Whether somebody has the name, or can be started for it.
-    bool offers(const char* service) const {
-        const QString wanted = QLatin1String(service);
-        for (const char* method : {"ListNames", "ListActivatableNames"}) {
-            const auto names = ask("org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", method);
-            if (names && names->toStringList().contains(wanted)) {
-                return true;
-            }
-        }
-        return false;
+    bool offers(const char* service) const { return names().contains(QLatin1String(service)); }
+    /// The last in order that begins so and ends in a version; empty for none.
+    QString nameLike(const char* beginning) const {
+        const QStringList like = names().filter(QRegularExpression(
+            QLatin1Char('^') + QRegularExpression::escape(QLatin1String(beginning)) + QStringLiteral("[0-9]+$")));
+        return like.isEmpty() ? QString() : like.last();
     }
 
   private:
+    QStringList names() const {
+        QStringList all;
+        for (const char* method : {"ListNames", "ListActivatableNames"}) {
+            const auto names = ask("org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", method);
+            all += names ? names->toStringList() : QStringList();
+        }
+        all.sort();
+        return all;
+    }
+
     const QString name_;
     const bool isThere_;
     QDBusConnection bus_;
@@ -124,12 +133,30 @@ Finding contacts(const Configuration& configuration) {
     std::string error;
     const auto read = ContactFiles::read(configuration.contacts, error);
     if (!read) {
-        return wrong("contacts", error, "ktr config set contacts FILE.vcf");
+        return wrong("contacts", Cause::Contacts, error, "ktr config set contacts FILE.vcf");
     }
     if (read->empty()) {
-        return wrong("contacts", "nobody is in them", "ktr config get contacts");
+        return wrong("contacts", Cause::Contacts, "nobody is in them", "ktr config get contacts");
     }
     return fine("contacts", std::to_string(read->size()) + " people");
+}
+
+Finding addressBooks(const CheckUp::Places& places, const Configuration& configuration) {
+    constexpr const char* kThing = "address books";
+    constexpr const char* kRegistry = "org.gnome.evolution.dataserver.Sources";
+    if (!configuration.addressBooks) {
+        return {kThing, State::NotUsed, "they are switched off", "ktr config unset addressBooks"};
+    }
+    const OwnBus session(places.sessionBus);
+    const QString registry = session.isThere() ? session.nameLike(kRegistry) : QString();
+    if (registry.isEmpty()) {
+        return {kThing, State::NotUsed, "this desktop keeps none", {}};
+    }
+    const auto sources = session.ask(registry.toUtf8().constData(), "/org/gnome/evolution/dataserver/SourceManager",
+                                     "org.freedesktop.DBus.ObjectManager", "GetManagedObjects");
+    return sources ? fine(kThing, "whoever keeps them answers")
+                   : wrong(kThing, Cause::AddressBooks, "whoever keeps them does not answer",
+                           "systemctl --user restart evolution-addressbook-factory evolution-source-registry");
 }
 
 Finding positions(const CheckUp::Places& places, const Configuration& configuration) {
@@ -143,20 +170,20 @@ Finding positions(const CheckUp::Places& places, const Configuration& configurat
             const OwnBus bus(places.systemBus);
             return bus.isThere() && bus.offers("org.freedesktop.GeoClue2")
                        ? fine("position", "GeoClue tells it")
-                       : wrong("position", "GeoClue is not there, so that there are no distances",
+                       : wrong("position", Cause::Position, "GeoClue is not there, so that there are no distances",
                                "sudo apt install geoclue-2.0");
         }
         case Source::Gpsd:
             return connects(positions.gpsdHost, positions.gpsdPort)
                        ? fine("position", "gpsd listens")
-                       : wrong("position", "gpsd does not listen, so that there are no distances",
+                       : wrong("position", Cause::Position, "gpsd does not listen, so that there are no distances",
                                "sudo systemctl start gpsd");
         case Source::Track:
             break;
     }
     const auto track = TrackReader::readFile(positions.file);
     if (const auto* error = std::get_if<documents::DocumentError>(&track)) {
-        return wrong("position", error->text(), "ktr config set positions.file FILE.gpx");
+        return wrong("position", Cause::Position, error->text(), "ktr config set positions.file FILE.gpx");
     }
     return fine("position", "a track tells it");
 }
@@ -166,14 +193,14 @@ Finding maps(const CheckUp::Places& places, const Configuration& configuration) 
     for (const auto& source : configuration.maps.sources) {
         std::string error;
         if (!source.file.empty() && MbtilesLoader::open(source.file, error) == nullptr) {
-            return wrong("maps", source.file + ": " + error, "ktr config get maps.sources");
+            return wrong("maps", Cause::Map, source.file + ": " + error, "ktr config get maps.sources");
         }
         ++opened;
     }
     for (const auto& file : FolderGround::filesIn(places.maps)) {
         std::string error;
         if (MbtilesLoader::open(file.string(), error) == nullptr) {
-            return wrong("maps", file.string() + ": " + error, "ktr maps add FILE.mbtiles");
+            return wrong("maps", Cause::Map, file.string() + ": " + error, "ktr maps add FILE.mbtiles");
         }
         ++opened;
     }
@@ -209,20 +236,21 @@ Finding letters() {
             }
         }
     }
-    return missing.empty() ? fine("letters", "of every language here")
-                           : wrong("letters", "these show as boxes: " + missing, "sudo apt install" + packages);
+    return missing.empty()
+               ? fine("letters", "of every language here")
+               : wrong("letters", Cause::Letters, "these show as boxes: " + missing, "sudo apt install" + packages);
 }
 
 Finding locale(const CheckUp::Places& places) {
     // Of this thread alone: the program's own stays as it is.
     const locale_t session = ::newlocale(LC_ALL_MASK, "", nullptr);
     if (session == nullptr) {
-        return wrong("locale", "the session's locale is not there", "sudo dpkg-reconfigure locales");
+        return wrong("locale", Cause::Letters, "the session's locale is not there", "sudo dpkg-reconfigure locales");
     }
     const std::string codeset = ::nl_langinfo_l(CODESET, session);
     ::freelocale(session);
     if (codeset != "UTF-8") {
-        return wrong("locale", "its letters are " + codeset + ", not UTF-8", "export LANG=C.UTF-8");
+        return wrong("locale", Cause::Letters, "its letters are " + codeset + ", not UTF-8", "export LANG=C.UTF-8");
     }
     return QtLocalization::hasTexts(places.language, places.texts, "host")
                ? fine("locale", "there are texts in " + places.language)
@@ -232,16 +260,18 @@ Finding locale(const CheckUp::Places& places) {
 Finding screenReader(const CheckUp::Places& places) {
     const OwnBus session(places.sessionBus);
     if (!session.isThere()) {
-        return wrong("screen reader", "there is no session bus that answers",
+        return wrong("screen reader", Cause::ScreenReader, "there is no session bus that answers",
                      "log in anew, or: dbus-run-session ktr show");
     }
     const auto address = session.ask("org.a11y.Bus", "/org/a11y/bus", "org.a11y.Bus", "GetAddress");
     if (!address) {
-        return wrong("screen reader", "there is no bus for screen readers", "sudo apt install at-spi2-core");
+        return wrong("screen reader", Cause::ScreenReader, "there is no bus for screen readers",
+                     "sudo apt install at-spi2-core");
     }
     const OwnBus bus(address->toString().toStdString());
     if (!bus.isThere() || !bus.offers("org.a11y.atspi.Registry")) {
-        return wrong("screen reader", "the bus for screen readers does not answer", "log out and in again");
+        return wrong("screen reader", Cause::ScreenReader, "the bus for screen readers does not answer",
+                     "log out and in again");
     }
     const auto listens = session.property("org.a11y.Bus", "/org/a11y/bus", "org.a11y.Status", "ScreenReaderEnabled");
     return fine("screen reader", listens && listens->toBool() ? "one listens" : "none listens now; the bus is ready");
@@ -252,10 +282,12 @@ Finding portals(const CheckUp::Places& places) {
     constexpr const char* kPath = "/org/freedesktop/portal/desktop";
     const OwnBus session(places.sessionBus);
     if (!session.isThere()) {
-        return wrong("portals", "there is no session bus that answers", "log in anew, or: dbus-run-session ktr show");
+        return wrong("portals", Cause::Desktop, "there is no session bus that answers",
+                     "log in anew, or: dbus-run-session ktr show");
     }
     if (!session.offers(kPortal)) {
-        return wrong("portals", "there are none: dark, contrast and motion are not followed, links open another way",
+        return wrong("portals", Cause::Desktop,
+                     "there are none: dark, contrast and motion are not followed, links open another way",
                      "sudo apt install xdg-desktop-portal xdg-desktop-portal-gtk");
     }
     std::string missing;
@@ -265,9 +297,9 @@ Finding portals(const CheckUp::Places& places) {
             missing += (missing.empty() ? "" : ", ") + std::string(name);
         }
     }
-    return missing.empty()
-               ? fine("portals", "settings and links")
-               : wrong("portals", "these are missing: " + missing, "sudo apt install xdg-desktop-portal-gtk");
+    return missing.empty() ? fine("portals", "settings and links")
+                           : wrong("portals", Cause::Desktop, "these are missing: " + missing,
+                                   "sudo apt install xdg-desktop-portal-gtk");
 }
 
 }  // namespace ktr::linux_::session_checks

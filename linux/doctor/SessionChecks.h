@@ -9,6 +9,8 @@ namespace ktr::linux_ {
 namespace session_checks {
 
 CheckUp::Finding contacts(const Configuration& configuration);
+/// The desktop's, beside the files.
+CheckUp::Finding addressBooks(const CheckUp::Places& places, const Configuration& configuration);
 CheckUp::Finding positions(const CheckUp::Places& places, const Configuration& configuration);
 CheckUp::Finding maps(const CheckUp::Places& places, const Configuration& configuration);
 /// By script, of the fonts that are installed. Main thread.

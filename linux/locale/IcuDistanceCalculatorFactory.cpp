@@ -9,8 +9,9 @@
 namespace ktr::linux_ {
 
 IcuDistanceCalculatorFactory::IcuDistanceCalculatorFactory(std::shared_ptr<platform::Geodesy> geodesy,
-                                                           std::optional<std::filesystem::path> preferences)
-    : geodesy_(std::move(geodesy)), preferences_(std::move(preferences)) {}
+                                                           std::optional<std::filesystem::path> preferences,
+                                                           std::optional<UnitSystem> chosen)
+    : geodesy_(std::move(geodesy)), preferences_(std::move(preferences)), chosen_(chosen) {}
 
 std::filesystem::path IcuDistanceCalculatorFactory::sessionPreferences() {
     const auto folder = QStandardPaths::writableLocation(QStandardPaths::GenericConfigLocation);
@@ -18,6 +19,9 @@ std::filesystem::path IcuDistanceCalculatorFactory::sessionPreferences() {
 }
 
 std::optional<UnitSystem> IcuDistanceCalculatorFactory::preferredUnits(const std::string& suite) const {
+    if (chosen_) {
+        return chosen_;
+    }
     if (!preferences_ || suite.empty() || suite.find('/') != std::string::npos) {
         return std::nullopt;
     }

@@ -16,8 +16,10 @@ class IcuDistanceCalculatorFactory : public platform::DistanceCalculatorFactory 
   public:
     /// The folder of the preferences; none: nothing overrides the units (rendering and tests, where the result must not
     /// depend on whose session it is).
+    /// `chosen` goes before those preferences.
     explicit IcuDistanceCalculatorFactory(std::shared_ptr<platform::Geodesy> geodesy,
-                                          std::optional<std::filesystem::path> preferences = std::nullopt);
+                                          std::optional<std::filesystem::path> preferences = std::nullopt,
+                                          std::optional<UnitSystem> chosen = std::nullopt);
     /// The folder "ktr" of the session's configuration (XDG_CONFIG_HOME, else ~/.config).
     static std::filesystem::path sessionPreferences();
 
@@ -30,6 +32,7 @@ class IcuDistanceCalculatorFactory : public platform::DistanceCalculatorFactory 
 
     std::shared_ptr<platform::Geodesy> geodesy_;
     std::optional<std::filesystem::path> preferences_;
+    std::optional<UnitSystem> chosen_;
 };
 
 }  // namespace ktr::linux_

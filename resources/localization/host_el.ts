@@ -1026,5 +1026,10 @@
         <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
         <translation>Τα χρώματα και η αντίθεσή της δεν ακολουθούνται, και ίσως δεν ανοίγουν σύνδεσμοι.</translation>
     </message>
+    <message>
+        <source>SHARING_REFUSED</source>
+        <extracomment>Under that switch, when the service does not do this. English: “Your service can’t change this here.”</extracomment>
+        <translation>Η υπηρεσία σας δεν μπορεί να το αλλάξει από εδώ.</translation>
+    </message>
 </context>
 </TS>

@@ -1026,5 +1026,10 @@
         <extracomment>Its cause</extracomment>
         <translation>Its colours and contrast aren’t followed, and links may not open.</translation>
     </message>
+    <message>
+        <source>SHARING_REFUSED</source>
+        <extracomment>Under that switch, when the service does not do this</extracomment>
+        <translation>Your service can’t change this here.</translation>
+    </message>
 </context>
 </TS>

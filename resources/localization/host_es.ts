@@ -1026,5 +1026,10 @@
         <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
         <translation>No se siguen sus colores ni su contraste, y puede que no se abran enlaces.</translation>
     </message>
+    <message>
+        <source>SHARING_REFUSED</source>
+        <extracomment>Under that switch, when the service does not do this. English: “Your service can’t change this here.”</extracomment>
+        <translation>Tu servicio no puede cambiar esto aquí.</translation>
+    </message>
 </context>
 </TS>

@@ -1026,5 +1026,10 @@
         <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
         <translation>رنگ و کنتراست آن دنبال نمی‌شود و شاید پیوندها باز نشوند.</translation>
     </message>
+    <message>
+        <source>SHARING_REFUSED</source>
+        <extracomment>Under that switch, when the service does not do this. English: “Your service can’t change this here.”</extracomment>
+        <translation>سرویس شما نمی‌تواند این را اینجا عوض کند.</translation>
+    </message>
 </context>
 </TS>

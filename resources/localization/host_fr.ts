@@ -1026,5 +1026,10 @@
         <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
         <translation>Ses couleurs et son contraste ne sont pas suivis, et des liens peuvent ne pas s’ouvrir.</translation>
     </message>
+    <message>
+        <source>SHARING_REFUSED</source>
+        <extracomment>Under that switch, when the service does not do this. English: “Your service can’t change this here.”</extracomment>
+        <translation>Votre service ne peut pas changer cela ici.</translation>
+    </message>
 </context>
 </TS>

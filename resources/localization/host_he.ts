@@ -1026,5 +1026,10 @@
         <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
         <translation>הצבעים והניגודיות שלו לא נלקחים ממנו, וייתכן שקישורים לא ייפתחו.</translation>
     </message>
+    <message>
+        <source>SHARING_REFUSED</source>
+        <extracomment>Under that switch, when the service does not do this. English: “Your service can’t change this here.”</extracomment>
+        <translation>השירות שלך לא יכול לשנות את זה כאן.</translation>
+    </message>
 </context>
 </TS>

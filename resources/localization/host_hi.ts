@@ -1026,5 +1026,10 @@
         <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
         <translation>उसके रंग और कंट्रास्ट नहीं अपनाए जाते, और शायद लिंक न खुलें।</translation>
     </message>
+    <message>
+        <source>SHARING_REFUSED</source>
+        <extracomment>Under that switch, when the service does not do this. English: “Your service can’t change this here.”</extracomment>
+        <translation>आपकी सेवा इसे यहाँ बदल नहीं सकती।</translation>
+    </message>
 </context>
 </TS>

@@ -1026,5 +1026,10 @@
         <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
         <translation>Colori e contrasto non sono seguiti, e i link forse non si aprono.</translation>
     </message>
+    <message>
+        <source>SHARING_REFUSED</source>
+        <extracomment>Under that switch, when the service does not do this. English: “Your service can’t change this here.”</extracomment>
+        <translation>Il tuo servizio non può cambiarlo da qui.</translation>
+    </message>
 </context>
 </TS>

@@ -1026,5 +1026,10 @@
         <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
         <translation>색상과 대비를 따르지 못하고, 링크가 열리지 않을 수 있습니다.</translation>
     </message>
+    <message>
+        <source>SHARING_REFUSED</source>
+        <extracomment>Under that switch, when the service does not do this. English: “Your service can’t change this here.”</extracomment>
+        <translation>서비스가 여기서는 이것을 바꿀 수 없습니다.</translation>
+    </message>
 </context>
 </TS>

@@ -1026,5 +1026,10 @@
         <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
         <translation>Kleuren en contrast worden niet gevolgd, en links openen misschien niet.</translation>
     </message>
+    <message>
+        <source>SHARING_REFUSED</source>
+        <extracomment>Under that switch, when the service does not do this. English: “Your service can’t change this here.”</extracomment>
+        <translation>Je dienst kan dit hier niet veranderen.</translation>
+    </message>
 </context>
 </TS>

@@ -1026,5 +1026,10 @@
         <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
         <translation>Jego kolory i kontrast nie są brane pod uwagę, a linki mogą się nie otwierać.</translation>
     </message>
+    <message>
+        <source>SHARING_REFUSED</source>
+        <extracomment>Under that switch, when the service does not do this. English: “Your service can’t change this here.”</extracomment>
+        <translation>Twoja usługa nie może tego tu zmienić.</translation>
+    </message>
 </context>
 </TS>

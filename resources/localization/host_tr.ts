@@ -1026,5 +1026,10 @@
         <extracomment>Its cause. English: “Its colours and contrast aren’t followed, and links may not open.”</extracomment>
         <translation>Renkleri ve karşıtlığı izlenmiyor; bağlantılar açılmayabilir.</translation>
     </message>
+    <message>
+        <source>SHARING_REFUSED</source>
+        <extracomment>Under that switch, when the service does not do this. English: “Your service can’t change this here.”</extracomment>
+        <translation>Hizmetiniz bunu buradan değiştiremiyor.</translation>
+    </message>
 </context>
 </TS>

@@ -663,5 +663,15 @@
         <extracomment>A longitude; %@ is a number with two decimals. English: “%@° west”</extracomment>
         <translation>%@° West</translation>
     </message>
+    <message>
+        <source>LINK_COMPUTER</source>
+        <extracomment>A button: makes a link with which the program on a computer signs in; and the title of the page that shows it. English: “Sign in on a computer”</extracomment>
+        <translation>Am Computer anmelden</translation>
+    </message>
+    <message>
+        <source>LINK_COMPUTER_TEXT</source>
+        <extracomment>Above the link. English: “Paste this link into ktr on the computer. It works once, within 15 minutes.”</extracomment>
+        <translation>Füge diesen Link in ktr auf dem Computer ein. Er gilt einmal, 15 Minuten lang.</translation>
+    </message>
 </context>
 </TS>

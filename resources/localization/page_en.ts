@@ -663,5 +663,15 @@
         <extracomment>A longitude; %@ is a number with two decimals</extracomment>
         <translation>%@° west</translation>
     </message>
+    <message>
+        <source>LINK_COMPUTER</source>
+        <extracomment>A button: makes a link with which the program on a computer signs in; and the title of the page that shows it</extracomment>
+        <translation>Sign in on a computer</translation>
+    </message>
+    <message>
+        <source>LINK_COMPUTER_TEXT</source>
+        <extracomment>Above the link</extracomment>
+        <translation>Paste this link into ktr on the computer. It works once, within 15 minutes.</translation>
+    </message>
 </context>
 </TS>

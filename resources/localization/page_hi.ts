@@ -663,5 +663,15 @@
         <extracomment>A longitude; %@ is a number with two decimals. English: “%@° west”</extracomment>
         <translation>%@° पश्चिम</translation>
     </message>
+    <message>
+        <source>LINK_COMPUTER</source>
+        <extracomment>A button: makes a link with which the program on a computer signs in; and the title of the page that shows it. English: “Sign in on a computer”</extracomment>
+        <translation>कंप्यूटर पर साइन इन करें</translation>
+    </message>
+    <message>
+        <source>LINK_COMPUTER_TEXT</source>
+        <extracomment>Above the link. English: “Paste this link into ktr on the computer. It works once, within 15 minutes.”</extracomment>
+        <translation>यह लिंक कंप्यूटर पर ktr में चिपकाएँ। यह 15 मिनट में एक बार काम करता है।</translation>
+    </message>
 </context>
 </TS>

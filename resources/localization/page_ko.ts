@@ -663,5 +663,15 @@
         <extracomment>A longitude; %@ is a number with two decimals. English: “%@° west”</extracomment>
         <translation>서경 %@°</translation>
     </message>
+    <message>
+        <source>LINK_COMPUTER</source>
+        <extracomment>A button: makes a link with which the program on a computer signs in; and the title of the page that shows it. English: “Sign in on a computer”</extracomment>
+        <translation>컴퓨터에서 로그인</translation>
+    </message>
+    <message>
+        <source>LINK_COMPUTER_TEXT</source>
+        <extracomment>Above the link. English: “Paste this link into ktr on the computer. It works once, within 15 minutes.”</extracomment>
+        <translation>이 링크를 컴퓨터의 ktr에 붙여 넣으세요. 15분 안에 한 번만 쓸 수 있습니다.</translation>
+    </message>
 </context>
 </TS>

@@ -663,5 +663,15 @@
         <extracomment>A longitude; %@ is a number with two decimals. English: “%@° west”</extracomment>
         <translation>西经%@°</translation>
     </message>
+    <message>
+        <source>LINK_COMPUTER</source>
+        <extracomment>A button: makes a link with which the program on a computer signs in; and the title of the page that shows it. English: “Sign in on a computer”</extracomment>
+        <translation>在电脑上登录</translation>
+    </message>
+    <message>
+        <source>LINK_COMPUTER_TEXT</source>
+        <extracomment>Above the link. English: “Paste this link into ktr on the computer. It works once, within 15 minutes.”</extracomment>
+        <translation>将此链接粘贴到电脑上的 ktr 中。15 分钟内可使用一次。</translation>
+    </message>
 </context>
 </TS>

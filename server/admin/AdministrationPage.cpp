@@ -19,7 +19,7 @@ std::string Administration::link(const std::string& name, bool isTerminal) {
     }
     const std::string address = settings->origin() + "/me/in?link=" + *link;
     out_ << "Whoever opens this within 15 minutes, once, is signed in as " << name << " for 30 days:\n  " << address
-         << "\n";
+         << "\nPasted into ktr's page for signing in, or with ktr open, it signs ktr in instead.\n";
     const auto code = isTerminal ? QrCode::of(address) : std::nullopt;
     if (code) {
         out_ << terminalCode(*code, true);

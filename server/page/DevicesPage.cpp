@@ -54,7 +54,24 @@ std::string DevicesPage::html(const PageContext& context, const std::vector<Page
     page.html().close();
     page.linkRow("/me/phone", language.text("SET_UP_PHONE"));
     page.close();
+    page.html().open("div", {{"class", "buttons"}});
+    page.openForm("/me/devices/link");
+    page.button(PageBuilder::Button::Quiet, language.text("LINK_COMPUTER"));
+    page.close();
+    page.close();
     return page.finish(language.text("MY_DEVICES"));
+}
+
+std::string DevicesPage::linkHtml(const PageContext& context, const std::string& link) {
+    const PageLanguage& language = context.language;
+    PageBuilder page(language, context.token);
+    page.bar(language.text("LINK_COMPUTER"), "/me/devices");
+    page.words(language.text("LINK_COMPUTER_TEXT"));
+    page.openCard();
+    page.html().open("div", {{"class", "field"}});
+    page.html().leaf("p", {{"class", "value"}, {"dir", "ltr"}, {"translate", "no"}}, link).close();
+    page.close();
+    return page.finish(language.text("LINK_COMPUTER"));
 }
 
 std::string DevicesPage::endHtml(const PageContext& context, const PageDevice& device) {

@@ -11,6 +11,8 @@ namespace ktr::server {
 class DevicesPage {
   public:
     static std::string html(const PageContext& context, const std::vector<PageDevice>& devices);
+    /// Shows a link with which a program signs in, once.
+    static std::string linkHtml(const PageContext& context, const std::string& link);
     static std::string endHtml(const PageContext& context, const PageDevice& device);
 };
 

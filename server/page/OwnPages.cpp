@@ -128,6 +128,9 @@ HttpResponse OwnPages::change(const PageRequest& request, const Reader& reader) 
     if (request.is({"phone"})) {
         return makePhone(request, reader);
     }
+    if (request.is({"devices", "link"})) {
+        return makeLink(request, reader);
+    }
     if (request.is({"devices", "*", "end"}) || request.is({"browsers", "*", "end"})) {
         return endDevice(request, reader);
     }
@@ -371,6 +374,15 @@ HttpResponse OwnPages::changeSettings(const PageRequest& request, const Reader& 
     HttpResponse response = PageAnswer::seeOther("/me/settings?saved");
     PageAnswer::setCookie(response, PageAnswer::kLanguage, language, kLanguageLasts);
     return response;
+}
+
+HttpResponse OwnPages::makeLink(const PageRequest& request, const Reader& reader) {
+    const auto link = Secret::make();
+    if (!link || !store_.addSignIn(reader.person.id, *link, reader.context.now)) {
+        return notKept(reader.context);
+    }
+    const std::string address = "https://" + request.host + "/me/in?link=" + *link;
+    return PageAnswer::html(200, DevicesPage::linkHtml(reader.context, address));
 }
 
 HttpResponse OwnPages::deleteAll(const Reader& reader) {

@@ -37,6 +37,8 @@ class OwnPages {
     HttpResponse changeRule(const PageRequest& request, const Reader& reader);
     HttpResponse stopSharing(const PageRequest& request, const Reader& reader);
     HttpResponse makePhone(const PageRequest& request, const Reader& reader);
+    /// With which a program signs in.
+    HttpResponse makeLink(const PageRequest& request, const Reader& reader);
     HttpResponse endDevice(const PageRequest& request, const Reader& reader);
     HttpResponse changeSettings(const PageRequest& request, const Reader& reader);
     HttpResponse deleteAll(const Reader& reader);

@@ -16,6 +16,11 @@ bool isForm(const HttpRequest& request) {
     return equalIgnoringCase(type.substr(0, type.find(';')), "application/x-www-form-urlencoded");
 }
 
+bool isDocument(const HttpRequest& request) {
+    const std::string type = request.headerText("Content-Type");
+    return equalIgnoringCase(type.substr(0, type.find(';')), "application/json");
+}
+
 bool isOfOwnPage(const HttpRequest& request) {
     if (const std::string* site = request.header("Sec-Fetch-Site")) {
         return *site == "same-origin";
@@ -57,6 +62,9 @@ PageRequest PageRequest::read(const HttpRequest& request) {
     out.query = UrlQuery::read(request.query);
     if (out.posts && isForm(request) && request.body.size() <= kMostForm) {
         out.form = UrlQuery::read(request.body);
+    }
+    if (out.posts && isDocument(request) && request.body.size() <= kMostForm) {
+        out.document = request.body;
     }
     out.host = request.headerText("Host");
     const std::string cookies = request.headerText("Cookie");

@@ -17,6 +17,7 @@ struct PageRequest {
     std::vector<std::string> parts;  ///< of the path, after "/me"
     UrlQuery query;
     UrlQuery form;         ///< of a post; empty for one that is no form or too long
+    std::string document;  ///< of a program's post: what it sends as JSON; empty otherwise
     std::string host;      ///< with its port, as the browser wrote it
     std::string session;   ///< the secret in its cookie; empty: none
     std::string language;  ///< chosen on the settings page; empty: none

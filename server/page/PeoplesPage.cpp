@@ -1,5 +1,8 @@
 #include "server/page/PeoplesPage.h"
 
+#include "documents/JsonReader.h"
+#include "platform/base/Json.h"
+#include "server/answers/CommandRequest.h"
 #include "server/http/BasicCredentials.h"
 #include "server/page/PageAnswer.h"
 #include "server/page/PlainPage.h"
@@ -100,10 +103,39 @@ HttpResponse PeoplesPage::signIn(const PageRequest& request, const PageLanguage&
     return saying(503, language, "NOT_KEPT", nullptr, false);
 }
 
+HttpResponse PeoplesPage::signProgramIn(const PageRequest& request, double& delay) {
+    const auto read = documents::JsonReader::read(request.document);
+    const auto* value = std::get_if<platform::Value>(&read);
+    const auto* members = value != nullptr ? value->dictionary() : nullptr;
+    const auto* link = members != nullptr ? members->find(kLinkField) : nullptr;
+    if (link == nullptr || link->string() == nullptr) {
+        return refusal(400, "expected a JSON object with a link");
+    }
+    const auto secret = Secret::make();
+    std::string person;
+    switch (secret ? setup_.store.signProgramIn(*link->string(), *secret, setup_.now(), person) : SignIn::Failed) {
+        case SignIn::Done: {
+            const platform::Dictionary answer{{"statusCode", 200}, {"person", person}, {"secret", *secret}};
+            HttpResponse response = HttpResponse::json(200, platform::writeJson(answer));
+            response.headers.emplace_back("Cache-Control", "no-store");
+            return response;
+        }
+        case SignIn::Spent:
+            delay = setup_.delays.afterFailure(request.peer, FailureDelays::Clock::now());
+            return refusal(403, "the link was used before, has ended, or never was");
+        case SignIn::Failed:
+            break;
+    }
+    return refusal(503, "the store cannot be written");
+}
+
 HttpResponse PeoplesPage::answerTo(const PageRequest& request, double& delay) {
     const std::int64_t now = setup_.now();
     const std::string tag = PageLanguage::choose(request.language, request.accepted);
     const PageLanguage plain(tag, "UTC");
+    if (request.is({"in"}) && !request.document.empty()) {
+        return signProgramIn(request, delay);
+    }
     if (request.is({"in"})) {
         return request.posts
                    ? signIn(request, plain, delay)

@@ -17,7 +17,8 @@
 namespace ktr::server {
 
 /// The pages for those whose phone has only a tracker: who sees them, how exactly, until when. A browser signs in with
-/// a link that works once, and is known by a cookie afterwards; a phone's secret signs nobody in. Requests are
+/// a link that works once, and is known by a cookie afterwards; a phone's secret signs nobody in. With such a link a
+/// program gets a reader's secret instead. Requests are
 /// answered one after the other on a thread of their own, which waits for the disk: the edge's threads do not.
 class PeoplesPage {
   public:
@@ -44,6 +45,8 @@ class PeoplesPage {
     void work();
     HttpResponse answerTo(const PageRequest& request, double& delay);
     HttpResponse signIn(const PageRequest& request, const PageLanguage& language, double& delay);
+    /// The same for a program: a reader's secret, once.
+    HttpResponse signProgramIn(const PageRequest& request, double& delay);
 
     Setup setup_;
     OwnPages own_;

@@ -7,6 +7,7 @@
 #include "platform/base/Json.h"
 #include "server/answers/CommandRequest.h"
 #include "server/answers/LocationAnswers.h"
+#include "server/rules/Visibility.h"
 
 namespace ktr::server {
 
@@ -70,6 +71,10 @@ bool AskCommands::answer(const std::string& command, const Device& device, const
                          const HttpReply& reply) const {
     if (command == "places") {
         places(device, reply);
+        return true;
+    }
+    if (command == "friends") {
+        friends(device, reply);
         return true;
     }
     if (command != "sharing") {
@@ -196,6 +201,24 @@ void AskCommands::places(const Device& device, const HttpReply& reply) const {
     }
     reply.send(
         HttpResponse::json(200, platform::writeJson(Dictionary{{"statusCode", 200}, {"places", std::move(places)}})));
+}
+
+void AskCommands::friends(const Device& device, const HttpReply& reply) const {
+    const std::uint64_t failures = setup_.store.readFailures();
+    const std::int64_t now = setup_.now();
+    Value::Array friends;
+    for (const Friend& one : setup_.store.friendsOf(device.person, now)) {
+        const auto person =
+            Visibility::visible(one.sharing, now) ? setup_.store.person(one.person) : std::optional<Person>();
+        if (person && !person->handles.empty()) {
+            friends.emplace_back(Dictionary{{"name", person->name}, {"handle", person->handles.front()}});
+        }
+    }
+    if (setup_.store.readFailures() != failures) {
+        return reply.send(notRead());
+    }
+    reply.send(
+        HttpResponse::json(200, platform::writeJson(Dictionary{{"statusCode", 200}, {"friends", std::move(friends)}})));
 }
 
 }  // namespace ktr::server

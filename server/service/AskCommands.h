@@ -13,7 +13,8 @@
 
 namespace ktr::server {
 
-/// The commands with which a person asks about, and changes, what they share, and hears of their own places
+/// The commands with which a person asks about, and changes, what they share, and hears of their own places and of who
+/// lets them see where they are
 /// (docs/service-protocol.md). Any thread.
 class AskCommands {
   public:
@@ -45,6 +46,8 @@ class AskCommands {
     bool isTakenBack(std::int64_t owner, std::int64_t viewer) const;
     void tell(const Device& device, const HttpReply& reply) const;
     void places(const Device& device, const HttpReply& reply) const;
+    /// Those whom the person would see now; who hides, ended a rule or was never heard is no different from a stranger.
+    void friends(const Device& device, const HttpReply& reply) const;
 
     const Setup setup_;
 };

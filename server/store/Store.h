@@ -160,6 +160,8 @@ class Store {
     bool addSignIn(std::int64_t person, std::string_view link, std::int64_t now);
     /// Spends the link, and signs a browser in that holds this secret from then on.
     SignIn signIn(std::string_view link, std::string_view session, std::int64_t now);
+    /// Spends the link, and makes a reader with this secret, of the person whose name it gives.
+    SignIn signProgramIn(std::string_view link, std::string_view secret, std::int64_t now, std::string& person);
     /// None with `failed` set: the store could not be read.
     std::optional<Browser> browserOf(std::string_view session, std::int64_t now, bool& failed);
     std::vector<Browser> browsersOf(std::int64_t person, std::int64_t now);
@@ -320,6 +322,8 @@ class Store {
         bool shared;
     };
     static void addDeviceIn(Database& database, std::int64_t device, const NewDevice& made, std::int64_t now);
+    /// Whose link it was; 0 for one that is spent, or never was.
+    static std::int64_t spendLinkIn(Database& database, std::string_view link, std::int64_t latest);
     void addSignInIn(Database& database, std::int64_t person, std::string_view link, std::int64_t now);
     static void endBrowsersIn(Database& database, std::int64_t person);
 

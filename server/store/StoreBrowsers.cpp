@@ -18,6 +18,40 @@ bool Store::addSignIn(std::int64_t person, std::string_view link, std::int64_t n
     return writeNow([&](Database& database) { addSignInIn(database, person, link, now); });
 }
 
+std::int64_t Store::spendLinkIn(Database& database, std::string_view link, std::int64_t latest) {
+    const std::string hash = Secret::hash(link);
+    std::int64_t person = 0;
+    {
+        auto row = database.statement("SELECT person FROM sign_in WHERE link = $1 AND until > $2");
+        row.bindBytes(hash).bind(latest);
+        person = row.next() ? row.integer(0) : 0;
+    }
+    database.statement("DELETE FROM sign_in WHERE link = $1").bindBytes(hash).run();
+    // Whoever deletes it has it: another process may have read it at the same moment.
+    return database.changes() == 1 ? person : 0;
+}
+
+SignIn Store::signProgramIn(std::string_view link, std::string_view secret, std::int64_t now, std::string& person) {
+    SignIn outcome = SignIn::Failed;
+    const std::int64_t device = Secret::number();
+    const bool good = device != 0 && writeNow([&](Database& database) {
+                          outcome = SignIn::Spent;
+                          const std::int64_t latest = present(now);
+                          const std::int64_t owner = spendLinkIn(database, link, latest);
+                          if (owner == 0) {
+                              return;
+                          }
+                          {
+                              auto row = database.statement("SELECT name FROM person WHERE id = $1");
+                              row.bind(owner);
+                              person = row.next() ? row.text(0) : "";
+                          }
+                          addDeviceIn(database, device, {owner, DeviceKind::Reader, secret, "", false}, latest);
+                          outcome = SignIn::Done;
+                      });
+    return good ? outcome : SignIn::Failed;
+}
+
 SignIn Store::signIn(std::string_view link, std::string_view session, std::int64_t now) {
     SignIn outcome = SignIn::Failed;
     const std::int64_t browser = Secret::number();
@@ -25,16 +59,8 @@ SignIn Store::signIn(std::string_view link, std::string_view session, std::int64
         browser != 0 && writeNow([&](Database& database) {
             outcome = SignIn::Spent;
             const std::int64_t latest = present(now);
-            const std::string hash = Secret::hash(link);
-            std::int64_t person = 0;
-            {
-                auto row = database.statement("SELECT person FROM sign_in WHERE link = $1 AND until > $2");
-                row.bindBytes(hash).bind(latest);
-                person = row.next() ? row.integer(0) : 0;
-            }
-            database.statement("DELETE FROM sign_in WHERE link = $1").bindBytes(hash).run();
-            // Whoever deletes it has it: another process may have read it at the same moment.
-            if (person == 0 || database.changes() != 1) {
+            const std::int64_t person = spendLinkIn(database, link, latest);
+            if (person == 0) {
                 return;
             }
             database.statement("DELETE FROM browser WHERE until <= $1").bind(latest).run();

@@ -123,6 +123,27 @@ class OwnServiceTest(unittest.TestCase):
         self.assertIn("2\u00a0minutes ago", seen.stdout, seen.stdout + seen.stderr)
         self.assertIn("Accurate to 39 feet", seen.stdout)
 
+    def test_a_link_signs_a_program_in_once(self):
+        self.add("Mara")
+        self.start()
+        link = re.search(r"https://localhost:\d+/me/in\?link=(\w+)", self.command("link", "Mara")).group(1)
+
+        def exchange(body):
+            status, text = self.request("POST", "/me/in", "", None, json.dumps(body).encode(),
+                                        **{"Content-Type": "application/json"})
+            return status, json.loads(text)
+
+        self.assertEqual(exchange({"link": "guessed"})[0], 403)
+        status, given = exchange({"link": link})
+        self.assertEqual((status, given["person"]), (200, "Mara"))
+        self.assertEqual(self.ask("Mara", given["secret"])[0], 200)
+        self.assertEqual(self.ask("Mara", given["secret"], command="friends"), (200, {"statusCode": 200, "friends": []}))
+        self.assertEqual(exchange({"link": link})[0], 403)
+        self.assertEqual(self.ask("Mara", link)[0], 401, "a link is no secret")
+        everything = b"".join(one.read_bytes() for one in (self.folder / "data").iterdir() if one.is_file())
+        self.assertNotIn(given["secret"].encode(), everything)
+        self.assertNotIn(link.encode(), everything)
+
     def test_who_is_not_seen_cannot_be_told_from_who_does_not_exist(self):
         people = {name: self.add(name) for name in ("Ann", "Otto", "Zoe", "Ivy", "Lea")}
         self.add("Mara")

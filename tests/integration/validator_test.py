@@ -109,6 +109,12 @@ class ValidatorTest(accessibility.WindowTest):
             self.assertIn("text", [node.getRoleName() for node in tree])
             self.check(tree)
 
+    def test_page_for_signing_in(self):
+        with tempfile.TemporaryDirectory() as folder:
+            tree, _ = self.open(0, environment={"XDG_CONFIG_HOME": folder})
+            self.assertIn("Where are your friends?", [node.name for node in tree])
+            self.check(tree)
+
     def test_a_fault_is_found(self):
         """The rules do speak: of a button without an action there would be a line."""
         import pyatspi

@@ -231,5 +231,69 @@ TEST_F(SignInTest, ClockOfTheService_IsComparedWithOurs) {
     EXPECT_FALSE(ServiceCheck::of(answer, 0.0, {kThen}).ahead);
 }
 
+TEST_F(SignInTest, Link_GoesIntoTheBodyOfOnePost_AndWhatItGivesIsKept) {
+    serve(answering(200, "", R"({"statusCode":200,"person":"Mara","secret":"gkx4tv"})"));
+    trustTheServers();
+    SignIn::Wish wish;
+    wish.link = " https://" + server->host() + "/me/in?link=4tvp0habc\n";
+    const auto result = signIn(wish);
+    EXPECT_EQ(result.outcome, Outcome::Done) << result.reason;
+    EXPECT_EQ(kept, "Mara@" + server->host() + "=gkx4tv");
+    EXPECT_EQ(configuration().account->personId, "Mara");
+    EXPECT_EQ(configuration().account->host, server->host());
+    ASSERT_EQ(server->requests().size(), 1U);
+    EXPECT_TRUE(server->requests()[0].head.starts_with("POST /me/in HTTP/1.1")) << server->requests()[0].head;
+    EXPECT_EQ(server->requests()[0].head.find("4tvp0habc"), std::string::npos) << "no address has it";
+    EXPECT_EQ(server->requests()[0].head.find("Authorization"), std::string::npos);
+    EXPECT_EQ(server->requests()[0].body, R"({"link":"4tvp0habc"})");
+    std::ifstream stream(file);
+    const std::string written(std::istreambuf_iterator<char>(stream), {});
+    EXPECT_EQ(written.find("4tvp0habc"), std::string::npos);
+    EXPECT_EQ(written.find("gkx4tv"), std::string::npos);
+}
+
+TEST_F(SignInTest, SpentLink_AndWhatIsNone_KeepNothing) {
+    serve(answering(403, "", R"({"statusCode":403,"message":"the link was used before"})"));
+    trustTheServers();
+    SignIn::Wish wish;
+    wish.link = "https://" + server->host() + "/me/in?link=4tvp0habc";
+    EXPECT_EQ(signIn(wish).outcome, Outcome::Unknown);
+    serve(answering(200, "", R"({"statusCode":200})"));
+    wish.link = "https://" + server->host() + "/me/in?link=4tvp0habc";
+    EXPECT_EQ(signIn(wish).outcome, Outcome::NoService) << "an answer that gives nothing";
+    for (const char* none :
+         {"http://brin.example/me/in?link=abc", "https://brin.example/me/in", "brin.example/me/in?link=a",
+          "https://brin.example/me/in?link=", "https://brin.example/me/in?link=a%20b",
+          "https://mara@brin.example/me/in?link=abc", "https://brin.example/in?link=abc"}) {
+        wish.link = none;
+        EXPECT_EQ(signIn(wish).outcome, Outcome::BadAddress) << none;
+    }
+    EXPECT_EQ(kept, "");
+    EXPECT_FALSE(configuration().account);
+}
+
+TEST_F(SignInTest, LinkThatWasSpent_IsNotAskedForAgain_WhenOnlyTheKeyringSaidNo) {
+    serve(answering(200, "", R"({"statusCode":200,"person":"Mara","secret":"gkx4tv"})"));
+    trustTheServers();
+    SignIn one(file, keyring(false));
+    SignIn::Wish wish;
+    wish.link = "https://" + server->host() + "/me/in?link=4tvp0habc";
+    std::optional<SignIn::Result> result;
+    const auto run = [&] {
+        result.reset();
+        one.begin(wish, [&result](const SignIn::Result& got) { result = got; });
+        const QDeadlineTimer deadline(30000);
+        while (!result && !deadline.hasExpired()) {
+            QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents, 50);
+        }
+        return result.value_or(SignIn::Result{}).outcome;
+    };
+    EXPECT_EQ(run(), Outcome::NoKeyring);
+    wish.place = SignIn::Place::File;
+    EXPECT_EQ(run(), Outcome::Done);
+    EXPECT_EQ(tokenInFile(), "gkx4tv");
+    EXPECT_EQ(server->posts(), 1U) << "the service gives it once";
+}
+
 }  // namespace
 }  // namespace ktr::test

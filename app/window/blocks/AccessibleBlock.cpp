@@ -20,7 +20,8 @@ QAccessible::State AccessibleBlock::state() const {
     QAccessible::State state = AccessiblePlain::state();
     state.checkable = block_.isCheckable();
     state.checked = block_.isChecked();
-    state.focusable = block_.canBePressed() && block_.isEnabled();
+    // Also while it is switched off: keys will reach it.
+    state.focusable = block_.canBePressed();
     return state;
 }
 

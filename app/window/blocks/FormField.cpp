@@ -106,7 +106,9 @@ void FormField::place() {
     const QRectF in = box();
     const int eye = eye_ == nullptr ? 0 : IconButton::side();
     const double editEnd = eye_ == nullptr ? kInset : eye + kEyeEnd;
-    edit_->setGeometry(mirrored(QRectF(kInset, in.y() + 2, width() - kInset - editEnd, in.height() - 4)).toRect());
+    const double editStart = kInset - QuestionEdit::kBefore;
+    edit_->setGeometry(
+        mirrored(QRectF(editStart, in.y() + 2, width() - editStart - editEnd, in.height() - 4)).toRect());
     if (eye_ != nullptr) {
         eye_->placeShape(
             mirrored(QRectF(width() - kEyeEnd - eye, in.y() + (in.height() - eye) / 2.0, eye, eye)).toRect());

@@ -17,25 +17,17 @@ constexpr int kAboveLower = 8;
 }  // namespace
 
 ColumnPage::ColumnPage(Bar bar, QWidget* parent)
-    : Page(parent), area_(new QScrollArea(this)), handle_(new QScrollBar(Qt::Vertical, this)), column_(new Column) {
+    : Page(parent), area_(new PageArea(this)), handle_(new PageHandle(this)), column_(new Column) {
     if (bar == Bar::With) {
         bar_ = new PageBar(this);
         bar_->setBack([this] { leave(); });
         setTabOrder(&bar_->back(), area_);
     }
-    area_->setFrameShape(QFrame::NoFrame);
-    area_->setFocusPolicy(Qt::NoFocus);
-    area_->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
-    // The bar lies over the page, as it does over a conversation.
-    area_->setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
-    area_->viewport()->setAutoFillBackground(false);
     area_->setWidget(column_);
     column_->setAutoFillBackground(false);
     column_->installEventFilter(this);
     area_->viewport()->installEventFilter(this);
     QScroller::grabGesture(area_->viewport(), QScroller::TouchGesture);
-    handle_->setFocusPolicy(Qt::NoFocus);
-    handle_->setCursor(Qt::ArrowCursor);
     QScrollBar* scrolled = area_->verticalScrollBar();
     connect(scrolled, &QScrollBar::rangeChanged, &listener_, [this](int least, int most) {
         handle_->setRange(least, most);

@@ -1,11 +1,10 @@
 #pragma once
 
-#include <QScrollArea>
-#include <QScrollBar>
-
 #include "app/window/blocks/Column.h"
 #include "app/window/blocks/PageBar.h"
 #include "app/window/pages/Page.h"
+#include "app/window/pages/PageArea.h"
+#include "app/window/pages/PageHandle.h"
 
 namespace ktr::app {
 
@@ -38,8 +37,8 @@ class ColumnPage : public Page {
     void place();
 
     PageBar* bar_ = nullptr;
-    QScrollArea* area_;
-    QScrollBar* handle_;
+    PageArea* area_;
+    PageHandle* handle_;
     Column* column_;
     Block* lower_ = nullptr;
     /// Hears what the scroll bars say: a widget that did would count as controlled by them for assistive technology.

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "linux/configuration/SignInLink.h"
 #include "linux/paint/QtImage.h"
 #include "platform/base/Bundle.h"
 #include "platform/base/Format.h"
@@ -29,6 +30,7 @@ SignInPage::SignInPage(host::Host& host, std::unique_ptr<linux_::SignIn> signIn,
       icon_(new Picture(kIconSide)),
       title_(new Words(BlockStyle::Title)),
       line_(new Words(BlockStyle::Body, Words::Tone::Soft)),
+      link_(new FormField),
       address_(new FormField),
       person_(new FormField),
       secret_(new FormField),
@@ -37,6 +39,7 @@ SignInPage::SignInPage(host::Host& host, std::unique_ptr<linux_::SignIn> signIn,
       go_(new Button(Button::Kind::Main)),
       cancel_(new Button(Button::Kind::Quiet)),
       inFile_(new Button(Button::Kind::Quiet)),
+      otherWay_(new Button(Button::Kind::Text)),
       footnote_(new Words(BlockStyle::Footnote, Words::Tone::Soft)) {
     line_->setBalanced(true);
     footnote_->setAlignment(BlockAlignment::Centre);
@@ -44,6 +47,7 @@ SignInPage::SignInPage(host::Host& host, std::unique_ptr<linux_::SignIn> signIn,
     column().add(icon_, {kIconTop, kTextInset, kTextInset, false});
     column().add(title_, {18, kTextInset, kTextInset});
     column().add(line_, {6, kTextInset, kTextInset});
+    column().add(link_, {24});
     column().add(address_, {24});
     column().add(person_, {14});
     column().add(secret_, {14});
@@ -54,14 +58,20 @@ SignInPage::SignInPage(host::Host& host, std::unique_ptr<linux_::SignIn> signIn,
     buttons_->add(cancel_);
     column().add(inFile_, {8});
     column().beginBottom(kLowerMargin);
-    column().add(footnote_, {20, kTextInset, kTextInset});
+    column().add(otherWay_, {20, kTextInset, kTextInset, false, true});
+    column().add(footnote_, {0, kTextInset, kTextInset});
+    link_->hide();
+    otherWay_->setPressed([this] {
+        setByLink(!isByLink_);
+        firstFocus()->setFocus(Qt::OtherFocusReason);
+    });
     note_->hide();
     cancel_->hide();
     inFile_->hide();
     inFile_->setWide(true);
     address_->setText(QString::fromStdString(before.host));
     person_->setText(QString::fromStdString(before.person));
-    for (FormField* field : {address_, person_, secret_}) {
+    for (FormField* field : fields()) {
         field->setChanged([this] { changed(); });
         field->setEntered([this] { go_->press(); });
     }
@@ -84,6 +94,9 @@ QString SignInPage::name() const {
 }
 
 QWidget* SignInPage::firstFocus() const {
+    if (isByLink_) {
+        return &link_->edit();
+    }
     for (const FormField* field : {address_, person_}) {
         if (field->text().isEmpty()) {
             return &field->edit();
@@ -97,7 +110,9 @@ void SignInPage::refreshed() {
     icon_->setImage(std::dynamic_pointer_cast<const linux_::QtImage>(
         platform->images->imageNamed("appIcon_dyn", platform::kSnippetsBundle)));
     title_->setText(text("SIGN_IN_TITLE"));
-    line_->setText(text(isAgain_ ? "STATUS_SIGN_IN" : "SIGN_IN_LINE"));
+    line_->setText(text(isByLink_ ? "SIGN_IN_LINK_LINE" : isAgain_ ? "STATUS_SIGN_IN" : "SIGN_IN_LINE"));
+    link_->setLabel(text("SIGN_IN_LINK"));
+    otherWay_->setWords(text(isByLink_ ? "SIGN_IN_USE_SECRET" : "SIGN_IN_HAVE_LINK"));
     address_->setLabel(text("SIGN_IN_ADDRESS"));
     address_->setHint(QStringLiteral("brin.example"));
     person_->setLabel(text("SIGN_IN_YOU"));
@@ -117,7 +132,7 @@ void SignInPage::resizeEvent(QResizeEvent* event) {
 }
 
 void SignInPage::clearNotes() {
-    for (FormField* field : {address_, person_, secret_}) {
+    for (FormField* field : fields()) {
         field->setNote({});
     }
     note_->setText({});
@@ -130,26 +145,63 @@ void SignInPage::clearNotes() {
 void SignInPage::changed() {
     clearNotes();
     setChecking(false);
+    if (isByLink_) {
+        return;
+    }
+    // A link that is pasted into another field is meant as one; and no secret stays in a field that shows it.
+    for (FormField* field : {address_, person_, secret_}) {
+        if (linux_::SignInLink::read(field->text().toStdString())) {
+            const QString link = field->text();
+            field->setText({});
+            offerLink(link);
+            return;
+        }
+    }
+}
+
+void SignInPage::offerLink(const QString& link) {
+    if (signIn_->isUnderWay()) {
+        return;
+    }
+    setByLink(true);
+    link_->setText(link);
+    setChecking(false);
+    go_->setFocus(Qt::OtherFocusReason);
+}
+
+void SignInPage::setByLink(bool isByLink) {
+    isByLink_ = isByLink;
+    clearNotes();
+    link_->setVisible(isByLink);
+    for (FormField* field : {address_, person_, secret_}) {
+        field->setVisible(!isByLink);
+    }
+    refresh();
+}
+
+bool SignInPage::isFull() const {
+    return isByLink_ ? !link_->text().trimmed().isEmpty()
+                     : !address_->text().trimmed().isEmpty() && !person_->text().trimmed().isEmpty() &&
+                           !secret_->text().isEmpty();
 }
 
 void SignInPage::setChecking(bool isChecking) {
-    for (FormField* field : {address_, person_, secret_}) {
+    for (FormField* field : fields()) {
         field->setFixed(isChecking);
     }
-    const bool isFull =
-        !address_->text().trimmed().isEmpty() && !person_->text().trimmed().isEmpty() && !secret_->text().isEmpty();
     go_->setWords(text(isChecking ? "SIGN_IN_CHECKING" : isRetry_ ? "SIGN_IN_RETRY" : "SIGN_IN_GO"));
     go_->setBusy(isChecking);
-    go_->setEnabled(isFull && !isChecking);
+    go_->setEnabled(isFull() && !isChecking);
+    otherWay_->setVisible(!isChecking);
     cancel_->setVisible(isChecking);
     buttons_->askForRoom();
 }
 
 void SignInPage::begin(linux_::SignIn::Place place) {
     clearNotes();
-    signIn_->begin(
-        {address_->text().toStdString(), person_->text().trimmed().toStdString(), secret_->text().toStdString(), place},
-        [this](const linux_::SignIn::Result& result) { ended(result); });
+    signIn_->begin({address_->text().toStdString(), person_->text().trimmed().toStdString(),
+                    secret_->text().toStdString(), place, isByLink_ ? link_->text().toStdString() : std::string()},
+                   [this](const linux_::SignIn::Result& result) { ended(result); });
     setChecking(true);
     cancel_->setFocus(Qt::OtherFocusReason);
 }
@@ -176,6 +228,7 @@ void SignInPage::ended(const linux_::SignIn::Result& result) {
         column().askForRoom();
         reveal(*note_);
     };
+    FormField& where = isByLink_ ? *link_ : *address_;
     switch (result.outcome) {
         case Outcome::Done:
             if (done_) {
@@ -183,22 +236,22 @@ void SignInPage::ended(const linux_::SignIn::Result& result) {
             }
             break;
         case Outcome::BadAddress:
-            complain(*address_, text("SIGN_IN_BAD_ADDRESS"));
+            complain(where, text(isByLink_ ? "SIGN_IN_BAD_LINK" : "SIGN_IN_BAD_ADDRESS"));
             break;
         case Outcome::NothingAnswers:
-            complain(*address_, textAbout("SIGN_IN_NOTHING_ANSWERS", result.host));
+            complain(where, textAbout("SIGN_IN_NOTHING_ANSWERS", result.host));
             break;
         case Outcome::NotTrusted:
-            complain(*address_, textAbout("SIGN_IN_NOT_TRUSTED", result.host));
+            complain(where, textAbout("SIGN_IN_NOT_TRUSTED", result.host));
             break;
         case Outcome::NoService:
-            complain(*address_, textAbout("SIGN_IN_NO_SERVICE", result.host));
+            complain(where, textAbout("SIGN_IN_NO_SERVICE", result.host));
             break;
         case Outcome::Failing:
-            complain(*address_, textAbout("SIGN_IN_FAILING", result.host));
+            complain(where, textAbout("SIGN_IN_FAILING", result.host));
             break;
         case Outcome::Unknown:
-            complain(*secret_, text("SIGN_IN_UNKNOWN"));
+            complain(isByLink_ ? *link_ : *secret_, text(isByLink_ ? "SIGN_IN_LINK_SPENT" : "SIGN_IN_UNKNOWN"));
             break;
         case Outcome::NoKeyring:
             go_->setWords(text("SIGN_IN_UNLOCK"));

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <vector>
 
 #include "app/window/blocks/Button.h"
 #include "app/window/blocks/Flow.h"
@@ -13,8 +14,8 @@
 
 namespace ktr::app {
 
-/// Where nobody is signed in, or not any more: service, person and secret, and what is wrong with them in words.
-/// Whoever shows it closes it once somebody is signed in. Main thread.
+/// Where nobody is signed in, or not any more: service, person and secret, or a link in place of them, and what is
+/// wrong with them in words. Whoever shows it closes it once somebody is signed in. Main thread.
 class SignInPage : public ColumnPage {
   public:
     /// What is known of the one who was signed in before; empty: nobody was.
@@ -33,6 +34,13 @@ class SignInPage : public ColumnPage {
     QWidget* firstFocus() const override;
     bool canBeLeft() const override { return false; }
 
+    /// A link that somebody sent: it stands in the field, and nothing is asked before the button is pressed.
+    void offerLink(const QString& link);
+
+    /// Only while a link is asked for instead of the other three.
+    FormField& link() const { return *link_; }
+    /// From one way to the other.
+    Button& otherWay() const { return *otherWay_; }
     FormField& address() const { return *address_; }
     FormField& person() const { return *person_; }
     FormField& secret() const { return *secret_; }
@@ -51,6 +59,9 @@ class SignInPage : public ColumnPage {
     /// With the host that was asked in its words.
     QString textAbout(const char* key, const std::string& host) const;
     void changed();
+    std::vector<FormField*> fields() const { return {link_, address_, person_, secret_}; }
+    void setByLink(bool isByLink);
+    bool isFull() const;
     void begin(linux_::SignIn::Place place);
     void stop();
     void ended(const linux_::SignIn::Result& result);
@@ -62,10 +73,12 @@ class SignInPage : public ColumnPage {
     const std::unique_ptr<linux_::SignIn> signIn_;
     const bool isAgain_;
     bool isRetry_ = false;
+    bool isByLink_ = false;
     std::function<void()> done_;
     Picture* icon_;
     Words* title_;
     Words* line_;
+    FormField* link_;
     FormField* address_;
     FormField* person_;
     FormField* secret_;
@@ -74,6 +87,7 @@ class SignInPage : public ColumnPage {
     Button* go_;
     Button* cancel_;
     Button* inFile_;
+    Button* otherWay_;
     Words* footnote_;
 };
 

@@ -113,6 +113,25 @@ class LibSecretModule : public SecretModule {
         }
         return isKept != FALSE;
     }
+
+    bool forget(const std::string& person, const std::string& host, double seconds, const std::atomic<bool>& givesUp,
+                std::string& error) const override {
+        GCancellable* cancellable = g_cancellable_new();
+        GError* failure = nullptr;
+        try {
+            const Deadline deadline(cancellable, seconds, givesUp);
+            secret_password_clear_sync(schema(), cancellable, &failure, "application", "ktr", "person", person.c_str(),
+                                       "host", host.c_str(), nullptr);
+        } catch (const std::exception& problem) {
+            error = problem.what();
+        }
+        g_object_unref(cancellable);
+        if (failure != nullptr) {
+            error = failure->message;
+            g_error_free(failure);
+        }
+        return error.empty();
+    }
 };
 
 }  // namespace

@@ -187,4 +187,44 @@ TEST_F(KTRSignInPageTest, EveryWindow_ShowsAllOfItWithoutCuttingAndScrolls) {
     }
 }
 
+TEST_F(KTRSignInPageTest, OneWhoHasALink_GivesNothingElse_AndComesBack) {
+    open();
+    EXPECT_FALSE(page->link().isVisible());
+    EXPECT_EQ(page->otherWay().words(), QStringLiteral("I have a link"));
+    page->otherWay().press();
+    EXPECT_TRUE(page->link().isVisible());
+    for (const FormField* field : {&page->address(), &page->person(), &page->secret()}) {
+        EXPECT_FALSE(field->isVisible());
+    }
+    EXPECT_EQ(page->firstFocus(), &page->link().edit());
+    EXPECT_FALSE(page->go().isEnabled());
+    keep("link");
+    type(page->link(), QStringLiteral("https://brin.example/somewhere"));
+    EXPECT_TRUE(page->go().isEnabled());
+    page->go().press();
+    waitForTheEnd();
+    EXPECT_EQ(page->link().note(), QStringLiteral("This isn’t a link for signing in."));
+    page->otherWay().press();
+    EXPECT_FALSE(page->link().isVisible());
+    EXPECT_TRUE(page->address().isVisible());
+    EXPECT_FALSE(page->go().isEnabled());
+}
+
+TEST_F(KTRSignInPageTest, LinkThatIsPastedIntoAnyField_IsMeantAsOne) {
+    open();
+    const QString link = QStringLiteral("https://") + nobody() + QStringLiteral("/me/in?link=4tvp0habc");
+    type(page->person(), link);
+    EXPECT_TRUE(page->link().isVisible());
+    EXPECT_EQ(page->link().text(), link);
+    EXPECT_EQ(page->person().text(), QString()) << "it would be shown there, and kept";
+    EXPECT_TRUE(page->go().isEnabled());
+    EXPECT_FALSE(page->cancel().isVisible()) << "nothing is asked before the press";
+    page->go().press();
+    keep("checking-link");
+    waitForTheEnd();
+    EXPECT_TRUE(page->link().note().contains(QStringLiteral("Nothing answers"))) << page->link().note().toStdString();
+    EXPECT_FALSE(page->link().note().contains(QStringLiteral("4tvp0habc")));
+    EXPECT_EQ(page->go().words(), QStringLiteral("Try again"));
+}
+
 }  // namespace ktr::app

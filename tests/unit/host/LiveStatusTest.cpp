@@ -54,6 +54,22 @@ TEST_F(LiveStatusTest, TroubleGoesBeforeHiding) {
     EXPECT_TRUE(status().wantsSignIn);
 }
 
+TEST_F(LiveStatusTest, EachTrouble_HasWhatMendsIt_AndNothingElseHas) {
+    using Help = LiveStatus::Help;
+    EXPECT_EQ(status().help, Help::None);
+    facts.assistant = Trouble::Unreachable;
+    EXPECT_EQ(status().help, Help::TryNow);
+    facts.assistant = Trouble::Faulty;
+    EXPECT_EQ(status().help, Help::CheckUp);
+    facts.assistant = Trouble::Untrusted;
+    EXPECT_EQ(status().help, Help::CheckUp);
+    facts.unusable = true;
+    EXPECT_EQ(status().help, Help::CheckUp);
+    facts.unusable = false;
+    facts.assistant = Trouble::SignedOut;
+    EXPECT_EQ(status().help, Help::None) << "the page for signing in is there";
+}
+
 TEST_F(LiveStatusTest, WhoWasNeverSignedIn_IsNotToldToDoItAgain) {
     facts.signedIn = false;
     EXPECT_EQ(words(), "STATUS_SIGN_IN_FIRST");
@@ -70,9 +86,11 @@ TEST_F(LiveStatusTest, EachTroubleHasItsOwnWords) {
             facts.service.trouble = isAssistants ? Trouble::None : trouble;
             facts.assistant = isAssistants ? trouble : Trouble::None;
             facts.shown = Date{100.0};
-            EXPECT_EQ(status(), (LiveStatus{LiveStatus::Mark::Warning, std::string(key) + "_SINCE"}));
+            EXPECT_EQ(words(), std::string(key) + "_SINCE");
+            EXPECT_EQ(status().mark, LiveStatus::Mark::Warning);
             facts.shown.reset();
-            EXPECT_EQ(status(), (LiveStatus{LiveStatus::Mark::Warning, key}));
+            EXPECT_EQ(words(), key);
+            EXPECT_EQ(status().mark, LiveStatus::Mark::Warning);
         }
     }
 }
@@ -111,7 +129,7 @@ TEST_F(LiveStatusTest, ScenarioOnScreen_IsNotLiveBeforeTheServiceHasAnswered) {
 TEST_F(LiveStatusTest, BrokenConfiguration_IsNotTakenForSigningOut) {
     facts.signedIn = false;
     facts.unusable = true;
-    EXPECT_EQ(status(), (LiveStatus{LiveStatus::Mark::Warning, "STATUS_UNREADABLE"}));
+    EXPECT_EQ(status(), (LiveStatus{LiveStatus::Mark::Warning, "STATUS_UNREADABLE", false, LiveStatus::Help::CheckUp}));
 }
 
 TEST_F(LiveStatusTest, QuestionUnderWayGoesBeforeHiding) {

@@ -86,6 +86,7 @@ class DesktopSettingsTest : public ::testing::Test {
     }
 
     const QString kScale = QStringLiteral("org.gnome.desktop.interface text-scaling-factor");
+    const QString kScheme = QStringLiteral("org.freedesktop.appearance color-scheme");
     const QString kContrast = QStringLiteral("org.freedesktop.appearance contrast");
     const QString kMotion = QStringLiteral("org.freedesktop.appearance reduced-motion");
     PrivateBus bus;
@@ -107,11 +108,13 @@ TEST_F(DesktopSettingsTest, Portal_IsReadOnGnomeAndPhoshAndAgainWhenTheWindowIsU
     for (const char* desktop : {"ubuntu:GNOME", "Phosh:GNOME", "phosh"}) {
         const auto read = start(desktop);
         EXPECT_FALSE(read->values().textScale) << "it does not wait for the bus";
-        EXPECT_TRUE(eventually([&] { return read->values() == DesktopSettings::Values{1.5, true, true}; })) << desktop;
+        EXPECT_TRUE(eventually([&] {
+            return read->values() == DesktopSettings::Values{1.5, std::nullopt, true, true};
+        })) << desktop;
         settings = {{kScale, 2.0}, {kContrast, 0u}, {kMotion, 0u}};
         read->refresh();
         EXPECT_TRUE(eventually([&] {
-            return read->values() == DesktopSettings::Values{2.0, false, false};
+            return read->values() == DesktopSettings::Values{2.0, std::nullopt, false, false};
         })) << desktop;
         settings = {{kScale, 1.5}, {kContrast, 1u}, {kMotion, 1u}};
     }
@@ -137,7 +140,9 @@ TEST_F(DesktopSettingsTest, ChangeRightBehindTheFirstAnswer_IsHeard) {
     afterAnswer = [this](const QString& what) { lower(what); };
     startPortal();
     const auto read = start("GNOME");
-    EXPECT_TRUE(eventually([&] { return read->values() == DesktopSettings::Values{1.25, false, false}; }));
+    EXPECT_TRUE(eventually([&] {
+        return read->values() == DesktopSettings::Values{1.25, std::nullopt, false, false};
+    }));
     EXPECT_EQ(asked.size(), 3U) << "nothing was asked twice";
 }
 
@@ -148,7 +153,7 @@ TEST_F(DesktopSettingsTest, AnswerThatAChangeOvertook_IsDropped) {
     const auto read = start("GNOME");
     EXPECT_TRUE(eventually([&] { return asked.size() == 3; }));
     pass(100);
-    EXPECT_EQ(read->values(), (DesktopSettings::Values{1.25, false, false}));
+    EXPECT_EQ(read->values(), (DesktopSettings::Values{1.25, std::nullopt, false, false}));
 }
 
 TEST_F(DesktopSettingsTest, PortalWithoutTheKeys_LeavesDefaults) {
@@ -174,7 +179,7 @@ TEST_F(DesktopSettingsTest, Nonsense_IsNone) {
     startPortal();
     const auto read = start("GNOME");
     EXPECT_TRUE(eventually([&] { return read->values().reducedMotion.has_value(); }));
-    EXPECT_EQ(read->values(), (DesktopSettings::Values{std::nullopt, std::nullopt, false}));
+    EXPECT_EQ(read->values(), (DesktopSettings::Values{std::nullopt, std::nullopt, std::nullopt, false}));
     for (const double scale : {0.0, -1.0, 1e9}) {
         change("org.gnome.desktop.interface", "text-scaling-factor", scale);
     }
@@ -212,6 +217,20 @@ TEST_F(DesktopSettingsTest, BusThatNeverAnswers_DelaysNobody) {
     EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::seconds(1));
     // Lets the one who waits go.
     ::close(silent);
+}
+
+TEST_F(DesktopSettingsTest, ColourScheme_IsReadAndFollowed_AndNoPreferenceIsNone) {
+    settings[kScheme] = 1u;
+    startPortal();
+    const auto desktop = start("GNOME");
+    EXPECT_TRUE(eventually([&] { return desktop->values().dark == true; }));
+    change("org.freedesktop.appearance", "color-scheme", 2u);
+    EXPECT_TRUE(eventually([&] { return desktop->values().dark == false; }));
+    change("org.freedesktop.appearance", "color-scheme", 0u);
+    EXPECT_TRUE(eventually([&] { return !desktop->values().dark; }));
+    change("org.freedesktop.appearance", "color-scheme", QStringLiteral("dark"));
+    pass(100);
+    EXPECT_FALSE(desktop->values().dark) << "a word is no scheme";
 }
 
 }  // namespace ktr::test

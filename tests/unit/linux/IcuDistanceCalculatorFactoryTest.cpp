@@ -51,4 +51,11 @@ TEST_F(IcuDistanceCalculatorFactoryTest, WithoutAFolder_NothingOverridesTheUnits
     EXPECT_EQ(factory.makeDistanceCalculator({"group", "en", "en-US", nullptr})->measurementSystem(), 1);
 }
 
+TEST_F(IcuDistanceCalculatorFactoryTest, WhatIsChosen_GoesBeforeThePreference) {
+    systemWith("[units]\nsystem=us\n");
+    IcuDistanceCalculatorFactory factory(std::make_shared<GeographicLibGeodesy>(), folder.path().toStdString(),
+                                         UnitSystem::ImperialUK);
+    EXPECT_EQ(factory.makeDistanceCalculator({"group.friends", "en", "de-DE", nullptr})->measurementSystem(), 2);
+}
+
 }  // namespace ktr::linux_

@@ -150,4 +150,17 @@ TEST_F(UserContactsTest, AddressBookThatTakesItsTime_IsNotWaitedFor) {
     EXPECT_LT(clock.elapsed(), 2000);
 }
 
+TEST_F(UserContactsTest, AddressBooksThatAreSwitchedOff_AreNotAsked_AndComeAndGoLive) {
+    FakeAddressBooks service(bus);
+    service.set(kLocal, {card("Ann")});
+    contacts = std::make_unique<UserContacts>(loop, UserContacts::Paths{}, bus.address().toStdString(), false);
+    names = namesOf(contacts->first(20.0, error));
+    contacts->follow([this](const UserContacts::Contacts& read) { names = namesOf(read); });
+    EXPECT_TRUE(names.empty());
+    contacts->setUsesBooks(true);
+    EXPECT_TRUE(runUntil([&] { return names == std::vector<std::string>{"Ann"}; }));
+    contacts->setUsesBooks(false);
+    EXPECT_TRUE(runUntil([&] { return names.empty(); }));
+}
+
 }  // namespace ktr::test

@@ -45,7 +45,7 @@ class AskServiceTest : public ::testing::TestWithParam<bool> {
         }
         Service::Setup setup;
         setup.store = store_;
-        setup.now = [] { return kNow; };
+        setup.now = [this] { return now_; };
         service_ = std::make_unique<Service>(std::move(setup));
         ASSERT_EQ(service_->start(), "");
     }
@@ -72,6 +72,7 @@ class AskServiceTest : public ::testing::TestWithParam<bool> {
     std::shared_ptr<Store> store_;
     std::unique_ptr<Service> service_;
     std::map<std::string, std::int64_t> ids_;
+    std::int64_t now_ = kNow;
 };
 
 INSTANTIATE_TEST_SUITE_P(Sqlite, AskServiceTest, ::testing::Values(false));
@@ -168,6 +169,26 @@ TEST_P(AskServiceTest, Places_AreTheAskersOwnAlone) {
     EXPECT_TRUE(holds(own, R"({"name":"Our house","latitude":50.2,"longitude":-3.1})")) << own;
     EXPECT_TRUE(holds(own, R"({"name":"_$!<home>!$_")")) << own;
     EXPECT_TRUE(holds(ask("otto", "places", ""), R"("places":[])"));
+}
+
+TEST_F(AskServiceTest, Friends_AreThoseWhosePlaceWouldBeTold_AndNobodyElse) {
+    ASSERT_TRUE(store_->grant(ids_["otto"], ids_["ann"], {Precision::Exact, kNow - 500, std::nullopt}));
+    ASSERT_TRUE(store_->grant(ids_["mara"], ids_["ann"], {Precision::Exact, kNow - 500, std::nullopt}));
+    EXPECT_TRUE(holds(ask("ann", "friends", ""), R"({"statusCode":200,"friends":[]})")) << "nobody was heard yet";
+    for (const char* name : {"otto", "mara"}) {
+        store_->keep(0, ids_[name], {{kNow + 1, kNow + 1, 50.2, -3.1, 10.0}}, kNow + 1, nullptr);
+    }
+    store_->finish();
+    now_ = kNow + 10;
+    const std::string both = ask("ann", "friends", "");
+    EXPECT_TRUE(holds(both, R"({"name":"otto","handle":"otto@x.example"})")) << both;
+    EXPECT_TRUE(holds(both, R"({"name":"mara","handle":"mara@x.example"})")) << both;
+    EXPECT_FALSE(holds(both, "50.2")) << "where anybody is is another question";
+    ASSERT_TRUE(store_->setHidden(ids_["mara"], true, now_));
+    ASSERT_TRUE(store_->revokeGrant(ids_["otto"], ids_["ann"]));
+    EXPECT_TRUE(holds(ask("ann", "friends", ""), R"("friends":[]})")) << "hiding and ending look the same";
+    EXPECT_TRUE(holds(ask("otto", "friends", ""), R"("friends":[]})"));
+    EXPECT_TRUE(store_->looksAt(ids_["otto"]).empty());
 }
 
 }  // namespace ktr::test

@@ -47,6 +47,52 @@ TEST_F(PeoplesPageTest, Link_IsNotSpentByAFormOfAnotherPage) {
     EXPECT_EQ(send(request("POST", "/me/in", "link=link")).status, 303);
 }
 
+TEST_F(PeoplesPageTest, Program_GetsAReadersSecretForALink_Once) {
+    ASSERT_TRUE(store_->addSignIn(mara_, "link", now_));
+    const auto program = [this](const std::string& body) {
+        HttpRequest out = request("POST", "/me/in", body);
+        out.headers = {{"Host", "home.example:8443"}, {"Content-Type", "application/json"}};
+        return send(out);
+    };
+    EXPECT_EQ(program("{}").status, 400);
+    EXPECT_EQ(program("[1]").status, 400);
+    EXPECT_EQ(program(R"({"link":"phone"})").status, 403) << "a phone's secret is no link";
+    EXPECT_GT(delayed_, 0.0) << "whoever guesses waits";
+    const HttpResponse given = program(R"({"link":"link"})");
+    EXPECT_EQ(given.status, 200);
+    EXPECT_EQ(headerOf(given, "Cache-Control"), "no-store");
+    EXPECT_EQ(headerOf(given, "Set-Cookie"), "");
+    std::smatch found;
+    ASSERT_TRUE(std::regex_search(
+        given.body, found, std::regex("^\\{\"statusCode\":200,\"person\":\"Mara\",\"secret\":\"([a-z0-9]{26})\"\\}$")))
+        << given.body;
+    bool failed = false;
+    const auto device = store_->deviceOf(found[1].str(), failed);
+    ASSERT_TRUE(device);
+    EXPECT_EQ(device->kind, server::DeviceKind::Reader);
+    EXPECT_EQ(device->person, mara_);
+    const HttpResponse again = program(R"({"link":"link"})");
+    EXPECT_EQ(again.status, 403);
+    EXPECT_FALSE(has(again, "secret\""));
+    EXPECT_EQ(send(request("POST", "/me/in", "link=link")).status, 403) << "it does not open the page afterwards";
+}
+
+TEST_F(PeoplesPageTest, LinkForAComputer_IsMadeByAPressOnOnesOwnPageAlone) {
+    EXPECT_EQ(post("/me/devices/link").status, 403) << "nobody is signed in";
+    signIn();
+    EXPECT_TRUE(has(get("/me/devices"), "Sign in on a computer"));
+    const HttpResponse made = post("/me/devices/link");
+    EXPECT_EQ(made.status, 200);
+    std::smatch found;
+    ASSERT_TRUE(
+        std::regex_search(made.body, found, std::regex("https://home.example:8443/me/in\\?link=([a-z0-9]{26})")))
+        << made.body;
+    EXPECT_EQ(get("/me/devices/link").status, 404) << "a look makes none";
+    std::string person;
+    EXPECT_EQ(store_->signProgramIn(found[1].str(), "secret", now_, person), server::SignIn::Done);
+    EXPECT_EQ(person, "Mara");
+}
+
 TEST_F(PeoplesPageTest, PhonesSecret_NeverSignsIn) {
     EXPECT_EQ(send(request("POST", "/me/in", "link=phone")).status, 403);
     cookie_ = "__Host-session=phone";

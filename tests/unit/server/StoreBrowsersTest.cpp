@@ -28,6 +28,26 @@ TEST_P(StoreBrowsers, Link_SignsInOnce) {
     EXPECT_FALSE(browser("link")) << "a link is no session";
 }
 
+TEST_P(StoreBrowsers, Link_MakesAReaderInstead_OnceAndOnlyThat) {
+    ASSERT_TRUE(store_->addSignIn(ann_, "link", kNow));
+    std::string person;
+    EXPECT_EQ(store_->signProgramIn("other", "secret", kNow + 1, person), SignIn::Spent);
+    EXPECT_EQ(store_->signProgramIn("link", "secret", kNow + 1, person), SignIn::Done);
+    EXPECT_EQ(person, store_->person(ann_)->name);
+    EXPECT_EQ(store_->signProgramIn("link", "second", kNow + 2, person), SignIn::Spent);
+    EXPECT_EQ(store_->signIn("link", "session", kNow + 2), SignIn::Spent) << "nor a browser afterwards";
+    bool failed = false;
+    const auto device = store_->deviceOf("secret", failed);
+    ASSERT_TRUE(device);
+    EXPECT_EQ(device->person, ann_);
+    EXPECT_EQ(device->kind, server::DeviceKind::Reader);
+    EXPECT_FALSE(store_->deviceOf("second", failed));
+    EXPECT_FALSE(store_->deviceOf("link", failed)) << "a link is no secret";
+    ASSERT_TRUE(store_->addSignIn(ann_, "late", kNow));
+    EXPECT_EQ(store_->signProgramIn("late", "third", kNow + Store::kSignInLasts, person), SignIn::Spent);
+    EXPECT_FALSE(store_->deviceOf("third", failed));
+}
+
 TEST_P(StoreBrowsers, Link_EndsAfterItsQuarterOfAnHour_WhateverTheClockSaysThen) {
     ASSERT_TRUE(store_->addSignIn(ann_, "link", kNow));
     EXPECT_EQ(store_->present(kNow + Store::kSignInLasts), kNow + Store::kSignInLasts);
