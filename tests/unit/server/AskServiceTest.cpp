@@ -171,7 +171,7 @@ TEST_P(AskServiceTest, Places_AreTheAskersOwnAlone) {
     EXPECT_TRUE(holds(ask("otto", "places", ""), R"("places":[])"));
 }
 
-TEST_F(AskServiceTest, Friends_AreThoseWhosePlaceWouldBeTold_AndNobodyElse) {
+TEST_P(AskServiceTest, Friends_AreThoseWhosePlaceWouldBeTold_AndNobodyElse) {
     ASSERT_TRUE(store_->grant(ids_["otto"], ids_["ann"], {Precision::Exact, kNow - 500, std::nullopt}));
     ASSERT_TRUE(store_->grant(ids_["mara"], ids_["ann"], {Precision::Exact, kNow - 500, std::nullopt}));
     EXPECT_TRUE(holds(ask("ann", "friends", ""), R"({"statusCode":200,"friends":[]})")) << "nobody was heard yet";
