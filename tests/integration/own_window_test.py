@@ -68,17 +68,24 @@ class OwnWindowTest(unittest.TestCase):
     def find(self, role, name):
         """The node whose name begins so, once it is there and shown."""
         import pyatspi
+        from gi.repository import GLib
 
         def found():
             for node in self.tree():
-                if (node.getRoleName() == role and node.name.startswith(name)
-                        and node.getState().contains(pyatspi.STATE_SHOWING)):
-                    return node
+                try:
+                    if (node.getRoleName() == role and node.name.startswith(name)
+                            and node.getState().contains(pyatspi.STATE_SHOWING)):
+                        return node
+                except GLib.Error:
+                    continue  # it went between two questions
             return None
         try:
             return wait_for(f"{role} {name!r}", found)
         except AssertionError:
-            seen = sorted({(node.getRoleName(), node.name) for node in self.tree() if node.name})
+            try:
+                seen = sorted({(node.getRoleName(), node.name) for node in self.tree() if node.name})
+            except GLib.Error:
+                seen = "what goes away"
             raise AssertionError(f"{role} {name!r} is not among {seen}; {self.log.read_text()[-2000:]}") from None
 
     def press(self, node):
