@@ -150,10 +150,10 @@ class LiveWindowTest(WindowCase):
         self.xdotool("type", "--delay", 5, "otto")
         self.xdotool("key", "Return")
         self.assertEqual(self.url_of(ON_MAP), otto)
-        # Beyond the newest answer's row and map stands the button, and beyond that the field.
+        # Beyond the newest answer's row and map stands the button, beyond that the settings', and beyond that the field.
         self.click(FIELD)
         self.xdotool("type", "--delay", 5, "where is ")
-        self.xdotool("key", "Tab", "Tab", "Tab", "Tab")
+        self.xdotool("key", "Tab", "Tab", "Tab", "Tab", "Tab")
         self.xdotool("type", "--delay", 5, "ann")
         self.xdotool("key", "Tab", "Tab", "Tab", "space")
         wait_for("the third answer", lambda: self.url_of(ON_MAP) == ann)
