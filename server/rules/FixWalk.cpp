@@ -26,7 +26,8 @@ FixWalk::FixWalk(const Sharing& sharing, std::int64_t now, const LastRest& known
     horizon_ = later_ - 2;
     // A phone's clock may be ahead by so much: nearer to the grant's beginning it depends on that what may count.
     sure_ = std::max(range_.from, range_.heardFrom + FixRules::kMostAhead);
-    const bool isTrue = known.slot <= horizon_ && heardLate < (known.slot + 1) * length_;
+    const bool isSomething = known.slot != LastRest().slot;
+    const bool isTrue = isSomething && known.slot <= horizon_ && heardLate < (known.slot + 1) * length_;
     const bool isForThisViewer = known.fix && known.begin >= sure_;
     const bool isNowhere = known.fix ? known.begin < sure_ : known.since <= sure_;
     if (Visibility::cellSide(sharing.grant->precision) > 0.0 && isTrue && (isForThisViewer || isNowhere)) {
