@@ -109,6 +109,21 @@
         <translation>مشاركة مع شخص</translation>
     </message>
     <message>
+        <source>ASKED_TITLE</source>
+        <extracomment>Above those who asked the reader to share. English: “Would like to see where you are”</extracomment>
+        <translation>يودّون رؤية مكانك</translation>
+    </message>
+    <message>
+        <source>ASKED_SHARE</source>
+        <extracomment>Button beside somebody who asked: leads to the page of a rule. English: “Share”</extracomment>
+        <translation>مشاركة</translation>
+    </message>
+    <message>
+        <source>ASKED_NOT_NOW</source>
+        <extracomment>Button beside it: the request goes, nobody hears of it. English: “Not now”</extracomment>
+        <translation>ليس الآن</translation>
+    </message>
+    <message>
         <source>SHARE_WHO</source>
         <extracomment>Label of a field. English: “Name, e-mail address or phone number”</extracomment>
         <translation>الاسم أو البريد الإلكتروني أو رقم الهاتف</translation>

@@ -109,6 +109,21 @@
         <translation>Κοινή χρήση με κάποιον</translation>
     </message>
     <message>
+        <source>ASKED_TITLE</source>
+        <extracomment>Above those who asked the reader to share. English: “Would like to see where you are”</extracomment>
+        <translation>Θέλουν να βλέπουν πού βρίσκεσαι</translation>
+    </message>
+    <message>
+        <source>ASKED_SHARE</source>
+        <extracomment>Button beside somebody who asked: leads to the page of a rule. English: “Share”</extracomment>
+        <translation>Κοινοποίηση</translation>
+    </message>
+    <message>
+        <source>ASKED_NOT_NOW</source>
+        <extracomment>Button beside it: the request goes, nobody hears of it. English: “Not now”</extracomment>
+        <translation>Όχι τώρα</translation>
+    </message>
+    <message>
         <source>SHARE_WHO</source>
         <extracomment>Label of a field. English: “Name, e-mail address or phone number”</extracomment>
         <translation>Όνομα, διεύθυνση e-mail ή αριθμός τηλεφώνου</translation>

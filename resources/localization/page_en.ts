@@ -109,6 +109,21 @@
         <translation>Share with somebody</translation>
     </message>
     <message>
+        <source>ASKED_TITLE</source>
+        <extracomment>Above those who asked the reader to share</extracomment>
+        <translation>Would like to see where you are</translation>
+    </message>
+    <message>
+        <source>ASKED_SHARE</source>
+        <extracomment>Button beside somebody who asked: leads to the page of a rule</extracomment>
+        <translation>Share</translation>
+    </message>
+    <message>
+        <source>ASKED_NOT_NOW</source>
+        <extracomment>Button beside it: the request goes, nobody hears of it</extracomment>
+        <translation>Not now</translation>
+    </message>
+    <message>
         <source>SHARE_WHO</source>
         <extracomment>Label of a field</extracomment>
         <translation>Name, e-mail address or phone number</translation>

@@ -109,6 +109,21 @@
         <translation>누군가와 공유</translation>
     </message>
     <message>
+        <source>ASKED_TITLE</source>
+        <extracomment>Above those who asked the reader to share. English: “Would like to see where you are”</extracomment>
+        <translation>위치를 보고 싶어 하는 사람</translation>
+    </message>
+    <message>
+        <source>ASKED_SHARE</source>
+        <extracomment>Button beside somebody who asked: leads to the page of a rule. English: “Share”</extracomment>
+        <translation>공유</translation>
+    </message>
+    <message>
+        <source>ASKED_NOT_NOW</source>
+        <extracomment>Button beside it: the request goes, nobody hears of it. English: “Not now”</extracomment>
+        <translation>나중에</translation>
+    </message>
+    <message>
         <source>SHARE_WHO</source>
         <extracomment>Label of a field. English: “Name, e-mail address or phone number”</extracomment>
         <translation>이름, 이메일 주소 또는 전화번호</translation>

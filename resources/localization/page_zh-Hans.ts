@@ -109,6 +109,21 @@
         <translation>与某人共享</translation>
     </message>
     <message>
+        <source>ASKED_TITLE</source>
+        <extracomment>Above those who asked the reader to share. English: “Would like to see where you are”</extracomment>
+        <translation>想看到你在哪里的人</translation>
+    </message>
+    <message>
+        <source>ASKED_SHARE</source>
+        <extracomment>Button beside somebody who asked: leads to the page of a rule. English: “Share”</extracomment>
+        <translation>共享</translation>
+    </message>
+    <message>
+        <source>ASKED_NOT_NOW</source>
+        <extracomment>Button beside it: the request goes, nobody hears of it. English: “Not now”</extracomment>
+        <translation>暂不</translation>
+    </message>
+    <message>
         <source>SHARE_WHO</source>
         <extracomment>Label of a field. English: “Name, e-mail address or phone number”</extracomment>
         <translation>姓名、电子邮件地址或电话号码</translation>

@@ -122,6 +122,10 @@ HttpResponse OwnPages::change(const PageRequest& request, const Reader& reader) 
     if (request.is({"sees", "*"})) {
         return changeRule(request, reader);
     }
+    if (request.is({"asked", "*", "no"})) {
+        return store_.endAsk(reader.person.id, request.number(1)) ? PageAnswer::seeOther("/me")
+                                                                  : notKept(reader.context);
+    }
     if (request.is({"sees", "*", "stop"}) || request.is({"sees", "*", "keep"})) {
         return stopSharing(request, reader);
     }
@@ -167,6 +171,9 @@ SharingPage::Data OwnPages::sharingOf(const Reader& reader) {
                                         [&, id = grant.arrival](const NamedPlace& one) { return one.id == id; });
         data.rules.push_back({viewer->id, name, viewer->handles.empty() ? name : viewer->handles.front(), grant,
                               place == places.end() ? std::string() : place->name});
+    }
+    for (const AskedBy& ask : store_.askersOf(reader.person.id, reader.context.now).value_or(std::vector<AskedBy>())) {
+        data.asks.push_back({ask.asker, ask.name, ask.handle, ask.time});
     }
     data.looks = looksOf(reader);
     data.looksKept = store_.retention(reader.person.id).value_or(Retention()).looks / 86400;

@@ -30,6 +30,14 @@ struct PageRule {
     std::string arrival = {};  ///< the name of the place whose reaching ends it; empty: none
 };
 
+/// Somebody who asks to see the reader.
+struct PageAsk {
+    std::int64_t asker = 0;
+    std::string name;
+    std::string handle;
+    std::int64_t time = 0;
+};
+
 struct PageLook {
     std::string viewer;
     std::int64_t time = 0;

@@ -65,6 +65,38 @@ void addRules(PageBuilder& page, const PageContext& context, const std::vector<P
     page.close();
 }
 
+void addAsks(PageBuilder& page, const PageContext& context, const std::vector<PageAsk>& asks) {
+    const PageLanguage& language = context.language;
+    const auto button = [&](const std::string& action, const char* key, const std::string& name, bool namesAsker) {
+        page.openForm(action);
+        if (namesAsker) {
+            // The rule is made as every other is: nothing is shared by this button alone.
+            page.hiddenField("who", name);
+        }
+        const std::string words = language.text(key);
+        page.html()
+            .open("button", {{"class", "end"}, {"aria-label", words + ": " + shownName(name)}})
+            .text(words)
+            .close();
+        page.close();
+    };
+    page.section(language.text("ASKED_TITLE"));
+    page.openCard();
+    page.html().open("ul");
+    for (const PageAsk& ask : asks) {
+        page.html().open("li").open("div", {{"class", "row"}});
+        page.face(ask.name, ask.handle.empty() ? ask.name : ask.handle);
+        page.html().open("span", {{"class", "grow"}});
+        page.html().open("span", {{"class", "name"}}).leaf("bdi", {}, shownName(ask.name)).close();
+        page.html().leaf("span", {{"class", "soft"}}, language.moment(ask.time, context.now)).close();
+        button("/me/share", "ASKED_SHARE", ask.name, true);
+        button("/me/asked/" + std::to_string(ask.asker) + "/no", "ASKED_NOT_NOW", ask.name, false);
+        page.html().close().close();
+    }
+    page.html().close();
+    page.close();
+}
+
 void addLooks(PageBuilder& page, const PageContext& context, const std::vector<PageLook>& looks, std::size_t most) {
     if (looks.empty()) {
         page.html().open("div", {{"class", "row"}}).text(context.language.text("NOBODY_LOOKED")).close();
@@ -99,6 +131,9 @@ std::string SharingPage::html(const PageContext& context, const Data& data) {
         page.told(data.told, false);
     }
     addSwitch(page, data.hidden);
+    if (!data.asks.empty()) {
+        addAsks(page, context, data.asks);
+    }
     if (shown.empty()) {
         page.html().open("div", {{"class", "buttons"}});
         page.linkButton(PageBuilder::Button::Main, "/me/share", language.text("SHARE_WITH"));

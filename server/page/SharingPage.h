@@ -14,6 +14,7 @@ class SharingPage {
     struct Data {
         bool hidden = false;
         std::vector<PageRule> rules;
+        std::vector<PageAsk> asks;
         std::vector<PageLook> looks;  ///< the newest first
         std::int64_t looksKept = 30;  ///< days
         std::string told = {};        ///< what was just done; empty: nothing

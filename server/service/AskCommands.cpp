@@ -21,6 +21,8 @@ namespace {
 constexpr double kMillisecondsASecond = 1000.0;
 /// Nobody names more people in one wish.
 constexpr std::size_t kMostNamed = 50;
+/// Bytes.
+constexpr std::size_t kLongestHandle = 254;
 /// Moments that whole seconds can tell.
 constexpr double kLatest = 1e15;
 
@@ -77,6 +79,10 @@ bool AskCommands::answer(const std::string& command, const Device& device, const
         friends(device, reply);
         return true;
     }
+    if (command == "askToShare") {
+        askToShare(device, body, reply);
+        return true;
+    }
     if (command != "sharing") {
         return false;
     }
@@ -88,6 +94,33 @@ bool AskCommands::answer(const std::string& command, const Device& device, const
     }
     sharing(device, *wish, reply);
     return true;
+}
+
+void AskCommands::askToShare(const Device& device, const Dictionary& body, const HttpReply& reply) const {
+    Complaints complaints;
+    FieldReader fields(body, {}, complaints);
+    if (!fields.object("clientContext", [](FieldReader& context) { context.leaveOthers(); })) {
+        fields.complain("clientContext", "expected an object, found nothing");
+    }
+    const auto handles = fields.texts("handles");
+    const auto isNoHandle = [](const std::string& handle) {
+        return handle.empty() || handle.size() > kLongestHandle || handle.find('\0') != std::string::npos;
+    };
+    if (handles.empty() || handles.size() > kMostNamed || std::any_of(handles.begin(), handles.end(), isNoHandle)) {
+        fields.complain("handles", "expected 1 to " + std::to_string(kMostNamed) + " handles");
+    }
+    if (complaints) {
+        return reply.send(refusal(400, complaints->path.text() + ": " + complaints->message));
+    }
+    switch (setup_.store.askToSee(device.person, handles, setup_.now())) {
+        case AskOutcome::Failed:
+            return reply.send(notWritten());
+        case AskOutcome::TooMany:
+            return reply.send(refusal(429, "so many were asked today already"));
+        case AskOutcome::Asked:
+            break;
+    }
+    reply.send(HttpResponse::json(200, platform::writeJson(Dictionary{{"statusCode", 200}})));
 }
 
 void AskCommands::sharing(const Device& device, const Wish& wish, const HttpReply& reply) const {

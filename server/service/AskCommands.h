@@ -39,6 +39,8 @@ class AskCommands {
     };
     static std::optional<Wish> read(const platform::Dictionary& body, std::string& complaint);
 
+    /// Asks those with these handles to share; answered alike whoever has them, and whether anybody does.
+    void askToShare(const Device& device, const platform::Dictionary& body, const HttpReply& reply) const;
     void sharing(const Device& device, const Wish& wish, const HttpReply& reply) const;
     /// Changes the rules for those who are named; all of them or, where somebody is not known, none.
     void changeRules(const Device& device, const Wish& wish, const HttpReply& reply) const;

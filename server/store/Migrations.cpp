@@ -122,6 +122,13 @@ CREATE TABLE fix_wish (
 CREATE INDEX fix_wish_viewer ON fix_wish (viewer);
 CREATE INDEX fix_wish_since ON fix_wish (since);
 )",
+    // 9: who asked whom to share, by the handle that they used: kept alike whether or not anybody has it.
+    R"(
+CREATE TABLE ask (
+    asker {integer} NOT NULL REFERENCES person ON DELETE CASCADE, handle {text} NOT NULL, time {integer} NOT NULL,
+    answered {integer} NOT NULL DEFAULT 0, PRIMARY KEY (asker, handle)) {strict by key};
+CREATE INDEX ask_handle ON ask (handle);
+)",
 };
 
 }  // namespace

@@ -87,6 +87,21 @@ struct Browser {
     std::int64_t until = 0;  ///< when it has to sign in again
 };
 
+/// Somebody would like to see where somebody is. A value.
+struct AskedBy {
+    std::int64_t asker = 0;
+    std::string name;
+    std::string handle;     ///< the first; empty: there is none
+    std::int64_t time = 0;  ///< seconds since 1970
+};
+
+/// What became of asking somebody to share.
+enum class AskOutcome {
+    Asked,    ///< or asked before on that day, or nobody is there: it is said to nobody which
+    TooMany,  ///< of whomever, on one day
+    Failed,   ///< the store could not be written
+};
+
 /// What became of a link that signs in.
 enum class SignIn {
     Done,

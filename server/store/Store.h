@@ -227,6 +227,19 @@ class Store {
     /// the fixes of its post, 0 without one.
     void takeWishes(std::int64_t person, std::int64_t newest, std::int64_t now, std::function<void(bool)> done);
 
+    // Asking somebody to share: once a day a person, and what is done and answered does not depend on who is there.
+
+    static constexpr std::int64_t kAskAgainAfter = 86400;   ///< seconds
+    static constexpr std::int64_t kAsksKept = 30L * 86400;  ///< seconds
+    static constexpr std::int64_t kMostAsks = 100;          ///< of one person on one day
+    /// Waits for the disk.
+    AskOutcome askToSee(std::int64_t asker, const std::vector<std::string>& handles, std::int64_t now);
+    /// Who asks somebody to share and has no answer; whom they let see them already is not among them. The newest
+    /// first. None: the store could not be read.
+    std::optional<std::vector<AskedBy>> askersOf(std::int64_t person, std::int64_t now);
+    /// The answer is no, for now: the asker hears nothing of it. Waits for the disk.
+    bool endAsk(std::int64_t person, std::int64_t asker);
+
     static std::string normalisedHandle(std::string_view handle);
 
   private:

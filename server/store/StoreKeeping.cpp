@@ -114,6 +114,10 @@ bool Store::forget(std::int64_t person, std::int64_t now) {
             .bindBytes(Secret::hash(identity))
             .bind(now)
             .run();
+        // What others asked goes by handle.
+        database.statement("DELETE FROM ask WHERE handle IN (SELECT text FROM handle WHERE person = $1)")
+            .bind(person)
+            .run();
         // All that refers to a person goes with it.
         database.statement("DELETE FROM person WHERE id = $1").bind(person).run();
     });

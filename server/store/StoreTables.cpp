@@ -19,6 +19,7 @@ constexpr std::array kTables = {
     StoreTable{"fence", false, {"subject", "watcher"}, {}},
     StoreTable{"outbox", false, {"subject", "watcher"}, {}},
     StoreTable{"fix_wish", false, {"viewer"}, {}},
+    StoreTable{"ask", false, {"asker"}, {}},
     StoreTable{"clock", true, {}, {}},
     StoreTable{"forgotten", true, {}, {}},
 };

@@ -102,6 +102,7 @@ void Store::deleteOldOf(Database& database, std::int64_t person, const Retention
         .bind(person)
         .bind((now - retention.looks) / 3600)
         .run();
+    database.statement("DELETE FROM ask WHERE asker = $1 AND time < $2").bind(person).bind(now - kAsksKept).run();
 }
 
 void Store::deleteOld(std::int64_t now, Done done) {

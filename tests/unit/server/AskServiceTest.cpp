@@ -191,4 +191,24 @@ TEST_P(AskServiceTest, Friends_AreThoseWhosePlaceWouldBeTold_AndNobodyElse) {
     EXPECT_TRUE(store_->looksAt(ids_["otto"]).empty());
 }
 
+TEST_P(AskServiceTest, AskingToShare_IsAnsweredAlikeWhoeverIsThere) {
+    ASSERT_TRUE(store_->grant(ids_["otto"], ids_["mara"], {Precision::Exact, kNow, std::nullopt}));
+    ASSERT_TRUE(store_->setHidden(ids_["otto"], true, kNow));
+    const auto asked = [this](const char* handle) {
+        return ask("mara", "askToShare", R"(,"handles":[")" + std::string(handle) + R"("])");
+    };
+    const std::string first = asked("ann@x.example");
+    EXPECT_TRUE(holds(first, "200 OK")) << first;
+    EXPECT_TRUE(holds(first, R"({"statusCode":200})")) << first;
+    EXPECT_EQ(asked("ann@x.example"), first) << "asked already";
+    EXPECT_EQ(asked("nobody@x.example"), first);
+    EXPECT_EQ(asked("otto@x.example"), first) << "hides";
+    EXPECT_EQ(asked("mara@x.example"), first) << "oneself";
+    EXPECT_EQ(store_->askersOf(ids_["ann"], kNow)->size(), 1U);
+    for (const char* wrong : {"", R"(,"handles":[])", R"(,"handles":[""])", R"(,"handles":"ann@x.example")",
+                              R"(,"handles":["a\u0000b"])", R"(,"handle":"ann@x.example")"}) {
+        EXPECT_TRUE(holds(ask("mara", "askToShare", wrong), " 400 ")) << wrong;
+    }
+}
+
 }  // namespace ktr::test

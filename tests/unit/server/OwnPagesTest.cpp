@@ -63,6 +63,20 @@ TEST_F(OwnPagesTest, Rule_IsChanged_AndEnded) {
     EXPECT_EQ(get(address()).status, 404);
 }
 
+TEST_F(OwnPagesTest, WhoeverAsks_IsNamed_UntilTheyAreAnswered) {
+    signIn();
+    ASSERT_EQ(store_->askToSee(lea_, {"mara@x.example"}, now_), server::AskOutcome::Asked);
+    const std::string asked = get("/me").body;
+    const std::string no = "/me/asked/" + std::to_string(lea_) + "/no";
+    EXPECT_NE(asked.find("Would like to see where you are"), std::string::npos) << asked;
+    EXPECT_NE(asked.find(no), std::string::npos);
+    EXPECT_NE(asked.find("name=\"who\" value=\"Lea\""), std::string::npos) << "which begins a rule";
+    EXPECT_TRUE(store_->grantsOf(mara_).empty()) << "nothing is shared by being asked";
+    EXPECT_EQ(get(no).status, 404) << "a link changes nothing";
+    EXPECT_EQ(post(no).status, 303);
+    EXPECT_EQ(get("/me").body.find("Would like to see"), std::string::npos);
+}
+
 TEST_F(OwnPagesTest, LeaveToBeTold_NeedsExact_AndEachFenceIsSeenAndEnded) {
     signIn();
     post("/me/share/with", "who=Lea&exactness=town&until=changed&fences=yes");
