@@ -1,6 +1,7 @@
 #include "ask/Answer.h"
 
 #include <array>
+#include <utility>
 
 namespace ktr::ask {
 
@@ -14,7 +15,8 @@ const char* nameOf(Outcome outcome) {
 }
 
 const char* nameOf(Action::Kind kind) {
-    constexpr std::array<const char*, 7> kNames{"none", "chooseOne", "didYouMean", "signIn", "tryAgain", "unlock", "askOtherwise"};
+    constexpr std::array<const char*, 8> kNames{"none",   "chooseOne",    "didYouMean", "signIn", "tryAgain",
+                                                "unlock", "askOtherwise", "askToShare"};
     return kNames.at(static_cast<std::size_t>(kind));
 }
 
@@ -29,13 +31,15 @@ Dictionary objectOf(const Answer& answer) {
     if (answer.meaning) {
         object.set("wish", nameOf(answer.meaning->wish));
     }
-    if (!answer.choices.empty()) {
-        Value::Array choices;
-        for (const Choice& choice : answer.choices) {
-            choices.emplace_back(
+    for (const auto& [name, people] : {std::pair("choices", &answer.choices), std::pair("unseen", &answer.unseen)}) {
+        Value::Array listed;
+        for (const Choice& choice : *people) {
+            listed.emplace_back(
                 Dictionary{{"name", choice.name}, {"handle", choice.handle}, {"question", choice.question}});
         }
-        object.set("choices", choices);
+        if (!listed.empty()) {
+            object.set(name, listed);
+        }
     }
     if (!answer.suggestions.empty()) {
         object.set("suggestions", Value::Array(answer.suggestions.begin(), answer.suggestions.end()));

@@ -33,9 +33,9 @@ struct Choice {
 
 /// What can be done about an answer.
 struct Action {
-    enum class Kind { None, ChooseOne, DidYouMean, SignIn, TryAgain, Unlock, AskOtherwise };
+    enum class Kind { None, ChooseOne, DidYouMean, SignIn, TryAgain, Unlock, AskOtherwise, AskToShare };
     Kind kind = Kind::None;
-    std::string label;   ///< in the answer's language; empty for none
+    std::string label;  ///< in the answer's language; empty for none
 };
 
 /// One honest answer. The host makes the picture of the snippet.
@@ -45,8 +45,10 @@ struct Answer {
     std::string sentence;            ///< never empty
     /// A snippet in the form of a scenario (docs/scenario-format.md); null where there is nothing to show.
     platform::Value snippet;
-    std::vector<Choice> choices;           ///< at most five
+    std::vector<Choice> choices;           ///< at most 50
     std::vector<std::string> suggestions;  ///< questions that can be asked instead, at most three
+    /// Those who were asked about and cannot be seen, whatever the reason; at most five. Their question asks them to share.
+    std::vector<Choice> unseen;
     Action action;
     std::optional<double> ageSeconds;  ///< of the oldest place that the sentence names
 };

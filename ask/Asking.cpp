@@ -9,7 +9,8 @@ namespace ktr::ask {
 
 namespace {
 
-constexpr std::size_t kMostChoices = 5;
+/// Of people who share a name: more than anybody looks through.
+constexpr std::size_t kMostChoices = 50;
 constexpr std::size_t kMostSuggestions = 3;
 
 std::string replaced(std::string text, const std::string& what, const std::string& with) {

@@ -54,24 +54,29 @@ Engine::Engine(std::shared_ptr<Languages> languages, ServicePort& service, World
     setPeople({});
 }
 
-std::variant<Answer, Engine::Shared> Engine::begun(const Question& question) {
+std::shared_ptr<const People> Engine::Crowd::people() {
+    std::call_once(once_, [this] { people_ = std::make_shared<const People>(std::exchange(listed_, {})); });
+    return people_;
+}
+
+Engine::Begun Engine::begun(const Question& question, Languages& languages, Crowd& crowd, const World& world, bool isLocked) {
     const auto asking = std::make_shared<Asking>();
     asking->question = question;
-    asking->people = people_;
-    asking->world = world_;
-    asking->language = languages_->language(question.language);
-    const auto english = languages_->language("en");
+    asking->people = crowd.people();
+    asking->world = world;
+    asking->language = languages.language(question.language);
+    const auto english = languages.language("en");
     if (!asking->language || !english) {
         // Without its texts the program has no words of its own.
         Answer answer;
         answer.outcome = Outcome::Unreachable;
-        answer.sentence = languages_->problem();
+        answer.sentence = languages.problem();
         return answer;
     }
-    if (world_.isLocked && world_.isLocked()) {
+    if (isLocked) {
         return asking->locked();
     }
-    const auto result = Understanding(*asking->language, *english, *people_).understand(question);
+    const auto result = Understanding(*asking->language, *english, *asking->people).understand(question);
     if (const auto* unknown = std::get_if<Understanding::UnknownPerson>(&result)) {
         return asking->unknownPerson(*unknown);
     }
@@ -92,13 +97,13 @@ std::variant<Answer, Engine::Shared> Engine::begun(const Question& question) {
 }
 
 std::optional<Answer> Engine::answerHere(const Question& question) {
-    auto begin = begun(question);
+    auto begin = begun(question, *languages_, *crowd_, world_, isLocked());
     auto* answer = std::get_if<Answer>(&begin);
     return answer == nullptr ? std::nullopt : std::optional(std::move(*answer));
 }
 
 std::variant<Answer, Understood> Engine::readHere(const Question& question) {
-    auto begin = begun(question);
+    auto begin = begun(question, *languages_, *crowd_, world_, isLocked());
     if (auto* answer = std::get_if<Answer>(&begin)) {
         return std::move(*answer);
     }
@@ -117,12 +122,31 @@ std::string Engine::whereIs(const std::string& name, const std::string& language
     return "";
 }
 
-void Engine::ask(const Question& question, const Completion& completion) {
-    auto begin = begun(question);
-    if (auto* answer = std::get_if<Answer>(&begin)) {
+void Engine::ask(const Question& question, const Completion& completion, const Meant& understood) {
+    const auto begin = std::make_shared<std::optional<Begun>>();
+    const auto work = [begin, question, languages = languages_, crowd = crowd_, world = world_, locked = isLocked()] {
+        *begin = begun(question, *languages, *crowd, world, locked);
+    };
+    const auto then = [this, alive = std::weak_ptr<bool>(alive_), begin, completion, understood] {
+        if (alive.lock()) {
+            goOn(std::move(**begin), completion, understood);
+        }
+    };
+    if (world_.elsewhere) {
+        return world_.elsewhere(work, then);
+    }
+    work();
+    then();
+}
+
+void Engine::goOn(Begun begun, const Completion& completion, const Meant& understood) {
+    if (auto* answer = std::get_if<Answer>(&begun)) {
         return completion(std::move(*answer));
     }
-    const auto& asking = std::get<Shared>(begin);
+    const auto& asking = std::get<Shared>(begun);
+    if (understood) {
+        understood(asking->understood.meaning);
+    }
     // "Tell me where Ann is now" is one ordinary read.
     const Wish want = asking->understood.meaning.wish;
     isPersonal(want) && want != Wish::TellNow ? wish(asking, completion) : read(asking, completion);

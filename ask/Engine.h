@@ -2,8 +2,10 @@
 
 #include <functional>
 #include <memory>
+#include <mutex>
 #include <optional>
 #include <string>
+#include <utility>
 #include <variant>
 #include <vector>
 
@@ -21,6 +23,7 @@ namespace ktr::ask {
 class Engine {
   public:
     using Completion = std::function<void(Answer)>;
+    using Meant = std::function<void(const Meaning&)>;
 
     /// Of the handles of one request.
     static constexpr std::size_t kMostHandles = 1000;
@@ -29,11 +32,13 @@ class Engine {
     Engine(std::shared_ptr<Languages> languages, ServicePort& service, World world);
 
     /// Whom the user knows. Whoever answers aloud to everybody gives only those who may be said aloud.
-    void setPeople(std::vector<Person> people) { people_ = std::make_shared<const People>(std::move(people)); }
-    const std::shared_ptr<const People>& people() const { return people_; }
+    void setPeople(std::vector<Person> people) { crowd_ = std::make_shared<Crowd>(std::move(people)); }
+    std::shared_ptr<const People> people() const { return crowd_->people(); }
 
-    /// Calls the completion exactly once, perhaps inside the call.
-    void ask(const Question& question, const Completion& completion);
+    /// Calls the completion exactly once, perhaps inside the call, and not after this is gone. Languages are read, people
+    /// sorted and the question understood elsewhere, where the world has an elsewhere. `understood` hears what the service
+    /// is asked for, just before it is.
+    void ask(const Question& question, const Completion& completion, const Meant& understood = nullptr);
     /// The answer as far as it needs no service: not understood, unknown, ambiguous, locked, refused. None: the service has
     /// to be asked.
     std::optional<Answer> answerHere(const Question& question);
@@ -44,9 +49,25 @@ class Engine {
 
   private:
     using Shared = std::shared_ptr<const Asking>;
-
     /// An answer, or what to go on with.
-    std::variant<Answer, Shared> begun(const Question& question);
+    using Begun = std::variant<Answer, Shared>;
+
+    /// People, who are sorted where they are first asked for. Any thread.
+    class Crowd {
+      public:
+        explicit Crowd(std::vector<Person> people) : listed_(std::move(people)) {}
+        std::shared_ptr<const People> people();
+
+      private:
+        std::once_flag once_;
+        std::vector<Person> listed_;
+        std::shared_ptr<const People> people_;
+    };
+
+    /// Any thread.
+    static Begun begun(const Question& question, Languages& languages, Crowd& crowd, const World& world, bool isLocked);
+    void goOn(Begun begun, const Completion& completion, const Meant& understood);
+    bool isLocked() const { return world_.isLocked && world_.isLocked(); }
     void read(const Shared& asking, const Completion& completion);
     void readPlaces(const Shared& asking, std::vector<Sight> sights, platform::Dictionary answer, const Completion& completion);
     void wish(const Shared& asking, const Completion& completion);
@@ -57,7 +78,8 @@ class Engine {
     std::shared_ptr<Languages> languages_;
     ServicePort& service_;
     World world_;
-    std::shared_ptr<const People> people_;
+    std::shared_ptr<Crowd> crowd_;
+    std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);
 };
 
 }  // namespace ktr::ask

@@ -6,8 +6,8 @@ namespace ktr::ask {
 
 namespace {
 
-constexpr std::array<const char*, 13> kWishes{"WhereIs", "WhereAll",    "HowFar",     "IsAt",    "NearMe", "NearPlace", "Closest",
-                                              "TellArrives", "TellLeaves", "TellNow", "Hide",   "Share",     "WhoSees"};
+constexpr std::array<const char*, 14> kWishes{"WhereIs", "WhereAll",    "HowFar",     "IsAt",    "NearMe", "NearPlace", "Closest",
+                                              "TellArrives", "TellLeaves", "TellNow", "Hide",   "Share",     "WhoSees", "AskToShare"};
 constexpr std::array<const char*, 4> kPrecisions{"exact", "1km", "town", "places"};
 
 template <class Enumeration, std::size_t kCount>
@@ -46,6 +46,7 @@ bool isPersonal(Wish wish) {
         case Wish::Hide:
         case Wish::Share:
         case Wish::WhoSees:
+        case Wish::AskToShare:
             return true;
         default:
             return false;

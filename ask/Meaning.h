@@ -21,6 +21,7 @@ enum class Wish {
     Hide,
     Share,
     WhoSees,
+    AskToShare,
 };
 
 /// How exactly somebody may be seen.

@@ -32,6 +32,8 @@ class ServicePort {
 
 /// What else an answer needs of the world. Each may be called during an answer, on the main thread.
 struct World {
+    /// Runs the work on another thread, and then the rest on the main thread; none: both at once.
+    std::function<void(std::function<void()> work, std::function<void()> then)> elsewhere;
     std::function<bool()> isLocked;  ///< none: never
     /// A distance in metres as the rows word it; none: the distance is not said.
     std::function<std::optional<std::string>(double metres)> distance;

@@ -13,6 +13,8 @@ namespace {
 constexpr std::size_t kTold = 3;
 constexpr std::size_t kListed = 8;
 constexpr double kMillisecondsASecond = 1000.0;
+/// So many of those who are not seen can be asked to share.
+constexpr std::size_t kOffered = 5;
 
 std::string joined(const std::vector<std::string>& sentences) {
     std::string all;
@@ -59,16 +61,42 @@ Answer WhereAnswers::answer(const std::vector<Place>& ownPlaces) const {
     }
 }
 
-std::string WhereAnswers::unseenSentences() const {
-    std::vector<std::string> unseen;
+std::vector<const Person*> WhereAnswers::unseen() const {
+    std::vector<const Person*> unseen;
     for (const Person* person : asking_.understood.people) {
         const bool isSeen =
             std::any_of(sights_.begin(), sights_.end(), [&](const Sight& sight) { return sight.person == person; });
         if (!isSeen) {
-            unseen.push_back(sentences_.text("notSeen", {{"name", person->shownName()}}));
+            unseen.push_back(person);
         }
     }
-    return joined(unseen);
+    return unseen;
+}
+
+std::string WhereAnswers::unseenSentences() const {
+    std::vector<std::string> sentences;
+    for (const Person* person : unseen()) {
+        sentences.push_back(sentences_.text("notSeen", {{"name", person->shownName()}}));
+    }
+    return joined(sentences);
+}
+
+void WhereAnswers::offerUnseen(Answer& answer) const {
+    for (const Person* person : unseen()) {
+        if (answer.unseen.size() < kOffered) {
+            const std::string handle = person->handle();
+            // By handle where two have the name: the question has to mean this one.
+            const bool isPlain = asking_.people->find(person->shownName(), *asking_.language).index() == 0;
+            answer.unseen.push_back(
+                {person->shownName(), handle,
+                 handle.empty() || !asking_.question.mayChange
+                     ? ""
+                     : sentences_.text("askToShare", {{"name", isPlain ? person->shownName() : handle}})});
+        }
+    }
+    if (!answer.unseen.empty() && !answer.unseen.front().question.empty()) {
+        answer.action = {Action::Kind::AskToShare, answer.unseen.front().question};
+    }
 }
 
 std::string WhereAnswers::askedSentence() const {
@@ -94,6 +122,7 @@ Answer WhereAnswers::nobodySeen() const {
     const auto& people = asking_.understood.people;
     Answer answer =
         asking_.answer(Outcome::NotSeen, people.empty() ? sentences_.text("nobodySeen") : unseenSentences());
+    offerUnseen(answer);
     return answer;
 }
 
@@ -107,6 +136,7 @@ Answer WhereAnswers::found(std::string sentence, const std::vector<Sight>& sight
             answer.ageSeconds = std::max(answer.ageSeconds.value_or(0.0), std::max(age, 0.0));
         }
     }
+    offerUnseen(answer);
     return answer;
 }
 

@@ -38,9 +38,12 @@ class WhereAnswers {
     Answer near(const std::vector<Place>& ownPlaces) const;
 
     /// What is said of those whom nobody sees: one sentence each, empty for none.
+    std::vector<const Person*> unseen() const;
     std::string unseenSentences() const;
     /// Since when the service asks for a newer place of somebody whose place is not of now; empty where it does not.
     std::string askedSentence() const;
+    /// What can be done about those who are not seen: the same for each reason.
+    void offerUnseen(Answer& answer) const;
     Answer nobodySeen() const;
     Answer found(std::string sentence, const std::vector<Sight>& sights, bool isList) const;
     std::string nameOf(const Sight& sight) const { return sight.person->shownName(); }

@@ -72,6 +72,13 @@ std::pair<std::string, Dictionary> WishAnswers::request() const {
     const Understood& understood = asking_.understood;
     const Meaning& meaning = understood.meaning;
     Dictionary members;
+    if (meaning.wish == Wish::AskToShare) {
+        Value::Array handles;
+        for (const Person* person : understood.people) {
+            handles.emplace_back(person->handle());
+        }
+        return {"askToShare", Dictionary{{"handles", handles}}};
+    }
     if (isFence()) {
         members.set("handle", understood.people.front()->handle());
         members.set("trigger", meaning.wish == Wish::TellArrives ? "OnArrival" : "OnDeparture");
@@ -105,6 +112,13 @@ std::pair<std::string, Dictionary> WishAnswers::request() const {
 }
 
 Answer WishAnswers::done(const Dictionary& answer) const {
+    if (asking_.understood.meaning.wish == Wish::AskToShare) {
+        // Whether anybody was there to be asked is said to nobody.
+        return asking_.answer(Outcome::Found,
+                              sentences_.text("askedToShare", {{"name", names()},
+                                                               {"time", sentences_.time(asking_.question.now,
+                                                                                        asking_.question.now)}}));
+    }
     return isFence() ? fence(answer) : sharing(answer);
 }
 

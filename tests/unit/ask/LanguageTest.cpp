@@ -4,6 +4,9 @@
 
 #include <chrono>
 #include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <map>
 #include <random>
 #include <set>
 
@@ -67,7 +70,8 @@ TEST(LanguageTest, EverySentenceNamesWhatItIsAboutAndLeavesNothingUnfilled) {
                                                                  {"sharedWith", {"MMM", "TTT"}},
                                                                  {"hiddenFrom", {"MMM"}},
                                                                  {"whoSees", {"MMM"}},
-
+                                                                 {"askToShare", {"NNN"}},
+                                                                 {"askedToShare", {"NNN", "TTT"}},
                                                                  {"seenMore", {"MMM", "4"}}};
     for (const std::string& tag : tags()) {
         const auto language = languages.language(tag);
@@ -83,6 +87,71 @@ TEST(LanguageTest, EverySentenceNamesWhatItIsAboutAndLeavesNothingUnfilled) {
             for (const std::string& word : words) {
                 EXPECT_NE(text.find(word), std::string::npos) << tag << ": " << key << ": " << text;
             }
+        }
+    }
+}
+
+// The button's words are the question that it asks.
+TEST(LanguageTest, WhatAsksAFriendToShare_IsUnderstoodInEveryLanguage) {
+    Languages languages(folder());
+    const auto english = languages.language("en");
+    ASSERT_TRUE(english);
+    std::vector<Person> listed;
+    for (const char* name : {"Ann Marsh", "美咲", "Layla Haddad-Nur", "Иван Петров", "Mary Ann O’Neil"}) {
+        Person person;
+        person.fullName = name;
+        person.emails = {"p" + std::to_string(listed.size()) + "@mail.example"};
+        listed.push_back(person);
+    }
+    const People people(listed);
+    for (const std::string& tag : tags()) {
+        const auto language = languages.language(tag);
+        ASSERT_TRUE(language) << languages.problem();
+        for (const Person& person : people.all()) {
+            for (const std::string& named : {person.fullName, person.emails.front()}) {
+                Question question;
+                question.text = Sentences(*language, 0.0).text("askToShare", {{"name", named}});
+                const auto result = Understanding(*language, *english, people).understand(question);
+                const auto* understood = std::get_if<Understood>(&result);
+                if (understood == nullptr) {
+                    ADD_FAILURE() << tag << ": " << question.text;
+                    continue;
+                }
+                EXPECT_EQ(understood->meaning.wish, Wish::AskToShare) << tag << ": " << question.text;
+                ASSERT_EQ(understood->people.size(), 1U) << tag << ": " << question.text;
+                EXPECT_EQ(understood->people.front(), &person) << tag << ": " << question.text;
+            }
+        }
+    }
+}
+
+// What the first page of the window offers to ask.
+TEST(LanguageTest, WhatTheWindowSuggests_IsUnderstoodInEveryLanguage) {
+    Languages languages(folder());
+    const auto english = languages.language("en");
+    ASSERT_TRUE(english);
+    const People nobody({});
+    const std::map<std::string, Wish> wanted{
+        {"SUGGEST_FRIENDS", Wish::WhereAll}, {"SUGGEST_NEAR", Wish::NearMe}, {"SUGGEST_HIDE", Wish::Hide}};
+    for (const std::string& tag : tags()) {
+        std::ifstream file(std::filesystem::path(KTR_SOURCE_DIR) / ("resources/localization/host_" + tag + ".ts"));
+        const std::string texts((std::istreambuf_iterator<char>(file)), std::istreambuf_iterator<char>());
+        const auto language = languages.language(tag);
+        ASSERT_TRUE(language) << languages.problem();
+        for (const auto& [key, wish] : wanted) {
+            const auto source = texts.find("<source>" + key + "</source>");
+            ASSERT_NE(source, std::string::npos) << tag << ": " << key;
+            const std::string mark = "<translation>";
+            const auto begin = texts.find(mark, source) + mark.size();
+            Question question;
+            question.text = texts.substr(begin, texts.find("</translation>", begin) - begin);
+            const auto result = Understanding(*language, *english, nobody).understand(question);
+            const auto* understood = std::get_if<Understood>(&result);
+            if (understood == nullptr) {
+                ADD_FAILURE() << tag << ": " << question.text;
+                continue;
+            }
+            EXPECT_EQ(understood->meaning.wish, wish) << tag << ": " << question.text;
         }
     }
 }
