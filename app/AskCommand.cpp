@@ -1,5 +1,7 @@
 #include "app/AskCommand.h"
 
+#include <unistd.h>
+
 #include <QEventLoop>
 #include <QProcess>
 #include <QTimer>
@@ -81,6 +83,10 @@ int AskCommand::write(const std::string& question, const ask::Answer& answer) {
     if (std::fputs((text + "\n").c_str(), stdout) == EOF || std::fflush(stdout) != 0) {
         tell("the answer cannot be written");
         return static_cast<int>(host::ExitCode::Failure);
+    }
+    // Whoever reads it sees how it is done; a program has it in the object.
+    if (answer.action.kind == ask::Action::Kind::AskToShare && !options_.json && ::isatty(STDERR_FILENO) == 1) {
+        tell("ktr ask " + documents::inQuotes(answer.action.label, answer.action.label.size()));
     }
     if (!options_.output.empty()) {
         host::QuestionDesk desk(host_);

@@ -334,28 +334,27 @@ std::string readLive(const Words& words, Options& options) {
     return "";
 }
 
-/// What is wrong with the first word, when it is no command, and with an option that there is not. A command may have
-/// commands of its own.
-std::string unknownWord(const CLI::App& app, std::vector<std::string>::const_iterator first,
-                        std::vector<std::string>::const_iterator last) {
+/// What is wrong with the first word, when it is no command, and with an option that there is not.
+std::string unknownWord(const CLI::App& app, const std::vector<std::string>& arguments) {
     std::vector<std::string> names;
     for (const CLI::App* command : app.get_subcommands({})) {
         names.push_back(command->get_name());
     }
-    if (!names.empty()) {
-        if (first == last || first->starts_with('-')) {
-            return "";
-        }
-        return std::find(names.begin(), names.end(), *first) == names.end()
-                   ? "there is no command " + documents::inQuotes(*first) + documents::didYouMean(*first, names)
-                   : unknownWord(*app.get_subcommand(*first), first + 1, last);
+    if (arguments.empty() || arguments.front().starts_with('-')) {
+        return "";
     }
-    for (const CLI::Option* option : app.get_options()) {
+    const std::string& word = arguments.front();
+    const auto command = std::find(names.begin(), names.end(), word);
+    if (command == names.end()) {
+        return "there is no command " + documents::inQuotes(word) + documents::didYouMean(word, names);
+    }
+    names.clear();
+    for (const CLI::Option* option : app.get_subcommand(word)->get_options()) {
         for (const std::string& name : option->get_lnames()) {
             names.push_back("--" + name);
         }
     }
-    for (auto argument = first; argument != last && *argument != "--"; ++argument) {
+    for (auto argument = arguments.begin() + 1; argument != arguments.end() && *argument != "--"; ++argument) {
         const std::string name = argument->substr(0, argument->find('='));
         if (name.starts_with("--") && std::find(names.begin(), names.end(), name) == names.end()) {
             return "there is no option " + documents::inQuotes(name) + documents::didYouMean(name, names);
@@ -387,7 +386,7 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
         return Ending{host::ExitCode::Ok, (asked.empty() ? parser.app.help() : asked.front()->help("ktr")) + "\n"};
     } catch (const CLI::ParseError& error) {
         // The library's own words name neither the slip nor what was meant.
-        const std::string unknown = unknownWord(parser.app, given.begin(), given.end());
+        const std::string unknown = unknownWord(parser.app, given);
         return misuse(unknown.empty() ? error.what() : unknown);
     }
     if (parser.serve->parsed()) {

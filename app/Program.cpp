@@ -305,9 +305,6 @@ host::ExitCode runProgram(int argc, char** argv) {
         case Options::Command::AddMap:
             return MapsCommand::add(options.map);
         case Options::Command::Watch:
-            if (!options.watch.language.empty()) {
-                tellOfLanguage(options.watch.language);
-            }
             return WatchCommand::run(options.watch, argc, argv);
         case Options::Command::Config:
             return ConfigCommand::run(options.config, linux_::XdgFolders::configurationFile());

@@ -378,6 +378,27 @@ void Host::answer(TurnView& view, const Scenario& answer) {
     }
 }
 
+void Host::takeAnswerBack(TurnView& view) {
+    const auto turn = std::find_if(turns_.begin(), turns_.end(), [&](const Turn& t) { return t.view.get() == &view; });
+    if (turn != turns_.end()) {
+        LocalizedText question = std::move(turn->scenario.question);
+        turn->scenario = Scenario();
+        turn->scenario.question = std::move(question);
+        turn->isAnswered = false;
+        view.setTexts(textsOf(*turn));
+        view.setOffers({});
+    }
+}
+
+void Host::removeTurn(TurnView& view) {
+    const auto turn = std::find_if(turns_.begin(), turns_.end(), [&](const Turn& t) { return t.view.get() == &view; });
+    if (turn != turns_.end()) {
+        turn->view->card()->letGo();
+        conversation_->removeTurn(turn->view);
+        turns_.erase(turn);
+    }
+}
+
 double Host::layOut(double width) {
     const double height = conversation_->layOut(width);
     window_->setFrame({0.0, 0.0, width, height});

@@ -42,6 +42,10 @@ class Host {
     /// Gives such a turn its sentence and, when there is one that the plugin draws, its card. An answer that cannot be
     /// drawn and says nothing either gets a sentence of the host's.
     void answer(TurnView& turn, const Scenario& answer);
+    /// Takes a turn's answer away: it is a question again.
+    void takeAnswerBack(TurnView& turn);
+    /// Takes a turn out of the conversation; nothing for one that is none of it.
+    void removeTurn(TurnView& turn);
     /// Lets the virtual clock run to the moment that the settings name and on until nothing is due, laying out at
     /// `width` before and after. The conversation's height, points.
     double settle(double width);

@@ -6,10 +6,11 @@
 #include <memory>
 #include <mutex>
 #include <optional>
+#include <string>
+#include <vector>
 
 #include "documents/JsonReader.h"
 #include "platform/base/Json.h"
-#include "serve/AssistantAnswers.h"
 #include "server/answers/CommandRequest.h"
 #include "server/http/BasicCredentials.h"
 #include "server/http/TlsContext.h"
@@ -37,6 +38,8 @@ constexpr std::size_t kDeepBrackets = 1000000;
 
 constexpr const char* kGetLocations = "getlocations";
 constexpr const char* kShowHide = "showHideLocation";
+constexpr const char* kSharing = "sharing";
+constexpr const char* kSetFence = "setFence";
 
 /// A JSON object as a body, or none.
 std::optional<Dictionary> objectOf(const std::string& body) {
@@ -85,7 +88,6 @@ class DevelopmentServer::Server {
     explicit Server(Setup setup)
         : setup_(std::move(setup)),
           made_(setup_.friends, setup_.personId, setup_.token, presentTime()),
-          assistant_(made_),
           authorization_(server::BasicCredentials{setup_.personId, setup_.token}.header()),
           tls_(server::TlsContext::make(setup_.certificate.certificate.get(), setup_.certificate.key.get())) {}
 
@@ -136,15 +138,40 @@ class DevelopmentServer::Server {
         if (!isForUs(request)) {
             return reply.send(server::refusal(421, "this service is for localhost alone"));
         }
-        if (request.path == "/assistant") {
-            return reply.send(ask(request));
-        }
         for (const char* command : {kGetLocations, kShowHide}) {
             if (request.method == "POST" && request.path == std::string(kCommands) + command) {
                 return run({command, std::move(request), std::move(reply), inner});
             }
         }
+        if (request.path == std::string(kCommands) + kSharing) {
+            return wish(std::move(request), reply, inner);
+        }
+        if (request.path == std::string(kCommands) + kSetFence) {
+            // A fence may lie where they are now.
+            const auto body = objectOf(request.body);
+            const Value* handle = body ? body->find("handle") : nullptr;
+            const auto handles = handle == nullptr || handle->string() == nullptr
+                                     ? std::vector<std::string>()
+                                     : std::vector<std::string>{*handle->string()};
+            return afterPosts(handles, inner, [request, reply, inner] { inner(request, reply); });
+        }
         inner(std::move(request), std::move(reply));
+    }
+
+    /// What the user asks of their own sharing goes before what an older answer still says of it.
+    void wish(HttpRequest request, const HttpReply& reply, const HttpHandler& inner) {
+        const auto body = objectOf(request.body);
+        inner(std::move(request), HttpReply([this, reply, body](std::optional<HttpResponse> given) {
+                  if (!given) {
+                      return;
+                  }
+                  auto answer = objectOf(given->body);
+                  if (given->status == 200 && answer && body) {
+                      made_.completeWish(*answer, *body);
+                      given = HttpResponse::json(200, platform::writeJson(*answer));
+                  }
+                  reply.send(std::move(*given));
+              }));
     }
 
     /// A web page that resolves its own name to loopback must not read the answers.
@@ -170,28 +197,6 @@ class DevelopmentServer::Server {
         if (setup_.report) {
             setup_.report("request " + std::to_string(number) + ": " + what);
         }
-    }
-
-    HttpResponse ask(const HttpRequest& request) const {
-        if (request.method != "POST") {
-            // A question may be a wish, and a page of another site, a link or a look ahead can make a GET.
-            HttpResponse response = server::refusal(405, "a question is a POST");
-            response.headers.emplace_back("Allow", "POST");
-            return response;
-        }
-        if (const auto refused = refusalOfCredentials(request)) {
-            return *refused;
-        }
-        // Nor can it send this type without asking whether it may.
-        if (const auto refused = server::refusalOfType(request)) {
-            return *refused;
-        }
-        const auto members = objectOf(request.body);
-        const auto* question = members ? members->find("question") : nullptr;
-        if (question == nullptr || question->string() == nullptr) {
-            return server::refusal(400, "expected a question: {\"question\": \"Where is Ann?\"}");
-        }
-        return HttpResponse::json(200, platform::writeJson(assistant_.answer(*question->string(), now())));
     }
 
     std::optional<HttpResponse> refusalOfCredentials(const HttpRequest& request) const {
@@ -250,7 +255,11 @@ class DevelopmentServer::Server {
             spoil(fault, response);
             return finish(call, response);
         }
-        afterPosts(call, [this, call] {
+        const auto body = objectOf(call.request.body);
+        std::string complaint;
+        const auto asks =
+            body && call.command == kGetLocations ? server::LocationsRequest::read(*body, complaint) : std::nullopt;
+        afterPosts(asks ? asks->handles : std::vector<std::string>(), call.inner, [this, call] {
             call.inner(call.request, HttpReply([this, call](std::optional<HttpResponse> given) {
                            if (given) {
                                finish(call, given->status == 200 ? completed(call, std::move(*given)) : *given);
@@ -260,22 +269,19 @@ class DevelopmentServer::Server {
     }
 
     /// The phones of those who are asked for send where they are; then goes on.
-    void afterPosts(const Call& call, const std::function<void()>& then) {
-        const auto body = objectOf(call.request.body);
-        std::string complaint;
-        const auto asks =
-            body && call.command == kGetLocations ? server::LocationsRequest::read(*body, complaint) : std::nullopt;
-        const auto posts = asks ? made_.posts(asks->handles, now()) : std::vector<HttpRequest>();
+    void afterPosts(const std::vector<std::string>& handles, const HttpHandler& inner,
+                    const std::function<void()>& then) {
+        const auto posts = made_.posts(handles, now());
         if (posts.empty()) {
             return then();
         }
         const auto under = std::make_shared<std::atomic<std::size_t>>(posts.size());
         for (const HttpRequest& post : posts) {
-            call.inner(post, HttpReply([under, then](const std::optional<HttpResponse>&) {
-                           if (under->fetch_sub(1) == 1) {
-                               then();
-                           }
-                       }));
+            inner(post, HttpReply([under, then](const std::optional<HttpResponse>&) {
+                      if (under->fetch_sub(1) == 1) {
+                          then();
+                      }
+                  }));
         }
     }
 
@@ -321,7 +327,6 @@ class DevelopmentServer::Server {
 
     Setup setup_;
     LocationService made_;
-    AssistantAnswers assistant_;
     std::string authorization_;
     std::chrono::steady_clock::time_point start_ = std::chrono::steady_clock::now();
     std::atomic<int> requests_ = 0;

@@ -4,7 +4,6 @@
 #include <algorithm>
 #include <array>
 #include <cmath>
-#include <future>
 
 #include "server/answers/CommandRequest.h"
 
@@ -198,17 +197,14 @@ void LocationService::completeSharing(Dictionary& answer, const Dictionary& requ
     completeContext(answer, fault);
 }
 
-std::optional<server::Fence> LocationService::setFence(const ServedFriend& person, const server::FenceCircle& circle,
-                                                       bool arrives, const ServiceMoment& moment) const {
-    const auto number = static_cast<std::size_t>(&person - file_.friends.data());
-    people_.setHidden(number, person.hidesAt(moment.seconds), moment.wholeSeconds());
-    const server::FenceWish wish{people_.owner(), people_.friendAt(number), {"", circle}, arrives, true};
-    std::promise<std::optional<server::Fence>> kept;
-    people_.store()->setFence(
-        wish, moment.wholeSeconds(), [&](server::FenceOutcome outcome, const server::Fence& fence) {
-            kept.set_value(outcome == server::FenceOutcome::Set ? std::optional(fence) : std::nullopt);
-        });
-    return kept.get_future().get();
+void LocationService::completeWish(Dictionary& answer, const Dictionary& request) const {
+    const Value* wish = request.find("wish");
+    const bool hides = wish != nullptr && *wish == Value("hide");
+    const bool shows = wish != nullptr && *wish == Value("share");
+    if ((hides || shows) && request.find("with") == nullptr) {
+        sharing_->wished(hides);
+    }
+    completeContext(answer, {});
 }
 
 Waypoint LocationService::placeAt(double latitude, double longitude) const {

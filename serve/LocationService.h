@@ -10,7 +10,6 @@
 #include "serve/MadeUpPeople.h"
 #include "serve/ServedFriend.h"
 #include "serve/SharingState.h"
-#include "server/fences/Fence.h"
 #include "server/http/HttpRequest.h"
 
 namespace ktr::serve {
@@ -46,10 +45,9 @@ class LocationService {
     void completeSharing(platform::Dictionary& answer, const platform::Dictionary& request, const ServiceMoment& moment,
                          const Fault& fault) const;
 
-    /// Keeps the user's wish to be told when a friend comes or goes, as the service keeps everybody's; what is kept may
-    /// be wider. None: this friend does not let the user be told, or it cannot be kept. It waits for the store.
-    std::optional<server::Fence> setFence(const ServedFriend& person, const server::FenceCircle& circle, bool arrives,
-                                          const ServiceMoment& moment) const;
+    /// The answer to a wish about the user's own sharing, which the service has done, and which is noted.
+    void completeWish(platform::Dictionary& answer, const platform::Dictionary& request) const;
+
     /// The place with the address of what is near it on somebody's track.
     Waypoint placeAt(double latitude, double longitude) const;
     /// Metres along the geodesic.

@@ -9,9 +9,13 @@
 namespace ktr::serve {
 
 using server::DeviceKind;
+using server::NamedPlace;
 using server::Store;
 
 namespace {
+
+/// Of one person's track.
+constexpr std::size_t kMostNamed = 20;
 
 /// A name that nobody in a friends file needs: several may be called alike, or not at all.
 std::string nameOf(std::size_t number) {
@@ -38,7 +42,8 @@ bool MadeUpPeople::make(const FriendsFile& file, const std::string& personId, co
         }
         friends_.push_back(store_->personNamed(name)->id);
         secrets_.push_back(*secret);
-        if (!store_->addDevice(friends_.back(), DeviceKind::Phone, *secret, "", now)) {
+        if (!store_->addDevice(friends_.back(), DeviceKind::Phone, *secret, "", now) ||
+            !namePlaces(friends_.back(), person)) {
             return false;
         }
     }
@@ -54,6 +59,34 @@ bool MadeUpPeople::make(const FriendsFile& file, const std::string& personId, co
                grant.fences = true;
                return store_->grant(person, owner_, grant);
            });
+}
+
+bool MadeUpPeople::namePlaces(std::int64_t person, const ServedFriend& of) {
+    std::vector<std::string> named;
+    for (const Waypoint& waypoint : of.track) {
+        const std::string name = waypoint.label.value_or("");
+        if (!NamedPlace::isName(name) || named.size() == kMostNamed ||
+            std::find(named.begin(), named.end(), name) != named.end()) {
+            continue;
+        }
+        named.push_back(name);
+        // "Home" is the sort of place that everybody has.
+        std::string sort = name;
+        std::transform(sort.begin(), sort.end(), sort.begin(), [](char letter) {
+            return letter >= 'A' && letter <= 'Z' ? static_cast<char>(letter + 'a' - 'A') : letter;
+        });
+        NamedPlace place;
+        place.name = name;
+        place.label = NamedPlace::isLabel(sort) ? sort : "other";
+        place.latitude = waypoint.latitude;
+        place.longitude = waypoint.longitude;
+        place.radius = NamedPlace::kLeastRadius;
+        place.said = true;
+        if (!store_->setPlace(person, place)) {
+            return false;
+        }
+    }
+    return true;
 }
 
 bool MadeUpPeople::add(const std::string& name, const ServedFriend& person, std::int64_t now) {

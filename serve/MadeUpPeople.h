@@ -33,6 +33,8 @@ class MadeUpPeople {
     server::HttpRequest post(std::size_t number, const Waypoint& place, std::int64_t now) const;
 
   private:
+    /// What the track calls its places, as the person would have named them: fences and answers find them.
+    bool namePlaces(std::int64_t person, const ServedFriend& of);
     bool add(const std::string& name, const ServedFriend& person, std::int64_t now);
     bool make(const FriendsFile& file, const std::string& personId, const std::string& token, std::int64_t now);
 

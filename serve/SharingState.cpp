@@ -9,13 +9,10 @@ SharingState::Sharing SharingState::now() const {
     return {!person || person->hidden, position_};
 }
 
-void SharingState::wish(bool hidden, std::int64_t now) {
-    {
-        const std::lock_guard<std::mutex> lock(mutex_);
-        wishesToHide_ = hidden;
-    }
-    store_->setHidden(person_, hidden, now);
-    if (!hidden) {
+void SharingState::wished(bool hides) {
+    const std::lock_guard<std::mutex> lock(mutex_);
+    wishesToHide_ = hides;
+    if (!hides) {
         store_->askToShare(reader_, nullptr);
     }
 }

@@ -28,8 +28,8 @@ class SharingState {
         : store_(std::move(store)), person_(person), reader_(reader) {}
 
     Sharing now() const;
-    /// What the user asked for. Returns when it holds.
-    void wish(bool hidden, std::int64_t now);
+    /// What the user asked the service for, which has done it.
+    void wished(bool hides);
     /// What a command said that the service obeyed. One that hides does not take back the user's wish to share: the
     /// next one that shows, shows. Without a position the one before stays known.
     void commanded(bool hides, const std::optional<Position>& position);

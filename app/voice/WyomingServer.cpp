@@ -47,42 +47,24 @@ std::string WyomingServer::listen(const QHostAddress& address, quint16 port) {
 
 void WyomingServer::accept() {
     while (QTcpSocket* const socket = server_.nextPendingConnection()) {
-        if (!setup_.peers.allows(socket->peerAddress()) || !makeRoom()) {
+        if (connections_ >= kMostConnections || !setup_.peers.allows(socket->peerAddress())) {
             socket->abort();
             socket->deleteLater();
             continue;
         }
+        ++connections_;
         socket->setReadBufferSize(kReadAhead);
         auto* const connection = new Connection(socket, setup_.patience);
-        connections_.push_back(connection);
-        connect(connection, &QObject::destroyed, this, [this, connection] { std::erase(connections_, connection); });
+        connect(connection, &QObject::destroyed, this, [this] { --connections_; });
         connect(socket, &QTcpSocket::disconnected, socket, &QObject::deleteLater);
         connect(socket, &QTcpSocket::readyRead, connection, [this, connection] { read(*connection); });
-        connect(&connection->timer, &QTimer::timeout, connection, [this, connection] { close(*connection); });
+        connect(&connection->timer, &QTimer::timeout, connection, [connection] { close(*connection); });
         connection->timer.start();
         read(*connection);
     }
 }
 
-bool WyomingServer::makeRoom() {
-    if (connections_.size() < kMostConnections) {
-        return true;
-    }
-    Connection* silent = nullptr;
-    for (Connection* one : connections_) {
-        if (!one->isAsking && (silent == nullptr || one->timer.remainingTime() < silent->timer.remainingTime())) {
-            silent = one;
-        }
-    }
-    if (silent != nullptr) {
-        close(*silent);
-    }
-    return silent != nullptr;
-}
-
 void WyomingServer::close(Connection& connection) {
-    std::erase(connections_, &connection);
-    connection.timer.stop();
     // What was said goes out, if it is taken at once.
     connection.socket->flush();
     connection.socket->abort();

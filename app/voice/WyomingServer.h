@@ -32,7 +32,6 @@ class WyomingServer : public QObject {
         int patience = 10000;  ///< milliseconds for a peer's next frame
     };
 
-    /// Where there are so many, whoever has been silent for longest makes room for the next.
     static constexpr std::size_t kMostConnections = 16;
     static constexpr int kMostFrames = 64;  ///< of one connection
 
@@ -49,14 +48,12 @@ class WyomingServer : public QObject {
     /// False: the connection is to be closed.
     bool handle(Connection& connection, const WyomingFrames::Frame& frame);
     void ask(Connection& connection, const WyomingFrames::Frame& frame);
-    /// False: all are being answered.
-    bool makeRoom();
-    void close(Connection& connection);
+    static void close(Connection& connection);
     platform::Dictionary information() const;
 
     const Setup setup_;
-    std::vector<Connection*> connections_;  ///< outlives what the server ends
     QTcpServer server_;
+    std::size_t connections_ = 0;
 };
 
 }  // namespace ktr::app

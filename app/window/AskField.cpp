@@ -1,6 +1,7 @@
 #include "app/window/AskField.h"
 
 #include <QFocusEvent>
+#include <QKeyEvent>
 #include <QPainter>
 
 #include "linux/paint/FontChoice.h"
@@ -62,17 +63,75 @@ AskField::AskField(const Texts& texts, QWidget* parent)
     setTabOrder(edit_, button_);
     edit_->installEventFilter(this);
     button_->installEventFilter(this);
-    connect(edit_, &QLineEdit::textChanged, &listener_,
-            [this](const QString& text) { button_->setReady(!text.trimmed().isEmpty(), animated_); });
+    connect(edit_, &QLineEdit::textChanged, &listener_, [this] { showButton(); });
     connect(edit_, &QLineEdit::returnPressed, &listener_, [this] { send(); });
-    connect(button_, &QAbstractButton::clicked, &listener_, [this] { send(); });
+    connect(button_, &QAbstractButton::clicked, &listener_, [this] { pressed(); });
 }
 
 void AskField::setTexts(const Texts& texts) {
+    texts_ = texts;
     edit_->setPlaceholderText(QString::fromStdString(texts.placeholder));
-    button_->setToolTip(QString::fromStdString(texts.send));
     callIt(*edit_, texts.name.empty() ? texts.placeholder : texts.name);
-    callIt(*button_, texts.send);
+    showButton();
+}
+
+void AskField::showButton() {
+    const bool isEmpty = edit_->text().trimmed().isEmpty();
+    const bool stops = isAsking_ && isEmpty && stopped_;
+    button_->setStops(stops);
+    button_->setReady(stops || !isEmpty, animated_);
+    const std::string& name = stops ? texts_.stop : texts_.send;
+    button_->setToolTip(QString::fromStdString(name));
+    callIt(*button_, name);
+}
+
+void AskField::setAsking(bool isAsking) {
+    if (isAsking != isAsking_) {
+        isAsking_ = isAsking;
+        showButton();
+    }
+}
+
+void AskField::offer(const std::string& question) {
+    if (edit_->text().isEmpty()) {
+        offered_ = QString::fromStdString(question);
+        edit_->setText(offered_);
+        edit_->deselect();
+    }
+}
+
+void AskField::withdraw() {
+    if (!offered_.isEmpty() && edit_->text() == offered_) {
+        edit_->clear();
+    }
+    offered_.clear();
+}
+
+void AskField::pressed() {
+    if (button_->stops()) {
+        stopped_();
+    } else {
+        send();
+    }
+}
+
+bool AskField::recall(const QKeyEvent& key) {
+    const bool older = key.key() == Qt::Key_Up;
+    if ((!older && key.key() != Qt::Key_Down) || (key.modifiers() & ~Qt::KeypadModifier) != Qt::NoModifier) {
+        return false;
+    }
+    // What somebody is typing is not taken from under their hands.
+    const bool isBrowsing = recalled_ < history_.size() && edit_->text() == history_[recalled_];
+    if (!isBrowsing && !edit_->text().isEmpty()) {
+        return false;
+    }
+    const std::size_t from = isBrowsing ? recalled_ : history_.size();
+    if (older ? from == 0 : from >= history_.size()) {
+        return false;
+    }
+    recalled_ = older ? from - 1 : from + 1;
+    edit_->setText(recalled_ < history_.size() ? history_[recalled_] : QString());
+    return true;
 }
 
 void AskField::send() {
@@ -80,6 +139,14 @@ void AskField::send() {
     if (text.isEmpty()) {
         return;
     }
+    constexpr std::size_t kMostRecalled = 50;
+    if (history_.empty() || history_.back() != text) {
+        history_.push_back(text);
+    }
+    if (history_.size() > kMostRecalled) {
+        history_.erase(history_.begin());
+    }
+    recalled_ = history_.size();
     edit_->clear();
     edit_->setFocus();
     if (asked_) {

@@ -333,8 +333,9 @@ void ConversationWidget::setHighContrast(bool high) {
 }
 
 bool ConversationWidget::isOnScreen(const host::TurnView& turn) const {
-    const auto card = turn.card()->frameInRoot();
-    return card.maxY() > scrolled() && card.y < scrolled() + height();
+    // Without a card it is its question that waits.
+    const auto part = turn.card()->hidden() ? turn.frameInRoot() : turn.card()->frameInRoot();
+    return part.maxY() > scrolled() && part.y < scrolled() + height();
 }
 
 void ConversationWidget::lookLater() {

@@ -41,6 +41,8 @@ class ConversationWidget : public QWidget {
     /// A turn was added, which is the newest then; a turn got its answer.
     void turnCame(host::TurnView& turn);
     void answerCame(host::TurnView& turn);
+    /// A turn looks another way, or has gone.
+    void turnsChanged() { layOut(); }
     void setReducedMotion(bool reduced);
     /// Whether anybody sees the window; so it is at first. Nothing turns while nobody does.
     void setSeen(bool seen);

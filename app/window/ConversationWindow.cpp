@@ -87,6 +87,7 @@ void ConversationWindow::addField() {
     field_ = new AskField({host_.text("ASK_FIELD"), host_.text("ASK_SEND")}, this);
     field_->edit().setMenuTexts(menuTexts());
     field_->setAsked([this](const std::string& question) { live_->ask(question); });
+    field_->setStopped([this] { live_->stop(); });
     field_->edit().installEventFilter(this);
     status_ = new StatusLine(this);
     status_->setHelped([this] { help(); });
@@ -103,15 +104,7 @@ void ConversationWindow::addField() {
     greeting_ = new Greeting(host_, this);
     greeting_->hide();
     greeting_->setAsked([this](const std::string& question) { live_->ask(question); });
-    live_->setHandlers({[this](host::TurnView& turn) {
-                            greetNoMore();
-                            conversation_->turnCame(turn);
-                        },
-                        [this](host::TurnView& turn) { conversation_->answerCame(turn); },
-                        [this] {
-                            showStatus();
-                            conversation_->tellListeners();
-                        }});
+    live_->setHandlers(handlers());
     statusTimer_.setSingleShot(true);
     host_.live()->setLockChanged([this] { sight_.look(); });
     // Ages and times of the day are others now, and what was known is old.
@@ -120,11 +113,44 @@ void ConversationWindow::addField() {
     connect(&statusTimer_, &QTimer::timeout, this, [this] { showStatus(); });
 }
 
+host::LiveConversation::Handlers ConversationWindow::handlers() {
+    host::LiveConversation::Handlers handlers;
+    handlers.asked = [this](host::TurnView& turn) {
+        greetNoMore();
+        field_->withdraw();
+        conversation_->turnCame(turn);
+    };
+    handlers.answered = [this](host::TurnView& turn) { conversation_->answerCame(turn); };
+    handlers.changed = [this] {
+        field_->setAsking(live_->canStop());
+        showStatus();
+        conversation_->tellListeners();
+    };
+    handlers.waits = [this](host::TurnView&) {
+        field_->withdraw();
+        conversation_->turnsChanged();
+    };
+    handlers.failed = [this](const std::string& question) { field_->offer(question); };
+    handlers.stopped = [this](const std::string& question) {
+        conversation_->turnsChanged();
+        field_->offer(question);
+    };
+    handlers.signIn = [this] { offerSignIn(); };
+    handlers.showFriends = [this] { showFriends(); };
+    handlers.open = [this](const std::string& url) {
+        if (links_) {
+            links_->open(url, host::LinkPolicy::From::FriendPage);
+        }
+    };
+    return handlers;
+}
+
 AskField::Texts ConversationWindow::fieldTexts() const {
     // Where there is no room for a status line, an empty field says what it would say.
     const bool isWaiting = isVeryLow() && !field_->edit().hasFocus();
     const std::string status = isWaiting ? live_->status().words : "";
-    return {status.empty() ? host_.text("ASK_FIELD") : status, host_.text("ASK_SEND"), host_.text("ASK_FIELD")};
+    return {status.empty() ? host_.text("ASK_FIELD") : status, host_.text("ASK_SEND"), host_.text("ASK_FIELD"),
+            host_.text("ASK_STOP")};
 }
 
 QuestionEdit::MenuTexts ConversationWindow::menuTexts() const {
@@ -356,6 +382,7 @@ void ConversationWindow::keyPressEvent(QKeyEvent* event) {
         return;
     }
     if (event->key() == Qt::Key_Escape && field_ != nullptr) {
+        live_->stop();
         field_->edit().setFocus(Qt::ShortcutFocusReason);
         return;
     }
@@ -434,6 +461,9 @@ bool ConversationWindow::eventFilter(QObject* object, QEvent* event) {
     if (event->type() == QEvent::KeyPress) {
         // Keys that mean nothing in a field of one line scroll the conversation.
         auto* key = static_cast<QKeyEvent*>(event);
+        if (field_->recall(*key)) {
+            return true;
+        }
         switch (key->key()) {
             case Qt::Key_Up:
             case Qt::Key_Down:

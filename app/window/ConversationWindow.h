@@ -60,6 +60,7 @@ class ConversationWindow : public PlainWidget {
   private:
     void addField();
     void offerLink(const std::string& link);
+    host::LiveConversation::Handlers handlers();
     void showFriend(const host::KnownFriends::Known& known, FriendPage::Asks asks);
     void showSelf();
     SharingRow::Wish sharingWish() const;

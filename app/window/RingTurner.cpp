@@ -28,13 +28,13 @@ void RingTurner::update() {
     bool any = false;
     for (const auto& turn : conversation_->turns()) {
         turn->card()->updateRing();
-        const auto& ring = turn->card()->ring();
-        if (ring->hidden() || !isSeen_(*turn)) {
-            continue;
+        for (const auto& ring : {turn->card()->ring(), turn->ring()}) {
+            if (!ring->hidden() && isSeen_(*turn)) {
+                any = true;
+                ring->setShare(still ? kStillShare : kShare);
+                ring->setTurn(still ? 0.0 : std::fmod(turns, 1.0));
+            }
         }
-        any = true;
-        ring->setShare(still ? kStillShare : kShare);
-        ring->setTurn(still ? 0.0 : std::fmod(turns, 1.0));
     }
     // Also for rings that stand still: they go when the search is over.
     const int step = still ? kStillStep : kStep;

@@ -9,8 +9,8 @@
 
 namespace ktr::app {
 
-/// Turns the rings of the cards that search, and takes them away when their search is over; of those that are seen.
-/// Main thread.
+/// Turns the rings of the cards that search, and takes them away when their search is over, and those of questions that
+/// wait; of turns that are seen. Main thread.
 class RingTurner {
   public:
     /// Both are asked at each step. `isStill`: whether rings stand; `isSeen`: whether anybody sees this turn.

@@ -154,12 +154,14 @@ void RowFocus::refresh() {
 void RowFocus::markFocus() {
     for (const auto& turn : conversation_->turns()) {
         turn->card()->setFocus(rectIn(*turn->card(), focused_.lock()));
+        turn->offers()->mark(focused_.lock().get(), hovered_.lock().get());
     }
 }
 
 void RowFocus::markHover() {
     for (const auto& turn : conversation_->turns()) {
         turn->card()->setHighlight(rectIn(*turn->card(), hovered_.lock()));
+        turn->offers()->mark(focused_.lock().get(), hovered_.lock().get());
     }
 }
 

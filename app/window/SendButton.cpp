@@ -62,6 +62,13 @@ void SendButton::setReady(bool ready, bool animated) {
     update();
 }
 
+void SendButton::setStops(bool stops) {
+    if (stops != stops_) {
+        stops_ = stops;
+        update();
+    }
+}
+
 void SendButton::setMarksFocus(bool marks) {
     marksFocus_ = marks;
     update();
@@ -89,6 +96,15 @@ void SendButton::paintEvent(QPaintEvent*) {
         const double half = palette_->focusRing / 2.0;
         painter.setPen(QPen(palette_->pine, palette_->focusRing));
         painter.drawEllipse(centre, radius + kAround - half - 1.0, radius + kAround - half - 1.0);
+    }
+    if (stops_) {
+        constexpr double kStop = 12.0;
+        constexpr double kStopCorner = 2.5;
+        painter.setPen(Qt::NoPen);
+        painter.setBrush(between(palette_->inkSoft, palette_->onPine, ready));
+        painter.drawRoundedRect(QRectF(centre.x() - kStop / 2.0, centre.y() - kStop / 2.0, kStop, kStop), kStopCorner,
+                                kStopCorner);
+        return;
     }
     painter.translate(centre);
     if (layoutDirection() == Qt::RightToLeft) {

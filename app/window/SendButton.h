@@ -9,7 +9,8 @@
 
 namespace ktr::app {
 
-/// The round button that sends the question: pale while there is nothing to send. Main thread.
+/// The round button that sends the question: pale while there is nothing to send, and a stop while an answer is waited
+/// for. Main thread.
 class SendButton : public QAbstractButton {
   public:
     /// Of its circle; the widget is larger by `kAround` on every side, for the ring of the keyboard's focus.
@@ -21,6 +22,9 @@ class SendButton : public QAbstractButton {
     void setColors(const linux_::Palette& palette);
     /// Whether there is something to send.
     void setReady(bool ready, bool animated);
+    /// Whether it stops what is asked instead of sending.
+    void setStops(bool stops);
+    bool stops() const { return stops_; }
     /// Whether the keyboard's focus is marked while the button has it.
     void setMarksFocus(bool marks);
     QSize sizeHint() const override;
@@ -36,6 +40,7 @@ class SendButton : public QAbstractButton {
     QTimer timer_;
     host::Motion colour_;
     bool marksFocus_ = false;
+    bool stops_ = false;
 };
 
 }  // namespace ktr::app

@@ -11,6 +11,7 @@
 #include "platform/base/Clock.h"
 #include "platform/base/DeviceInformation.h"
 #include "platform/base/Json.h"
+#include "platform/base/MainLoop.h"
 #include "platform/base/Region.h"
 #include "platform/location/Geodesy.h"
 #include "platform/location/PlatformLocationManager.h"
@@ -24,6 +25,14 @@ constexpr const char* kAppGroup = "group.org.ktr";
 
 ask::World worldOf(Host& host) {
     ask::World world;
+    // A loop waits for its workers when it ends: what they leave behind is dropped with it.
+    platform::MainLoop* const loop = host.platform()->mainLoop.get();
+    world.elsewhere = [loop](std::function<void()> work, std::function<void()> then) {
+        loop->runInBackground([loop, work = std::move(work), then = std::move(then)] {
+            work();
+            loop->post(then);
+        });
+    };
     world.isLocked = [&host] {
         const auto& lock = host.platform()->deviceLock;
         const int state = lock ? lock->lockState() : platform::DeviceLock::kWithoutLock;
@@ -115,7 +124,8 @@ ask::Question QuestionDesk::question(const std::string& text, bool isLive) {
     return question;
 }
 
-void QuestionDesk::ask(const ask::Question& question, const ask::Engine::Completion& completion) {
+void QuestionDesk::ask(const ask::Question& question, const ask::Engine::Completion& completion,
+                       const ask::Engine::Meant& understood) {
     if (host_.live() != nullptr && host_.live()->isUnusable()) {
         // Who the contacts are is said there, too: "I don't know Ann" would be no honest answer.
         ask::Answer unreadable;
@@ -123,11 +133,14 @@ void QuestionDesk::ask(const ask::Question& question, const ask::Engine::Complet
         unreadable.sentence = host_.text("STATUS_UNREADABLE");
         return completion(std::move(unreadable));
     }
-    engine().ask(question, [alive = std::weak_ptr<bool>(alive_), completion](ask::Answer answer) {
-        if (alive.lock()) {
-            completion(std::move(answer));
-        }
-    });
+    engine().ask(
+        question,
+        [alive = std::weak_ptr<bool>(alive_), completion](ask::Answer answer) {
+            if (alive.lock()) {
+                completion(std::move(answer));
+            }
+        },
+        understood);
 }
 
 Scenario QuestionDesk::scenarioOf(const ask::Answer& answer) const {

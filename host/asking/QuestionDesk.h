@@ -1,6 +1,8 @@
 #pragma once
 
+#include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 
 #include "ask/Engine.h"
@@ -29,8 +31,9 @@ class QuestionDesk {
     ask::Question question(const std::string& text, bool isLive);
     /// The same without a look for the asker's position: for what is read here and not asked.
     ask::Question questionInWords(const std::string& text) const;
-    /// Calls the completion exactly once, perhaps inside the call, and not after this is gone.
-    void ask(const ask::Question& question, const ask::Engine::Completion& completion);
+    /// Calls the completion exactly once, and not after this is gone. `understood` hears what the service is asked for.
+    void ask(const ask::Question& question, const ask::Engine::Completion& completion,
+             const ask::Engine::Meant& understood = nullptr);
     /// The same as a turn for the conversation: the sentence, and its snippet when there is one.
     Scenario scenarioOf(const ask::Answer& answer) const;
     /// With the people of the contacts as they are now.

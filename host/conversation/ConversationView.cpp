@@ -21,8 +21,8 @@ std::shared_ptr<linux_::QtAppearance> shownAppearance() {
 void ConversationView::addTurn(const std::shared_ptr<TurnView>& turn) {
     turns_.push_back(turn);
     turn->setMotionStyle(style_);
-    if (softColor_) {
-        turn->setSoftColor(*softColor_);
+    if (palette_ != nullptr) {
+        turn->setPalette(*palette_);
     }
     addSubview(turn);
 }
@@ -85,10 +85,9 @@ bool ConversationView::advance(double now) {
 }
 
 void ConversationView::setPalette(const linux_::Palette& palette) {
-    const QColor& soft = palette.inkSoft;
-    softColor_ = platform::Color::rgb(soft.redF(), soft.greenF(), soft.blueF());
+    palette_ = &palette;
     for (const auto& turn : turns_) {
-        turn->setSoftColor(*softColor_);
+        turn->setPalette(palette);
     }
     setNeedsDisplay();
     // Maps ask for pictures that fit.

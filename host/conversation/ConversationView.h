@@ -1,7 +1,6 @@
 #pragma once
 
 #include <memory>
-#include <optional>
 #include <vector>
 
 #include "host/conversation/CardShadow.h"
@@ -46,7 +45,7 @@ class ConversationView : public platform::View {
     bool moves_ = false;
     bool showsTimes_ = true;
     std::vector<std::shared_ptr<TurnView>> turns_;
-    std::optional<platform::Color> softColor_;
+    const linux_::Palette* palette_ = nullptr;
     /// Painting keeps what it blurred.
     mutable CardShadow shadow_;
 };

@@ -14,6 +14,11 @@ inline constexpr double kBubbleSide = 16.0;
 inline constexpr double kBubbleBottom = 11.0;
 inline constexpr double kQuestionToSentence = 14.0;
 inline constexpr double kCardToQuestion = 22.0;
+inline constexpr double kRingToBubble = 12.0;  ///< while the question waits for its answer
+inline constexpr double kMark = 16.0;          ///< in the ring's place, where nothing came
+inline constexpr double kSentenceToOffers = 12.0;
+inline constexpr double kSentenceToQuestions = 18.0;
+inline constexpr double kOffersToQuestion = 6.0;  ///< besides what is between a card and the next question
 
 // A card's header; x from the card's start edge
 inline constexpr double kHeaderHeight = 48.0;

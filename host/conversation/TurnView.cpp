@@ -66,7 +66,25 @@ void place(View& view, const Rect& rect, double parentWidth) {
     view.setFrame(mirrored(rect, parentWidth, rightToLeft()));
 }
 
+platform::Color softColor(const linux_::Palette& palette) {
+    const QColor& soft = palette.inkSoft;
+    return platform::Color::rgb(soft.redF(), soft.greenF(), soft.blueF());
+}
+
 }  // namespace
+
+/// Before a question of which nothing came; the sentence says the same.
+class TurnView::MarkView : public View {
+  public:
+    MarkView() { setUserInteractionEnabled(false); }
+
+  protected:
+    void draw(Canvas& canvas) const override {
+        if (auto* qt = qtCanvas(canvas)) {
+            paintIcon(qt->painter(), Icon::Warning, toQt(bounds()), qt->palette().warning, false);
+        }
+    }
+};
 
 bool TurnView::initWithFrame(const Rect& frame) {
     if (!View::initWithFrame(frame)) {
@@ -80,14 +98,21 @@ bool TurnView::initWithFrame(const Rect& frame) {
     sentence_->setLineBreakMode(LineBreakMode::WordWrapping);
     card_ = create<CardView>(&CardView::initWithFrame, Rect{});
     card_->setHidden(true);
+    ring_ = create<RingView>(&RingView::initWithFrame, Rect{});
+    mark_ = create<MarkView>(&MarkView::initWithFrame, Rect{});
+    offers_ = create<OffersView>(&OffersView::initWithFrame, Rect{});
     chooseFonts();
     speech_->addSubview(time_);
     speech_->addSubview(bubble_);
     sentenceFade_ = create<AnswerView>(&AnswerView::initWithFrame, Rect{});
     sentenceFade_->addSubview(sentence_);
     speech_->addSubview(sentenceFade_);
+    speech_->addSubview(ring_);
+    speech_->addSubview(mark_);
     addSubview(speech_);
     addSubview(card_);
+    addSubview(offers_);
+    setProgress(Progress::None);
     return true;
 }
 
@@ -96,6 +121,7 @@ void TurnView::chooseFonts() {
     sentence_->setFont(preferredFont(TextStyle::Body));
     bubble_->chooseFont();
     card_->chooseFont();
+    offers_->chooseFonts();
 }
 
 void TurnView::renew() {
@@ -121,9 +147,40 @@ void TurnView::setTexts(const TurnTexts& texts) {
 
 void TurnView::setSentence(const std::string& sentence) {
     texts_.sentence = cutText(sentence, kLongestText);
-    sentence_->setText(inItsDirection(texts_.sentence));
-    sentence_->setHidden(sentence.empty());
-    sentenceFade_->setHidden(sentence.empty());
+    showSentence();
+}
+
+void TurnView::setPatience(const std::string& words) {
+    patience_ = words;
+    showSentence();
+}
+
+void TurnView::showSentence() {
+    const bool isPatience = texts_.sentence.empty();
+    const std::string& words = isPatience ? patience_ : texts_.sentence;
+    sentence_->setText(inItsDirection(words));
+    sentence_->setTextColor(isPatience && palette_ != nullptr ? softColor(*palette_)
+                                                              : Color::ofRole(ColorRole::StandardText));
+    sentence_->setHidden(words.empty());
+    sentenceFade_->setHidden(words.empty());
+}
+
+void TurnView::setProgress(Progress progress) {
+    progress_ = progress;
+    ring_->setHidden(progress != Progress::Asking);
+    mark_->setHidden(progress != Progress::Failed);
+}
+
+void TurnView::setOffers(const Offers& offers) {
+    offers_->setOffers(offers);
+    setNeedsLayout();
+}
+
+void TurnView::setPalette(const linux_::Palette& palette) {
+    palette_ = &palette;
+    time_->setTextColor(softColor(palette));
+    offers_->setPalette(palette);
+    showSentence();
 }
 
 void TurnView::setController(const std::shared_ptr<HostSnippetViewController>& controller) {
@@ -142,11 +199,13 @@ Size TurnView::sentenceSize(double width) const {
 
 double TurnView::layOut(double width, bool first) {
     places_.width = width;
-    if (width >= measures::kWideFrom) {
+    const bool isWide = width >= measures::kWideFrom;
+    if (isWide) {
         layOutWide(width);
     } else {
         layOutNarrow(width, first);
     }
+    places_.offersFollowCard = !isWide;
     if (!card_->hidden()) {
         setCardHeight(card_->heightForWidth(places_.card.width), places_.card.width);
     }
@@ -158,7 +217,15 @@ void TurnView::layOutNarrow(double width, bool first) {
     const double cardTop = layOutNarrowSpeech(width, first);
     speech_->setFrame({0.0, 0.0, width, cardTop});
     places_.least = cardTop;
+    places_.speechEnd = cardTop - (sentence_->hidden() ? 0.0 : measures::kSentenceToCard);
     places_.card = {measures::kGutter, cardTop, width - 2.0 * measures::kGutter, 0.0};
+    // Questions keep to the edge at which the question stands.
+    const double start = offers_->asksOn() ? measures::kGutter : measures::kSentenceStart;
+    layOutOffers(start, width - start - measures::kGutter, false);
+}
+
+void TurnView::layOutOffers(double start, double width, bool atEnd) {
+    places_.offers = {start, 0.0, width, offers_->hidden() ? 0.0 : offers_->layOut(width, atEnd)};
 }
 
 void TurnView::setCardHeight(double height, double width) {
@@ -181,6 +248,17 @@ void TurnView::placeAnswer() {
         card.height = growth_.at(now_);
         place(*card_, card, places_.width);
         height_ = std::max(height_, places_.card.y + card.height);
+    }
+    if (!offers_->hidden()) {
+        constexpr double kAround = OffersView::kAround;
+        const bool followsCard = places_.offersFollowCard && !card_->hidden();
+        const double gap = offers_->asksOn() ? measures::kSentenceToQuestions : measures::kSentenceToOffers;
+        const double top = (followsCard ? height_ : places_.speechEnd) + gap;
+        Rect offers = places_.offers.offsetBy(-kAround, top + rise - kAround);
+        offers.width += 2.0 * kAround;
+        offers.height += 2.0 * kAround;
+        place(*offers_, offers, places_.width);
+        height_ = std::max(height_, top + places_.offers.height + measures::kOffersToQuestion);
     }
 }
 
@@ -213,6 +291,7 @@ bool TurnView::advance(double now) {
     const bool moves = !isOver(now);
     if (moved || moves) {
         sentenceFade_->setOpacity(answerArrival_.at(now));
+        offers_->setOpacity(answerArrival_.at(now));
         card_->setOpacity(answerArrival_.at(now));
         placeAnswer();
         setNeedsDisplay();
@@ -227,6 +306,15 @@ void TurnView::draw(Canvas& canvas) const {
         // Holds for everything in the turn: the caller restores the canvas when it leaves it.
         qt->painter().setOpacity(qt->painter().opacity() * opacity);
     }
+}
+
+void TurnView::placeProgress(const Rect& bubble, double parentWidth) {
+    const double middle = bubble.maxY() - measures::kBubbleBottom - sentence_->font().lineHeight() / 2.0;
+    const auto put = [&](View& view, double side) {
+        place(view, {bubble.x - measures::kRingToBubble - side, middle - side / 2.0, side, side}, parentWidth);
+    };
+    put(*ring_, measures::kRing);
+    put(*mark_, measures::kMark);
 }
 
 double TurnView::layOutNarrowSpeech(double width, bool first) {
@@ -245,7 +333,9 @@ double TurnView::layOutNarrowSpeech(double width, bool first) {
     if (!bubble_->hidden()) {
         const Size size =
             bubble_->sizeForWidth(std::min(width * measures::kBubbleShare, width - 2.0 * measures::kGutter));
-        place(*bubble_, {width - measures::kGutter - size.width, y, size.width, size.height}, width);
+        const Rect bubble{width - measures::kGutter - size.width, y, size.width, size.height};
+        place(*bubble_, bubble, width);
+        placeProgress(bubble, width);
         y += size.height + (sentence_->hidden() ? measures::kSentenceToCard : measures::kQuestionToSentence);
     }
     if (!sentence_->hidden()) {
@@ -264,6 +354,8 @@ void TurnView::layOutWide(double width) {
     const double speechHeight = layOutWideSpeech();
     place(*speech_, {columns.speechStart, 0.0, measures::kSpeechColumn, speechHeight}, width);
     places_.least = speechHeight;
+    places_.speechEnd = speechHeight;
+    layOutOffers(columns.speechStart, measures::kSpeechColumn - measures::kSpeechInset, true);
     places_.card = {columns.cardStart, 0.0, columns.cardWidth, 0.0};
 }
 
@@ -273,7 +365,9 @@ double TurnView::layOutWideSpeech() {
     double y = 0.0;
     if (!bubble_->hidden()) {
         const Size size = bubble_->sizeForWidth(kColumn);
-        place(*bubble_, {kColumn - size.width, y, size.width, size.height}, kColumn);
+        const Rect bubble{kColumn - size.width, y, size.width, size.height};
+        place(*bubble_, bubble, kColumn);
+        placeProgress(bubble, kColumn);
         y += size.height + measures::kQuestionToSentence;
     }
     if (!sentence_->hidden()) {

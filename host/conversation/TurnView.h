@@ -7,7 +7,9 @@
 #include "host/conversation/CardView.h"
 #include "host/conversation/FadeView.h"
 #include "host/conversation/Motion.h"
-#include "platform/ui/Color.h"
+#include "host/conversation/OffersView.h"
+#include "host/conversation/RingView.h"
+#include "linux/paint/Palette.h"
 #include "platform/ui/Label.h"
 #include "platform/ui/View.h"
 
@@ -21,24 +23,37 @@ struct TurnTexts {
     std::string sentence;
 };
 
-/// A question, a sentence and a card: one under the other, or side by side where there is room. Main thread.
+/// A question, a sentence, a card and what can be done about them: one under the other, or side by side where there is
+/// room. Main thread.
 class TurnView : public platform::View {
   public:
     /// Bytes of a question or a sentence: whoever sends a megabyte must not hold up the window, which measures all of
     /// it.
     static constexpr std::size_t kLongestText = 4000;
 
+    /// How it is with the question: while it waits a ring stands before it, and a mark where nothing came of it.
+    enum class Progress { None, Asking, Failed };
+
     bool initWithFrame(const platform::Rect& frame) override;
     void setTexts(const TurnTexts& texts);
     void setSentence(const std::string& sentence);
+    void setProgress(Progress progress);
+    /// Said in the sentence's place as long as there is no sentence; empty: nothing.
+    void setPatience(const std::string& words);
+    /// What can be done about the answer, in the place of what could before.
+    void setOffers(const Offers& offers);
     /// Puts an answer into the card, which is not shown before.
     void setController(const std::shared_ptr<platform::HostSnippetViewController>& controller);
     /// Begins anew where the language or the text size may be another: with the fonts of now, and with a new card in
     /// the place of the old one. A still is kept, any other answer is taken away; texts stay until they are set.
     void renew();
-    /// Of the time.
-    void setSoftColor(const platform::Color& color) { time_->setTextColor(color); }
+    /// What the texts take their colours from that the host has of its own.
+    void setPalette(const linux_::Palette& palette);
     const std::shared_ptr<CardView>& card() const { return card_; }
+    const std::shared_ptr<RingView>& ring() const { return ring_; }
+    const std::shared_ptr<OffersView>& offers() const { return offers_; }
+    Progress progress() const { return progress_; }
+    const std::string& question() const { return texts_.question; }
     const std::string& sentence() const { return texts_.sentence; }
     platform::AccessibilityRole accessibilityRole() const override { return platform::AccessibilityRole::Group; }
     /// The question, else the sentence.
@@ -70,6 +85,12 @@ class TurnView : public platform::View {
     void draw(platform::Canvas& canvas) const override;
 
   private:
+    class MarkView;
+
+    void showSentence();
+    void layOutOffers(double start, double width, bool atEnd);
+    /// Beside the question's last line, whose bubble is there.
+    void placeProgress(const platform::Rect& bubble, double parentWidth);
     void layOutNarrow(double width, bool first);
     void layOutWide(double width);
     double riseOf(const Motion& arrival) const;
@@ -89,6 +110,9 @@ class TurnView : public platform::View {
         double sentenceParent = 0.0;
         platform::Rect card;  ///< without its height
         double least = 0.0;   ///< of the turn's height
+        double speechEnd = 0.0;
+        platform::Rect offers;  ///< their content, without its upper edge
+        bool offersFollowCard = false;
     };
 
     TurnTexts texts_;
@@ -108,7 +132,14 @@ class TurnView : public platform::View {
     /// Around the sentence, which may come on its own.
     std::shared_ptr<FadeView> sentenceFade_;
     std::shared_ptr<platform::Label> sentence_;
+    /// Before the question.
+    std::shared_ptr<RingView> ring_;
+    std::shared_ptr<MarkView> mark_;
     std::shared_ptr<CardView> card_;
+    std::shared_ptr<OffersView> offers_;
+    std::string patience_;
+    Progress progress_ = Progress::None;
+    const linux_::Palette* palette_ = nullptr;
 };
 
 }  // namespace ktr::host

@@ -40,4 +40,18 @@ std::string FriendLinks::placeText(const platform::Coordinate& coordinate) {
     return QString::asprintf("%.5f, %.5f", coordinate.latitude, coordinate.longitude).toStdString();
 }
 
+FriendLinks::Ways FriendLinks::waysTo(const platform::Contact* contact, const std::string& handle) {
+    Ways ways;
+    for (const auto& number : contact != nullptr ? contact->phoneNumbers : std::vector<platform::LabeledText>()) {
+        ways.call = ways.call ? ways.call : call(number.value);
+    }
+    for (const auto& address : contact != nullptr ? contact->emailAddresses : std::vector<platform::LabeledText>()) {
+        ways.write = ways.write ? ways.write : write(address.value);
+    }
+    const bool isAddress = handle.find('@') != std::string::npos;
+    ways.call = ways.call || isAddress ? ways.call : call(handle);
+    ways.write = ways.write || !isAddress ? ways.write : write(handle);
+    return ways;
+}
+
 }  // namespace ktr::host

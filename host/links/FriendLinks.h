@@ -3,6 +3,7 @@
 #include <optional>
 #include <string>
 
+#include "platform/contacts/Contact.h"
 #include "platform/location/PlatformLocation.h"
 
 namespace ktr::host {
@@ -16,6 +17,13 @@ class FriendLinks {
     static std::optional<std::string> call(const std::string& number);
     /// None for what is no address (RFC 6068).
     static std::optional<std::string> write(const std::string& address);
+    /// To call somebody, and to write to them: by the contact's first number and address that are some, else by the
+    /// handle. The contact may be null, the handle empty.
+    struct Ways {
+        std::optional<std::string> call;
+        std::optional<std::string> write;
+    };
+    static Ways waysTo(const platform::Contact* contact, const std::string& handle);
     /// The place as somebody would send it: "50.21550, -3.11110".
     static std::string placeText(const platform::Coordinate& coordinate);
 };

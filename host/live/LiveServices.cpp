@@ -82,13 +82,13 @@ void LiveServices::makeOnce(const platform::Platform& platform) {
     // Asked on the main thread, at each question.
     assistant_ = std::make_unique<linux_::AssistantClient>(
         [this] {
-            const auto settings = transportSettings(*accounts_);
+            const auto configured = accounts_->configuration();
             const auto account = accounts_->deviceOwnerAccount();
             const auto token = account ? account->tokenOfType(platform::kFriendLocationService) : std::nullopt;
             const auto authorization =
                 token ? platform::basicAuthorization(account->personIdentifier().value_or(""), *token) : std::nullopt;
-            return linux_::AssistantClient::Settings{settings.serviceHost, authorization, settings.certificateFiles,
-                                                     language_};
+            return linux_::AssistantClient::Settings{configured.account ? configured.account->assistant : std::nullopt,
+                                                     authorization, configured.certificates, language_};
         },
         network_);
 }
@@ -164,6 +164,11 @@ bool LiveServices::isSignedIn() const {
     const auto account = accounts_->deviceOwnerAccount();
     return account && account->personIdentifier() && account->hostNameOfType(platform::kFriendLocationService) &&
            account->tokenOfType(platform::kFriendLocationService);
+}
+
+bool LiveServices::hasAssistant() const {
+    const auto configured = accounts_->configuration();
+    return configured.account && configured.account->assistant;
 }
 
 void LiveServices::setChanged(std::function<void()> changed) {

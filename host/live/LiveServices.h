@@ -82,6 +82,8 @@ class LiveServices {
     const ServiceWatch& service() const { return *service_; }
     /// What ages are counted by; the moments of `service` are its.
     const linux_::EvenClock& evenClock() const { return *evenClock_; }
+    /// Whether the account names an assistant's server, which is asked instead of the engine.
+    bool hasAssistant() const;
     linux_::AssistantClient& assistant() { return *assistant_; }
     /// Called after something that the user gets to see may have changed.
     void setChanged(std::function<void()> changed);

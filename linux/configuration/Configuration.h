@@ -19,6 +19,9 @@ struct Configuration {
         /// The file that holds the app token, as an absolute path; none: the Secret Service, then the file "token"
         /// beside the configuration file.
         std::optional<std::string> tokenFile;
+        /// A server that answers questions as they are typed, with ":port" when the port is not 443; none: they are
+        /// understood here, and the service gets typed requests.
+        std::optional<std::string> assistant;
         bool operator==(const Account&) const = default;
     };
 

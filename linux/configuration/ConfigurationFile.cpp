@@ -94,6 +94,7 @@ const std::vector<std::string>& ConfigurationFile::names() {
                                                     "account.host",
                                                     "account.domains",
                                                     "account.tokenFile",
+                                                    "account.assistant",
                                                     "certificates",
                                                     "contacts",
                                                     "addressBooks",

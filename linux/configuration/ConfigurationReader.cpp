@@ -63,9 +63,12 @@ void readAccount(FieldReader& members, const std::filesystem::path& file, Config
     }
     account.userName = members.text("userName");
     account.host = members.text("host");
-    if (account.host && !isHost(*account.host)) {
-        members.complain("host", "expected a host such as \"friends.example\" or \"localhost:8443\", found " +
-                                     documents::inQuotes(*account.host));
+    account.assistant = members.text("assistant");
+    for (const auto& [name, host] : {std::pair("host", account.host), std::pair("assistant", account.assistant)}) {
+        if (host && !isHost(*host)) {
+            members.complain(name, "expected a host such as \"friends.example\" or \"localhost:8443\", found " +
+                                       documents::inQuotes(*host));
+        }
     }
     if (const auto* listed = members.member("domains"); listed != nullptr && !listed->isNull()) {
         account.domains = members.texts("domains");

@@ -49,6 +49,16 @@
         <translation>Send</translation>
     </message>
     <message>
+        <source>ASK_STOP</source>
+        <extracomment>The same button, while an answer is waited for: it gives the question up.</extracomment>
+        <translation>Stop asking</translation>
+    </message>
+    <message>
+        <source>ASKING_SLOW</source>
+        <extracomment>In the answer’s place, when it takes more than four seconds.</extracomment>
+        <translation>Taking longer than usual…</translation>
+    </message>
+    <message>
         <source>STATUS_LIVE_NOW</source>
         <extracomment>Status line: answers keep coming</extracomment>
         <translation>Live · updated just now</translation>

@@ -49,6 +49,16 @@
         <translation>Envoyer</translation>
     </message>
     <message>
+        <source>ASK_STOP</source>
+        <extracomment>The same button, while an answer is waited for: it gives the question up. English: “Stop asking”</extracomment>
+        <translation>Arrêter de demander</translation>
+    </message>
+    <message>
+        <source>ASKING_SLOW</source>
+        <extracomment>In the answer’s place, when it takes more than four seconds. English: “Taking longer than usual…”</extracomment>
+        <translation>C’est plus long que d’habitude…</translation>
+    </message>
+    <message>
         <source>STATUS_LIVE_NOW</source>
         <extracomment>Status line: answers keep coming. English: “Live · updated just now”</extracomment>
         <translation>En direct · actualisé à l’instant</translation>

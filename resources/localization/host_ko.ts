@@ -49,6 +49,16 @@
         <translation>보내기</translation>
     </message>
     <message>
+        <source>ASK_STOP</source>
+        <extracomment>The same button, while an answer is waited for: it gives the question up. English: “Stop asking”</extracomment>
+        <translation>묻기 중지</translation>
+    </message>
+    <message>
+        <source>ASKING_SLOW</source>
+        <extracomment>In the answer’s place, when it takes more than four seconds. English: “Taking longer than usual…”</extracomment>
+        <translation>평소보다 오래 걸립니다…</translation>
+    </message>
+    <message>
         <source>STATUS_LIVE_NOW</source>
         <extracomment>Status line: answers keep coming. English: “Live · updated just now”</extracomment>
         <translation>실시간 · 방금 업데이트됨</translation>

@@ -49,6 +49,16 @@
         <translation>Надіслати</translation>
     </message>
     <message>
+        <source>ASK_STOP</source>
+        <extracomment>The same button, while an answer is waited for: it gives the question up. English: “Stop asking”</extracomment>
+        <translation>Припинити запит</translation>
+    </message>
+    <message>
+        <source>ASKING_SLOW</source>
+        <extracomment>In the answer’s place, when it takes more than four seconds. English: “Taking longer than usual…”</extracomment>
+        <translation>Це довше, ніж зазвичай…</translation>
+    </message>
+    <message>
         <source>STATUS_LIVE_NOW</source>
         <extracomment>Status line: answers keep coming. English: “Live · updated just now”</extracomment>
         <translation>Наживо · оновлено щойно</translation>

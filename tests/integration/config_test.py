@@ -23,6 +23,7 @@ VALUES = {
     "account.host": (["friends.example", "localhost:8443", "[::1]:8443"], ["https://friends.example/", "a b", "x:99999999", 5]),
     "account.domains": ([[], ["friends.example"]], ["friends.example", [5], [""]]),
     "account.tokenFile": (["token2"], [True, ""]),
+    "account.assistant": (["assistant.example:8443"], ["no host", True]),
     "certificates": ([["ca.pem"]], [{}, [1]]),
     "contacts": ([["a.vcf", "b.vcf"]], [[None], "a.vcf"]),
     "language": (["de-AT"], [7, ""]),

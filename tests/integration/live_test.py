@@ -70,7 +70,7 @@ class LiveTest(unittest.TestCase):
         self.assertEqual(result.returncode, 0, result.stderr)
         self.assertIn("Ann Marsh, Place: Fish Market", result.stdout)
         self.assertIn("Otto Brandt, Place: Work", result.stdout)
-        self.assertIn("Here is where they are.", result.stdout)
+        self.assertRegex(result.stdout, r"At \d?\d:\d\d Ann Marsh was at home\. At \d?\d:\d\d Otto Brandt was at work\.")
         self.assertIn("Live · updated just now", result.stderr)
         self.assertRegex(result.stderr, r"the service was asked: [2-9]\d* answers, 0 failures")
 
@@ -80,6 +80,16 @@ class LiveTest(unittest.TestCase):
         self.assertEqual(self.run_live(environment, "render", 0.1, "-o", before).returncode, 0)
         self.assertEqual(self.run_live(environment, "render", 8, "-o", after).returncode, 0)
         self.assertNotEqual(before.read_bytes(), after.read_bytes())
+
+    def snippet_of(self, friends, timeout=60000):
+        """A list of these, of whom nothing is known."""
+        scenario = self.folder / "list.json"
+        context = f"ktrServerContext://serverContext?minCallbackIntervalInMS=300&callbackTimeoutIntervalInMS={timeout}&"
+        scenario.write_text(json.dumps({"clock": "2001-05-16T17:42:00+01:00", "sentence": "Here they are.", "snippet": {
+            "kind": "VAKtrLocationSnippet", "proximity": "friends", "searchContext": context, "locations": [
+                {"friend": {"data": one["emails"][0], "object": {
+                    "fullName": one["fullName"], "emails": [{"emailAddress": one["emails"][0]}]}}} for one in friends]}}))
+        return scenario
 
     def snippet_of_ann(self):
         """An answer that asks the service twice after 0.3 seconds, and then as the service says."""
@@ -106,19 +116,26 @@ class LiveTest(unittest.TestCase):
     def test_question_that_is_not_understood_gets_its_sentence(self):
         result = self.describe(MOVING, 0.2, question="Tell me a joke")
         self.assertEqual(result.returncode, 0, result.stderr)
-        self.assertIn('Ask "Where is Ann?"', result.stdout)
+        self.assertIn("I didn’t understand that.", result.stdout)
+        self.assertIn("Where is Ann? (link)", result.stdout)
         self.assertNotIn("Friends", result.stdout)
 
     def test_looking_for_friends_becomes_none_found(self):
         nobody = [person("Zofia", "Wrona", []), person("Kwame", "Asare", [])]
-        self.assertIn("Finding your friends…", self.describe(nobody, 0.3, "--interval", "60").stdout)
+        result = self.describe(nobody, 0.3)
+        self.assertIn("I can’t see where any of your friends are.", result.stdout)
+        self.assertNotIn("Friends", result.stdout, "no card where there is nothing to show")
+        looked_for = self.snippet_of(nobody, timeout=500)
+        self.assertIn("Finding your friends…", self.run_live(self.serve(nobody, "--interval", "60"), "describe", 0.3,
+                                                             looked_for, question=None).stdout)
         # The answer comes after the asking has ended, and is the last.
-        result = self.describe(nobody, 2, "--interval", "0.3", "--fault", "delay=0.6", timeout=0.5)
+        result = self.run_live(self.serve(nobody, "--interval", "0.3", "--fault", "delay=0.6", timeout=0.5), "describe", 2,
+                               looked_for, question=None)
         self.assertIn("No friends found there.", result.stdout)
 
     def test_friend_appears_once_found(self):
         late = [person("Kwame", "Asare", [place(0, "Home")], locatedAfter=1.5), person("Zofia", "Wrona", [])]
-        result = self.describe(late, 3, "--interval", "0.3")
+        result = self.run_live(self.serve(late, "--interval", "0.3"), "describe", 3, self.snippet_of(late), question=None)
         self.assertIn("Kwame Asare, Place: Home", result.stdout)
 
     # Faults: words of the fault, what the status line says at the end, what is on screen at the end.
@@ -158,6 +175,8 @@ class LiveTest(unittest.TestCase):
     def check_fault(self, name):
         words, status, shown = self.FAULTS[name]
         # Nobody may be so slow as to ask only after Ann has moved: four ask at once, perhaps under a sanitizer.
+        # The question itself is answered.
+        words += "" if "at=" in words else ",at=2"
         result = self.describe(moving(7), 9, "--interval", "0.4", "--fault", words)
         told = f"{name}\n{result.stdout}\n{result.stderr}"
         assert result.returncode == 0, told
@@ -300,13 +319,13 @@ class LiveTest(unittest.TestCase):
         environment = {**os.environ, "KTR_CONFIG": str(self.folder / "none.json"), "XDG_STATE_HOME": str(self.folder)}
         result = self.run_live(environment, "describe", 0.3)
         self.assertEqual(result.returncode, 1)
-        self.assertIn("Sign in to ask about your friends.", result.stdout)
+        self.assertIn("Sign in, then I’ll tell you.", result.stdout)
         self.assertIn("Sign in to see your friends.", result.stderr)
 
-    def test_assistant_of_another_certificate_is_not_believed(self):
+    def test_service_of_another_certificate_is_not_believed(self):
         result = self.describe(MOVING, 0.3, "--certificate", "foreign")
         self.assertEqual(result.returncode, 1)
-        self.assertIn("Your assistant is out of reach right now.", result.stdout)
+        self.assertIn("Your service didn’t answer.", result.stdout)
         self.assertIn("nobody who is trusted vouches for its certificate", result.stderr)
         self.assertIn("ktr: Service not trusted.\n", result.stderr)
 

@@ -34,13 +34,14 @@ class Service:
     def credentials(self):
         return "Basic " + base64.b64encode(f"1000:{self.token}".encode()).decode()
 
-    def ask(self, question):
-        """The assistant's answer to a question."""
+    def hides(self, wish="read"):
+        """Whether friends cannot see the user, after a wish: "read" changes nothing."""
         context = ssl.create_default_context(cafile=self.authority)
         connection = http.client.HTTPSConnection("localhost", self.port, context=context, timeout=20)
-        connection.request("POST", "/assistant", json.dumps({"question": question}),
-                           {"Authorization": self.credentials, "Content-Type": "application/json"})
-        return json.loads(connection.getresponse().read())
+        connection.request("POST", "/qloxservice/friends/va/sharing", json.dumps({"clientContext": {}, "wish": wish}),
+                           {"Authorization": self.credentials, "Content-Type": "application/json",
+                            "X-Orcha-Seek-API-Ver": "4.0", "X-Orcha-AuthScheme": "Forever"})
+        return json.loads(connection.getresponse().read())["hidden"]
 
     def end(self, how=signal.SIGTERM):
         """Ends the service; gives its exit status and the lines that it wrote."""

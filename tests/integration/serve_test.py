@@ -277,53 +277,56 @@ class SharingTest(unittest.TestCase):
         connection.request("POST", "/qloxservice/friends/va/showHideLocation", json.dumps(body), headers(service))
         return json.loads(connection.getresponse().read())["myInfo"]
 
-    def visible(self, service, question):
-        return service.ask(question)["snippet"]["visible"]
-
     def test_state_is_kept_while_it_runs(self):
         with Service(PROGRAM) as service:
-            self.assertTrue(self.visible(service, "Can my friends see me?"))
+            self.assertFalse(service.hides())
             self.assertEqual(self.command(service, "No", latitude=50.2104, longitude=-3.12)["location"]["latitude"],
                              50.2104)
-            self.assertFalse(self.visible(service, "Hide my location"))
-            self.assertFalse(self.visible(service, "Can my friends see me?"))
+            self.assertTrue(service.hides("hide"))
+            self.assertTrue(service.hides())
             self.assertTrue(self.command(service, "No")["hidden"], "an older answer repeats itself")
-            self.assertFalse(self.visible(service, "Can my friends see me?"))
-            self.assertTrue(self.visible(service, "Share my location"))
+            self.assertTrue(service.hides())
+            self.assertFalse(service.hides("share"))
             self.assertIsNone(self.command(service, "Yes")["location"])
-            self.assertFalse(self.visible(service, "Can my friends see me?"))
+            self.assertTrue(service.hides())
             self.assertEqual(self.command(service, "No")["location"]["latitude"], 50.2104)
-            self.assertTrue(self.visible(service, "Can my friends see me?"))
+            self.assertFalse(service.hides())
             _, lines = service.end()
             self.assertEqual(lines, [f"request {n}: showHideLocation, 200" for n in (1, 2, 3, 4)])
 
-    def test_only_a_question_with_the_token_changes_anything(self):
+    def test_only_a_wish_with_the_token_changes_anything(self):
+        path = "/qloxservice/friends/va/sharing"
         with Service(PROGRAM) as service:
-            wish = json.dumps({"question": "Hide my location"})
-            good = {"Authorization": service.credentials, "Content-Type": "application/json"}
-            for method, path, body, fields, status in (
-                    ("GET", "/assistant?q=hide%20my%20location", None, {}, 405),
-                    ("GET", "/assistant?q=hide%20my%20location", None, good, 405),
-                    ("HEAD", "/assistant?q=hide%20my%20location", None, good, 405),
-                    ("PUT", "/assistant", wish, good, 405),
-                    ("POST", "/assistant", wish, {**good, "Authorization": "Basic MTAwMDp4"}, 401),
-                    ("POST", "/assistant", wish, {"Content-Type": "application/json"}, 401),
+            wish = json.dumps({"clientContext": {}, "wish": "hide"})
+            good = headers(service)
+            for method, body, fields, status in (
+                    ("GET", None, {}, 404),
+                    ("GET", None, good, 404),
+                    ("PUT", wish, good, 404),
+                    ("POST", wish, {**good, "Authorization": "Basic MTAwMDp4"}, 401),
+                    ("POST", wish, {"Content-Type": "application/json"}, 401),
                     # What a page of another site can send without being asked whether it may.
-                    ("POST", "/assistant", wish, {**good, "Content-Type": "text/plain"}, 415),
-                    ("POST", "/assistant", "q=hide+my+location",
-                     {**good, "Content-Type": "application/x-www-form-urlencoded"}, 415),
-                    ("POST", "/assistant?q=hide%20my%20location", "{}", good, 400)):
+                    ("POST", wish, {**good, "Content-Type": "text/plain"}, 415),
+                    ("POST", "wish=hide", {**good, "Content-Type": "application/x-www-form-urlencoded"}, 415),
+                    ("POST", "{}", good, 400)):
                 connection = connect(service)
                 connection.request(method, path, body, fields)
-                self.assertEqual(connection.getresponse().status, status, (method, path, fields))
-            self.assertTrue(self.visible(service, "Can my friends see me?"))
-            self.assertFalse(self.visible(service, "Hide my location"))
+                self.assertEqual(connection.getresponse().status, status, (method, fields))
+            self.assertFalse(service.hides())
+            self.assertTrue(service.hides("hide"))
+
+    def test_there_is_no_server_for_questions(self):
+        with Service(PROGRAM) as service:
+            connection = connect(service)
+            connection.request("POST", "/assistant", json.dumps({"question": "Hide my location"}), headers(service))
+            self.assertEqual(connection.getresponse().status, 404)
+            self.assertFalse(service.hides())
 
     def test_state_ends_with_it(self):
         with Service(PROGRAM) as service:
             self.command(service, "Yes")
         with Service(PROGRAM) as service:
-            self.assertTrue(self.visible(service, "Can my friends see me?"))
+            self.assertFalse(service.hides())
 
     def test_many_at_once(self):
         with Service(PROGRAM) as service:
@@ -339,7 +342,7 @@ class SharingTest(unittest.TestCase):
             body = json.dumps({"clientContext": {}, "prefs": {"hideLocation": "Yes"}})
             connection.request("POST", "/qloxservice/friends/va/showHideLocation", body, headers(service))
             self.assertEqual(connection.getresponse().status, 503)
-            self.assertTrue(self.visible(service, "Can my friends see me?"), "a command that failed changed nothing")
+            self.assertFalse(service.hides(), "a command that failed changed nothing")
 
 
 class FenceTest(unittest.TestCase):

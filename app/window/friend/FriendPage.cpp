@@ -224,18 +224,7 @@ QString FriendPage::howExactlyWords() const {
 void FriendPage::chooseActions() {
     const VAKtrLocation& location = *known_.location;
     const auto contact = KnownFriends::contactOf(location);
-    const std::string handle = KnownFriends::handleOf(location);
-    std::optional<std::string> call;
-    std::optional<std::string> write;
-    for (const auto& number : contact ? contact->phoneNumbers : std::vector<platform::LabeledText>()) {
-        call = call ? call : FriendLinks::call(number.value);
-    }
-    for (const auto& address : contact ? contact->emailAddresses : std::vector<platform::LabeledText>()) {
-        write = write ? write : FriendLinks::write(address.value);
-    }
-    const bool isAddress = handle.find('@') != std::string::npos;
-    call = call || isAddress ? call : FriendLinks::call(handle);
-    write = write || !isAddress ? write : FriendLinks::write(handle);
+    const auto [call, write] = FriendLinks::waysTo(contact.get(), KnownFriends::handleOf(location));
     std::vector<FriendSheet::Action> actions;
     const auto add = [&](Icon icon, const char* key, const std::string& url, const char* nobody) {
         actions.push_back({icon, text(key), [this, url, nobody] { open_(url, nobody); }});

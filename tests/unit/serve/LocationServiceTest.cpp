@@ -209,18 +209,23 @@ class SharingStateTest : public LocationServiceTest {
         ASSERT_TRUE(done.get_future().get());
         service.sharing().commanded(hides, std::nullopt);
     }
+    void wish(bool hides) {
+        const auto& people = service.people();
+        ASSERT_TRUE(people.store()->setHidden(people.owner(), hides, kMoment.wholeSeconds()));
+        service.sharing().wished(hides);
+    }
 };
 
 TEST_F(SharingStateTest, WishToBeHidden_IsNotUndoneByACommand) {
     EXPECT_FALSE(isHidden());
-    service.sharing().wish(true, kMoment.wholeSeconds());
+    wish(true);
     EXPECT_TRUE(isHidden());
     command(false);
     EXPECT_TRUE(isHidden());
     command(true);
     command(false);
     EXPECT_TRUE(isHidden()) << "a command is no wish";
-    service.sharing().wish(false, kMoment.wholeSeconds());
+    wish(false);
     EXPECT_FALSE(isHidden());
 }
 

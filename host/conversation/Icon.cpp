@@ -1,9 +1,9 @@
-#include "app/window/blocks/Icon.h"
+#include "host/conversation/Icon.h"
 
 #include <QPainter>
 #include <QSvgRenderer>
 
-namespace ktr::app {
+namespace ktr::host {
 
 namespace {
 
@@ -96,4 +96,4 @@ void paintIcon(QPainter& painter, Icon icon, const QRectF& rect, const QColor& c
     painter.restore();
 }
 
-}  // namespace ktr::app
+}  // namespace ktr::host
