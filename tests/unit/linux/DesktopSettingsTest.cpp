@@ -156,6 +156,20 @@ TEST_F(DesktopSettingsTest, AnswerThatAChangeOvertook_IsDropped) {
     EXPECT_EQ(read->values(), (DesktopSettings::Values{1.25, std::nullopt, false, false}));
 }
 
+TEST_F(DesktopSettingsTest, ColourScheme_IsReadAndFollowed_AndNoPreferenceIsNone) {
+    settings[kScheme] = 1u;
+    startPortal();
+    const auto desktop = start("GNOME");
+    EXPECT_TRUE(eventually([&] { return desktop->values().dark == true; }));
+    change("org.freedesktop.appearance", "color-scheme", 2u);
+    EXPECT_TRUE(eventually([&] { return desktop->values().dark == false; }));
+    change("org.freedesktop.appearance", "color-scheme", 0u);
+    EXPECT_TRUE(eventually([&] { return !desktop->values().dark; }));
+    change("org.freedesktop.appearance", "color-scheme", QStringLiteral("dark"));
+    pass(100);
+    EXPECT_FALSE(desktop->values().dark) << "a word is no scheme";
+}
+
 TEST_F(DesktopSettingsTest, PortalWithoutTheKeys_LeavesDefaults) {
     startPortal();
     const auto read = start("GNOME");
@@ -217,20 +231,6 @@ TEST_F(DesktopSettingsTest, BusThatNeverAnswers_DelaysNobody) {
     EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::seconds(1));
     // Lets the one who waits go.
     ::close(silent);
-}
-
-TEST_F(DesktopSettingsTest, ColourScheme_IsReadAndFollowed_AndNoPreferenceIsNone) {
-    settings[kScheme] = 1u;
-    startPortal();
-    const auto desktop = start("GNOME");
-    EXPECT_TRUE(eventually([&] { return desktop->values().dark == true; }));
-    change("org.freedesktop.appearance", "color-scheme", 2u);
-    EXPECT_TRUE(eventually([&] { return desktop->values().dark == false; }));
-    change("org.freedesktop.appearance", "color-scheme", 0u);
-    EXPECT_TRUE(eventually([&] { return !desktop->values().dark; }));
-    change("org.freedesktop.appearance", "color-scheme", QStringLiteral("dark"));
-    pass(100);
-    EXPECT_FALSE(desktop->values().dark) << "a word is no scheme";
 }
 
 }  // namespace ktr::test
