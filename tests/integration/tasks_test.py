@@ -148,7 +148,7 @@ class TasksTest(live_window_test.LiveWindowTest):
         self.click_on("Ask about your friends", "text")
         self.type("hide my location")
         self.key("Return")
-        wait_for("nobody to see", lambda: service.ask("can my friends see me")["snippet"]["visible"] is False)
+        wait_for("nobody to see", lambda: service.hides())
         self.await_seen("Your location is hidden")
 
     def test_task_change_text_size(self):
