@@ -9,14 +9,15 @@ using platform::Dictionary;
 using platform::Value;
 
 const char* nameOf(Outcome outcome) {
-    constexpr std::array<const char*, 10> kNames{"found",       "notSeen",     "ambiguous",     "unknownPerson", "hidden",
-                                                 "unreachable", "notSignedIn", "notUnderstood", "locked",        "refused"};
+    constexpr std::array<const char*, 10> kNames{"found",  "notSeen",     "ambiguous",   "unknownPerson",
+                                                 "hidden", "unreachable", "notSignedIn", "notUnderstood",
+                                                 "locked", "refused"};
     return kNames.at(static_cast<std::size_t>(outcome));
 }
 
 const char* nameOf(Action::Kind kind) {
-    constexpr std::array<const char*, 8> kNames{"none",   "chooseOne",    "didYouMean", "signIn", "tryAgain",
-                                                "unlock", "askOtherwise", "askToShare"};
+    constexpr std::array<const char*, 8> kNames{"none",     "chooseOne", "didYouMean",   "signIn",
+                                                "tryAgain", "unlock",    "askOtherwise", "askToShare"};
     return kNames.at(static_cast<std::size_t>(kind));
 }
 

@@ -47,7 +47,8 @@ struct Answer {
     platform::Value snippet;
     std::vector<Choice> choices;           ///< at most 50
     std::vector<std::string> suggestions;  ///< questions that can be asked instead, at most three
-    /// Those who were asked about and cannot be seen, whatever the reason; at most five. Their question asks them to share.
+    /// Those who were asked about and cannot be seen, whatever the reason; at most five. Their question asks them to
+    /// share.
     std::vector<Choice> unseen;
     Action action;
     std::optional<double> ageSeconds;  ///< of the oldest place that the sentence names

@@ -64,9 +64,9 @@ void Asking::addChoices(Answer& answer, const std::string& said, const std::vect
         if (answer.choices.size() == kMostChoices) {
             return;
         }
-        answer.choices.push_back({person->shownName(), person->handle(),
-                                  replaced(question.text, said,
-                                           person->handle().empty() ? person->shownName() : person->handle())});
+        answer.choices.push_back(
+            {person->shownName(), person->handle(),
+             replaced(question.text, said, person->handle().empty() ? person->shownName() : person->handle())});
     }
 }
 

@@ -44,7 +44,8 @@ std::vector<WhereAnswers::Place> placesIn(const Dictionary& answer) {
 bool needsPlaces(const Understood& understood) {
     const Wish wish = understood.meaning.wish;
     return (wish == Wish::NearPlace || wish == Wish::Closest || wish == Wish::IsAt) &&
-           !(understood.meaning.place.empty() && understood.placeWord.empty()) && understood.placeWord != "me" && understood.placePerson == nullptr;
+           !(understood.meaning.place.empty() && understood.placeWord.empty()) && understood.placeWord != "me" &&
+           understood.placePerson == nullptr;
 }
 
 }  // namespace
@@ -59,7 +60,8 @@ std::shared_ptr<const People> Engine::Crowd::people() {
     return people_;
 }
 
-Engine::Begun Engine::begun(const Question& question, Languages& languages, Crowd& crowd, const World& world, bool isLocked) {
+Engine::Begun Engine::begun(const Question& question, Languages& languages, Crowd& crowd, const World& world,
+                            bool isLocked) {
     const auto asking = std::make_shared<Asking>();
     asking->question = question;
     asking->people = crowd.people();
@@ -204,14 +206,18 @@ void Engine::read(const Shared& asking, const Completion& completion) {
     });
 }
 
-void Engine::readPlaces(const Shared& asking, std::vector<Sight> sights, Dictionary answer, const Completion& completion) {
-    service_.send("places", {}, [asking, sights = std::move(sights), answer = std::move(answer), completion](const ServiceReply& reply) {
-        // A service that knows no places still knows where friends are.
-        if (reply.failure == ServiceReply::Failure::NotSignedIn || reply.failure == ServiceReply::Failure::Unreachable) {
-            return completion(asking->failed(reply.failure));
-        }
-        completion(WhereAnswers(*asking, sights, answer).answer(placesIn(reply.body)));
-    });
+void Engine::readPlaces(const Shared& asking, std::vector<Sight> sights, Dictionary answer,
+                        const Completion& completion) {
+    service_.send(
+        "places", {},
+        [asking, sights = std::move(sights), answer = std::move(answer), completion](const ServiceReply& reply) {
+            // A service that knows no places still knows where friends are.
+            if (reply.failure == ServiceReply::Failure::NotSignedIn ||
+                reply.failure == ServiceReply::Failure::Unreachable) {
+                return completion(asking->failed(reply.failure));
+            }
+            completion(WhereAnswers(*asking, sights, answer).answer(placesIn(reply.body)));
+        });
 }
 
 void Engine::wish(const Shared& asking, const Completion& completion) {

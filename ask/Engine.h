@@ -18,8 +18,8 @@
 
 namespace ktr::ask {
 
-/// Answers questions: understands them here, by templates and contacts, asks the service what only that knows, and says it in
-/// one honest sentence. The same question gets the same answer wherever it is asked. Main thread.
+/// Answers questions: understands them here, by templates and contacts, asks the service what only that knows, and says
+/// it in one honest sentence. The same question gets the same answer wherever it is asked. Main thread.
 class Engine {
   public:
     using Completion = std::function<void(Answer)>;
@@ -35,12 +35,12 @@ class Engine {
     void setPeople(std::vector<Person> people) { crowd_ = std::make_shared<Crowd>(std::move(people)); }
     std::shared_ptr<const People> people() const { return crowd_->people(); }
 
-    /// Calls the completion exactly once, perhaps inside the call, and not after this is gone. Languages are read, people
-    /// sorted and the question understood elsewhere, where the world has an elsewhere. `understood` hears what the service
-    /// is asked for, just before it is.
+    /// Calls the completion exactly once, perhaps inside the call, and not after this is gone. Languages are read,
+    /// people sorted and the question understood elsewhere, where the world has an elsewhere. `understood` hears what
+    /// the service is asked for, just before it is.
     void ask(const Question& question, const Completion& completion, const Meant& understood = nullptr);
-    /// The answer as far as it needs no service: not understood, unknown, ambiguous, locked, refused. None: the service has
-    /// to be asked.
+    /// The answer as far as it needs no service: not understood, unknown, ambiguous, locked, refused. None: the service
+    /// has to be asked.
     std::optional<Answer> answerHere(const Question& question);
     /// The same, or what the question says where the service has to be asked. What it points to is of `people`.
     std::variant<Answer, Understood> readHere(const Question& question);
@@ -69,7 +69,8 @@ class Engine {
     void goOn(Begun begun, const Completion& completion, const Meant& understood);
     bool isLocked() const { return world_.isLocked && world_.isLocked(); }
     void read(const Shared& asking, const Completion& completion);
-    void readPlaces(const Shared& asking, std::vector<Sight> sights, platform::Dictionary answer, const Completion& completion);
+    void readPlaces(const Shared& asking, std::vector<Sight> sights, platform::Dictionary answer,
+                    const Completion& completion);
     void wish(const Shared& asking, const Completion& completion);
     /// Asks for the handles from `from` on, as many requests as it takes, then goes on with all entries in one answer.
     void gather(const Shared& asking, std::shared_ptr<const std::vector<std::string>> handles, std::size_t from,

@@ -48,8 +48,8 @@ bool isPartOfWord(char32_t c) {
     const auto code = static_cast<UChar32>(c);
     const int type = u_charType(code);
     // The mark in the place of what cannot be read stays: it makes no name of another.
-    return u_isalnum(code) || type == U_NON_SPACING_MARK || type == U_COMBINING_SPACING_MARK || c == U'\'' || c == U'@' ||
-           c == U'+' || c == U'_' || c == 0xFFFD;
+    return u_isalnum(code) || type == U_NON_SPACING_MARK || type == U_COMBINING_SPACING_MARK || c == U'\'' ||
+           c == U'@' || c == U'+' || c == U'_' || c == 0xFFFD;
 }
 
 /// A sign that belongs to a word between two letters or digits: in addresses, numbers, double names, times of day.

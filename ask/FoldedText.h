@@ -7,8 +7,8 @@
 namespace ktr::ask {
 
 /// A text as questions, templates and names are compared: in lower case, without accents and punctuation, one form for
-/// letters that are written in several ways, one blank between words, none at the ends and none beside a letter of a script
-/// that is written without blanks. Each letter knows where it stood. Any thread.
+/// letters that are written in several ways, one blank between words, none at the ends and none beside a letter of a
+/// script that is written without blanks. Each letter knows where it stood. Any thread.
 class FoldedText {
   public:
     /// Broken UTF-8 is read as far as it goes, with a mark in the place of what is broken.
@@ -16,7 +16,8 @@ class FoldedText {
 
     const std::u32string& letters() const { return letters_; }
     bool empty() const { return letters_.empty(); }
-    /// The part of the original text behind the letters from `begin` to `end`, without blanks and punctuation around it.
+    /// The part of the original text behind the letters from `begin` to `end`, without blanks and punctuation around
+    /// it.
     std::string original(std::size_t begin, std::size_t end) const;
 
     /// The letters alone.

@@ -13,8 +13,8 @@
 
 namespace ktr::ask {
 
-/// Templates compiled into one automaton that reads a text once, whatever it is: the work is bounded by the product of its
-/// lengths. Immutable once it is compiled; any thread.
+/// Templates compiled into one automaton that reads a text once, whatever it is: the work is bounded by the product of
+/// its lengths. Immutable once it is compiled; any thread.
 class Grammar {
   public:
     /// What a template leaves open. A letter of it is no evidence for the template.
@@ -38,7 +38,7 @@ class Grammar {
     };
     /// One way to read a text as a whole.
     struct Reading {
-        std::uint32_t group = 0;  ///< of the template
+        std::uint32_t group = 0;   ///< of the template
         std::int32_t letters = 0;  ///< that the template named: the more, the surer
         std::array<Span, kSlots> slots;
         std::array<std::int8_t, kLists> values{-1, -1, -1, -1};  ///< which of a list's; -1: none
@@ -47,8 +47,8 @@ class Grammar {
     /// By list: a part for each value.
     using Lists = std::array<std::vector<Template::Part>, kLists>;
 
-    /// Slots and lists are written by these names: "name", "place", "time", "hour", "minute", "count"; "precision", "every",
-    /// "spot", "now".
+    /// Slots and lists are written by these names: "name", "place", "time", "hour", "minute", "count"; "precision",
+    /// "every", "spot", "now".
     Grammar(Rules rules, Lists lists);
     /// Empty, or what is wrong: an unknown slot or rule, a rule that uses itself, too much of it.
     std::string add(std::uint32_t group, const Template::Part& part);
@@ -63,7 +63,7 @@ class Grammar {
         Kind kind = Kind::Split;
         std::uint8_t which = 0;  ///< slot or list
         std::int8_t value = 0;
-        char32_t letter = 0;      ///< or the group of an acceptance
+        char32_t letter = 0;  ///< or the group of an acceptance
         std::vector<std::uint32_t> next = {};
     };
     class Run;

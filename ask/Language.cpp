@@ -104,8 +104,8 @@ std::optional<std::filesystem::path> Language::fileFor(const std::string& tag, c
     return std::nullopt;
 }
 
-std::variant<std::shared_ptr<const Language>, documents::DocumentError> Language::read(const std::filesystem::path& file,
-                                                                                       const std::string& tag) {
+std::variant<std::shared_ptr<const Language>, documents::DocumentError> Language::read(
+    const std::filesystem::path& file, const std::string& tag) {
     const std::shared_ptr<Language> language(new Language(tag));
     documents::FileReader::Terms terms;
     terms.most = kLargestFile;

@@ -16,8 +16,8 @@
 
 namespace ktr::ask {
 
-/// All that asking and answering needs to know of one language, read from resources/questions (docs/asking.md). Immutable;
-/// any thread.
+/// All that asking and answering needs to know of one language, read from resources/questions (docs/asking.md).
+/// Immutable; any thread.
 class Language {
   public:
     /// What a time of day is said by.

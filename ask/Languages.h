@@ -14,8 +14,8 @@ namespace ktr::ask {
 class Languages {
   public:
     explicit Languages(std::filesystem::path folder) : folder_(std::move(folder)) {}
-    /// The language that serves a tag (BCP 47); English for one that there is no file for. None: not even that can be read,
-    /// with the reason in `problem`.
+    /// The language that serves a tag (BCP 47); English for one that there is no file for. None: not even that can be
+    /// read, with the reason in `problem`.
     std::shared_ptr<const Language> language(const std::string& tag);
     /// What was wrong with a file; empty when nothing was.
     std::string problem() const;

@@ -6,8 +6,9 @@ namespace ktr::ask {
 
 namespace {
 
-constexpr std::array<const char*, 14> kWishes{"WhereIs", "WhereAll",    "HowFar",     "IsAt",    "NearMe", "NearPlace", "Closest",
-                                              "TellArrives", "TellLeaves", "TellNow", "Hide",   "Share",     "WhoSees", "AskToShare"};
+constexpr std::array<const char*, 14> kWishes{"WhereIs",   "WhereAll", "HowFar",      "IsAt",       "NearMe",
+                                              "NearPlace", "Closest",  "TellArrives", "TellLeaves", "TellNow",
+                                              "Hide",      "Share",    "WhoSees",     "AskToShare"};
 constexpr std::array<const char*, 4> kPrecisions{"exact", "1km", "town", "places"};
 
 template <class Enumeration, std::size_t kCount>

@@ -27,16 +27,17 @@ enum class Wish {
 /// How exactly somebody may be seen.
 enum class Precision { Exact, Kilometre, Town, Places };
 
-/// What a question says, in words: whom and which place it means is for `People` and `Places` to find. All of the question
-/// is in here: what no template has a place for makes it not understood.
+/// What a question says, in words: whom and which place it means is for `People` and `Places` to find. All of the
+/// question is in here: what no template has a place for makes it not understood.
 struct Meaning {
     Wish wish = Wish::WhereIs;
     std::string people;  ///< who it is about, as it was written: a name, or several; empty: nobody is named
     std::string place;   ///< empty: none is named
-    std::string spot;    ///< a place that has a word of its own: "me", "home", "work", "school", "gym"; then `place` is empty
-    std::string until;   ///< until when, as it was written; empty: without an end
+    std::string
+        spot;  ///< a place that has a word of its own: "me", "home", "work", "school", "gym"; then `place` is empty
+    std::string until;  ///< until when, as it was written; empty: without an end
     std::optional<Precision> precision;
-    bool everyTime = false;  ///< of a wish to be told: not only once
+    bool everyTime = false;   ///< of a wish to be told: not only once
     bool thisMoment = false;  ///< where somebody is "right now": what was known before may not be enough
     /// Letters that a template named, and not only a slot took: a question that is nothing but a name has none.
     int certainty = 0;

@@ -102,7 +102,8 @@ std::optional<platform::Date> momentOf(const std::string& words, const Language&
     const double here = now.secondsSinceReferenceDate + secondsFromUtc;
     const double intoDay = here - std::floor(here / kDay) * kDay;
     for (const Grammar::Reading& reading : language.times(text)) {
-        const auto wait = secondsUntil(Words(text, reading, language), static_cast<Language::Time>(reading.group), intoDay);
+        const auto wait =
+            secondsUntil(Words(text, reading, language), static_cast<Language::Time>(reading.group), intoDay);
         if (wait) {
             return platform::Date{now.secondsSinceReferenceDate + *wait};
         }

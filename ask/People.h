@@ -17,8 +17,8 @@
 namespace ktr::ask {
 
 /// Finds people by what somebody calls them: whole name, first or last name, nickname, e-mail address, phone number, a
-/// relative's word ("mum"), in the forms that the language gives names. Never guesses: what fits two people names both, and
-/// what is only near is offered, not taken. Any thread.
+/// relative's word ("mum"), in the forms that the language gives names. Never guesses: what fits two people names both,
+/// and what is only near is offered, not taken. Any thread.
 class People {
   public:
     /// Each person once: entries of one name that share a handle are one.
@@ -43,8 +43,8 @@ class People {
     using Found = std::vector<std::size_t>;
     using Result = std::variant<Found, Ambiguous, Unknown>;
 
-    /// Who a text names: one, or several with the language's "and" between them. `chosen`: a handle; of several who have a
-    /// name, the one with this handle is meant.
+    /// Who a text names: one, or several with the language's "and" between them. `chosen`: a handle; of several who
+    /// have a name, the one with this handle is meant.
     Result find(const std::string& text, const Language& language, const std::string& chosen = {}) const;
 
     static constexpr std::size_t kMostNear = 3;
@@ -62,8 +62,8 @@ class People {
     Numbers relatives(const std::u32string& name, const Language& language) const;
     /// By how names sound in Latin letters, when the scripts differ.
     Numbers transliterated(const std::u32string& name) const;
-    bool findSome(const std::u32string& text, std::size_t begin, std::size_t end, const Language& language, std::size_t left,
-                  std::vector<std::pair<std::size_t, std::size_t>>& pieces) const;
+    bool findSome(const std::u32string& text, std::size_t begin, std::size_t end, const Language& language,
+                  std::size_t left, std::vector<std::pair<std::size_t, std::size_t>>& pieces) const;
     Unknown unknownIn(const FoldedText& folded, std::size_t begin, const Language& language) const;
     Numbers near(const std::u32string& name) const;
 

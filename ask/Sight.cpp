@@ -86,7 +86,8 @@ std::optional<Sight> sightOf(const Dictionary& entry) {
         for (const Value& label : *labels->array()) {
             if (label.dictionary() != nullptr && !textIn(*label.dictionary(), "label").empty()) {
                 const Value* phrase = label.dictionary()->find("phrase");
-                sight.isPhrase = sight.isPhrase || (sight.labels.empty() && phrase != nullptr && phrase->boolean() == true);
+                sight.isPhrase =
+                    sight.isPhrase || (sight.labels.empty() && phrase != nullptr && phrase->boolean() == true);
                 sight.labels.push_back(textIn(*label.dictionary(), "label"));
             }
         }
@@ -184,13 +185,12 @@ std::string Sight::sentence(const Sentences& sentences, const Question& question
     const bool isPresent = this->isPresent(question);
     // Without a time of its own it is known since now at the latest.
     const platform::Date moment = hasTime ? time : question.now;
-    return sentences.text(words.empty() ? "foundNoWords" : "found",
-                          {{"name", person->shownName()},
-                           {"where", words},
-                           {"distance", far},
-                           {"far", far.empty() ? "no" : "yes"},
-                           {"when", isPresent ? "now" : "then"},
-                           {"time", sentences.time(moment, question.now)}});
+    return sentences.text(words.empty() ? "foundNoWords" : "found", {{"name", person->shownName()},
+                                                                     {"where", words},
+                                                                     {"distance", far},
+                                                                     {"far", far.empty() ? "no" : "yes"},
+                                                                     {"when", isPresent ? "now" : "then"},
+                                                                     {"time", sentences.time(moment, question.now)}});
 }
 
 std::vector<Sight> sightsIn(const Dictionary& answer, const std::vector<const Person*>& asked) {

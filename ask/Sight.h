@@ -45,8 +45,8 @@ struct Sight {
     std::string distance(const World& world) const;
 };
 
-/// The friends whom an answer to a get-locations command shows. Entries that are not whole are passed over, and what answers
-/// to no handle that was asked for as well.
+/// The friends whom an answer to a get-locations command shows. Entries that are not whole are passed over, and what
+/// answers to no handle that was asked for as well.
 std::vector<Sight> sightsIn(const platform::Dictionary& answer, const std::vector<const Person*>& asked);
 
 /// A snippet of these, in the form of a scenario; `proximity`: it lists several. The answer's context goes with it.

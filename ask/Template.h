@@ -10,7 +10,8 @@
 
 namespace ktr::ask {
 
-/// A sentence template as it is written (docs/asking.md): words, "[optional]", "(one|other)", "{slot}", "<rule>". Any thread.
+/// A sentence template as it is written (docs/asking.md): words, "[optional]", "(one|other)", "{slot}", "<rule>". Any
+/// thread.
 class Template {
   public:
     /// A part, and what it is made of.

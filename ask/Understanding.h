@@ -23,8 +23,8 @@ struct Understood {
     std::optional<platform::Date> until;
 };
 
-/// Understands questions: by the templates of their language, else of English, and the contacts. It needs no network and
-/// guesses nothing: a reading counts only if all of it can be told. Any thread.
+/// Understands questions: by the templates of their language, else of English, and the contacts. It needs no network
+/// and guesses nothing: a reading counts only if all of it can be told. Any thread.
 class Understanding {
   public:
     /// What can be said before anybody else is asked: `answer` without its sentence's further words.

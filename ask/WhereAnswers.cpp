@@ -20,7 +20,8 @@ std::string joined(const std::vector<std::string>& sentences) {
     std::string all;
     for (const std::string& one : sentences) {
         // Full-width full stops bring their own room.
-        const bool needsBlank = !all.empty() && !one.empty() && all.compare(all.size() - std::min<std::size_t>(3, all.size()), 3, "。") != 0;
+        const bool needsBlank = !all.empty() && !one.empty() &&
+                                all.compare(all.size() - std::min<std::size_t>(3, all.size()), 3, "。") != 0;
         all += (needsBlank ? " " : "") + one;
     }
     return all;
@@ -128,11 +129,13 @@ Answer WhereAnswers::nobodySeen() const {
 
 Answer WhereAnswers::found(std::string sentence, const std::vector<Sight>& sights, bool isList) const {
     Answer answer = asking_.answer(Outcome::Found, std::move(sentence));
-    answer.snippet = snippetOf(sights, answer_, !isList ? nullptr : asking_.understood.meaning.wish == Wish::NearMe ? "nearby" : "friends");
+    answer.snippet = snippetOf(sights, answer_,
+                               !isList                                           ? nullptr
+                               : asking_.understood.meaning.wish == Wish::NearMe ? "nearby"
+                                                                                 : "friends");
     for (const Sight& sight : sights) {
         if (sight.hasTime) {
-            const double age =
-                asking_.question.now.secondsSinceReferenceDate - sight.time.secondsSinceReferenceDate;
+            const double age = asking_.question.now.secondsSinceReferenceDate - sight.time.secondsSinceReferenceDate;
             answer.ageSeconds = std::max(answer.ageSeconds.value_or(0.0), std::max(age, 0.0));
         }
     }
@@ -169,7 +172,8 @@ Answer WhereAnswers::whereAll() const {
     }
     const std::size_t more = sights_.size() - told.size();
     const std::string key = more == 0 ? "seen" : "seenMore";
-    return found(sentences_.text(key, {{"names", sentences_.list(told)}, {"count", std::to_string(more)}}), sights_, true);
+    return found(sentences_.text(key, {{"names", sentences_.list(told)}, {"count", std::to_string(more)}}), sights_,
+                 true);
 }
 
 Answer WhereAnswers::howFar() const {
@@ -180,11 +184,12 @@ Answer WhereAnswers::howFar() const {
     for (const Sight& sight : sights_) {
         const std::string far = sight.distance(asking_.world);
         const platform::Date moment = sight.hasTime ? sight.time : asking_.question.now;
-        told.push_back(far.empty() ? sentences_.text("howFarUnknown", {{"name", nameOf(sight)}})
-                                   : sentences_.text("howFar", {{"name", nameOf(sight)},
-                                                                {"distance", far},
-                                                                {"when", sight.isPresent(asking_.question) ? "now" : "then"},
-                                                                {"time", sentences_.time(moment, asking_.question.now)}}));
+        told.push_back(far.empty()
+                           ? sentences_.text("howFarUnknown", {{"name", nameOf(sight)}})
+                           : sentences_.text("howFar", {{"name", nameOf(sight)},
+                                                        {"distance", far},
+                                                        {"when", sight.isPresent(asking_.question) ? "now" : "then"},
+                                                        {"time", sentences_.time(moment, asking_.question.now)}}));
     }
     told.push_back(askedSentence());
     told.push_back(unseenSentences());
@@ -232,7 +237,8 @@ Answer WhereAnswers::isAt(const std::vector<Place>& ownPlaces) const {
     for (const Sight& sight : sights_) {
         const std::string sort = sight.sort(*asking_.language);
         const bool isSort = !understood.placeWord.empty() && understood.placeWord != "me";
-        const bool isCalled = isSort ? sort == understood.placeWord : understood.placeWord.empty() && sight.isCalled(name);
+        const bool isCalled =
+            isSort ? sort == understood.placeWord : understood.placeWord.empty() && sight.isCalled(name);
         // Whoever is at a place of another sort is not there; of one without a sort nobody can tell.
         const bool canTell = isSort ? !sort.empty() : known.has_value();
         const bool isThere =
@@ -248,7 +254,8 @@ Answer WhereAnswers::isAt(const std::vector<Place>& ownPlaces) const {
 
 Answer WhereAnswers::near(const std::vector<Place>& ownPlaces) const {
     const Understood& understood = asking_.understood;
-    const bool isMine = understood.placeWord == "me" || (understood.meaning.place.empty() && understood.placeWord.empty());
+    const bool isMine =
+        understood.placeWord == "me" || (understood.meaning.place.empty() && understood.placeWord.empty());
     const auto known = place(ownPlaces);
     if (!known) {
         if (understood.placePerson != nullptr) {
@@ -277,7 +284,8 @@ Answer WhereAnswers::near(const std::vector<Place>& ownPlaces) const {
     if (understood.meaning.wish == Wish::Closest && byDistance.size() > 1) {
         byDistance.resize(1);
     } else if (understood.meaning.wish != Wish::Closest) {
-        const auto far = std::find_if(byDistance.begin(), byDistance.end(), [](const auto& one) { return one.first > kNear; });
+        const auto far =
+            std::find_if(byDistance.begin(), byDistance.end(), [](const auto& one) { return one.first > kNear; });
         byDistance.erase(far, byDistance.end());
     }
     if (byDistance.empty()) {
@@ -296,7 +304,8 @@ Answer WhereAnswers::near(const std::vector<Place>& ownPlaces) const {
     bool isPresent = true;
     for (const Sight& sight : sights) {
         isPresent = isPresent && sight.isPresent(asking_.question);
-        oldest = sight.hasTime && sight.time.secondsSinceReferenceDate < oldest.secondsSinceReferenceDate ? sight.time : oldest;
+        oldest = sight.hasTime && sight.time.secondsSinceReferenceDate < oldest.secondsSinceReferenceDate ? sight.time
+                                                                                                          : oldest;
     }
     const char* key = understood.meaning.wish == Wish::Closest ? "closest" : "near";
     return found(text(key, {{"names", sentences_.list(names)},

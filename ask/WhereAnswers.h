@@ -8,8 +8,8 @@
 
 namespace ktr::ask {
 
-/// Answers to questions about where friends are, from what the service said: of those who are asked for, and what it tells of
-/// nobody is never told apart from what it does not know. Any thread.
+/// Answers to questions about where friends are, from what the service said: of those who are asked for, and what it
+/// tells of nobody is never told apart from what it does not know. Any thread.
 class WhereAnswers {
   public:
     /// Metres around a place that count as near it, and within which somebody is at it.

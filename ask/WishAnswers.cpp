@@ -88,7 +88,8 @@ std::pair<std::string, Dictionary> WishAnswers::request() const {
             }
         } else if (!meaning.place.empty() || !understood.placeWord.empty()) {
             // A person's own place goes by its sort.
-            members.set("place", Dictionary{{"name", understood.placeWord.empty() ? meaning.place : understood.placeWord}});
+            members.set("place",
+                        Dictionary{{"name", understood.placeWord.empty() ? meaning.place : understood.placeWord}});
         }
         members.set("once", !meaning.everyTime);
         return {"setFence", members};
@@ -102,8 +103,8 @@ std::pair<std::string, Dictionary> WishAnswers::request() const {
         members.set("with", with);
     }
     if (understood.until) {
-        members.set("until",
-                    (understood.until->secondsSinceReferenceDate + platform::kSecondsFrom1970ToReferenceDate) * kMillisecondsASecond);
+        members.set("until", (understood.until->secondsSinceReferenceDate + platform::kSecondsFrom1970ToReferenceDate) *
+                                 kMillisecondsASecond);
     }
     if (meaning.precision) {
         members.set("precision", nameOf(*meaning.precision));
@@ -114,10 +115,10 @@ std::pair<std::string, Dictionary> WishAnswers::request() const {
 Answer WishAnswers::done(const Dictionary& answer) const {
     if (asking_.understood.meaning.wish == Wish::AskToShare) {
         // Whether anybody was there to be asked is said to nobody.
-        return asking_.answer(Outcome::Found,
-                              sentences_.text("askedToShare", {{"name", names()},
-                                                               {"time", sentences_.time(asking_.question.now,
-                                                                                        asking_.question.now)}}));
+        return asking_.answer(
+            Outcome::Found,
+            sentences_.text("askedToShare", {{"name", names()},
+                                             {"time", sentences_.time(asking_.question.now, asking_.question.now)}}));
     }
     return isFence() ? fence(answer) : sharing(answer);
 }
@@ -143,10 +144,11 @@ Answer WishAnswers::sharing(const Dictionary& answer) const {
     std::string sentence;
     if (!understood.people.empty()) {
         const bool shares = understood.meaning.wish == Wish::Share;
-        sentence = sentences_.text(shares ? "sharedWith" : "hiddenFrom",
-                                   {{"names", names()},
-                                    {"end", understood.until ? "yes" : "no"},
-                                    {"time", understood.until ? sentences_.time(*understood.until, asking_.question.now) : ""}});
+        sentence = sentences_.text(
+            shares ? "sharedWith" : "hiddenFrom",
+            {{"names", names()},
+             {"end", understood.until ? "yes" : "no"},
+             {"time", understood.until ? sentences_.time(*understood.until, asking_.question.now) : ""}});
         if (shares && isHidden) {
             sentence += " " + sentences_.text("youAreHidden");
         }
@@ -155,17 +157,20 @@ Answer WishAnswers::sharing(const Dictionary& answer) const {
     } else if (understood.meaning.wish != Wish::WhoSees) {
         sentence = sentences_.text("youAreShown");
     } else {
-        sentence = sentences_.text(viewers.empty() ? "nobodySeesYou" : "whoSees", {{"names", sentences_.list(viewers)}});
+        sentence =
+            sentences_.text(viewers.empty() ? "nobodySeesYou" : "whoSees", {{"names", sentences_.list(viewers)}});
     }
     const bool tellsHidden = isHidden && understood.meaning.wish == Wish::WhoSees;
     Answer done = asking_.answer(tellsHidden ? Outcome::Hidden : Outcome::Found, sentence);
     Dictionary more;
-    if (const Dictionary* mine = objectIn(answer, "myInfo"); mine != nullptr && !textIn(*mine, "preferredEmail").empty()) {
+    if (const Dictionary* mine = objectIn(answer, "myInfo");
+        mine != nullptr && !textIn(*mine, "preferredEmail").empty()) {
         more.set("preferredEmail", textIn(*mine, "preferredEmail"));
     }
     // Who shares with one friend has a sentence; the card is about all of them.
     if (understood.people.empty()) {
-        done.snippet = Dictionary{{"kind", "VAKtrVisibilityView"}, {"searchContext", contextOf(answer, more)}, {"visible", !isHidden}};
+        done.snippet = Dictionary{
+            {"kind", "VAKtrVisibilityView"}, {"searchContext", contextOf(answer, more)}, {"visible", !isHidden}};
     }
     return done;
 }
@@ -183,7 +188,8 @@ Answer WishAnswers::fence(const Dictionary& answer) const {
         const Value* value = place->find(name);
         return value == nullptr ? 0.0 : value->number().value_or(0.0);
     };
-    Dictionary location{{"latitude", number("latitude")}, {"longitude", number("longitude")}, {"accuracy", number("radius")}};
+    Dictionary location{
+        {"latitude", number("latitude")}, {"longitude", number("longitude")}, {"accuracy", number("radius")}};
     for (const char* name : {"name", "label"}) {
         if (const std::string text = textIn(*place, name); !text.empty()) {
             location.set("label", text);
