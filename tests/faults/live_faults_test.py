@@ -122,7 +122,7 @@ class LiveFaultsTest(Faults):
             self.assert_kept(result)
             if result.returncode != 0:
                 return
-            for shown in (r"Here is where they are\.", "Ann Marsh, Place: ", r"Otto Brandt, Place: Work, [\d.]+\s\w+\saway"):
+            for shown in (r"Ann Marsh was at home, ", "Ann Marsh, Place: ", r"Otto Brandt, Place: Work, [\d.]+\s\w+\saway"):
                 if not re.search(shown, result.stdout):
                     self.assert_says_why(result)
 
