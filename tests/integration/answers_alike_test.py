@@ -1,5 +1,5 @@
-"""One question, one answer: in the terminal, from a voice client, on an assistant's bus and in the desktop's search, in every
-language, against the real programs and a real service."""
+"""One question, one answer: in the terminal, from a voice client, on an assistant's bus and in the desktop's search, in some
+languages, with KTR_LONG_TESTS=1 in every one, against the real programs and a real service."""
 import html
 import json
 import os
@@ -19,6 +19,8 @@ from service_program import ServiceProgram
 
 SERVICE, KTR = sys.argv[1:3]
 SOURCE = pathlib.Path(os.environ["KTR_SOURCE"])
+LONG = bool(os.environ.get("KTR_LONG_TESTS"))
+SOME = ("en", "ja", "pl")
 LANGUAGES = sorted(file.stem for file in (SOURCE / "resources" / "questions").glob("*.json"))
 NAME, PATH, SHELL, RUNNER = "org.ktr.ktr.Search", "/org/ktr/ktr/Search", "org.gnome.Shell.SearchProvider2", "org.kde.krunner1"
 VCARD = "BEGIN:VCARD\r\nVERSION:3.0\r\nN:{1};{0};;;\r\nFN:{0} {1}\r\nEMAIL:{2}@x.example\r\nEND:VCARD\r\n"
@@ -113,10 +115,10 @@ class AnswersAlikeTest(unittest.TestCase):
         self.assertEqual(str(meta["description"]), text)
         return text
 
-    def test_in_every_language_the_same_question_has_one_answer(self):
+    def test_the_same_question_has_one_answer(self):
         self.assertEqual(len(LANGUAGES), 21)
         connection = self.session.connect()
-        for language in LANGUAGES:
+        for language in LANGUAGES if LONG else SOME:
             suggestions = json.loads((SOURCE / "resources" / "questions" / f"{language}.json").read_text())["suggestions"]
             search = self.start(KTR, "search", "--language", language)
             while not connection.name_has_owner(NAME):

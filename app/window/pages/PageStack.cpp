@@ -33,6 +33,7 @@ void PageStack::open(std::unique_ptr<Page> page) {
         // Its parts would keep the mouse's key, and fields the arrows, to themselves.
         QCoreApplication::instance()->installEventFilter(this);
     }
+    setAttribute(Qt::WA_TransparentForMouseEvents, false);
     Page* opened = page.release();
     open_.push_back({opened, window()->focusWidget()});
     opened->setParent(this);
@@ -91,7 +92,10 @@ void PageStack::take(bool isAll) {
     }
     // What it calls from within itself may go on.
     gone->setLeave(nullptr);
+    // Who presses now means what appears, not what fades.
+    gone->setAttribute(Qt::WA_TransparentForMouseEvents);
     if (open_.empty()) {
+        setAttribute(Qt::WA_TransparentForMouseEvents);
         QCoreApplication::instance()->removeEventFilter(this);
         showBelow(true);
     } else {

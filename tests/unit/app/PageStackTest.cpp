@@ -82,6 +82,23 @@ TEST_F(KTRPageStackTest, OpenPage_HidesWhatLiesBelowTakesTheFocusAndIsSaid) {
     EXPECT_EQ(heard(), QStringLiteral("Settings"));
 }
 
+TEST_F(KTRPageStackTest, PageThatFades_TakesNoPress) {
+    stack.setMotion(host::MotionStyle::Full);
+    below.resize(window.size());
+    open(QStringLiteral("Settings"));
+    TestPage& second = open(QStringLiteral("Maps"));
+    const QPoint middle(200, 350);
+    ASSERT_TRUE(second.isAncestorOf(window.childAt(middle)) || window.childAt(middle) == &second);
+    stack.back();
+    ASSERT_TRUE(second.isVisible()) << "it does not fade";
+    EXPECT_FALSE(second.isAncestorOf(window.childAt(middle)) || window.childAt(middle) == &second);
+    EXPECT_TRUE(stack.isAncestorOf(window.childAt(middle))) << "the first page is there";
+    stack.back();
+    EXPECT_EQ(window.childAt(middle), &below);
+    open(QStringLiteral("Settings"));
+    EXPECT_TRUE(stack.isAncestorOf(window.childAt(middle)));
+}
+
 TEST_F(KTRPageStackTest, EveryWayBack_LeadsToTheConversationAndItsFocus) {
     for (int way = 0; way < 5; ++way) {
         below.setFocus();
