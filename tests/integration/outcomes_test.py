@@ -3,10 +3,12 @@
 accessibility bus of a session of its own. The same question gets the same answer. Skipped without a virtual display, a session
 bus and pyatspi."""
 
+import contextlib
 import json
 import os
 import re
 import shutil
+import sqlite3
 import subprocess
 import sys
 import tempfile
@@ -64,30 +66,43 @@ class OutcomesTest(unittest.TestCase):
                               text=True, timeout=60, check=False)
         return done.returncode, json.loads(done.stdout)
 
-    def texts(self, process):
-        """All that the window of this program says, and the names of what can be pressed in it."""
+    def nodes(self, process):
+        """Everything in the window of this program."""
         import pyatspi
 
-        texts, links = [], []
-
         def walk(node):
-            name = node.name.replace("\u00a0", " ")
-            (links if node.getRoleName() == "link" else texts).append(name)
+            yield node
             for child in node:
                 if child is not None:
-                    walk(child)
+                    yield from walk(child)
 
         for program in pyatspi.Registry.getDesktop(0):
             if program is not None and program.get_process_id() == process.pid:
-                walk(program)
+                yield from walk(program)
+
+    def texts(self, process):
+        """All that the window of this program says, and the names of what can be pressed in it."""
+        texts, links = [], []
+        for node in self.nodes(process):
+            (links if node.getRoleName() == "link" else texts).append(node.name.replace("\u00a0", " "))
         return texts, links
 
-    def shown(self, environment, questions, sentences):
-        """The same from one window, once it has said all of this."""
+    def press(self, process, name):
+        action = next(node for node in self.nodes(process) if node.getRoleName() == "link" and node.name == name).queryAction()
+        action.doAction([action.getName(i) for i in range(action.nActions)].index("Press"))
+
+    def open(self, environment, questions):
         program = subprocess.Popen([KTR, "show", "--language", "en-GB", "--reduced-motion",
                                     *(word for question in questions for word in ("--ask", question))], env=environment)
         self.addCleanup(program.wait)
         self.addCleanup(program.kill)
+        return program
+
+    def shown(self, environment, questions, sentences):
+        """The same from one window, once it has said all of this."""
+        return self.said_by(self.open(environment, questions), sentences)
+
+    def said_by(self, program, sentences):
         deadline = time.monotonic() + 60
         said = ([], [])
         while time.monotonic() < deadline:
@@ -129,6 +144,33 @@ class OutcomesTest(unittest.TestCase):
             self.assertIn(f"Ask {name} Unseen to share", links)
         for choice in ("Max Weber", "Max Stone", "See all friends", *answers["Tell me a joke"]["suggestions"]):
             self.assertIn(choice, links)
+
+    def test_what_is_offered_is_done(self):
+        """A choice asks about the one who was chosen, a suggestion is asked, and a wish to be shared with is sent."""
+        environment = self.configure()
+        stone = self.asked(environment, "Where is Max Stone?")[1]
+        joke = self.asked(environment, "Tell me a joke")[1]
+        unseen = self.asked(environment, "Where is Hana?")[1]
+        program = self.open(environment, ["Where is Max?", "Tell me a joke", "Where is Hana?"])
+        texts, links = self.said_by(program, [joke["sentence"], unseen["sentence"]])
+        self.assertIn("Max Stone", links)
+        self.assertFalse(any(stone["sentence"] in text for text in texts), texts)
+        self.press(program, "Max Stone")
+        texts, _ = self.said_by(program, [stone["sentence"]])
+        self.assertTrue(any(stone["sentence"] in text for text in texts), texts)
+        self.press(program, joke["suggestions"][0])
+        texts, _ = self.said_by(program, [joke["suggestions"][0]])
+        self.assertIn(joke["suggestions"][0], texts, "it stands as a question now")
+        self.press(program, "Ask Hana Unseen to share")
+        deadline = time.monotonic() + 30
+        while not self.asks() and time.monotonic() < deadline:
+            time.sleep(0.2)
+        self.assertEqual(self.asks(), ["hana@x.example"])
+
+    def asks(self):
+        """Of whom the service was asked that they share."""
+        with contextlib.closing(sqlite3.connect(self.folder / "data" / "service.db")) as database:
+            return [handle for handle, in database.execute("SELECT handle FROM ask")]
 
     def test_user_who_hides(self):
         environment = self.configure()
