@@ -8,7 +8,9 @@
 #include <QPointingDevice>
 #include <QTouchEvent>
 #include <QWheelEvent>
+#include <algorithm>
 #include <memory>
+#include <mutex>
 
 #include "app/window/ConversationWindow.h"
 #include "app/window/friend/FriendsPage.h"
@@ -34,9 +36,10 @@ class FriendPageTest : public ::testing::Test {
         options.language = language;
         host = testHost(options, demoScenarios(names), host::Host::Time::Running);
         ASSERT_TRUE(host);
-        desktop = std::make_unique<linux_::DesktopOpener>(QString(), [this](const std::string& url) {
-            opened.push_back(url);
-            return desktopOpens;
+        desktop = std::make_unique<linux_::DesktopOpener>(QString(), [log = log](const std::string& url) {
+            const std::lock_guard lock(log->mutex);
+            log->opened.push_back(url);
+            return log->opens;
         });
         window = std::make_unique<ConversationWindow>(*host);
         window->openLinks(*desktop);
@@ -96,8 +99,23 @@ class FriendPageTest : public ::testing::Test {
     std::unique_ptr<host::Host> host;
     std::unique_ptr<linux_::DesktopOpener> desktop;
     std::unique_ptr<ConversationWindow> window;
-    std::vector<std::string> opened;
-    bool desktopOpens = true;
+    /// What the desktop was asked to open, on threads of its own that may outlive a test.
+    struct Log {
+        std::mutex mutex;
+        std::vector<std::string> opened;
+        bool opens = true;
+    };
+    std::vector<std::string> opened() const {
+        const std::lock_guard lock(log->mutex);
+        std::vector<std::string> all = log->opened;
+        std::sort(all.begin(), all.end());
+        return all;
+    }
+    void setDesktopOpens(bool opens) const {
+        const std::lock_guard lock(log->mutex);
+        log->opens = opens;
+    }
+    std::shared_ptr<Log> log = std::make_shared<Log>();
 };
 
 TEST_F(FriendPageTest, ATapOnARowOpensItsFriend_WithThePluginsOwnRow) {
@@ -115,7 +133,7 @@ TEST_F(FriendPageTest, ATapOnARowOpensItsFriend_WithThePluginsOwnRow) {
     EXPECT_NEAR(tip.x, 200.0, 1.0);
     EXPECT_GT(tip.y, 100.0);
     EXPECT_LT(tip.y, page()->sheet().geometry().top());
-    EXPECT_TRUE(opened.empty());
+    EXPECT_TRUE(opened().empty());
 }
 
 TEST_F(FriendPageTest, TheWayBackLeadsToTheConversation) {
@@ -186,11 +204,11 @@ TEST_F(FriendPageTest, CallWriteMapsAndCopy_AreMadeOfTheContactAndThePlace) {
         names.push_back(sheet.action(i)->accessibleName());
         sheet.action(i)->press();
     }
-    ASSERT_TRUE(eventually([&] { return opened.size() >= names.size() - 1; }));
-    std::sort(opened.begin(), opened.end());
-    ASSERT_GE(opened.size(), 2u);
-    EXPECT_TRUE(opened[0].starts_with("geo:50.2")) << opened[0];
-    EXPECT_EQ(opened[1], "mailto:ann@harbour.example");
+    ASSERT_TRUE(eventually([&] { return opened().size() >= names.size() - 1; }));
+    const auto urls = opened();
+    ASSERT_GE(urls.size(), 2u);
+    EXPECT_TRUE(urls[0].starts_with("geo:50.2")) << urls[0];
+    EXPECT_EQ(urls[1], "mailto:ann@harbour.example");
     const QString copied = QApplication::clipboard()->text();
     EXPECT_NE(copied.indexOf(QStringLiteral("50.2")), -1) << copied.toStdString();
     EXPECT_EQ(sheet.action(names.size() - 1)->accessibleName(), QStringLiteral("Copied"));
@@ -198,7 +216,7 @@ TEST_F(FriendPageTest, CallWriteMapsAndCopy_AreMadeOfTheContactAndThePlace) {
 
 TEST_F(FriendPageTest, WhereNobodyOpensAPlaceTheWindowSaysSo) {
     open({"single"});
-    desktopOpens = false;
+    setDesktopOpens(false);
     host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
     window->open("https://brin.example/", LinkPolicy::From::Outside);
     ASSERT_TRUE(eventually([&] { return !window->notice().sentence().isEmpty(); }));
@@ -210,7 +228,7 @@ TEST_F(FriendPageTest, NothingElseIsOpened_AndThatIsSaid) {
     EXPECT_FALSE(host->delegate().open(platform::Url("tel:+441632960018")));
     window->open("file:///etc/passwd", LinkPolicy::From::Outside);
     settle();
-    EXPECT_TRUE(opened.empty());
+    EXPECT_TRUE(opened().empty());
     EXPECT_FALSE(window->pages().isOpen());
     EXPECT_EQ(window->notice().sentence(), QStringLiteral("This link isn’t opened here."));
 }
@@ -236,7 +254,7 @@ TEST_F(FriendPageTest, NoHandleLeadsToOnesOwnPage_TheListToAll) {
     window->pages().back();
     host->delegate().open(platform::Url("wayloc://friends/"));
     EXPECT_NE(dynamic_cast<FriendsPage*>(window->pages().current()), nullptr);
-    EXPECT_TRUE(opened.empty());
+    EXPECT_TRUE(opened().empty());
 }
 
 TEST_F(FriendPageTest, AFriendWithoutAPlaceHasNoPin_AndASentence) {
