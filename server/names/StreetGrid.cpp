@@ -104,7 +104,7 @@ void StreetGrid::sortIntoCells() {
             const double bottom = row == kSide - 1 ? std::numeric_limits<double>::infinity() : (row + 1) * kCell;
             const auto [begin, end] = shareBetween(segment.fromY, segment.toY, top, bottom);
             const double width = segment.toX - segment.fromX;
-            const auto [left, right] = std::minmax(segment.fromX + begin * width, segment.fromX + end * width);
+            const auto [left, right] = std::minmax({segment.fromX + begin * width, segment.fromX + end * width});
             const int lastColumn = cellOf(right);
             for (int column = cellOf(left); column <= lastColumn; ++column) {
                 touched.emplace_back(static_cast<std::uint16_t>(row * kSide + column), number);
