@@ -306,10 +306,11 @@ TEST(NameDeskTest, OtherMaps_AreUsedFromTheNextQuestionOn) {
 }
 
 TEST(NameDeskTest, WhoComesToADeskThatIsOverrun_IsToldCoordinatesAtOnce) {
-    NameDesk desk({});
     std::promise<void> go, begun;
     std::shared_future<void> gone = go.get_future().share();
     std::atomic<int> told = 0;
+    // Its thread uses them until it has ended.
+    NameDesk desk({});
     // The first holds the desk up.
     desk.ask({}, kEnglish, [&](const std::vector<PlaceName>&) {
         begun.set_value();
