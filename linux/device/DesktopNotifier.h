@@ -24,7 +24,7 @@ class DesktopNotifier : public QObject {
         std::string tag;  ///< tells it from others; letters, digits and hyphens
         std::string title;
         std::string body;  ///< plain text
-        /// Tells it from others to a server, over restarts of this program. A server that heeds the specification gives
+        /// Tells it from others to a server, over restarts of this program. A server that keeps to the standard gives
         /// back what it was given, and replaces what it shows so already. 0: the server chooses.
         std::uint32_t number = 0;
     };

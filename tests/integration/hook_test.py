@@ -281,7 +281,7 @@ class NotificationTest(WatchCase):
         self.environment["DBUS_SESSION_BUS_ADDRESS"] = self.bus("session")
         self.environment["DBUS_SYSTEM_BUS_ADDRESS"] = self.bus("system")
         self.shown = self.folder / "shown"
-        # As the specification has it: what replaces one has its number.
+        # As desktops agreed: what replaces one has its number.
         with self.shown.open("w") as out:
             self.mock("--session", NOTIFICATIONS, PATH, NOTIFICATIONS, stdout=out)
         self.tell("session", NOTIFICATIONS, PATH, "AddMethod", NOTIFICATIONS, "Notify", "susssasa{sv}i", "u",
