@@ -171,7 +171,7 @@ void Engine::gather(const Shared& asking, std::shared_ptr<const std::vector<std:
     if (asking->understood.meaning.thisMoment && asking->question.mayChange && !asking->understood.people.empty()) {
         members.set("fresh", true);
     }
-    service_.send("getlocations", members, [this, asking, handles, end, gathered, then](ServiceReply reply) {
+    service_.send({"getlocations", members, asking->language->tag()}, [this, asking, handles, end, gathered, then](ServiceReply reply) {
         if (reply.failure != ServiceReply::Failure::None) {
             return then(std::move(reply));
         }
@@ -209,7 +209,7 @@ void Engine::read(const Shared& asking, const Completion& completion) {
 void Engine::readPlaces(const Shared& asking, std::vector<Sight> sights, Dictionary answer,
                         const Completion& completion) {
     service_.send(
-        "places", {},
+        {"places", {}, asking->language->tag()},
         [asking, sights = std::move(sights), answer = std::move(answer), completion](const ServiceReply& reply) {
             // A service that knows no places still knows where friends are.
             if (reply.failure == ServiceReply::Failure::NotSignedIn ||
@@ -226,7 +226,7 @@ void Engine::wish(const Shared& asking, const Completion& completion) {
         return completion(*impossible);
     }
     const auto [command, members] = wishes.request();
-    service_.send(command, members, [asking, completion](const ServiceReply& reply) {
+    service_.send({command, members, asking->language->tag()}, [asking, completion](const ServiceReply& reply) {
         switch (reply.failure) {
             case ServiceReply::Failure::None:
                 return completion(WishAnswers(*asking).done(reply.body));

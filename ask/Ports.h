@@ -20,14 +20,22 @@ struct ServiceReply {
     platform::Dictionary body = {};
 };
 
+/// A typed request (docs/service-protocol.md).
+struct ServiceRequest {
+    std::string command;
+    platform::Dictionary members = {};  ///< beside "clientContext"
+    /// BCP 47: of the labels in its answer; empty: the assistant's.
+    std::string language = {};
+};
+
 /// The way to the user's service. Main thread.
 class ServicePort {
   public:
     using Completion = std::function<void(ServiceReply)>;
     virtual ~ServicePort() = default;
-    /// Sends one request once: a POST to the command's path with these members beside "clientContext". Calls the
-    /// completion exactly once, on the main thread, perhaps inside the call.
-    virtual void send(const std::string& command, platform::Dictionary members, Completion completion) = 0;
+    /// Sends one request once: a POST to the command's path. Calls the completion exactly once, on the main thread,
+    /// perhaps inside the call.
+    virtual void send(ServiceRequest request, Completion completion) = 0;
 };
 
 /// What else an answer needs of the world. Each may be called during an answer, on the main thread.
@@ -35,8 +43,8 @@ struct World {
     /// Runs the work on another thread, and then the rest on the main thread; none: both at once.
     std::function<void(std::function<void()> work, std::function<void()> then)> elsewhere;
     std::function<bool()> isLocked;  ///< none: never
-    /// A distance in metres as the rows word it; none: the distance is not said.
-    std::function<std::optional<std::string>(double metres)> distance;
+    /// A distance in metres as the rows word it, in a language (BCP 47); none: the distance is not said.
+    std::function<std::optional<std::string>(double metres, const std::string& language)> distance;
     /// Metres between two places, by which they are ordered and near. Never none.
     std::function<double(double latitude, double longitude, double otherLatitude, double otherLongitude)> metres;
 };

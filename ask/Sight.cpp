@@ -174,14 +174,14 @@ bool Sight::isPresent(const Question& question) const {
     return !question.isLive && isOfNow(question);
 }
 
-std::string Sight::distance(const World& world) const {
-    const auto text = metres && world.distance ? world.distance(*metres) : std::nullopt;
+std::string Sight::distance(const World& world, const std::string& language) const {
+    const auto text = metres && world.distance ? world.distance(*metres, language) : std::nullopt;
     return text.value_or("");
 }
 
 std::string Sight::sentence(const Sentences& sentences, const Question& question, const World& world) const {
     const std::string words = where(sentences);
-    const std::string far = distance(world);
+    const std::string far = distance(world, sentences.language().tag());
     const bool isPresent = this->isPresent(question);
     // Without a time of its own it is known since now at the latest.
     const platform::Date moment = hasTime ? time : question.now;

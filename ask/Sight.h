@@ -42,7 +42,7 @@ struct Sight {
     bool isOfNow(const Question& question) const;
     /// Whether a sentence may say that it is so: else it says when it was.
     bool isPresent(const Question& question) const;
-    std::string distance(const World& world) const;
+    std::string distance(const World& world, const std::string& language) const;
 };
 
 /// The friends whom an answer to a get-locations command shows. Entries that are not whole are passed over, and what

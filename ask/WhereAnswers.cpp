@@ -182,7 +182,7 @@ Answer WhereAnswers::howFar() const {
     }
     std::vector<std::string> told;
     for (const Sight& sight : sights_) {
-        const std::string far = sight.distance(asking_.world);
+        const std::string far = sight.distance(asking_.world, asking_.language->tag());
         const platform::Date moment = sight.hasTime ? sight.time : asking_.question.now;
         told.push_back(far.empty()
                            ? sentences_.text("howFarUnknown", {{"name", nameOf(sight)}})
@@ -294,7 +294,7 @@ Answer WhereAnswers::near(const std::vector<Place>& ownPlaces) const {
     std::vector<std::string> names;
     std::vector<Sight> sights;
     for (const auto& [metres, sight] : byDistance) {
-        const std::string far = sight.distance(asking_.world);
+        const std::string far = sight.distance(asking_.world, asking_.language->tag());
         names.push_back(far.empty() ? nameOf(sight) : nameOf(sight) + " (" + far + ")");
         sights.push_back(sight);
     }

@@ -18,8 +18,8 @@ bool maySay(const Value& entry) {
 
 }  // namespace
 
-void AloudRequests::send(const std::string& command, Dictionary members, Completion completion) {
-    requests_.send(command, std::move(members), [completion = std::move(completion)](ask::ServiceReply reply) {
+void AloudRequests::send(ask::ServiceRequest request, Completion completion) {
+    requests_.send(std::move(request), [completion = std::move(completion)](ask::ServiceReply reply) {
         const Value* locations = reply.body.find("locations");
         if (locations != nullptr) {
             Dictionary said;

@@ -10,7 +10,7 @@ class AloudRequests : public ask::ServicePort {
   public:
     /// `requests` outlives this.
     explicit AloudRequests(ask::ServicePort& requests) : requests_(requests) {}
-    void send(const std::string& command, platform::Dictionary members, Completion completion) override;
+    void send(ask::ServiceRequest request, Completion completion) override;
 
   private:
     ask::ServicePort& requests_;

@@ -38,10 +38,10 @@ ask::World worldOf(Host& host) {
         const int state = lock ? lock->lockState() : platform::DeviceLock::kWithoutLock;
         return state == platform::DeviceLock::kLocked || state == platform::DeviceLock::kLocking;
     };
-    world.distance = [&host](double metres) -> std::optional<std::string> {
+    world.distance = [&host](double metres, const std::string& language) -> std::optional<std::string> {
         const auto& platform = *host.platform();
         const auto calculator = platform.distanceCalculators->makeDistanceCalculator(
-            {kAppGroup, platform.assistant->languageCode(), platform.region->localeIdentifier(),
+            {kAppGroup, language, platform.region->localeIdentifier(),
              platform.localization});
         const auto* words = dynamic_cast<const linux_::IcuDistanceCalculator*>(calculator.get());
         return words == nullptr ? std::nullopt : words->localizedDistance(metres);

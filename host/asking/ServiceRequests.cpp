@@ -2,6 +2,7 @@
 
 #include <utility>
 
+#include "platform/assistant/AssistantSettings.h"
 #include "platform/base/DeviceInformation.h"
 #include "platform/base/Json.h"
 #include "platform/base/MainLoop.h"
@@ -43,9 +44,22 @@ ServiceReply replyOf(const platform::HttpAnswer& answer) {
     return {Failure::None, *body};
 }
 
+/// What the labels of an answer are worded by, as in the plugin's own requests: sentence and row say the same.
+Dictionary contextOf(const platform::Platform& platform, const std::string& language) {
+    Dictionary context;
+    const auto assistants = platform.assistant ? platform.assistant->languageCode() : std::nullopt;
+    if (!language.empty() || assistants) {
+        context.set("locale", language.empty() ? *assistants : language);
+    }
+    if (const auto country = platform.region ? platform.region->countryCode() : std::nullopt) {
+        context.set("regionCode", *country);
+    }
+    return context;
+}
+
 }  // namespace
 
-void ServiceRequests::send(const std::string& command, Dictionary members, Completion completion) {
+void ServiceRequests::send(ask::ServiceRequest wanted, Completion completion) {
     const auto platform = platform_();
     const auto account = platform->accounts ? platform->accounts->deviceOwnerAccount() : nullptr;
     const auto host = account ? account->hostNameOfType(platform::kFriendLocationService) : std::nullopt;
@@ -55,18 +69,14 @@ void ServiceRequests::send(const std::string& command, Dictionary members, Compl
     if (!host || !authorization || !platform->httpTransport) {
         return completion({ServiceReply::Failure::NotSignedIn});
     }
-    Dictionary context;
-    if (platform->region) {
-        context.set("locale", platform->region->localeIdentifier());
-    }
-    Dictionary body{{"clientContext", context}};
-    for (const auto& [name, value] : members) {
+    Dictionary body{{"clientContext", contextOf(*platform, wanted.language)}};
+    for (const auto& [name, value] : wanted.members) {
         body.set(name, value);
     }
     platform::HttpRequest request;
     request.scheme = "https";
     request.host = *host;
-    request.path = kCommands + command;
+    request.path = kCommands + wanted.command;
     request.headers = {{"Content-Type", "application/json"},
                        {"Authorization", *authorization},
                        {"X-Orcha-Seek-API-Ver", "4.0"},

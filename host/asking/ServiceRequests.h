@@ -16,7 +16,7 @@ class ServiceRequests : public ask::ServicePort {
     /// `platform` is asked at each request. What is under way when this goes does nothing any more.
     explicit ServiceRequests(std::function<std::shared_ptr<platform::Platform>()> platform)
         : platform_(std::move(platform)) {}
-    void send(const std::string& command, platform::Dictionary members, Completion completion) override;
+    void send(ask::ServiceRequest request, Completion completion) override;
 
   private:
     std::function<std::shared_ptr<platform::Platform>()> platform_;

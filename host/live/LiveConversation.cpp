@@ -193,7 +193,7 @@ void LiveConversation::whoShares(std::function<void(const std::vector<Sharer>&)>
         });
         return;
     }
-    requests_.send("friends", {}, [told = std::move(told)](const ask::ServiceReply& reply) {
+    requests_.send({"friends"}, [told = std::move(told)](const ask::ServiceReply& reply) {
         const platform::Value* listed = reply.body.find("friends");
         const auto* friends = listed != nullptr ? listed->array() : nullptr;
         std::vector<Sharer> sharers;
@@ -213,7 +213,7 @@ void LiveConversation::whoShares(std::function<void(const std::vector<Sharer>&)>
 
 void LiveConversation::tryNow() {
     // What it answers counts as a sign of life, whatever is in it.
-    requests_.send("getlocations", {{"handles", platform::Value::Array()}}, [](const ask::ServiceReply&) {});
+    requests_.send({"getlocations", {{"handles", platform::Value::Array()}}}, [](const ask::ServiceReply&) {});
     host_.askAgain();
 }
 
@@ -331,7 +331,7 @@ LiveConversation::Reply LiveConversation::replyOf(const Waiting& asked, const as
 
 void LiveConversation::sendWish(const Waiting& asked) {
     const char* const wish = !asked.isSeen ? "read" : *asked.isSeen ? "share" : "hide";
-    requests_.send("sharing", {{"wish", wish}}, [weak = weak_from_this(), asked](const ask::ServiceReply& reply) {
+    requests_.send({"sharing", {{"wish", wish}}}, [weak = weak_from_this(), asked](const ask::ServiceReply& reply) {
         if (const auto self = weak.lock()) {
             self->receiveWish(asked, reply);
         }

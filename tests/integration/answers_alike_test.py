@@ -115,6 +115,13 @@ class AnswersAlikeTest(unittest.TestCase):
         self.assertEqual(str(meta["description"]), text)
         return text
 
+    def label_in_the_row(self, language):
+        """As the service words Ann's place for the card's own requests in a language."""
+        status, answer = self.service.ask("Mara", (self.folder / "token").read_text().strip(), "ann@x.example",
+                                          locale=language)
+        self.assertEqual(status, 200, answer)
+        return json.loads(answer)["locations"]["ann@x.example"]["location"]["labels"][0]["label"]
+
     def test_the_same_question_has_one_answer(self):
         self.assertEqual(len(LANGUAGES), 21)
         connection = self.session.connect()
@@ -129,6 +136,8 @@ class AnswersAlikeTest(unittest.TestCase):
                 with self.subTest(language=language, question=question):
                     said = self.in_the_terminal(question, language)
                     self.assertEqual(said[0], outcome)
+                    if outcome == "found":
+                        self.assertIn(self.label_in_the_row(language), said[1], "whatever the session's language")
                     self.assertEqual(self.by_voice(question, language), said[1])
                     self.assertEqual(self.on_the_bus(question, language.lower()), said[1])
                     self.assertEqual(self.in_the_search(question, connection), said[1])

@@ -114,8 +114,8 @@ class ServiceProgram:
         return self.request("POST", "/pub", json.dumps(message), by_socket, (user, secret),
                             **{"Content-Type": "application/json"})
 
-    def ask(self, user, secret, *handles, by_socket=False):
-        body = json.dumps({"clientContext": {}, "handles": list(handles)})
+    def ask(self, user, secret, *handles, by_socket=False, **context):
+        body = json.dumps({"clientContext": context, "handles": list(handles)})
         return self.request("POST", COMMANDS + "getlocations", body, by_socket, (user, secret), **{
             "Content-Type": "application/json", "X-Orcha-Seek-API-Ver": "4.0", "X-Orcha-AuthScheme": "Forever"})
 

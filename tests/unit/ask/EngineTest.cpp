@@ -22,10 +22,11 @@ class ServiceDouble : public ServicePort {
     struct Sent {
         std::string command;
         Dictionary members;
+        std::string language;
     };
-    void send(const std::string& command, Dictionary members, Completion completion) override {
-        sent.push_back({command, members});
-        completion(answer ? answer(command, members) : ServiceReply{ServiceReply::Failure::Unreachable});
+    void send(ServiceRequest request, Completion completion) override {
+        sent.push_back({request.command, request.members, request.language});
+        completion(answer ? answer(request.command, request.members) : ServiceReply{ServiceReply::Failure::Unreachable});
     }
     std::vector<Sent> sent;
     std::function<ServiceReply(const std::string&, const Dictionary&)> answer;
@@ -59,7 +60,10 @@ class EngineTest : public ::testing::Test {
     EngineTest() {
         World world;
         world.isLocked = [this] { return isLocked; };
-        world.distance = [](double metres) { return std::to_string(std::lround(metres)) + " m"; };
+        world.distance = [this](double metres, const std::string& language) {
+            distanceLanguages.push_back(language);
+            return std::to_string(std::lround(metres)) + " m";
+        };
         // Degrees near the equator, as if the earth were flat.
         world.metres = [](double a, double b, double c, double d) { return std::hypot(a - c, b - d) * 111320.0; };
         engine = std::make_unique<Engine>(
@@ -82,6 +86,7 @@ class EngineTest : public ::testing::Test {
     std::unique_ptr<Engine> engine;
     Question question;
     bool isLocked = false;
+    std::vector<std::string> distanceLanguages;
 };
 
 TEST_F(EngineTest, SomebodySeen_IsSaidWithPlaceAndDistanceAndDrawn) {
@@ -98,6 +103,28 @@ TEST_F(EngineTest, SomebodySeen_IsSaidWithPlaceAndDistanceAndDrawn) {
     ASSERT_EQ(service.sent.size(), 1U);
     EXPECT_EQ(service.sent.front().command, "getlocations");
     EXPECT_EQ(platform::writeJson(*service.sent.front().members.find("handles")), R"(["ann@harbour.example"])");
+}
+
+TEST_F(EngineTest, ServiceAndDistances_AreAskedInTheLanguageOfTheQuestion) {
+    question.position = Position{1.0, 1.0, {}};
+    service.answer = [](const std::string&, const Dictionary&) {
+        Dictionary ann = entry(1.001, 1.0, 10.0, "Fish Market");
+        ann.set("distanceInMeters", "310.52");
+        return locations({{"ann@harbour.example", ann}});
+    };
+    question.language = "de-AT";
+    ask("Wo ist Ann?");
+    EXPECT_EQ(distanceLanguages, std::vector<std::string>({"de-AT"}));
+    // Whom there are no words for is answered in English throughout.
+    question.language = "xx";
+    ask("Where is Ann?");
+    ask("Who is near the harbour?");
+    ask("Hide my location");
+    ASSERT_EQ(service.sent.size(), 5U);
+    EXPECT_EQ(service.sent[0].language, "de-AT");
+    for (std::size_t i = 1; i < service.sent.size(); ++i) {
+        EXPECT_EQ(service.sent[i].language, "en") << service.sent[i].command;
+    }
 }
 
 TEST_F(EngineTest, WhereTheRowGoesOnChanging_TheSentenceSaysWhenItWasTrue) {

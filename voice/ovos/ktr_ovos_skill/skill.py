@@ -89,8 +89,9 @@ class Skill:
             if self.hiding is not None:
                 self.hiding.cancel()
                 self.hiding = None
-                self.bus.send(Message("gui.clear.namespace", {"__from": SKILL}))
+                # First: who hears that it is no longer shown finds it nowhere.
                 self.pictures.remove()
+                self.bus.send(Message("gui.clear.namespace", {"__from": SKILL}))
 
     def work(self):
         while True:
