@@ -26,7 +26,8 @@ class ServiceDouble : public ServicePort {
     };
     void send(ServiceRequest request, Completion completion) override {
         sent.push_back({request.command, request.members, request.language});
-        completion(answer ? answer(request.command, request.members) : ServiceReply{ServiceReply::Failure::Unreachable});
+        completion(answer ? answer(request.command, request.members)
+                          : ServiceReply{ServiceReply::Failure::Unreachable});
     }
     std::vector<Sent> sent;
     std::function<ServiceReply(const std::string&, const Dictionary&)> answer;
