@@ -5,6 +5,7 @@
 #include <QEventLoop>
 #include <QProcess>
 #include <QTimer>
+#include <algorithm>
 #include <cstdio>
 #include <optional>
 
@@ -25,6 +26,8 @@ constexpr int kSpeechWait = 60000;
 /// What a picture waits for until faces, region and map are there, milliseconds.
 constexpr int kSettling = 1500;
 constexpr int kTick = 100;
+/// Of many who could be meant, so many lines.
+constexpr std::size_t kMostTold = 9;
 
 /// Through speech-dispatcher; waits for the end. Whether it was said.
 bool speak(const std::string& sentence, const std::string& language) {
@@ -35,6 +38,20 @@ bool speak(const std::string& sentence, const std::string& language) {
                   QStringLiteral("--language"), QString::fromStdString(language.substr(0, language.find('-'))),
                   QStringLiteral("--"), QString::fromStdString(sentence)});
     return speech.waitForFinished(kSpeechWait) && speech.exitStatus() == QProcess::NormalExit && speech.exitCode() == 0;
+}
+
+void tellQuestion(const std::string& question, const std::string& name) {
+    tell("ktr ask " + documents::asShellWord(question) + (name.empty() ? "" : "   # " + name));
+}
+
+/// The questions that mean one of several, or that ask somebody to share.
+void tellWhatToAsk(const ask::Answer& answer) {
+    for (std::size_t i = 0; i < std::min(answer.choices.size(), kMostTold); ++i) {
+        tellQuestion(answer.choices[i].question, answer.choices[i].name);
+    }
+    if (answer.action.kind == ask::Action::Kind::AskToShare) {
+        tellQuestion(answer.action.label, "");
+    }
 }
 
 }  // namespace
@@ -84,9 +101,9 @@ int AskCommand::write(const std::string& question, const ask::Answer& answer) {
         tell("the answer cannot be written");
         return static_cast<int>(host::ExitCode::Failure);
     }
-    // Whoever reads it sees how it is done; a program has it in the object.
-    if (answer.action.kind == ask::Action::Kind::AskToShare && !options_.json && ::isatty(STDERR_FILENO) == 1) {
-        tell("ktr ask " + documents::inQuotes(answer.action.label, answer.action.label.size()));
+    // Whoever reads it sees what to ask next; a program has it in the object.
+    if (!options_.json && ::isatty(STDERR_FILENO) == 1) {
+        tellWhatToAsk(answer);
     }
     if (!options_.output.empty()) {
         host::QuestionDesk desk(host_);

@@ -114,6 +114,14 @@ std::string withoutControls(std::string_view text) {
     return out;
 }
 
+std::string asShellWord(std::string_view text) {
+    std::string word = "'";
+    for (const char c : withoutControls(text)) {
+        word += c == '\'' ? std::string("'\\''") : std::string(1, c);
+    }
+    return word + "'";
+}
+
 std::string jsonForTerminal(std::string_view json) {
     std::string out;
     for (std::size_t at = 0; at < json.size();) {

@@ -4,6 +4,8 @@
 import json
 import os
 import pathlib
+import pty
+import shlex
 import struct
 import subprocess
 import tempfile
@@ -69,6 +71,31 @@ class AskTest(unittest.TestCase):
         code, chosen = self.asked(answer["choices"][1]["question"])
         self.assertEqual(code, 0)
         self.assertIn("Max Stone", chosen["sentence"])
+
+    def told_on_a_terminal(self, question):
+        """What somebody reads beside the answer, which goes to a file."""
+        ours, theirs = pty.openpty()
+        environment = dict(os.environ, KTR_CONFIG=str(self.folder / "config.json"), XDG_STATE_HOME=str(self.folder / "state"))
+        subprocess.run([PROGRAM, "ask", question, "--language", "en-GB"], env=environment, stdout=subprocess.DEVNULL,
+                       stderr=theirs, timeout=60, check=False)
+        os.close(theirs)
+        told = b""
+        try:
+            while block := os.read(ours, 65536):
+                told += block
+        except OSError:
+            pass
+        os.close(ours)
+        return told.decode().replace("\r\n", "\n")
+
+    def test_a_terminal_is_told_what_to_ask_and_it_can_be_pasted(self):
+        self.assertEqual(self.told_on_a_terminal("Where is Max?"),
+                         "ktr: ktr ask 'Where is max.weber@mail.example?'   # Max Weber\n"
+                         "ktr: ktr ask 'Where is max.stone@mail.example?'   # Max Stone\n")
+        line = self.told_on_a_terminal("Where is Shirin?").removeprefix("ktr: ").strip()
+        self.assertEqual(shlex.split(line)[:2], ["ktr", "ask"])
+        self.assertIn("Shirin", shlex.split(line)[2])
+        self.assertEqual(self.told_on_a_terminal("Where is Ann?"), "")
 
     def test_one_sentence_is_printed(self):
         result = self.run_ask("Where is Otto?")

@@ -52,6 +52,12 @@ TEST(WordsTest, WithoutControls_LeavesBlanks) {
     EXPECT_EQ(withoutControls("\u2068Ann\u2069 \u200f"), "\u2068Ann\u2069 \u200f");
 }
 
+TEST(WordsTest, AsShellWord_RunsNothing) {
+    EXPECT_EQ(documents::asShellWord("Where is $(x) `y` \"z\"?\n"), "'Where is $(x) `y` \"z\"? '");
+    EXPECT_EQ(documents::asShellWord("O'Brien"), "'O'\\''Brien'");
+    EXPECT_EQ(documents::asShellWord(""), "''");
+}
+
 TEST(WordsTest, JsonForTerminal_IsTheSameValueWithoutWhatSteers) {
     EXPECT_EQ(documents::jsonForTerminal("{\"a\":\"x\u009b31m\x7f\u202e\u200f\u2068 Zoë\"}\n"),
               "{\"a\":\"x\\u009b31m\\u007f\\u202e\\u200f\\u2068 Zoë\"}\n");
