@@ -1,8 +1,11 @@
 // Any bytes as a sentence template, and as a question in each language: nothing may crash or hang, and whoever is said
 // to be meant was named.
+#include <unicode/translit.h>
+
 #include <cstdint>
 #include <cstdlib>
 #include <filesystem>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -36,6 +39,25 @@ struct Asked {
     }
 };
 
+/// What the letters of other scripts are in Latin ones: "ㅇ" before a consonant is silent.
+std::u32string inLatin(const std::u32string& letters) {
+    UErrorCode status = U_ZERO_ERROR;
+    static const std::unique_ptr<icu::Transliterator> latin(
+        icu::Transliterator::createInstance("Any-Latin; Latin-ASCII; Lower", UTRANS_FORWARD, status));
+    auto text = icu::UnicodeString::fromUTF32(reinterpret_cast<const UChar32*>(letters.data()),  // NOLINT
+                                              static_cast<std::int32_t>(letters.size()));
+    latin->transliterate(text);
+    std::string utf8;
+    return ktr::ask::FoldedText::of(text.toUTF8String(utf8));
+}
+
+/// In one of its forms, in whatever script: the first letters are the name's own.
+bool isNamedIn(const std::string& question, const std::string& name) {
+    const std::u32string folded = ktr::ask::FoldedText::of(question);
+    const std::u32string first = ktr::ask::FoldedText::of(name).substr(0, 5);
+    return folded.find(first) != std::u32string::npos || inLatin(folded).find(first) != std::u32string::npos;
+}
+
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
@@ -50,10 +72,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     const auto& language = *asked.all[data[0] % asked.all.size()];
     const auto result = ktr::ask::Understanding(language, *asked.english, asked.people).understand(question);
     if (const auto* understood = std::get_if<ktr::ask::Understood>(&result)) {
-        const std::u32string folded = ktr::ask::FoldedText::of(text);
         for (const auto* person : understood->people) {
-            // In one of its forms: the first letters are the name's own.
-            if (folded.find(ktr::ask::FoldedText::of(person->fullName).substr(0, 5)) == std::u32string::npos) {
+            if (!isNamedIn(text, person->fullName)) {
                 std::abort();
             }
         }
