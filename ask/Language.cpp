@@ -74,7 +74,10 @@ std::string textOf(const FoldedText& text, const Grammar::Span& span) {
 
 }  // namespace
 
-std::optional<std::filesystem::path> Language::fileFor(const std::string& tag, const std::filesystem::path& folder) {
+std::optional<std::string> Language::fileFor(const std::string& tag, const std::set<std::string>& files) {
+    if (tag.size() > kLongestTag) {
+        return std::nullopt;
+    }
     std::vector<std::string> names{tag};
     if (tag == "iw" || tag.rfind("iw-", 0) == 0) {
         names.emplace_back("he");
@@ -91,22 +94,14 @@ std::optional<std::filesystem::path> Language::fileFor(const std::string& tag, c
     if (tag.rfind("zh", 0) == 0) {
         names.emplace_back("zh-Hans");
     }
-    for (const std::string& name : names) {
-        // A tag is a name in the folder, and never a way out of it.
-        const bool isName = !name.empty() && std::all_of(name.begin(), name.end(), [](unsigned char c) {
-            return std::isalnum(c) != 0 || c == '-';
-        });
-        std::error_code error;
-        if (isName && std::filesystem::is_regular_file(folder / (name + ".json"), error)) {
-            return folder / (name + ".json");
-        }
-    }
-    return std::nullopt;
+    const auto found =
+        std::find_if(names.begin(), names.end(), [&](const std::string& name) { return files.count(name) == 1; });
+    return found == names.end() ? std::nullopt : std::optional(*found);
 }
 
 std::variant<std::shared_ptr<const Language>, documents::DocumentError> Language::read(
     const std::filesystem::path& file, const std::string& tag) {
-    const std::shared_ptr<Language> language(new Language(tag));
+    const auto language = std::make_shared<File>();
     documents::FileReader::Terms terms;
     terms.most = kLargestFile;
     documents::DocumentWarnings unknown;
@@ -118,27 +113,31 @@ std::variant<std::shared_ptr<const Language>, documents::DocumentError> Language
     if (error) {
         return *error;
     }
-    return std::shared_ptr<const Language>(language);
+    return std::shared_ptr<const Language>(new Language(tag, language));
 }
 
-void Language::readAll(FieldReader& fields) {
+std::shared_ptr<const Language> Language::under(const std::string& tag) const {
+    return std::shared_ptr<const Language>(new Language(tag, file_));
+}
+
+void Language::File::readAll(FieldReader& fields) {
     readQuestions(fields);
     readWords(fields);
-    times_ = std::make_unique<Grammar>(Grammar::Rules(), Grammar::Lists());
-    fields.object("times", [&](FieldReader& times) {
+    times = std::make_unique<Grammar>(Grammar::Rules(), Grammar::Lists());
+    fields.object("times", [&](FieldReader& given) {
         for (std::size_t time = 0; time < kTimes; ++time) {
-            Templates(times).add(*times_, static_cast<std::uint32_t>(time), kTimeNames.at(time));
+            Templates(given).add(*times, static_cast<std::uint32_t>(time), kTimeNames.at(time));
         }
     });
-    fields.object("sentences", [&](FieldReader& sentences) {
-        for (const auto& [key, value] : sentences.dictionary()) {
-            sentences_[key] = sentences.string(key).value_or("");
+    fields.object("sentences", [&](FieldReader& given) {
+        for (const auto& [key, value] : given.dictionary()) {
+            sentences[key] = given.string(key).value_or("");
         }
     });
-    suggestions_ = fields.texts("suggestions");
+    suggestions = fields.texts("suggestions");
 }
 
-void Language::readQuestions(FieldReader& fields) {
+void Language::File::readQuestions(FieldReader& fields) {
     Grammar::Rules rules;
     fields.object("rules", [&](FieldReader& given) { rules = Templates(given).rules(); });
     Grammar::Lists lists;
@@ -154,47 +153,47 @@ void Language::readQuestions(FieldReader& fields) {
         .push_back(Templates(fields).read("now", fields.string("now").value_or("")));
     auto& spots = lists.at(static_cast<std::size_t>(Grammar::List::Spot));
     spots.push_back(Templates(fields).read(kMyPlace, fields.string(kMyPlace).value_or("")));
-    fields.object("places", [&](FieldReader& places) {
+    fields.object("places", [&](FieldReader& given) {
         for (const char* label : kKinds) {
-            places.object(label, [&](FieldReader& kind) {
+            given.object(label, [&](FieldReader& kind) {
                 spots.push_back(Templates(kind).read("called", kind.string("called").value_or("")));
-                kinds_.push_back({label, kind.text("said").value_or("")});
+                kinds.push_back({label, kind.text("said").value_or("")});
             });
         }
     });
-    places_ = std::make_unique<Grammar>(Grammar::Rules(), Grammar::Lists());
+    places = std::make_unique<Grammar>(Grammar::Rules(), Grammar::Lists());
     for (std::size_t spot = 0; spot < spots.size(); ++spot) {
-        places_->add(static_cast<std::uint32_t>(spot), spots[spot]);
+        places->add(static_cast<std::uint32_t>(spot), spots[spot]);
     }
-    questions_ = std::make_unique<Grammar>(std::move(rules), std::move(lists));
-    fields.object("questions", [&](FieldReader& questions) {
-        for (const auto& [name, value] : questions.dictionary()) {
+    questions = std::make_unique<Grammar>(std::move(rules), std::move(lists));
+    fields.object("questions", [&](FieldReader& given) {
+        for (const auto& [name, value] : given.dictionary()) {
             if (const auto wish = wishNamed(name)) {
-                Templates(questions).add(*questions_, static_cast<std::uint32_t>(*wish), name);
+                Templates(given).add(*questions, static_cast<std::uint32_t>(*wish), name);
             }
         }
     });
 }
 
-void Language::readWords(FieldReader& fields) {
+void Language::File::readWords(FieldReader& fields) {
     for (const std::string& word : fields.texts("and")) {
         // A comma is folded away, and parts names in every language.
         if (const std::u32string folded = foldedWithBlanks(word); !folded.empty()) {
-            conjunctions_.push_back(folded);
+            conjunctions.push_back(folded);
         }
     }
-    fields.object("relations", [&](FieldReader& relations) {
-        for (const auto& [name, value] : relations.dictionary()) {
-            relations_.emplace_back();
-            for (const std::string& word : relations.texts(name)) {
-                relations_.back().push_back(FoldedText::of(word));
+    fields.object("relations", [&](FieldReader& given) {
+        for (const auto& [name, value] : given.dictionary()) {
+            relations.emplace_back();
+            for (const std::string& word : given.texts(name)) {
+                relations.back().push_back(FoldedText::of(word));
             }
         }
     });
-    fields.object("endings", [&](FieldReader& endings) {
-        for (const auto& [ending, value] : endings.dictionary()) {
-            for (const std::string& own : endings.stringOrStrings(ending)) {
-                endings_.emplace_back(FoldedText::of(ending), FoldedText::of(own));
+    fields.object("endings", [&](FieldReader& given) {
+        for (const auto& [ending, value] : given.dictionary()) {
+            for (const std::string& own : given.stringOrStrings(ending)) {
+                endings.emplace_back(FoldedText::of(ending), FoldedText::of(own));
             }
         }
     });
@@ -203,7 +202,7 @@ void Language::readWords(FieldReader& fields) {
         ++value;
         for (std::size_t at = 0; at <= words.size();) {
             const std::size_t end = std::min(words.find('|', at), words.size());
-            numbers_[FoldedText::of(words.substr(at, end - at))] = value;
+            numbers[FoldedText::of(words.substr(at, end - at))] = value;
             at = end + 1;
         }
     }
@@ -212,7 +211,7 @@ void Language::readWords(FieldReader& fields) {
 std::vector<Meaning> Language::meanings(const std::string& question) const {
     const FoldedText text(question);
     std::vector<Meaning> meanings;
-    for (const Grammar::Reading& reading : questions_->read(text.letters())) {
+    for (const Grammar::Reading& reading : file_->questions->read(text.letters())) {
         Meaning meaning;
         meaning.wish = static_cast<Wish>(reading.group);
         const auto slot = [&](Grammar::Slot which) {
@@ -238,7 +237,7 @@ std::vector<Meaning> Language::meanings(const std::string& question) const {
 }
 
 std::string Language::placeWord(const std::string& words) const {
-    const auto readings = places_->read(FoldedText::of(words));
+    const auto readings = file_->places->read(FoldedText::of(words));
     if (readings.empty()) {
         return {};
     }
@@ -246,18 +245,18 @@ std::string Language::placeWord(const std::string& words) const {
 }
 
 std::string Language::spotOf(std::size_t number) const {
-    return number == kMe ? kMyPlace : kinds_.at(number - 1).label;
+    return number == kMe ? kMyPlace : file_->kinds.at(number - 1).label;
 }
 
 const Language::PlaceKind* Language::kindOf(const std::string& label) const {
-    const auto found =
-        std::find_if(kinds_.begin(), kinds_.end(), [&](const PlaceKind& kind) { return kind.label == label; });
-    return found == kinds_.end() ? nullptr : &*found;
+    const auto found = std::find_if(file_->kinds.begin(), file_->kinds.end(),
+                                    [&](const PlaceKind& kind) { return kind.label == label; });
+    return found == file_->kinds.end() ? nullptr : &*found;
 }
 
 const std::string& Language::sentence(const std::string& key) const {
-    const auto found = sentences_.find(key);
-    return found == sentences_.end() ? key : found->second;
+    const auto found = file_->sentences.find(key);
+    return found == file_->sentences.end() ? key : found->second;
 }
 
 }  // namespace ktr::ask

@@ -4,13 +4,15 @@
 #include <map>
 #include <memory>
 #include <mutex>
+#include <set>
 #include <string>
 
 #include "ask/Language.h"
 
 namespace ktr::ask {
 
-/// The languages of a folder, each read when it is first asked for. Any thread.
+/// The languages of a folder, each file read when it is first asked for, and once for all tags that it serves: whoever
+/// invents tags makes nothing grow. Any thread.
 class Languages {
   public:
     explicit Languages(std::filesystem::path folder) : folder_(std::move(folder)) {}
@@ -22,10 +24,12 @@ class Languages {
 
   private:
     std::shared_ptr<const Language> read(const std::string& tag);
+    void list();
 
     const std::filesystem::path folder_;
     mutable std::mutex mutex_;
-    std::map<std::string, std::shared_ptr<const Language>> known_;
+    std::set<std::string> files_;                                   ///< named without their ending
+    std::map<std::string, std::shared_ptr<const Language>> known_;  ///< by the name of the file
     std::string problem_;
 };
 

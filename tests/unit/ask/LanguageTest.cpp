@@ -1,6 +1,7 @@
 #include "ask/Language.h"
 
 #include <gtest/gtest.h>
+#include <unistd.h>
 
 #include <chrono>
 #include <filesystem>
@@ -21,10 +22,10 @@ std::filesystem::path folder() {
     return std::filesystem::path(KTR_SOURCE_DIR) / "resources/questions";
 }
 
-std::vector<std::string> tags() {
-    std::vector<std::string> tags;
+std::set<std::string> tags() {
+    std::set<std::string> tags;
     for (const auto& entry : std::filesystem::directory_iterator(folder())) {
-        tags.push_back(entry.path().stem().string());
+        tags.insert(entry.path().stem().string());
     }
     return tags;
 }
@@ -156,14 +157,57 @@ TEST(LanguageTest, WhatTheWindowSuggests_IsUnderstoodInEveryLanguage) {
     }
 }
 
-TEST(LanguageTest, FileFor_NeverLeavesItsFolder) {
-    EXPECT_FALSE(Language::fileFor("../questions/en", folder()));
-    EXPECT_FALSE(Language::fileFor("", folder()));
-    EXPECT_EQ(Language::fileFor("pt-BR", folder()), folder() / "pt.json");
-    EXPECT_EQ(Language::fileFor("zh-TW", folder()), folder() / "zh-Hant.json");
-    EXPECT_EQ(Language::fileFor("zh-CN", folder()), folder() / "zh-Hans.json");
-    EXPECT_EQ(Language::fileFor("iw", folder()), folder() / "he.json");
-    EXPECT_FALSE(Language::fileFor("tlh", folder()));
+TEST(LanguageTest, FileFor_IsTheNearestOfTheFolderAndNeverOutsideIt) {
+    const auto files = tags();
+    EXPECT_FALSE(Language::fileFor("../questions/en", files));
+    EXPECT_FALSE(Language::fileFor("", files));
+    EXPECT_EQ(Language::fileFor("pt-BR", files), "pt");
+    EXPECT_EQ(Language::fileFor("zh-TW", files), "zh-Hant");
+    EXPECT_EQ(Language::fileFor("zh-CN", files), "zh-Hans");
+    EXPECT_EQ(Language::fileFor("iw", files), "he");
+    EXPECT_FALSE(Language::fileFor("tlh", files));
+}
+
+// Voice clients name the language with each question: whoever invents tags must not make a copy of a language for each.
+TEST(LanguagesTest, TagsOfOneFileShareWhatItSays) {
+    Languages languages(folder());
+    const auto english = languages.language("en");
+    ASSERT_TRUE(english) << languages.problem();
+    for (char first = 'A'; first <= 'Z'; ++first) {
+        const std::string tag = std::string("en-") + first + first;
+        const auto invented = languages.language(tag);
+        ASSERT_TRUE(invented) << tag;
+        EXPECT_EQ(invented->tag(), tag);
+        EXPECT_EQ(&invented->sentences(), &english->sentences()) << tag;
+        EXPECT_EQ(languages.language("x" + tag)->tag(), "en");
+    }
+    EXPECT_NE(&languages.language("de")->sentences(), &english->sentences());
+}
+
+// The name of the language reaches this as a peer sent it, as long as a frame may be.
+TEST(LanguagesTest, ATagWithoutEnd_IsNoLanguageAndCostsNothing) {
+    std::string tag = "en";
+    while (tag.size() < 16000) {
+        tag += "-a";
+    }
+    const auto files = tags();
+    EXPECT_FALSE(Language::fileFor(tag, files));
+    EXPECT_EQ(Languages(folder()).language(tag)->tag(), "en");
+    EXPECT_EQ(Language::fileFor("en-" + std::string(Language::kLongestTag - 3, 'a'), files), "en");
+    EXPECT_FALSE(Language::fileFor("en-" + std::string(Language::kLongestTag - 2, 'a'), files));
+}
+
+// Once listed, the folder is not looked at again: questions are also read on the main thread.
+TEST(LanguagesTest, LanguagesThatWereRead_NeedNoDisk) {
+    const auto copy = std::filesystem::temp_directory_path() / ("languages-" + std::to_string(::getpid()));
+    std::filesystem::copy(folder(), copy);
+    Languages languages(copy);
+    ASSERT_TRUE(languages.language("de"));
+    std::filesystem::remove_all(copy);
+    ASSERT_TRUE(languages.language("de-AT"));
+    EXPECT_EQ(languages.language("de-AT")->tag(), "de-AT");
+    EXPECT_FALSE(languages.language("fr"));
+    EXPECT_FALSE(languages.problem().empty());
 }
 
 // Whoever is found was named: every word of a friend's name, in one of its forms, stands in the question.
@@ -183,7 +227,8 @@ TEST(LanguageTest, RandomQuestionsNeverNameTheWrongPerson) {
         "work",   "and", ",",       "until",   "six",      "hide", "share", "my", "location", "with", "\xff\xfe",
         "\u202e", "家",  "は",      "в",       "{name}",   "[",    "|",     "?",  "   ",      "'s"};
     std::mt19937 random(20261122);  // NOLINT: the same questions every time
-    const auto all = tags();
+    const auto names = tags();
+    const std::vector<std::string> all(names.begin(), names.end());
     for (int i = 0; i < 10000; ++i) {
         std::string text;
         for (std::size_t n = random() % 12; n > 0; --n) {
