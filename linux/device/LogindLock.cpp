@@ -67,10 +67,11 @@ LogindLock::LogindLock(QDBusConnection bus) : bus_(std::move(bus)) {
     auto* watcher = new QDBusServiceWatcher(kService, bus_, QDBusServiceWatcher::WatchForOwnerChange, this);
     connect(watcher, &QDBusServiceWatcher::serviceOwnerChanged, this,
             [this](const QString&, const QString&, const QString& now) {
-                if (now.isEmpty()) {
-                    setState(kWithoutLock);
-                } else {
+                if (!now.isEmpty()) {
                     findSession();
+                } else if (state_ != kLocked) {
+                    // A screen that was locked is locked still: only whoever comes back can say that it is not.
+                    setState(kWithoutLock);
                 }
             });
     findSession();

@@ -16,7 +16,7 @@ namespace ktr::linux_ {
 
 /// The lock state of this login session, from logind (org.freedesktop.login1, property LockedHint). It asks once and
 /// then listens; until the answer comes, and without a bus, a session or logind, the device counts as one without a
-/// lock. Follows logind when it restarts. Main thread.
+/// lock. Follows logind when it restarts; while it is gone, what was locked stays so. Main thread.
 class LogindLock : public QObject, public platform::DeviceLock {
     Q_OBJECT
 

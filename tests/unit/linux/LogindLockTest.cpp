@@ -1,5 +1,7 @@
 #include "linux/device/LogindLock.h"
 
+#include <QCoreApplication>
+#include <QDBusConnectionInterface>
 #include <QDBusObjectPath>
 #include <QDBusVariant>
 #include <memory>
@@ -68,13 +70,34 @@ TEST_F(LogindLockTest, Hint_IsReadAndFollowed) {
 
 TEST_F(LogindLockTest, LogindThatComesAndGoes_IsFollowed) {
     const LogindLock lock(client);
+    startLogind();
+    EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kUnlocked; }));
+    ASSERT_TRUE(service.unregisterService(QStringLiteral("org.freedesktop.login1")));
+    EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kWithoutLock; }));
+    locked = true;
+    ASSERT_TRUE(service.registerService(QStringLiteral("org.freedesktop.login1")));
+    EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kLocked; }));
+}
+
+// Whoever restarts or kills logind on a locked screen must not make it speak of friends.
+TEST_F(LogindLockTest, LogindThatGoesFromALockedScreen_LeavesItLocked) {
+    LogindLock lock(client);
     locked = true;
     startLogind();
     EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kLocked; }));
+    int changes = 0;
+    lock.setChanged([&changes] { ++changes; });
     ASSERT_TRUE(service.unregisterService(QStringLiteral("org.freedesktop.login1")));
-    EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kWithoutLock; }));
-    locked = false;
+    // What the bus says of it has come before the bus's answer to this.
+    EXPECT_FALSE(client.interface()->isServiceRegistered(QStringLiteral("org.freedesktop.login1")));
+    QCoreApplication::processEvents();
+    EXPECT_EQ(lock.lockState(), LogindLock::kLocked);
+    const int before = reads;
     ASSERT_TRUE(service.registerService(QStringLiteral("org.freedesktop.login1")));
+    EXPECT_TRUE(eventually([&] { return reads > before; }));
+    EXPECT_EQ(lock.lockState(), LogindLock::kLocked);
+    EXPECT_EQ(changes, 0);
+    announce(false);
     EXPECT_TRUE(eventually([&] { return lock.lockState() == LogindLock::kUnlocked; }));
 }
 
