@@ -153,27 +153,34 @@ void SignIn::beginWithLink(const Wish& wish) {
         attempt->wish.secret = spent.secret;
         checked(attempt, {ServiceCheck::Outcome::Fine, "", 0.0, std::nullopt});
     };
-    if (spent_ && spent_->link == wish.link) {
+    if (spent_ && spent_->link == wish.link && !spent_->secret.empty()) {
         keepIt(attempt_, *spent_);
         return;
     }
-    link->exchange(
-        client_, certificatesOf(file_), [this, keepIt, attempt = attempt_](const SignInLink::Exchanged& exchanged) {
-            QMetaObject::invokeMethod(
-                QCoreApplication::instance(),
-                [this, keepIt, attempt, exchanged] {
-                    if (attempt->givesUp) {
-                        return;
-                    }
-                    if (exchanged.outcome != ServiceCheck::Outcome::Fine) {
-                        end(attempt, {outcomeOf(exchanged.outcome), attempt->host, exchanged.reason});
-                        return;
-                    }
-                    spent_ = std::make_shared<Spent>(Spent{attempt->wish.link, exchanged.person, exchanged.secret});
-                    keepIt(attempt, *spent_);
-                },
-                Qt::QueuedConnection);
-        });
+    if (!spent_ || spent_->link != wish.link) {
+        spent_ = std::make_shared<Spent>(Spent{wish.link, "", ""});
+    }
+    link->exchange(client_, certificatesOf(file_),
+                   [keepIt, attempt = attempt_, spent = spent_](const SignInLink::Exchanged& exchanged) {
+                       QMetaObject::invokeMethod(
+                           QCoreApplication::instance(),
+                           [keepIt, attempt, spent, exchanged] {
+                               // Whoever gave up may try again: the link is spent all the same.
+                               if (exchanged.outcome == ServiceCheck::Outcome::Fine) {
+                                   spent->person = exchanged.person;
+                                   spent->secret = exchanged.secret;
+                               }
+                               if (attempt->givesUp) {
+                                   return;
+                               }
+                               if (spent->secret.empty()) {
+                                   end(attempt, {outcomeOf(exchanged.outcome), attempt->host, exchanged.reason});
+                                   return;
+                               }
+                               keepIt(attempt, *spent);
+                           },
+                           Qt::QueuedConnection);
+                   });
 }
 
 void SignIn::checked(const std::shared_ptr<Attempt>& attempt, const ServiceCheck::Result& found) {

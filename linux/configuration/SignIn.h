@@ -76,7 +76,8 @@ class SignIn {
     const Store store_;
     HttpsClient client_;
     std::shared_ptr<Attempt> attempt_;
-    /// What the link that was spent last stands for, until it is kept: the service gives it once.
+    /// What the link that was tried last stands for, once the service has said it and until it is kept: it says it
+    /// once, also to somebody who has given up meanwhile.
     std::shared_ptr<Spent> spent_;
 };
 

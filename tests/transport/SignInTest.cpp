@@ -8,6 +8,7 @@
 #include <iterator>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "linux/configuration/ConfigurationFile.h"
@@ -293,6 +294,34 @@ TEST_F(SignInTest, LinkThatWasSpent_IsNotAskedForAgain_WhenOnlyTheKeyringSaidNo)
     EXPECT_EQ(run(), Outcome::Done);
     EXPECT_EQ(tokenInFile(), "gkx4tv");
     EXPECT_EQ(server->posts(), 1U) << "the service gives it once";
+}
+
+// The service gives the secret once. Whoever stops while its answer is on the way, and presses again, has it still.
+TEST_F(SignInTest, LinkThatWasSpentForSomebodyWhoGaveUp_SignsInAtTheNextTry) {
+    bool isSpent = false;
+    const auto once = answering(200, "", R"({"statusCode":200,"person":"Mara","secret":"gkx4tv"})");
+    const auto spent = answering(403, "", R"({"statusCode":403,"message":"the link was used before"})");
+    serve([&](QSslSocket& socket, const TestServer::Request& request) {
+        (std::exchange(isSpent, true) ? spent : once)(socket, request);
+    });
+    trustTheServers();
+    SignIn one(file, keyring());
+    SignIn::Wish wish;
+    wish.link = "https://" + server->host() + "/me/in?link=4tvp0habc";
+    one.begin(wish, [](const SignIn::Result&) { FAIL() << "after it was cancelled"; });
+    const QDeadlineTimer deadline(30000);
+    while (server->posts() == 0 && !deadline.hasExpired()) {
+        QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents, 5);
+    }
+    one.cancel();
+    std::optional<SignIn::Result> result;
+    one.begin(wish, [&result](const SignIn::Result& got) { result = got; });
+    while (!result && !deadline.hasExpired()) {
+        QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents, 50);
+    }
+    ASSERT_TRUE(result);
+    EXPECT_EQ(result->outcome, Outcome::Done) << result->reason;
+    EXPECT_EQ(kept, "Mara@" + server->host() + "=gkx4tv");
 }
 
 }  // namespace
