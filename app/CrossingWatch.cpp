@@ -85,7 +85,7 @@ void CrossingWatch::listen() {
             qApp,
             [self, events = std::move(events)]() mutable {
                 if (self) {
-                    self->take(std::move(events));
+                    self->take(events);
                 }
             },
             Qt::QueuedConnection);
@@ -122,7 +122,7 @@ void CrossingWatch::listenLater(double pause) {
                        [this] { waiting_.size() < kMostWaiting ? listen() : listenLater(kFirstPause); });
 }
 
-void CrossingWatch::take(std::vector<linux_::StreamEvent> events) {
+void CrossingWatch::take(const std::vector<linux_::StreamEvent>& events) {
     pause_ = kFirstPause;
     trouble_.clear();
     for (const linux_::StreamEvent& event : events) {

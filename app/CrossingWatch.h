@@ -54,7 +54,7 @@ class CrossingWatch : public QObject {
     void listen();
     void listenLater(double pause);
     void ended(const linux_::HttpsAnswer& answer);
-    void take(std::vector<linux_::StreamEvent> events);
+    void take(const std::vector<linux_::StreamEvent>& events);
     void handOnNext();
     void handedOn(std::int64_t number);
     void acknowledge();
