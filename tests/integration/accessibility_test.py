@@ -4,35 +4,16 @@ and presses. Skipped without a virtual display, a session bus and pyatspi."""
 
 import os
 import pathlib
-import shutil
 import subprocess
 import sys
 import tempfile
-import time
 import unittest
 
-from virtual_display import VirtualDisplay
+from screen_session import nodes, outside
+from window_case import wait_for
 
 PROGRAM = os.environ["KTR_PROGRAM"]
 SCENARIOS = pathlib.Path(os.environ["KTR_SOURCE"]) / "resources" / "scenarios"
-# The bindings belong to the system's Python.
-SYSTEM_PYTHON = "/usr/bin/python3"
-
-
-def wait_for(what, condition, seconds=30.0):
-    deadline = time.monotonic() + seconds
-    while time.monotonic() < deadline:
-        result = condition()
-        if result:
-            return result
-        time.sleep(0.05)
-    raise AssertionError(f"{what} did not come")
-
-
-def nodes(root):
-    yield root
-    for i in range(root.childCount):
-        yield from nodes(root.getChildAtIndex(i))
 
 
 class WindowTest(unittest.TestCase):
@@ -141,22 +122,7 @@ class AccessibilityTest(WindowTest):
         self.assertLessEqual(focused, 1)
 
 
-def outside(file=__file__, *programs, seconds=120):
-    """Starts a display and a session bus, and a file of tests again inside them, where it has the programs that it needs."""
-    for needed in ("Xvfb", "dbus-run-session", SYSTEM_PYTHON, *programs):
-        if not shutil.which(needed):
-            print(needed, "is not installed")
-            return 77
-    if subprocess.run([SYSTEM_PYTHON, "-c", "import pyatspi"], capture_output=True, check=False).returncode != 0:
-        print("python3-pyatspi is not installed")
-        return 77
-    with tempfile.TemporaryDirectory() as runtime, VirtualDisplay("900x900") as display:
-        environment = {**os.environ, "DISPLAY": display.name, "XDG_RUNTIME_DIR": runtime, "KTR_INSIDE": "yes"}
-        return subprocess.run(["dbus-run-session", "--", SYSTEM_PYTHON, file, *sys.argv[1:]], env=environment,
-                              timeout=seconds, check=False).returncode
-
-
 if __name__ == "__main__":
     if "KTR_INSIDE" not in os.environ:
-        sys.exit(outside())
+        sys.exit(outside(__file__))
     unittest.main()

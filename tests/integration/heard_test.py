@@ -7,19 +7,16 @@ import json
 import os
 import pathlib
 import re
-import shutil
 import subprocess
 import sys
 import tempfile
 import time
 import unittest
 
+from screen_session import outside, tree
 from serve import Service
-from virtual_display import VirtualDisplay
 
 PROGRAM = os.environ["KTR_PROGRAM"]
-# The bindings belong to the system's Python.
-SYSTEM_PYTHON = "/usr/bin/python3"
 FOREVER = 100000
 
 
@@ -130,25 +127,10 @@ class HeardTest(unittest.TestCase):
 
     def walk(self, listener):
         """Every node's name, asked once the rows are there."""
-        import pyatspi
-        from gi.repository import GLib
-
-        def nodes(root):
-            yield root
-            for i in range(root.childCount):
-                yield from nodes(root.getChildAtIndex(i))
-
-        desktop = pyatspi.Registry.getDesktop(0)
         for _ in range(100):
             listener.listen(0.1)
-            try:
-                programs = [desktop.getChildAtIndex(i) for i in range(desktop.childCount)]
-                mine = [one for one in programs if one and one.get_process_id() == listener._process.pid]
-                names = [node.name for node in nodes(mine[0]) if node.getRoleName() == "link"]
-                if names:
-                    return names
-            except (AttributeError, RuntimeError, LookupError, IndexError, GLib.Error):
-                pass
+            if names := [node.name for node in tree(listener._process.pid) if node.getRoleName() == "link"]:
+                return names
         raise AssertionError("no rows on the bus")
 
     def here(self):
@@ -247,22 +229,7 @@ class HeardTest(unittest.TestCase):
         self.assertEqual(len(listener.announcements), 1, "Ann has moved meanwhile")
 
 
-def outside():
-    """Starts a display and a session bus, and this file again inside them."""
-    for needed in ("Xvfb", "xdotool", "dbus-run-session", SYSTEM_PYTHON):
-        if not shutil.which(needed):
-            print(needed, "is not installed")
-            return 77
-    if subprocess.run([SYSTEM_PYTHON, "-c", "import pyatspi"], capture_output=True, check=False).returncode != 0:
-        print("python3-pyatspi is not installed")
-        return 77
-    with tempfile.TemporaryDirectory() as runtime, VirtualDisplay("900x900") as display:
-        environment = {**os.environ, "DISPLAY": display.name, "XDG_RUNTIME_DIR": runtime, "KTR_INSIDE": "yes"}
-        return subprocess.run(["dbus-run-session", "--", SYSTEM_PYTHON, __file__, *sys.argv[1:]], env=environment,
-                              timeout=590, check=False).returncode
-
-
 if __name__ == "__main__":
     if "KTR_INSIDE" not in os.environ:
-        sys.exit(outside())
+        sys.exit(outside(__file__, "xdotool", seconds=590))
     unittest.main()

@@ -7,20 +7,17 @@ import json
 import os
 import pathlib
 import re
-import shutil
 import subprocess
 import sys
 import tempfile
 import time
 import unittest
 
+from screen_session import SYSTEM_PYTHON, outside, tree
 from serve import Service
-from virtual_display import VirtualDisplay
 
 PROGRAM = os.environ["KTR_PROGRAM"]
 SCENARIOS = pathlib.Path(os.environ["KTR_SOURCE"]) / "resources" / "scenarios"
-# The bindings belong to the system's Python.
-SYSTEM_PYTHON = "/usr/bin/python3"
 
 # Desktop settings that say GNOME's text size: each line on the standard input is another one.
 PORTAL = """
@@ -65,12 +62,6 @@ loop.run()
 """
 
 
-def nodes(root):
-    yield root
-    for i in range(root.childCount):
-        yield from nodes(root.getChildAtIndex(i))
-
-
 class OpenWindow(unittest.TestCase):
     def setUp(self):
         folder = tempfile.TemporaryDirectory(ignore_cleanup_errors=True)
@@ -89,17 +80,7 @@ class OpenWindow(unittest.TestCase):
         self.addCleanup(self.program.kill)
 
     def tree(self):
-        """All nodes; empty while the window comes, goes or is filled."""
-        import pyatspi
-        from gi.repository import GLib
-
-        try:
-            desktop = pyatspi.Registry.getDesktop(0)
-            programs = [desktop.getChildAtIndex(i) for i in range(desktop.childCount)]
-            mine = [one for one in programs if one and one.get_process_id() == self.program.pid and one.childCount]
-            return list(nodes(mine[0])) if mine else []
-        except (AttributeError, RuntimeError, LookupError, GLib.Error):
-            return []
+        return tree(self.program.pid)
 
     def wait_for(self, what, condition, seconds=60):
         from gi.repository import GLib
@@ -250,23 +231,7 @@ class PseudoLanguageTest(OpenWindow):
         self.check(until=["šŵíťčhéď öff"])
 
 
-def outside():
-    """Starts a display and a session bus, and this file again inside them."""
-    for needed in ("Xvfb", "xdotool", "dbus-run-session", SYSTEM_PYTHON):
-        if not shutil.which(needed):
-            print(needed, "is not installed")
-            return 77
-    if subprocess.run([SYSTEM_PYTHON, "-c", "import pyatspi, dbus.service"], capture_output=True,
-                      check=False).returncode != 0:
-        print("python3-pyatspi or python3-dbus is not installed")
-        return 77
-    with tempfile.TemporaryDirectory(ignore_cleanup_errors=True) as runtime, VirtualDisplay("900x900") as display:
-        environment = {**os.environ, "DISPLAY": display.name, "XDG_RUNTIME_DIR": runtime, "KTR_INSIDE": "yes"}
-        return subprocess.run(["dbus-run-session", "--", SYSTEM_PYTHON, __file__, *sys.argv[1:]], env=environment,
-                              timeout=560, check=False).returncode
-
-
 if __name__ == "__main__":
     if "KTR_INSIDE" not in os.environ:
-        sys.exit(outside())
+        sys.exit(outside(__file__, "xdotool", modules=("pyatspi", "dbus.service"), seconds=560))
     unittest.main()

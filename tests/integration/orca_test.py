@@ -5,15 +5,14 @@ a module that writes it down. Long, and skipped without Xvfb, a session bus, the
 import json
 import os
 import pathlib
-import shutil
 import subprocess
 import sys
 import tempfile
 import time
 import unittest
 
+from screen_session import outside
 from serve import Service
-from virtual_display import VirtualDisplay
 
 PROGRAM = os.environ["KTR_PROGRAM"]
 
@@ -117,22 +116,14 @@ class OrcaTest(unittest.TestCase):
         self.assertEqual(self.said().count("People: 1"), 2, self.said())
 
 
-def outside():
-    """Starts a display and a session bus, and this file again inside them."""
+def main():
     if os.environ.get("KTR_LONG_TESTS") != "1":
         print("only with KTR_LONG_TESTS=1")
         return 77
-    for needed in ("Xvfb", "xdotool", "dbus-run-session", "orca", "speech-dispatcher"):
-        if not shutil.which(needed):
-            print(needed, "is not installed")
-            return 77
-    with tempfile.TemporaryDirectory(ignore_cleanup_errors=True) as runtime, VirtualDisplay("900x900") as display:
-        environment = {**os.environ, "DISPLAY": display.name, "XDG_RUNTIME_DIR": runtime, "KTR_INSIDE": "yes"}
-        return subprocess.run(["dbus-run-session", "--", sys.executable, __file__, *sys.argv[1:]], env=environment,
-                              timeout=560, check=False).returncode
+    return outside(__file__, "xdotool", "orca", "speech-dispatcher", seconds=560)
 
 
 if __name__ == "__main__":
     if "KTR_INSIDE" not in os.environ:
-        sys.exit(outside())
+        sys.exit(main())
     unittest.main()

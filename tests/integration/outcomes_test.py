@@ -7,20 +7,16 @@ import contextlib
 import json
 import os
 import re
-import shutil
 import sqlite3
 import subprocess
 import sys
-import tempfile
 import time
 import unittest
 
+from screen_session import outside
 from service_program import ServiceProgram, free_port
-from virtual_display import VirtualDisplay
 
 SERVICE, KTR = sys.argv[1:3]
-# The bindings belong to the system's Python.
-SYSTEM_PYTHON = "/usr/bin/python3"
 VCARD = "BEGIN:VCARD\r\nVERSION:3.0\r\nN:{1};{0};;;\r\nFN:{0} {1}\r\nEMAIL:{2}@x.example\r\nEND:VCARD\r\n"
 # Ann is seen; the others are not, each for a reason of their own.
 UNSEEN = {"Hana": "hides", "Nora": "never shared", "Rita": "took it back", "Fio": "was never heard", "Una": "is unknown"}
@@ -212,22 +208,7 @@ class OutcomesTest(unittest.TestCase):
         self.assertEqual(len(answers), 1, answers)
 
 
-def outside():
-    """Starts a display and a session bus, and this file again inside them."""
-    for needed in ("Xvfb", "dbus-run-session", SYSTEM_PYTHON):
-        if not shutil.which(needed):
-            print(needed, "is not installed")
-            return 77
-    if subprocess.run([SYSTEM_PYTHON, "-c", "import dbusmock, pyatspi"], capture_output=True, check=False).returncode != 0:
-        print("python3-pyatspi or python3-dbusmock is not installed")
-        return 77
-    with tempfile.TemporaryDirectory() as runtime, VirtualDisplay("900x900") as display:
-        environment = {**os.environ, "DISPLAY": display.name, "XDG_RUNTIME_DIR": runtime, "KTR_INSIDE": "yes"}
-        return subprocess.run(["dbus-run-session", "--", SYSTEM_PYTHON, __file__, *sys.argv[1:]], env=environment,
-                              timeout=590, check=False).returncode
-
-
 if __name__ == "__main__":
     if "KTR_INSIDE" not in os.environ:
-        sys.exit(outside())
+        sys.exit(outside(__file__, modules=("dbusmock", "pyatspi"), seconds=590))
     unittest.main(argv=[sys.argv[0], *sys.argv[3:]])

@@ -12,8 +12,9 @@ import time
 import unittest
 
 import accessibility_test as accessibility
-from accessibility_test import nodes, wait_for
+from accessibility_test import wait_for
 from own_service import OwnService
+from screen_session import tree
 
 PROGRAM = os.environ["KTR_PROGRAM"]
 SERVICE = os.environ["KTR_SERVICE"]
@@ -54,16 +55,7 @@ class OwnWindowTest(unittest.TestCase):
         self.addCleanup(self.program.kill)
 
     def tree(self):
-        import pyatspi
-        from gi.repository import GLib
-
-        try:
-            desktop = pyatspi.Registry.getDesktop(0)
-            programs = [desktop.getChildAtIndex(i) for i in range(desktop.childCount)]
-            mine = [one for one in programs if one and one.get_process_id() == self.program.pid and one.childCount]
-            return list(nodes(mine[0])) if mine else []
-        except (AttributeError, RuntimeError, LookupError, GLib.Error):
-            return []
+        return tree(self.program.pid)
 
     def find(self, role, name):
         """The node whose name begins so, once it is there and shown."""
