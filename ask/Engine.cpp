@@ -154,8 +154,8 @@ void Engine::goOn(Begun begun, const Completion& completion, const Meant& unders
     isPersonal(want) && want != Wish::TellNow ? wish(asking, completion) : read(asking, completion);
 }
 
-void Engine::gather(const Shared& asking, std::shared_ptr<const std::vector<std::string>> handles, std::size_t from,
-                    Dictionary gathered, const std::function<void(ServiceReply)>& then) {
+void Engine::gather(const Shared& asking, const std::shared_ptr<const std::vector<std::string>>& handles,
+                    std::size_t from, const Dictionary& gathered, const std::function<void(ServiceReply)>& then) {
     const std::size_t end = std::min(from + kMostHandles, handles->size());
     Dictionary members{{"handles", Value::Array(handles->begin() + static_cast<std::ptrdiff_t>(from),
                                                 handles->begin() + static_cast<std::ptrdiff_t>(end))},
@@ -171,20 +171,21 @@ void Engine::gather(const Shared& asking, std::shared_ptr<const std::vector<std:
     if (asking->understood.meaning.thisMoment && asking->question.mayChange && !asking->understood.people.empty()) {
         members.set("fresh", true);
     }
-    service_.send({"getlocations", members, asking->language->tag()}, [this, asking, handles, end, gathered, then](ServiceReply reply) {
-        if (reply.failure != ServiceReply::Failure::None) {
-            return then(std::move(reply));
-        }
-        Dictionary locations = memberOf(gathered, "locations");
-        for (const auto& [handle, entry] : memberOf(reply.body, "locations")) {
-            locations.set(handle, entry);
-        }
-        reply.body.set("locations", locations);
-        if (end == handles->size()) {
-            return then(std::move(reply));
-        }
-        gather(asking, handles, end, std::move(reply.body), then);
-    });
+    service_.send({"getlocations", members, asking->language->tag()},
+                  [this, asking, handles, end, gathered, then](ServiceReply reply) {
+                      if (reply.failure != ServiceReply::Failure::None) {
+                          return then(std::move(reply));
+                      }
+                      Dictionary locations = memberOf(gathered, "locations");
+                      for (const auto& [handle, entry] : memberOf(reply.body, "locations")) {
+                          locations.set(handle, entry);
+                      }
+                      reply.body.set("locations", locations);
+                      if (end == handles->size()) {
+                          return then(std::move(reply));
+                      }
+                      gather(asking, handles, end, reply.body, then);
+                  });
 }
 
 void Engine::read(const Shared& asking, const Completion& completion) {

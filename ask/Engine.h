@@ -73,8 +73,8 @@ class Engine {
                     const Completion& completion);
     void wish(const Shared& asking, const Completion& completion);
     /// Asks for the handles from `from` on, as many requests as it takes, then goes on with all entries in one answer.
-    void gather(const Shared& asking, std::shared_ptr<const std::vector<std::string>> handles, std::size_t from,
-                platform::Dictionary gathered, const std::function<void(ServiceReply)>& then);
+    void gather(const Shared& asking, const std::shared_ptr<const std::vector<std::string>>& handles, std::size_t from,
+                const platform::Dictionary& gathered, const std::function<void(ServiceReply)>& then);
 
     std::shared_ptr<Languages> languages_;
     ServicePort& service_;

@@ -173,7 +173,7 @@ void People::addNames(std::size_t number) {
     for (const auto& [one, other] : {std::pair(first, last), std::pair(last, first), std::pair(nickname, last)}) {
         if (!one.empty() && !other.empty()) {
             const bool joined = FoldedText::isWithoutBlanks(one.back()) || FoldedText::isWithoutBlanks(other.front());
-            add(joined ? one + other : one + U" " + other, number);
+            add(std::u32string(one).append(joined ? U"" : U" ").append(other), number);
         }
     }
     for (const std::string& email : person.emails) {

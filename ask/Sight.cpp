@@ -138,7 +138,7 @@ bool Sight::isCalled(const std::u32string& name) const {
 std::string Sight::sort(const Language& language) const {
     for (const std::string& label : labels) {
         const std::string kind = kindOf(label);
-        const std::string sort = kind.empty() ? language.placeWord(label) : kind;
+        std::string sort = kind.empty() ? language.placeWord(label) : kind;
         if (language.kindOf(sort) != nullptr) {
             return sort;
         }

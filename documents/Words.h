@@ -23,8 +23,8 @@ std::string inQuotes(std::string_view text, std::size_t longest = 60);
 /// that are read aloud, where an escape would be spelt out.
 std::string withoutControls(std::string_view text);
 
-/// The text as one word of a command that somebody may paste into a shell: in single quotes, in which nothing is expanded
-/// or run, without what would end the line or steer the terminal.
+/// The text as one word of a command that somebody may paste into a shell: in single quotes, in which nothing is
+/// expanded or run, without what would end the line or steer the terminal.
 std::string asShellWord(std::string_view text);
 
 /// JSON fit to be printed: what would steer a terminal or override directions inside its strings becomes an escape,

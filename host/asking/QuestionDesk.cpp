@@ -41,8 +41,7 @@ ask::World worldOf(Host& host) {
     world.distance = [&host](double metres, const std::string& language) -> std::optional<std::string> {
         const auto& platform = *host.platform();
         const auto calculator = platform.distanceCalculators->makeDistanceCalculator(
-            {kAppGroup, language, platform.region->localeIdentifier(),
-             platform.localization});
+            {kAppGroup, language, platform.region->localeIdentifier(), platform.localization});
         const auto* words = dynamic_cast<const linux_::IcuDistanceCalculator*>(calculator.get());
         return words == nullptr ? std::nullopt : words->localizedDistance(metres);
     };
