@@ -31,6 +31,39 @@ int sync(int descriptor) {
     return result == 0 ? 0 : errno;
 }
 
+int copyAll(int from, int to) {
+    std::string block(std::size_t{1} << 18, '\0');
+    for (;;) {
+        const ssize_t count = ::read(from, block.data(), block.size());
+        if (count == 0 || (count < 0 && errno != EINTR)) {
+            return count == 0 ? 0 : errno;
+        }
+        const int failure = count < 0 ? 0 : writeAll(to, {block.data(), static_cast<std::size_t>(count)});
+        if (failure != 0) {
+            return failure;
+        }
+    }
+}
+
+/// What was written comes to the disk, or goes.
+int finish(int descriptor, int failure, const std::filesystem::path& file) {
+    if (failure == 0) {
+        failure = sync(descriptor);
+    }
+    // Some file systems report a full disk only here. The descriptor is gone whatever is said.
+    if (::close(descriptor) != 0 && failure == 0 && errno != EINTR) {
+        failure = errno;
+    }
+    if (failure != 0) {
+        ::unlink(file.c_str());
+    }
+    return failure;
+}
+
+int openNew(const std::filesystem::path& file, mode_t mode) {
+    return FileSteps::open(file, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW, mode);
+}
+
 }  // namespace
 
 int FileSteps::open(const std::filesystem::path& file, int flags, mode_t mode) {
@@ -42,21 +75,18 @@ int FileSteps::open(const std::filesystem::path& file, int flags, mode_t mode) {
 }
 
 int FileSteps::writeNew(const std::filesystem::path& file, std::string_view bytes, mode_t mode) {
-    const int descriptor = open(file, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW, mode);
-    if (descriptor < 0) {
+    const int descriptor = openNew(file, mode);
+    return descriptor < 0 ? errno : finish(descriptor, writeAll(descriptor, bytes), file);
+}
+
+int FileSteps::copyNew(const std::filesystem::path& from, const std::filesystem::path& to, mode_t mode) {
+    const int source = open(from, O_RDONLY);
+    if (source < 0) {
         return errno;
     }
-    int failure = writeAll(descriptor, bytes);
-    if (failure == 0) {
-        failure = sync(descriptor);
-    }
-    // Some file systems report a full disk only here. The descriptor is gone whatever is said.
-    if (::close(descriptor) != 0 && failure == 0 && errno != EINTR) {
-        failure = errno;
-    }
-    if (failure != 0) {
-        ::unlink(file.c_str());
-    }
+    const int descriptor = openNew(to, mode);
+    const int failure = descriptor < 0 ? errno : finish(descriptor, copyAll(source, descriptor), to);
+    ::close(source);
     return failure;
 }
 

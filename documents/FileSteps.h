@@ -14,6 +14,8 @@ class FileSteps {
   public:
     /// Makes a file that was not there, writes all bytes and brings them to the disk. What a failure leaves is removed.
     static int writeNew(const std::filesystem::path& file, std::string_view bytes, mode_t mode);
+    /// The same with the bytes of another file, however many they are. What is there already stays.
+    static int copyNew(const std::filesystem::path& from, const std::filesystem::path& to, mode_t mode);
     /// Brings the names in a folder to the disk.
     static int syncFolder(const std::filesystem::path& folder);
     /// `open`, closed in programs that are started later, and again where a signal came between. A descriptor, or -1

@@ -2,14 +2,19 @@
 
 #include <sqlite3.h>
 
+#include <cstring>
 #include <filesystem>
 #include <memory>
 #include <string_view>
 #include <system_error>
 
+#include "documents/FileSteps.h"
+
 namespace ktr::tiles {
 
 namespace {
+
+constexpr unsigned kOwnersAlone = 0600;
 
 struct Close {
     void operator()(sqlite3* database) const { sqlite3_close_v2(database); }
@@ -55,10 +60,9 @@ MbtilesIndex::State MbtilesIndex::stateOf(const std::string& path) {
 }
 
 std::string MbtilesIndex::copyIndexed(const std::string& from, const std::string& to) {
-    std::error_code failed;
-    std::filesystem::copy_file(from, to, failed);
-    if (failed) {
-        return failed.message();
+    // Whatever the file allows, its copy is to be written to.
+    if (const int failure = documents::FileSteps::copyNew(from, to, kOwnersAlone); failure != 0) {
+        return std::strerror(failure);
     }
     std::string problem;
     {
@@ -70,7 +74,8 @@ std::string MbtilesIndex::copyIndexed(const std::string& from, const std::string
         }
     }
     if (!problem.empty()) {
-        std::filesystem::remove(to, failed);
+        std::error_code nothingLeftToDo;
+        std::filesystem::remove(to, nothingLeftToDo);
     }
     return problem;
 }

@@ -1,7 +1,11 @@
 #include "tiles/MbtilesIndex.h"
 
 #include <sqlite3.h>
+#include <sys/resource.h>
+#include <sys/wait.h>
+#include <unistd.h>
 
+#include <csignal>
 #include <fstream>
 
 #include "tests/support/TemporaryFolder.h"
@@ -37,6 +41,28 @@ TEST_F(MbtilesIndexTest, AFileWithoutAnIndexGetsACopyWithOne_AndStaysAsItIs) {
     EXPECT_EQ(MbtilesIndex::stateOf(copy), MbtilesIndex::State::Indexed);
     EXPECT_EQ(MbtilesIndex::stateOf(plain), MbtilesIndex::State::Unindexed);
     EXPECT_NE(MbtilesIndex::copyIndexed(plain, copy), "") << "what is there is not overwritten";
+}
+
+// A map of two gigabytes that does not fit must not leave the disk full; and a map that may not be written to is copied
+// all the same.
+TEST_F(MbtilesIndexTest, ACopyThatDoesNotFit_IsTakenAwayAndTheReasonSaid) {
+    const auto plain = make("plain.mbtiles", tiles_);
+    std::filesystem::permissions(plain, std::filesystem::perms::owner_read);
+    const auto copy = (folder.path() / "copy.mbtiles").string();
+    const pid_t child = ::fork();
+    if (child == 0) {
+        std::signal(SIGXFSZ, SIG_IGN);
+        const rlimit few{3000, 3000};
+        ::setrlimit(RLIMIT_FSIZE, &few);
+        ::_exit(MbtilesIndex::copyIndexed(plain, copy) == "File too large" ? 0 : 1);
+    }
+    int status = 0;
+    ASSERT_EQ(::waitpid(child, &status, 0), child);
+    EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0);
+    EXPECT_FALSE(std::filesystem::exists(copy));
+    EXPECT_EQ(MbtilesIndex::copyIndexed(plain, copy), "");
+    EXPECT_EQ(std::filesystem::status(copy).permissions(),
+              std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
 }
 
 TEST_F(MbtilesIndexTest, AnIndexIsSeen_AlsoBehindAView) {
