@@ -30,6 +30,7 @@ void NameDesk::ask(std::vector<PlaceNames::Place> places, ViewerLocale viewer, T
     }
     const PlaceWords words(viewer);
     std::vector<PlaceName> names;
+    names.reserve(places.size());
     for (const PlaceNames::Place& place : places) {
         names.push_back({"", "", words.coordinates(place.latitude, place.longitude)});
     }

@@ -141,7 +141,7 @@ std::optional<StreetGrid::Nearest> StreetGrid::nearest(double x, double y, doubl
     double least = reach;
     for (int row = cellOf(y - reach); row <= cellOf(y + reach); ++row) {
         for (int column = cellOf(x - reach); column <= cellOf(x + reach); ++column) {
-            const auto cell = static_cast<std::size_t>(row * kSide + column);
+            const auto cell = static_cast<std::size_t>(row) * kSide + static_cast<std::size_t>(column);
             for (std::uint32_t entry = cell == 0 ? 0 : ends_[cell - 1]; entry < ends_[cell]; ++entry) {
                 const Segment& segment = segments_[entries_[entry]];
                 const double away = distance(segment, x, y);

@@ -122,7 +122,7 @@ PageLanguage::PageLanguage(const std::string& language, const std::string& zone)
 PageLanguage::~PageLanguage() = default;
 
 std::string PageLanguage::choose(std::string_view chosen, std::string_view accepted) {
-    if (const std::string tag = chosen.empty() ? "" : servedBy(chosen); !tag.empty()) {
+    if (std::string tag = chosen.empty() ? "" : servedBy(chosen); !tag.empty()) {
         return tag;
     }
     std::string best = "en";

@@ -303,7 +303,7 @@ void Service::takeTooLong(const HttpRequest& request, const HttpReply& reply) {
 
 std::optional<std::string> Service::cleanedFace(const Report& report) {
     std::string complaint;
-    const auto face = report.face ? Face::cleaned(*report.face, complaint) : std::nullopt;
+    auto face = report.face ? Face::cleaned(*report.face, complaint) : std::nullopt;
     counters_.droppedFaces += report.face && !face ? 1 : 0;
     return face;
 }

@@ -87,9 +87,10 @@ FenceSimulation::Crossings FenceSimulation::cross(int count, bool byCar, double 
             }
         };
         stay(arrives ? far : 0.0);
-        const double begin = uniform(0.0, speed * static_cast<double>(interval));
-        for (double way = begin; way < far; way += speed * static_cast<double>(interval)) {
+        double way = uniform(0.0, speed * static_cast<double>(interval));
+        while (way < far) {
             add(arrives ? far - way : way);
+            way += speed * static_cast<double>(interval);
         }
         stay(arrives ? 0.0 : far);
         ++crossings.made;

@@ -148,7 +148,7 @@ std::string Migrations::run(Database& database, bool make) {
     };
     database.clear();
     auto schema = database.schema();
-    if (const std::string refused = refusal(schema); !refused.empty() || *schema == latest()) {
+    if (std::string refused = refusal(schema); !refused.empty() || *schema == latest()) {
         return refused;
     }
     if (!database.begin()) {
