@@ -96,9 +96,9 @@ struct SignIn::Spent {
     std::string secret;
 };
 
-SignIn::SignIn(std::filesystem::path configurationFile) : SignIn(std::move(configurationFile), storeInKeyring) {}
+SignIn::SignIn(const std::filesystem::path& configurationFile) : SignIn(configurationFile, storeInKeyring) {}
 
-SignIn::SignIn(std::filesystem::path configurationFile, Store store)
+SignIn::SignIn(const std::filesystem::path& configurationFile, Store store)
     : file_(documents::FileSteps::absolute(configurationFile)), store_(std::move(store)) {}
 
 SignIn::~SignIn() {

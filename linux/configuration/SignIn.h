@@ -50,8 +50,8 @@ class SignIn {
                                      const std::atomic<bool>& givesUp, std::string& problem)>;
 
     /// With the user's Secret Service.
-    explicit SignIn(std::filesystem::path configurationFile);
-    SignIn(std::filesystem::path configurationFile, Store store);
+    explicit SignIn(const std::filesystem::path& configurationFile);
+    SignIn(const std::filesystem::path& configurationFile, Store store);
     /// As `cancel`.
     ~SignIn();
     SignIn(const SignIn&) = delete;

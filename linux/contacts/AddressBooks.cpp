@@ -19,6 +19,9 @@ namespace {
 
 const QString kBus = QStringLiteral("org.freedesktop.DBus");
 const QString kBusPath = QStringLiteral("/org/freedesktop/DBus");
+/// What the connection says of itself (D-Bus specification, "org.freedesktop.DBus.Local").
+const QString kLocal = QStringLiteral("org.freedesktop.DBus.Local");
+const QString kLocalPath = QStringLiteral("/org/freedesktop/DBus/Local");
 const QString kObjects = QStringLiteral("org.freedesktop.DBus.ObjectManager");
 const QString kProperties = QStringLiteral("org.freedesktop.DBus.Properties");
 /// The services' names end in the number of their interface's version.
@@ -75,6 +78,8 @@ AddressBooks::AddressBooks(QDBusConnection bus, Read read, const Pauses& pauses)
         const bool isLost = books_.empty() || isStale_;
         isLost ? start() : refresh();
     });
+    // What was asked of a bus that goes is not answered, nor does it end.
+    bus_.connect(QString(), kLocalPath, kLocal, QStringLiteral("Disconnected"), this, SLOT(start()));
 }
 
 AddressBooks::~AddressBooks() = default;

@@ -47,6 +47,7 @@ class AddressBooks : public QObject {
     AddressBooks(QDBusConnection bus, Read read, const Pauses& pauses);
     ~AddressBooks() override;
 
+  public Q_SLOTS:
     void start();
 
   private Q_SLOTS:

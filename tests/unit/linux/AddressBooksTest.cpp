@@ -100,6 +100,24 @@ TEST_F(AddressBooksTest, SilentBook_IsLeftOutAndTriedAgain) {
     EXPECT_TRUE(comesTo("local{Ann}"));
 }
 
+TEST_F(AddressBooksTest, BusThatDiesWhileABookIsRead_KeepsNobodyWaiting) {
+    auto dying = std::make_unique<PrivateBus>();
+    auto service = std::make_unique<FakeAddressBooks>(*dying);
+    service->set(QStringLiteral("local"), {"Ann"});
+    service->setManner(Manner::Silent, QStringLiteral("Open"));
+    books = std::make_unique<AddressBooks>(dying->connect(QStringLiteral("books-client")),
+                                           [this](const std::vector<AddressBooks::Book>& now, bool complete) {
+                                               told = now;
+                                               isComplete = isComplete || complete;
+                                           });
+    books->start();
+    ASSERT_TRUE(comesTo("local{}")) << "it is being read";
+    EXPECT_FALSE(isComplete);
+    dying.reset();
+    EXPECT_TRUE(eventually([&] { return isComplete; }));
+    EXPECT_EQ(cards(), "local{}");
+}
+
 TEST_F(AddressBooksTest, SilentRegistry_IsTriedAgain) {
     FakeAddressBooks service(bus);
     service.set(QStringLiteral("local"), {"Ann"});
