@@ -339,13 +339,13 @@ class Drawer {
 
     /// Its name beside it, or beside whatever stands on it: it is what says where the map is. Whether there was room.
     bool drawNearest(const Nearest& nearest) {
-        constexpr double kFarthest = 60.0;
+        constexpr int kSteps = 10;
         constexpr double kStep = 6.0;
         const MapText text(QString::fromStdString(names_.town(*nearest.town)), language_, {14, true, false});
         const QRectF dot = dotAt(nearest.spot);
         const bool isSeen = !isTaken(dot);
-        for (double out = 0.0; out <= kFarthest; out += kStep) {
-            if (placeBeside(text, nearest.spot, kTownRadius + kTownEdge / 2.0 + out)) {
+        for (int step = 0; step <= kSteps; ++step) {
+            if (placeBeside(text, nearest.spot, kTownRadius + kTownEdge / 2.0 + step * kStep)) {
                 if (isSeen) {
                     drawDot(nearest.spot);
                     taken_.push_back(dot);

@@ -111,10 +111,11 @@ void ServiceCheck::run(HttpsClient& client, const Account& account, std::functio
     request.deadline = kDeadline;
     request.inactivityLimit = kDeadline;
     const auto began = std::chrono::steady_clock::now();
-    client.send(std::move(request), account.certificateFiles, [began, done = std::move(done)](HttpsAnswer answer) {
-        const double seconds = std::chrono::duration<double>(std::chrono::steady_clock::now() - began).count();
-        done(of(answer, seconds, SystemClock().now()));
-    });
+    client.send(
+        std::move(request), account.certificateFiles, [began, done = std::move(done)](const HttpsAnswer& answer) {
+            const double seconds = std::chrono::duration<double>(std::chrono::steady_clock::now() - began).count();
+            done(of(answer, seconds, SystemClock().now()));
+        });
 }
 
 }  // namespace ktr::linux_

@@ -128,8 +128,8 @@ WordFont* WordFont::of(const FontSpec& spec, QChar::Script script) {
     return known.fonts.emplace_back(Fonts::Font{spec, script, std::move(made)}).font.get();
 }
 
-WordFont::WordFont(QRawFont raw, std::shared_ptr<hb_face_t> face, QChar::Script script)
-    : raw_(std::move(raw)),
+WordFont::WordFont(const QRawFont& raw, std::shared_ptr<hb_face_t> face, QChar::Script script)
+    : raw_(raw),
       script_(script),
       face_(std::move(face)),
       unrounded_(hb_font_create(face_.get()), hb_font_destroy),

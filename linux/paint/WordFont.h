@@ -40,7 +40,7 @@ class WordFont {
     /// until the application ends; valid until then.
     static WordFont* of(const FontSpec& spec, QChar::Script script);
 
-    WordFont(QRawFont raw, std::shared_ptr<hb_face_t> face, QChar::Script script);
+    WordFont(const QRawFont& raw, std::shared_ptr<hb_face_t> face, QChar::Script script);
     ~WordFont();
     WordFont(const WordFont&) = delete;
     WordFont& operator=(const WordFont&) = delete;
