@@ -138,6 +138,14 @@ class OvosSkillTest(unittest.TestCase):
         self.start("--ktr", "/nonexistent/ktr")
         self.assertEqual(self.bus.ask("where is ann"), ([], False))
 
+    def test_a_program_that_says_something_else_is_passed_over_each_time(self):
+        other = self.folder / "other"
+        other.write_text('#!/bin/sh\nfor word; do case $word in --output=*) : >"${word#--output=}";; esac; done\necho "[1]"\n')
+        other.chmod(0o700)
+        self.start("--ktr", str(other))
+        for _ in range(2):
+            self.assertEqual(self.bus.ask("where is ann"), ([], False))
+
     def test_it_can_be_installed(self):
         source, target = self.folder / "source", self.folder / "installed"
         subprocess.run(["cp", "-r", SKILL, source], check=True)

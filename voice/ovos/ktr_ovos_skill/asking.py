@@ -72,9 +72,10 @@ class Asking:
         line = self.process.stdout.readline()
         late.cancel()
         try:
-            self.answer = json.loads(line)
-        except ValueError:
-            self.answer = None
+            answer = json.loads(line)
+        except (ValueError, RecursionError):
+            answer = None
+        self.answer = answer if isinstance(answer, dict) else None
 
     def end(self):
         self.process.kill()

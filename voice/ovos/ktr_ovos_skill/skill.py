@@ -60,7 +60,7 @@ class Skill:
             return self.close_question(message, False)
         self.asking = asking
         answer = asking.answer
-        sentence = answer.get("sentence") if isinstance(answer, dict) and answer.get("outcome") != "notUnderstood" else None
+        sentence = answer.get("sentence") if answer and answer.get("outcome") != "notUnderstood" else None
         if sentence:
             lang = message.data.get("lang")
             self.bus.send(message.answer("speak", {"utterance": sentence, "lang": lang if isinstance(lang, str) else "en-us",
