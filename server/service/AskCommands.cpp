@@ -26,6 +26,10 @@ constexpr std::size_t kLongestHandle = 254;
 /// Moments that whole seconds can tell.
 constexpr double kLatest = 1e15;
 
+bool isNoHandle(const std::string& handle) {
+    return handle.empty() || handle.size() > kLongestHandle || handle.find('\0') != std::string::npos;
+}
+
 HttpResponse notWritten() {
     return refusal(503, "the store cannot be written");
 }
@@ -49,8 +53,8 @@ std::optional<AskCommands::Wish> AskCommands::read(const Dictionary& body, std::
         fields.complain("wish", R"(expected "read", "hide" or "share")");
     }
     wish.with = fields.texts("with");
-    if (wish.with.size() > kMostNamed) {
-        fields.complain("with", "expected at most " + std::to_string(kMostNamed));
+    if (wish.with.size() > kMostNamed || std::any_of(wish.with.begin(), wish.with.end(), isNoHandle)) {
+        fields.complain("with", "expected at most " + std::to_string(kMostNamed) + " handles");
     }
     if (const auto until = fields.number("until", 0.0, kLatest)) {
         wish.until = static_cast<std::int64_t>(std::floor(*until / kMillisecondsASecond));
@@ -103,9 +107,6 @@ void AskCommands::askToShare(const Device& device, const Dictionary& body, const
         fields.complain("clientContext", "expected an object, found nothing");
     }
     const auto handles = fields.texts("handles");
-    const auto isNoHandle = [](const std::string& handle) {
-        return handle.empty() || handle.size() > kLongestHandle || handle.find('\0') != std::string::npos;
-    };
     if (handles.empty() || handles.size() > kMostNamed || std::any_of(handles.begin(), handles.end(), isNoHandle)) {
         fields.complain("handles", "expected 1 to " + std::to_string(kMostNamed) + " handles");
     }
@@ -125,75 +126,22 @@ void AskCommands::askToShare(const Device& device, const Dictionary& body, const
 
 void AskCommands::sharing(const Device& device, const Wish& wish, const HttpReply& reply) const {
     if (wish.kind == Wish::Kind::Read) {
-        return tell(device, reply);
-    }
-    if (!wish.with.empty()) {
-        return changeRules(device, wish, reply);
+        return tell(device, true, reply);
     }
     // The answer follows the commit.
-    const bool done = setup_.store.setHidden(device.person, wish.kind == Wish::Kind::Hide, setup_.now());
-    done ? tell(device, reply) : reply.send(notWritten());
+    const bool hides = wish.kind == Wish::Kind::Hide;
+    const bool done = wish.with.empty() ? setup_.store.setHidden(device.person, hides, setup_.now())
+                                        : setup_.store.changeRules(device.person, wish.with,
+                                                                   {hides, wish.until, wish.precision}, setup_.now());
+    // Who sees the person is told to who asks that alone: else a wish for a handle would tell who is at this service.
+    done ? tell(device, wish.with.empty(), reply) : reply.send(notWritten());
 }
 
-bool AskCommands::isTakenBack(std::int64_t owner, std::int64_t viewer) const {
-    if (setup_.store.revokeGrant(owner, viewer)) {
-        return true;
-    }
-    // There was none, or it could not be ended.
-    const std::uint64_t failures = setup_.store.readFailures();
-    const auto left = setup_.store.sharing(viewer, owner);
-    return left && !left->grant && setup_.store.readFailures() == failures;
-}
-
-void AskCommands::changeRules(const Device& device, const Wish& wish, const HttpReply& reply) const {
-    const std::uint64_t failures = setup_.store.readFailures();
-    std::vector<std::int64_t> viewers;
-    for (const std::string& handle : wish.with) {
-        const auto viewer = setup_.store.personOf(handle);
-        if (setup_.store.readFailures() != failures) {
-            return reply.send(notRead());
-        }
-        if (!viewer || *viewer == device.person) {
-            return reply.send(refusal(404, "the service has nobody else with this handle"));
-        }
-        viewers.push_back(*viewer);
-    }
-    const auto now = setup_.store.present(setup_.now());
-    const auto rules = setup_.store.grantsOf(device.person);
-    for (const std::int64_t viewer : viewers) {
-        if (wish.kind == Wish::Kind::Hide) {
-            if (!isTakenBack(device.person, viewer)) {
-                return reply.send(notWritten());
-            }
-            continue;
-        }
-        const auto person = setup_.store.person(viewer);
-        const auto before = std::find_if(rules.begin(), rules.end(),
-                                         [&](const auto& rule) { return person && rule.first == person->name; });
-        // What was agreed with this viewer before stays, but for what the wish names.
-        Grant rule;
-        rule.from = now;
-        if (before != rules.end() && before->second.end() > now) {
-            rule = before->second;
-        } else if (before != rules.end()) {
-            // Of what is over no leave comes back by itself, and nothing from before is seen.
-            rule.precision = before->second.precision;
-        }
-        rule.precision = wish.precision.value_or(rule.precision);
-        rule.until = wish.until;
-        rule.arrival = 0;
-        rule.confirmed = now;
-        if (!person || !setup_.store.grant(device.person, viewer, rule)) {
-            return reply.send(notWritten());
-        }
-    }
-    tell(device, reply);
-}
-
-void AskCommands::tell(const Device& device, const HttpReply& reply) const {
+void AskCommands::tell(const Device& device, bool tellsViewers, const HttpReply& reply) const {
     const std::uint64_t failures = setup_.store.readFailures();
     const auto person = setup_.store.person(device.person);
-    const auto rules = setup_.store.grantsOf(device.person);
+    const auto rules =
+        tellsViewers ? setup_.store.grantsOf(device.person) : std::vector<std::pair<std::string, Grant>>();
     if (!person || setup_.store.readFailures() != failures) {
         return reply.send(notRead());
     }
@@ -213,7 +161,9 @@ void AskCommands::tell(const Device& device, const HttpReply& reply) const {
         }
         viewers.emplace_back(std::move(viewer));
     }
-    answer.set("viewers", std::move(viewers));
+    if (tellsViewers) {
+        answer.set("viewers", std::move(viewers));
+    }
     reply.send(HttpResponse::json(200, platform::writeJson(answer)));
 }
 

@@ -42,11 +42,7 @@ class AskCommands {
     /// Asks those with these handles to share; answered alike whoever has them, and whether anybody does.
     void askToShare(const Device& device, const platform::Dictionary& body, const HttpReply& reply) const;
     void sharing(const Device& device, const Wish& wish, const HttpReply& reply) const;
-    /// Changes the rules for those who are named; all of them or, where somebody is not known, none.
-    void changeRules(const Device& device, const Wish& wish, const HttpReply& reply) const;
-    /// Ends a rule; false: it may still hold.
-    bool isTakenBack(std::int64_t owner, std::int64_t viewer) const;
-    void tell(const Device& device, const HttpReply& reply) const;
+    void tell(const Device& device, bool tellsViewers, const HttpReply& reply) const;
     void places(const Device& device, const HttpReply& reply) const;
     /// Those whom the person would see now; who hides, ended a rule or was never heard is no different from a stranger.
     void friends(const Device& device, const HttpReply& reply) const;

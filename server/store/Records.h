@@ -71,6 +71,13 @@ struct Look {
     bool asked = false;     ///< else carried along with what a phone is told
 };
 
+/// What somebody wishes for those who are named: that a rule ends, or begins or goes on as it is said here. A value.
+struct RuleWish {
+    bool ends = false;
+    std::optional<std::int64_t> until;   ///< seconds since 1970; none: without an end
+    std::optional<Precision> precision;  ///< none: as before, exact for a new rule
+};
+
 /// What became of the answer to "is this grant still meant?".
 enum class Confirmation {
     Kept,

@@ -118,6 +118,10 @@ class Store {
     bool grant(std::int64_t owner, std::int64_t viewer, const Grant& grant);
     /// Whether there was one.
     bool revokeGrant(std::int64_t owner, std::int64_t viewer);
+    /// What a person wishes for those with these handles (text without zeros), in one commit. Whom nobody knows, and
+    /// the person themself, it does not concern: nothing tells them from somebody for whom there was nothing to change.
+    bool changeRules(std::int64_t owner, const std::vector<std::string>& handles, const RuleWish& wish,
+                     std::int64_t now);
     /// The owner says that a grant without an end is still meant.
     Confirmation confirmGrant(std::int64_t owner, std::int64_t viewer, std::int64_t now);
     /// How many secrets of a person ended. Their browsers are signed out, their unused links are void.
@@ -294,6 +298,8 @@ class Store {
     /// Of seven columns: exactness, since, until, arrival, aloud, confirmed, fences.
     static Grant grantOf(const Database::Run& row, int firstColumn);
     static std::optional<Grant> readGrant(Database& database, std::int64_t owner, std::int64_t viewer);
+    void grantIn(Database& database, std::int64_t owner, std::int64_t viewer, const Grant& grant);
+    void revokeByHandleIn(Database& database, std::int64_t owner, const std::string& handle);
     static void askPlaces(std::deque<Database::Run>& runs, Database& database, std::int64_t owner);
     static std::vector<NamedPlace> placesIn(Database::Run& row);
     static std::vector<NamedPlace> readPlaces(Database& database, std::int64_t owner);

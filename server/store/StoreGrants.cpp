@@ -12,6 +12,12 @@ bool covers(Precision one, Precision other) {
     return one == other || one == Precision::Exact || (other != Precision::Places && one < other);
 }
 
+/// Who has a handle in the form that is kept; 0: nobody.
+std::int64_t personIn(Database& database, const std::string& handle) {
+    auto row = database.statement("SELECT person FROM handle WHERE text = $1");
+    return row.bind(std::string_view(handle)).next() ? row.integer(0) : 0;
+}
+
 }  // namespace
 
 Grant Store::grantOf(const Database::Run& row, int column) {
@@ -33,41 +39,42 @@ std::optional<Grant> Store::readGrant(Database& database, std::int64_t owner, st
     return row.bind(owner).bind(viewer).next() ? std::optional(grantOf(row, 0)) : std::nullopt;
 }
 
+void Store::grantIn(Database& database, std::int64_t owner, std::int64_t viewer, const Grant& grant) {
+    changes(owner);
+    changes(viewer);
+    const std::int64_t latest = present(0);
+    const auto before = readGrant(database, owner, viewer);
+    // Whoever saw as exactly until now goes on seeing; else nothing from before is seen.
+    const bool goesOn = before && latest < before->end() && covers(before->precision, grant.precision);
+    const std::int64_t since = goesOn ? std::min(before->from, grant.from) : afterAllHeard(database, owner, grant.from);
+    // The question comes 90 days after somebody said so, not after what is seen begins.
+    const auto confirmed = grant.confirmed || grant.until || latest <= since ? grant.confirmed : latest;
+    database
+        .statement(
+            "INSERT INTO share (viewer, owner, exactness, since, until, arrival, aloud, confirmed, fences) "
+            "VALUES ($1, $2, $3, $4, $5, $6, $7, $8, $9) ON CONFLICT (viewer, owner) DO UPDATE SET "
+            "exactness = excluded.exactness, since = excluded.since, until = excluded.until, "
+            "arrival = excluded.arrival, aloud = excluded.aloud, confirmed = excluded.confirmed, "
+            "fences = excluded.fences")
+        .bind(viewer)
+        .bind(owner)
+        .bind(static_cast<std::int64_t>(grant.precision))
+        .bind(since)
+        .bind(grant.until)
+        .bind(grant.arrival)
+        .bind(std::int64_t{grant.aloud})
+        .bind(confirmed)
+        .bind(std::int64_t{grant.fences})
+        .run();
+    Grant kept = grant;
+    kept.from = since;
+    if (!goesOn || !kept.tells(latest)) {
+        endFencesIn(database, owner, viewer);
+    }
+}
+
 bool Store::grant(std::int64_t owner, std::int64_t viewer, const Grant& grant) {
-    return writeNow([&](Database& database) {
-        changes(owner);
-        changes(viewer);
-        const std::int64_t latest = present(0);
-        const auto before = readGrant(database, owner, viewer);
-        // Whoever saw as exactly until now goes on seeing; else nothing from before is seen.
-        const bool goesOn = before && latest < before->end() && covers(before->precision, grant.precision);
-        const std::int64_t since =
-            goesOn ? std::min(before->from, grant.from) : afterAllHeard(database, owner, grant.from);
-        // The question comes 90 days after somebody said so, not after what is seen begins.
-        const auto confirmed = grant.confirmed || grant.until || latest <= since ? grant.confirmed : latest;
-        database
-            .statement(
-                "INSERT INTO share (viewer, owner, exactness, since, until, arrival, aloud, confirmed, fences) "
-                "VALUES ($1, $2, $3, $4, $5, $6, $7, $8, $9) ON CONFLICT (viewer, owner) DO UPDATE SET "
-                "exactness = excluded.exactness, since = excluded.since, until = excluded.until, "
-                "arrival = excluded.arrival, aloud = excluded.aloud, confirmed = excluded.confirmed, "
-                "fences = excluded.fences")
-            .bind(viewer)
-            .bind(owner)
-            .bind(static_cast<std::int64_t>(grant.precision))
-            .bind(since)
-            .bind(grant.until)
-            .bind(grant.arrival)
-            .bind(std::int64_t{grant.aloud})
-            .bind(confirmed)
-            .bind(std::int64_t{grant.fences})
-            .run();
-        Grant kept = grant;
-        kept.from = since;
-        if (!goesOn || !kept.tells(latest)) {
-            endFencesIn(database, owner, viewer);
-        }
-    });
+    return writeNow([&](Database& database) { grantIn(database, owner, viewer, grant); });
 }
 
 bool Store::revokeGrant(std::int64_t owner, std::int64_t viewer) {
@@ -80,6 +87,54 @@ bool Store::revokeGrant(std::int64_t owner, std::int64_t viewer) {
         endFencesIn(database, owner, viewer);
     });
     return good && ended > 0;
+}
+
+void Store::revokeByHandleIn(Database& database, std::int64_t owner, const std::string& handle) {
+    std::int64_t viewer = 0;
+    {
+        // One question whoever has the handle: it takes as long for nobody.
+        auto row = database.statement(
+            "DELETE FROM share WHERE owner = $1 AND viewer = (SELECT person FROM handle WHERE text = $2) "
+            "RETURNING viewer");
+        if (!row.bind(owner).bind(std::string_view(handle)).next()) {
+            return;
+        }
+        viewer = row.integer(0);
+    }
+    changes(owner);
+    changes(viewer);
+    endFencesIn(database, owner, viewer);
+}
+
+bool Store::changeRules(std::int64_t owner, const std::vector<std::string>& handles, const RuleWish& wish,
+                        std::int64_t now) {
+    return writeNow([&](Database& database) {
+        const std::int64_t latest = present(now);
+        for (const std::string& handle : handles) {
+            if (wish.ends) {
+                revokeByHandleIn(database, owner, normalisedHandle(handle));
+                continue;
+            }
+            const std::int64_t viewer = personIn(database, normalisedHandle(handle));
+            if (viewer == 0 || viewer == owner) {
+                continue;
+            }
+            Grant rule;
+            rule.from = latest;
+            if (const auto before = readGrant(database, owner, viewer); before && before->end() > latest) {
+                // What was agreed with this viewer before stays, but for what the wish names.
+                rule = *before;
+            } else if (before) {
+                // Of what is over no leave comes back by itself, and nothing from before is seen.
+                rule.precision = before->precision;
+            }
+            rule.precision = wish.precision.value_or(rule.precision);
+            rule.until = wish.until;
+            rule.arrival = 0;
+            rule.confirmed = latest;
+            grantIn(database, owner, viewer, rule);
+        }
+    });
 }
 
 Confirmation Store::confirmGrant(std::int64_t owner, std::int64_t viewer, std::int64_t now) {

@@ -209,6 +209,9 @@ TEST_P(StoreFences, EndedGrant_EndsThem_WithWhatTheyHaveNotTold) {
     EXPECT_TRUE(store_->revokeGrant(ann_, otto_));
     isOver("revoked");
     begin();
+    EXPECT_TRUE(store_->changeRules(ann_, {"OTTO@x.example"}, {true, std::nullopt, std::nullopt}, kNow));
+    isOver("revoked by handle");
+    begin();
     EXPECT_TRUE(letTell(otto_, Precision::Town));
     isOver("less exact");
     begin();

@@ -1,5 +1,10 @@
 #include <gtest/gtest.h>
 
+#include <mutex>
+#include <set>
+#include <string>
+#include <vector>
+
 #include "server/store/Store.h"
 #include "tests/unit/server/StoreContract.h"
 
@@ -44,6 +49,30 @@ class StoreRules : public StoreContract {
         return store_->deviceOf(secret, failed)->id;
     }
 };
+
+TEST_P(StoreRules, RulesForSeveral_AreChangedInOneCommit) {
+    std::mutex mutex;
+    std::vector<server::Change> heard;
+    const auto listening = store_->listen([&](const server::Change& change) {
+        const std::lock_guard<std::mutex> lock(mutex);
+        if (change.concerns(ann_) && !change.everything) {
+            heard.push_back(change);
+        }
+    });
+    const std::vector<std::string> both{"otto@x.example", "nobody@x.example", "Mara@x.example"};
+    ASSERT_TRUE(store_->changeRules(ann_, both, {false, kNow + 60, Precision::Town}, kNow));
+    for (const auto& [name, rule] : store_->grantsOf(ann_)) {
+        EXPECT_EQ(rule.precision, Precision::Town) << name;
+        EXPECT_EQ(rule.until, kNow + 60) << name;
+    }
+    ASSERT_TRUE(store_->changeRules(ann_, both, {true, std::nullopt, std::nullopt}, kNow));
+    EXPECT_TRUE(store_->grantsOf(ann_).empty());
+    const std::lock_guard<std::mutex> lock(mutex);
+    ASSERT_EQ(heard.size(), 2U) << "one for each wish";
+    for (const server::Change& change : heard) {
+        EXPECT_EQ(change.people, (std::set<std::int64_t>{ann_, otto_, mara_}));
+    }
+}
 
 TEST_P(StoreRules, Places_AreTheirOwners_ReplacedByNameAndRemoved) {
     ASSERT_TRUE(store_->setPlace(ann_, home(false)));
