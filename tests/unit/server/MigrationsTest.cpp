@@ -1,6 +1,7 @@
 #include "server/store/Migrations.h"
 
 #include <gtest/gtest.h>
+#include <libpq-fe.h>
 #include <sqlite3.h>
 #include <sys/stat.h>
 
@@ -76,34 +77,6 @@ class FileStoreTest : public ::testing::Test {
     std::unique_ptr<Store> open(std::string& complaint, bool make = false) const {
         return Store::open({folder_.path().string()}, make, complaint);
     }
-    static std::string contents(const std::string& path) {
-        const std::ifstream stream(path);
-        std::ostringstream text;
-        text << stream.rdbuf();
-        return text.str();
-    }
-    /// All columns of all tables, a line each.
-    static std::string columns(const std::string& path) {
-        sqlite3* handle = nullptr;
-        EXPECT_EQ(sqlite3_open(path.c_str(), &handle), SQLITE_OK);
-        std::string text;
-        const auto add = [](void* all, int, char** values, char**) {
-            *static_cast<std::string*>(all) += std::string(values[0]) + "\n";
-            return 0;
-        };
-        sqlite3_exec(
-            handle,
-            "SELECT m.name || ' ' || c.name || ' ' || c.type FROM sqlite_schema m, pragma_table_info(m.name) c "
-            "WHERE m.type = 'table' ORDER BY 1",
-            add, &text, nullptr);
-        sqlite3_close(handle);
-        return text;
-    }
-    std::string columnsOfNewStore() const {
-        std::string complaint;
-        EXPECT_TRUE(open(complaint, true)) << complaint;
-        return columns(file());
-    }
     TemporaryFolder folder_;
 };
 
@@ -135,37 +108,6 @@ TEST_F(FileStoreTest, StoreOfTheFirstVersion_IsBroughtToToday_WithAllThatIsInIt)
     // And again: nothing is left to do.
     store = open(complaint);
     EXPECT_TRUE(store) << complaint;
-}
-
-TEST_F(FileStoreTest, StoreOfEveryVersion_IsBroughtToToday_WithAllThatIsInIt) {
-    const std::string today = columnsOfNewStore();
-    for (int version = 1; version < Migrations::latest(); ++version) {
-        std::filesystem::remove_all(folder_.path());
-        std::filesystem::create_directory(folder_.path());
-        run(file(), kFirst);
-        for (int step = 2; step <= version; ++step) {
-            run(file(),
-                contents(std::string(KTR_TEST_DATA) + "/unit/server/stores/step" + std::to_string(step) + ".sql")
-                    .c_str());
-        }
-        std::string complaint;
-        const auto store = open(complaint);
-        ASSERT_TRUE(store) << version << ": " << complaint;
-        EXPECT_EQ(columns(file()), today) << version;
-        EXPECT_EQ(store->check(), "") << version;
-        const auto sharing = store->sharing(2, 1);
-        ASSERT_TRUE(sharing && sharing->grant) << version;
-        EXPECT_EQ(sharing->fixes.size(), 2U) << version;
-        EXPECT_EQ(sharing->grant->aloud, version >= 3);
-        EXPECT_EQ(sharing->grant->fences, version >= 6);
-        EXPECT_EQ(store->browsersOf(1, 1763760000).size(), version >= 2 ? 1U : 0U);
-        EXPECT_EQ(store->person(1)->zone, version >= 3 ? "Europe/Berlin" : "");
-        EXPECT_EQ(store->placesOf(1).size(), version >= 3 ? 1U : 0U);
-        EXPECT_EQ(store->retention(1)->looks, version >= 4 ? 86400 : 30 * 86400);
-        EXPECT_EQ(store->face(1).has_value(), version >= 5);
-        EXPECT_TRUE(store->everythingOf(1)->find("fix_wish")) << version;
-        EXPECT_EQ(store->fencesAbout(1).value().size(), version >= 6 ? 1U : 0U);
-    }
 }
 
 TEST_F(FileStoreTest, NewerStore_AndForeignFiles_AreRefusedWithASentence) {
@@ -217,6 +159,113 @@ TEST_F(FileStoreTest, StoreInMemory_IsOneStore_AndGoneAfterwards) {
     store = Store::open(address, true, complaint);
     ASSERT_TRUE(store) << complaint;
     EXPECT_TRUE(store->people().empty());
+}
+
+/// Stores as each version left them, of either kind.
+class StoreOfEveryVersion : public ::testing::TestWithParam<bool> {
+  protected:
+    void SetUp() override {
+        if (GetParam() && PrivatePostgres::shared() == nullptr) {
+            GTEST_SKIP() << "needs a PostgreSQL server: KTR_LONG_TESTS=1 starts one";
+        }
+    }
+    StoreAddress newAddress() {
+        const std::string folder = (folder_.path() / std::to_string(++stores_)).string();
+        return GetParam() ? StoreAddress{PrivatePostgres::shared()->newStore()}
+                          : StoreAddress{std::filesystem::create_directory(folder) ? folder : ""};
+    }
+    void run(const StoreAddress& address, const std::string& sql) const {
+        ASSERT_NE(sql, "");
+        if (!GetParam()) {
+            return test::run(address.text + "/service.db", sql.c_str());
+        }
+        PGconn* const connection = ::PQconnectdb(address.text.c_str());
+        PGresult* const result = ::PQexec(connection, ("BEGIN;" + sql + ";COMMIT").c_str());
+        EXPECT_EQ(::PQresultStatus(result), PGRES_COMMAND_OK) << ::PQresultErrorMessage(result);
+        ::PQclear(result);
+        ::PQfinish(connection);
+    }
+    /// What made a store of the version before one of this version.
+    std::string step(int version) const {
+        if (version == 1 && !GetParam()) {
+            return kFirst;
+        }
+        const std::ifstream stream(std::string(KTR_TEST_DATA) + "/unit/server/stores/" +
+                                   (GetParam() ? "postgresql/" : "") + "step" + std::to_string(version) + ".sql");
+        std::ostringstream text;
+        text << stream.rdbuf();
+        return text.str();
+    }
+    /// All columns of all tables, and all indexes, a line each.
+    std::string form(const StoreAddress& address) const {
+        std::string complaint;
+        const auto database = address.connect(complaint);
+        EXPECT_TRUE(database) << complaint;
+        auto row = database->statement(
+            GetParam() ? "SELECT table_name || ' ' || column_name || ' ' || data_type || ' ' || is_nullable || ' ' || "
+                         "COALESCE(collation_name, '') FROM information_schema.columns WHERE table_schema = "
+                         "current_schema() UNION SELECT tablename || ' ' || replace(indexdef, current_schema() || '.', "
+                         "'') FROM pg_indexes WHERE schemaname = current_schema() ORDER BY 1"
+                       : "SELECT m.name || ' ' || c.name || ' ' || c.type FROM sqlite_schema m, "
+                         "pragma_table_info(m.name) c WHERE m.type = 'table' UNION SELECT tbl_name || ' ' || sql FROM "
+                         "sqlite_schema WHERE type = 'index' AND sql IS NOT NULL ORDER BY 1");
+        std::string text;
+        while (row.next()) {
+            text += row.text(0) + "\n";
+        }
+        EXPECT_FALSE(database->failed()) << database->complaint();
+        return text;
+    }
+    TemporaryFolder folder_;
+    int stores_ = 0;
+};
+
+INSTANTIATE_TEST_SUITE_P(Sqlite, StoreOfEveryVersion, ::testing::Values(false));
+INSTANTIATE_TEST_SUITE_P(Postgres, StoreOfEveryVersion, ::testing::Values(true));
+
+TEST_P(StoreOfEveryVersion, IsBroughtToToday_WithAllThatIsInIt) {
+    std::string complaint;
+    const StoreAddress fresh = newAddress();
+    ASSERT_TRUE(Store::open(fresh, true, complaint)) << complaint;
+    const std::string today = form(fresh);
+    EXPECT_NE(today.find("ask_handle"), std::string::npos) << today;
+    for (int version = 1; version <= Migrations::latest(); ++version) {
+        const StoreAddress address = newAddress();
+        for (int one = 1; one <= version; ++one) {
+            run(address, step(one));
+        }
+        if (version == Migrations::latest()) {
+            EXPECT_EQ(form(address), today) << "what is kept here is what this version made";
+        }
+        const auto store = Store::open(address, false, complaint);
+        ASSERT_TRUE(store) << version << ": " << complaint;
+        EXPECT_EQ(form(address), today) << version;
+        EXPECT_EQ(store->check(), "") << version;
+        bool failed = false;
+        EXPECT_TRUE(store->deviceOf("foo", failed)) << version;
+        EXPECT_EQ(store->personOf("ANN@x.example"), 1) << version;
+        EXPECT_TRUE(store->person(2)->hidden) << version;
+        const auto sharing = store->sharing(2, 1);
+        ASSERT_TRUE(sharing && sharing->grant) << version;
+        EXPECT_EQ(sharing->grant->until, 1763800000) << version;
+        EXPECT_EQ(sharing->fixes, (std::vector<Fix>{{1763759000, 1763759001, 50.25, -3.5, 12.5},
+                                                    {1763759100, 1763759101, 50.5, -3.5, std::nullopt}}));
+        EXPECT_EQ(sharing->grant->aloud, version >= 3);
+        EXPECT_EQ(sharing->grant->fences, version >= 6);
+        EXPECT_EQ(store->browsersOf(1, 1763760000).size(), version >= 2 ? 1U : 0U);
+        EXPECT_EQ(store->person(1)->zone, version >= 3 ? "Europe/Berlin" : "");
+        EXPECT_EQ(store->placesOf(1).size(), version >= 3 ? 1U : 0U);
+        EXPECT_EQ(store->retention(1)->looks, version >= 4 ? 86400 : 30 * 86400);
+        EXPECT_EQ(store->face(1).has_value(), version >= 5);
+        EXPECT_TRUE(store->everythingOf(1)->find("fix_wish")) << version;
+        EXPECT_EQ(store->fencesAbout(1).value().size(), version >= 6 ? 1U : 0U);
+        EXPECT_EQ(store->askersOf(1, 1763760000).value().size(), version >= 9 ? 1U : 0U);
+        // And what was added since works.
+        EXPECT_TRUE(store->addPerson("new", {"new@x.example"}, 1763760000)) << version;
+        EXPECT_EQ(store->askToSee(store->personNamed("new")->id, {"ann@x.example"}, 1763760000),
+                  server::AskOutcome::Asked);
+        EXPECT_EQ(store->askersOf(1, 1763760000).value().size(), version >= 9 ? 2U : 1U);
+    }
 }
 
 class StoreMigrations : public StoreContract {};
