@@ -1,6 +1,7 @@
 #include "server/rules/FixWalk.h"
 
 #include <algorithm>
+#include <iterator>
 
 #include "server/ingest/FixRules.h"
 #include "server/rules/Cell.h"
@@ -10,7 +11,7 @@ namespace ktr::server {
 namespace {
 
 /// So many at most: what is read in vain stays small.
-constexpr std::int64_t kMostAtOnce = 16;
+constexpr std::int64_t kMostAtOnce = 64;
 
 }  // namespace
 
@@ -62,7 +63,14 @@ std::vector<FixWalk::Question> FixWalk::questions() const {
         }
         all.push_back({range, FixEdge::Last});
     }
+    if (asksForFirstToo()) {
+        all.push_back({range_, FixEdge::First});
+    }
     return all;
+}
+
+bool FixWalk::asksForFirstToo() const {
+    return step_ == Step::Going && known_ && !showsKnown_ && sure_ == range_.from;
 }
 
 bool FixWalk::isSamePlace(const Fix& one, const Fix& other) const {
@@ -122,32 +130,41 @@ void FixWalk::takeLast(const Fix& fix) {
     }
 }
 
+void FixWalk::takeFirst(const std::optional<Fix>& answer) {
+    if (!found_) {
+        found_ = LastRest{horizon_, sure_, std::nullopt, 0};
+    }
+    const Fix first = answer.value_or(fixes_.back());
+    if (!kept_.empty()) {
+        fixes_ = std::move(kept_);
+    }
+    fixes_.push_back(first);
+    step_ = Step::Done;
+}
+
 void FixWalk::take(const std::vector<std::optional<Fix>>& answers) {
     if (step_ == Step::First) {
-        if (!found_) {
-            found_ = LastRest{horizon_, sure_, std::nullopt, 0};
-        }
-        const Fix first = answers.front().value_or(fixes_.back());
-        if (!kept_.empty()) {
-            fixes_ = std::move(kept_);
-        }
-        fixes_.push_back(first);
-        step_ = Step::Done;
-        return;
+        return takeFirst(answers.front());
     }
+    const bool hasFirst = asksForFirstToo();
+    const auto end = answers.end() - (hasFirst ? 1 : 0);
     const bool hadLeft = !kept_.empty();
-    for (const auto& answer : answers) {
+    for (auto answer = answers.begin(); answer != end; ++answer) {
         // After a leap what was asked for before it is of no use.
-        if (answer && step_ == Step::Going && hadLeft == !kept_.empty()) {
-            takeLast(*answer);
+        if (*answer && step_ == Step::Going && hadLeft == !kept_.empty()) {
+            takeLast(**answer);
         }
     }
     atOnce_ = std::min(atOnce_ * 2, kMostAtOnce);
-    if (step_ == Step::Going && !answers.back() && hadLeft == !kept_.empty()) {
+    if (step_ == Step::Going && !*std::prev(end) && hadLeft == !kept_.empty()) {
         if (fixes_.empty()) {
             fixes_ = std::move(kept_);
         }
         step_ = fixes_.empty() ? Step::Done : Step::First;
+    }
+    if (hasFirst && step_ == Step::First) {
+        // Of all that may count: if it is the one that was found last, nothing is before that.
+        takeFirst(*end);
     }
 }
 

@@ -53,6 +53,9 @@ class FixWalk {
   private:
     enum class Step { Going, First, Done };
 
+    /// The first fix will decide, as far as is known: it is asked for beside the last ones.
+    bool asksForFirstToo() const;
+    void takeFirst(const std::optional<Fix>& answer);
     bool isSamePlace(const Fix& one, const Fix& other) const;
     void takeLast(const Fix& fix);
     /// Ends the walk where the rest is known.

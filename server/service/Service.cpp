@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <charconv>
+#include <utility>
 
 #include "documents/JsonReader.h"
 #include "platform/base/Json.h"
@@ -378,9 +379,9 @@ void Service::answerLocations(const Device& device, const Dictionary& body, cons
     for (const std::string& handle : request->handles) {
         client += '\n' + handle;
     }
-    const auto now = [this, device = device, asked = *request]() -> HeldAnswers::Answer {
-        // While it was held its secret may have ended.
-        if (!store_->isInUse(device.id).value_or(true)) {
+    const auto now = [this, device = device, asked = *request, wasHeld = false]() mutable -> HeldAnswers::Answer {
+        // While it was held its secret may have ended; before that it was just looked at.
+        if (std::exchange(wasHeld, true) && !store_->isInUse(device.id).value_or(true)) {
             return {
                 "", {}, [](const HttpReply& late) { late.send(refusal(401, "the credentials are missing or wrong")); }};
         }
