@@ -1,70 +1,28 @@
-#include <gtest/gtest.h>
-
-#include <atomic>
 #include <chrono>
-#include <map>
 #include <memory>
 #include <string>
 #include <thread>
 
-#include "server/http/BasicCredentials.h"
-#include "server/service/Service.h"
-#include "tests/support/RawClient.h"
+#include "tests/unit/server/FourPeople.h"
 
 namespace ktr::test {
 
-using server::BasicCredentials;
-using server::DeviceKind;
-using server::Grant;
-using server::Precision;
-using server::Service;
-using server::Store;
-
-/// A service over plain HTTP on this machine: ann has a phone, and lets otto, who has a reader, be told; mara she lets
-/// see where she is, and no more.
-class FenceServiceTest : public ::testing::Test {
+/// Ann lets otto be told when she comes and goes; mara she lets see where she is, and no more.
+class FenceServiceTest : public FourPeople {
   protected:
-    static constexpr std::int64_t kNow = 1763760000;
     static constexpr double kDegree = 111230.0;
 
     void SetUp() override {
-        std::string complaint;
-        store_ = Store::open(server::StoreAddress::inMemory(), true, complaint);
-        ASSERT_TRUE(store_) << complaint;
-        for (const char* name : {"ann", "otto", "mara", "eve"}) {
-            ASSERT_TRUE(store_->addPerson(name, {std::string(name) + "@x.example"}, kNow));
-            ids_[name] = store_->personNamed(name)->id;
-            ASSERT_TRUE(store_->addDevice(ids_[name], DeviceKind::Phone, std::string(name) + "'s", "", kNow));
-            ASSERT_TRUE(store_->addDevice(ids_[name], DeviceKind::Reader, std::string(name) + "'s ktr", "", kNow));
-        }
+        ASSERT_NO_FATAL_FAILURE(FourPeople::SetUp());
         Grant grant{Precision::Exact, kNow - 1000, std::nullopt};
         ASSERT_TRUE(store_->grant(ids_["ann"], ids_["mara"], grant));
         grant.fences = true;
         ASSERT_TRUE(store_->grant(ids_["ann"], ids_["otto"], grant));
         begin();
     }
-    void TearDown() override {
-        if (service_) {
-            service_->stop();
-        }
-    }
-    void begin() {
-        Service::Setup setup;
-        setup.store = store_;
-        setup.now = [this] { return now_.load(); };
-        setup.holdsAnswers = true;
-        service_ = std::make_unique<Service>(std::move(setup));
-        ASSERT_EQ(service_->start(), "");
-    }
-    static std::string authorization(const std::string& who, const std::string& secret) {
-        return "Authorization: " + BasicCredentials{who, secret}.header() + "\r\n";
-    }
     static std::string command(const std::string& who, const std::string& path, const std::string& body) {
-        return "POST /qloxservice/friends/va/" + path + " HTTP/1.1\r\nHost: localhost\r\n" +
-               authorization(who, who + "'s ktr") +
-               "X-Orcha-Seek-API-Ver: 4.0\r\nX-Orcha-AuthScheme: Forever\r\nContent-Type: application/json\r\n"
-               "Content-Length: " +
-               std::to_string(body.size()) + "\r\n\r\n" + body;
+        return "POST /qloxservice/friends/va/" + path + " HTTP/1.1\r\nHost: localhost\r\n" + commandHeaders(who) +
+               "Content-Type: application/json\r\nContent-Length: " + std::to_string(body.size()) + "\r\n\r\n" + body;
     }
     std::string ask(const std::string& who, const std::string& path, const std::string& body) {
         const RawClient client(service_->port());
@@ -126,10 +84,6 @@ class FenceServiceTest : public ::testing::Test {
     static constexpr std::chrono::milliseconds kShort{400};
     static constexpr const char* kNothing = "(nothing more in time)";
 
-    std::atomic<std::int64_t> now_ = kNow;
-    std::map<std::string, std::int64_t> ids_;
-    std::shared_ptr<Store> store_;
-    std::unique_ptr<Service> service_;
     std::string first_;
 };
 

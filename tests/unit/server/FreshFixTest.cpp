@@ -1,55 +1,26 @@
-#include <gtest/gtest.h>
-
-#include <atomic>
-#include <map>
-#include <memory>
 #include <string>
 
 #include "documents/JsonReader.h"
 #include "platform/base/Json.h"
-#include "server/http/BasicCredentials.h"
 #include "server/ingest/SealedText.h"
-#include "server/service/Service.h"
-#include "tests/support/RawClient.h"
+#include "tests/unit/server/FourPeople.h"
 
 namespace ktr::test {
 
-using server::BasicCredentials;
-using server::DeviceKind;
-using server::Grant;
-using server::Precision;
-using server::Service;
-using server::Store;
-
 /// "Where is Ann right now?": ann has a phone, otto sees her exactly, mara her town, eve nothing. What is looked at is
 /// what is written to the phone, and what the one who asks gets to read.
-class FreshFixTest : public ::testing::Test {
+class FreshFixTest : public FourPeople {
   protected:
-    static constexpr std::int64_t kNow = 1763760000;
     static constexpr const char* kAndroid = "Owntracks-Android/gms/420506000";
     static constexpr const char* kIphone = "OwnTracks/18.5 CFNetwork/1494.0.7 Darwin/23.4.0";
     static constexpr const char* kReport = R"({"_type":"cmd","action":"reportLocation"})";
 
     void SetUp() override {
-        std::string complaint;
-        store_ = Store::open(server::StoreAddress::inMemory(), true, complaint);
-        ASSERT_TRUE(store_) << complaint;
-        for (const char* name : {"ann", "otto", "mara", "eve"}) {
-            ASSERT_TRUE(store_->addPerson(name, {std::string(name) + "@x.example"}, kNow));
-            ids_[name] = store_->personNamed(name)->id;
-            ASSERT_TRUE(store_->addDevice(ids_[name], DeviceKind::Phone, std::string(name) + "'s", "", kNow));
-            ASSERT_TRUE(store_->addDevice(ids_[name], DeviceKind::Reader, std::string(name) + "'s ktr", "", kNow));
-        }
+        ASSERT_NO_FATAL_FAILURE(FourPeople::SetUp());
         ASSERT_TRUE(store_->grant(ids_["ann"], ids_["otto"], {Precision::Exact, kNow - 9000, std::nullopt}));
         ASSERT_TRUE(store_->grant(ids_["ann"], ids_["mara"], {Precision::Town, kNow - 9000, std::nullopt}));
-        Service::Setup setup;
-        setup.store = store_;
-        setup.now = [this] { return now_.load(); };
-        setup.holdsAnswers = true;
-        service_ = std::make_unique<Service>(std::move(setup));
-        ASSERT_EQ(service_->start(), "");
+        ASSERT_NO_FATAL_FAILURE(begin());
     }
-    void TearDown() override { service_->stop(); }
 
     static std::string bodyOf(const std::string& answer) {
         const std::size_t begin = answer.find("\r\n\r\n");
@@ -68,9 +39,7 @@ class FreshFixTest : public ::testing::Test {
         return bodyOf(client.read(""));
     }
     std::string ask(const std::string& who, const std::string& handles, const char* fresh = R"(,"fresh":true)") const {
-        return send("/qloxservice/friends/va/getlocations",
-                    "Authorization: " + BasicCredentials{who, who + "'s ktr"}.header() +
-                        "\r\nX-Orcha-Seek-API-Ver: 4.0\r\nX-Orcha-AuthScheme: Forever\r\n",
+        return send("/qloxservice/friends/va/getlocations", commandHeaders(who),
                     R"({"clientContext":{},"handles":[)" + handles + "]" + fresh + "}");
     }
     /// What ann's phone is answered, that says where it was so many seconds ago.
@@ -80,16 +49,9 @@ class FreshFixTest : public ::testing::Test {
                         agent, secret);
     }
     std::string postBody(const std::string& body, const std::string& agent, const std::string& secret = "ann's") const {
-        return send("/pub",
-                    "Authorization: " + BasicCredentials{"ann", secret}.header() + "\r\nUser-Agent: " + agent + "\r\n",
-                    body);
+        return send("/pub", authorization("ann", secret) + "User-Agent: " + agent + "\r\n", body);
     }
     static std::string since(std::int64_t time) { return std::to_string(time) + "000"; }
-
-    std::atomic<std::int64_t> now_ = kNow;
-    std::map<std::string, std::int64_t> ids_;
-    std::shared_ptr<Store> store_;
-    std::unique_ptr<Service> service_;
 };
 
 TEST_F(FreshFixTest, AndroidPhone_IsToldToReportOnce_WithTheAnswerToItsNextPost) {
