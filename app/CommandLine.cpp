@@ -125,6 +125,25 @@ struct Parser {
         render = app.add_subcommand("render", "Draws a scenario to a PNG, SVG or PDF file, without a display");
         describe = app.add_subcommand("describe", "Prints what a screen reader would say, in reading order");
         ask = app.add_subcommand("ask", "Asks one question and prints the answer");
+        addAsk();
+        addConversation();
+        open = app.add_subcommand("open", "Opens a link to a friend, in the window that is there or in a new one");
+        open->add_option("link", options.link, "wayloc://friend/HANDLE, or wayloc://friends/; none: the window alone")
+            ->type_name("LINK");
+        CLI::App* maps = app.add_subcommand("maps", "Maps of one's own");
+        maps->require_subcommand(1);
+        addMap = maps->add_subcommand("add", "Checks a map (MBTiles), sees to its index and adds it");
+        addMap->add_option("file", options.map, "The file with the map; it stays where it is")
+            ->required()
+            ->type_name("FILE");
+        serve = std::make_unique<ServeArguments>(app);
+        addWatch();
+        keeping = std::make_unique<KeepingArguments>(app, options.config, options.doctor);
+        addWyoming();
+        addSearch();
+    }
+
+    void addAsk() {
         ask->add_option("question", options.questions, "The question, in words")
             ->required()
             ->expected(1)
@@ -136,6 +155,9 @@ struct Parser {
         ask->add_option("-o,--output", options.output, "Draw the answer, too")->type_name("FILE.png|.svg|.pdf");
         addCommon(*ask);
         ask->footer(kAskExamples);
+    }
+
+    void addConversation() {
         show->add_option("scenarios", options.scenarios,
                          "Scenario files; one turn of the conversation each. Without one the window is live")
             ->type_name("SCENARIO");
@@ -167,16 +189,12 @@ struct Parser {
                 ->type_name("QUESTION");
             addCommon(*command);
         }
-        open = app.add_subcommand("open", "Opens a link to a friend, in the window that is there or in a new one");
-        open->add_option("link", options.link, "wayloc://friend/HANDLE, or wayloc://friends/; none: the window alone")
-            ->type_name("LINK");
-        CLI::App* maps = app.add_subcommand("maps", "Maps of one's own");
-        maps->require_subcommand(1);
-        addMap = maps->add_subcommand("add", "Checks a map (MBTiles), sees to its index and adds it");
-        addMap->add_option("file", options.map, "The file with the map; it stays where it is")
-            ->required()
-            ->type_name("FILE");
-        serve = std::make_unique<ServeArguments>(app);
+        show->footer(kShowExamples);
+        render->footer(kRenderExamples);
+        describe->footer(kDescribeExamples);
+    }
+
+    void addWatch() {
         watch =
             app.add_subcommand("watch", "Shows a notification when somebody comes or goes, as the service tells it");
         watch->add_flag("--print", options.watch.prints, "Lines on the standard output instead of notifications");
@@ -190,17 +208,15 @@ struct Parser {
                                ->needs(hook);
         hook->needs(key);
         watch->footer("Example: ktr watch --print");
-        keeping = std::make_unique<KeepingArguments>(app, options.config, options.doctor);
-        addWyoming();
+    }
+
+    void addSearch() {
         search = app.add_subcommand("search", "Answers the desktop's search, which starts it");
         search->add_option("--language", words.language, "Language of questions and answers")->type_name("TAG");
         search->add_option("--idle", options.searchIdle, "Seconds without a search until it ends (60)")
             ->type_name("SECONDS")
             ->check(CLI::Range(1, 86400));
         search->add_option("--plugin", options.plugin, "The plugin's library")->type_name("PATH");
-        show->footer(kShowExamples);
-        render->footer(kRenderExamples);
-        describe->footer(kDescribeExamples);
     }
 
     /// A window that is live, at a link; false for one that is opened by nobody.
@@ -367,6 +383,40 @@ bool endsWith(const std::string& text, const std::string& end) {
     return text.size() > end.size() && text.compare(text.size() - end.size(), end.size(), end) == 0;
 }
 
+/// Empty, or what is wrong.
+std::string readWatch(Options& options) {
+    options.command = Options::Command::Watch;
+    const WatchCommand::Options& given = options.watch;
+    if (!given.language.empty() && !host::isLanguageTag(given.language)) {
+        return wrong("--language", "a language such as en-GB", given.language);
+    }
+    const std::string objection = given.hook.empty() ? "" : CrossingHook::objection(given.hook);
+    return objection.empty() ? "" : "--hook: " + objection;
+}
+
+/// What a command that asks or draws was given. Empty, or what is wrong.
+std::string readQuestion(Parser& parser) {
+    Options& options = parser.options;
+    options.command = parser.ask->parsed()       ? Options::Command::Ask
+                      : parser.wyoming->parsed() ? Options::Command::Wyoming
+                      : parser.search->parsed()  ? Options::Command::Search
+                      : parser.show->parsed()    ? Options::Command::Show
+                      : parser.render->parsed()  ? Options::Command::Render
+                                                 : Options::Command::Describe;
+    if (const std::string complaint = readWords(parser.words, options); !complaint.empty()) {
+        return complaint;
+    }
+    if (const std::string complaint = readLive(parser.words, options); !complaint.empty()) {
+        return complaint;
+    }
+    const std::string& output = options.output;
+    const bool draws = parser.render->parsed() || !output.empty();
+    if (draws && !endsWith(output, ".png") && !endsWith(output, ".svg") && !endsWith(output, ".pdf")) {
+        return wrong("--output", "a file name that ends in .png, .svg or .pdf", output);
+    }
+    return "";
+}
+
 }  // namespace
 
 std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::string> arguments) {
@@ -395,16 +445,8 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
         return complaint.empty() ? std::variant<Options, Ending>(parser.options) : misuse(complaint);
     }
     if (parser.watch->parsed()) {
-        parser.options.command = Options::Command::Watch;
-        const WatchCommand::Options& watch = parser.options.watch;
-        if (!watch.language.empty() && !host::isLanguageTag(watch.language)) {
-            return misuse(wrong("--language", "a language such as en-GB", watch.language));
-        }
-        if (const std::string objection = watch.hook.empty() ? "" : CrossingHook::objection(watch.hook);
-            !objection.empty()) {
-            return misuse("--hook: " + objection);
-        }
-        return parser.options;
+        const std::string complaint = readWatch(parser.options);
+        return complaint.empty() ? std::variant<Options, Ending>(parser.options) : misuse(complaint);
     }
     if (parser.keeping->isConfig() || parser.keeping->isDoctor()) {
         parser.options.command = parser.keeping->isDoctor() ? Options::Command::Doctor : Options::Command::Config;
@@ -419,24 +461,8 @@ std::variant<Options, CommandLine::Ending> CommandLine::parse(std::vector<std::s
                                  : misuse(wrong("LINK", "a link such as wayloc://friend/ann@harbour.example, or https",
                                                 parser.options.link));
     }
-    parser.options.command = parser.ask->parsed()       ? Options::Command::Ask
-                             : parser.wyoming->parsed() ? Options::Command::Wyoming
-                             : parser.search->parsed()  ? Options::Command::Search
-                             : parser.show->parsed()    ? Options::Command::Show
-                             : parser.render->parsed()  ? Options::Command::Render
-                                                        : Options::Command::Describe;
-    if (const std::string complaint = readWords(parser.words, parser.options); !complaint.empty()) {
-        return misuse(complaint);
-    }
-    if (const std::string complaint = readLive(parser.words, parser.options); !complaint.empty()) {
-        return misuse(complaint);
-    }
-    const std::string& output = parser.options.output;
-    const bool draws = parser.render->parsed() || !output.empty();
-    if (draws && !endsWith(output, ".png") && !endsWith(output, ".svg") && !endsWith(output, ".pdf")) {
-        return misuse(wrong("--output", "a file name that ends in .png, .svg or .pdf", output));
-    }
-    return parser.options;
+    const std::string complaint = readQuestion(parser);
+    return complaint.empty() ? std::variant<Options, Ending>(parser.options) : misuse(complaint);
 }
 
 }  // namespace ktr::app

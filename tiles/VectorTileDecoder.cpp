@@ -357,6 +357,18 @@ bool Builder::endPart(MapTile::Shape shape, std::uint32_t begin) {
     return true;
 }
 
+/// The box around what a feature is drawn with.
+void measure(std::span<const MapTile::Spot> spots, MapTile::Feature& feature) {
+    feature.left = feature.top = std::numeric_limits<float>::max();
+    feature.right = feature.bottom = std::numeric_limits<float>::lowest();
+    for (const MapTile::Spot& spot : spots) {
+        feature.left = std::min(feature.left, spot.x);
+        feature.right = std::max(feature.right, spot.x);
+        feature.top = std::min(feature.top, spot.y);
+        feature.bottom = std::max(feature.bottom, spot.y);
+    }
+}
+
 bool Builder::readGeometry(Numbers numbers, MapTile::Feature& feature, std::uint32_t extent) {
     constexpr std::uint32_t kMoveTo = 1, kLineTo = 2, kClosePath = 7;
     const auto firstSpot = static_cast<std::uint32_t>(tile_.spots.size());
@@ -409,14 +421,7 @@ bool Builder::readGeometry(Numbers numbers, MapTile::Feature& feature, std::uint
         drop(firstSpot, feature.firstPart);
         return false;
     }
-    feature.left = feature.top = std::numeric_limits<float>::max();
-    feature.right = feature.bottom = std::numeric_limits<float>::lowest();
-    for (const auto& spot : std::span(tile_.spots).subspan(firstSpot)) {
-        feature.left = std::min(feature.left, spot.x);
-        feature.right = std::max(feature.right, spot.x);
-        feature.top = std::min(feature.top, spot.y);
-        feature.bottom = std::max(feature.bottom, spot.y);
-    }
+    measure(std::span<const MapTile::Spot>(tile_.spots).subspan(firstSpot), feature);
     return true;
 }
 

@@ -79,6 +79,37 @@ bool isOpened(const QRawFont& font) {
 
 }  // namespace
 
+bool LabelShaper::add(const QGlyphRun& run, QPointF origin, double haloWidth, LabelGlyphs& made) {
+    const double unit = 1.0 / kShapedPixels;
+    const QRawFont font = run.rawFont();
+    bool hasInk = false;
+    const auto indexes = run.glyphIndexes();
+    const auto positions = run.positions();
+    const auto advances = font.advancesForGlyphIndexes(indexes);
+    const QString fontName = font.familyName() + QLatin1Char('/') + font.styleName();
+    for (qsizetype index = 0; index < indexes.size(); ++index) {
+        auto& letter = letters_[{fontName, indexes[index], haloWidth}];
+        if (letter.outline.isEmpty()) {
+            const auto rings = font.pathForGlyph(indexes[index]).toSubpathPolygons();
+            letter.outline = pathOf(rings, unit);
+            letter.halo = pathOf(LabelHalo::around(rings, haloWidth * kShapedPixels / 2.0), unit);
+        }
+        LabelGlyphs::Glyph glyph;
+        glyph.outline = letter.outline;
+        glyph.halo = letter.halo;
+        glyph.ink = letter.outline.boundingRect();
+        glyph.x = (positions[index].x() - origin.x()) * unit;
+        glyph.y = (positions[index].y() - origin.y()) * unit;
+        glyph.advance = index < advances.size() ? advances[index].x() * unit : 0.0;
+        hasInk = hasInk || !glyph.ink.isEmpty();
+        made.width = std::max({made.width, glyph.x + glyph.advance, glyph.x + glyph.ink.right()});
+        made.ascent = std::max(made.ascent, -(glyph.y + glyph.ink.top()));
+        made.descent = std::max(made.descent, glyph.y + glyph.ink.bottom());
+        made.glyphs.push_back(std::move(glyph));
+    }
+    return hasInk;
+}
+
 std::shared_ptr<const LabelGlyphs> LabelShaper::shape(const std::string& name, const Style& style) {
     const Key key(name, style);
     if (const auto found = byKey_.find(key); found != byKey_.end()) {
@@ -99,38 +130,12 @@ std::shared_ptr<const LabelGlyphs> LabelShaper::shape(const std::string& name, c
         line.setLineWidth(1e6);
     }
     layout.endLayout();
-    const double unit = 1.0 / kShapedPixels;
     const double left = line.isValid() ? line.naturalTextRect().left() : 0.0;
     const double baseline = line.isValid() ? line.y() + line.ascent() : 0.0;
     bool hasInk = false;
     for (const QGlyphRun& run : layout.glyphRuns()) {
-        const QRawFont font = run.rawFont();
-        if (!isOpened(font)) {
-            continue;
-        }
-        const auto indexes = run.glyphIndexes();
-        const auto positions = run.positions();
-        const auto advances = font.advancesForGlyphIndexes(indexes);
-        const QString fontName = font.familyName() + QLatin1Char('/') + font.styleName();
-        for (qsizetype index = 0; index < indexes.size(); ++index) {
-            auto& letter = letters_[{fontName, indexes[index], style.haloWidth}];
-            if (letter.outline.isEmpty()) {
-                const auto rings = font.pathForGlyph(indexes[index]).toSubpathPolygons();
-                letter.outline = pathOf(rings, unit);
-                letter.halo = pathOf(LabelHalo::around(rings, style.haloWidth * kShapedPixels / 2.0), unit);
-            }
-            LabelGlyphs::Glyph glyph;
-            glyph.outline = letter.outline;
-            glyph.halo = letter.halo;
-            glyph.ink = letter.outline.boundingRect();
-            glyph.x = (positions[index].x() - left) * unit;
-            glyph.y = (positions[index].y() - baseline) * unit;
-            glyph.advance = index < advances.size() ? advances[index].x() * unit : 0.0;
-            hasInk = hasInk || !glyph.ink.isEmpty();
-            made->width = std::max({made->width, glyph.x + glyph.advance, glyph.x + glyph.ink.right()});
-            made->ascent = std::max(made->ascent, -(glyph.y + glyph.ink.top()));
-            made->descent = std::max(made->descent, glyph.y + glyph.ink.bottom());
-            made->glyphs.push_back(std::move(glyph));
+        if (isOpened(run.rawFont())) {
+            hasInk = add(run, {left, baseline}, style.haloWidth, *made) || hasInk;
         }
     }
     std::stable_sort(made->glyphs.begin(), made->glyphs.end(), [](const auto& a, const auto& b) { return a.x < b.x; });

@@ -9,7 +9,9 @@
 #include <utility>
 #include <vector>
 
+#include <QGlyphRun>
 #include <QPainterPath>
+#include <QPointF>
 #include <QRectF>
 #include <QString>
 
@@ -57,6 +59,9 @@ class LabelShaper {
         Key key;
         std::shared_ptr<const LabelGlyphs> glyphs;
     };
+
+    /// Puts a run's letters to a name's, whose line begins at `origin`. Whether there is anything to see of them.
+    bool add(const QGlyphRun& run, QPointF origin, double haloWidth, LabelGlyphs& made);
 
     std::list<Kept> kept_;  ///< latest used first
     std::map<Key, std::list<Kept>::iterator> byKey_;

@@ -1,3 +1,4 @@
+// `main` is long: every command of the program once, with its words, in the order in which the help lists them.
 #include <unistd.h>
 
 #include <CLI/CLI.hpp>

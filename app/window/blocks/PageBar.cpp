@@ -44,10 +44,12 @@ void PageBar::refreshed() {
 
 void PageBar::place() {
     const int side = IconButton::side();
-    back_->placeShape(mirrored(QRectF(kBackStart, (height() - side) / 2, side, side)).toRect());
+    const int buttonTop = (height() - side) / 2;
+    back_->placeShape(mirrored(QRectF(kBackStart, buttonTop, side, side)).toRect());
     const int across = nameWidth(width());
     const int high = name_->shapeHeight(across);
-    name_->placeShape(mirrored(QRectF(kBackStart + side + kNameGap, (height() - high) / 2, across, high)).toRect());
+    const int nameTop = (height() - high) / 2;
+    name_->placeShape(mirrored(QRectF(kBackStart + side + kNameGap, nameTop, across, high)).toRect());
 }
 
 }  // namespace ktr::app
