@@ -25,7 +25,7 @@ class TemporaryFolder {
 
     const std::filesystem::path& path() const { return path_; }
     std::filesystem::path write(const std::string& name, const std::string& text, unsigned mode = 0600) const {
-        const std::filesystem::path file = path_ / name;
+        std::filesystem::path file = path_ / name;
         std::filesystem::create_directories(file.parent_path());
         std::ofstream(file, std::ios::binary) << text;
         std::filesystem::permissions(file, static_cast<std::filesystem::perms>(mode));

@@ -40,7 +40,7 @@ class TransportTest : public PlatformTest {
         options.key = certificates->key();
         return options;
     }
-    static TestServer::Behaviour answering(int status, std::string fields = "", std::string body = "{}") {
+    static TestServer::Behaviour answering(int status, const std::string& fields = "", const std::string& body = "{}") {
         return [=](QSslSocket& socket, const TestServer::Request&) { answerWith(socket, status, fields, body); };
     }
     /// A server that hears everything and answers gladly; nobody may talk to it.

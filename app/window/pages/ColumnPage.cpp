@@ -74,9 +74,8 @@ bool ColumnPage::event(QEvent* event) {
 }
 
 bool ColumnPage::eventFilter(QObject* object, QEvent* event) {
-    if (object == area_->viewport() && event->type() == QEvent::LayoutRequest) {
-        place();
-    } else if (object == column_ && event->type() == QEvent::LayoutDirectionChange) {
+    const bool hasOtherRoom = object == area_->viewport() && event->type() == QEvent::LayoutRequest;
+    if (hasOtherRoom || (object == column_ && event->type() == QEvent::LayoutDirectionChange)) {
         place();
     }
     return Page::eventFilter(object, event);

@@ -22,7 +22,7 @@ constexpr double kWideTop = 0.2;  ///< of the height
 
 }  // namespace
 
-SignInPage::SignInPage(host::Host& host, std::unique_ptr<linux_::SignIn> signIn, Before before)
+SignInPage::SignInPage(host::Host& host, std::unique_ptr<linux_::SignIn> signIn, const Before& before)
     : ColumnPage(Bar::Without),
       host_(host),
       signIn_(std::move(signIn)),

@@ -25,7 +25,7 @@ class SignInPage : public ColumnPage {
     };
 
     /// The host outlives the page.
-    SignInPage(host::Host& host, std::unique_ptr<linux_::SignIn> signIn, Before before);
+    SignInPage(host::Host& host, std::unique_ptr<linux_::SignIn> signIn, const Before& before);
 
     /// Called once somebody is signed in; the page may be gone afterwards.
     void setDone(std::function<void()> done) { done_ = std::move(done); }

@@ -1,5 +1,5 @@
-// The building blocks of pages: what they say, how they are used without a mouse, and that nothing of them is cut. `fill`
-// is long: it has each of them once.
+// The building blocks of pages: what they say, how they are used without a mouse, and that nothing of them is cut.
+// `fill` is long: it has each of them once.
 #include <QAccessible>
 #include <QAccessibleInterface>
 #include <QApplication>

@@ -23,7 +23,7 @@ using platform::ContentSizeCategory;
 class KTRSignInPageTest : public ::testing::Test {
   protected:
     void open(const std::string& language = "en-GB", ContentSizeCategory size = ContentSizeCategory::L,
-              SignInPage::Before before = {}, QSize window = {400, 780}) {
+              const SignInPage::Before& before = {}, QSize window = {400, 780}) {
         page = nullptr;
         host = nullptr;
         host::HostOptions options;

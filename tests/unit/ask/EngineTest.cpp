@@ -326,8 +326,10 @@ TEST_F(EngineTest, WhetherSomebodyIsAtWork_IsSaidAsFarAsItCanBeTold) {
 }
 
 TEST_F(EngineTest, ManyContacts_AreAskedForInSeveralRequestsAndNoneIsLeftOut) {
+    constexpr int kMany = 2500;
     std::vector<Person> people;
-    for (int i = 0; i < 2500; ++i) {
+    people.reserve(kMany);
+    for (int i = 0; i < kMany; ++i) {
         people.push_back(
             person(("P" + std::to_string(i)).c_str(), "X", ("p" + std::to_string(i) + "@x.example").c_str()));
     }

@@ -136,7 +136,7 @@ TEST_F(ConfiguredMapsTest, NothingConfigured_IsTheBuiltInWorld) {
 }
 
 TEST_F(ConfiguredMapsTest, AFileOfPicturesThatAreNotRead_IsSaid) {
-    write("webp", "RIFF\x1a\0\0\0WEBPVP8L");
+    write("webp", std::string("RIFF\x1a\0\0\0WEBPVP8L", 16));
     EXPECT_EQ(drawFile().attribution, "Natural Earth");
     const std::string line = "The map " + path() + " cannot be read: its pictures are WebP; PNG and JPEG are read";
     EXPECT_TRUE(log->has(platform::LogLevel::Error, line));

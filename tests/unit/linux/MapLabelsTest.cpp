@@ -18,7 +18,7 @@ class MapLabelsTest : public test::PlatformTest {
         request.viewport.size = {300.0, 200.0};
         request.scale = 2.0;
         drawings.push_back(
-            std::unique_ptr<MapDrawing>(new MapDrawing{request, painter, painter, picture.size(), region, {}}));
+            std::make_unique<MapDrawing>(MapDrawing{request, painter, painter, picture.size(), region, {}}));
         return MapLabels(*drawings.back(), shaper);
     }
     /// What is not paper any more, in points.

@@ -211,7 +211,7 @@ TEST(QtLocalizationTextsTest, TheBuiltInLabels_StandInBothTables) {
 
 TEST(QtLocalizationTextsTest, TheWordsReadAsTheyShould) {
     const ProjectsTexts english("en-GB");
-    const auto filled = [&](const char* key, platform::FormatArguments arguments) {
+    const auto filled = [&](const char* key, const platform::FormatArguments& arguments) {
         return platform::formatted(english.text(key, platform::kSnippetsBundle), arguments);
     };
     EXPECT_EQ(filled("APPLICATION_NAME", {}), "Friends");

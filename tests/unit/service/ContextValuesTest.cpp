@@ -77,7 +77,7 @@ TEST(ContextValuesTest, NumberBeyondADoubleIsTheNearestFiniteOne) {
     EXPECT_EQ(numberOf("1e99999999999999999999999"), kGreatest);
     EXPECT_EQ(numberOf("1e-99999999999999999999999"), 0.0);
     EXPECT_EQ(numberOf(std::string(400, '9')), kGreatest);
-    EXPECT_EQ(numberOf(std::string(400, '9') + "e-5"), kGreatest);
+    EXPECT_EQ(numberOf(std::string(400, '9').append("e-5")), kGreatest);
     EXPECT_EQ(numberOf("0." + std::string(400, '0') + "1"), 0.0);
     EXPECT_EQ(numberOf("0e999"), 0.0);
 }
