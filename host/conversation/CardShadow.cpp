@@ -59,15 +59,64 @@ void blur(std::vector<float>& samples, std::size_t side, double sigma) {
     }
 }
 
+/// A stretch of pixels, [low, high), and where it stands: without those whole pixels of it that lie in `hidden`, if
+/// that reaches over one of its ends. All in points.
+struct Span {
+    double low, high;
+    double cutLow = 0.0, cutHigh = 0.0;
+
+    void leaveOut(double hiddenLow, double hiddenHigh, double scale) {
+        const auto whole = [scale](double points) { return std::max(std::floor(points * scale), 0.0) / scale; };
+        if (hiddenLow > low && hiddenHigh >= high) {
+            cutHigh = std::min(whole(high - hiddenLow), high - low);
+        } else if (hiddenLow <= low && hiddenHigh < high) {
+            cutLow = std::min(whole(hiddenHigh - low), high - low);
+        }
+    }
+};
+
+/// Leaves out what is hidden at the left or right of a piece that is one pixel to a pixel across.
+void leaveOutAcross(const QRectF& hidden, double scale, QRectF& target, QRectF& source) {
+    if (hidden.top() <= target.top() && hidden.bottom() >= target.bottom()) {
+        Span span{target.left(), target.right()};
+        span.leaveOut(hidden.left(), hidden.right(), scale);
+        target.adjust(span.cutLow, 0.0, -span.cutHigh, 0.0);
+        source.adjust(span.cutLow * scale, 0.0, -span.cutHigh * scale, 0.0);
+    }
+}
+
+/// The same at the top or bottom.
+void leaveOutDown(const QRectF& hidden, double scale, QRectF& target, QRectF& source) {
+    QRectF turnedTarget(target.top(), target.left(), target.height(), target.width());
+    QRectF turnedSource(source.top(), source.left(), source.height(), source.width());
+    leaveOutAcross({hidden.top(), hidden.left(), hidden.height(), hidden.width()}, scale, turnedTarget, turnedSource);
+    target.setRect(turnedTarget.top(), turnedTarget.left(), turnedTarget.height(), turnedTarget.width());
+    source.setRect(turnedSource.top(), turnedSource.left(), turnedSource.height(), turnedSource.width());
+}
+
 }  // namespace
 
 void CardShadow::paint(linux_::QtCanvas& canvas, const QRectF& card, double corner) {
+    paintLayers(canvas, card, corner, {});
+}
+
+void CardShadow::paintAround(linux_::QtCanvas& canvas, const QRectF& card, double corner) {
+    constexpr double kEdge = 1.0;  // points along which the card's own edge may be soft
+    const bool isOpaque = canvas.painter().opacity() == 1.0;
+    paintLayers(
+        canvas, card, corner,
+        isOpaque ? Hidden{card.adjusted(kEdge, corner, -kEdge, -corner), card.adjusted(corner, kEdge, -corner, -kEdge)}
+                 : Hidden{});
+}
+
+void CardShadow::paintLayers(linux_::QtCanvas& canvas, const QRectF& card, double corner, const Hidden& hidden) {
     if (canvas.palette().cardShadow.alpha() == 0) {
         return;
     }
     for (const Layer& layer : kLayers) {
         const QRectF shape = card.adjusted(-layer.spread, -layer.spread, layer.spread, layer.spread);
-        paintOne(canvas, shape.translated(0.0, layer.dy), std::max(corner + layer.spread, 0.0), layer.blur / 2.0);
+        paintOne(canvas, shape.translated(0.0, layer.dy), std::max(corner + layer.spread, 0.0), layer.blur / 2.0,
+                 hidden);
     }
 }
 
@@ -113,11 +162,12 @@ const CardShadow::Blurred& CardShadow::blurred(double sigma, double corner, doub
     return kept_.back();
 }
 
-void CardShadow::paintOne(linux_::QtCanvas& canvas, const QRectF& shape, double corner, double sigma) {
+void CardShadow::paintOne(linux_::QtCanvas& canvas, const QRectF& shape, double corner, double sigma,
+                          const Hidden& hidden) {
     QPainter& painter = canvas.painter();
     const auto engine = painter.paintEngine()->type();
     if (engine == QPaintEngine::Raster) {
-        stretch(painter, blurred(sigma, corner, 1.0 / canvas.pixel(), canvas.palette().cardShadow), shape);
+        stretch(painter, blurred(sigma, corner, 1.0 / canvas.pixel(), canvas.palette().cardShadow), shape, hidden);
         return;
     }
     // Vector pictures get each shadow as one image: stretched pieces would show their seams, and some viewers take no
@@ -131,12 +181,12 @@ void CardShadow::paintOne(linux_::QtCanvas& canvas, const QRectF& shape, double 
         QPainter pixels(&whole);
         pixels.scale(kVectorScale, kVectorScale);
         pixels.translate(-outer.topLeft());
-        stretch(pixels, b, shape);
+        stretch(pixels, b, shape, {});
     }
     painter.drawImage(QRectF(outer.topLeft(), QSizeF(whole.size()) / kVectorScale), whole);
 }
 
-void CardShadow::stretch(QPainter& painter, const Blurred& b, const QRectF& shape) {
+void CardShadow::stretch(QPainter& painter, const Blurred& b, const QRectF& shape, const Hidden& hidden) {
     const double pixels = b.edge * b.scale;
     const QRectF outer = shape.adjusted(-b.margin, -b.margin, b.margin, b.margin);
     // A card too small for the corners squeezes them.
@@ -147,9 +197,17 @@ void CardShadow::stretch(QPainter& painter, const Blurred& b, const QRectF& shap
     const std::array<double, 4> from = {0.0, pixels, pixels + 1.0, 2.0 * pixels + 1.0};
     for (std::size_t row = 0; row < 3; ++row) {
         for (std::size_t column = 0; column < 3; ++column) {
-            const QRectF target(QPointF(xs[column], ys[row]), QPointF(xs[column + 1], ys[row + 1]));
-            const QRectF source(QPointF(from[column], from[row]), QPointF(from[column + 1], from[row + 1]));
+            QRectF target(QPointF(xs[column], ys[row]), QPointF(xs[column + 1], ys[row + 1]));
+            QRectF source(QPointF(from[column], from[row]), QPointF(from[column + 1], from[row + 1]));
+            if (row == 1 && column != 1 && edgeX == b.edge) {
+                leaveOutAcross(hidden.tall, b.scale, target, source);
+            } else if (column == 1 && row != 1 && edgeY == b.edge) {
+                leaveOutDown(hidden.wide, b.scale, target, source);
+            }
             if (row == 1 && column == 1) {
+                if (hidden.tall.contains(target)) {
+                    continue;
+                }
                 // All of one colour, and as large as the card: stretching a pixel over it would cost more than all
                 // else.
                 const int centre = static_cast<int>(pixels);

@@ -17,8 +17,16 @@ class CardShadow {
     static constexpr double kReach = 44.0;
 
     void paint(linux_::QtCanvas& canvas, const QRectF& card, double corner);
+    /// The same where a card of this shape, which nothing shows through, is painted over it at once: what the card
+    /// hides is left out, which is nearly all of a tall card's shadow. A painter that is not opaque paints all of it.
+    void paintAround(linux_::QtCanvas& canvas, const QRectF& card, double corner);
 
   private:
+    /// What is not seen; empty for nothing. `tall` reaches nearly to the left and right edge, `wide` to top and bottom.
+    struct Hidden {
+        QRectF tall;
+        QRectF wide;
+    };
     struct Blurred {
         double sigma = 0.0;
         double corner = 0.0;
@@ -29,8 +37,9 @@ class CardShadow {
         double edge = 0.0;    ///< points from the image's border to the stretched middle
     };
 
-    void paintOne(linux_::QtCanvas& canvas, const QRectF& shape, double corner, double sigma);
-    static void stretch(QPainter& painter, const Blurred& blurred, const QRectF& shape);
+    void paintLayers(linux_::QtCanvas& canvas, const QRectF& card, double corner, const Hidden& hidden);
+    void paintOne(linux_::QtCanvas& canvas, const QRectF& shape, double corner, double sigma, const Hidden& hidden);
+    static void stretch(QPainter& painter, const Blurred& blurred, const QRectF& shape, const Hidden& hidden);
     const Blurred& blurred(double sigma, double corner, double scale, const QColor& color);
 
     std::vector<Blurred> kept_;

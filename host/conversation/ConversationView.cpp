@@ -112,7 +112,7 @@ void ConversationView::draw(platform::Canvas& canvas) const {
         if (visible.isNull() || visible.intersects(shape.adjusted(-kReach, -kReach, kReach, kReach))) {
             const double whole = qt->painter().opacity();
             qt->painter().setOpacity(whole * turn->cardOpacity());
-            shadow_.paint(*qt, shape, measures::kCardCorner);
+            shadow_.paintAround(*qt, shape, measures::kCardCorner);
             qt->painter().setOpacity(whole);
         }
     }
