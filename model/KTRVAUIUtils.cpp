@@ -6,13 +6,15 @@
 #include <cstdlib>
 #include <limits>
 #include <optional>
+#include <unordered_map>
 #include <utility>
 
 #include "model/KTRVALocation.h"
 #include "model/PluginBundle.h"
 #include "platform/base/Assert.h"
 #include "platform/base/Clock.h"
-#include "platform/base/Format.h"
+#include "platform/base/CurrentPlatform.h"
+#include "platform/base/FilledText.h"
 #include "platform/base/Platform.h"
 
 namespace ktr {
@@ -30,7 +32,7 @@ struct Band {
 /// The whole seconds between now and the date, either way, at most 2^31.
 std::int64_t ageInSeconds(const platform::Date& date) {
     const double interval =
-        date.secondsSinceReferenceDate - platform::Platform::installed()->clock->now().secondsSinceReferenceDate;
+        date.secondsSinceReferenceDate - platform::currentPlatform()->clock->now().secondsSinceReferenceDate;
     if (std::isnan(interval)) {
         return 0;
     }
@@ -60,19 +62,40 @@ Band bandOf(std::int64_t seconds) {
             static_cast<std::int64_t>(minutes / 60.0)};
 }
 
-}  // namespace
+/// There are few ages, and rows are filled again and again: each is worded once.
+struct WordedAges {
+    static std::shared_ptr<WordedAges> makeShared() { return std::make_shared<WordedAges>(); }
+    /// Minutes, and hours of more than a week.
+    static constexpr std::size_t kMost = 256;
+    std::unordered_map<std::int64_t, KTRVAUIUtils::AgeStrings> byNumber;
+};
 
-KTRVAUIUtils::AgeStrings KTRVAUIUtils::ageStringsForDate(const platform::Date& date) {
-    KTR_ASSERT_MAIN_THREAD();
-    const Band band = bandOf(ageInSeconds(date));
+KTRVAUIUtils::AgeStrings worded(const Band& band) {
     std::string row = AssistantLocalizedString(band.rowKey);
     std::string spoken = AssistantLocalizedString(band.spokenKey);
     if (band.number) {
         const std::string number = KTRVALocation::numberFormatter()->plainStringFromInteger(*band.number);
-        row = platform::formatted(row, {number});
-        spoken = platform::formatted(spoken, {number});
+        row = platform::filled(row, {number});
+        spoken = platform::filled(spoken, {number});
     }
     return {std::move(row), std::move(spoken)};
+}
+
+}  // namespace
+
+KTRVAUIUtils::AgeStrings KTRVAUIUtils::ageStringsForDate(const platform::Date& date) {
+    KTR_ASSERT_MAIN_THREAD();
+    constexpr std::int64_t kRanks = 5;
+    const Band band = bandOf(ageInSeconds(date));
+    auto& known = platform::shared<WordedAges>()->byNumber;
+    const std::int64_t place = band.number.value_or(0) * kRanks + band.rank;
+    if (const auto found = known.find(place); found != known.end()) {
+        return found->second;
+    }
+    if (known.size() == WordedAges::kMost) {
+        known.clear();
+    }
+    return known.emplace(place, worded(band)).first->second;
 }
 
 platform::Dictionary KTRVAUIUtils::dictionaryWithAgeStringsForDate(const platform::Date& date) {

@@ -1,6 +1,7 @@
 #include "model/LabelUtil.h"
 
 #include <algorithm>
+#include <string_view>
 
 #include "platform/assistant/Localization.h"
 #include "platform/base/Platform.h"
@@ -15,8 +16,11 @@ const std::vector<std::string>& LabelUtil::defaultLabelKeys() {
 }
 
 bool LabelUtil::isDefaultLabel(const std::optional<std::string>& label) {
+    // Most labels, and every city, are somebody's own words.
+    constexpr std::string_view kOpening = "_$!<";
     const auto& keys = defaultLabelKeys();
-    return label && std::find(keys.begin(), keys.end(), platform::asciiLowercased(*label)) != keys.end();
+    return label && label->starts_with(kOpening) &&
+           std::find(keys.begin(), keys.end(), platform::asciiLowercased(*label)) != keys.end();
 }
 
 std::optional<std::string> LabelUtil::keyForDefaultLabel(const std::string& text) {

@@ -1,6 +1,7 @@
 #include "model/LogCategory.h"
 
 #include "model/PluginBundle.h"
+#include "platform/base/CurrentPlatform.h"
 #include "platform/base/Platform.h"
 
 namespace ktr {
@@ -18,6 +19,11 @@ class LogCategory : public platform::Log {
 std::shared_ptr<const platform::Log> LogCategory_Unspecified() {
     auto handle = platform::shared<LogCategory>();
     return handle ? handle : LogCategory::makeShared();
+}
+
+bool isLineWanted(platform::LogLevel level) {
+    const platform::Platform* installed = platform::currentPlatform();
+    return installed != nullptr && installed->logSink && installed->logSink->wants(level);
 }
 
 }  // namespace ktr

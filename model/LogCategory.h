@@ -11,4 +11,7 @@ namespace ktr {
 /// handle whose lines go nowhere. Any thread.
 std::shared_ptr<const platform::Log> LogCategory_Unspecified();
 
+/// Whether a line of this level would be kept: asked first where what the line says costs something. Main thread.
+bool isLineWanted(platform::LogLevel level);
+
 }  // namespace ktr

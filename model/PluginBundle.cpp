@@ -1,6 +1,7 @@
 #include "model/PluginBundle.h"
 
 #include "platform/assistant/Localization.h"
+#include "platform/base/CurrentPlatform.h"
 #include "platform/base/Platform.h"
 
 namespace ktr {
@@ -10,7 +11,7 @@ std::shared_ptr<platform::Bundle> PluginBundle::bundle() {
 }
 
 std::string AssistantLocalizedString(const std::string& key) {
-    return platform::Platform::installed()->localization->text(key, platform::kSnippetsBundle);
+    return platform::currentPlatform()->localization->text(key, platform::kSnippetsBundle);
 }
 
 }  // namespace ktr

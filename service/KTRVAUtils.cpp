@@ -8,6 +8,7 @@
 
 #include "platform/base/Assert.h"
 #include "platform/base/Clock.h"
+#include "platform/base/CurrentPlatform.h"
 #include "platform/base/Platform.h"
 #include "platform/base/Utf8.h"
 
@@ -203,7 +204,7 @@ std::shared_ptr<PlatformLocation> KTRVAUtils::geoLocationForVALocation(
     PlatformLocation::Fix fix;
     fix.coordinate = {latitude, longitude};
     fix.horizontalAccuracy = location->accuracy.value_or(0.0);
-    fix.timestamp = platform::Platform::installed()->clock->now();
+    fix.timestamp = platform::currentPlatform()->clock->now();
     return std::make_shared<PlatformLocation>(fix);
 }
 

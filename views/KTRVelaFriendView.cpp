@@ -9,6 +9,8 @@
 #include "model/LabelUtil.h"
 #include "model/LogCategory.h"
 #include "model/PluginBundle.h"
+#include "platform/base/CurrentPlatform.h"
+#include "platform/base/FilledText.h"
 #include "platform/base/Platform.h"
 #include "platform/location/Geodesy.h"
 #include "service/Common.h"
@@ -42,6 +44,16 @@ void setSpokenText(const std::shared_ptr<Label>& label, std::optional<std::strin
     if (label) {
         label->setAccessibilityLabel(std::move(text));
     }
+}
+
+std::string spokenPlace(const std::string& place) {
+    static const std::string kKey = "ACCESSIBILITY_AT_LABEL";
+    return platform::filled(AssistantLocalizedString(kKey), {place});
+}
+
+std::string spokenDistance(const std::string& distance) {
+    static const std::string kKey = "ACCESSIBILITY_DISTANCE";
+    return platform::filled(AssistantLocalizedString(kKey), {distance});
 }
 
 }  // namespace
@@ -125,7 +137,7 @@ void KTRVelaFriendView::setLocation(std::shared_ptr<KTRVALocation> location) {
 void KTRVelaFriendView::updateView() {
     // A position may still arrive when the host has already gone: no text can be formatted then, and what is shown
     // stays.
-    if (!Platform::installed()) {
+    if (platform::currentPlatform() == nullptr) {
         return;
     }
     updateAvatar();
@@ -136,13 +148,13 @@ void KTRVelaFriendView::updateView() {
 }
 
 void KTRVelaFriendView::updateAvatar() {
-    const auto attribute = location_ && location_->velaLocation() ? location_->velaLocation()->friend_ : nullptr;
-    const auto handle = attribute ? attribute->data : std::nullopt;
     std::shared_ptr<platform::Contact> contact;
     if (location_) {
-        contact = Common::sharedInstance()->isHandleEmail(handle)
-                      ? ContactsUtilities::contactForEmail(location_->friendEmail())
-                      : ContactsUtilities::contactForPhone(location_->friendPhone());
+        const auto* object = location_->velaLocation().get();
+        const auto* attribute = object != nullptr ? object->friend_.get() : nullptr;
+        const bool isEmail = attribute != nullptr && Common::sharedInstance()->isHandleEmail(attribute->data);
+        contact = isEmail ? ContactsUtilities::contactForEmail(location_->friendEmail())
+                          : ContactsUtilities::contactForPhone(location_->friendPhone());
     }
     assignContactLater(std::move(contact));
 }
@@ -158,18 +170,22 @@ std::string KTRVelaFriendView::placeText() const {
 }
 
 void KTRVelaFriendView::updatePlace() {
-    setText(locationLabel_, placeText());
-    // Without a coordinate nothing is said but the text itself, lest an earlier place be spoken.
-    std::optional<std::string> spoken;
-    if (location_ && location_->hasCoordinate() && locationLabel_) {
-        spoken = platform::formatted(AssistantLocalizedString("ACCESSIBILITY_AT_LABEL"), {locationLabel_->text()});
+    if (!locationLabel_) {
+        return;
     }
-    setSpokenText(locationLabel_, std::move(spoken));
+    const std::string text = placeText();
+    const bool isPlaced = location_ && location_->hasCoordinate();
+    if (text == locationLabel_->text() && isPlaced == locationLabel_->accessibilityLabel().has_value()) {
+        return;
+    }
+    locationLabel_->setText(text);
+    // Without a coordinate nothing is said but the text itself, lest an earlier place be spoken.
+    locationLabel_->setAccessibilityLabel(isPlaced ? std::optional(spokenPlace(text)) : std::nullopt);
 }
 
 KTRVAUIUtils::AgeStrings KTRVelaFriendView::ageTexts() const {
-    const auto object = location_ ? location_->velaLocation() : nullptr;
-    const double date = object ? object->locationDate.value_or(0.0) : 0.0;
+    const auto* object = location_ ? location_->velaLocation().get() : nullptr;
+    const double date = object != nullptr ? object->locationDate.value_or(0.0) : 0.0;
     return date > 0.0 ? KTRVAUIUtils::ageStringsForDate({date}) : KTRVAUIUtils::AgeStrings();
 }
 
@@ -191,14 +207,15 @@ std::string KTRVelaFriendView::distanceText() const {
 
 void KTRVelaFriendView::updateDistance() {
     const std::string distance = distanceText();
-    std::string text;
-    std::string spoken;
-    if (!isVisibility_ && !distance.empty()) {
-        text = distance;
-        spoken = platform::formatted(AssistantLocalizedString("ACCESSIBILITY_DISTANCE"), {distance});
+    if (!distanceLabel_) {
+        return;
     }
-    setText(distanceLabel_, text);
-    setSpokenText(distanceLabel_, std::move(spoken));
+    const std::string text = isVisibility_ ? "" : distance;
+    if (text == distanceLabel_->text() && distanceLabel_->accessibilityLabel()) {
+        return;
+    }
+    distanceLabel_->setText(text);
+    distanceLabel_->setAccessibilityLabel(text.empty() ? text : spokenDistance(text));
 }
 
 std::optional<platform::Url> KTRVelaFriendView::urlForTouch() {
@@ -219,12 +236,11 @@ std::string KTRVelaFriendView::accessibilityText() const {
             parts.push_back(label ? label->accessibilityText() : "");
         }
     } else {
-        const auto filled = [](const char* key, const std::string& text) {
-            return text.empty() ? "" : platform::formatted(AssistantLocalizedString(key), {text});
-        };
-        const bool isPlaced = location_ && location_->hasCoordinate();
-        parts.push_back(isPlaced ? filled("ACCESSIBILITY_AT_LABEL", placeText()) : placeText());
-        parts.push_back(isVisibility_ ? "" : filled("ACCESSIBILITY_DISTANCE", distanceText()));
+        const std::string place = placeText();
+        const std::string distance = distanceText();
+        const bool isPlaced = location_ && location_->hasCoordinate() && !place.empty();
+        parts.push_back(isPlaced ? spokenPlace(place) : place);
+        parts.push_back(isVisibility_ || distance.empty() ? "" : spokenDistance(distance));
         parts.push_back(ageTexts().spoken);
     }
     return SpokenRow::line(parts);

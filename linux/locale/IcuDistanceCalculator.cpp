@@ -15,7 +15,7 @@
 
 #include "linux/locale/LocaleRegion.h"
 #include "linux/locale/UnitWidth.h"
-#include "platform/base/Format.h"
+#include "platform/base/FilledText.h"
 
 namespace ktr::linux_ {
 
@@ -161,6 +161,10 @@ std::optional<std::int64_t> roundedNumber(double number, bool isInTens) {
     return static_cast<std::int64_t>(whole) * 4 + (isInTens ? 3 : decimals);
 }
 
+std::string frameIn(const std::shared_ptr<platform::Localization>& texts) {
+    return texts ? texts->text(kFrameKey, texts->hostBundleIdentifier(), std::nullopt, kPlainFrame) : kPlainFrame;
+}
+
 std::string wordsOf(const icu::number::FormattedNumber& number, UErrorCode& status) {
     std::string text;
     number.toTempString(status).toUTF8String(text);
@@ -243,6 +247,7 @@ IcuDistanceCalculator::IcuDistanceCalculator(Settings settings, std::optional<Un
     : settings_(std::move(settings)),
       system_(UnitSystem::Metric),
       geodesy_(std::move(geodesy)),
+      frame_(frameIn(settings_.localizationDelegate)),
       formatter_(std::make_unique<Formatter>()) {
     const icu::Locale units = localeOf(settings_.measurementSystemLocale);
     if (!override) {
@@ -317,12 +322,7 @@ std::string IcuDistanceCalculator::worded(double metres) const {
 }
 
 std::string IcuDistanceCalculator::framed(const std::string& text) const {
-    const auto& texts = settings_.localizationDelegate;
-    if (!texts) {
-        return text;
-    }
-    const std::string frame = texts->text(kFrameKey, texts->hostBundleIdentifier(), std::nullopt, kPlainFrame);
-    return frame == kPlainFrame ? text : platform::formatted(frame, {text});
+    return frame_ == kPlainFrame ? text : platform::filled(frame_, {text});
 }
 
 long IcuDistanceCalculator::measurementSystem() const {

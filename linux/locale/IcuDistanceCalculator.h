@@ -49,6 +49,8 @@ class IcuDistanceCalculator : public platform::DistanceCalculator {
     Settings settings_;
     UnitSystem system_;
     std::shared_ptr<platform::Geodesy> geodesy_;
+    /// The host's, read once.
+    std::string frame_;
     std::unique_ptr<Formatter> formatter_;
     /// Cached words of late distances: at each refresh most friends are where they were.
     std::unordered_map<Ends, std::string, EndsHash> known_;

@@ -5,6 +5,7 @@
 #include <cmath>
 
 #include "platform/assistant/Localization.h"
+#include "platform/base/FilledText.h"
 #include "platform/base/Json.h"
 #include "platform/base/Platform.h"
 #include "platform/base/PluralRules.h"
@@ -123,6 +124,29 @@ void appendArgument(const Conversion& conversion, const FormatArguments& argumen
     }
 }
 
+/// Copies a format, and has each argument put where it is asked for: `append(conversion, index, out)`.
+template <class Append>
+std::string fill(std::string_view format, const Append& append) {
+    std::string out;
+    std::size_t next = 0;
+    for (std::size_t at = 0; at < format.size();) {
+        if (format[at] != '%') {
+            const auto percent = std::min(format.find('%', at), format.size());
+            out.append(format.substr(at, percent - at));
+            at = percent;
+            continue;
+        }
+        const Conversion conversion = conversionAt(format.substr(at));
+        if (conversion.kind == Conversion::Kind::Unknown || conversion.kind == Conversion::Kind::Percent) {
+            out.push_back('%');
+        } else {
+            append(conversion, conversion.position > 0 ? conversion.position - 1 : next++, out);
+        }
+        at += conversion.length;
+    }
+    return out;
+}
+
 /// The branch of a plural text that goes with the number in the first argument, by the rules of the texts' language.
 /// A text that is not built as it should be stands as it is.
 std::string_view branchFor(std::string_view text, const FormatArguments& arguments) {
@@ -154,25 +178,23 @@ std::string formatted(std::string_view format, const FormatArguments& arguments,
     if (PluralText::isPlural(format)) {
         format = branchFor(format, arguments);
     }
-    std::string out;
-    std::size_t next = 0;
-    for (std::size_t at = 0; at < format.size();) {
-        if (format[at] != '%') {
-            const auto percent = std::min(format.find('%', at), format.size());
-            out.append(format.substr(at, percent - at));
-            at = percent;
-            continue;
-        }
-        const Conversion conversion = conversionAt(format.substr(at));
-        if (conversion.kind == Conversion::Kind::Unknown || conversion.kind == Conversion::Kind::Percent) {
-            out.push_back('%');
-        } else {
-            const std::size_t index = conversion.position > 0 ? conversion.position - 1 : next++;
-            appendArgument(conversion, arguments, index, redact, out);
-        }
-        at += conversion.length;
+    return fill(format, [&](const Conversion& conversion, std::size_t index, std::string& out) {
+        appendArgument(conversion, arguments, index, redact, out);
+    });
+}
+
+std::string filled(std::string_view format, std::initializer_list<std::string_view> texts) {
+    if (PluralText::isPlural(format)) {
+        return formatted(format, FormatArguments(texts.begin(), texts.end()));
     }
-    return out;
+    return fill(format, [&](const Conversion& conversion, std::size_t index, std::string& out) {
+        if (index >= texts.size()) {
+            out += "(null)";
+        } else {
+            // A text is no number.
+            out += conversion.kind == Conversion::Kind::Real ? "0" : texts.begin()[index];
+        }
+    });
 }
 
 }  // namespace ktr::platform

@@ -3,6 +3,7 @@
 #include <atomic>
 #include <utility>
 
+#include "platform/base/CurrentPlatform.h"
 #include "platform/base/NotificationCenter.h"
 
 namespace ktr::platform {
@@ -27,6 +28,11 @@ Platform::~Platform() = default;
 std::shared_ptr<Platform> Platform::installed() {
     const std::lock_guard lock(installMutex());
     return slot();
+}
+
+Platform* currentPlatform() {
+    // Only this thread changes what the slot holds.
+    return slot().get();
 }
 
 void Platform::install(std::shared_ptr<Platform> platform) {

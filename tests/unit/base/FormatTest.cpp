@@ -4,6 +4,8 @@
 
 #include <memory>
 
+#include "platform/base/FilledText.h"
+
 namespace ktr::test {
 namespace {
 
@@ -23,6 +25,14 @@ TEST(FormatTest, FillsEachConversion) {
 TEST(FormatTest, RealsRoundHalvesToEven) {
     EXPECT_EQ(formatted("%0.0f %0.0f %0.0f %0.0f", {0.5, 1.5, 2.5, -0.6}), "0 2 2 -1");
     EXPECT_EQ(formatted("%0.0f", {1e22}), "10000000000000000000000");
+}
+
+TEST(FormatTest, FilledWithTexts_IsWhatIsFormattedOfThem) {
+    for (const char* format : {"%@", "at %1$@, %2$@", "%2$@ %@ %@", "%d %i %li|%0.0f", "100 %% %", "%q %@", "",
+                               "{0, plural, one{one %@} other{many %@}}", "{0, plural, broken"}) {
+        EXPECT_EQ(platform::filled(format, {"Ann", "50 %@"}), formatted(format, {"Ann", "50 %@"})) << format;
+        EXPECT_EQ(platform::filled(format, {}), formatted(format, {})) << format;
+    }
 }
 
 TEST(FormatTest, NoneReadsNull) {

@@ -36,6 +36,7 @@ class KTRVAUIUtilsTest : public PlatformTest {
         const platform::Value* text = texts.find(key);
         return text != nullptr && text->string() != nullptr ? *text->string() : "absent";
     }
+    std::size_t texts() const { return localization->asked.size(); }
     static std::string row(double secondsAgo) { return entry(secondsAgo, "LabelStringKey"); }
     static std::string spoken(double secondsAgo) { return entry(secondsAgo, "LabelAccessibilityStringKey"); }
 };
@@ -112,6 +113,26 @@ TEST_F(KTRVAUIUtilsTest, BothTextsHaveTheLocalesDigits) {
     platform->decimalNumbers = std::make_shared<ArabicNumbers>();
     EXPECT_EQ(row(45.0), "LOCATED_LESS_THAN_30SECONDS ٣٠");
     EXPECT_EQ(spoken(12.0 * 60.0), "ACCESSIBILITY_LOCATED_MINUTES ١٢");
+}
+
+TEST_F(KTRVAUIUtilsTest, SameAgeAgain_IsNotWordedAgain) {
+    const std::string first = row(300.0);
+    const std::size_t asked = texts();
+    EXPECT_EQ(row(330.0), first);
+    EXPECT_EQ(texts(), asked);
+    EXPECT_NE(row(360.0), first);
+    EXPECT_EQ(texts(), asked + 2);
+}
+
+TEST_F(KTRVAUIUtilsTest, MoreAgesThanAreKept_AreAllRight) {
+    for (int pass = 0; pass < 2; ++pass) {
+        for (int hours = 2; hours < 1000; ++hours) {
+            EXPECT_EQ(row(3600.0 * hours), "LOCATED_MORE_THAN_1HR " + std::to_string(hours));
+        }
+    }
+    // The same number in minutes and in hours.
+    EXPECT_EQ(row(120.0), "LOCATED_MINUTES 2");
+    EXPECT_EQ(row(7200.0), "LOCATED_MORE_THAN_1HR 2");
 }
 
 }  // namespace
