@@ -4,7 +4,7 @@
 #include "model/LogCategory.h"
 #include "model/PluginBundle.h"
 #include "platform/assistant/AssistantSettings.h"
-#include "platform/base/Format.h"
+#include "platform/base/FilledText.h"
 #include "platform/base/Platform.h"
 #include "platform/base/Utf8.h"
 #include "platform/contacts/PhoneNumberLibrary.h"
@@ -88,6 +88,11 @@ void describe(VAPerson& person, const std::shared_ptr<Contact>& contact) {
     person.identifier = installed->assistantContacts->assistantIdentifierForContact(*contact);
 }
 
+const std::optional<std::string>& noHandle() {
+    static const std::optional<std::string> none;
+    return none;
+}
+
 }  // namespace
 
 bool KTRVALocation::initWithVelaLocation(const std::shared_ptr<VAKtrLocation>& velaLocation) {
@@ -118,25 +123,42 @@ std::shared_ptr<KTRVALocation> KTRVALocation::locationWithHandle(const std::opti
     return platform::create<KTRVALocation>(&KTRVALocation::initWithHandle, handle, vaPerson, dictionary);
 }
 
+std::shared_ptr<KTRVALocation> KTRVALocation::locationWithEntry(const std::string& handle,
+                                                                const std::shared_ptr<VAPerson>& vaPerson,
+                                                                const Dictionary* entry) {
+    auto record = platform::create<KTRVALocation>(&KTRVALocation::init);
+    if (record) {
+        record->decodeEntry(handle, vaPerson, entry);
+    }
+    return record;
+}
+
 void KTRVALocation::decodeHandle(const std::optional<std::string>& handle, const std::shared_ptr<VAPerson>& vaPerson,
                                  const std::optional<Dictionary>& dictionary) {
+    decodeEntry(handle, vaPerson, dictionary ? &*dictionary : nullptr);
+}
+
+void KTRVALocation::decodeEntry(const std::optional<std::string>& handle, const std::shared_ptr<VAPerson>& vaPerson,
+                                const Dictionary* entry) {
     velaLocation_ = std::make_shared<VAKtrLocation>();
     auto person = vaPerson;
     if (!person) {
         person = Common::sharedInstance()->isHandleEmail(handle) ? personForEmailFromContacts(handle)
                                                                  : personForPhoneFromContacts(handle);
     }
-    LogCategory_Unspecified()->write(platform::LogLevel::Debug, "VAPerson found: %@", person);
+    if (isLineWanted(platform::LogLevel::Debug)) {
+        LogCategory_Unspecified()->write(platform::LogLevel::Debug, "VAPerson found: %@", person);
+    }
     velaLocation_->friend_ = std::make_shared<VAPersonAttribute>();
-    velaLocation_->friend_->object = person;
+    velaLocation_->friend_->object = std::move(person);
     velaLocation_->friend_->data = handle;
-    if (!dictionary) {
+    if (entry == nullptr) {
         return;
     }
-    if (const auto distance = textAt(*dictionary, "distanceInMeters")) {
+    if (const auto distance = textAt(*entry, "distanceInMeters")) {
         velaLocation_->distance = numberFormatter()->numberFromString(*distance);
     }
-    const Dictionary* location = dictionaryAt(&*dictionary, "location");
+    const Dictionary* location = dictionaryAt(entry, "location");
     if (const Dictionary* address = dictionaryAt(location, "address")) {
         decodeAddress(*address);
     }
@@ -180,48 +202,44 @@ std::shared_ptr<platform::NumberFormatter> KTRVALocation::numberFormatter() {
     return Platform::installed()->decimalNumbers;
 }
 
-std::shared_ptr<VAPerson> KTRVALocation::person() const {
-    return velaLocation_ && velaLocation_->friend_ ? velaLocation_->friend_->object : nullptr;
+const VAPerson* KTRVALocation::person() const {
+    return velaLocation_ && velaLocation_->friend_ ? velaLocation_->friend_->object.get() : nullptr;
 }
 
 std::string KTRVALocation::friendName() const {
-    const auto friendPerson = person();
-    if (friendPerson && friendPerson->fullName && !friendPerson->fullName->empty()) {
+    const auto* friendPerson = person();
+    if (friendPerson != nullptr && friendPerson->fullName && !friendPerson->fullName->empty()) {
         return *friendPerson->fullName;
     }
     return friendHandlePretty();
 }
 
-std::optional<std::string> KTRVALocation::friendEmail() const {
-    const auto friendPerson = person();
-    if (!friendPerson || friendPerson->emails.empty() || !friendPerson->emails.back()) {
-        return std::nullopt;
-    }
-    return friendPerson->emails.back()->emailAddress;
+const std::optional<std::string>& KTRVALocation::friendEmail() const {
+    const auto* friendPerson = person();
+    const bool isThere = friendPerson != nullptr && !friendPerson->emails.empty() && friendPerson->emails.back();
+    return isThere ? friendPerson->emails.back()->emailAddress : noHandle();
 }
 
-std::optional<std::string> KTRVALocation::friendPhone() const {
-    const auto friendPerson = person();
-    if (!friendPerson || friendPerson->phones.empty() || !friendPerson->phones.back()) {
-        return std::nullopt;
-    }
-    return friendPerson->phones.back()->number;
+const std::optional<std::string>& KTRVALocation::friendPhone() const {
+    const auto* friendPerson = person();
+    const bool isThere = friendPerson != nullptr && !friendPerson->phones.empty() && friendPerson->phones.back();
+    return isThere ? friendPerson->phones.back()->number : noHandle();
 }
 
-std::optional<std::string> KTRVALocation::friendHandle() const {
-    auto email = friendEmail();
+const std::optional<std::string>& KTRVALocation::friendHandle() const {
+    const auto& email = friendEmail();
     return email ? email : friendPhone();
 }
 
 std::string KTRVALocation::friendHandlePretty() const {
-    if (auto email = friendEmail()) {
+    if (const auto& email = friendEmail()) {
         return *email;
     }
     return formatPhoneNumber(friendPhone().value_or(""));
 }
 
 std::string KTRVALocation::unformattedHandle() const {
-    if (auto email = friendEmail()) {
+    if (const auto& email = friendEmail()) {
         return *email;
     }
     return unformatPhoneNumber(friendPhone().value_or(""));
@@ -267,7 +285,8 @@ std::string KTRVALocation::friendLocation(bool refreshFinished) const {
             return *velaLocation_->label;
         }
         if (city && state && *city != *state) {
-            return platform::formatted(AssistantLocalizedString("CITY_STATE_LABEL"), {*city, *state});
+            static const std::string kCityAndState = "CITY_STATE_LABEL";
+            return platform::filled(AssistantLocalizedString(kCityAndState), {*city, *state});
         }
         if (city || state) {
             return city ? *city : *state;
@@ -287,8 +306,10 @@ std::optional<std::string> KTRVALocation::distanceFromLocation(
     }
     const auto calculator = distanceCalculator();
     auto text = calculator->localizedDistance(*location, *place);
-    LogCategory_Unspecified()->write(platform::LogLevel::Debug, "Distance calculated: %@ for friend: %@ (Unit:%li)",
-                                     text, friendName(), calculator->measurementSystem());
+    if (isLineWanted(platform::LogLevel::Debug)) {
+        LogCategory_Unspecified()->write(platform::LogLevel::Debug, "Distance calculated: %@ for friend: %@ (Unit:%li)",
+                                         text, friendName(), calculator->measurementSystem());
+    }
     return text;
 }
 

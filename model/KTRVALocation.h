@@ -30,6 +30,10 @@ class KTRVALocation : public KTRVABaseModel {
     static std::shared_ptr<KTRVALocation> locationWithHandle(const std::optional<std::string>& handle,
                                                              const std::shared_ptr<platform::VAPerson>& vaPerson,
                                                              const std::optional<platform::Dictionary>& dictionary);
+    /// As `locationWithHandle`, of an entry that stays where it is: of a thousand none is copied.
+    static std::shared_ptr<KTRVALocation> locationWithEntry(const std::string& handle,
+                                                            const std::shared_ptr<platform::VAPerson>& vaPerson,
+                                                            const platform::Dictionary* entry);
 
     /// Replaces the wrapped object by a new one made of the handle, the person (none: looked up in the contacts by the
     /// handle) and one entry of the service's answer. The entry:
@@ -57,11 +61,11 @@ class KTRVALocation : public KTRVABaseModel {
 
     /// The full name, else the handle for reading; empty when there is neither.
     std::string friendName() const;
-    /// The last of the person's e-mail addresses, or of their numbers. A present empty one counts.
-    std::optional<std::string> friendEmail() const;
-    std::optional<std::string> friendPhone() const;
+    /// The last of the person's e-mail addresses, or of their numbers, where it stands. A present empty one counts.
+    const std::optional<std::string>& friendEmail() const;
+    const std::optional<std::string>& friendPhone() const;
     /// The e-mail address, else the number.
-    std::optional<std::string> friendHandle() const;
+    const std::optional<std::string>& friendHandle() const;
     /// The e-mail address, else the number for reading; empty without either.
     std::string friendHandlePretty() const;
     /// The e-mail address, else the number's digits and "+"; empty without either.
@@ -95,7 +99,9 @@ class KTRVALocation : public KTRVABaseModel {
     static std::shared_ptr<platform::Bundle> bundle();
 
   private:
-    std::shared_ptr<platform::VAPerson> person() const;
+    const platform::VAPerson* person() const;
+    void decodeEntry(const std::optional<std::string>& handle, const std::shared_ptr<platform::VAPerson>& vaPerson,
+                     const platform::Dictionary* entry);
     void decodeAddress(const platform::Dictionary& address);
     void decodeFix(const platform::Dictionary& location);
 

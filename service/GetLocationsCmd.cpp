@@ -1,6 +1,7 @@
 #include "service/GetLocationsCmd.h"
 
 #include <algorithm>
+#include <cstddef>
 
 #include "model/KTRVALocation.h"
 #include "model/LogCategory.h"
@@ -42,6 +43,30 @@ const Dictionary* objectAt(const Dictionary& dictionary, const std::string& key)
     const Value* value = dictionary.find(key);
     return value != nullptr ? value->dictionary() : nullptr;
 }
+
+/// The entries of an answer by handle. Services list both in one order: then none is looked up.
+class EntriesInOrder {
+  public:
+    explicit EntriesInOrder(const Dictionary* locations) : locations_(locations) {}
+    /// None for a handle without an object.
+    const Dictionary* of(const std::string& handle) {
+        if (locations_ == nullptr) {
+            return nullptr;
+        }
+        if (next_ < locations_->size()) {
+            const auto& [key, value] = *(locations_->begin() + static_cast<std::ptrdiff_t>(next_));
+            if (key == handle) {
+                ++next_;
+                return value.dictionary();
+            }
+        }
+        return objectAt(*locations_, handle);
+    }
+
+  private:
+    const Dictionary* locations_;
+    std::size_t next_ = 0;
+};
 
 /// The handles to walk.
 std::vector<std::string> handlesOf(const Dictionary& response, const Dictionary* locations) {
@@ -150,13 +175,11 @@ void GetLocationsCmd::readServerContext(const Dictionary& response) {
     setContextIdentifierURL(KTRVAUtils::contextIdentifierURLForDictionary(context));
 }
 
-void GetLocationsCmd::appendLocation(const std::string& handle, const Dictionary* locations, ServiceResult& found) {
-    const Dictionary* entry = locations != nullptr ? objectAt(*locations, handle) : nullptr;
+void GetLocationsCmd::appendLocation(const std::string& handle, const Dictionary* entry, ServiceResult& found) {
     if (entry != nullptr && jsonInteger(entry->find("status")) == kNotReported) {
         return;
     }
-    const auto record = KTRVALocation::locationWithHandle(handle, friendForHandle(handle),
-                                                          entry != nullptr ? std::optional(*entry) : std::nullopt);
+    const auto record = KTRVALocation::locationWithEntry(handle, friendForHandle(handle), entry);
     if (record && record->velaLocation()) {
         found.emplace_back(record->velaLocation());
     }
@@ -171,9 +194,12 @@ std::optional<ServiceResult> GetLocationsCmd::result() {
     }
     readServerContext(*response);
     const Dictionary* locations = objectAt(*response, "locations");
+    const std::vector<std::string> handles = handlesOf(*response, locations);
     ServiceResult found;
-    for (const std::string& handle : handlesOf(*response, locations)) {
-        appendLocation(handle, locations, found);
+    found.reserve(handles.size());
+    EntriesInOrder entries(locations);
+    for (const std::string& handle : handles) {
+        appendLocation(handle, entries.of(handle), found);
     }
     LogCategory_Unspecified()->line("location result: %@", std::make_shared<DescribedList>(found));
     return found;

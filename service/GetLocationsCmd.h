@@ -64,7 +64,8 @@ class GetLocationsCmd : public KTRBaseCmd {
 
   private:
     void readServerContext(const platform::Dictionary& response);
-    void appendLocation(const std::string& handle, const platform::Dictionary* locations, ServiceResult& found);
+    /// `entry` may be none.
+    void appendLocation(const std::string& handle, const platform::Dictionary* entry, ServiceResult& found);
 
     std::optional<Persons> friends_;
     /// The first person of each address and number.

@@ -93,6 +93,18 @@ void KTJSONCommand::finish(HttpAnswer answer) {
     }
 }
 
+bool KTJSONCommand::hasLargeAnswer() const {
+    constexpr std::size_t kMany = 100;
+    return response_ && std::any_of(response_->begin(), response_->end(), [](const auto& entry) {
+               const Dictionary* members = entry.second.dictionary();
+               return members != nullptr && members->size() >= kMany;
+           });
+}
+
+std::optional<Dictionary> KTJSONCommand::takeAnswer() {
+    return std::exchange(response_, std::nullopt);
+}
+
 KTJSONCommand::CompletionBlock KTJSONCommand::takeCompletionBlock() {
     return std::exchange(completionBlock_, nullptr);
 }

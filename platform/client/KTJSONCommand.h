@@ -59,6 +59,9 @@ class KTR_API KTJSONCommand : public Object {
     HttpRequest makeRequest();
     void finish(HttpAnswer answer);
     CompletionBlock takeCompletionBlock();
+    std::optional<Dictionary> takeAnswer();
+    /// Whether giving back the answer's memory takes as long as filling some rows: hundreds of entries.
+    bool hasLargeAnswer() const;
 
     std::string scheme_;
     std::string host_;

@@ -46,7 +46,14 @@ void KTServerInteractionController::sendCommand(const std::shared_ptr<KTJSONComm
         // The last references go on the main thread, after what the block has posted there.
         Sending last = std::move(*sending);
         const auto loop = std::move(last.mainLoop);
-        loop->post([kept = std::make_shared<Sending>(std::move(last))] {});
+        loop->post([kept = std::make_shared<Sending>(std::move(last)), worker = std::weak_ptr(loop)] {
+            kept->block = nullptr;
+            const auto there = worker.lock();
+            // Nobody else has the command: nobody can ask for its answer any more.
+            if (there && kept->command.use_count() == 1 && kept->command->hasLargeAnswer()) {
+                there->runInBackground([answer = kept->command->takeAnswer()] {});
+            }
+        });
     };
     if (command->host().empty() || !platform->httpTransport) {
         platform->mainLoop->post([finish] { finish({HttpFailure::BadRequest, 0, std::nullopt, std::nullopt}); });

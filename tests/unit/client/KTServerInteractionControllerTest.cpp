@@ -2,6 +2,7 @@
 
 #include <thread>
 
+#include "tests/support/BackgroundLoop.h"
 #include "tests/support/PlatformTest.h"
 
 namespace ktr::test {
@@ -173,6 +174,32 @@ TEST_F(KTServerInteractionControllerTest, CompletionMayClearItselfAndIsReleasedO
     time->runPosted();
     EXPECT_EQ(released, std::this_thread::get_id());
     EXPECT_TRUE(watched.expired());
+}
+
+TEST_F(KTServerInteractionControllerTest, LargeAnswer_IsGivenBackOnAWorkerOnceNobodyHasTheCommand) {
+    const auto loop = std::make_shared<BackgroundLoop>(time->now());
+    platform->mainLoop = loop;
+    Dictionary many;
+    for (int i = 0; i < 200; ++i) {
+        many.set(std::to_string(i), i);
+    }
+    send();
+    transport->answer(Dictionary{{"locations", many}});
+    loop->runPosted();
+    EXPECT_TRUE(loop->waiting.empty()) << "somebody may still ask for it";
+    EXPECT_TRUE(command->jsonResponseDictionary());
+    for (const bool isLarge : {false, true}) {
+        command = platform::create<EchoCommand>(&EchoCommand::init);
+        command->setHost("service.example.org");
+        send();
+        const std::weak_ptr<EchoCommand> watched = command;
+        command.reset();
+        transport->answer(Dictionary{{"locations", isLarge ? many : Dictionary{{"a", 1}}}});
+        loop->runPosted();
+        EXPECT_TRUE(watched.expired());
+        EXPECT_EQ(loop->waiting.size(), isLarge ? 1U : 0U) << "a small one is not worth waking a worker";
+    }
+    loop->runOnThreads();
 }
 
 TEST_F(KTServerInteractionControllerTest, TransportGoesAway_CommandFailsAndNothingLeaks) {

@@ -215,5 +215,26 @@ TEST_F(GetLocationsCmdTest, Result_IsMadeAnewAtEveryCall) {
               std::get<std::shared_ptr<platform::VAKtrLocation>>(second[0]));
 }
 
+TEST_F(GetLocationsCmdTest, Result_EachHandleHasItsOwnEntryInAnyOrder) {
+    const auto inTown = [](const char* town) {
+        return Dictionary{{"location", Dictionary{{"address", Dictionary{{"locality", town}}}}}};
+    };
+    const Dictionary locations{{"a@x", inTown("A")}, {"b@x", inTown("B")}, {"c@x", inTown("C")}};
+    using Handles = platform::Value::Array;
+    for (const Handles& order : {Handles{"a@x", "b@x", "c@x"}, Handles{"c@x", "b@x", "a@x"}, Handles{"a@x", "a@x"},
+                                 Handles{"b@x", "none@x", "a@x", "b@x", "c@x"}}) {
+        answer({{"emails", order}, {"locations", locations}});
+        const auto result = command->result().value();
+        ASSERT_EQ(result.size(), order.size());
+        for (std::size_t i = 0; i < order.size(); ++i) {
+            const auto object = std::get<std::shared_ptr<platform::VAKtrLocation>>(result[i]);
+            const std::string& handle = *order[i].string();
+            EXPECT_EQ(object->city, handle == "none@x"
+                                        ? std::nullopt
+                                        : std::optional(std::string(1, static_cast<char>(handle[0] - 32))));
+        }
+    }
+}
+
 }  // namespace
 }  // namespace ktr::test
