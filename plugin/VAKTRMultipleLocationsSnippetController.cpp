@@ -90,10 +90,37 @@ std::shared_ptr<KTRVelaFriendView> VAKTRMultipleLocationsSnippetController::make
     return row;
 }
 
+bool VAKTRMultipleLocationsSnippetController::refillSameRows(const Locations& known) {
+    const auto container = containerView();
+    if (displayShowAllRow_ || !container || known.size() != arranged_.size() ||
+        known.size() != container->arrangedSubviews().size()) {
+        return false;
+    }
+    for (std::size_t i = 0; i < known.size(); ++i) {
+        const auto& handle = known[i]->friendHandle();
+        if (!handle || *handle != arranged_[i].first || container->arrangedSubviews()[i] != arranged_[i].second) {
+            return false;
+        }
+    }
+    // What is asked while a row is filled may lead back here.
+    ArrangedRows rows = std::exchange(arranged_, {});
+    for (std::size_t i = 0; i < known.size(); ++i) {
+        rows[i].second->setLocation(known[i]);
+        rows[i].second->setSeparatorEnabled(i + 1 < known.size());
+    }
+    if (arranged_.empty()) {
+        arranged_ = std::move(rows);
+    }
+    return true;
+}
+
 void VAKTRMultipleLocationsSnippetController::createFriendViews() {
     const Locations known = proximityLocationsWithCoordinates();
     if (known.empty()) {
         showMessage();
+        return;
+    }
+    if (refillSameRows(known)) {
         return;
     }
     // A handle that comes again has one row, which stands, and is filled, at its last place: what the earlier places
@@ -110,6 +137,8 @@ void VAKTRMultipleLocationsSnippetController::createFriendViews() {
     }
     FriendViews views;
     views.reserve(lastPlaces.size());
+    ArrangedRows arranged;
+    arranged.reserve(lastPlaces.size());
     Views rows;
     rows.reserve(lastPlaces.size());
     for (std::size_t i = 0; i < known.size(); ++i) {
@@ -120,9 +149,11 @@ void VAKTRMultipleLocationsSnippetController::createFriendViews() {
         row->setLocation(known[i]);
         row->setSeparatorEnabled(i + 1 < known.size() || displayShowAllRow_);
         rows.push_back(row);
+        arranged.emplace_back(keys[i], row);
         views.emplace(keys[i], std::move(row));
     }
     const FriendViews earlier = std::exchange(friendViews_, std::move(views));
+    arranged_ = std::move(arranged);
     if (displayShowAllRow_ && singleLabelView_) {
         singleLabelView_->setLabelText(AssistantLocalizedString("SHOW_ALL"));
         singleLabelView_->setIsShowAll(true);

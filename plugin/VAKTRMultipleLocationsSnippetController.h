@@ -3,6 +3,7 @@
 #include <memory>
 #include <string>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "plugin/VAKTRBaseSnippetController.h"
@@ -37,15 +38,22 @@ class VAKTRMultipleLocationsSnippetController : public VAKTRBaseSnippetControlle
     bool displayShowAllRow() const { return displayShowAllRow_; }
     void setDisplayShowAllRow(bool display) { displayShowAllRow_ = display; }
     const FriendViews& friendViews() const { return friendViews_; }
-    void setFriendViews(FriendViews views) { friendViews_ = std::move(views); }
+    void setFriendViews(FriendViews views) {
+        friendViews_ = std::move(views);
+        arranged_.clear();
+    }
     /// The message, and the row that opens the whole list.
     std::shared_ptr<KTRVelaSingleLabelView> singleLabelView() const { return singleLabelView_; }
     void setSingleLabelView(std::shared_ptr<KTRVelaSingleLabelView> view) { singleLabelView_ = std::move(view); }
 
   private:
     using Views = std::vector<std::shared_ptr<platform::View>>;
+    using ArrangedRows = std::vector<std::pair<std::string, std::shared_ptr<KTRVelaFriendView>>>;
 
     std::shared_ptr<KTRVelaFriendView> makeFriendView();
+    /// Fills the rows that are there, when the friends are those of the earlier pass in the same order; false when they
+    /// are not, with nothing done.
+    bool refillSameRows(const Locations& known);
     /// The row of the earlier pass, or a new one.
     std::shared_ptr<KTRVelaFriendView> rowForKey(const std::string& key);
     void showMessage();
@@ -55,6 +63,8 @@ class VAKTRMultipleLocationsSnippetController : public VAKTRBaseSnippetControlle
 
     bool displayShowAllRow_ = false;
     FriendViews friendViews_;
+    /// The rows as they were last arranged, each with its friend's key.
+    ArrangedRows arranged_;
     std::shared_ptr<KTRVelaSingleLabelView> singleLabelView_;
 };
 

@@ -145,12 +145,17 @@ platform::VisualFormatMetrics KTRVelaBaseView::layoutMetrics() {
 
 void KTRVelaBaseView::assignContactLater(std::shared_ptr<platform::Contact> contact) {
     const auto installed = Platform::installed();
-    if (!installed || !installed->mainLoop) {
+    const bool isGiven = contactsAwaited_ == 0 && hasContact_ && contact_ == contact.get();
+    if (isGiven || !installed || !installed->mainLoop) {
         return;
     }
+    ++contactsAwaited_;
     installed->mainLoop->schedule(kAvatarDelay, false, [self = platform::strong(this), shown = std::move(contact)] {
+        --self->contactsAwaited_;
         if (self->avatarViewController_) {
             self->avatarViewController_->setContacts({shown ? shown : std::make_shared<platform::Contact>()});
+            self->hasContact_ = true;
+            self->contact_ = shown.get();
         }
     });
 }

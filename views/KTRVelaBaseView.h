@@ -60,6 +60,7 @@ class KTRVelaBaseView : public platform::View {
     std::shared_ptr<platform::ContactAvatarController> avatarViewController() const { return avatarViewController_; }
     void setAvatarViewController(std::shared_ptr<platform::ContactAvatarController> controller) {
         avatarViewController_ = std::move(controller);
+        hasContact_ = false;
     }
     /// Holds the avatar's view.
     std::shared_ptr<platform::View> friendIconView() const { return friendIconView_; }
@@ -80,7 +81,7 @@ class KTRVelaBaseView : public platform::View {
     /// What the rows' layout formats name: margins, the avatar's size, a hairline of one pixel of the main screen.
     static platform::VisualFormatMetrics layoutMetrics();
     /// Gives the avatar this contact, or an empty one, 0.1 seconds later. The row is held until then: it is the row
-    /// that was filled that gets the avatar, whoever drops it.
+    /// that was filled that gets the avatar, whoever drops it. What it has already it is not given again.
     void assignContactLater(std::shared_ptr<platform::Contact> contact);
     /// The least height that the row's constraints allow at its present width, points.
     double fittingHeight();
@@ -91,6 +92,11 @@ class KTRVelaBaseView : public platform::View {
     bool separatorEnabled_ = false;
     std::weak_ptr<ViewURLHandler> urlHandler_;
     std::weak_ptr<FriendViewDelegate> viewDelegate_;
+    /// Whether, and which, contact was given to the avatar, which keeps it; none for an empty one.
+    bool hasContact_ = false;
+    const platform::Contact* contact_ = nullptr;
+    /// How many contacts are on their way to it.
+    int contactsAwaited_ = 0;
     std::shared_ptr<platform::ContactAvatarController> avatarViewController_;
     std::shared_ptr<platform::View> friendIconView_;
     std::shared_ptr<platform::View> separatorView_;

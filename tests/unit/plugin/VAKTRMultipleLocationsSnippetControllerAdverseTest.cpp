@@ -265,7 +265,10 @@ TEST_F(VAKTRMultipleLocationsSnippetControllerAdverseTest, Locations_ChangedWhil
 TEST_F(VAKTRMultipleLocationsSnippetControllerAdverseTest, ReloadTimer_DropsTheControllerItself) {
     const auto talking = std::make_shared<TalkingLocalization>();
     platform->localization = talking;
-    auto controller = makeController({ann()});
+    // City and state are put together anew at each filling: the texts are asked.
+    auto friendInState = ann();
+    friendInState->stateCode = "SP";
+    auto controller = makeController({friendInState});
     layOut(controller, 320.0);
     time->runUntilIdle(1.0);
     controller->viewWillAppear(false);

@@ -9,6 +9,7 @@
 namespace ktr {
 
 using namespace platform;
+using test::contactWith;
 using test::FakeHost;
 using test::friendByEmail;
 using test::listOf;
@@ -296,9 +297,39 @@ TEST_F(VAKTRMultipleLocationsSnippetControllerTest, SameHandleAThousandTimes_IsF
     time->runUntilIdle(1.0);
     const std::size_t timers = time->pendingTimers();
     const int lookups = contacts->fetches;
+    contacts->contacts = {contactWith("ann", "ann@example.org", "")};
     update(controller, LocationList(1000, ann()));
     EXPECT_EQ(time->pendingTimers(), timers + 1);
     EXPECT_EQ(contacts->fetches, lookups + 1);
+}
+
+TEST_F(VAKTRMultipleLocationsSnippetControllerTest, SameFriendsAgain_ShowWhatIsNewInTheSameRows) {
+    const auto controller = makeController({ann(), bo()});
+    controller->desiredHeightForWidth(320.0);
+    const Views before = shown(controller);
+    auto moved = bo();
+    moved->city = "Elsewhere";
+    update(controller, {ann(), moved});
+    EXPECT_EQ(shown(controller), before);
+    EXPECT_EQ(std::static_pointer_cast<KTRVelaFriendView>(before[1])->locationLabel()->text(), "Elsewhere");
+    EXPECT_TRUE(std::static_pointer_cast<KTRVelaFriendView>(before[0])->separatorEnabled());
+    EXPECT_FALSE(std::static_pointer_cast<KTRVelaFriendView>(before[1])->separatorEnabled());
+    // In another order, or with one row somewhere else, it is arranged again.
+    update(controller, {bo(), ann()});
+    EXPECT_EQ(shown(controller), (Views{before[1], before[0]}));
+    controller->containerView()->setArrangedSubviews({before[0]});
+    update(controller, {bo(), ann()});
+    EXPECT_EQ(shown(controller), (Views{before[1], before[0]}));
+}
+
+TEST_F(VAKTRMultipleLocationsSnippetControllerTest, OtherRowsBySetter_AreTheOnesThatAreFilled) {
+    const auto controller = makeController({ann()});
+    controller->desiredHeightForWidth(320.0);
+    const Views before = shown(controller);
+    controller->setFriendViews({});
+    update(controller, {ann()});
+    ASSERT_EQ(shown(controller).size(), 1u);
+    EXPECT_NE(shown(controller)[0], before[0]);
 }
 
 TEST_F(VAKTRMultipleLocationsSnippetControllerTest, SameHandleTwice_RowsOfOthersLeaveTheTree) {

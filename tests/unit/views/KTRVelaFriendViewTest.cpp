@@ -255,6 +255,41 @@ TEST_F(KTRVelaFriendViewTest, Avatar_UnknownContact_IsOneEmptyContact) {
     EXPECT_TRUE(row->avatarViewController()->contacts().front()->isEmpty());
 }
 
+TEST_F(KTRVelaFriendViewTest, Avatar_SameContactAgain_AsksForNoStep) {
+    const auto ann = contactWith("ann", "ann@example.org", "");
+    const auto row = rowFor(friendByEmail("Ann", "ann@example.org"));
+    time->advance(0.1);
+    const std::size_t timers = time->pendingTimers();
+    row->updateView();
+    EXPECT_EQ(time->pendingTimers(), timers) << "nobody, again";
+    contacts->contacts = {ann};
+    row->updateView();
+    EXPECT_EQ(time->pendingTimers(), timers + 1);
+    // One that is on its way is no reason to rest: another may overtake what is shown.
+    contacts->contacts = {};
+    row->updateView();
+    EXPECT_EQ(time->pendingTimers(), timers + 2);
+    time->advance(0.1);
+    EXPECT_TRUE(row->avatarViewController()->contacts().front()->isEmpty());
+    contacts->contacts = {ann};
+    row->updateView();
+    time->advance(0.1);
+    row->updateView();
+    EXPECT_EQ(time->pendingTimers(), timers);
+    EXPECT_EQ(row->avatarViewController()->contacts(), std::vector{ann});
+    EXPECT_EQ(contacts->fetches, 6) << "the look-up is at once, each time";
+}
+
+TEST_F(KTRVelaFriendViewTest, Avatar_AnotherAvatarController_IsGivenTheContact) {
+    const auto row = rowFor(friendByEmail("Ann", "ann@example.org"));
+    time->advance(0.1);
+    const auto other = std::make_shared<ContactAvatarController>();
+    row->setAvatarViewController(other);
+    row->updateView();
+    time->advance(0.1);
+    EXPECT_EQ(other->contacts().size(), 1u);
+}
+
 TEST_F(KTRVelaFriendViewTest, Avatar_DeferredStepKeepsRowAlive) {
     auto row = rowFor(friendByEmail("Ann", "ann@example.org"));
     const auto avatar = row->avatarViewController();
