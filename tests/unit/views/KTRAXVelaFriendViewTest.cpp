@@ -400,6 +400,9 @@ TEST_F(KTRAXVelaFriendViewTest, Avatar_OneStepAFilling_AndTheImageDoesNotWaitFor
     ASSERT_EQ(row->avatarViewController()->contacts().size(), 1u);
     EXPECT_EQ(row->avatarViewController()->contacts()[0], contacts->contacts[0]);
     row->updateView();
+    EXPECT_EQ(time->pendingTimers(), 0u) << "the same contact again";
+    contacts->contacts = {test::contactWith("c2", "ann@example.org", "")};
+    row->updateView();
     EXPECT_EQ(time->pendingTimers(), 1u);
 }
 
@@ -427,15 +430,15 @@ TEST_F(KTRAXVelaFriendViewTest, Threads_ManyRowsAreRenderedAtOnce) {
 }
 
 TEST_F(KTRAXVelaFriendViewTest, ScreenReader_HearsOneLinkAndNoImage) {
+    localization->set(kBundle, "ACCESSIBILITY_AT_LABEL", "At %@");
+    localization->set(kBundle, "ACCESSIBILITY_ROW_PARTS", "%1$@, %2$@");
+    localization->set(kBundle, "ACCESSIBILITY_DISTANCE", "%@ away");
+    localization->set(kBundle, "ACCESSIBILITY_LOCATED_MINUTES", "%@ minutes ago");
     const auto window = create<Window>(&Window::initWithFrame, Rect{0.0, 0.0, 640.0, 500.0});
     const auto row = rowFor(ann());
     time->advance(0.2);
     window->addSubview(row);
     layOut(row, 640.0);
-    localization->set(kBundle, "ACCESSIBILITY_AT_LABEL", "At %@");
-    localization->set(kBundle, "ACCESSIBILITY_ROW_PARTS", "%1$@, %2$@");
-    localization->set(kBundle, "ACCESSIBILITY_DISTANCE", "%@ away");
-    localization->set(kBundle, "ACCESSIBILITY_LOCATED_MINUTES", "%@ minutes ago");
     const auto tree = accessibilityTree(window, false);
     ASSERT_EQ(tree.children.size(), 1u);
     EXPECT_EQ(tree.children[0].role, AccessibilityRole::Link);
