@@ -176,7 +176,9 @@ TEST_F(IcuDistanceCalculatorTest, TheHostsText_FramesTheDistance) {
                                        std::make_shared<GeographicLibGeodesy>());
     EXPECT_EQ(framed.localizedDistance(3.0), "about 3\u00a0m");
     texts->texts.clear();
-    EXPECT_EQ(framed.localizedDistance(3.0), "3\u00a0m");
+    const IcuDistanceCalculator plain({"group", "en", "de-DE", texts}, std::nullopt,
+                                      std::make_shared<GeographicLibGeodesy>());
+    EXPECT_EQ(plain.localizedDistance(3.0), "3\u00a0m");
 }
 
 TEST_F(IcuDistanceCalculatorTest, NoDistance_GivesNone) {
