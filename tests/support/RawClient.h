@@ -1,6 +1,7 @@
 #pragma once
 
 #include <arpa/inet.h>
+#include <gtest/gtest.h>
 #include <netinet/in.h>
 #include <poll.h>
 #include <sys/socket.h>
@@ -23,7 +24,7 @@ class RawClient {
         sockaddr_in address{};
         address.sin_family = AF_INET;
         ::inet_pton(AF_INET, from.c_str(), &address.sin_addr);
-        ::bind(descriptor_, reinterpret_cast<sockaddr*>(&address), sizeof address);
+        EXPECT_EQ(::bind(descriptor_, reinterpret_cast<sockaddr*>(&address), sizeof address), 0) << from;
         address.sin_port = htons(static_cast<std::uint16_t>(port));
         address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
         connected_ = ::connect(descriptor_, reinterpret_cast<sockaddr*>(&address), sizeof address) == 0;

@@ -53,7 +53,7 @@ TEST_F(OwnPagesTest, Rule_IsChanged_AndEnded) {
     ASSERT_TRUE(store_->grant(mara_, lea_, {Precision::Exact, now_ - 100, std::nullopt}));
     EXPECT_EQ(post(address(), "exactness=1km&until=time&time=23%3A30").status, 303);
     EXPECT_EQ(leasGrant()->precision, Precision::Kilometre);
-    EXPECT_EQ(leasGrant()->until, now_ + 70 * 60);
+    EXPECT_EQ(leasGrant()->until, now_ + 70L * 60);
     EXPECT_EQ(post(address(), "exactness=1km&until=changed").status, 303);
     EXPECT_EQ(leasGrant()->until, std::nullopt);
     EXPECT_EQ(get(address("/stop")).status, 200);
@@ -126,7 +126,7 @@ TEST_F(OwnPagesTest, KeepSharing_IsAskedAfter90Days_AndAnswersForAnother90) {
 
 TEST_F(OwnPagesTest, EndThatWasNotTouched_StaysOnItsDay) {
     signIn();
-    const std::int64_t end = now_ + 5 * 86400;
+    const std::int64_t end = now_ + 5L * 86400;
     ASSERT_TRUE(store_->grant(mara_, lea_, {Precision::Exact, now_, end}));
     EXPECT_EQ(post(address(), "exactness=town&until=time&time=22%3A20").status, 303);
     EXPECT_EQ(leasGrant()->until, end);

@@ -32,9 +32,9 @@ class PageFixture : public ::testing::Test {
                                        }});
     }
 
-    server::HttpResponse send(server::HttpRequest request) {
+    server::HttpResponse send(const server::HttpRequest& request) {
         std::promise<std::optional<server::HttpResponse>> answered;
-        page_->answer(request, server::HttpReply([&](std::optional<server::HttpResponse> response) {
+        page_->answer(request, server::HttpReply([&](const std::optional<server::HttpResponse>& response) {
                           answered.set_value(response);
                       }));
         return answered.get_future().get().value_or(server::HttpResponse{0, {}, "", {}});

@@ -228,8 +228,9 @@ TEST_F(PeoplesPageTest, ManyAtOnce_AreAnsweredOrRefused_NeverLost) {
     for (int i = 0; i < 500; ++i) {
         auto promise = std::make_shared<std::promise<std::optional<HttpResponse>>>();
         answers.push_back(promise->get_future());
-        page_->answer(request("GET", "/me"),
-                      HttpReply([promise](std::optional<HttpResponse> response) { promise->set_value(response); }));
+        page_->answer(request("GET", "/me"), HttpReply([promise](const std::optional<HttpResponse>& response) {
+                          promise->set_value(response);
+                      }));
     }
     for (auto& answer : answers) {
         const auto response = answer.get();

@@ -57,7 +57,7 @@ TEST(PlaceWordsTest, EveryLanguage_HasWordsOfItsOwn) {
         for (const std::string& text : {words.near("Exeter", 40000.0), words.coordinates(1.0, 2.0),
                                         words.coordinates(-1.0, -2.0), words.street("Quay Road", "Brinmouth")}) {
             EXPECT_EQ(text.find('%'), std::string::npos) << language << ": " << text;
-            EXPECT_EQ(text.find("_"), std::string::npos) << language << ": " << text;
+            EXPECT_EQ(text.find('_'), std::string::npos) << language << ": " << text;
         }
         EXPECT_NE(words.near("Exeter", 40000.0).find("Exeter"), std::string::npos) << language;
         EXPECT_NE(words.coordinates(1.0, 2.0), words.coordinates(-1.0, 2.0)) << language;

@@ -117,8 +117,8 @@ TEST_P(StoreFences, OnceIsOnce) {
     ASSERT_EQ(set(wish(false, true)), FenceOutcome::Set);
     EXPECT_EQ(store_->fencesBy(otto_)->size(), 1U);
     for (int i = 1; i < 5; ++i) {
-        ASSERT_TRUE(isAt(kNow + i * 100, i % 2 == 1 ? 900.0 : 0.0));
-        ASSERT_TRUE(isAt(kNow + i * 100 + 50, i % 2 == 1 ? 900.0 : 0.0));
+        ASSERT_TRUE(isAt(kNow + i * 100L, i % 2 == 1 ? 900.0 : 0.0));
+        ASSERT_TRUE(isAt(kNow + i * 100L + 50, i % 2 == 1 ? 900.0 : 0.0));
     }
     EXPECT_EQ(toldInShort(kNow + 500), "-100 ");
     EXPECT_TRUE(store_->fencesBy(otto_)->empty());
@@ -141,7 +141,7 @@ TEST_P(StoreFences, Refusals_AreAlikeForWhoeverDoesNotLetTell) {
     EXPECT_EQ(asked(otto_, ann_), FenceOutcome::Refused) << "hidden";
     ASSERT_TRUE(store_->setHidden(ann_, false, kNow));
     EXPECT_EQ(asked(otto_, ann_), FenceOutcome::Set);
-    store_->present(kNow + 100 * 86400);
+    store_->present(kNow + 100L * 86400);
     EXPECT_EQ(asked(otto_, ann_), FenceOutcome::Refused) << "over";
 }
 
@@ -278,13 +278,13 @@ TEST_P(StoreFences, LatePosts_TellWhenItWas_OrNothingAfterSixHours) {
     ASSERT_TRUE(isAt(kNow, 0.0));
     ASSERT_EQ(set(wish(false)), FenceOutcome::Set);
     ASSERT_EQ(set(wish(true)), FenceOutcome::Set);
-    const std::int64_t heard = kNow + 7 * 3600;
+    const std::int64_t heard = kNow + 7L * 3600;
     const auto fix = [&](std::int64_t time, double metres) {
         return Fix{time, heard, 50.2 + metres / kDegree, -3.1, 10.0};
     };
     const auto before = store_->droppedEvents();
     store_->present(heard);
-    ASSERT_TRUE(keep({fix(kNow + 100, 900.0), fix(kNow + 200, 900.0), fix(kNow + 6 * 3600, 0.0)}, heard));
+    ASSERT_TRUE(keep({fix(kNow + 100, 900.0), fix(kNow + 200, 900.0), fix(kNow + 6L * 3600, 0.0)}, heard));
     EXPECT_EQ(toldInShort(heard), "+21600 ");
     EXPECT_EQ(store_->droppedEvents(), before + 1);
 }

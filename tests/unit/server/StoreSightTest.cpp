@@ -45,7 +45,7 @@ class StoreSight : public StoreContract {
         }
     }
 
-    static constexpr std::int64_t kToday = kNow + 2 * 86400;
+    static constexpr std::int64_t kToday = kNow + 2L * 86400;
     double longitude_ = -3.0;
 };
 INSTANTIATE_TEST_SUITE_P(Sqlite, StoreSight, ::testing::Values(false));

@@ -224,7 +224,7 @@ TEST_P(VisibilityPropertyTest, MovesWithinACell_AreNotSeenBelowExactPrecision) {
         Sharing other = sharing;
         // Older ones may become too old on either side of a slot's edge: they keep their times.
         const std::int64_t first =
-            std::max({sharing.grant->from, sharing.shownSince, kNow + 3 * 3600 - sharing.retention});
+            std::max({sharing.grant->from, sharing.shownSince, kNow + 3L * 3600 - sharing.retention});
         for (Fix& one : other.fixes) {
             Fix moved = one;
             moved.latitude += real(-0.02, 0.02);
@@ -290,10 +290,10 @@ TEST_P(VisibilityPropertyTest, WhatIsKnownOfWhereSomebodyRested_ChangesNothing) 
         // A person on the way, at rest, unheard, and heard late, whom several look at again and again.
         std::vector<Sharing> viewers(4);
         for (Sharing& sharing : viewers) {
-            sharing.retention = between(0, 2) == 0 ? 2 * 3600 : 2 * kDay;
+            sharing.retention = between(0, 2) == 0 ? 2L * 3600 : 2 * kDay;
             sharing.shownSince = viewers.front().shownSince;
             sharing.grant = Grant{between(0, 1) == 0 ? Precision::Town : Precision::Kilometre,
-                                  kNow - between(-7200, 6 * 3600), std::nullopt};
+                                  kNow - between(-7200, 6L * 3600), std::nullopt};
         }
         std::vector<Fix> fixes;
         std::map<Precision, LastRest> known;

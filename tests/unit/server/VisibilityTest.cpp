@@ -137,10 +137,10 @@ TEST_F(VisibilityTest, Town_DoesNotFollowToAndFroOverAnEdge) {
     Sharing sharing = shared(Precision::Town);
     const std::int64_t slot = kNow - kNow % 900;
     for (int i = 40; i > 0; --i) {
-        sharing.fixes.push_back(fix(slot - i * 900 + 10, i % 2 == 0 ? 50.2 : 51.2, -3.1));
+        sharing.fixes.push_back(fix(slot - i * 900L + 10, i % 2 == 0 ? 50.2 : 51.2, -3.1));
     }
     std::set<double> latitudes;
-    for (std::int64_t now = slot - 30 * 900; now <= slot; now += 450) {
+    for (std::int64_t now = slot - 30L * 900; now <= slot; now += 450) {
         latitudes.insert(Visibility::visible(sharing, now)->latitude);
     }
     EXPECT_EQ(latitudes.size(), 1U);

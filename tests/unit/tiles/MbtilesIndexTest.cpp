@@ -19,7 +19,7 @@ namespace {
 class MbtilesIndexTest : public ::testing::Test {
   protected:
     std::string make(const std::string& name, const std::string& statements) {
-        const std::string path = (folder.path() / name).string();
+        std::string path = (folder.path() / name).string();
         sqlite3* database = nullptr;
         EXPECT_EQ(sqlite3_open(path.c_str(), &database), SQLITE_OK);
         EXPECT_EQ(sqlite3_exec(database, statements.c_str(), nullptr, nullptr, nullptr), SQLITE_OK);
