@@ -185,7 +185,10 @@ std::string ConfigurationFile::change(const std::vector<Change>& changes) const 
     text += "\n";
     const auto tried = ConfigurationReader::readText(text, file_);
     if (const auto* error = std::get_if<ConfigurationReader::Error>(&tried)) {
-        return error->text;
+        // What was wrong before has a place in the file; what would be written has none.
+        const auto standing = ConfigurationReader::readFile(file_);
+        const auto* before = std::get_if<ConfigurationReader::Error>(&standing);
+        return before != nullptr && before->ofMember == error->ofMember ? before->text : error->ofMember;
     }
     // What a link leads to is changed; the link stays.
     std::error_code isNone;

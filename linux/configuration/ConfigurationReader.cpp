@@ -234,16 +234,22 @@ void readAll(FieldReader& members, const std::filesystem::path& file, Configurat
 
 using Read = std::variant<Configuration, ConfigurationReader::Error>;
 
+ConfigurationReader::Error errorOf(const documents::DocumentError& error) {
+    constexpr std::string_view kRoot = "$.";
+    const std::string member = error.path.starts_with(kRoot) ? error.path.substr(kRoot.size()) : "";
+    return {error.text(), (member.empty() ? "" : member + ": ") + error.message};
+}
+
 Read readOrError(const std::variant<std::string, documents::DocumentError>& text, const std::filesystem::path& file,
                  documents::DocumentWarnings* warnings) {
     if (const auto* error = std::get_if<documents::DocumentError>(&text)) {
-        return error->isMissing ? Read(Configuration{}) : Read(ConfigurationReader::Error{error->text()});
+        return error->isMissing ? Read(Configuration{}) : Read(errorOf(*error));
     }
     Configuration configuration;
     const auto error = documents::DocumentReader::readText(
         std::get<std::string>(text), file.string(),
         [&](FieldReader& members) { readAll(members, file, configuration); }, warnings);
-    return error ? Read(ConfigurationReader::Error{error->text()}) : Read(std::move(configuration));
+    return error ? Read(errorOf(*error)) : Read(std::move(configuration));
 }
 
 }  // namespace

@@ -16,6 +16,9 @@ class ConfigurationReader {
     /// `/home/ann/.config/ktr/config.json:3:17: $.account.personId: expected a string, found a number`.
     struct Error {
         std::string text;
+        /// The same of a text that stands in no file: without file, line and column, the member by its name.
+        /// `account.personId: expected a string, found a number`.
+        std::string ofMember;
     };
 
     /// A file that does not exist reads as an empty one: no account is signed in and everything has its default. One

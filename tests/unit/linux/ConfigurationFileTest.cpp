@@ -109,6 +109,15 @@ TEST_F(ConfigurationFileTest, UnknownMember_IsNamedWithTheNearest) {
     EXPECT_FALSE(std::filesystem::exists(path));
 }
 
+TEST_F(ConfigurationFileTest, BadValue_IsSaidOfItsMember_AndWhatWasWrongBeforeOfItsLine) {
+    EXPECT_EQ(file.set("positions.port", "70000").rfind("positions.port: ", 0), 0U)
+        << file.set("positions.port", "70000") << ": no line of a text that nobody wrote";
+    ASSERT_EQ(file.set("language", "de"), "");
+    EXPECT_EQ(file.set("textSize", "Huge").rfind("textSize: ", 0), 0U) << file.set("textSize", "Huge");
+    write("{\n \"language\": \"de\",\n \"colors\": \"pink\"}");
+    EXPECT_EQ(file.set("language", "fr").rfind(path.string() + ":3:", 0), 0U) << file.set("language", "fr");
+}
+
 TEST_F(ConfigurationFileTest, MissingFile_HasNothingAndIsMadeForItsOwner) {
     EXPECT_TRUE(std::get<0>(file.get("language")).isNull());
     EXPECT_TRUE(std::get<0>(file.list()).empty());
