@@ -76,4 +76,9 @@ CrossingWords CrossingWords::of(const Crossing& crossing, bool isLocked,
     return {crossing.name, platform::formatted(text(crossing.arrives ? "WATCH_ARRIVAL" : "WATCH_DEPARTURE"), {where})};
 }
 
+std::string CrossingWords::question(const Crossing& crossing,
+                                    const std::function<std::string(const std::string& key)>& text) {
+    return platform::formatted(text("FRIEND_WHERE"), {crossing.name});
+}
+
 }  // namespace ktr::app

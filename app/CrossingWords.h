@@ -32,6 +32,9 @@ struct CrossingWords {
     static CrossingWords of(const Crossing& crossing, bool isLocked,
                             const std::function<std::string(const std::string& key)>& text,
                             const std::function<std::string(std::int64_t time)>& clock);
+    /// What a click on it asks: where the one is whom it is about.
+    static std::string question(const Crossing& crossing,
+                                const std::function<std::string(const std::string& key)>& text);
     bool operator==(const CrossingWords&) const = default;
 };
 

@@ -71,6 +71,12 @@ std::optional<CrossingWatch::Account> readAccount(linux_::ConfiguredAccountStore
                                   configuration.account->domains};
 }
 
+/// In which notifications and the questions behind them are worded, as the window's texts are.
+std::string languageOf(const WatchCommand::Options& options, const linux_::Configuration& configuration) {
+    const std::string said = options.language.empty() ? configuration.language.value_or("") : options.language;
+    return said.empty() ? linux_::LocaleRegion::sessionLanguage() : said;
+}
+
 std::optional<std::string> readKey(const std::string& file, std::string& complaint) {
     documents::FileReader::Terms terms;
     terms.most = kMostOfKey;
@@ -108,10 +114,10 @@ int endingSignals() {
 class Teller {
   public:
     /// `hook`: none: nobody else is told.
-    Teller(const WatchCommand::Options& options, HookQueue* hook)
+    Teller(const WatchCommand::Options& options, std::string language, HookQueue* hook)
         : options_(options),
           hook_(hook),
-          language_(options.language.empty() ? linux_::LocaleRegion::sessionLanguage() : options.language),
+          language_(std::move(language)),
           texts_(language_),
           notifier_(QDBusConnection::sessionBus(), [this](const std::string& tag) { open(tag); }) {
         texts_.addBundle(linux_::QtLocalization::kHostBundle, host::resourceFolder() / "localization", "host");
@@ -129,26 +135,27 @@ class Teller {
             tell("the crossings cannot be written");
             return QCoreApplication::exit(static_cast<int>(host::ExitCode::Failure));
         }
-        const auto text = [this](const std::string& key) {
-            return texts_.text(key, linux_::QtLocalization::kHostBundle);
-        };
         const auto clock = [this](std::int64_t time) {
             return QLocale(QString::fromStdString(language_))
                 .toString(QDateTime::fromSecsSinceEpoch(time).time(), QLocale::ShortFormat)
                 .toStdString();
         };
-        const auto words = CrossingWords::of(crossing, lock_.lockState() == platform::DeviceLock::kLocked, text, clock);
+        const auto words =
+            CrossingWords::of(crossing, lock_.lockState() == platform::DeviceLock::kLocked, textOf(), clock);
         const std::string tag = "ktr-crossing-" + std::to_string(crossing.number);
         if (questions_.size() >= kMostQuestions) {
             questions_.erase(questions_.begin());
         }
-        questions_[tag] = crossing.name;
+        questions_[tag] = CrossingWords::question(crossing, textOf());
         const auto number = kFirstNumber + static_cast<std::uint32_t>(crossing.number % kFirstNumber);
         notifier_.show({tag, words.title, words.body, number},
                        [this, crossing, next](bool isShown) { shown(crossing, next, isShown); });
     }
 
   private:
+    std::function<std::string(const std::string&)> textOf() const {
+        return [this](const std::string& key) { return texts_.text(key, linux_::QtLocalization::kHostBundle); };
+    }
     void shown(const Crossing& crossing, const CrossingWatch::Next& next, bool isShown) {
         if (!isShown && !std::exchange(isNobodyThere_, true)) {
             tell("there is nobody on the desktop who shows notifications");
@@ -171,8 +178,10 @@ class Teller {
     void open(const std::string& tag) {
         QStringList words{QStringLiteral("show")};
         if (const auto question = questions_.find(tag); question != questions_.end()) {
-            words << QStringLiteral("--ask")
-                  << QStringLiteral("Where is %1?").arg(QString::fromStdString(question->second));
+            words << QStringLiteral("--ask") << QString::fromStdString(question->second);
+        }
+        if (!options_.language.empty()) {
+            words << QStringLiteral("--language") << QString::fromStdString(options_.language);
         }
         QProcess::startDetached(QCoreApplication::applicationFilePath(), words);
     }
@@ -184,7 +193,7 @@ class Teller {
     linux_::LogindLock lock_;
     linux_::DesktopNotifier notifier_;
     bool isNobodyThere_ = false;                    ///< it was said
-    std::map<std::string, std::string> questions_;  ///< whom a notification is about, by its tag
+    std::map<std::string, std::string> questions_;  ///< what a click on a notification asks, by its tag
 };
 
 }  // namespace
@@ -227,7 +236,7 @@ host::ExitCode WatchCommand::run(const Options& options, int argc, char** argv) 
             [&hook](const Crossing& crossing, std::function<void()> done) { hook->post(crossing, std::move(done)); },
             [](const std::string& line) { tell(line); }, [] { return QDateTime::currentSecsSinceEpoch(); }});
     }
-    Teller teller(options, queue.get());
+    Teller teller(options, languageOf(options, accounts.configuration()), queue.get());
     CrossingWatch watch(
         {*account, folder / "watch",
          [&](const Crossing& crossing, const CrossingWatch::Next& next) { teller.tellOf(crossing, next); },

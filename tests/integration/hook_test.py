@@ -150,10 +150,9 @@ class WatchCase(unittest.TestCase):
         self.is_at(500)
         self.is_at(0)
 
-    def start(self, *options):
+    def start(self, *options, language=("--language", "en")):
         with open(self.folder / "watched", "ab") as out:
-            self.watch = subprocess.Popen([PROGRAM, "watch", "--language", "en", *options], env=self.environment, stdout=out,
-                                          stderr=out)
+            self.watch = subprocess.Popen([PROGRAM, "watch", *language, *options], env=self.environment, stdout=out, stderr=out)
 
     def kill(self):
         if self.watch is not None:
@@ -353,6 +352,34 @@ class NotificationTest(WatchCase):
         self.assertTrue(eventually(lambda: len(self.notifications()) == 2), self.said())
         self.assertEqual([one[1:] for one in self.notifications()], [("Somebody arrived", ""), ("Ann", "Arrived: Office")])
         self.assertNotIn("Ann", self.shown.read_text().split("Somebody arrived")[0])
+
+    def windows(self):
+        """The arguments of each window on this test's configuration, by its process."""
+        found = {}
+        own = f"KTR_CONFIG={self.folder / 'config.json'}".encode()
+        for place in pathlib.Path("/proc").glob("[0-9]*"):
+            with contextlib.suppress(OSError):
+                words = (place / "cmdline").read_bytes().decode().split("\0")[:-1]
+                if own in (place / "environ").read_bytes().split(b"\0") and "show" in words:
+                    found[int(place.name)] = words[words.index("show"):]
+        return found
+
+    def end_windows(self):
+        for process in self.windows():
+            os.kill(process, signal.SIGKILL)
+
+    def test_click_asks_in_the_language_of_the_configuration(self):
+        self.addCleanup(self.end_windows)
+        self.configure(language="de")
+        self.start(language=())
+        self.arrive()
+        self.assertTrue(eventually(lambda: len(self.notifications()) == 1), self.said())
+        number, _, body = self.notifications()[0]
+        self.assertEqual(body, "Angekommen: Office")
+        self.tell("session", NOTIFICATIONS, PATH, "EmitSignal", NOTIFICATIONS, "ActionInvoked", "us",
+                  f"[<uint32 {number}>, <'default'>]")
+        self.assertTrue(eventually(lambda: self.windows(), 20), self.said())
+        self.assertEqual(list(self.windows().values()), [["show", "--ask", "Wo ist Ann?"]])
 
 
 if __name__ == "__main__":

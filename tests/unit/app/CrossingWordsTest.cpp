@@ -47,6 +47,11 @@ TEST(CrossingWordsTest, Notification_SaysWhoAndWhere_ButNothingWhileTheScreenIsL
     EXPECT_EQ(words(crossing, true), (CrossingWords{"WATCH_SOMEBODY_ARRIVED", ""}));
 }
 
+TEST(CrossingWordsTest, Click_AsksInTheLanguageOfTheTexts) {
+    const auto german = [](const std::string& key) { return std::string(key == "FRIEND_WHERE" ? "Wo ist %@?" : key); };
+    EXPECT_EQ(CrossingWords::question(*Crossing::read(kEvent), german), "Wo ist Ann?");
+}
+
 TEST(CrossingHookTest, Signature_IsTheHashOfTimeAndBody) {
     // printf '1763760000.{"a":1}' | openssl dgst -sha256 -hmac 0123456789abcdef
     EXPECT_EQ(CrossingHook::signature("0123456789abcdef", 1763760000, R"({"a":1})"),
