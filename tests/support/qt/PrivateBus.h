@@ -30,16 +30,18 @@ class PrivateBus {
         }
         EXPECT_FALSE(address_.isEmpty()) << "dbus-daemon does not start";
     }
-    ~PrivateBus() {
-        daemon_.kill();
-        daemon_.waitForFinished();
-    }
+    ~PrivateBus() { die(); }
     PrivateBus(const PrivateBus&) = delete;
     PrivateBus& operator=(const PrivateBus&) = delete;
 
     /// A connection of its own; names are used once.
     QDBusConnection connect(const QString& name) const { return QDBusConnection::connectToBus(address_, name); }
     const QString& address() const { return address_; }
+    /// Leaves everybody who is connected without a word.
+    void die() {
+        daemon_.kill();
+        daemon_.waitForFinished();
+    }
     static void disconnect(const QString& name) { QDBusConnection::disconnectFromBus(name); }
 
   private:

@@ -162,6 +162,50 @@ TEST_F(AddressBooksTest, ServiceThatDies_LeavesItsCards_AndIsReadWhenItIsBack) {
     EXPECT_TRUE(comesTo("local{Anna}"));
 }
 
+TEST_F(AddressBooksTest, BusThatDiesInTheMiddle_LeavesTheCardsAndNobodyWaiting) {
+    FakeAddressBooks service(bus);
+    service.set(QStringLiteral("local"), {"Ann"});
+    open(400);
+    ASSERT_TRUE(comesTo("local{Ann}"));
+    ASSERT_TRUE(eventually([&] { return isComplete; }));
+    isComplete = false;
+    const int before = service.readings();
+    service.setManner(Manner::Silent, QStringLiteral("GetContactList"));
+    service.set(QStringLiteral("local"), {"Anna"});
+    ASSERT_TRUE(eventually([&] { return service.readings() > before; }));
+    bus.die();
+    EXPECT_TRUE(eventually([&] { return isComplete; })) << "what was asked is never answered";
+    EXPECT_EQ(cards(), "local{Ann}");
+}
+
+TEST_F(AddressBooksTest, BusThatDiesBeforeAnythingWasRead_IsToldAsNoBooks) {
+    FakeAddressBooks service(bus);
+    service.set(QStringLiteral("local"), {"Ann"});
+    service.setManner(Manner::Silent, QStringLiteral("GetManagedObjects"));
+    open(400);
+    wakesIn(100);
+    ASSERT_FALSE(isComplete);
+    bus.die();
+    EXPECT_TRUE(eventually([&] { return isComplete; })) << "the program's start waits for this";
+    EXPECT_TRUE(told.empty());
+}
+
+TEST_F(AddressBooksTest, HundredThousandCards_AreReadWhole) {
+    FakeAddressBooks service(bus);
+    std::vector<std::string> all;
+    std::size_t bytes = 0;
+    for (int i = 0; i < 100000; ++i) {
+        all.push_back("BEGIN:VCARD\r\nFN:Person " + std::to_string(i) + "\r\nEND:VCARD");
+        bytes += all.back().size() + 2;
+    }
+    service.set(QStringLiteral("local"), all);
+    open(20000);
+    ASSERT_TRUE(eventually([&] { return isComplete; }));
+    ASSERT_EQ(told.size(), 1U);
+    EXPECT_EQ(told.front().cards.size(), bytes);
+    EXPECT_NE(told.front().cards.find("FN:Person 99999\r\n"), std::string::npos);
+}
+
 class BookPhotosTest : public ::testing::Test {
   protected:
     std::string with(const std::string& photo) const {

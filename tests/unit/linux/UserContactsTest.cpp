@@ -3,6 +3,7 @@
 #include <QElapsedTimer>
 #include <QEventLoop>
 #include <QTimer>
+#include <algorithm>
 #include <filesystem>
 
 #include "linux/device/QtMainLoop.h"
@@ -131,6 +132,16 @@ TEST_F(UserContactsTest, AddressBooks_StandBesideTheFiles) {
 }
 
 // The start waits for its second and no longer; what comes later is told.
+TEST_F(UserContactsTest, AddressBookWithCardsThatAreNone_GivesTheOthers) {
+    FakeAddressBooks service(bus);
+    service.set(kLocal, {card("Ann"), "garbage", "BEGIN:VCARD\r\nFN:half", std::string(1, '\x01'), "", card("Bo")});
+    follow({});
+    EXPECT_TRUE(runUntil([&] {
+        return std::find(names.begin(), names.end(), "Ann") != names.end() &&
+               std::find(names.begin(), names.end(), "Bo") != names.end();
+    })) << names.size();
+}
+
 TEST_F(UserContactsTest, AddressBookThatTakesItsTime_IsNotWaitedFor) {
     FakeAddressBooks service(bus);
     service.set(kLocal, {card("Bea")});
