@@ -48,7 +48,6 @@ ConversationWidget::ConversationWidget(host::Host& host, QWidget* parent)
       client_(std::make_shared<Client>(*this)),
       touches_(std::make_shared<platform::TouchDispatcher>(host.window())),
       rows_(host.window(), host.conversation(), host.rightToLeft()),
-      palette_(&Palette::of(ColorScheme::Light)),
       voice_(std::make_unique<Voice>(host, *this)),
       bar_(new QScrollBar(Qt::Vertical, this)),
       rings_(
@@ -91,6 +90,8 @@ ConversationWidget::ConversationWidget(host::Host& host, QWidget* parent)
 ConversationWidget::~ConversationWidget() {
     accessible_.reset();
     host_.delegate().resize = nullptr;
+    // The conversation stays.
+    host_.conversation()->setPalette(Palette::of(palette_.scheme, palette_.contrast));
 }
 
 AccessibleConversation& ConversationWidget::accessible() {
@@ -117,10 +118,12 @@ void ConversationWidget::choosePalette() {
     const bool systemIsDark = desktopDark_.value_or(QApplication::palette().color(QPalette::Window).lightness() < 128);
     const host::HostSettings& settings = host_.settings();
     const bool highContrast = settings.drawsHighContrast();
-    palette_ = &Palette::of(settings.dark.value_or(systemIsDark) ? ColorScheme::Dark : ColorScheme::Light,
-                            highContrast ? Contrast::High : Contrast::Normal);
-    host_.conversation()->setPalette(*palette_);
-    bar_->setStyleSheet(scrollBarStyle(*palette_));
+    const Palette& plain = Palette::of(settings.dark.value_or(systemIsDark) ? ColorScheme::Dark : ColorScheme::Light,
+                                       highContrast ? Contrast::High : Contrast::Normal);
+    // Always in the same place: whoever was shown the colours keeps looking there.
+    palette_ = accent_ ? plain.withAccent(*accent_) : plain;
+    host_.conversation()->setPalette(palette_);
+    bar_->setStyleSheet(scrollBarStyle(palette_));
     update();
     if (paletteChanged_) {
         paletteChanged_();
@@ -325,6 +328,12 @@ void ConversationWidget::setDesktopDark(std::optional<bool> dark) {
     }
 }
 
+void ConversationWidget::setAccent(const std::optional<QColor>& accent) {
+    if (std::exchange(accent_, accent) != accent) {
+        choosePalette();
+    }
+}
+
 void ConversationWidget::setHighContrast(bool high) {
     if (high != host_.settings().desktopHighContrast) {
         host_.setDesktopHighContrast(high);
@@ -371,9 +380,9 @@ void ConversationWidget::paintEvent(QPaintEvent* event) {
     QPainter painter(this);
     painter.setRenderHints(QPainter::Antialiasing | QPainter::TextAntialiasing | QPainter::SmoothPixmapTransform);
     painter.setClipRegion(event->region());
-    painter.fillRect(event->rect(), palette_->window);
+    painter.fillRect(event->rect(), palette_.window);
     painter.translate(0.0, -scrolled());
-    linux_::QtCanvas canvas(painter, *palette_);
+    linux_::QtCanvas canvas(painter, palette_);
     const QRectF dirty = QRectF(event->rect()).translated(0.0, scrolled());
     host_.window()->paint(canvas, {dirty.x(), dirty.y(), dirty.width(), dirty.height()});
 }

@@ -50,7 +50,9 @@ class ConversationWidget : public QWidget {
     void setHighContrast(bool high);
     /// The desktop's colours; none: those of the toolkit.
     void setDesktopDark(std::optional<bool> dark);
-    const linux_::Palette& colors() const { return *palette_; }
+    /// The colour of what can be done; none: the palette's own.
+    void setAccent(const std::optional<QColor>& accent);
+    const linux_::Palette& colors() const { return palette_; }
     /// Called after the colours have become others.
     void setPaletteChanged(std::function<void()> changed) { paletteChanged_ = std::move(changed); }
     const RowFocus& rows() const { return rows_; }
@@ -131,7 +133,8 @@ class ConversationWidget : public QWidget {
     std::shared_ptr<platform::TouchDispatcher> touches_;
     RowFocus rows_;
     std::optional<bool> desktopDark_;
-    const linux_::Palette* palette_;
+    std::optional<QColor> accent_;
+    linux_::Palette palette_ = linux_::Palette::of(linux_::ColorScheme::Light);
     std::function<void()> paletteChanged_;
     std::unique_ptr<Voice> voice_;
     bool reducedMotion_ = false;

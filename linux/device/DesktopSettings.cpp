@@ -1,11 +1,14 @@
 #include "linux/device/DesktopSettings.h"
 
+#include <QDBusArgument>
 #include <QDBusMessage>
 #include <QDBusPendingCallWatcher>
 #include <QDBusPendingReply>
 #include <QProcess>
 #include <QStandardPaths>
 #include <QStringList>
+#include <algorithm>
+#include <array>
 #include <cmath>
 
 #include "linux/device/KdeFonts.h"
@@ -22,6 +25,7 @@ const QString kAppearance = QStringLiteral("org.freedesktop.appearance");
 const QString kScheme = QStringLiteral("color-scheme");
 const QString kContrast = QStringLiteral("contrast");
 const QString kMotion = QStringLiteral("reduced-motion");
+const QString kAccent = QStringLiteral("accent-color");
 const QString kGnome = QStringLiteral("org.gnome.desktop.interface");
 const QString kTextScale = QStringLiteral("text-scaling-factor");
 
@@ -45,6 +49,27 @@ std::optional<bool> wishOf(const QVariant& value) {
     bool isNumber = false;
     const uint wish = value.toUInt(&isNumber);
     return isNumber ? std::optional(wish == 1) : std::nullopt;
+}
+
+/// Red, green and blue from 0 to 1 in sRGB; whatever lies outside is how the portal says that there is none.
+std::optional<QColor> colorOf(const QVariant& value) {
+    if (value.userType() != qMetaTypeId<QDBusArgument>()) {
+        return std::nullopt;
+    }
+    const auto argument = value.value<QDBusArgument>();
+    if (argument.currentSignature() != QLatin1String("(ddd)")) {
+        return std::nullopt;
+    }
+    std::array<double, 3> parts{};
+    argument.beginStructure();
+    for (double& part : parts) {
+        argument >> part;
+    }
+    argument.endStructure();
+    const bool isColor =
+        std::all_of(parts.begin(), parts.end(), [](double part) { return part >= 0.0 && part <= 1.0; });
+    const auto channel = [&parts](std::size_t i) { return static_cast<int>(std::lround(parts[i] * 255.0)); };
+    return isColor ? std::optional(QColor(channel(0), channel(1), channel(2))) : std::nullopt;
 }
 
 }  // namespace
@@ -115,6 +140,7 @@ void DesktopSettings::askAll() {
     ask(kAppearance, kScheme);
     ask(kAppearance, kContrast);
     ask(kAppearance, kMotion);
+    ask(kAppearance, kAccent);
     if (desktop_ == Desktop::Gnome) {
         ask(kGnome, kTextScale);
     }
@@ -158,6 +184,8 @@ void DesktopSettings::take(const QString& group, const QString& key, const QVari
         values.highContrast = wishOf(value);
     } else if (group == kAppearance && key == kMotion) {
         values.reducedMotion = wishOf(value);
+    } else if (group == kAppearance && key == kAccent) {
+        values.accent = colorOf(value);
     } else if (group == kGnome && key == kTextScale && desktop_ == Desktop::Gnome) {
         portalKnowsTextScale_ = true;
         values.textScale = scaleOf(value);

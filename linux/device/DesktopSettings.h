@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QColor>
 #include <QDBusConnection>
 #include <QDBusVariant>
 #include <QObject>
@@ -15,9 +16,9 @@
 
 namespace ktr::linux_ {
 
-/// What the desktop's user has set for all programs: the size of texts, dark or light, high contrast and less motion.
-/// The text size is KDE's, or else that of GNOME and Phosh, and each is asked for only on its own desktop: elsewhere
-/// its answer is a stale one. Colours, contrast and motion are those of the desktop portal
+/// What the desktop's user has set for all programs: the size of texts, dark or light, high contrast, less motion and
+/// an accent colour. The text size is KDE's, or else that of GNOME and Phosh, and each is asked for only on its own
+/// desktop: elsewhere its answer is a stale one. Colours, contrast, motion and accent are those of the desktop portal
 /// (org.freedesktop.portal.Settings). Nothing waits: the bus is joined and files are read in the background, and values
 /// are none until somebody has said them, for good where nobody does. Main thread.
 class DesktopSettings : public QObject {
@@ -29,6 +30,7 @@ class DesktopSettings : public QObject {
         std::optional<bool> dark;         ///< none: no preference
         std::optional<bool> highContrast;
         std::optional<bool> reducedMotion;
+        std::optional<QColor> accent = {};  ///< as the user chose it, whatever stands out from what
         bool operator==(const Values&) const = default;
     };
     /// Where everything is found; a test has its own.

@@ -1,6 +1,7 @@
 #include "linux/paint/Palette.h"
 
 #include <algorithm>
+#include <cmath>
 
 namespace ktr::linux_ {
 
@@ -96,6 +97,23 @@ Palette highContrast(ColorScheme scheme) {
     return p;
 }
 
+/// WCAG 2.1, "relative luminance".
+double luminance(const QColor& color) {
+    const auto linear = [](double v) { return v <= 0.04045 ? v / 12.92 : std::pow((v + 0.055) / 1.055, 2.4); };
+    return 0.2126 * linear(color.redF()) + 0.7152 * linear(color.greenF()) + 0.0722 * linear(color.blueF());
+}
+
+/// WCAG 2.1, "contrast ratio".
+double contrastOf(const QColor& one, const QColor& other) {
+    const auto [low, high] = std::minmax(luminance(one), luminance(other));
+    return (high + 0.05) / (low + 0.05);
+}
+
+QColor mixed(const QColor& from, const QColor& to, double share) {
+    const auto part = [share](int a, int b) { return static_cast<int>(std::lround(a + (b - a) * share)); };
+    return {part(from.red(), to.red()), part(from.green(), to.green()), part(from.blue(), to.blue())};
+}
+
 float channel(double value) {
     return static_cast<float>(std::clamp(value, 0.0, 1.0));
 }
@@ -111,6 +129,28 @@ const Palette& Palette::of(ColorScheme scheme, Contrast contrast) {
         return scheme == ColorScheme::Dark ? kHighDark : kHighLight;
     }
     return scheme == ColorScheme::Dark ? kDark : kLight;
+}
+
+Palette Palette::withAccent(const QColor& accent) const {
+    Palette made = *this;
+    if (contrast == linux_::Contrast::High) {
+        return made;
+    }
+    constexpr double kReads = 4.5;
+    constexpr int kSteps = 64;
+    const QColor end = scheme == ColorScheme::Dark ? QColor(Qt::white) : QColor(Qt::black);
+    const auto reads = [this](const QColor& color) {
+        const auto on = {window, card, highlight, mapLand, onPine};
+        return std::all_of(on.begin(), on.end(), [&](const QColor& one) { return contrastOf(color, one) >= kReads; });
+    };
+    // Towards the end of the grey scale that is not the grounds': the hue stays, and the end itself reads.
+    for (int step = 0; step <= kSteps; ++step) {
+        made.pine = mixed(accent, end, static_cast<double>(step) / kSteps);
+        if (reads(made.pine)) {
+            break;
+        }
+    }
+    return made;
 }
 
 QColor Palette::resolve(const platform::Color& color) const {

@@ -20,6 +20,10 @@ class Palette {
 
     static const Palette& of(ColorScheme scheme, Contrast contrast = Contrast::Normal);
 
+    /// The same with the user's own colour in the place of `pine`: as near to it as still reads on every ground and
+    /// under `onPine` (WCAG 2.1, 1.4.3: 4.5 to 1). High contrast keeps its own, and so do the colours of maps.
+    Palette withAccent(const QColor& accent) const;
+
     /// What a colour of the plugin looks like here: roles are looked up, fixed colours stand as they are.
     QColor resolve(const platform::Color& color) const;
 

@@ -47,7 +47,10 @@ QtTextImage::Pixels QtTextImage::make(double scale, const Palette& palette) cons
     return made;
 }
 
-bool QtTextImage::drawPixels(QPainter& painter, QPointF topLeft, double scale, const Palette& palette) const {
+bool QtTextImage::drawPixels(QPainter& painter, QPointF topLeft, double scale, const Palette& shown) const {
+    // What a window paints with may change, or go, while pixels are made in the background; what it was made of never
+    // does, and has the same colours of texts.
+    const Palette& palette = Palette::of(shown.scheme, shown.contrast);
     lastPalette_->store(&palette);
     if (pixels_.palette != &palette || std::abs(pixels_.scale - scale) > kSameScale) {
         makeInBackground(scale, palette);

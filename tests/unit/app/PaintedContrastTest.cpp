@@ -1,5 +1,6 @@
 // What is painted, measured: every text is at least 4.5 to 1 against what it stands on.
 #include <QApplication>
+#include <QKeyEvent>
 #include <QMouseEvent>
 #include <algorithm>
 #include <cmath>
@@ -141,6 +142,38 @@ TEST_F(KTRPaintedContrastTest, RowUnderThePointerAndPressedRow) {
             measure("pressed");
             mouse(QEvent::MouseButtonRelease, {-50.0, -50.0});
         }
+    }
+}
+
+TEST_F(KTRPaintedContrastTest, Accent_IsPaintedWhereTheKeyboardIs_InEveryScheme) {
+    for (const bool dark : {false, true}) {
+        open("dinner", dark, false);
+        const auto painted = [this](const QColor& color) {
+            const QImage picture = widget->grab().toImage();
+            int count = 0;
+            for (int y = 0; y < picture.height(); ++y) {
+                for (int x = 0; x < picture.width(); ++x) {
+                    count += picture.pixelColor(x, y) == color ? 1 : 0;
+                }
+            }
+            return count;
+        };
+        const QColor own = widget->colors().pine;
+        widget->setFocus(Qt::TabFocusReason);
+        QKeyEvent tab(QEvent::KeyPress, Qt::Key_Tab, Qt::NoModifier);
+        QApplication::sendEvent(widget.get(), &tab);
+        const int ring = painted(own);
+        ASSERT_GT(ring, 200) << "the ring around a row";
+        widget->setAccent(QColor(0x91, 0x41, 0xAC));
+        const QColor accent = widget->colors().pine;
+        EXPECT_EQ(painted(own), 0);
+        EXPECT_EQ(painted(accent), ring);
+        widget->setHighContrast(true);
+        EXPECT_EQ(painted(accent), 0) << "high contrast has its own";
+        widget->setHighContrast(false);
+        EXPECT_EQ(painted(accent), ring);
+        widget->setAccent(std::nullopt);
+        EXPECT_EQ(painted(own), ring);
     }
 }
 

@@ -4,10 +4,13 @@
 #include <sys/un.h>
 #include <unistd.h>
 
+#include <QDBusArgument>
+#include <QDBusMetaType>
 #include <QDBusVariant>
 #include <chrono>
 #include <fstream>
 #include <functional>
+#include <limits>
 #include <map>
 #include <memory>
 
@@ -17,6 +20,25 @@
 namespace ktr::test {
 
 using linux_::DesktopSettings;
+
+/// As the portal sends a colour.
+struct PortalColor {
+    double red = 0.0, green = 0.0, blue = 0.0;
+};
+
+QDBusArgument& operator<<(QDBusArgument& argument, const PortalColor& color) {
+    argument.beginStructure();
+    argument << color.red << color.green << color.blue;
+    argument.endStructure();
+    return argument;
+}
+
+const QDBusArgument& operator>>(const QDBusArgument& argument, PortalColor& color) {
+    argument.beginStructure();
+    argument >> color.red >> color.green >> color.blue;
+    argument.endStructure();
+    return argument;
+}
 
 class DesktopSettingsTest : public ::testing::Test {
   protected:
@@ -143,7 +165,7 @@ TEST_F(DesktopSettingsTest, ChangeRightBehindTheFirstAnswer_IsHeard) {
     EXPECT_TRUE(eventually([&] {
         return read->values() == DesktopSettings::Values{1.25, std::nullopt, false, false};
     }));
-    EXPECT_EQ(asked.size(), 4U) << "nothing was asked twice";
+    EXPECT_EQ(asked.size(), 5U) << "nothing was asked twice";
 }
 
 TEST_F(DesktopSettingsTest, AnswerThatAChangeOvertook_IsDropped) {
@@ -151,7 +173,7 @@ TEST_F(DesktopSettingsTest, AnswerThatAChangeOvertook_IsDropped) {
     beforeAnswer = [this](const QString& what) { lower(what); };
     startPortal();
     const auto read = start("GNOME");
-    EXPECT_TRUE(eventually([&] { return asked.size() == 4; }));
+    EXPECT_TRUE(eventually([&] { return asked.size() == 5; }));
     pass(100);
     EXPECT_EQ(read->values(), (DesktopSettings::Values{1.25, std::nullopt, false, false}));
 }
@@ -170,10 +192,29 @@ TEST_F(DesktopSettingsTest, ColourScheme_IsReadAndFollowed_AndNoPreferenceIsNone
     EXPECT_FALSE(desktop->values().dark) << "a word is no scheme";
 }
 
+TEST_F(DesktopSettingsTest, Accent_IsReadAndFollowed_AndWhatIsNoColourIsNone) {
+    qDBusRegisterMetaType<PortalColor>();
+    const auto color = [](double red, double green, double blue) {
+        return QVariant::fromValue(PortalColor{red, green, blue});
+    };
+    settings[QStringLiteral("org.freedesktop.appearance accent-color")] = color(0.2, 0.4, 1.0);
+    startPortal();
+    const auto desktop = start("GNOME");
+    EXPECT_TRUE(eventually([&] { return desktop->values().accent == QColor(51, 102, 255); }));
+    const double nan = std::numeric_limits<double>::quiet_NaN();
+    for (const QVariant& none : {color(-1.0, -1.0, -1.0), color(0.5, 0.5, 1.01), color(nan, 0.5, 0.5),
+                                 QVariant(QStringLiteral("#3366ff")), QVariant(0x3366ffu)}) {
+        change("org.freedesktop.appearance", "accent-color", none);
+        EXPECT_TRUE(eventually([&] { return !desktop->values().accent; }));
+        change("org.freedesktop.appearance", "accent-color", color(0.0, 1.0, 0.0));
+        EXPECT_TRUE(eventually([&] { return desktop->values().accent == QColor(0, 255, 0); }));
+    }
+}
+
 TEST_F(DesktopSettingsTest, PortalWithoutTheKeys_LeavesDefaults) {
     startPortal();
     const auto read = start("GNOME");
-    EXPECT_TRUE(eventually([&] { return asked.size() == 4; }));
+    EXPECT_TRUE(eventually([&] { return asked.size() == 5; }));
     pass(100);
     EXPECT_EQ(read->values(), DesktopSettings::Values{});
     EXPECT_EQ(changes, 0);

@@ -45,6 +45,33 @@ TEST(PaletteTest, Text_ReadsOnWhatItStandsOn) {
     }
 }
 
+TEST(PaletteTest, Accent_TakesThePlaceOfPine_AndReadsWhateverItIs) {
+    for (const auto scheme : {ColorScheme::Light, ColorScheme::Dark}) {
+        const Palette& own = Palette::of(scheme);
+        EXPECT_EQ(own.withAccent(own.pine).pine, own.pine) << "what reads stays as it is";
+        for (const QRgb chosen :
+             {0x000000U, 0xFFFFFFU, 0xFFFF00U, 0x0000FFU, 0x3584E4U, 0xEF8F14U, 0xC8372DU, 0x808080U}) {
+            const QColor accent = QColor::fromRgb(chosen);
+            const Palette p = own.withAccent(accent);
+            for (const QColor& ground : {p.window, p.card, p.highlight, p.mapLand, p.onPine}) {
+                EXPECT_GE(contrast(p.pine, ground), 4.5) << chosen;
+            }
+            EXPECT_EQ(p.ink, own.ink);
+            EXPECT_EQ(p.mapUserHalo, own.mapUserHalo) << "where the user is stays what it is";
+            if (accent.saturation() == 255 && p.pine.saturation() > 0) {
+                EXPECT_NEAR(p.pine.hue(), accent.hue(), 3) << chosen;
+            }
+        }
+    }
+}
+
+TEST(PaletteTest, Accent_ChangesNothingInHighContrast) {
+    for (const auto scheme : {ColorScheme::Light, ColorScheme::Dark}) {
+        const Palette& own = Palette::of(scheme, Contrast::High);
+        EXPECT_EQ(own.withAccent(QColor(Qt::magenta)).pine, own.pine);
+    }
+}
+
 TEST(PaletteTest, Roles_AreLookedUp) {
     const Palette& light = Palette::of(ColorScheme::Light);
     const Palette& dark = Palette::of(ColorScheme::Dark);
