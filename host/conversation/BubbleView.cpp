@@ -1,11 +1,13 @@
 #include "host/conversation/BubbleView.h"
 
 #include <QPainter>
+#include <QTextBoundaryFinder>
 #include <algorithm>
 #include <cmath>
 
 #include "host/conversation/Measures.h"
 #include "host/conversation/Shapes.h"
+#include "linux/paint/JapanesePhrases.h"
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/assistant/Localization.h"
 #include "platform/base/Platform.h"
@@ -23,6 +25,29 @@ WrappedSize wrappedSize(const std::string& text, const platform::Font& font, dou
     return {layout->usedSize(), layout->lines().size()};
 }
 
+namespace {
+
+/// Of the phrases of a text that parts its words without blanks, the widest; 0 for any other. Such a text fills lines
+/// that are narrower, too, with its words broken.
+double widestPhrase(const std::string& text, const platform::Font& font) {
+    const QString plain = QString::fromStdString(text);
+    const QString joined = linux_::JapanesePhrases::joined(plain);
+    if (joined == plain) {
+        return 0.0;
+    }
+    constexpr double kUnbounded = 100000.0;
+    double widest = 0.0;
+    QTextBoundaryFinder phrases(QTextBoundaryFinder::Line, joined);
+    for (qsizetype begin = 0, end = phrases.toNextBoundary(); end > begin; end = phrases.toNextBoundary()) {
+        const std::string phrase = joined.mid(begin, end - begin).trimmed().remove(QChar(0x2060)).toStdString();
+        widest = std::max(widest, std::ceil(wrappedSize(phrase, font, kUnbounded).size.width));
+        begin = end;
+    }
+    return widest;
+}
+
+}  // namespace
+
 double balancedWidth(const std::string& text, const platform::Font& font, double mostWidth) {
     const WrappedSize widest = wrappedSize(text, font, mostWidth);
     const double own = std::min(mostWidth, std::ceil(widest.size.width));
@@ -30,6 +55,9 @@ double balancedWidth(const std::string& text, const platform::Font& font, double
         return own;
     }
     double tooNarrow = std::floor(own / static_cast<double>(widest.lines + 1));
+    if (const double phrase = widestPhrase(text, font); phrase <= own) {
+        tooNarrow = std::max(tooNarrow, phrase - 1.0);
+    }
     double enough = own;
     while (enough - tooNarrow > 1.0) {
         const double middle = std::floor((tooNarrow + enough) / 2.0);

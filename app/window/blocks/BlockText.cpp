@@ -72,14 +72,30 @@ std::shared_ptr<const linux_::QtTextLayout> BlockText::layOut(double width, bool
     container.alignment = alignment == BlockAlignment::Centre ? platform::TextAlignment::Center
                           : atTheRight                        ? platform::TextAlignment::Right
                                                               : platform::TextAlignment::Left;
-    const platform::AttributedString words(text_.toStdString(), fontOf(style_));
+    const platform::AttributedString words(text_.toStdString(), fontWithin(width));
     return std::dynamic_pointer_cast<const linux_::QtTextLayout>(
         platform::Platform::installed()->textEngine->layOut(words, container));
 }
 
+platform::Font BlockText::fontWithin(double width) const {
+    platform::Font font = fontOf(style_);
+    if (!keepsWords_) {
+        return font;
+    }
+    double widest = 1.0;
+    for (const QString& word : text_.split(QLatin1Char(' '), Qt::SkipEmptyParts)) {
+        widest = std::max(widest, static_cast<double>(BlockText(word, style_).naturalWidth()));
+    }
+    if (widest > width) {
+        // Whole sizes alone are set as they are.
+        font.size = std::max(std::floor(font.size * width / widest), std::ceil(font.size / 2.0));
+    }
+    return font;
+}
+
 double BlockText::widthWithin(double width) const {
     return isBalanced_ && !isEmpty() && canLayOut()
-               ? host::balancedWidth(text_.toStdString(), fontOf(style_), std::floor(width))
+               ? host::balancedWidth(text_.toStdString(), fontWithin(width), std::floor(width))
                : width;
 }
 

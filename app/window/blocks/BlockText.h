@@ -24,6 +24,10 @@ class BlockText {
     explicit BlockText(QString text, BlockStyle style = BlockStyle::Body, bool isBalanced = false)
         : text_(std::move(text)), style_(style), isBalanced_(isBalanced) {}
 
+    /// Where a word is wider than its line, everything is set smaller, down to half its size, so that nothing is broken
+    /// inside a word.
+    void keepWordsWhole() { keepsWords_ = true; }
+
     static platform::Font fontOf(BlockStyle style);
     /// The same for a line that is typed into.
     static QFont typingFont(BlockStyle style);
@@ -40,10 +44,12 @@ class BlockText {
   private:
     std::shared_ptr<const linux_::QtTextLayout> layOut(double width, bool rightToLeft, BlockAlignment alignment) const;
     double widthWithin(double width) const;
+    platform::Font fontWithin(double width) const;
 
     QString text_;
     BlockStyle style_ = BlockStyle::Body;
     bool isBalanced_ = false;
+    bool keepsWords_ = false;
 };
 
 }  // namespace ktr::app

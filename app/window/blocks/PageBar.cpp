@@ -16,7 +16,9 @@ constexpr int kEnd = 15;
 PageBar::PageBar(QWidget* parent)
     : Block(parent),
       back_(new IconButton(Icon::Back, IconButton::Tone::Pine, this)),
-      name_(new Words(BlockStyle::Headline, Words::Tone::Ink, this)) {}
+      name_(new Words(BlockStyle::Headline, Words::Tone::Ink, this)) {
+    name_->keepWordsWhole();
+}
 
 void PageBar::setTexts(const QString& name, const QString& back) {
     name_->setText(name);

@@ -13,7 +13,11 @@ constexpr int kMarkGap = 8;
 }  // namespace
 
 Words::Words(BlockStyle style, Tone tone, QWidget* parent)
-    : Block(parent), style_(style), tone_(tone), isBalanced_(style == BlockStyle::Title) {
+    : Block(parent),
+      style_(style),
+      tone_(tone),
+      isBalanced_(style == BlockStyle::Title),
+      keepsWords_(style == BlockStyle::Title) {
     setFocusPolicy(Qt::NoFocus);
     setAttribute(Qt::WA_TransparentForMouseEvents);
 }
@@ -21,6 +25,9 @@ Words::Words(BlockStyle style, Tone tone, QWidget* parent)
 void Words::setText(const QString& text) {
     if (text != text_.text()) {
         text_ = BlockText(text, style_, isBalanced_);
+        if (keepsWords_) {
+            text_.keepWordsWhole();
+        }
         setAccessibleName(text);
         askForRoom();
     }
@@ -34,6 +41,15 @@ void Words::setAlignment(BlockAlignment alignment) {
 void Words::setBalanced(bool isBalanced) {
     isBalanced_ = isBalanced;
     text_ = BlockText(text_.text(), style_, isBalanced);
+    if (keepsWords_) {
+        text_.keepWordsWhole();
+    }
+    askForRoom();
+}
+
+void Words::keepWordsWhole() {
+    keepsWords_ = true;
+    text_.keepWordsWhole();
     askForRoom();
 }
 

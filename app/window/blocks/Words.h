@@ -16,6 +16,8 @@ class Words : public Block {
     const QString& text() const { return text_.text(); }
     void setAlignment(BlockAlignment alignment);
     void setBalanced(bool isBalanced);
+    /// See BlockText.
+    void keepWordsWhole();
     /// A warning before the first line.
     void setWarning(bool isWarning);
 
@@ -39,6 +41,7 @@ class Words : public Block {
     BlockText text_;
     BlockAlignment alignment_ = BlockAlignment::Start;
     bool isBalanced_ = false;
+    bool keepsWords_ = false;
     bool isWarning_ = false;
 };
 

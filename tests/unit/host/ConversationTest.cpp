@@ -187,6 +187,14 @@ TEST_F(KTRConversationTest, Question_NeverBreaksAWordForBalance) {
     EXPECT_EQ(width, 12.0 * kEm);
 }
 
+TEST_F(KTRConversationTest, JapaneseSentence_IsNoNarrowerThanItsWidestPhrase) {
+    const platform::Font body = platform::preferredFont(platform::TextStyle::Body);
+    // "今、" and a phrase of seven letters: five on each of two lines would be narrower.
+    ASSERT_EQ(wrappedSize("今、見守っています", body, 8.0 * kEm).lines, 2u);
+    EXPECT_EQ(balancedWidth("今、見守っています", body, 8.0 * kEm), 7.0 * kEm);
+    EXPECT_LT(balancedWidth("今、見守っています", body, 6.0 * kEm), 7.0 * kEm) << "it cannot be whole there";
+}
+
 TEST_F(KTRConversationTest, Sentence_RunsAsItsLanguageDoesWhoeverItBeginsWith) {
     const auto said = [this](const std::string& sentence) {
         const auto answer = addTurn("where", sentence)->subviews()[0]->subviews()[2];
