@@ -188,14 +188,22 @@ class OutcomesTest(unittest.TestCase):
         self.addCleanup(login.stop)
         environment["DBUS_SYSTEM_BUS_ADDRESS"] = system.address
         login.lock(True)
-        self.assertEqual(self.asked(environment, "Where is Ann?")[1]["outcome"], "locked")
+        answers, texts, _ = self.assert_alike(environment, {"Where is Ann?": (17, "locked")})
+        self.assertFalse(any("Ann Marsh" in text for text in texts), "nobody is named to whoever passes by")
         login.lock(False)
         self.assertEqual(self.asked(environment, "Where is Ann?")[1]["outcome"], "found")
 
     def test_account_that_the_service_does_not_know(self):
         (self.folder / "token").write_text("x" * 22 + "\n")
-        _, answer = self.asked(self.configure(), "Where is Ann?")
-        self.assertEqual((answer["outcome"], answer["action"]["kind"]), ("notSignedIn", "signIn"))
+        answers, texts, _ = self.assert_alike(self.configure(), {"Where is Ann?": (15, "notSignedIn")})
+        self.assertEqual(answers["Where is Ann?"]["action"]["kind"], "signIn")
+        self.assertIn("Sign in again", texts)
+
+    def test_nobody_is_signed_in(self):
+        answers, texts, _ = self.assert_alike(self.configure(personId=None), {"Where is Ann?": (15, "notSignedIn")})
+        self.assertEqual(answers["Where is Ann?"]["action"]["kind"], "signIn")
+        self.assertIn("Where are your friends?", texts, "the page that signs in")
+        self.assertNotIn("Sign in again", texts, "for nobody was before")
 
     def test_asking_to_share_says_the_same_whoever_is_there(self):
         environment = self.configure()
