@@ -86,7 +86,15 @@ void ConversationWindow::addField() {
     live_ = host::LiveConversation::make(host_);
     field_ = new AskField({host_.text("ASK_FIELD"), host_.text("ASK_SEND")}, this);
     field_->edit().setMenuTexts(menuTexts());
-    field_->setAsked([this](const std::string& question) { live_->ask(question); });
+    field_->setAsked([this](const std::string& question) {
+        if (question.size() <= host::LiveConversation::kLongestQuestion) {
+            live_->ask(question);
+            return;
+        }
+        // A part of it would be another question.
+        field_->edit().setText(QString::fromStdString(question));
+        say(host_.text("QUESTION_TOO_LONG"));
+    });
     field_->setStopped([this] { live_->stop(); });
     field_->edit().installEventFilter(this);
     status_ = new StatusLine(this);
@@ -240,7 +248,8 @@ void ConversationWindow::showStatus() {
                              : now.help == host::LiveStatus::Help::CheckUp ? "CHECK_UP"
                                                                            : nullptr;
     const QString helpBefore = status_->help().words();
-    status_->setHelp(help == nullptr ? QString() : QString::fromStdString(host_.text(help)));
+    status_->setHelp(help == nullptr ? QString() : QString::fromStdString(host_.text(help)),
+                     QString::fromStdString(host_.text("CHECK_UP")));
     if (std::exchange(wantsSignIn_, now.wantsSignIn) != now.wantsSignIn) {
         if (now.wantsSignIn) {
             offerSignIn();
@@ -406,6 +415,7 @@ void ConversationWindow::desktopChanged() {
     chooseMotion();
     conversation_->setDesktopDark(values.dark);
     conversation_->setHighContrast(values.highContrast.value_or(false));
+    conversation_->setAccent(values.accent);
     decideTextSize();
 }
 

@@ -13,6 +13,7 @@
 #include <QPainter>
 #include <QProxyStyle>
 #include <QStyleHints>
+#include <QValidator>
 
 namespace ktr::app {
 
@@ -36,11 +37,35 @@ class QuestionEdit::CaretlessStyle : public QProxyStyle {
     }
 };
 
+/// A question is one line: what is pasted, dropped or dictated may have several.
+class QuestionEdit::OneLine : public QValidator {
+  public:
+    using QValidator::QValidator;
+    State validate(QString& text, int& cursor) const override {
+        const auto isEnd = [](QChar c) {
+            return (c >= QLatin1Char('\n') && c <= QLatin1Char('\r')) || c == QChar(0x85) ||
+                   c == QChar::LineSeparator || c == QChar::ParagraphSeparator;
+        };
+        for (qsizetype i = 0; i < text.size(); ++i) {
+            if (!isEnd(text[i])) {
+                continue;
+            }
+            if (text[i] == QLatin1Char('\r') && i + 1 < text.size() && text[i + 1] == QLatin1Char('\n')) {
+                text.remove(i, 1);
+                cursor -= cursor > i ? 1 : 0;
+            }
+            text[i] = QLatin1Char(' ');
+        }
+        return Acceptable;
+    }
+};
+
 QuestionEdit::QuestionEdit(QWidget* parent) : QLineEdit(parent), style_(std::make_unique<CaretlessStyle>()) {
     setStyle(style_.get());
     setFrame(false);
     alignToStart();
     grabGesture(Qt::TapAndHoldGesture);
+    setValidator(new OneLine(this));
     connect(&blink_, &QTimer::timeout, this, [this] {
         caretShown_ = !caretShown_;
         update(caret());

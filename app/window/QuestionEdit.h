@@ -9,8 +9,8 @@
 
 namespace ktr::app {
 
-/// The line that is typed into: colours of the palette, a placeholder that is never cut, and a caret of its own, 2 wide
-/// in pine. Main thread.
+/// The line that is typed into, whose line ends are blanks wherever they come from: colours of the palette, a
+/// placeholder that is never cut, and a caret of its own, 2 wide in pine. Main thread.
 class QuestionEdit : public QLineEdit {
   public:
     /// From its start edge to its text and its placeholder: room for the caret, which stands before an empty line.
@@ -39,6 +39,7 @@ class QuestionEdit : public QLineEdit {
 
   private:
     class CaretlessStyle;
+    class OneLine;
 
     void showMenu(QPoint at);
     void showCaret();

@@ -48,13 +48,6 @@ QPainterPath hiddenPath() {
     return path;
 }
 
-/// Listeners meet it also while it is hidden, and take one without a name for a fault.
-void nameWithoutWords(Button& button) {
-    if (button.words().isEmpty()) {
-        button.setAccessibleName(QStringLiteral("-"));
-    }
-}
-
 }  // namespace
 
 StatusLine::StatusLine(QWidget* parent)
@@ -64,7 +57,6 @@ StatusLine::StatusLine(QWidget* parent)
       palette_(&linux_::Palette::of(linux_::ColorScheme::Light)) {
     words_->setTextFormat(Qt::PlainText);
     help_->hide();
-    nameWithoutWords(*help_);
     refreshFont();
 }
 
@@ -88,11 +80,13 @@ int StatusLine::helpRoom() const {
     return help_->words().isEmpty() ? 0 : help_->naturalWidth() + kHelpEnd;
 }
 
-void StatusLine::setHelp(const QString& words) {
+void StatusLine::setHelp(const QString& words, const QString& otherwise) {
     if (help_->words() != words) {
         help_->setWords(words);
-        nameWithoutWords(*help_);
         showHelp();
+    }
+    if (const QString& name = words.isEmpty() ? otherwise : words; help_->accessibleName() != name) {
+        help_->setAccessibleName(name);
     }
 }
 

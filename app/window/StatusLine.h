@@ -20,8 +20,9 @@ class StatusLine : public PlainWidget {
     explicit StatusLine(QWidget* parent = nullptr);
 
     void setStatus(const host::LiveStatus& status);
-    /// What mends it stands at its end, a button of the parent's, since it is higher than a line. Empty: nothing.
-    void setHelp(const QString& words);
+    /// What mends it stands at its end, a button of the parent's, since it is higher than a line. Empty: nothing;
+    /// listeners meet the button all the same, and hear that it is called `otherwise`.
+    void setHelp(const QString& words, const QString& otherwise);
     void setHelped(std::function<void()> helped) { help_->setPressed(std::move(helped)); }
     Button& help() const { return *help_; }
     void setColors(const linux_::Palette& palette);

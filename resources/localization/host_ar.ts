@@ -49,6 +49,11 @@
         <translation>إرسال</translation>
     </message>
     <message>
+        <source>QUESTION_TOO_LONG</source>
+        <extracomment>In place of an answer, where what was typed or pasted is too long to be a question</extracomment>
+        <translation>هذا أطول من أن يكون سؤالًا. اسأل سؤالًا أقصر من فضلك.</translation>
+    </message>
+    <message>
         <source>ASK_STOP</source>
         <extracomment>The same button, while an answer is waited for: it gives the question up. English: “Stop asking”</extracomment>
         <translation>أوقف السؤال</translation>
@@ -735,6 +740,21 @@
         <source>SETTINGS_POSITION_LINE</source>
         <extracomment>Under that switch. English: “Distances are counted from it.”</extracomment>
         <translation>منه تُحسب المسافات.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH</source>
+        <extracomment>A switch on the page with settings: notifications of friends who come and go</extracomment>
+        <translation>الإشعارات</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH_LINE</source>
+        <extracomment>Under that switch</extracomment>
+        <translation>حين يغادر الأصدقاء أو يصلون، كما طلبت.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH_NONE</source>
+        <extracomment>Under that switch, in the place of its line, where the computer cannot run anything in the background</extracomment>
+        <translation>لا يمكن تشغيل شيء في الخلفية هنا.</translation>
     </message>
     <message>
         <source>SETTINGS_MAPS</source>

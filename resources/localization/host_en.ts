@@ -49,6 +49,11 @@
         <translation>Send</translation>
     </message>
     <message>
+        <source>QUESTION_TOO_LONG</source>
+        <extracomment>In place of an answer, where what was typed or pasted is too long to be a question</extracomment>
+        <translation>That’s too long for a question. Please ask a shorter one.</translation>
+    </message>
+    <message>
         <source>ASK_STOP</source>
         <extracomment>The same button, while an answer is waited for: it gives the question up.</extracomment>
         <translation>Stop asking</translation>
@@ -735,6 +740,21 @@
         <source>SETTINGS_POSITION_LINE</source>
         <extracomment>Under that switch</extracomment>
         <translation>Distances are counted from it.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH</source>
+        <extracomment>A switch on the page with settings: notifications of friends who come and go</extracomment>
+        <translation>Notifications</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH_LINE</source>
+        <extracomment>Under that switch</extracomment>
+        <translation>When friends leave or arrive, as you asked.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH_NONE</source>
+        <extracomment>Under that switch, in the place of its line, where the computer cannot run anything in the background</extracomment>
+        <translation>Nothing can run in the background here.</translation>
     </message>
     <message>
         <source>SETTINGS_MAPS</source>

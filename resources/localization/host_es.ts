@@ -49,6 +49,11 @@
         <translation>Enviar</translation>
     </message>
     <message>
+        <source>QUESTION_TOO_LONG</source>
+        <extracomment>In place of an answer, where what was typed or pasted is too long to be a question</extracomment>
+        <translation>Es demasiado largo para una pregunta. Haz una más corta.</translation>
+    </message>
+    <message>
         <source>ASK_STOP</source>
         <extracomment>The same button, while an answer is waited for: it gives the question up. English: “Stop asking”</extracomment>
         <translation>Dejar de preguntar</translation>
@@ -735,6 +740,21 @@
         <source>SETTINGS_POSITION_LINE</source>
         <extracomment>Under that switch. English: “Distances are counted from it.”</extracomment>
         <translation>Desde ahí se cuentan las distancias.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH</source>
+        <extracomment>A switch on the page with settings: notifications of friends who come and go</extracomment>
+        <translation>Notificaciones</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH_LINE</source>
+        <extracomment>Under that switch</extracomment>
+        <translation>Cuando tus amigos salen o llegan, como pediste.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH_NONE</source>
+        <extracomment>Under that switch, in the place of its line, where the computer cannot run anything in the background</extracomment>
+        <translation>Aquí nada puede funcionar en segundo plano.</translation>
     </message>
     <message>
         <source>SETTINGS_MAPS</source>

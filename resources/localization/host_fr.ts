@@ -49,6 +49,11 @@
         <translation>Envoyer</translation>
     </message>
     <message>
+        <source>QUESTION_TOO_LONG</source>
+        <extracomment>In place of an answer, where what was typed or pasted is too long to be a question</extracomment>
+        <translation>C’est trop long pour une question. Posez-en une plus courte.</translation>
+    </message>
+    <message>
         <source>ASK_STOP</source>
         <extracomment>The same button, while an answer is waited for: it gives the question up. English: “Stop asking”</extracomment>
         <translation>Arrêter de demander</translation>
@@ -735,6 +740,21 @@
         <source>SETTINGS_POSITION_LINE</source>
         <extracomment>Under that switch. English: “Distances are counted from it.”</extracomment>
         <translation>Les distances partent de là.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH</source>
+        <extracomment>A switch on the page with settings: notifications of friends who come and go</extracomment>
+        <translation>Notifications</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH_LINE</source>
+        <extracomment>Under that switch</extracomment>
+        <translation>Quand des amis partent ou arrivent, comme demandé.</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH_NONE</source>
+        <extracomment>Under that switch, in the place of its line, where the computer cannot run anything in the background</extracomment>
+        <translation>Rien ne peut fonctionner en arrière-plan ici.</translation>
     </message>
     <message>
         <source>SETTINGS_MAPS</source>

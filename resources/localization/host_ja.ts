@@ -49,6 +49,11 @@
         <translation>送信</translation>
     </message>
     <message>
+        <source>QUESTION_TOO_LONG</source>
+        <extracomment>In place of an answer, where what was typed or pasted is too long to be a question</extracomment>
+        <translation>質問としては長すぎます。もっと短く尋ねてください。</translation>
+    </message>
+    <message>
         <source>ASK_STOP</source>
         <extracomment>The same button, while an answer is waited for: it gives the question up. English: “Stop asking”</extracomment>
         <translation>問い合わせを中止</translation>
@@ -735,6 +740,21 @@
         <source>SETTINGS_POSITION_LINE</source>
         <extracomment>Under that switch. English: “Distances are counted from it.”</extracomment>
         <translation>距離はここから測ります。</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH</source>
+        <extracomment>A switch on the page with settings: notifications of friends who come and go</extracomment>
+        <translation>通知</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH_LINE</source>
+        <extracomment>Under that switch</extracomment>
+        <translation>友達が出発・到着したときに、頼んだとおり知らせます。</translation>
+    </message>
+    <message>
+        <source>SETTINGS_WATCH_NONE</source>
+        <extracomment>Under that switch, in the place of its line, where the computer cannot run anything in the background</extracomment>
+        <translation>ここではバックグラウンドで何も動かせません。</translation>
     </message>
     <message>
         <source>SETTINGS_MAPS</source>

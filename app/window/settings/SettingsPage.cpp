@@ -51,6 +51,7 @@ SettingsPage::SettingsPage(host::Host& host, SharingRow::Wish wish, Window windo
       account_(new AccountRow),
       sharing_(new SharingRow(host, std::move(wish))),
       textSize_(new StepRow),
+      watch_(qEnvironmentVariable("DBUS_SESSION_BUS_ADDRESS"), QStringLiteral("ktr-watch.service")),
       desk_(host.settings().liveConfiguration.value_or("")),
       aside_(owner_) {
     setAcceptDrops(true);
@@ -75,6 +76,12 @@ SettingsPage::SettingsPage(host::Host& host, SharingRow::Wish wish, Window windo
     colors_ = addRow(reading, ListRow::Kind::Leads, [this] { chooseColors(); });
     distances_ = addRow(reading, ListRow::Kind::Leads, [this] { chooseDistances(); });
     language_ = addRow(reading, ListRow::Kind::Leads, [this] { chooseLanguage(); });
+
+    notices_ = addRow(reading, ListRow::Kind::Switch, [this] {
+        watch_.setOn(!notices_->isChecked());
+        showNotices();
+    });
+    watch_.setChanged([this] { showNotices(); });
 
     auto* contacts = addSection("SETTINGS_CONTACTS");
     books_ = addRow(contacts, ListRow::Kind::Switch, [this] {
@@ -141,6 +148,8 @@ void SettingsPage::setTexts() {
     colors_->setWords(text("SETTINGS_COLORS"));
     distances_->setWords(text("SETTINGS_DISTANCES"));
     language_->setWords(text("SETTINGS_LANGUAGE"));
+    notices_->setWords(text("SETTINGS_WATCH"));
+    showNotices();
     books_->setWords(text("SETTINGS_BOOKS"));
     books_->setSecond(text("SETTINGS_BOOKS_LINE"));
     position_->setWords(text("SETTINGS_POSITION"));
@@ -191,6 +200,14 @@ void SettingsPage::setValues() {
     held(*language_, said.language.has_value());
     books_->setChecked(shown_.addressBooks);
     position_->setChecked(shown_.positions.source != Configuration::Positions::Source::None);
+}
+
+void SettingsPage::showNotices() {
+    using State = linux_::UserUnit::State;
+    const State state = watch_.state();
+    notices_->setChecked(state == State::On);
+    notices_->setHeld(watch_.isBusy() || (state != State::On && state != State::Off));
+    notices_->setSecond(text(state == State::None ? "SETTINGS_WATCH_NONE" : "SETTINGS_WATCH_LINE"));
 }
 
 void SettingsPage::change(const std::string& name, std::optional<Value> value) {

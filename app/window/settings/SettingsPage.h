@@ -14,6 +14,7 @@
 #include "app/window/settings/AccountRow.h"
 #include "app/window/settings/SettingsDesk.h"
 #include "host/Host.h"
+#include "linux/device/UserUnit.h"
 
 namespace ktr::app {
 
@@ -45,6 +46,8 @@ class SettingsPage : public ColumnPage {
     ListRow& chosenColors() const { return *colors_; }
     ListRow& distances() const { return *distances_; }
     ListRow& language() const { return *language_; }
+    /// Whether the user's services keep what shows notifications.
+    ListRow& notices() const { return *notices_; }
     ListRow& books() const { return *books_; }
     ListRow& position() const { return *position_; }
     ListCard& maps() const { return *maps_; }
@@ -66,6 +69,7 @@ class SettingsPage : public ColumnPage {
     ListRow* addRow(ListCard* card, ListRow::Kind kind, std::function<void()> pressed);
     void setTexts();
     void setValues();
+    void showNotices();
     QString sizeWords() const;
     static std::vector<std::string> languages();
     QString languageWords(const std::string& language) const;
@@ -100,6 +104,7 @@ class SettingsPage : public ColumnPage {
     ListRow* colors_;
     ListRow* distances_;
     ListRow* language_;
+    ListRow* notices_;
     ListRow* books_;
     ListRow* position_;
     ListCard* maps_;
@@ -108,6 +113,7 @@ class SettingsPage : public ColumnPage {
     ListRow* addMap_ = nullptr;
     ListRow* checkUp_;
     bool hasAsked_ = false;
+    linux_::UserUnit watch_;
     QObject owner_;
     SettingsDesk desk_;
     linux_::Aside aside_;

@@ -112,6 +112,31 @@ TEST_F(KTRConversationWindowTest, AFriendsPage_AsksAboutThatFriendAlone) {
     EXPECT_FALSE(page->asksAbout({}));
 }
 
+TEST_F(KTRConversationWindowTest, QuestionThatIsTooLong_IsNotAskedInPart_AndStaysToBeMadeShorter) {
+    open();
+    window->resize(400, 700);
+    window->show();
+    const QString longest(static_cast<int>(host::LiveConversation::kLongestQuestion), u'x');
+    const std::size_t before = host->conversation()->turns().size();
+    window->field()->edit().setText(longest + u'x');
+    window->field()->button().click();
+    EXPECT_EQ(window->notice().sentence(), QStringLiteral("That’s too long for a question. Please ask a shorter one."));
+    EXPECT_EQ(window->field()->edit().text(), longest + u'x');
+    EXPECT_EQ(host->conversation()->turns().size(), before);
+    window->field()->edit().setText(longest);
+    window->field()->button().click();
+    EXPECT_EQ(window->field()->edit().text(), QString()) << "this one is asked";
+}
+
+TEST_F(KTRConversationWindowTest, StatusWithoutHelp_HasAButtonWithARealNameAllTheSame) {
+    open();
+    window->resize(400, 700);
+    window->show();
+    ASSERT_EQ(window->status()->help().words(), QString());
+    EXPECT_FALSE(window->status()->help().isVisible());
+    EXPECT_EQ(window->status()->help().accessibleName(), QStringLiteral("Check-up"));
+}
+
 TEST_F(KTRConversationWindowTest, EveryShape_FieldAndConversationNeverOverlap) {
     using platform::ContentSizeCategory;
     for (const auto size : {ContentSizeCategory::L, ContentSizeCategory::XXXL, ContentSizeCategory::AX3}) {

@@ -19,6 +19,7 @@
 #include "linux/configuration/ConfigurationReader.h"
 #include "tests/support/EnvironmentVariable.h"
 #include "tests/support/TemporaryFolder.h"
+#include "tests/support/qt/PrivateBus.h"
 
 #include <gtest/gtest.h>
 
@@ -247,6 +248,48 @@ TEST_F(SettingsPageTest, CheckUp_TellsWhatIsWrong_EachOnceWithItsButton) {
     first->button().press();
     EXPECT_TRUE(check->isLooking());
     EXPECT_TRUE(eventually([&] { return !check->isLooking(); }));
+}
+
+TEST_F(SettingsPageTest, Notifications_AreTheUsersServices_AndSaySoWhereThereAreNone) {
+    test::PrivateBus bus;
+    const test::EnvironmentVariable session("DBUS_SESSION_BUS_ADDRESS", bus.address().toUtf8().constData());
+    open();
+    const auto isCalled = [this](const char* name) {
+        return eventually([&] { return nameOf(page()->notices()) == QString::fromUtf8(name); });
+    };
+    EXPECT_TRUE(isCalled("Notifications, Nothing can run in the background here."));
+    EXPECT_FALSE(page()->notices().canBePressed());
+
+    const QString manager = QStringLiteral("user-services");
+    QDBusConnection service = bus.connect(manager);
+    QString file = QStringLiteral("disabled");
+    test::FakeService fake([&file](const QDBusMessage& message, const QDBusConnection& connection) {
+        if (message.member() == QLatin1String("EnableUnitFiles")) {
+            file = QStringLiteral("enabled");
+        } else if (message.member() == QLatin1String("DisableUnitFiles")) {
+            file = QStringLiteral("disabled");
+        }
+        return connection.send(message.member() == QLatin1String("GetUnitFileState") ? message.createReply(file)
+                                                                                     : message.createReply());
+    });
+    ASSERT_TRUE(service.registerVirtualObject(QStringLiteral("/org/freedesktop/systemd1"), &fake));
+    ASSERT_TRUE(service.registerService(QStringLiteral("org.freedesktop.systemd1")));
+    window->pages().closeAll();
+    window->settings()->press();
+    EXPECT_TRUE(isCalled("Notifications, When friends leave or arrive, as you asked."));
+    EXPECT_TRUE(eventually([this] { return page()->notices().canBePressed(); }));
+    EXPECT_FALSE(page()->notices().isChecked());
+    page()->notices().press();
+    EXPECT_TRUE(eventually([this] { return page()->notices().isChecked(); }));
+    EXPECT_EQ(file, QStringLiteral("enabled"));
+    ASSERT_TRUE(eventually([this] { return page()->notices().canBePressed(); }));
+    keep("notifications");
+    page()->notices().press();
+    EXPECT_TRUE(eventually([this] { return !page()->notices().isChecked(); }));
+    EXPECT_EQ(file, QStringLiteral("disabled"));
+    window->pages().closeAll();
+    settle();
+    test::PrivateBus::disconnect(manager);
 }
 
 TEST_F(SettingsPageTest, NarrowWindows_RightToLeftAndTheLargestText_CutNothing) {
