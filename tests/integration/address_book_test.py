@@ -3,14 +3,17 @@
 name the assistant does not know, and a service that hangs. Skipped without evolution-data-server."""
 
 import base64
+import contextlib
 import json
 import os
 import pathlib
 import shutil
+import signal
 import struct
 import subprocess
 import sys
 import tempfile
+import threading
 import time
 import unittest
 import zlib
@@ -110,12 +113,36 @@ class AddressBookTest(unittest.TestCase):
         photos = list((self.folder / "xdg_data_home/evolution/addressbook").rglob("photos/*"))
         self.assertTrue(photos, "the service keeps photos in files of its own")
 
-    def test_service_that_hangs_costs_a_second_and_its_faces(self):
-        self.fill([card("Wanda", "Wanted", WANTED, face())])
+    def daemons(self):
+        """The service's processes on this test's bus."""
         daemons = subprocess.run(["pgrep", "-f", "^/usr/libexec/evolution-(source-registry|addressbook-factory)"],
                                  capture_output=True, text=True, check=False).stdout.split()
-        own = [int(pid) for pid in daemons if self.environment["DBUS_SESSION_BUS_ADDRESS"].encode() in
-               pathlib.Path(f"/proc/{pid}/environ").read_bytes()]
+        own = []
+        for pid in daemons:
+            with contextlib.suppress(OSError):
+                if self.environment["DBUS_SESSION_BUS_ADDRESS"].encode() in pathlib.Path(f"/proc/{pid}/environ").read_bytes():
+                    own.append(int(pid))
+        return own
+
+    def test_service_that_dies_while_it_is_read_holds_nothing_up_and_is_read_when_it_is_back(self):
+        wanted = card("Wanda", "Wanted", WANTED, face())
+        (self.folder / "wanda.vcf").write_text(wanted)
+        self.fill([card(f"Given{n}", f"Family{n}", f"person{n}@harbour.example") for n in range(CONTACTS - 1)] + [wanted])
+        for moment in (0.05, 0.2, 0.5):
+            own = self.daemons()
+            self.assertTrue(own)
+            dying = threading.Timer(moment, lambda own=own: [os.kill(pid, signal.SIGKILL) for pid in own])
+            begin = time.monotonic()
+            dying.start()
+            self.show()
+            dying.join()
+            self.assertLess(time.monotonic() - begin, 60)
+            # The bus starts it anew for whoever asks.
+            self.assert_alike(lambda: self.show()[0], lambda: self.show("wanda.vcf", bus=False)[0], "another face")
+
+    def test_service_that_hangs_costs_a_second_and_its_faces(self):
+        self.fill([card("Wanda", "Wanted", WANTED, face())])
+        own = self.daemons()
         self.assertTrue(own)
         for pid in own:
             os.kill(pid, 19)

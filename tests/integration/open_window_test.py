@@ -7,12 +7,14 @@ import json
 import os
 import pathlib
 import re
+import shutil
 import subprocess
 import sys
 import tempfile
 import time
 import unittest
 
+import mock_bus
 from screen_session import SYSTEM_PYTHON, outside, tree
 from serve import Service
 
@@ -149,6 +151,47 @@ class DesktopTextSizeTest(OpenWindow):
 
         write(10)
         self.check(lambda: write(25), lambda: write(10))
+
+
+@unittest.skipUnless(mock_bus.is_possible() and shutil.which("xwd"), "python3-dbusmock or xwd is not installed")
+class AccentTest(OpenWindow):
+    """The ring of the keyboard's focus has the colour that the desktop's user has chosen, while the window is open."""
+
+    NAME, PATH, SETTINGS = "org.freedesktop.portal.Desktop", "/org/freedesktop/portal/desktop", "org.freedesktop.portal.Settings"
+
+    def mock(self, method, *arguments):
+        return subprocess.run(["gdbus", "call", "--session", "-d", self.NAME, "-o", self.PATH, "-m",
+                               f"org.freedesktop.DBus.Mock.{method}", *arguments], capture_output=True, check=False).returncode == 0
+
+    def painted(self, red, green, blue):
+        """How many pixels of the screen have this colour."""
+        screen = subprocess.run(["xwd", "-silent", "-root"], env=self.environment, capture_output=True, check=True).stdout
+        pixels = screen[len(screen) % 4:]
+        wanted = bytes((blue, green, red))
+        return sum(pixels[i:i + 3] == wanted for i in range(0, len(pixels), 4))
+
+    def test_ring_has_the_chosen_colour_and_another_one_once_that_is_chosen(self):
+        portal = subprocess.Popen([SYSTEM_PYTHON, "-m", "dbusmock", "--session", self.NAME, self.PATH, self.SETTINGS],
+                                  stdout=subprocess.DEVNULL)
+        self.addCleanup(portal.wait)
+        self.addCleanup(portal.terminate)
+        # Violet, 5C2480.
+        reply = ("ret = dbus.Struct((92 / 255, 36 / 255, 128 / 255), signature='ddd', variant_level=1) "
+                 "if args[1] == 'accent-color' else dbus.UInt32(0, variant_level=1)")
+        self.wait_for("the portal", lambda: self.mock("AddMethod", self.SETTINGS, "Read", "ss", "v", reply))
+        self.open(SCENARIOS / "dinner.json", "--light")
+        self.wait_for("six rows", lambda: len([node for node in self.tree() if node.getRoleName() == "link"]) == 6)
+        window = subprocess.run(["xdotool", "search", "--onlyvisible", "--name", "^ktr$"], env=self.environment, text=True,
+                                capture_output=True, check=True).stdout.split()[0]
+        subprocess.run(["xdotool", "windowfocus", "--sync", window, "key", "Tab"], env=self.environment, check=True)
+        self.wait_for("a violet ring", lambda: self.painted(0x5C, 0x24, 0x80) > 200)
+        self.assertTrue(self.mock("EmitSignal", self.SETTINGS, "SettingChanged", "ssv",
+                                  "[<'org.freedesktop.appearance'>, <'accent-color'>, <<(0.0, 0.4, 0.0)>>]"))
+        self.wait_for("a green ring", lambda: self.painted(0, 102, 0) > 200)
+        self.assertEqual(self.painted(0x5C, 0x24, 0x80), 0)
+        self.assertTrue(self.mock("EmitSignal", self.SETTINGS, "SettingChanged", "ssv",
+                                  "[<'org.freedesktop.appearance'>, <'accent-color'>, <<(-1.0, -1.0, -1.0)>>]"))
+        self.wait_for("the program's own colour", lambda: self.painted(0x1E, 0x66, 0x53) > 200)
 
 
 class PseudoLanguageTest(OpenWindow):

@@ -1,11 +1,16 @@
 """Runs `ktr-service` for a test."""
+import base64
+import http.client
+import json
 import os
 import pathlib
 import re
 import socket
 import sqlite3
+import ssl
 import subprocess
 import tempfile
+import time
 
 
 def free_port():
@@ -55,6 +60,27 @@ class OwnService:
                                         stdout=subprocess.PIPE, text=True)
         ready = self.process.stdout.readline()
         assert ready.startswith(f"ready https://localhost:{self.port} "), ready
+
+    def post(self, name, password, latitude, longitude):
+        """What somebody's phone sends."""
+        context = ssl.create_default_context(cafile=self.authority)
+        connection = http.client.HTTPSConnection("localhost", self.port, context=context, timeout=20)
+        credentials = base64.b64encode(f"{name}:{password}".encode()).decode()
+        connection.request("POST", "/pub", json.dumps({"_type": "location", "lat": latitude, "lon": longitude, "acc": 12,
+                                                       "tst": int(time.time()) - 60, "tid": "an"}),
+                           {"Authorization": f"Basic {credentials}", "Content-Type": "application/json"})
+        status = connection.getresponse().status
+        connection.close()
+        assert status == 200, status
+
+    def ends_of_shares(self, name):
+        """When each grant of a person's ends, seconds since 1970; none for one that does not."""
+        database = sqlite3.connect(self.folder / "data" / "service.db")
+        try:
+            return [end for end, in database.execute(
+                "SELECT until FROM share WHERE owner = (SELECT id FROM person WHERE name = ?)", (name,))]
+        finally:
+            database.close()
 
     def stop(self):
         if self.process is not None:

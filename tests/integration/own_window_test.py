@@ -117,27 +117,13 @@ class OwnWindowTest(unittest.TestCase):
             self.service.command("friend", name, "Mara")
         self.service.earlier()
         self.service.start()
-        self.post("Ann", ann)
+        self.service.post("Ann", ann, 50.2104, -3.12)
         self.sign_in_by_hand("Mara")
         self.open("open", "wayloc://friends/")
         row = self.find("push button", "Ann")
         self.assertNotIn("Otto", [node.name for node in self.tree()], "nothing was heard of him yet")
         self.press(row)
         self.find("push button", "Copy place")
-
-    def post(self, name, secret):
-        import base64
-        import http.client
-        import ssl
-
-        context = ssl.create_default_context(cafile=self.service.authority)
-        connection = http.client.HTTPSConnection("localhost", self.service.port, context=context, timeout=20)
-        credentials = base64.b64encode(f"{name}:{secret}".encode()).decode()
-        connection.request("POST", "/pub", json.dumps({"_type": "location", "lat": 50.2104, "lon": -3.12, "acc": 12,
-                                                       "tst": int(time.time()) - 60, "tid": "an"}),
-                           {"Authorization": f"Basic {credentials}", "Content-Type": "application/json"})
-        self.assertEqual(connection.getresponse().status, 200)
-        connection.close()
 
     def without_keyring(self):
         """Somebody has the keyring's name and knows nothing of secrets, so that none asks for a password."""

@@ -15,6 +15,7 @@ import accessibility_test
 import live_window_test
 import mock_bus
 from live_window_test import FIRST_ROW, wait_for
+from own_service import OwnService
 
 
 class TasksTest(live_window_test.LiveWindowTest):
@@ -85,6 +86,20 @@ class TasksTest(live_window_test.LiveWindowTest):
         place = self.await_seen(name, *roles).queryComponent().getExtents(pyatspi.DESKTOP_COORDS)
         self.xdotool("mousemove", place.x + place.width // 2, place.y + place.height // 2, "click", 1)
 
+    def scroll_to(self, name, role):
+        """Turns the wheel until this stands in the window."""
+        import pyatspi
+
+        def there():
+            node = self.seen(name, role)
+            place = node.queryComponent().getExtents(pyatspi.WINDOW_COORDS) if node else None
+            if place and place.y >= 0 and place.y + place.height <= 800:
+                return True
+            self.xdotool("mousemove", "--window", self.window, 200, 500, "click", 5)
+            time.sleep(0.2)
+            return False
+        wait_for(f"{name!r} in the window", there)
+
     def open_ann(self):
         """The page that a tap on her row leads to."""
         service = self.serve()
@@ -150,6 +165,53 @@ class TasksTest(live_window_test.LiveWindowTest):
         self.key("Return")
         wait_for("nobody to see", lambda: service.hides())
         self.await_seen("Your location is hidden")
+
+    def test_task_share_until_tonight(self):
+        """With a service of one's own: typed, granted until the day ends, and the card that follows says that one is seen."""
+        own = OwnService(os.environ["KTR_SERVICE"])
+        self.addCleanup(own.__exit__)
+        phone = own.add("Mara")
+        own.add("Ann")
+        own.start()
+        own.post("Mara", phone, 50.2104, -3.12)
+        made = json.loads(own.command("reader", "Mara", "--token-file", str(self.folder / "token")))
+        (self.folder / "ann.vcf").write_text("BEGIN:VCARD\r\nVERSION:3.0\r\nN:Marsh;Ann;;;\r\nFN:Ann Marsh\r\n"
+                                             "EMAIL:ann@x.example\r\nEND:VCARD\r\n")
+        config = self.folder / "config.json"
+        config.write_text(json.dumps({"account": made["account"], "certificates": [own.authority], "contacts": ["ann.vcf"],
+                                      "addressBooks": False, "positions": {"source": "none"}}))
+        config.chmod(0o600)
+        self.environment["KTR_CONFIG"] = str(config)
+        self.open_spoken()
+        self.click_on("Ask about your friends", "text")
+        self.type("share my location with Ann until tonight")
+        self.key("Return")
+        granted = wait_for("a grant", lambda: own.ends_of_shares("Mara"))
+        self.assertEqual(len(granted), 1, granted)
+        until = time.localtime(granted[0])
+        self.assertLessEqual(0, granted[0] - time.time())
+        self.assertLessEqual(granted[0] - time.time(), 86400 + 3600, "tonight")
+        self.assertIn((until.tm_hour, until.tm_min), ((0, 0), (23, 59)), "when the day ends")
+        self.await_seen("Sharing with Ann Marsh until")
+
+    def test_task_add_a_map(self):
+        self.environment["XDG_DATA_HOME"] = str(self.folder / "data")
+        self.serve()
+        town = pathlib.Path(live_window_test.PROGRAM).parent.parent / "share" / "ktr" / "maps" / "brinmouth.mbtiles"
+        self.assertTrue(town.exists(), town)
+        self.open_spoken()
+        self.click_on("Settings", "push button")
+        self.await_seen("Text size")
+        self.scroll_to("Add a region", "push button")
+        self.click_on("Add a region", "push button")
+        dialog = wait_for("a dialog", lambda: self.xdotool("search", "--onlyvisible", "--name", "Add a region", check=False).split())
+        self.xdotool("windowfocus", "--sync", dialog[0])
+        self.type(str(town))
+        self.key("Return")
+        added = wait_for("a map", lambda: list((self.folder / "data").rglob("*.mbtiles")))
+        self.assertEqual(len(added), 1)
+        self.xdotool("windowfocus", "--sync", self.window)
+        self.await_seen("Brinmouth", "push button")
 
     def test_task_change_text_size(self):
         self.serve()

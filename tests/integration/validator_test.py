@@ -3,15 +3,19 @@
 read as it is installed; only its report is written down here instead of in its window. Skipped without it."""
 
 import importlib.util
+import json
 import os
 import pathlib
-import pathlib
+import subprocess
 import sys
 import tempfile
+import time
 import types
 import unittest
 
 import accessibility_test as accessibility
+import screen_session
+from serve import Service
 
 SCHEMA = pathlib.Path("/usr/share/accerciser/plugindata/validate/basic.py")
 
@@ -115,6 +119,75 @@ class ValidatorTest(accessibility.WindowTest):
             self.assertIn("Where are your friends?", [node.name for node in tree])
             self.check(tree)
 
+    def live(self, *words):
+        """A window beside a service that knows two friends; its whole tree, when it is asked for."""
+        folder = tempfile.TemporaryDirectory()
+        self.addCleanup(folder.cleanup)
+        track = [{"at": 0, "latitude": 50.2114, "longitude": -3.115, "label": "Home"}]
+        friends = [{"fullName": name, "firstName": name.split()[0], "emails": [address], "track": track}
+                   for name, address in (("Ann Marsh", "ann@harbour.example"), ("Otto Brandt", "otto@mail.example"))]
+        file, config = pathlib.Path(folder.name) / "friends.json", pathlib.Path(folder.name) / "config.json"
+        file.write_text(json.dumps({"friends": friends}), encoding="utf-8")
+        service = Service(accessibility.PROGRAM, "--friends", file, "--write-config", config)
+        self.addCleanup(service.__exit__)
+        environment = {**os.environ, "QT_LINUX_ACCESSIBILITY_ALWAYS_ON": "1", "QT_QPA_PLATFORM": "xcb", "KTR_CONFIG": str(config),
+                       "XDG_STATE_HOME": folder.name, "XDG_DATA_HOME": folder.name}
+        program = subprocess.Popen([accessibility.PROGRAM, *words], env={**environment, "LANG": "C.UTF-8"})
+        self.addCleanup(program.wait)
+        self.addCleanup(program.kill)
+        return lambda: screen_session.tree(program.pid)
+
+    def shown(self, tree, name, *roles):
+        """What bears this name on the screen, or begins with it."""
+        import pyatspi
+        from gi.repository import GLib
+
+        def found():
+            for node in tree():
+                try:
+                    if (node.name or "").startswith(name) and (not roles or node.getRoleName() in roles) and node.getState(
+                            ).contains(pyatspi.STATE_SHOWING):
+                        return node
+                except (AttributeError, GLib.Error):
+                    continue
+            return None
+        return accessibility.wait_for(repr(name), found)
+
+    def press(self, node):
+        action = node.queryAction()
+        action.doAction([action.getName(i) for i in range(action.nActions)].index("Press"))
+
+    def check_page(self, tree):
+        """Once nothing comes or goes any more."""
+        time.sleep(1.5)
+        self.check(tree())
+        nameless = [node.getRoleName() for node in tree() if node.getRoleName() in ("push button", "check box", "link", "entry")
+                    and not any(letter.isalpha() for letter in node.name or "")]
+        self.assertEqual(nameless, [], "a name is words")
+
+    def test_settings_and_what_they_lead_to(self):
+        tree = self.live("show")
+        self.press(self.shown(tree, "Settings", "push button"))
+        self.shown(tree, "Notifications", "check box")
+        self.check_page(tree)
+        self.press(self.shown(tree, "Colours", "push button"))
+        self.shown(tree, "Dark", "radio button")
+        self.check_page(tree)
+        self.press(self.shown(tree, "Back", "push button"))
+        self.press(self.shown(tree, "Check-up", "push button"))
+        self.shown(tree, "Check again", "push button")
+        self.check_page(tree)
+
+    def test_friends_and_own_page(self):
+        tree = self.live("show", "--ask", "where are my friends")
+        self.press(self.shown(tree, "Ann Marsh", "link"))
+        self.shown(tree, "Copy place", "push button")
+        self.check_page(tree)
+        for link, name in (("wayloc://friends/", "Ann"), ("wayloc://friend/", "Friends can see me")):
+            tree = self.live("open", link)
+            self.shown(tree, name)
+            self.check_page(tree)
+
     def test_a_fault_is_found(self):
         """The rules do speak: of a button without an action there would be a line."""
         import pyatspi
@@ -144,5 +217,5 @@ if __name__ == "__main__":
         print("accerciser is not installed")
         sys.exit(77)
     if "KTR_INSIDE" not in os.environ:
-        sys.exit(accessibility.outside(__file__))
+        sys.exit(screen_session.outside(__file__, seconds=300))
     unittest.main()

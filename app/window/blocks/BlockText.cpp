@@ -83,7 +83,8 @@ platform::Font BlockText::fontWithin(double width) const {
         return font;
     }
     double widest = 1.0;
-    for (const QString& word : text_.split(QLatin1Char(' '), Qt::SkipEmptyParts)) {
+    QString parted = text_;
+    for (const QString& word : parted.replace(kMayPart, QLatin1Char(' ')).split(QLatin1Char(' '), Qt::SkipEmptyParts)) {
         widest = std::max(widest, static_cast<double>(BlockText(word, style_).naturalWidth()));
     }
     if (widest > width) {

@@ -20,6 +20,9 @@ enum class BlockAlignment { Start, Centre, End };
 /// size; without a platform it takes no room. A value. Main thread.
 class BlockText {
   public:
+    /// Between two letters, a line may end there; it takes no room.
+    static constexpr QChar kMayPart{0x200B};
+
     BlockText() = default;
     explicit BlockText(QString text, BlockStyle style = BlockStyle::Body, bool isBalanced = false)
         : text_(std::move(text)), style_(style), isBalanced_(isBalanced) {}

@@ -16,14 +16,24 @@ constexpr int kPadding = 12;
 constexpr int kBeforeButton = 12;
 constexpr int kNarrowCard = 336;  ///< of a window of 360
 
+/// An address has no blanks: it parts behind its signs.
+QString parting(QString address) {
+    for (const char sign : {'@', '.', ':'}) {
+        address.replace(QLatin1Char(sign), QString(QLatin1Char(sign)) + BlockText::kMayPart);
+    }
+    return address;
+}
+
 }  // namespace
 
 AccountRow::AccountRow(QWidget* parent)
     : Block(parent), signOut_(new Button(Button::Kind::Quiet, {}, Icon::None, this)) {}
 
 void AccountRow::setTexts(const QString& name, const QString& address, const QString& signOut) {
-    name_ = BlockText(name, BlockStyle::Headline);
-    address_ = BlockText(address, BlockStyle::Subheadline);
+    name_ = BlockText(parting(name), BlockStyle::Headline);
+    address_ = BlockText(parting(address), BlockStyle::Subheadline);
+    name_.keepWordsWhole();
+    address_.keepWordsWhole();
     setAccessibleName(address.isEmpty() ? name : name + QStringLiteral(", ") + address);
     signOut_->setWords(signOut);
     place();
