@@ -197,13 +197,13 @@ class OutcomesTest(unittest.TestCase):
         (self.folder / "token").write_text("x" * 22 + "\n")
         answers, texts, _ = self.assert_alike(self.configure(), {"Where is Ann?": (15, "notSignedIn")})
         self.assertEqual(answers["Where is Ann?"]["action"]["kind"], "signIn")
-        self.assertIn("Sign in again", texts)
+        self.assertIn("Sign in again to see your friends.", texts)
 
     def test_nobody_is_signed_in(self):
         answers, texts, _ = self.assert_alike(self.configure(personId=None), {"Where is Ann?": (15, "notSignedIn")})
         self.assertEqual(answers["Where is Ann?"]["action"]["kind"], "signIn")
         self.assertIn("Where are your friends?", texts, "the page that signs in")
-        self.assertNotIn("Sign in again", texts, "for nobody was before")
+        self.assertNotIn("Sign in again to see your friends.", texts, "for nobody was before")
 
     def test_asking_to_share_says_the_same_whoever_is_there(self):
         environment = self.configure()

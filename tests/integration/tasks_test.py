@@ -167,7 +167,7 @@ class TasksTest(live_window_test.LiveWindowTest):
         self.await_seen("Your location is hidden")
 
     def test_task_share_until_tonight(self):
-        """With a service of one's own: typed, granted until the day ends, and the card that follows says that one is seen."""
+        """With a service of one's own: typed, granted until the day ends, and the answer says so."""
         own = OwnService(os.environ["KTR_SERVICE"])
         self.addCleanup(own.__exit__)
         phone = own.add("Mara")
@@ -192,7 +192,7 @@ class TasksTest(live_window_test.LiveWindowTest):
         self.assertLessEqual(0, granted[0] - time.time())
         self.assertLessEqual(granted[0] - time.time(), 86400 + 3600, "tonight")
         self.assertIn((until.tm_hour, until.tm_min), ((0, 0), (23, 59)), "when the day ends")
-        self.await_seen("Sharing with Ann Marsh until")
+        self.await_seen("Ann Marsh can see where you are, until")
 
     def test_task_add_a_map(self):
         self.environment["XDG_DATA_HOME"] = str(self.folder / "data")
@@ -211,7 +211,7 @@ class TasksTest(live_window_test.LiveWindowTest):
         added = wait_for("a map", lambda: list((self.folder / "data").rglob("*.mbtiles")))
         self.assertEqual(len(added), 1)
         self.xdotool("windowfocus", "--sync", self.window)
-        self.await_seen("Brinmouth", "push button")
+        self.await_seen("brinmouth, Streets", "push button")
 
     def test_task_change_text_size(self):
         self.serve()

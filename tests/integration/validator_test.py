@@ -183,7 +183,7 @@ class ValidatorTest(accessibility.WindowTest):
         self.press(self.shown(tree, "Ann Marsh", "link"))
         self.shown(tree, "Copy place", "push button")
         self.check_page(tree)
-        for link, name in (("wayloc://friends/", "Ann"), ("wayloc://friend/", "Friends can see me")):
+        for link, name in (("wayloc://friends/", "Nobody was asked about yet."), ("wayloc://friend/", "Friends can see me")):
             tree = self.live("open", link)
             self.shown(tree, name)
             self.check_page(tree)

@@ -21,19 +21,19 @@ QAccessible::State AccessibleBlock::state() const {
     state.checkable = block_.isCheckable();
     state.checked = block_.isChecked();
     // Also while it is switched off: keys will reach it.
-    state.focusable = block_.canBePressed();
+    state.focusable = canBePressed();
     return state;
 }
 
 void* AccessibleBlock::interface_cast(QAccessible::InterfaceType type) {
     // What cannot be pressed has no actions, not an empty list of them. The plain kind never has any.
-    return type == QAccessible::ActionInterface && block_.canBePressed()
+    return type == QAccessible::ActionInterface && canBePressed()
                ? QAccessibleWidget::interface_cast(type)  // NOLINT(bugprone-parent-virtual-call)
                : AccessiblePlain::interface_cast(type);
 }
 
 QStringList AccessibleBlock::actionNames() const {
-    if (!block_.canBePressed() || !block_.isEnabled()) {
+    if (!canBePressed() || !block_.isEnabled()) {
         return {};
     }
     return {block_.isCheckable() ? toggleAction() : pressAction(), setFocusAction()};
@@ -45,7 +45,7 @@ void AccessibleBlock::doAction(const QString& name) {
     }
     if (name == setFocusAction()) {
         block_.setFocus(Qt::OtherFocusReason);
-    } else if (block_.canBePressed() && (name == pressAction() || name == toggleAction())) {
+    } else if (canBePressed() && (name == pressAction() || name == toggleAction())) {
         block_.press();
     }
 }

@@ -13,13 +13,18 @@ class AccessibleBlock : public AccessiblePlain {
 
     explicit AccessibleBlock(Block& block) : AccessiblePlain(&block, block.role()), block_(block) {}
 
-    QAccessible::Role role() const override { return block_.role(); }
+    /// What can be pressed and has no words yet only keeps its place.
+    QAccessible::Role role() const override {
+        return block_.canBePressed() && !canBePressed() ? QAccessible::Whitespace : block_.role();
+    }
     QAccessible::State state() const override;
     void* interface_cast(QAccessible::InterfaceType type) override;
     QStringList actionNames() const override;
     void doAction(const QString& name) override;
 
   private:
+    bool canBePressed() const { return block_.canBePressed() && !block_.accessibleName().isEmpty(); }
+
     Block& block_;
 };
 

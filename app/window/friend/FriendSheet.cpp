@@ -5,6 +5,8 @@
 #include <QScroller>
 #include <algorithm>
 
+#include "app/window/pages/PageArea.h"
+
 namespace ktr::app {
 
 namespace {
@@ -21,18 +23,13 @@ constexpr int kRingRoom = 5;  ///< that actions have above and below themselves
 
 FriendSheet::FriendSheet(QWidget* parent)
     : Block(parent),
-      area_(new QScrollArea(this)),
+      area_(new PageArea(this)),
       content_(new Content),
       row_(new FriendRow(content_)),
       person_(new ListRow(ListRow::Kind::Plain, {}, content_)),
       where_(new Words(BlockStyle::Subheadline, Words::Tone::Ink, content_)),
       howExactly_(new Words(BlockStyle::Subheadline, Words::Tone::Ink, content_)),
       offer_(new Button(Button::Kind::Quiet, {}, Icon::None, content_)) {
-    area_->setFrameShape(QFrame::NoFrame);
-    area_->setFocusPolicy(Qt::NoFocus);
-    area_->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
-    area_->setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
-    area_->viewport()->setAutoFillBackground(false);
     area_->setWidget(content_);
     content_->setAutoFillBackground(false);
     content_->installEventFilter(this);

@@ -262,14 +262,14 @@ TEST_F(SettingsPageTest, Notifications_AreTheUsersServices_AndSaySoWhereThereAre
 
     const QString manager = QStringLiteral("user-services");
     QDBusConnection service = bus.connect(manager);
-    QString file = QStringLiteral("disabled");
-    test::FakeService fake([&file](const QDBusMessage& message, const QDBusConnection& connection) {
+    QString unitFile = QStringLiteral("disabled");
+    test::FakeService fake([&unitFile](const QDBusMessage& message, const QDBusConnection& connection) {
         if (message.member() == QLatin1String("EnableUnitFiles")) {
-            file = QStringLiteral("enabled");
+            unitFile = QStringLiteral("enabled");
         } else if (message.member() == QLatin1String("DisableUnitFiles")) {
-            file = QStringLiteral("disabled");
+            unitFile = QStringLiteral("disabled");
         }
-        return connection.send(message.member() == QLatin1String("GetUnitFileState") ? message.createReply(file)
+        return connection.send(message.member() == QLatin1String("GetUnitFileState") ? message.createReply(unitFile)
                                                                                      : message.createReply());
     });
     ASSERT_TRUE(service.registerVirtualObject(QStringLiteral("/org/freedesktop/systemd1"), &fake));
@@ -281,12 +281,12 @@ TEST_F(SettingsPageTest, Notifications_AreTheUsersServices_AndSaySoWhereThereAre
     EXPECT_FALSE(page()->notices().isChecked());
     page()->notices().press();
     EXPECT_TRUE(eventually([this] { return page()->notices().isChecked(); }));
-    EXPECT_EQ(file, QStringLiteral("enabled"));
+    EXPECT_EQ(unitFile, QStringLiteral("enabled"));
     ASSERT_TRUE(eventually([this] { return page()->notices().canBePressed(); }));
     keep("notifications");
     page()->notices().press();
     EXPECT_TRUE(eventually([this] { return !page()->notices().isChecked(); }));
-    EXPECT_EQ(file, QStringLiteral("disabled"));
+    EXPECT_EQ(unitFile, QStringLiteral("disabled"));
     window->pages().closeAll();
     settle();
     test::PrivateBus::disconnect(manager);
