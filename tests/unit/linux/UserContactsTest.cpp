@@ -140,6 +140,10 @@ TEST_F(UserContactsTest, AddressBookWithCardsThatAreNone_GivesTheOthers) {
         return std::find(names.begin(), names.end(), "Ann") != names.end() &&
                std::find(names.begin(), names.end(), "Bo") != names.end();
     })) << names.size();
+    for (const auto& line : log->texts(platform::LogLevel::Error)) {
+        EXPECT_NE(line.find("card"), std::string::npos) << line;
+        expectErrorLine(line);
+    }
 }
 
 TEST_F(UserContactsTest, AddressBookThatTakesItsTime_IsNotWaitedFor) {
