@@ -86,6 +86,7 @@ def validate(acc, checks, state, report):
 
 class ValidatorTest(accessibility.WindowTest):
     maxDiff = None
+    before = None
 
     def check(self, tree):
         checks, report = rules(), Report()
@@ -132,7 +133,11 @@ class ValidatorTest(accessibility.WindowTest):
         self.addCleanup(service.__exit__)
         environment = {**os.environ, "QT_LINUX_ACCESSIBILITY_ALWAYS_ON": "1", "QT_QPA_PLATFORM": "xcb", "KTR_CONFIG": str(config),
                        "XDG_STATE_HOME": folder.name, "XDG_DATA_HOME": folder.name}
-        program = subprocess.Popen([accessibility.PROGRAM, *words], env={**environment, "LANG": "C.UTF-8"})
+        if self.before is not None:
+            # A link would lead there.
+            self.before.kill()
+            self.before.wait()
+        self.before = program = subprocess.Popen([accessibility.PROGRAM, *words], env={**environment, "LANG": "C.UTF-8"})
         self.addCleanup(program.wait)
         self.addCleanup(program.kill)
         return lambda: screen_session.tree(program.pid)
