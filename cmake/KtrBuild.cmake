@@ -35,6 +35,10 @@ if(KTR_SANITIZE)
     if("thread" IN_LIST KTR_SANITIZE)
         # The sanitizer does not understand fences; asio's are beside locks, which it does.
         add_compile_definitions(BOOST_ASIO_DISABLE_FENCED_BLOCK)
+        if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
+            # GCC 12 does not see under this sanitizer that "std::string(400, '9') + text" has grown.
+            target_compile_options(ktr_warnings INTERFACE -Wno-array-bounds -Wno-stringop-overflow)
+        endif()
     endif()
 endif()
 
