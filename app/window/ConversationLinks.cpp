@@ -48,10 +48,18 @@ void ConversationWindow::say(const std::string& sentence) {
 }
 
 void ConversationWindow::showFriend(const host::KnownFriends::Known& known, FriendPage::Asks asks) {
-    pages_->open(std::make_unique<FriendPage>(host_, known, asks, [this](const std::string& url, const char* nobody) {
+    const auto open = [this](const std::string& url, const char* nobody) {
         links_->open(url, LinkPolicy::From::FriendPage, nobody);
-    }));
+    };
+    pages_->open(std::make_unique<FriendPage>(host_, known, asks, open, wayToStreets()));
     notice_->raise();
+}
+
+std::function<void()> ConversationWindow::wayToStreets() {
+    if (!live_) {
+        return nullptr;
+    }
+    return [this] { showSettings(SettingsFrom::Maps); };
 }
 
 void ConversationWindow::showFriends() {
@@ -84,8 +92,9 @@ SharingRow::Wish ConversationWindow::sharingWish() const {
     };
 }
 
-void ConversationWindow::showSettings() {
+void ConversationWindow::showSettings(SettingsFrom from) {
     SettingsPage::Window window;
+    window.beginsAtMaps = from == SettingsFrom::Maps;
     window.open = [this](std::unique_ptr<Page> page) {
         pages_->open(std::move(page));
         notice_->raise();
@@ -103,7 +112,12 @@ void ConversationWindow::showSettings() {
         decideTextSize();
     };
     window.isTextSizeHeld = saidTextSize_.has_value();
-    pages_->open(std::make_unique<SettingsPage>(host_, sharingWish(), std::move(window)));
+    auto page = std::make_unique<SettingsPage>(host_, sharingWish(), std::move(window));
+    SettingsPage& opened = *page;
+    pages_->open(std::move(page));
+    if (from == SettingsFrom::Maps) {
+        opened.reveal(opened.maps());
+    }
     notice_->raise();
 }
 

@@ -247,7 +247,7 @@ void ConversationWidget::layOutMarked() {
         return;
     }
     layOutWindow();
-    if (std::any_of(turns.begin(), turns.end(), [](const auto& turn) { return turn->card()->isOutdated(); })) {
+    if (std::any_of(turns.begin(), turns.end(), [](const auto& turn) { return turn->isOutdated(); })) {
         layOut();
     }
 }

@@ -75,6 +75,7 @@ ConversationWindow::~ConversationWindow() {
     if (desktop_ != nullptr) {
         desktop_->setChanged(nullptr);
     }
+    host_.conversation()->setGetStreets(nullptr);
     if (live_) {
         live_->setHandlers({});
         host_.live()->setLockChanged(nullptr);
@@ -113,6 +114,7 @@ void ConversationWindow::addField() {
     greeting_->hide();
     greeting_->setAsked([this](const std::string& question) { live_->ask(question); });
     live_->setHandlers(handlers());
+    host_.conversation()->setGetStreets(wayToStreets());
     statusTimer_.setSingleShot(true);
     host_.live()->setLockChanged([this] { sight_.look(); });
     // Ages and times of the day are others now, and what was known is old.

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QTimer>
+#include <functional>
 #include <memory>
 #include <string>
 #include <vector>
@@ -76,7 +77,10 @@ class ConversationWindow : public PlainWidget {
     void showStatus();
     /// What the status line's button promises.
     void help();
-    void showSettings();
+    enum class SettingsFrom { Top, Maps };
+    /// Leads to where a map is added; empty where nothing is live, as there are no settings.
+    std::function<void()> wayToStreets();
+    void showSettings(SettingsFrom from = SettingsFrom::Top);
     void showCheckUp();
     /// Whether anybody sees the window has become another.
     void sightChanged();

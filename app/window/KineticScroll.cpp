@@ -4,41 +4,22 @@
 
 namespace ktr::app {
 
-namespace {
-
-/// Only the last moments of a drag tell how fast the finger was when it let go, seconds.
-constexpr double kMemory = 0.1;
-
-}  // namespace
-
 void KineticScroll::press(double y, double time) {
     stop();
-    samples_.assign(1, {y, time});
+    trail_.begin({0.0, y}, time);
 }
 
 double KineticScroll::drag(double y, double time) {
-    if (samples_.empty()) {
-        press(y, time);
-        return 0.0;
-    }
-    const double moved = samples_.back().y - y;
-    samples_.push_back({y, time});
-    while (samples_.size() > 2 && time - samples_.front().time > kMemory) {
-        samples_.pop_front();
-    }
-    return moved;
+    // The content goes the other way.
+    return -trail_.move({0.0, y}, time).y();
 }
 
 void KineticScroll::release(double time) {
-    if (samples_.size() >= 2 && time - samples_.back().time <= kMemory) {
-        const double seconds = samples_.back().time - samples_.front().time;
-        const double moved = samples_.front().y - samples_.back().y;
-        if (seconds > 0.0 && std::abs(moved / seconds) >= kSlowest) {
-            velocity_ = moved / seconds;
-        }
+    const double speed = -trail_.release(time).y();
+    if (std::abs(speed) >= kSlowest) {
+        velocity_ = speed;
     }
     lastTime_ = time;
-    samples_.clear();
 }
 
 double KineticScroll::step(double time) {

@@ -1,7 +1,8 @@
 #pragma once
 
-#include <deque>
 #include <optional>
+
+#include "app/window/DragTrail.h"
 
 namespace ktr::app {
 
@@ -25,10 +26,7 @@ class KineticScroll {
     double step(double time);
 
   private:
-    struct Sample {
-        double y, time;
-    };
-    std::deque<Sample> samples_;
+    DragTrail trail_;
     double lastTime_ = 0.0;
     std::optional<double> velocity_;
 };

@@ -154,14 +154,21 @@ void RowFocus::refresh() {
 void RowFocus::markFocus() {
     for (const auto& turn : conversation_->turns()) {
         turn->card()->setFocus(rectIn(*turn->card(), focused_.lock()));
-        turn->offers()->mark(focused_.lock().get(), hovered_.lock().get());
+        markOffers(*turn);
     }
 }
 
 void RowFocus::markHover() {
     for (const auto& turn : conversation_->turns()) {
         turn->card()->setHighlight(rectIn(*turn->card(), hovered_.lock()));
-        turn->offers()->mark(focused_.lock().get(), hovered_.lock().get());
+        markOffers(*turn);
+    }
+}
+
+void RowFocus::markOffers(const host::TurnView& turn) const {
+    turn.offers()->mark(focused_.lock().get(), hovered_.lock().get());
+    if (turn.streets()) {
+        turn.streets()->mark(focused_.lock().get(), hovered_.lock().get());
     }
 }
 

@@ -52,6 +52,7 @@ class RowFocus {
     std::optional<std::size_t> firstOfNewest(const std::vector<platform::AccessibilityNode>& rows) const;
     void markFocus();
     void markHover();
+    void markOffers(const host::TurnView& turn) const;
 
     std::shared_ptr<platform::View> root_;
     std::shared_ptr<host::ConversationView> conversation_;

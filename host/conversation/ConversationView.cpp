@@ -1,6 +1,7 @@
 #include "host/conversation/ConversationView.h"
 
 #include <QPainter>
+#include <utility>
 
 #include "host/conversation/Measures.h"
 #include "host/conversation/Shapes.h"
@@ -21,10 +22,18 @@ std::shared_ptr<linux_::QtAppearance> shownAppearance() {
 void ConversationView::addTurn(const std::shared_ptr<TurnView>& turn) {
     turns_.push_back(turn);
     turn->setMotionStyle(style_);
+    turn->setGetStreets(getStreets_);
     if (palette_ != nullptr) {
         turn->setPalette(*palette_);
     }
     addSubview(turn);
+}
+
+void ConversationView::setGetStreets(std::function<void()> get) {
+    getStreets_ = std::move(get);
+    for (const auto& turn : turns_) {
+        turn->setGetStreets(getStreets_);
+    }
 }
 
 void ConversationView::removeTurn(const std::shared_ptr<TurnView>& turn) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <memory>
 #include <vector>
 
@@ -21,6 +22,8 @@ class ConversationView : public platform::View {
     /// Lays everything out for a width and takes the height that it needs, which is returned; points.
     double layOut(double width);
 
+    /// How somebody gets streets where a card's map has none; empty: nothing is offered.
+    void setGetStreets(std::function<void()> get);
     /// Whether a narrow conversation has room for its times; laid out with the next width.
     void setShowsTimes(bool shows) { showsTimes_ = shows; }
     /// What may move from now on; no turn does, until this is called. Pins and maps do not glide in reduced motion.
@@ -46,6 +49,7 @@ class ConversationView : public platform::View {
     bool showsTimes_ = true;
     std::vector<std::shared_ptr<TurnView>> turns_;
     const linux_::Palette* palette_ = nullptr;
+    std::function<void()> getStreets_;
     /// Painting keeps what it blurred.
     mutable CardShadow shadow_;
 };

@@ -14,6 +14,7 @@ inline constexpr double kBubbleSide = 16.0;
 inline constexpr double kBubbleBottom = 11.0;
 inline constexpr double kQuestionToSentence = 14.0;
 inline constexpr double kCardToQuestion = 22.0;
+inline constexpr double kCardToStreets = 2.0;  ///< to the line that says that there are none
 inline constexpr double kRingToBubble = 12.0;  ///< while the question waits for its answer
 inline constexpr double kMark = 16.0;          ///< in the ring's place, where nothing came
 inline constexpr double kSentenceToOffers = 12.0;

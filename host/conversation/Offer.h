@@ -15,6 +15,7 @@ struct Offer {
     enum class Kind {
         Button,    ///< an icon, perhaps, and words
         Person,    ///< somebody to choose: a face and a name
+        Line,      ///< words alone, in a line of small text
         Question,  ///< one that may be asked: the bubble's form, empty
     };
     Kind kind = Kind::Button;

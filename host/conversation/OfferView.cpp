@@ -41,10 +41,6 @@ bool rightToLeft() {
     return platform::Platform::installed()->assistant->languageIsRightToLeft();
 }
 
-platform::Color colorOf(const QColor& color) {
-    return platform::Color::rgb(color.redF(), color.greenF(), color.blueF());
-}
-
 }  // namespace
 
 bool OfferView::initWithFrame(const Rect& frame) {
@@ -60,8 +56,7 @@ bool OfferView::initWithFrame(const Rect& frame) {
 
 void OfferView::setOffer(const Offer& offer) {
     offer_ = offer;
-    const bool isQuestion = offer.kind == Offer::Kind::Question;
-    label_->setFont(platform::preferredFont(isQuestion ? platform::TextStyle::Body : platform::TextStyle::Headline));
+    label_->setFont(fontOf(offer.kind));
     label_->setText(offer.words);
     addGestureRecognizer(std::make_shared<platform::TapGestureRecognizer>([press = offer.press] {
         if (press) {
@@ -71,7 +66,8 @@ void OfferView::setOffer(const Offer& offer) {
 }
 
 void OfferView::setPalette(const linux_::Palette& palette) {
-    label_->setTextColor(colorOf(offer_.kind == Offer::Kind::Button ? palette.pine : palette.ink));
+    const bool isControl = offer_.kind == Offer::Kind::Button || offer_.kind == Offer::Kind::Line;
+    label_->setTextColor(textColor(isControl ? palette.pine : palette.ink));
 }
 
 OfferView::Room OfferView::room() const {
@@ -80,11 +76,29 @@ OfferView::Room OfferView::room() const {
             return {kFaceIn + grown(kFace) + kFaceGap, kPersonEnd, kAboveWords, kAboveWords, grown(kPersonHeight)};
         case Offer::Kind::Question:
             return {measures::kBubbleSide, measures::kBubbleSide, measures::kBubbleTop, measures::kBubbleBottom, 0.0};
+        case Offer::Kind::Line:
+            return {kLineSide, kLineSide, kAboveWords, kAboveWords, kButtonHeight};
         case Offer::Kind::Button:
             break;
     }
     const double icon = offer_.icon == Icon::None ? 0.0 : grown(iconSide(offer_.icon)) + kIconGap;
     return {kButtonSide + icon, kButtonSide, kAboveWords, kAboveWords, grown(kButtonHeight)};
+}
+
+platform::Font OfferView::fontOf(Offer::Kind kind) {
+    switch (kind) {
+        case Offer::Kind::Question:
+            return platform::preferredFont(platform::TextStyle::Body);
+        case Offer::Kind::Line: {
+            auto font = platform::preferredFont(platform::TextStyle::Footnote);
+            font.weight = platform::FontWeight::Bold;
+            return font;
+        }
+        case Offer::Kind::Button:
+        case Offer::Kind::Person:
+            break;
+    }
+    return platform::preferredFont(platform::TextStyle::Headline);
 }
 
 platform::Size OfferView::sizeForWidth(double most) const {
@@ -149,7 +163,8 @@ void OfferView::draw(platform::Canvas& canvas) const {
         return isQuestion ? bubblePath(inner, corner() - inset, measures::kBubbleTailCorner - inset, rightToLeft())
                           : roundedPath(inner, corner() - inset);
     };
-    if (!isQuestion) {
+    const bool isLine = offer_.kind == Offer::Kind::Line;
+    if (!isQuestion && !isLine) {
         fillPath(*qt, shape(0.0), palette.card);
     }
     if (isHovered_) {
@@ -157,6 +172,9 @@ void OfferView::draw(platform::Canvas& canvas) const {
     }
     if (isDown_) {
         fillPath(*qt, shape(0.0), linux_::Palette::pressed());
+    }
+    if (isLine) {
+        return;
     }
     const double edge = isHovered_ ? std::max(palette.highlightEdge.width, 1.0) : 1.0;
     qt->painter().strokePath(shape(edge / 2.0), QPen(palette.fieldLine, edge));

@@ -14,6 +14,9 @@ namespace ktr::host {
 /// thread.
 class OfferView : public platform::View {
   public:
+    /// Of a line's target, before and behind its words, points.
+    static constexpr double kLineSide = 12.0;
+
     bool initWithFrame(const platform::Rect& frame) override;
     void setOffer(const Offer& offer);
     void setPalette(const linux_::Palette& palette);
@@ -46,7 +49,7 @@ class OfferView : public platform::View {
         double least = 0.0;
     };
     Room room() const;
-    void chooseFont();
+    static platform::Font fontOf(Offer::Kind kind);
     void setDown(bool isDown);
 
     Offer offer_;

@@ -75,9 +75,8 @@ void OffersView::setOffers(const Offers& offers) {
 
 void OffersView::setPalette(const linux_::Palette& palette) {
     palette_ = &palette;
-    const QColor& soft = palette.inkSoft;
     for (const auto& label : {title_, note_}) {
-        label->setTextColor(platform::Color::rgb(soft.redF(), soft.greenF(), soft.blueF()));
+        label->setTextColor(textColor(palette.inkSoft));
     }
     for (const auto& offer : offers_) {
         offer->setPalette(palette);

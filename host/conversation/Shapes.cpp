@@ -48,6 +48,10 @@ void strokeInside(linux_::QtCanvas& canvas, const QRectF& rect, double corner, c
                                 QPen(color, width));
 }
 
+platform::Color textColor(const QColor& color) {
+    return platform::Color::rgb(color.redF(), color.greenF(), color.blueF());
+}
+
 platform::Rect mirrored(const platform::Rect& rect, double parentWidth, bool rightToLeft) {
     return rightToLeft ? platform::Rect{parentWidth - rect.maxX(), rect.y, rect.width, rect.height} : rect;
 }

@@ -21,6 +21,9 @@ void fillPath(linux_::QtCanvas& canvas, const QPainterPath& path, const QColor& 
 /// Draws an edge wholly inside a rounded rectangle.
 void strokeInside(linux_::QtCanvas& canvas, const QRectF& rect, double corner, const QColor& color, double width);
 
+/// The colour of a text that the host has of its own.
+platform::Color textColor(const QColor& color);
+
 /// A rectangle as its mirror image has it in a parent of this width.
 platform::Rect mirrored(const platform::Rect& rect, double parentWidth, bool rightToLeft);
 

@@ -10,6 +10,7 @@
 #include "host/conversation/WideColumns.h"
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/assistant/Localization.h"
+#include "platform/base/MainLoop.h"
 #include "platform/base/Platform.h"
 
 namespace ktr::host {
@@ -66,9 +67,14 @@ void place(View& view, const Rect& rect, double parentWidth) {
     view.setFrame(mirrored(rect, parentWidth, rightToLeft()));
 }
 
-platform::Color softColor(const linux_::Palette& palette) {
-    const QColor& soft = palette.inkSoft;
-    return platform::Color::rgb(soft.redF(), soft.greenF(), soft.blueF());
+std::shared_ptr<PlatformMapView> mapIn(const View& view) {
+    for (const auto& subview : view.subviews()) {
+        auto map = std::dynamic_pointer_cast<PlatformMapView>(subview);
+        if (map || (map = mapIn(*subview))) {
+            return map;
+        }
+    }
+    return nullptr;
 }
 
 }  // namespace
@@ -135,6 +141,61 @@ void TurnView::renew() {
     // What comes next stands at once in its own size.
     laidOutCard_ = 0.0;
     chooseFonts();
+    if (streets_) {
+        streets_->renew();
+        followStreets();
+    }
+}
+
+void TurnView::setGetStreets(std::function<void()> get) {
+    if (!get) {
+        if (streets_) {
+            streets_->removeFromSuperview();
+            streets_ = nullptr;
+            streetsChanged_.remove();
+        }
+        return;
+    }
+    if (!streets_) {
+        streets_ = create<StreetsLine>(&StreetsLine::initWithFrame, Rect{});
+        streets_->setHidden(true);
+        if (palette_ != nullptr) {
+            streets_->setPalette(*palette_);
+        }
+        addSubview(streets_);
+        // One that is there may have told already.
+        map_ = mapIn(*card_->content());
+        followStreets();
+    }
+    streets_->setGet(std::move(get));
+}
+
+void TurnView::followStreets() {
+    const auto installed = Platform::installed();
+    streetsChanged_ = installed->notificationCenter->addObserver(
+        kMapStreetsChangedNotification, [target = weak(this)](const Notification& told) {
+            const auto self = target.lock();
+            const auto map = std::dynamic_pointer_cast<PlatformMapView>(told.sender);
+            if (!self || !map || !map->isDescendantOf(*self->card_)) {
+                return;
+            }
+            self->map_ = map;
+            // Perhaps in the middle of a layout.
+            Platform::installed()->mainLoop->post([target] {
+                if (const auto turn = target.lock()) {
+                    turn->setNeedsLayout();
+                }
+            });
+        });
+}
+
+bool TurnView::lacksStreets() const {
+    const auto map = map_.lock();
+    return map && !card_->hidden() && map->isDescendantOf(*card_) && !map->hasStreets();
+}
+
+bool TurnView::isOutdated() const {
+    return card_->isOutdated() || (streets_ && streets_->hidden() == lacksStreets());
 }
 
 void TurnView::setTexts(const TurnTexts& texts) {
@@ -159,7 +220,7 @@ void TurnView::showSentence() {
     const bool isPatience = texts_.sentence.empty();
     const std::string& words = isPatience ? patience_ : texts_.sentence;
     sentence_->setText(inItsDirection(words));
-    sentence_->setTextColor(isPatience && palette_ != nullptr ? softColor(*palette_)
+    sentence_->setTextColor(isPatience && palette_ != nullptr ? textColor(palette_->inkSoft)
                                                               : Color::ofRole(ColorRole::StandardText));
     sentence_->setHidden(words.empty());
     sentenceFade_->setHidden(words.empty());
@@ -178,8 +239,11 @@ void TurnView::setOffers(const Offers& offers) {
 
 void TurnView::setPalette(const linux_::Palette& palette) {
     palette_ = &palette;
-    time_->setTextColor(softColor(palette));
+    time_->setTextColor(textColor(palette.inkSoft));
     offers_->setPalette(palette);
+    if (streets_) {
+        streets_->setPalette(palette);
+    }
     showSentence();
 }
 
@@ -209,6 +273,7 @@ double TurnView::layOut(double width, bool first) {
     if (!card_->hidden()) {
         setCardHeight(card_->heightForWidth(places_.card.width), places_.card.width);
     }
+    layOutStreets();
     placeAnswer();
     return height_;
 }
@@ -222,6 +287,13 @@ void TurnView::layOutNarrow(double width, bool first) {
     // Questions keep to the edge at which the question stands.
     const double start = offers_->asksOn() ? measures::kGutter : measures::kSentenceStart;
     layOutOffers(start, width - start - measures::kGutter, false);
+}
+
+void TurnView::layOutStreets() {
+    if (streets_) {
+        streets_->setHidden(!lacksStreets());
+        streetsHeight_ = streets_->hidden() ? 0.0 : streets_->heightForWidth(places_.card.width);
+    }
 }
 
 void TurnView::layOutOffers(double start, double width, bool atEnd) {
@@ -248,6 +320,11 @@ void TurnView::placeAnswer() {
         card.height = growth_.at(now_);
         place(*card_, card, places_.width);
         height_ = std::max(height_, places_.card.y + card.height);
+        if (streets_ && !streets_->hidden()) {
+            const double top = card.maxY() + measures::kCardToStreets;
+            place(*streets_, {card.x, top, card.width, streetsHeight_}, places_.width);
+            height_ = std::max(height_, top - rise + streetsHeight_);
+        }
     }
     if (!offers_->hidden()) {
         constexpr double kAround = OffersView::kAround;
@@ -293,6 +370,9 @@ bool TurnView::advance(double now) {
         sentenceFade_->setOpacity(answerArrival_.at(now));
         offers_->setOpacity(answerArrival_.at(now));
         card_->setOpacity(answerArrival_.at(now));
+        if (streets_) {
+            streets_->setOpacity(answerArrival_.at(now));
+        }
         placeAnswer();
         setNeedsDisplay();
     }

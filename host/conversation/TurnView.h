@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <memory>
 #include <string>
 
@@ -9,7 +10,10 @@
 #include "host/conversation/Motion.h"
 #include "host/conversation/OffersView.h"
 #include "host/conversation/RingView.h"
+#include "host/conversation/StreetsLine.h"
 #include "linux/paint/Palette.h"
+#include "platform/base/NotificationCenter.h"
+#include "platform/map/PlatformMapView.h"
 #include "platform/ui/Label.h"
 #include "platform/ui/View.h"
 
@@ -42,6 +46,9 @@ class TurnView : public platform::View {
     void setPatience(const std::string& words);
     /// What can be done about the answer, in the place of what could before.
     void setOffers(const Offers& offers);
+    /// How somebody gets streets where the card's map has none: a line below the card offers it. Empty: nothing is
+    /// offered.
+    void setGetStreets(std::function<void()> get);
     /// Puts an answer into the card, which is not shown before.
     void setController(const std::shared_ptr<platform::HostSnippetViewController>& controller);
     /// Begins anew where the language or the text size may be another: with the fonts of now, and with a new card in
@@ -52,6 +59,10 @@ class TurnView : public platform::View {
     const std::shared_ptr<CardView>& card() const { return card_; }
     const std::shared_ptr<RingView>& ring() const { return ring_; }
     const std::shared_ptr<OffersView>& offers() const { return offers_; }
+    /// None where nothing is offered; hidden while there are streets.
+    const std::shared_ptr<StreetsLine>& streets() const { return streets_; }
+    /// Something has changed without anybody's word: the turn would be of another height now.
+    bool isOutdated() const;
     Progress progress() const { return progress_; }
     const std::string& question() const { return texts_.question; }
     const std::string& sentence() const { return texts_.sentence; }
@@ -88,6 +99,10 @@ class TurnView : public platform::View {
     class MarkView;
 
     void showSentence();
+    /// Hears from the maps of the installed platform.
+    void followStreets();
+    bool lacksStreets() const;
+    void layOutStreets();
     void layOutOffers(double start, double width, bool atEnd);
     /// Beside the question's last line, whose bubble is there.
     void placeProgress(const platform::Rect& bubble, double parentWidth);
@@ -137,6 +152,11 @@ class TurnView : public platform::View {
     std::shared_ptr<MarkView> mark_;
     std::shared_ptr<CardView> card_;
     std::shared_ptr<OffersView> offers_;
+    std::shared_ptr<StreetsLine> streets_;
+    double streetsHeight_ = 0.0;
+    /// That the card showed last.
+    std::weak_ptr<platform::PlatformMapView> map_;
+    platform::NotificationCenter::Token streetsChanged_;
     std::string patience_;
     Progress progress_ = Progress::None;
     const linux_::Palette* palette_ = nullptr;

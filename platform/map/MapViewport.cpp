@@ -8,6 +8,21 @@
 
 namespace ktr::platform {
 
+MapViewport MapViewport::between(const MapViewport& from, const MapViewport& to, double progress) {
+    if (progress >= 1.0) {
+        return to;
+    }
+    const double zoom = from.zoom + (to.zoom - from.zoom) * progress;
+    const double first = 1.0 / mercatorWorld(from.zoom);
+    const double last = 1.0 / mercatorWorld(to.zoom);
+    const double now = 1.0 / mercatorWorld(zoom);
+    const double part = std::abs(last - first) > 1e-6 * first ? (now - first) / (last - first) : progress;
+    const Point a = mercatorPoint(from.centre);
+    const Point b = mercatorPoint(to.centre);
+    const double dx = b.x - a.x;
+    return {mercatorCoordinate({a.x + (dx - std::round(dx)) * part, a.y + (b.y - a.y) * part}), zoom, to.size};
+}
+
 Point MapViewport::pointFor(const Coordinate& coordinate) const {
     const Point middle = mercatorPoint(centre);
     const Point there = mercatorPoint(coordinate);

@@ -14,6 +14,10 @@ struct KTR_API MapViewport {
     double zoom = 0.0;  ///< 0 shows the world in 256 points; need not be whole
     Size size;          ///< points
 
+    /// On the way from one to another, `progress` from 0 to 1: the scale changes evenly to the eye, and what is common
+    /// to both stays put.
+    static MapViewport between(const MapViewport& from, const MapViewport& to, double progress);
+
     bool operator==(const MapViewport&) const = default;
 
     /// Where a coordinate stands, in points from the rectangle's top left corner: the copy of the world that is nearest

@@ -13,7 +13,7 @@
 #include "platform/map/MapChromeView.h"
 #include "platform/map/MapLocationManager.h"
 #include "platform/map/MapPlacelessView.h"
-#include "platform/map/Mercator.h"
+#include "platform/map/MapUserTracker.h"
 #include "platform/ui/Appearance.h"
 #include "platform/ui/Canvas.h"
 #include "platform/ui/Device.h"
@@ -42,65 +42,9 @@ bool hasPlace(const std::vector<std::shared_ptr<MapAnnotation>>& annotations) {
                        [](const auto& annotation) { return annotation->hasKnownLocation(); });
 }
 
-/// On the way from one viewport to another: the scale changes evenly to the eye, and what is common to both stays put.
-MapViewport between(const MapViewport& from, const MapViewport& to, double progress) {
-    if (progress >= 1.0) {
-        return to;
-    }
-    const double zoom = from.zoom + (to.zoom - from.zoom) * progress;
-    const double first = 1.0 / mercatorWorld(from.zoom);
-    const double last = 1.0 / mercatorWorld(to.zoom);
-    const double now = 1.0 / mercatorWorld(zoom);
-    const double part = std::abs(last - first) > 1e-6 * first ? (now - first) / (last - first) : progress;
-    const Point a = mercatorPoint(from.centre);
-    const Point b = mercatorPoint(to.centre);
-    const double dx = b.x - a.x;
-    return {mercatorCoordinate({a.x + (dx - std::round(dx)) * part, a.y + (b.y - a.y) * part}), zoom, to.size};
-}
-
 }  // namespace
 
 PlatformMapViewDelegate::~PlatformMapViewDelegate() = default;
-
-/// Hears of the user's position for a map.
-class PlatformMapView::UserTracker : public PlatformLocationManagerDelegate,
-                                     public std::enable_shared_from_this<UserTracker> {
-  public:
-    explicit UserTracker(std::weak_ptr<PlatformMapView> map) : map_(std::move(map)) {}
-    ~UserTracker() override {
-        if (manager_) {
-            manager_->stopUpdatingLocation();
-        }
-    }
-    void start(const std::shared_ptr<PlatformLocationManager>& manager) {
-        manager_ = manager;
-        manager->setDelegate(weak_from_this());
-        manager->setDesiredAccuracy(kLocationAccuracyNearestTenMeters);
-        manager->setDistanceFilter(1.0);
-        manager->startUpdatingLocation();
-        catchUp();
-    }
-    void catchUp() { tell(manager_ ? manager_->location() : nullptr); }
-    void didUpdateLocations(PlatformLocationManager&, const PlatformLocations& locations) override {
-        if (!locations.empty()) {
-            tell(locations.back());
-        }
-    }
-
-  private:
-    void tell(const std::shared_ptr<PlatformLocation>& location) {
-        // A negative accuracy marks a position that is none.
-        if (const auto map = map_.lock(); map && location && location != told_ && isValid(location->coordinate()) &&
-                                          location->fix().horizontalAccuracy >= 0.0) {
-            told_ = location;
-            map->userMoved(location);
-        }
-    }
-
-    std::weak_ptr<PlatformMapView> map_;
-    std::shared_ptr<PlatformLocationManager> manager_;
-    std::shared_ptr<PlatformLocation> told_;
-};
 
 PlatformMapView::PlatformMapView() : userLocation_(std::make_shared<UserLocation>()) {}
 
@@ -168,6 +112,7 @@ void PlatformMapView::updateNow() {
     updateRenderers();
     updateViewport();
     requestGround();
+    tellStreets();
 }
 
 void PlatformMapView::showPlaceless() {
@@ -282,16 +227,23 @@ void PlatformMapView::groundArrived() {
         // The picture reached beyond the view, where its town may be.
         *coarse -= std::log2(1.0 + 2.0 * kBeyond);
     }
-    const bool isOther = coarse != coarseZoom_ || backdrop_->hasStreets() != hasStreets_;
     // Where something was seen before, nothing jumps.
     glidesToRequested_ = glidesToRequested_ || (hadGround_ && coarse != coarseZoom_);
     hadGround_ = true;
     coarseZoom_ = coarse;
-    hasStreets_ = backdrop_->hasStreets();
     setNeedsUpdate();
     setNeedsDisplay();
-    const auto installed = Platform::installed();
-    if (isOther && installed && installed->notificationCenter) {
+    tellStreets();
+}
+
+void PlatformMapView::tellStreets() {
+    const bool hasStreets = isPlaceless() || backdrop_->hasStreets();
+    if (hasStreets == hasStreets_ && coarseZoom_ == toldCoarseZoom_) {
+        return;
+    }
+    hasStreets_ = hasStreets;
+    toldCoarseZoom_ = coarseZoom_;
+    if (const auto installed = Platform::installed(); installed && installed->notificationCenter) {
         installed->notificationCenter->post({kMapStreetsChangedNotification, strong(this)});
     }
 }
@@ -326,7 +278,7 @@ void PlatformMapView::glideTo(const MapViewport& target) {
     glideTarget_ = target;
     auto glide = Animation::start(kGlide, [self = weak(this), from = shown_, target](double progress) {
         if (const auto map = self.lock()) {
-            map->show(between(from, target, progress));
+            map->show(MapViewport::between(from, target, progress));
         }
     });
     if (glide->isRunning()) {
@@ -469,7 +421,11 @@ void PlatformMapView::setShowsUserLocation(bool shows) {
         userLocation_->setLocation(nullptr, {});
     } else if (installed && installed->locationManagers) {
         const auto permission = shared<MapLocationManager>();
-        tracker_ = std::make_shared<UserTracker>(weak(this));
+        tracker_ = std::make_shared<MapUserTracker>([target = weak(this)](const auto& location) {
+            if (const auto self = target.lock()) {
+                self->userMoved(location);
+            }
+        });
         tracker_->start(installed->locationManagers->makeManager(permission ? permission->effectiveBundle() : nullptr));
     }
     setNeedsUpdate();

@@ -7,7 +7,7 @@
 #include <vector>
 
 #include "platform/base/NotificationCenter.h"
-#include "platform/location/PlatformLocationManager.h"
+#include "platform/location/PlatformLocation.h"
 #include "platform/map/AnnotationView.h"
 #include "platform/map/CircleOverlay.h"
 #include "platform/map/MapRegion.h"
@@ -20,6 +20,7 @@ class MapAnnotationLayer;
 class MapChromeView;
 class MapBackdrop;
 class MapPlacelessView;
+class MapUserTracker;
 class PlatformMapView;
 
 /// A map has learnt whether there are streets where it is; its sender is the map.
@@ -82,7 +83,8 @@ class KTR_API PlatformMapView : public View {
     void setSurroundings(Surroundings surroundings);
 
     // Beyond the streets
-    /// False once a picture of the ground has shown that there are no streets where the middle is.
+    /// False once a picture of the ground has shown that there are no streets where the middle is. Where there is no
+    /// place to show, nobody misses them.
     bool hasStreets() const { return hasStreets_; }
     /// The zoom at which a map without streets says more. A region is shown that far out; a host's hand decides itself.
     const std::optional<double>& coarseZoom() const { return coarseZoom_; }
@@ -131,8 +133,6 @@ class KTR_API PlatformMapView : public View {
     void draw(Canvas& canvas) const override;
 
   private:
-    class UserTracker;
-
     void setNeedsUpdate();
     void arrangeViews(const std::vector<std::shared_ptr<MapAnnotation>>& annotations);
     void updateRenderers();
@@ -146,6 +146,7 @@ class KTR_API PlatformMapView : public View {
     void showPlaceless();
     void requestGround();
     void groundArrived();
+    void tellStreets();
     /// As if there were streets everywhere.
     MapViewport viewportAskedFor() const;
     void userMoved(const std::shared_ptr<PlatformLocation>& location);
@@ -163,6 +164,7 @@ class KTR_API PlatformMapView : public View {
     bool hadGround_ = false;  ///< a picture has been there
     bool hasStreets_ = true;
     std::optional<double> coarseZoom_;
+    std::optional<double> toldCoarseZoom_;
     Surroundings surroundings_;
     bool glidesToRequested_ = false;
     std::shared_ptr<Animation> glide_;
@@ -171,7 +173,7 @@ class KTR_API PlatformMapView : public View {
     std::vector<std::shared_ptr<MapOverlay>> overlays_;
     std::vector<std::shared_ptr<MapOverlayRenderer>> renderers_;
     std::shared_ptr<UserLocation> userLocation_;
-    std::shared_ptr<UserTracker> tracker_;
+    std::shared_ptr<MapUserTracker> tracker_;
     std::unique_ptr<MapBackdrop> backdrop_;
     std::unique_ptr<MapAnnotationLayer> layer_;
     std::shared_ptr<MapChromeView> chrome_;

@@ -48,9 +48,9 @@ class LiveWindowTest(WindowCase):
         super().setUp()
         self.output = self.folder / "output"
 
-    def serve(self, *options, step=0.0):
-        """Ann goes so many degrees to the north from label to label, in the demo town."""
-        track = [{"at": at, "latitude": 50.2114 + step * at, "longitude": -3.115, "label": label}
+    def serve(self, *options, step=0.0, start=(50.2114, -3.115)):
+        """Ann goes so many degrees to the north from label to label, in the demo town or from another start."""
+        track = [{"at": at, "latitude": start[0] + step * at, "longitude": start[1], "label": label}
                  for at, label in ((0, "Home"), (4, "Fish Market"), (5, "Work"), (6, "Ferry Pier"), (7, "Harbour Steps"))]
         ann = {"fullName": "Ann Marsh", "firstName": "Ann", "emails": ["ann@harbour.example"], "track": track}
         otto = {"fullName": "Otto Brandt", "firstName": "Otto", "emails": ["otto@mail.example"], "track": track[:1]}

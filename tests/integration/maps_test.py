@@ -4,30 +4,19 @@ not one of pixels, and a place beyond all of them."""
 
 import base64
 import json
-import math
 import os
 import pathlib
 import re
-import sqlite3
 import struct
 import subprocess
 import tempfile
 import unittest
 import zlib
 
+from map_file import MAGENTA, PLACE, write_region
+
 PROGRAM = os.environ["KTR_PROGRAM"]
 SCENARIOS = pathlib.Path(os.environ["KTR_SOURCE"]) / "resources" / "scenarios"
-# East of Berlin, where no map that comes along has streets.
-PLACE = (52.42, 13.95)
-MAGENTA = b"\xff\x00\xff"
-
-
-def png(color, side=256):
-    def chunk(kind, data):
-        return struct.pack(">I", len(data)) + kind + data + struct.pack(">I", zlib.crc32(kind + data))
-    rows = (b"\x00" + color * side) * side
-    return (b"\x89PNG\r\n\x1a\n" + chunk(b"IHDR", struct.pack(">IIBBBBB", side, side, 8, 2, 0, 0, 0))
-            + chunk(b"IDAT", zlib.compress(rows)) + chunk(b"IEND", b""))
 
 
 def pixels_of(picture):
@@ -54,23 +43,6 @@ class MapsTest(unittest.TestCase):
         self.scenario = self.folder / "scenario.json"
         self.scenario.write_text(json.dumps(scenario), encoding="utf-8")
 
-    def region(self):
-        """A file with pictures around the place, all of one colour."""
-        path = self.folder / "region.mbtiles"
-        with sqlite3.connect(path) as database:
-            database.execute("CREATE TABLE metadata (name TEXT, value TEXT)")
-            database.execute("CREATE TABLE tiles (zoom_level INTEGER, tile_column INTEGER, tile_row INTEGER, tile_data BLOB)")
-            database.execute("CREATE UNIQUE INDEX tile_index ON tiles (zoom_level, tile_column, tile_row)")
-            database.executemany("INSERT INTO metadata VALUES (?, ?)", [("format", "png"), ("minzoom", "9"), ("maxzoom", "14")])
-            for level in range(9, 15):
-                count = 2 ** level
-                x = int((PLACE[1] / 360 + 0.5) * count)
-                y = int((0.5 - math.asinh(math.tan(math.radians(PLACE[0]))) / math.tau) * count)
-                database.executemany("INSERT INTO tiles VALUES (?, ?, ?, ?)", [
-                    (level, x + dx, count - 1 - y - dy, png(MAGENTA)) for dx in range(-3, 4) for dy in range(-3, 4)])
-        database.close()
-        return path
-
     def draw(self, name="a.png", scenario=None):
         """The picture, and what was said."""
         picture = self.folder / name
@@ -84,7 +56,7 @@ class MapsTest(unittest.TestCase):
         picture, said = self.draw()
         self.assertEqual(said, "")
         self.assertNotIn(MAGENTA * 20, pixels_of(picture))
-        self.config.write_text(json.dumps({"maps": {"sources": [{"file": str(self.region()), "attribution": "© Somebody"}]}}))
+        self.config.write_text(json.dumps({"maps": {"sources": [{"file": str(write_region(self.folder / "region.mbtiles")), "attribution": "© Somebody"}]}}))
         picture, said = self.draw()
         self.assertEqual(said, "")
         self.assertIn(MAGENTA * 20, pixels_of(picture))

@@ -6,6 +6,7 @@ tests are."""
 import json
 import os
 import pathlib
+import re
 import subprocess
 import sys
 import time
@@ -13,6 +14,7 @@ import unittest
 
 import accessibility_test
 import live_window_test
+import map_file
 import mock_bus
 from live_window_test import FIRST_ROW, wait_for
 from own_service import OwnService
@@ -156,6 +158,30 @@ class TasksTest(live_window_test.LiveWindowTest):
         self.click_on("Open in Maps", "push button")
         wait_for("a place", lambda: "OpenURI" in told.read_text())
         self.assertRegex(told.read_text(), r'OpenURI "" "geo:50\.2\d*,-3\.1\d*\?q=50\.2\d*,-3\.1\d*\(Ann%20Marsh\)"')
+
+    def test_task_add_a_map(self):
+        """Where no map has streets, the line under the card leads to where one is added; then the card has it."""
+        self.environment["XDG_DATA_HOME"] = str(self.folder / "data")
+        region = map_file.write_region(self.folder / "region.mbtiles")
+        self.serve(start=map_file.PLACE)
+        self.open_spoken("--ask", "where is ann")
+        card = (24, 330, 376, 500)
+
+        def drawn():
+            # Four bytes a pixel, of which the last says nothing.
+            return re.search(b"(?:\xff\x00\xff.){100}", self.picture(card) or b"", re.DOTALL)
+        self.await_seen("No streets for this region here yet.")
+        self.assertIsNone(drawn())
+        self.click_on("Get streets", "link")
+        self.click_on("Add a region", "push button")
+        dialog = wait_for("the dialog", lambda: self.xdotool("search", "--onlyvisible", "--name", "^Add a region$", check=False))
+        self.xdotool("windowfocus", "--sync", dialog.split()[0])
+        self.type(region)
+        self.key("Return")
+        self.await_seen("region", "push button")
+        self.click_on("Back", "push button")
+        wait_for("the map under the earlier card", drawn)
+        wait_for("nothing more to get", lambda: not self.seen("Get streets"))
 
     def test_task_hide(self):
         service = self.serve()

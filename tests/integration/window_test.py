@@ -1,13 +1,17 @@
 #!/usr/bin/python3
-"""Opens `ktr show` on a virtual display and uses it with a mouse and keys. Skipped without Xvfb and xdotool."""
+"""Opens `ktr show` on a virtual display and uses it with a mouse and keys. Skipped without Xvfb,
+xdotool and xwd."""
 
+import json
 import os
 import pathlib
+import re
 import shutil
 import subprocess
 import sys
 import unittest
 
+import map_file
 from window_case import WindowCase, wait_for
 
 PROGRAM = os.environ["KTR_PROGRAM"]
@@ -68,6 +72,28 @@ class WindowTest(WindowCase):
         self.xdotool("mousemove", "--window", self.window, 190, 350, "click", 1)
         self.wait_for_urls("wayloc://friends/")
 
+    def test_a_scenario_is_drawn_on_the_configured_map(self):
+        scenario = json.loads((SCENARIOS / "single.json").read_text(encoding="utf-8"))
+        location = scenario["snippet"]["locations"][0]
+        location["latitude"], location["longitude"] = map_file.PLACE
+        scenario["contacts"] = str(SCENARIOS / "contacts")
+        del scenario["positions"]
+        file, config = self.folder / "scenario.json", self.folder / "config.json"
+        file.write_text(json.dumps(scenario), encoding="utf-8")
+        region = map_file.write_region(self.folder / "region.mbtiles")
+        config.write_text(json.dumps({"maps": {"sources": [{"file": str(region)}, {"file": str(self.folder / "gone.mbtiles")}]}}))
+        self.environment["KTR_CONFIG"] = str(config)
+        self.open(file, "--light")
+
+        def drawn():
+            taken = subprocess.run(["xwd", "-silent", "-id", self.window], env=self.environment, capture_output=True, check=False)
+            # Four bytes a pixel, of which the last says nothing.
+            return re.search(b"(?:\xff\x00\xff.){100}", taken.stdout, re.DOTALL)
+        wait_for("the configured map", drawn)
+        self.xdotool("key", "ctrl+q")
+        self.assertEqual(self.program.wait(timeout=30), 0)
+        self.assertRegex(self.program.stderr.read(), r'^warning: the map ".*gone\.mbtiles" is not there.*\n$')
+
     def test_several_scenarios_open(self):
         self.open(*sorted(SCENARIOS.glob("*.json")))
         self.xdotool("key", "ctrl+w")
@@ -75,7 +101,7 @@ class WindowTest(WindowCase):
 
 
 if __name__ == "__main__":
-    if not shutil.which("Xvfb") or not shutil.which("xdotool"):
-        print("Xvfb and xdotool are not installed")
+    if not all(shutil.which(tool) for tool in ("Xvfb", "xdotool", "xwd")):
+        print("Xvfb, xdotool and xwd are not installed")
         sys.exit(77)
     unittest.main()

@@ -20,8 +20,9 @@ constexpr double kFirstMetres = 1.5;  ///< a point, where the map is first seen
 constexpr double kPinDown = 0.52;     ///< of the free height
 constexpr double kPinDownLow = 0.6;
 constexpr int kLowMap = 420;
-constexpr double kCircleShare = 0.8;  ///< of the smaller side of what is free
-constexpr double kGlide = 0.5;        ///< seconds
+constexpr double kCircleShare = 0.8;     ///< of the smaller side of what is free
+constexpr double kGlide = 0.5;           ///< seconds
+constexpr double kNearMetres = 40000.0;  ///< across: from farther out a map is said to have streets anywhere
 
 }  // namespace
 
@@ -89,6 +90,7 @@ void FriendMap::build() {
     window_->addSubview(map_);
     window_->setClient(client_);
     coarse_.reset();
+    lacksStreets_ = false;
     if (const auto installed = Platform::installed()) {
         streets_ = installed->notificationCenter->addObserver(kMapStreetsChangedNotification,
                                                               [this](const Notification& told) {
@@ -180,8 +182,22 @@ double FriendMap::firstZoom() const {
     return coarse_ ? std::min(zoom, *coarse_) : zoom;
 }
 
+/// What is seen elsewhere says nothing of the pin's place, and from farther out nobody misses streets.
+void FriendMap::noteStreets() {
+    const MapViewport& shown = camera_.shown();
+    if (!map_->hasStreets() && !isTouched_) {
+        lacksStreets_ = true;
+    } else if (map_->hasStreets() && place_) {
+        const bool isNear = std::min(shown.size.width, shown.size.height) * shown.metresPerPoint() < kNearMetres;
+        const bool isThere = Rect{0.0, 0.0, shown.size.width, shown.size.height}.contains(shown.pointFor(onMap_));
+        lacksStreets_ = lacksStreets_ && !(isNear && isThere);
+    }
+}
+
 /// Where there are no streets, the map is first seen from as far as a town to name is; a hand may go anywhere.
 void FriendMap::streetsChanged() {
+    noteStreets();
+    tell();
     if (map_->hasStreets()) {
         coarse_.reset();
         return;

@@ -2,11 +2,11 @@
 
 #include <QElapsedTimer>
 #include <QTimer>
-#include <deque>
 #include <functional>
 #include <memory>
 #include <optional>
 
+#include "app/window/DragTrail.h"
 #include "app/window/PlainWidget.h"
 #include "app/window/friend/FriendPin.h"
 #include "app/window/friend/MapCamera.h"
@@ -51,8 +51,10 @@ class FriendMap : public PlainWidget {
     bool isTouched() const { return isTouched_; }
     bool isCoarsest() const { return camera_.isCoarsest(); }
     bool isFinest() const { return camera_.isFinest(); }
+    /// There are no streets where the pin is, as was seen when the map last showed it from near enough.
+    bool lacksStreets() const { return place_.has_value() && lacksStreets_; }
     const platform::MapViewport& shown() const { return camera_.shown(); }
-    /// Called when `isTouched`, `isCoarsest` or `isFinest` may have become another.
+    /// Called when `isTouched`, `isCoarsest`, `isFinest` or `lacksStreets` may have become another.
     void setChanged(std::function<void()> changed) { changed_ = std::move(changed); }
 
   protected:
@@ -70,10 +72,6 @@ class FriendMap : public PlainWidget {
 
   private:
     class Client;
-    struct Sample {
-        QPointF at;
-        double time;
-    };
 
     bool touch(QTouchEvent& event);
     void pan(QPointF by);
@@ -90,6 +88,7 @@ class FriendMap : public PlainWidget {
     void updateCircle();
     platform::Point pinPoint() const;
     double firstZoom() const;
+    void noteStreets();
     void streetsChanged();
     double seconds() const { return static_cast<double>(clock_.nsecsElapsed()) * 1e-9; }
 
@@ -106,14 +105,15 @@ class FriendMap : public PlainWidget {
     MapCamera camera_;
     platform::NotificationCenter::Token streets_;
     std::optional<double> coarse_;  ///< the zoom at which a map without streets is first seen
-    bool isPlaced_ = false;         ///< the camera has been brought to the pin
+    bool lacksStreets_ = false;
+    bool isPlaced_ = false;  ///< the camera has been brought to the pin
     bool isTouched_ = false;
     bool isRingShown_ = false;
     QElapsedTimer clock_;
     QTimer frames_;
     QTimer rest_;
     std::optional<QPointF> held_;  ///< where the mouse is
-    std::deque<Sample> samples_;
+    DragTrail trail_;
     QPointF velocity_;  ///< points a second, of a map that runs on
     double flungAt_ = 0.0;
     double steppedAt_ = 0.0;

@@ -15,7 +15,6 @@ constexpr double kArrow = 60.0;  ///< points a key goes
 constexpr double kNotch = 120.0;
 constexpr double kNotchSteps = 0.5;
 constexpr double kPixelSteps = 1.0 / 240.0;
-constexpr double kRecent = 0.1;  ///< seconds of a hand's way that count for how fast it was
 constexpr double kSlowest = 60.0;
 constexpr double kFastest = 4000.0;  ///< points a second
 
@@ -29,19 +28,14 @@ void FriendMap::grab(QPointF at) {
     velocity_ = {};
     camera_.stop();
     frames_.stop();
-    samples_ = {{at, seconds()}};
+    trail_.begin(at, seconds());
 }
 
 /// Lets go: a map that was moving runs on.
 void FriendMap::letFly() {
     const double now = seconds();
-    while (samples_.size() > 1 && now - samples_.front().time > kRecent) {
-        samples_.pop_front();
-    }
-    const double passed = samples_.empty() ? 0.0 : now - samples_.front().time;
-    QPointF speed = passed > 0.0 ? (samples_.back().at - samples_.front().at) / passed : QPointF();
+    const QPointF speed = trail_.release(now);
     const double fast = std::hypot(speed.x(), speed.y());
-    samples_.clear();
     if (isStill_ || fast < kSlowest) {
         rest_.start();
         return;
@@ -68,7 +62,7 @@ void FriendMap::mouseMoveEvent(QMouseEvent* event) {
         const QPointF by = whole(event->position() - *held_);
         if (!by.isNull()) {
             *held_ += by;
-            samples_.push_back({event->position(), seconds()});
+            trail_.move(event->position(), seconds());
             pan(by);
         }
     }
@@ -189,9 +183,9 @@ bool FriendMap::touch(QTouchEvent& event) {
     if (fingers == 2 && span > kNarrow && pinchSpan_ > kNarrow) {
         zoom(std::log2(span / pinchSpan_), at);
         pinchSpan_ = span;
-        samples_ = {{at, seconds()}};
+        trail_.begin(at, seconds());
     } else {
-        samples_.push_back({at, seconds()});
+        trail_.move(at, seconds());
     }
     return true;
 }

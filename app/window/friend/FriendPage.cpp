@@ -41,11 +41,13 @@ QString qt(const std::string& text) {
 
 }  // namespace
 
-FriendPage::FriendPage(host::Host& host, KnownFriends::Known known, Asks asks, Open open)
+FriendPage::FriendPage(host::Host& host, KnownFriends::Known known, Asks asks, Open open,
+                       std::function<void()> getStreets)
     : host_(host),
       known_(std::move(known)),
       isAsked_(asks == Asks::AtOnce),
       open_(std::move(open)),
+      getStreets_(std::move(getStreets)),
       map_(new FriendMap(this)),
       sheet_(new FriendSheet(this)),
       leave_(new MapControls(this)),
@@ -62,7 +64,8 @@ FriendPage::FriendPage(host::Host& host, KnownFriends::Known known, Asks asks, O
         map_->setFocus(Qt::OtherFocusReason);
     });
     again_->hide();
-    map_->setChanged([this] { again_->setVisible(map_->isTouched() && map_->place()); });
+    map_->setChanged([this] { mapChanged(); });
+    sheet_->streets().action().setPressed([this] { getStreets_(); });
     sheet_->row().setChanged([this] { takeNewest(); });
     copied_.setSingleShot(true);
     copied_.setInterval(kCopied);
@@ -130,6 +133,7 @@ void FriendPage::setTexts() {
     further_->setName(text("MAP_FURTHER"));
     map_->setAccessibleName(textWith("MAP_SPOKEN", friendName));
     again_->setWords(textWith("FRIEND_SHOW", friendName));
+    sheet_->streets().setTexts(text("MAP_NO_STREETS"), text("MAP_GET_STREETS"));
     sheet_->setOffer(isAsked_ ? QString() : textWith("FRIEND_WHERE", friendName), [this] {
         isAsked_ = true;
         build();
@@ -152,6 +156,11 @@ bool FriendPage::asksAbout(const std::vector<std::string>& handles) const {
     return isAsked_ && !handles.empty() && std::all_of(handles.begin(), handles.end(), [&](const std::string& handle) {
                return std::find(own.begin(), own.end(), handle) != own.end();
            });
+}
+
+void FriendPage::mapChanged() {
+    again_->setVisible(map_->isTouched() && map_->place());
+    sheet_->setLacksStreets(getStreets_ && map_->lacksStreets());
 }
 
 void FriendPage::takeNewest() {
@@ -188,7 +197,7 @@ void FriendPage::showPlace() {
     if (isThere != sheet_->hasPlace()) {
         sheet_->setHasPlace(isThere);
     }
-    again_->setVisible(map_->isTouched() && map_->place());
+    mapChanged();
     place();
 }
 

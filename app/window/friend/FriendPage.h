@@ -27,8 +27,9 @@ class FriendPage : public Page {
     /// Opens a link that this page has made; with the key of the words for when nobody opens it.
     using Open = std::function<void(const std::string& url, const char* nobody)>;
 
-    /// The host outlives the page.
-    FriendPage(host::Host& host, host::KnownFriends::Known known, Asks asks, Open open);
+    /// The host outlives the page. `getStreets` leads to where a map is added; empty: nothing is said of streets.
+    FriendPage(host::Host& host, host::KnownFriends::Known known, Asks asks, Open open,
+               std::function<void()> getStreets);
     ~FriendPage() override;
 
     QString name() const override;
@@ -54,6 +55,7 @@ class FriendPage : public Page {
     void ask();
     void build();
     void setTexts();
+    void mapChanged();
     void takeNewest();
     void showPlace();
     void chooseActions();
@@ -69,6 +71,7 @@ class FriendPage : public Page {
     host::KnownFriends::Known known_;
     bool isAsked_;
     const Open open_;
+    const std::function<void()> getStreets_;
     FriendMap* map_;
     FriendSheet* sheet_;
     MapControls* leave_;

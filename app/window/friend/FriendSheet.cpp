@@ -17,6 +17,7 @@ constexpr int kInset = 15;
 constexpr int kLinesUp = 2;  ///< into the row's lower margin
 constexpr int kGap = 16;
 constexpr int kActionsIn = 7;
+constexpr int kBelowStreets = 4;
 constexpr int kRingRoom = 5;  ///< that actions have above and below themselves
 
 }  // namespace
@@ -29,13 +30,15 @@ FriendSheet::FriendSheet(QWidget* parent)
       person_(new ListRow(ListRow::Kind::Plain, {}, content_)),
       where_(new Words(BlockStyle::Subheadline, Words::Tone::Ink, content_)),
       howExactly_(new Words(BlockStyle::Subheadline, Words::Tone::Ink, content_)),
-      offer_(new Button(Button::Kind::Quiet, {}, Icon::None, content_)) {
+      offer_(new Button(Button::Kind::Quiet, {}, Icon::None, content_)),
+      streets_(new StreetsRow(content_)) {
     area_->setWidget(content_);
     content_->setAutoFillBackground(false);
     content_->installEventFilter(this);
     QScroller::grabGesture(area_->viewport(), QScroller::TouchGesture);
     offer_->setWide(true);
     offer_->hide();
+    streets_->hide();
     setHasPlace(false);
 }
 
@@ -91,6 +94,7 @@ void FriendSheet::setActions(const std::vector<Action>& actions) {
         actions_.push_back(action);
     }
     setTabOrder(before, offer_);
+    setTabOrder(offer_, &streets_->action());
     place();
     askForRoom();
 }
@@ -101,6 +105,14 @@ void FriendSheet::setOffer(const QString& words, std::function<void()> done) {
     offer_->setVisible(!words.isEmpty());
     place();
     askForRoom();
+}
+
+void FriendSheet::setLacksStreets(bool lacks) {
+    if (lacks == streets_->isHidden()) {
+        streets_->setVisible(lacks);
+        place();
+        askForRoom();
+    }
 }
 
 int FriendSheet::layOut(int width, bool places) const {
@@ -128,6 +140,10 @@ int FriendSheet::layOut(int width, bool places) const {
     if (!offer_->isHidden()) {
         y += actions_.empty() ? 0 : kGap - kRingRoom;
         put(*offer_, kInset, std::max(width - 2 * kInset, 1));
+    }
+    if (!streets_->isHidden()) {
+        put(*streets_, 0, width);
+        return y + kBelowStreets;
     }
     return y + kInset - (offer_->isHidden() && !actions_.empty() ? kRingRoom : 0);
 }

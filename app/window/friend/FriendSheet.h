@@ -10,6 +10,7 @@
 #include "app/window/blocks/Words.h"
 #include "app/window/friend/FriendRow.h"
 #include "app/window/friend/RoundAction.h"
+#include "app/window/friend/StreetsRow.h"
 
 namespace ktr::app {
 
@@ -38,6 +39,10 @@ class FriendSheet : public Block {
     RoundAction* action(std::size_t index) const { return index < actions_.size() ? actions_[index] : nullptr; }
     /// A button below; without words there is none.
     void setOffer(const QString& words, std::function<void()> done);
+
+    /// Below all else, that the map has no streets and what gets some; hidden at first.
+    StreetsRow& streets() const { return *streets_; }
+    void setLacksStreets(bool lacks);
 
     int shapeHeight(int width) const override;
     QAccessible::Role role() const override { return QAccessible::Grouping; }
@@ -70,6 +75,7 @@ class FriendSheet : public Block {
     Words* howExactly_;
     std::vector<RoundAction*> actions_;
     Button* offer_;
+    StreetsRow* streets_;
     bool hasPlace_ = false;
 };
 

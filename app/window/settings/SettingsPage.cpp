@@ -126,6 +126,10 @@ QString SettingsPage::name() const {
     return text("SETTINGS");
 }
 
+QWidget* SettingsPage::firstFocus() const {
+    return window_.beginsAtMaps ? addMap_ : ColumnPage::firstFocus();
+}
+
 void SettingsPage::refreshed() {
     if (!desk_.isBusy()) {
         shown_ = host_.live()->configuration();
@@ -326,6 +330,7 @@ void SettingsPage::showMaps(const std::vector<AddedMaps::Map>& maps) {
     };
     if (addMap_ == nullptr || !std::equal(maps.begin(), maps.end(), listed_.begin(), listed_.end(), isSame)) {
         listed_ = maps;
+        const bool hadFocus = addMap_ != nullptr && addMap_->hasFocus();
         maps_->clear();
         for (const AddedMaps::Map& map : listed_) {
             auto* row = new ListRow(ListRow::Kind::Leads, QString::fromStdString(map.name));
@@ -335,6 +340,9 @@ void SettingsPage::showMaps(const std::vector<AddedMaps::Map>& maps) {
         world_ = new ListRow(ListRow::Kind::Plain);
         maps_->add(world_);
         addMap_ = addRow(maps_, ListRow::Kind::Adds, [this] { chooseMap(); });
+        if (hadFocus) {
+            addMap_->setFocus(Qt::OtherFocusReason);
+        }
     }
     for (std::size_t i = 0; i < listed_.size(); ++i) {
         static_cast<ListRow*>(maps_->rows()[i])->setSecond(sizeOf(listed_[i]));

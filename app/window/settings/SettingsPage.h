@@ -32,12 +32,14 @@ class SettingsPage : public ColumnPage {
         /// Sets it in this window at once.
         std::function<void(platform::ContentSizeCategory)> setTextSize;
         bool isTextSizeHeld = false;  ///< the command line has said it
+        bool beginsAtMaps = false;    ///< where a map is added
     };
 
     /// The host outlives the page.
     SettingsPage(host::Host& host, SharingRow::Wish wish, Window window);
 
     QString name() const override;
+    QWidget* firstFocus() const override;
 
     AccountRow& account() const { return *account_; }
     SharingRow& sharing() const { return *sharing_; }

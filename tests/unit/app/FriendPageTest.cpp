@@ -233,6 +233,22 @@ TEST_F(FriendPageTest, NothingElseIsOpened_AndThatIsSaid) {
     EXPECT_EQ(window->notice().sentence(), QStringLiteral("This link isn’t opened here."));
 }
 
+TEST_F(FriendPageTest, APlaceThatAPluginOpensInMaps_GoesTheWayOfItsLinks_AlsoOnceThePlatformIsAnother) {
+    open({"dinner"});
+    const auto refused = QStringLiteral("This link isn’t opened here.");
+    ASSERT_NE(host->platform()->mapsApplication, nullptr);
+    EXPECT_FALSE(host->platform()->mapsApplication->open({{50.2104, -3.12}, "Ann"}));
+    EXPECT_EQ(window->notice().sentence(), refused);
+    host::HostSettings settings = host->settings();
+    settings.language = "de";
+    ASSERT_FALSE(host->remake(settings));
+    ASSERT_NE(host->platform()->mapsApplication, nullptr);
+    EXPECT_FALSE(host->platform()->mapsApplication->open({{50.2104, -3.12}, "Ann"}));
+    EXPECT_NE(window->notice().sentence(), refused) << "the same in German";
+    settle();
+    EXPECT_TRUE(opened().empty());
+}
+
 TEST_F(FriendPageTest, ALinkFromOutside_ShowsAContactAndAsksOnlyOnATap) {
     open({"dinner"});
     window->open("wayloc://friend/ann@harbour.example", LinkPolicy::From::Outside);

@@ -5,7 +5,11 @@
 #include <QApplication>
 #include <QDeadlineTimer>
 #include <QDir>
+#include <QDragEnterEvent>
+#include <QDropEvent>
 #include <QImage>
+#include <QMimeData>
+#include <QUrl>
 #include <filesystem>
 #include <fstream>
 #include <memory>
@@ -213,6 +217,29 @@ TEST_F(SettingsPageTest, Maps_AreAddedListedAndRemoved_AndWhatIsNoneIsSaid) {
     map->remove().press();
     EXPECT_TRUE(eventually([&] { return page() != nullptr && maps() == 2; }));
     EXPECT_TRUE(std::filesystem::exists(town)) << "the file itself stays";
+}
+
+TEST_F(SettingsPageTest, AMapThatIsDropped_IsAdded_AndWhatIsNoFileIsNotTaken) {
+    open();
+    const auto drop = [this](const QUrl& url) {
+        QMimeData carried;
+        carried.setUrls({url});
+        QDragEnterEvent enters({200, 200}, Qt::CopyAction, &carried, Qt::LeftButton, Qt::NoModifier);
+        enters.setAccepted(false);
+        QApplication::sendEvent(page(), &enters);
+        if (enters.isAccepted()) {
+            QDropEvent falls({200.0, 200.0}, Qt::CopyAction, &carried, Qt::LeftButton, Qt::NoModifier);
+            QApplication::sendEvent(page(), &falls);
+        }
+        return enters.isAccepted();
+    };
+    EXPECT_FALSE(drop(QUrl(QStringLiteral("https://maps.example/town.mbtiles"))));
+    EXPECT_TRUE(drop(QUrl::fromLocalFile(QString::fromStdString(folder.path().string()))));
+    EXPECT_TRUE(eventually(
+        [this] { return window->notice().sentence() == QStringLiteral("This file isn’t a map that can be drawn."); }));
+    const auto town = host::resourceFolder() / "maps" / "brinmouth.mbtiles";
+    EXPECT_TRUE(drop(QUrl::fromLocalFile(QString::fromStdString(town.string()))));
+    EXPECT_TRUE(eventually([this] { return page()->maps().rows().size() == 3; }));
 }
 
 TEST_F(SettingsPageTest, CheckUp_TellsWhatIsWrong_EachOnceWithItsButton) {

@@ -306,6 +306,29 @@ TEST_F(PlatformMapViewTest, BeyondTheStreets_ARegionIsShownFromFartherOut_AndIsT
     EXPECT_EQ(told, 2);
 }
 
+TEST_F(PlatformMapViewTest, WhereThereIsNoPlaceAnyMore_NobodyMissesStreets) {
+    int told = 0;
+    const auto observer = platform->notificationCenter->addObserver(
+        kMapStreetsChangedNotification, [&](const Notification& one) { told += one.sender == map_ ? 1 : 0; });
+    const auto ann = std::make_shared<Pin>();
+    map_->addAnnotation(ann);
+    map_->setRegion(kTown, false);
+    maps_->coarseZoom = 9.0;
+    time->runPosted();
+    maps_->answer();
+    time->runUntilIdle(1.0);
+    ASSERT_FALSE(map_->hasStreets());
+    ASSERT_EQ(told, 1);
+    map_->removeAnnotation(ann);
+    time->runUntilIdle(1.0);
+    EXPECT_TRUE(map_->hasStreets());
+    EXPECT_EQ(told, 2) << "whoever offers streets hears of it";
+    map_->addAnnotation(ann);
+    time->runUntilIdle(1.0);
+    EXPECT_FALSE(map_->hasStreets());
+    EXPECT_EQ(told, 3);
+}
+
 TEST_F(PlatformMapViewTest, BeyondTheStreets_AHandsMapStaysAndIsTold) {
     maps_->coarseZoom = 9.0;
     map_->showAt({50.21, -3.12}, 15.0, PlatformMapView::Hand::Moving);

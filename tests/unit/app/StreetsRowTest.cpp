@@ -1,0 +1,240 @@
+// Where a map has no streets: the line under the card and on the friend's page of a live window, and where it leads.
+// KTR_GALLERY names a folder for pictures.
+#include "app/window/friend/StreetsRow.h"
+
+#include <QApplication>
+#include <QBuffer>
+#include <QDeadlineTimer>
+#include <QImage>
+#include <QKeyEvent>
+#include <algorithm>
+#include <cmath>
+#include <filesystem>
+#include <fstream>
+#include <memory>
+#include <numbers>
+
+#include "app/AddedMaps.h"
+#include "app/window/ConversationWindow.h"
+#include "app/window/friend/FriendPage.h"
+#include "app/window/settings/SettingsPage.h"
+#include "host/scenario/ScenarioReader.h"
+#include "linux/configuration/ConfigurationReader.h"
+#include "tests/support/EnvironmentVariable.h"
+#include "tests/support/TemporaryFolder.h"
+#include "tests/support/maps/MbtilesWriter.h"
+#include "tests/unit/app/TestHost.h"
+
+#include <gtest/gtest.h>
+
+namespace ktr::app {
+
+namespace {
+
+/// East of Berlin, where no map that comes along has streets.
+constexpr double kLatitude = 52.42;
+constexpr double kLongitude = 13.95;
+constexpr QRgb kMagenta = qRgb(255, 0, 255);
+
+constexpr const char* kAnn =
+    R"({"question": "Where is Ann?", "sentence": "Ann is near Berlin, 23 kilometres away.", "clock": "2026-05-16T17:44:00+01:00",
+    "snippet": {"kind": "VAKtrLocationSnippet", "searchContext": "ktrServerContext://serverContext?clientId=demo&",
+    "locations": [{"friend": {"data": "ann@harbour.example", "object": {"fullName": "Ann Marsh", "firstName": "Ann",
+     "emails": [{"emailAddress": "ann@harbour.example"}]}}, "latitude": 52.42, "longitude": 13.95, "accuracy": 30,
+     "ageSeconds": 300, "city": "Grünheide"}]}})";
+
+class StreetsRowTest : public ::testing::Test {
+  protected:
+    StreetsRowTest()
+        : data("XDG_DATA_HOME", (folder.path() / "data").c_str()),
+          state("XDG_STATE_HOME", (folder.path() / "state").c_str()) {}
+
+    void open(QSize size = {400, 780}, const std::string& members = "") {
+        TearDown();
+        const auto file = folder.path() / "config.json";
+        std::ofstream(file) << R"({"account": {"personId": "1000", "host": "127.0.0.1:9"}, "addressBooks": false,)"
+                            << R"( "positions": {"source": "none"})" << members << "}";
+        const auto read = linux_::ConfigurationReader::readFile(file);
+        auto settings =
+            std::get<host::HostSettings>(host::HostSettings::decide({}, {}, {}, std::get<linux_::Configuration>(read)));
+        settings.liveConfiguration = file;
+        auto made = host::Host::make(settings, host::Host::Time::Running, KTR_PLUGIN_FILE);
+        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made)) << std::get<host::Failure>(made).line;
+        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
+        bool isReady = false;
+        host->live()->start([&isReady] { isReady = true; });
+        ASSERT_TRUE(eventually([&isReady] { return isReady; }));
+        window = std::make_unique<ConversationWindow>(*host);
+        window->openLinks(desktop);
+        window->pages().setMotion(host::MotionStyle::None);
+        // Nobody has signed in, which is another test's matter.
+        window->pages().closeAll();
+        window->resize(size);
+        window->show();
+        const auto ann = host::ScenarioReader({0.0}, host::ScenarioReader::Clock::Present).readText(kAnn, "test");
+        ASSERT_TRUE(std::holds_alternative<host::Scenario>(ann)) << std::get<host::Failure>(ann).line;
+        ASSERT_FALSE(host->addTurn(std::get<host::Scenario>(ann)));
+        window->conversation().turnsChanged();
+    }
+    void TearDown() override {
+        window.reset();
+        host.reset();
+    }
+    static bool eventually(const std::function<bool()>& condition) {
+        const QDeadlineTimer deadline(20000);
+        while (!condition() && !deadline.hasExpired()) {
+            QApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents, 20);
+        }
+        return condition();
+    }
+    std::shared_ptr<host::StreetsLine> line() const { return host->conversation()->turns().back()->streets(); }
+    bool isOffered() const { return line() && !line()->hidden(); }
+    FriendPage* friendPage() const { return dynamic_cast<FriendPage*>(window->pages().current()); }
+    SettingsPage* settingsPage() const { return dynamic_cast<SettingsPage*>(window->pages().current()); }
+    void key(int code) const {
+        QKeyEvent event(QEvent::KeyPress, code, Qt::NoModifier);
+        QApplication::sendEvent(&window->conversation(), &event);
+    }
+    /// A file with a map around Ann, all of one colour.
+    std::filesystem::path region() {
+        const auto path = folder.path() / "region.mbtiles";
+        QImage tile(256, 256, QImage::Format_RGB32);
+        tile.fill(kMagenta);
+        QByteArray png;
+        QBuffer buffer(&png);
+        buffer.open(QIODevice::WriteOnly);
+        tile.save(&buffer, "PNG");
+        test::MbtilesWriter writer(path.string());
+        writer.makeTables();
+        writer.putMetadata("format", "png");
+        for (int level = 9; level <= 14; ++level) {
+            const int count = 1 << level;
+            const double latitude = kLatitude * std::numbers::pi / 180.0;
+            const int x = static_cast<int>((kLongitude / 360.0 + 0.5) * count);
+            const int y = static_cast<int>((0.5 - std::asinh(std::tan(latitude)) / (2.0 * std::numbers::pi)) * count);
+            for (int dx = -3; dx <= 3; ++dx) {
+                for (int dy = -3; dy <= 3; ++dy) {
+                    writer.putTile({level, x + dx, y + dy}, png.toStdString());
+                }
+            }
+        }
+        return path;
+    }
+    /// How many pixels of what a widget shows are of the added map.
+    static int pixelsOfTheMap(QWidget& widget) {
+        const QImage picture = widget.grab().toImage().convertToFormat(QImage::Format_RGB32);
+        int count = 0;
+        for (int y = 0; y < picture.height(); ++y) {
+            const auto* row = reinterpret_cast<const QRgb*>(picture.constScanLine(y));
+            count += static_cast<int>(std::count(row, row + picture.width(), kMagenta));
+        }
+        return count;
+    }
+
+    test::TemporaryFolder folder;
+    test::EnvironmentVariable data;
+    test::EnvironmentVariable state;
+    linux_::DesktopOpener desktop{QString(), [](const std::string&) { return false; }};
+    std::unique_ptr<host::Host> host;
+    std::unique_ptr<ConversationWindow> window;
+};
+
+}  // namespace
+
+TEST_F(StreetsRowTest, UnderACard_AKeyLeadsToWhereAMapIsAdded_AndTheMapTakesTheLineAway) {
+    open();
+    ASSERT_TRUE(eventually([this] { return isOffered(); }));
+    keepPicture(*window, "streets-line");
+    EXPECT_EQ(pixelsOfTheMap(*window), 0);
+    auto& rows = window->conversation();
+    EXPECT_TRUE(rows.focusRow(line()->action().get()));
+    keepPicture(*window, "streets-line-focus");
+    key(Qt::Key_Return);
+    ASSERT_NE(settingsPage(), nullptr);
+    auto* const adds = dynamic_cast<ListRow*>(settingsPage()->maps().rows().back());
+    ASSERT_NE(adds, nullptr);
+    QApplication::processEvents();
+    EXPECT_TRUE(adds->hasFocus()) << "where a map is added";
+    EXPECT_TRUE(adds->visibleRegion().contains(adds->rect().center())) << "and it is seen";
+    keepPicture(*window, "streets-settings");
+    settingsPage()->addMap(QString::fromStdString(region().string()));
+    ASSERT_TRUE(eventually([this] { return settingsPage()->maps().rows().size() == 3; }));
+    window->pages().back();
+    EXPECT_TRUE(eventually([this] { return !isOffered() && pixelsOfTheMap(*window) > 10000; }));
+    keepPicture(*window, "streets-line-gone");
+}
+
+TEST_F(StreetsRowTest, OnAFriendsPage_TheSameIsOffered_AndTheWayBackLeadsThere) {
+    open();
+    host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+    ASSERT_NE(friendPage(), nullptr);
+    auto& sheet = friendPage()->sheet();
+    ASSERT_TRUE(eventually([&] { return sheet.streets().isVisible(); }));
+    const FriendPage* const page = friendPage();
+    keepPicture(*window, "streets-row");
+    EXPECT_EQ(sheet.streets().action().words(), QStringLiteral("Get streets"));
+    EXPECT_GE(sheet.streets().action().shape().height(), 44);
+    EXPECT_LE(sheet.streets().geometry().bottom(), sheet.height());
+    sheet.streets().action().press();
+    ASSERT_NE(settingsPage(), nullptr);
+    window->pages().back();
+    ASSERT_EQ(friendPage(), page);
+    ASSERT_FALSE(std::holds_alternative<AddedMaps::Problem>(AddedMaps::add(region())));
+    EXPECT_TRUE(eventually([&] { return !sheet.streets().isVisible() && pixelsOfTheMap(*window) > 10000; }));
+    keepPicture(*window, "streets-row-gone");
+}
+
+TEST_F(StreetsRowTest, OnAFriendsPage_LookingElsewhereChangesNothingOfWhatIsSaidOfThePlace) {
+    open();
+    host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+    auto& sheet = friendPage()->sheet();
+    ASSERT_TRUE(eventually([&] { return sheet.streets().isVisible(); }));
+    // So far out that nobody misses streets.
+    for (int i = 0; i < 12; ++i) {
+        friendPage()->map().step(false);
+    }
+    ASSERT_TRUE(eventually([&] { return friendPage()->map().isCoarsest(); }));
+    const QDeadlineTimer drawn(1000);
+    eventually([&] { return drawn.hasExpired(); });
+    EXPECT_TRUE(sheet.streets().isVisible());
+}
+
+TEST_F(StreetsRowTest, EveryShapeAndLanguage_CutsNothing) {
+    struct Case {
+        QSize size;
+        const char* name;
+        const char* members;
+    };
+    for (const Case& one :
+         {Case{{320, 640}, "de-320", R"(, "language": "de")"}, Case{{400, 700}, "ar", R"(, "language": "ar")"},
+          Case{{320, 640}, "ja-dark", R"(, "language": "ja", "colors": "dark")"},
+          Case{{320, 780}, "ax3", R"(, "language": "en-GB", "textSize": "AX3")"},
+          Case{{900, 420}, "low-wide", R"(, "language": "en-GB")"},
+          Case{{1600, 900}, "wide-dark", R"(, "language": "de", "colors": "dark")"},
+          Case{{400, 700}, "contrast", R"(, "language": "en-GB", "colors": "high-contrast")"}}) {
+        open(one.size, one.members);
+        ASSERT_TRUE(eventually([this] { return isOffered(); })) << one.name;
+        keepPicture(*window, std::string("streets-line-") + one.name);
+        const auto words = line()->subviews().front()->frameInRoot();
+        const auto action = line()->action()->frameInRoot();
+        const auto whole = line()->frameInRoot();
+        for (const auto& part : {words, action}) {
+            EXPECT_GE(part.x, whole.x) << one.name;
+            EXPECT_LE(part.maxX(), whole.maxX()) << one.name;
+            EXPECT_GE(part.y, whole.y) << one.name;
+            EXPECT_LE(part.maxY(), whole.maxY()) << one.name;
+        }
+        EXPECT_FALSE(words.intersects(action)) << one.name;
+        host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+        ASSERT_NE(friendPage(), nullptr);
+        auto& streets = friendPage()->sheet().streets();
+        ASSERT_TRUE(eventually([&] { return !streets.isHidden(); })) << one.name;
+        QApplication::processEvents();
+        const auto shapeOf = [](const Block& block) { return block.shape().translated(block.pos()); };
+        EXPECT_FALSE(shapeOf(*streets.findChild<Words*>()).intersects(shapeOf(streets.action()))) << one.name;
+        EXPECT_TRUE(streets.rect().contains(streets.action().geometry())) << one.name;
+        keepPicture(*window, std::string("streets-row-") + one.name);
+    }
+}
+
+}  // namespace ktr::app
