@@ -39,6 +39,31 @@ void FolderGround::list() {
     files_ = std::move(files);
 }
 
+void FolderGround::setChangeHandler(std::function<void()> changed) {
+    changed_ = std::move(changed);
+    watch_ = std::make_unique<FileWatch>([this] { follow(); });
+    follow();
+}
+
+/// The folder may come later, and so may those that it stands in.
+void FolderGround::follow() {
+    const auto above = folder_.parent_path();
+    watch_->watch({folder_ / "maps", folder_, above, above.parent_path()}, [this](bool) { look(); });
+}
+
+/// What else changes beside the folder draws nothing anew.
+void FolderGround::look() {
+    aside_.run([this, folder = folder_]() -> Aside::Then {
+        return [this, files = filesIn(folder)] {
+            const bool isOther = told_ && *told_ != files;
+            told_ = files;
+            if (isOther && changed_) {
+                changed_();
+            }
+        };
+    });
+}
+
 MapDrawn FolderGround::draw(const MapDrawing& drawing) {
     list();
     MapDrawn all;

@@ -1,11 +1,15 @@
 #pragma once
 
+#include <QObject>
 #include <filesystem>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
 #include <vector>
 
+#include "linux/device/Aside.h"
+#include "linux/device/FileWatch.h"
 #include "linux/maps/MapGround.h"
 
 namespace ktr::linux_ {
@@ -21,6 +25,8 @@ class FolderGround final : public MapGround {
     /// The maps in a folder, in the order in which they are drawn. It looks at the disk.
     static std::vector<std::filesystem::path> filesIn(const std::filesystem::path& folder);
     MapDrawn draw(const MapDrawing& drawing) override;
+    /// Tells when maps come into the folder, or go.
+    void setChangeHandler(std::function<void()> changed) override;
 
   private:
     struct File {
@@ -29,9 +35,17 @@ class FolderGround final : public MapGround {
         std::vector<std::shared_ptr<MapGround>> grounds;
     };
     void list();
+    void follow();
+    void look();
 
     const std::filesystem::path folder_;
     std::vector<File> files_;
+    // On the main thread
+    std::function<void()> changed_;
+    std::optional<std::vector<std::filesystem::path>> told_;  ///< what was there last
+    std::unique_ptr<FileWatch> watch_;
+    QObject owner_;
+    Aside aside_{owner_};
 };
 
 }  // namespace ktr::linux_

@@ -24,7 +24,8 @@ def write_region(path):
         database.execute("CREATE TABLE metadata (name TEXT, value TEXT)")
         database.execute("CREATE TABLE tiles (zoom_level INTEGER, tile_column INTEGER, tile_row INTEGER, tile_data BLOB)")
         database.execute("CREATE UNIQUE INDEX tile_index ON tiles (zoom_level, tile_column, tile_row)")
-        database.executemany("INSERT INTO metadata VALUES (?, ?)", [("format", "png"), ("minzoom", "9"), ("maxzoom", "14")])
+        database.executemany("INSERT INTO metadata VALUES (?, ?)", [("format", "png"), ("minzoom", "9"), ("maxzoom", "14"),
+                                                                      ("bounds", "13.45,52.22,14.45,52.62")])
         for level in range(9, 15):
             count = 2 ** level
             x = int((PLACE[1] / 360 + 0.5) * count)

@@ -173,8 +173,10 @@ class TasksTest(live_window_test.LiveWindowTest):
         self.await_seen("No streets for this region here yet.")
         self.assertIsNone(drawn())
         self.click_on("Get streets", "link")
-        self.click_on("Add a region", "push button")
-        dialog = wait_for("the dialog", lambda: self.xdotool("search", "--onlyvisible", "--name", "^Add a region$", check=False))
+        # It has the focus.
+        self.await_seen("Add a region", "push button")
+        self.key("Return")
+        dialog = wait_for("the dialog", lambda: self.xdotool("search", "--onlyvisible", "--name", "^Add a region", check=False))
         self.xdotool("windowfocus", "--sync", dialog.split()[0])
         self.type(region)
         self.key("Return")

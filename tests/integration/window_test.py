@@ -92,7 +92,7 @@ class WindowTest(WindowCase):
         wait_for("the configured map", drawn)
         self.xdotool("key", "ctrl+q")
         self.assertEqual(self.program.wait(timeout=30), 0)
-        self.assertRegex(self.program.stderr.read(), r'^warning: the map ".*gone\.mbtiles" is not there.*\n$')
+        self.assertIn('gone.mbtiles" is not there', self.program.stderr.read())
 
     def test_several_scenarios_open(self):
         self.open(*sorted(SCENARIOS.glob("*.json")))

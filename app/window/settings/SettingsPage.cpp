@@ -6,6 +6,7 @@
 #include <QFileDialog>
 #include <QLocale>
 #include <QMimeData>
+#include <QTimer>
 #include <QUrl>
 #include <algorithm>
 #include <array>
@@ -62,7 +63,10 @@ SettingsPage::SettingsPage(host::Host& host, SharingRow::Wish wish, Window windo
 
     auto* sharing = addSection("SETTINGS_SHARING");
     sharing->add(sharing_);
-    sharing_->setHeard([this] { whoSees_->setVisible(sharing_->isKnown()); });
+    sharing_->setHeard([this] {
+        whoSees_->setVisible(sharing_->isKnown());
+        keepMapsSeen();
+    });
     whoSees_ = addRow(sharing, ListRow::Kind::Leads, [this] {
         if (const auto& who = shown_.account; who && who->host) {
             window_.openLink("https://" + *who->host + "/me");
@@ -128,6 +132,15 @@ QString SettingsPage::name() const {
 
 QWidget* SettingsPage::firstFocus() const {
     return window_.beginsAtMaps ? addMap_ : ColumnPage::firstFocus();
+}
+
+void SettingsPage::keepMapsSeen() {
+    // Once everything has its new place.
+    QTimer::singleShot(0, this, [this] {
+        if (addMap_->hasFocus()) {
+            reveal(*maps_);
+        }
+    });
 }
 
 void SettingsPage::refreshed() {
@@ -342,6 +355,7 @@ void SettingsPage::showMaps(const std::vector<AddedMaps::Map>& maps) {
         addMap_ = addRow(maps_, ListRow::Kind::Adds, [this] { chooseMap(); });
         if (hadFocus) {
             addMap_->setFocus(Qt::OtherFocusReason);
+            keepMapsSeen();
         }
     }
     for (std::size_t i = 0; i < listed_.size(); ++i) {

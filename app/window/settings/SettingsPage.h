@@ -84,6 +84,8 @@ class SettingsPage : public ColumnPage {
     void chooseDistances();
     void chooseLanguage();
     void signOut();
+    /// What appears above pushes a map that is being added out of sight.
+    void keepMapsSeen();
     void listMaps();
     void showMaps(const std::vector<AddedMaps::Map>& maps);
     void showMap(const AddedMaps::Map& map);

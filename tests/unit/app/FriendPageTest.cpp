@@ -15,6 +15,7 @@
 #include "app/window/ConversationWindow.h"
 #include "app/window/friend/FriendsPage.h"
 #include "app/window/friend/SelfPage.h"
+#include "platform/map/MapsApplication.h"
 #include "platform/map/Mercator.h"
 #include "tests/unit/app/TestHost.h"
 
@@ -30,9 +31,9 @@ using host::LinkPolicy;
 class FriendPageTest : public ::testing::Test {
   public:
     void open(const std::vector<std::string>& names, const std::string& language = "en-GB", int width = 400,
-              int height = 700) {
+              int height = 700, bool isDark = false) {
         host::HostOptions options;
-        options.dark = false;
+        options.dark = isDark;
         options.language = language;
         host = testHost(options, demoScenarios(names), host::Host::Time::Running);
         ASSERT_TRUE(host);
@@ -180,6 +181,51 @@ TEST_F(FriendPageTest, MouseWheelKeysAndButtonsMoveTheMap_AndShowBringsItBack) {
     EXPECT_FALSE(page()->showAgain().isVisible());
 }
 
+/// What a frame costs, without a clock: one painting of the map, and nothing laid out, asked or said.
+TEST_F(FriendPageTest, ADraggedAndAZoomedFrame_PaintsTheMapOnce_AndLaysNothingOut) {
+    open({"single"});
+    host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+    ASSERT_TRUE(eventually([&] { return page()->sheet().row().controller()->view() != nullptr; }));
+    FriendMap& map = page()->map();
+    class Counts : public QObject {
+      public:
+        bool eventFilter(QObject* object, QEvent* event) override {
+            paintings += object == map && event->type() == QEvent::Paint ? 1 : 0;
+            const bool isLayout = event->type() == QEvent::LayoutRequest || event->type() == QEvent::Resize ||
+                                  event->type() == QEvent::Move;
+            layouts += isLayout ? 1 : 0;
+            return false;
+        }
+        QObject* map = nullptr;
+        int paintings = 0;
+        int layouts = 0;
+    } counts;
+    counts.map = &map;
+    mouse(QEvent::MouseButtonPress, {150.0, 150.0});
+    // With the first frame the way back to the pin appears.
+    mouse(QEvent::MouseMove, {152.0, 150.0});
+    settle();
+    qApp->installEventFilter(&counts);
+    constexpr int kFrames = 30;
+    for (int frame = 1; frame <= kFrames; ++frame) {
+        const int before = counts.paintings;
+        mouse(QEvent::MouseMove, {152.0 + 3.0 * frame, 150.0 + frame});
+        ASSERT_TRUE(eventually([&] { return counts.paintings > before; })) << frame;
+    }
+    for (int frame = 0; frame < kFrames; ++frame) {
+        const int before = counts.paintings;
+        const QPointF at(120.0, 90.0);
+        QWheelEvent wheel(at, map.mapToGlobal(at), {}, {0, frame % 20 < 10 ? 20 : -20}, Qt::NoButton, Qt::NoModifier,
+                          Qt::NoScrollPhase, false);
+        QApplication::sendEvent(&map, &wheel);
+        ASSERT_TRUE(eventually([&] { return counts.paintings > before; })) << frame;
+    }
+    qApp->removeEventFilter(&counts);
+    // A picture that comes from the workers meanwhile is a painting of its own: far fewer than frames.
+    EXPECT_LE(counts.paintings, 2 * kFrames + kFrames / 2);
+    EXPECT_EQ(counts.layouts, 0);
+}
+
 TEST_F(FriendPageTest, TwoFingersMakeTheMapLarger_AroundWhereTheyAre) {
     open({"single"});
     host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
@@ -298,37 +344,41 @@ TEST_F(FriendPageTest, AnotherPlatformTakesThePlaceOfThisOne_AndThePageGoesOn) {
     ASSERT_FALSE(host->remake(settings));
 }
 
-/// The picture of the page, for who looks at it: KTR_PICTURES names a folder.
+/// Some of each; all of them, with a picture of each, where KTR_GALLERY names a folder.
 TEST_F(FriendPageTest, EveryShape_HasEverythingInPlace) {
-    struct Shape {
-        int width, height;
-        const char* language;
-    };
-    for (const Shape& shape :
-         {Shape{320, 640, "en-GB"}, Shape{400, 800, "de"}, Shape{400, 300, "en-GB"}, Shape{844, 390, "ar"},
-          Shape{900, 700, "ja"}, Shape{1600, 900, "en-GB"}, Shape{320, 200, "de"}}) {
-        open({"single"}, shape.language, shape.width, shape.height);
+    const QSize shapes[] = {{320, 200}, {320, 640}, {400, 300}, {400, 800},
+                            {844, 390}, {900, 200}, {900, 700}, {1600, 900}};
+    const char* const languages[] = {"en-GB", "de", "ar", "ja"};
+    const bool isGallery = qEnvironmentVariableIsSet("KTR_GALLERY");
+    for (std::size_t i = 0; i < std::size(shapes) * std::size(languages) * 2; ++i) {
+        const std::size_t shape = i / 8;
+        const std::size_t language = i / 2 % 4;
+        const bool isDark = i % 2 == 1;
+        if (!isGallery && (language != shape % 4 || isDark != (shape % 3 == 0))) {
+            continue;
+        }
+        const QSize size = shapes[shape];
+        const std::string name = std::string("friend-") + languages[language] + "-" + std::to_string(size.width()) +
+                                 "x" + std::to_string(size.height()) + (isDark ? "-dark" : "");
+        open({"single"}, languages[language], size.width(), size.height(), isDark);
         host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
         ASSERT_NE(page(), nullptr);
         ASSERT_TRUE(eventually([&] { return page()->sheet().row().controller()->view() != nullptr; }));
         const QRect sheet = page()->sheet().geometry();
         const QRect whole = page()->rect();
-        EXPECT_TRUE(whole.contains(sheet)) << shape.width << "x" << shape.height;
+        EXPECT_TRUE(whole.contains(sheet)) << name;
         EXPECT_TRUE(whole.contains(page()->back().parentWidget()->geometry()));
-        EXPECT_FALSE(sheet.intersects(page()->back().parentWidget()->geometry())) << shape.width << "x" << shape.height;
+        EXPECT_FALSE(sheet.intersects(page()->back().parentWidget()->geometry())) << name;
         if (page()->zoom().isVisible()) {
-            EXPECT_FALSE(sheet.intersects(page()->zoom().geometry())) << shape.width << "x" << shape.height;
+            EXPECT_FALSE(sheet.intersects(page()->zoom().geometry())) << name;
             EXPECT_TRUE(whole.contains(page()->zoom().geometry()));
         }
-        if (const QByteArray folder = qgetenv("KTR_PICTURES"); !folder.isEmpty()) {
-            const QDeadlineTimer drawn(1500);
+        if (isGallery) {
+            const QDeadlineTimer drawn(1200);
             while (!drawn.hasExpired()) {
                 QApplication::processEvents(QEventLoop::AllEvents, 20);
             }
-            window->grab().save(QString::fromLocal8Bit(folder) + QStringLiteral("/friend-%1x%2-%3.png")
-                                                                     .arg(shape.width)
-                                                                     .arg(shape.height)
-                                                                     .arg(QLatin1String(shape.language)));
+            keepPicture(*window, name);
         }
         TearDown();
     }

@@ -72,7 +72,7 @@ class StreetsRowTest : public ::testing::Test {
         window->resize(size);
         window->show();
         const auto ann = host::ScenarioReader({0.0}, host::ScenarioReader::Clock::Present).readText(kAnn, "test");
-        ASSERT_TRUE(std::holds_alternative<host::Scenario>(ann)) << std::get<host::Failure>(ann).line;
+        ASSERT_TRUE(std::holds_alternative<host::Scenario>(ann));
         ASSERT_FALSE(host->addTurn(std::get<host::Scenario>(ann)));
         window->conversation().turnsChanged();
     }
@@ -107,6 +107,7 @@ class StreetsRowTest : public ::testing::Test {
         test::MbtilesWriter writer(path.string());
         writer.makeTables();
         writer.putMetadata("format", "png");
+        writer.putMetadata("bounds", "13.45,52.22,14.45,52.62");
         for (int level = 9; level <= 14; ++level) {
             const int count = 1 << level;
             const double latitude = kLatitude * std::numbers::pi / 180.0;
@@ -180,6 +181,8 @@ TEST_F(StreetsRowTest, OnAFriendsPage_TheSameIsOffered_AndTheWayBackLeadsThere) 
     window->pages().back();
     ASSERT_EQ(friendPage(), page);
     ASSERT_FALSE(std::holds_alternative<AddedMaps::Problem>(AddedMaps::add(region())));
+    // From as far out as a town is named nobody can tell; from nearer the streets are seen.
+    friendPage()->map().step(true);
     EXPECT_TRUE(eventually([&] { return !sheet.streets().isVisible() && pixelsOfTheMap(*window) > 10000; }));
     keepPicture(*window, "streets-row-gone");
 }
@@ -232,7 +235,7 @@ TEST_F(StreetsRowTest, EveryShapeAndLanguage_CutsNothing) {
         QApplication::processEvents();
         const auto shapeOf = [](const Block& block) { return block.shape().translated(block.pos()); };
         EXPECT_FALSE(shapeOf(*streets.findChild<Words*>()).intersects(shapeOf(streets.action()))) << one.name;
-        EXPECT_TRUE(streets.rect().contains(streets.action().geometry())) << one.name;
+        EXPECT_TRUE(streets.rect().contains(shapeOf(streets.action()))) << one.name;
         keepPicture(*window, std::string("streets-row-") + one.name);
     }
 }
