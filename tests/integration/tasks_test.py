@@ -159,7 +159,7 @@ class TasksTest(live_window_test.LiveWindowTest):
         wait_for("a place", lambda: "OpenURI" in told.read_text())
         self.assertRegex(told.read_text(), r'OpenURI "" "geo:50\.2\d*,-3\.1\d*\?q=50\.2\d*,-3\.1\d*\(Ann%20Marsh\)"')
 
-    def test_task_add_a_map(self):
+    def test_task_get_streets(self):
         """Where no map has streets, the line under the card leads to where one is added; then the card has it."""
         self.environment["XDG_DATA_HOME"] = str(self.folder / "data")
         region = map_file.write_region(self.folder / "region.mbtiles")
