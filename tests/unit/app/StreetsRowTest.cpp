@@ -14,7 +14,6 @@
 #include <memory>
 #include <numbers>
 
-#include "app/AddedMaps.h"
 #include "app/window/ConversationWindow.h"
 #include "app/window/friend/FriendPage.h"
 #include "app/window/settings/SettingsPage.h"
@@ -180,11 +179,6 @@ TEST_F(StreetsRowTest, OnAFriendsPage_TheSameIsOffered_AndTheWayBackLeadsThere) 
     ASSERT_NE(settingsPage(), nullptr);
     window->pages().back();
     ASSERT_EQ(friendPage(), page);
-    ASSERT_FALSE(std::holds_alternative<AddedMaps::Problem>(AddedMaps::add(region())));
-    // From as far out as a town is named nobody can tell; from nearer the streets are seen.
-    friendPage()->map().step(true);
-    EXPECT_TRUE(eventually([&] { return !sheet.streets().isVisible() && pixelsOfTheMap(*window) > 10000; }));
-    keepPicture(*window, "streets-row-gone");
 }
 
 TEST_F(StreetsRowTest, OnAFriendsPage_LookingElsewhereChangesNothingOfWhatIsSaidOfThePlace) {
