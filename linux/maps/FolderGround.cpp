@@ -1,13 +1,52 @@
 #include "linux/maps/FolderGround.h"
 
+#include <QObject>
 #include <algorithm>
+#include <optional>
 #include <system_error>
+#include <utility>
 
+#include "linux/device/Aside.h"
+#include "linux/device/FileWatch.h"
 #include "linux/maps/MbtilesPictures.h"
 #include "linux/maps/PictureGround.h"
 #include "linux/maps/VectorGround.h"
 
 namespace ktr::linux_ {
+
+/// Tells when maps come into a folder, or go. Main thread.
+class FolderGround::Follower : public QObject {
+  public:
+    Follower(std::filesystem::path folder, std::function<void()> changed)
+        : folder_(std::move(folder)), changed_(std::move(changed)), watch_([this] { follow(); }), aside_(*this) {
+        follow();
+    }
+
+  private:
+    /// The folder may come later, and so may those that it stands in.
+    void follow() {
+        const auto above = folder_.parent_path();
+        watch_.watch({folder_ / "maps", folder_, above, above.parent_path()}, [this](bool) { look(); });
+    }
+    /// What else changes beside the folder draws nothing anew.
+    void look() {
+        aside_.run([this, folder = folder_]() -> Aside::Then {
+            return [this, files = filesIn(folder)] {
+                const bool isOther = told_ && *told_ != files;
+                told_ = files;
+                if (isOther) {
+                    changed_();
+                }
+            };
+        });
+    }
+
+    const std::filesystem::path folder_;
+    const std::function<void()> changed_;
+    std::optional<std::vector<std::filesystem::path>> told_;  ///< what was there last
+    FileWatch watch_;
+    Aside aside_;
+};
 
 std::vector<std::filesystem::path> FolderGround::filesIn(const std::filesystem::path& folder) {
     std::vector<std::filesystem::path> paths;
@@ -40,28 +79,8 @@ void FolderGround::list() {
 }
 
 void FolderGround::setChangeHandler(std::function<void()> changed) {
-    changed_ = std::move(changed);
-    watch_ = std::make_unique<FileWatch>([this] { follow(); });
-    follow();
-}
-
-/// The folder may come later, and so may those that it stands in.
-void FolderGround::follow() {
-    const auto above = folder_.parent_path();
-    watch_->watch({folder_ / "maps", folder_, above, above.parent_path()}, [this](bool) { look(); });
-}
-
-/// What else changes beside the folder draws nothing anew.
-void FolderGround::look() {
-    aside_.run([this, folder = folder_]() -> Aside::Then {
-        return [this, files = filesIn(folder)] {
-            const bool isOther = told_ && *told_ != files;
-            told_ = files;
-            if (isOther && changed_) {
-                changed_();
-            }
-        };
-    });
+    follower_ = std::shared_ptr<Follower>(new Follower(folder_, std::move(changed)),
+                                          [](Follower* follower) { follower->deleteLater(); });
 }
 
 MapDrawn FolderGround::draw(const MapDrawing& drawing) {

@@ -1,15 +1,11 @@
 #pragma once
 
-#include <QObject>
 #include <filesystem>
 #include <functional>
 #include <memory>
-#include <optional>
 #include <string>
 #include <vector>
 
-#include "linux/device/Aside.h"
-#include "linux/device/FileWatch.h"
 #include "linux/maps/MapGround.h"
 
 namespace ktr::linux_ {
@@ -34,18 +30,13 @@ class FolderGround final : public MapGround {
         /// Vector tiles and pictures: only the file itself says which it has, and the other finds nothing in it.
         std::vector<std::shared_ptr<MapGround>> grounds;
     };
+    class Follower;
     void list();
-    void follow();
-    void look();
 
     const std::filesystem::path folder_;
     std::vector<File> files_;
-    // On the main thread
-    std::function<void()> changed_;
-    std::optional<std::vector<std::filesystem::path>> told_;  ///< what was there last
-    std::unique_ptr<FileWatch> watch_;
-    QObject owner_;
-    Aside aside_{owner_};
+    /// Of the main thread, where it also ends: a ground may end on a worker.
+    std::shared_ptr<Follower> follower_;
 };
 
 }  // namespace ktr::linux_
