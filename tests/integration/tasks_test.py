@@ -220,7 +220,7 @@ class TasksTest(live_window_test.LiveWindowTest):
         self.assertLessEqual(0, granted[0] - time.time())
         self.assertLessEqual(granted[0] - time.time(), 86400 + 3600, "tonight")
         self.assertIn((until.tm_hour, until.tm_min), ((0, 0), (23, 59)), "when the day ends")
-        self.await_seen("Ann Marsh can see where you are, until")
+        self.await_seen("Ann Marsh may see where you are, until")
 
     def test_task_add_a_map(self):
         self.environment["XDG_DATA_HOME"] = str(self.folder / "data")
