@@ -68,6 +68,9 @@ struct WordedAges {
     /// Minutes, and hours of more than a week.
     static constexpr std::size_t kMost = 256;
     std::unordered_map<std::int64_t, KTRVAUIUtils::AgeStrings> byNumber;
+    /// What they are worded by: with others they are worded anew.
+    std::shared_ptr<platform::Localization> texts;
+    std::shared_ptr<platform::NumberFormatter> numbers;
 };
 
 KTRVAUIUtils::AgeStrings worded(const Band& band) {
@@ -81,13 +84,25 @@ KTRVAUIUtils::AgeStrings worded(const Band& band) {
     return {std::move(row), std::move(spoken)};
 }
 
+WordedAges& wordedAges() {
+    WordedAges& ages = *platform::shared<WordedAges>();
+    const auto& texts = platform::currentPlatform()->localization;
+    const auto numbers = KTRVALocation::numberFormatter();
+    if (ages.texts != texts || ages.numbers != numbers) {
+        ages.byNumber.clear();
+        ages.texts = texts;
+        ages.numbers = numbers;
+    }
+    return ages;
+}
+
 }  // namespace
 
 KTRVAUIUtils::AgeStrings KTRVAUIUtils::ageStringsForDate(const platform::Date& date) {
     KTR_ASSERT_MAIN_THREAD();
     constexpr std::int64_t kRanks = 5;
     const Band band = bandOf(ageInSeconds(date));
-    auto& known = platform::shared<WordedAges>()->byNumber;
+    auto& known = wordedAges().byNumber;
     const std::int64_t place = band.number.value_or(0) * kRanks + band.rank;
     if (const auto found = known.find(place); found != known.end()) {
         return found->second;

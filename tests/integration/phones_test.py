@@ -113,8 +113,9 @@ class PhonesTest(unittest.TestCase):
             self.assertEqual(phone.answers[-1][0]["_type"], "location")
         self.service.command("face", "Ann")
         for phone in (otto, zoe):
+            moment = time.time() - 6
             for answered in (False, True):
-                phone.locate(50, -3, time.time() - 6)
+                phone.locate(50, -3, moment)
                 self.assertTrue(phone.send())
                 self.assertEqual(phone.answers[-1][0], {"_type": "card", "tid": "Ann", "name": "Ann"},
                                  "again, since the first answer may have been lost" if answered else "it changed")
