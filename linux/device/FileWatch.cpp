@@ -1,15 +1,18 @@
 #include "linux/device/FileWatch.h"
 
 #include <sys/inotify.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include <QSocketNotifier>
 #include <array>
 #include <cerrno>
 #include <cstdint>
+#include <map>
 #include <mutex>
 #include <set>
 #include <system_error>
+#include <tuple>
 #include <utility>
 
 #include "platform/base/Log.h"
@@ -23,9 +26,21 @@ constexpr std::uint32_t kOfFile = IN_MODIFY | IN_ATTRIB | IN_MOVE_SELF | IN_DELE
 constexpr std::uint32_t kOfFolder = IN_CREATE | IN_DELETE | IN_MOVE | IN_DELETE_SELF | IN_MOVE_SELF | IN_ONLYDIR;
 
 void warn(const char* what, int number) {
-    platform::platformLog().write(platform::LogLevel::Error, "files are not followed: %@: %@",
+    platform::platformLog().write(platform::LogLevel::Error, "files are looked at now and then, not followed: %@: %@",
                                   platform::FormatArgument(std::string(what)),
                                   platform::FormatArgument(std::generic_category().message(number)));
+}
+
+/// What differs once a file or a folder has become another; all zero where there is none.
+using Stamp = std::tuple<ino_t, off_t, time_t, long, time_t, long>;
+
+Stamp stampOf(const std::filesystem::path& path) {
+    struct stat found {};
+    if (::stat(path.c_str(), &found) != 0) {
+        return {};
+    }
+    return {found.st_ino,          found.st_size,        found.st_mtim.tv_sec,
+            found.st_mtim.tv_nsec, found.st_ctim.tv_sec, found.st_ctim.tv_nsec};
 }
 
 }  // namespace
@@ -49,6 +64,7 @@ class FileWatch::Events {
     int descriptor() const { return descriptor_; }
     /// Whether one of the folders is new.
     bool add(const Files& files) {
+        const std::lock_guard<std::mutex> lock(mutex_);
         bool isFolderNew = false;
         for (const std::filesystem::path& file : files) {
             add(file, kOfFile);
@@ -65,32 +81,66 @@ class FileWatch::Events {
         }
         return any;
     }
+    /// Whether there is something that has to be looked at.
+    bool mustLook() {
+        const std::lock_guard<std::mutex> lock(mutex_);
+        return !lookedAt_.empty();
+    }
+    /// Whether something became another since.
+    bool look() {
+        const std::lock_guard<std::mutex> lock(mutex_);
+        bool any = false;
+        for (auto& [path, stamp] : lookedAt_) {
+            const Stamp now = stampOf(path);
+            any = any || now != stamp;
+            stamp = now;
+        }
+        return any;
+    }
 
   private:
-    /// Whether it is watched from now on and was not.
+    /// Whether it is followed from now on and was not.
     bool add(const std::filesystem::path& path, std::uint32_t what) {
-        if (path.empty() || descriptor_ < 0) {
+        if (path.empty()) {
             return false;
+        }
+        if (descriptor_ < 0) {
+            return addToLookedAt(path);
         }
         const int watch = inotify_add_watch(descriptor_, path.c_str(), what);
-        if (watch < 0) {
-            if (errno == ENOSPC) {
-                warn(path.c_str(), errno);
-            }
+        if (watch >= 0) {
+            // The system gives each another number, and the same one twice the same.
+            return known_.insert(watch).second;
+        }
+        if (errno != ENOSPC) {
             return false;
         }
-        // The system gives each another number, and the same one twice the same.
-        const std::lock_guard<std::mutex> lock(mutex_);
-        return known_.insert(watch).second;
+        if (lookedAt_.empty()) {
+            warn(path.c_str(), ENOSPC);
+        }
+        return addToLookedAt(path);
+    }
+    bool addToLookedAt(const std::filesystem::path& path) {
+        const Stamp now = stampOf(path);
+        const auto [entry, isNew] = lookedAt_.try_emplace(path, now);
+        if (isNew) {
+            return now != Stamp{};
+        }
+        // What has become another since is told when it is looked at; what was not there has nothing to be told of.
+        return entry->second == Stamp{} && std::exchange(entry->second, now) != now;
     }
 
     const int descriptor_;
     std::mutex mutex_;
     std::set<int> known_;
+    std::map<std::filesystem::path, Stamp> lookedAt_;
 };
 
-FileWatch::FileWatch(std::function<void()> changed)
+FileWatch::FileWatch(std::function<void()> changed, std::chrono::milliseconds everySoOften)
     : changed_(std::move(changed)), events_(std::make_shared<Events>()), aside_(*this) {
+    looks_.setSingleShot(true);
+    looks_.setInterval(everySoOften);
+    connect(&looks_, &QTimer::timeout, this, [this] { look(); });
     if (events_->descriptor() >= 0) {
         notifier_ = std::make_unique<QSocketNotifier>(events_->descriptor(), QSocketNotifier::Read);
         connect(notifier_.get(), &QSocketNotifier::activated, this, [this] {
@@ -104,11 +154,26 @@ FileWatch::FileWatch(std::function<void()> changed)
 FileWatch::~FileWatch() = default;
 
 void FileWatch::watch(Files files, std::function<void(bool isFolderNew)> then) {
-    aside_.run([events = events_, files = std::move(files), then = std::move(then)] {
+    aside_.run([this, events = events_, files = std::move(files), then = std::move(then)] {
         const bool isFolderNew = events->add(files);
-        return [then, isFolderNew] {
+        return [this, then, isFolderNew, mustLook = events->mustLook()] {
+            if (mustLook && !looks_.isActive()) {
+                looks_.start();
+            }
             if (then) {
                 then(isFolderNew);
+            }
+        };
+    });
+}
+
+void FileWatch::look() {
+    aside_.run([this, events = events_] {
+        return [this, isOther = events->look()] {
+            // Only now: a disk that does not answer is asked once.
+            looks_.start();
+            if (isOther) {
+                changed_();
             }
         };
     });

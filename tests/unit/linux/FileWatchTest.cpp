@@ -1,10 +1,12 @@
 #include "linux/device/FileWatch.h"
 
 #include <gtest/gtest.h>
+#include <sys/resource.h>
 
 #include <QCoreApplication>
 #include <chrono>
 #include <fstream>
+#include <memory>
 #include <optional>
 #include <thread>
 
@@ -12,12 +14,31 @@
 
 namespace ktr::linux_ {
 
-class FileWatchTest : public ::testing::Test {
+/// Whether the system has a watch to give.
+enum class System { Watches, HasNoneLeft };
+
+/// No file can be opened while it lives.
+class NoDescriptors {
+  public:
+    NoDescriptors() {
+        EXPECT_EQ(getrlimit(RLIMIT_NOFILE, &before_), 0);
+        const rlimit none{0, before_.rlim_max};
+        EXPECT_EQ(setrlimit(RLIMIT_NOFILE, &none), 0);
+    }
+    ~NoDescriptors() { EXPECT_EQ(setrlimit(RLIMIT_NOFILE, &before_), 0); }
+    NoDescriptors(const NoDescriptors&) = delete;
+    NoDescriptors& operator=(const NoDescriptors&) = delete;
+
+  private:
+    rlimit before_{};
+};
+
+class FileWatchTest : public ::testing::TestWithParam<System> {
   protected:
-    /// Whether it has come true within two seconds.
+    /// Whether it has come true within twenty seconds.
     template <typename Condition>
     static bool comes(Condition condition) {
-        for (int round = 0; round < 400 && !condition(); ++round) {
+        for (int round = 0; round < 4000 && !condition(); ++round) {
             QCoreApplication::processEvents();
             std::this_thread::sleep_for(std::chrono::milliseconds(5));
         }
@@ -29,20 +50,27 @@ class FileWatchTest : public ::testing::Test {
     /// What is told once it watches.
     bool watch(FileWatch::Files files) {
         std::optional<bool> isFolderNew;
-        files_.watch(std::move(files), [&](bool isNew) { isFolderNew = isNew; });
+        files_->watch(std::move(files), [&](bool isNew) { isFolderNew = isNew; });
         EXPECT_FALSE(isFolderNew.has_value()) << "it looked at the disk at once";
         EXPECT_TRUE(comes([&] { return isFolderNew.has_value(); }));
         return isFolderNew.value_or(false);
+    }
+    std::unique_ptr<FileWatch> made() {
+        std::optional<NoDescriptors> none;
+        if (GetParam() == System::HasNoneLeft) {
+            none.emplace();
+        }
+        return std::make_unique<FileWatch>([this] { ++changes; }, std::chrono::milliseconds(20));
     }
     /// In place, as `echo >>` does.
     static void append(const std::filesystem::path& file) { std::ofstream(file, std::ios::app) << "more"; }
 
     test::TemporaryFolder folder;
     int changes = 0;
-    FileWatch files_{[this] { ++changes; }};
+    std::unique_ptr<FileWatch> files_ = made();
 };
 
-TEST_F(FileWatchTest, FileThatAppears_IsTold) {
+TEST_P(FileWatchTest, FileThatAppears_IsTold) {
     EXPECT_TRUE(watch({folder.path() / "config.json"}));
     settle();
     EXPECT_EQ(changes, 0);
@@ -50,7 +78,7 @@ TEST_F(FileWatchTest, FileThatAppears_IsTold) {
     EXPECT_TRUE(comes([this] { return changes > 0; }));
 }
 
-TEST_F(FileWatchTest, FileThatIsReplaced_IsToldAndToBeWatchedAgain) {
+TEST_P(FileWatchTest, FileThatIsReplaced_IsToldAndToBeWatchedAgain) {
     folder.write("config.json", "1");
     watch({folder.path() / "config.json"});
     folder.write("config.json.new", "2");
@@ -64,7 +92,7 @@ TEST_F(FileWatchTest, FileThatIsReplaced_IsToldAndToBeWatchedAgain) {
 }
 
 // Dotfiles are links into a folder that nobody has named.
-TEST_F(FileWatchTest, FileBehindALink_IsToldWhenItIsWritten) {
+TEST_P(FileWatchTest, FileBehindALink_IsToldWhenItIsWritten) {
     test::TemporaryFolder elsewhere;
     elsewhere.write("real.json", "1");
     std::filesystem::create_symlink(elsewhere.path() / "real.json", folder.path() / "config.json");
@@ -73,7 +101,7 @@ TEST_F(FileWatchTest, FileBehindALink_IsToldWhenItIsWritten) {
     EXPECT_TRUE(comes([this] { return changes > 0; }));
 }
 
-TEST_F(FileWatchTest, FolderThatIsNotThere_IsNewOnceItIs) {
+TEST_P(FileWatchTest, FolderThatIsNotThere_IsNewOnceItIs) {
     const auto file = folder.path() / "later" / "token";
     EXPECT_FALSE(watch({file}));
     std::filesystem::create_directory(folder.path() / "later");
@@ -81,8 +109,8 @@ TEST_F(FileWatchTest, FolderThatIsNotThere_IsNewOnceItIs) {
     EXPECT_FALSE(watch({file}));
 }
 
-TEST_F(FileWatchTest, WhoHasGone_IsToldNothing) {
-    auto mine = std::make_unique<FileWatch>([this] { ++changes; });
+TEST_P(FileWatchTest, WhoHasGone_IsToldNothing) {
+    auto mine = made();
     bool isTold = false;
     mine->watch({folder.path() / "config.json"}, [&](bool) { isTold = true; });
     mine.reset();
@@ -91,5 +119,10 @@ TEST_F(FileWatchTest, WhoHasGone_IsToldNothing) {
     EXPECT_FALSE(isTold);
     EXPECT_EQ(changes, 0);
 }
+
+INSTANTIATE_TEST_SUITE_P(EachSystem, FileWatchTest, ::testing::Values(System::Watches, System::HasNoneLeft),
+                         [](const auto& tested) {
+                             return tested.param == System::Watches ? "Watches" : "HasNoneLeft";
+                         });
 
 }  // namespace ktr::linux_
