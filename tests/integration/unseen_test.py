@@ -20,16 +20,18 @@ LOGIND, MANAGER, SESSION = "org.freedesktop.login1", "/org/freedesktop/login1", 
 
 
 class UnseenTest(WindowCase):
-    def setUp(self):
-        super().setUp()
+    def serve(self, *options):
         config = self.folder / "config.json"
-        # The user walks on and on.
+        self.service = Service(PROGRAM, "--write-config", config, "--interval", str(INTERVAL), *options)
+        self.addCleanup(self.service.__exit__)
+        self.environment["KTR_CONFIG"] = str(config)
+
+    def walk(self):
+        """Served to a user who walks on and on."""
         walk = self.folder / "walk.json"
         walk.write_text(json.dumps({"sentence": "-", "positions": [
             {"at": n, "latitude": 50.2 + n * 1e-3, "longitude": -3.1} for n in range(300)]}))
-        self.service = Service(PROGRAM, "--write-config", config, "--interval", str(INTERVAL), "--positions", walk)
-        self.addCleanup(self.service.__exit__)
-        self.environment["KTR_CONFIG"] = str(config)
+        self.serve("--positions", walk)
 
     def open(self, question):
         program = subprocess.Popen([PROGRAM, "show", "--language", "en-GB", "--ask", question], env=self.environment)
@@ -55,13 +57,16 @@ class UnseenTest(WindowCase):
             time.sleep(0.05)
 
     def assert_asks_nothing(self, why):
-        # What was on its way when the window went is over by then.
-        time.sleep(4 * INTERVAL)
+        # What was on its way when the window went is over at some time.
+        deadline = time.monotonic() + 30
         self.asked()
         time.sleep(6 * INTERVAL)
-        self.assertEqual(self.asked(), 0, why)
+        while self.asked():
+            self.assertLess(time.monotonic(), deadline, why)
+            time.sleep(6 * INTERVAL)
 
     def test_window_that_is_hidden_or_elsewhere_asks_nothing_and_asks_when_it_is_back(self):
+        self.walk()
         self.open("Where are my friends?")
         self.wait_until_asked()
         self.xprop("-id", self.window, "-f", "_NET_WM_STATE", "32a", "-set", "_NET_WM_STATE", "_NET_WM_STATE_HIDDEN")
@@ -97,6 +102,7 @@ class UnseenTest(WindowCase):
                                       f"{{'LockedHint': <{str(locked).lower()}>}}"))
 
     def test_locked_session_asks_nothing_and_asks_when_it_is_unlocked(self):
+        self.walk()
         self.start_logind()
         self.open("Where are my friends?")
         self.wait_until_asked()
@@ -106,6 +112,7 @@ class UnseenTest(WindowCase):
         self.wait_until_asked()
 
     def test_sharing_ends_where_nobody_sees_it(self):
+        self.walk()
         self.open("Share my location")
         self.wait_until_asked("showHideLocation")
         self.xprop("-id", self.window, "-f", "_NET_WM_STATE", "32a", "-set", "_NET_WM_STATE", "_NET_WM_STATE_HIDDEN")
@@ -118,12 +125,17 @@ class UnseenTest(WindowCase):
         self.assertEqual(self.asked("showHideLocation"), 0, "what would have shown the user is given up, not held")
 
     def test_two_starts_of_a_card_are_one_request(self):
+        # An answer takes its time, as anywhere but on one machine, and nobody moves: two questions are alike.
+        self.serve("--fault", f"delay={INTERVAL / 2}")
         self.open("Where are my friends?")
         self.wait_until_asked()
-        time.sleep(INTERVAL / 2)
         self.asked()
+        begin = time.monotonic()
         time.sleep(10 * INTERVAL)
-        self.assertLessEqual(self.asked(), 12, "one an interval, though the card started twice")
+        count = self.asked()
+        rounds = (time.monotonic() - begin) / (1.5 * INTERVAL)
+        self.assertGreater(count, 1)
+        self.assertLessEqual(count, 1.5 * rounds + 1, "one an interval, though the card started twice")
 
 
 if __name__ == "__main__":
