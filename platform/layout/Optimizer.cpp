@@ -18,7 +18,9 @@ Optimizer::Optimizer(SolverState& state)
       guards_(state.problem->entities.size(), Guard::None),
       above_(state.problem->entities.size(), 0),
       open_(state.tableau->columns()),
-      steps_(200 + 50 * (state.tableau->columns() + state.tableau->rows())) {}
+      steps_(200 + 50 * (state.tableau->columns() + state.tableau->rows())) {
+    moved_.reserve(static_cast<std::size_t>(state.tableau->rows()));
+}
 
 void Optimizer::run() {
     const std::vector<int>& order = state_.problem->order;
@@ -86,20 +88,28 @@ void Optimizer::exchange(int row, int column) {
     guard(leaving, guards_[leaving]);
 }
 
+/// What moves with a column: the few rows that `firstStop`, `collectBreaks` and `advance` look at.
+void Optimizer::findMoved(int column) {
+    const Tableau& t = *state_.tableau;
+    moved_.clear();
+    for (int r = 0; r < t.rows(); ++r) {
+        if (t.at(r, column) != 0.0) {
+            moved_.push_back(r);
+        }
+    }
+}
+
 void Optimizer::advance(int column, int direction, double distance) {
     const Tableau& t = *state_.tableau;
     const double step = direction * distance;
     if (step == 0.0) {
         return;
     }
-    for (int r = 0; r < t.rows(); ++r) {
-        const double cell = t.at(r, column);
-        if (cell != 0.0) {
-            const int e = t.rowEntity(r);
-            const double change = cell * step;
-            state_.values[e] += change;
-            state_.magnitudes[e] = std::max(state_.magnitudes[e], std::abs(change));
-        }
+    for (const int r : moved_) {
+        const int e = t.rowEntity(r);
+        const double change = t.at(r, column) * step;
+        state_.values[e] += change;
+        state_.magnitudes[e] = std::max(state_.magnitudes[e], std::abs(change));
     }
     state_.values[t.columnEntity(column)] += step;
 }
@@ -123,7 +133,7 @@ Optimizer::Break Optimizer::firstStop(int column, int direction, int exceptRow) 
     const Tableau& t = *state_.tableau;
     const bool first = idle_ > t.columns() + t.rows();  // the lowest entity leaves: no cycle (Bland's rule)
     Break best{kInfinite, 0.0, 0.0, -1};
-    for (int r = 0; r < t.rows(); ++r) {
+    for (const int r : moved_) {
         const double cell = direction * t.at(r, column);
         if (std::abs(cell) <= kCell || r == exceptRow) {
             continue;
@@ -176,6 +186,7 @@ void Optimizer::approach(int e) {
         }
         const double slope = isRow ? std::abs(state_.tableau->at(row, move.column)) : 1.0;
         const double wanted = std::abs(miss) / slope;
+        findMoved(move.column);
         const Break stop = firstStop(move.column, move.direction, row);
         if (stop.at < wanted) {
             const int leaving = state_.tableau->rowEntity(stop.row);
@@ -204,11 +215,15 @@ Optimizer::Move Optimizer::moveToward(int row, int sign) const {
     const double* cells = t.row(row);
     double largest = 0.0;
     for (int j = 0; j < t.columns(); ++j) {
-        if (isOpen(j, sign * (cells[j] > 0.0 ? 1 : -1))) {
-            largest = std::max(largest, std::abs(cells[j]));
+        // Most cells are zero: they are passed over first.
+        if (std::abs(cells[j]) > largest && isOpen(j, sign * (cells[j] > 0.0 ? 1 : -1))) {
+            largest = std::abs(cells[j]);
         }
     }
     Move best;
+    if (largest <= kCell) {
+        return best;
+    }
     for (int j = 0; j < t.columns(); ++j) {
         const int direction = sign * (cells[j] > 0.0 ? 1 : -1);
         const double size = std::abs(cells[j]);
@@ -412,7 +427,7 @@ Optimizer::Move Optimizer::steepest() const {
 void Optimizer::collectBreaks(Move move, double level) {
     const Tableau& t = *state_.tableau;
     breaks_.clear();
-    for (int r = 0; r < t.rows(); ++r) {
+    for (const int r : moved_) {
         const double cell = move.direction * t.at(r, move.column);
         if (std::abs(cell) <= kCell) {
             continue;
@@ -445,6 +460,7 @@ bool Optimizer::descend(Move move, double level) {
     const bool isShort = idle_ > state_.tableau->columns() + state_.tableau->rows();
     const int entering = state_.tableau->columnEntity(move.column);
     double slope = slopeOf(move.column, move.direction);
+    findMoved(move.column);
     collectBreaks(move, level);
     for (const Break& at : breaks_) {
         slope += at.jump;

@@ -42,6 +42,7 @@ class Optimizer {
     void lock(int column, std::uint8_t directions);
     void guard(int e, Guard guard);
     void exchange(int row, int column);
+    void findMoved(int column);
     void advance(int column, int direction, double distance);
     Break firstStop(int column, int direction, int exceptRow) const;
     double stopOf(int row, double slope) const;
@@ -73,9 +74,10 @@ class Optimizer {
     std::vector<std::int8_t> above_;   // by entity, in a level's sum: counted as above (1) or below (-1) zero
     std::vector<double> slopes_;       // by column
     std::vector<Break> breaks_;
-    int open_ = 0;   // columns with an open direction
-    int steps_ = 0;  // left
-    int idle_ = 0;   // steps of no length in a row
+    std::vector<int> moved_;  // the rows that the column in question moves
+    int open_ = 0;            // columns with an open direction
+    int steps_ = 0;           // left
+    int idle_ = 0;            // steps of no length in a row
     double sumLevel_ = 0.0;
 };
 

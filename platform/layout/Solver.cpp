@@ -14,6 +14,8 @@ namespace {
 
 constexpr int kFree = -1;
 constexpr int kIgnored = -2;
+// What a row of a list has: nothing grows step by step while its constraints are added.
+constexpr std::size_t kUsualEntities = 96;
 // Values are computed afresh at each solve, the tableau after this many exchanges: no rounding adds up.
 constexpr int kExchangesBetweenRebuilds = 4000;
 
@@ -43,7 +45,10 @@ bool isSame(const Entity& a, const Entity& b) {
 void normalise(Entity& entity, std::span<const Term> terms) {
     entity.terms.assign(terms.begin(), terms.end());
     std::vector<Term>& own = entity.terms;
-    std::sort(own.begin(), own.end(), [](const Term& a, const Term& b) { return a.variable < b.variable; });
+    const auto isBefore = [](const Term& a, const Term& b) { return a.variable < b.variable; };
+    if (!std::is_sorted(own.begin(), own.end(), isBefore)) {
+        std::sort(own.begin(), own.end(), isBefore);
+    }
     std::size_t kept = 0;
     for (std::size_t i = 0; i < own.size();) {
         Term sum = own[i];
@@ -64,11 +69,12 @@ void normalise(Entity& entity, std::span<const Term> terms) {
     for (const Term& term : own) {
         largest = std::max(largest, std::abs(term.coefficient));
     }
-    const double sign = own.front().coefficient > 0.0 ? 1.0 : -1.0;
-    for (Term& term : own) {
-        term.coefficient /= sign * largest;
+    entity.scale = own.front().coefficient > 0.0 ? largest : -largest;
+    if (entity.scale != 1.0) {
+        for (Term& term : own) {
+            term.coefficient /= entity.scale;
+        }
     }
-    entity.scale = sign * largest;
 }
 
 }  // namespace
@@ -76,6 +82,14 @@ void normalise(Entity& entity, std::span<const Term> terms) {
 Solver::Solver() {
     state_.problem = std::make_shared<SolverProblem>();
     state_.tableau = std::make_shared<Tableau>();
+    state_.problem->entities.reserve(kUsualEntities);
+    state_.problem->order.reserve(kUsualEntities);
+    state_.problem->variables.reserve(kUsualEntities);
+    state_.constants.reserve(kUsualEntities);
+    state_.values.reserve(kUsualEntities);
+    state_.magnitudes.reserve(kUsualEntities);
+    state_.sides.reserve(kUsualEntities);
+    handles_.reserve(kUsualEntities);
 }
 
 /// The problem, for writing.
@@ -169,7 +183,7 @@ ConstraintId Solver::add(std::span<const Term> terms, LayoutRelation relation, d
                           : relation == LayoutRelation::GreaterOrEqual ? LayoutRelation::LessOrEqual
                                                                        : relation;
     }
-    entity.hash = hashOf(entity);
+    entity.hash = isEdited ? 0 : hashOf(entity);
     entity.isEdited = isEdited;
     for (const int e : isEdited ? std::span<const int>() : std::span<const int>(state_.problem->order)) {
         if (state_.constants[e] == scaled && isSame(state_.problem->entities[e], entity)) {

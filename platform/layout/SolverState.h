@@ -21,7 +21,7 @@ struct SolverProblem {
         double level = 0.0;       ///< 0 for a variable
         double scale = 1.0;       ///< the largest factor of the terms as they were given; the terms are divided by it
         std::uint32_t users = 0;  ///< how often it was added; 0: a free place
-        std::uint64_t hash = 0;   ///< of terms, relation and level
+        std::uint64_t hash = 0;   ///< of terms, relation and level, of what may be one with an equal one
         std::vector<Term> terms;  ///< one for each variable, in the order of variables
 
         bool isPenalisedAbove() const { return relation != LayoutRelation::GreaterOrEqual; }

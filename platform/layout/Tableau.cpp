@@ -8,6 +8,8 @@ namespace ktr::platform {
 namespace {
 // What is left of a sum whose parts cancel to this fraction is rounding, not a factor.
 constexpr double kCancelled = 1e-13;
+// For so many rows there is room from the start.
+constexpr int kUsualRows = 48;
 }  // namespace
 
 void Tableau::place(int entity, int where) {
@@ -21,12 +23,15 @@ void Tableau::addColumn(int entity) {
     const int column = columns();
     if (column == stride_) {
         const int wider = std::max(16, stride_ * 2);
-        std::vector<double> cells(static_cast<std::size_t>(rows()) * wider, 0.0);
+        std::vector<double> cells;
+        cells.reserve(static_cast<std::size_t>(std::max(rows(), kUsualRows)) * wider);
+        cells.resize(static_cast<std::size_t>(rows()) * wider, 0.0);
         for (int r = 0; r < rows(); ++r) {
             std::copy_n(row(r), column, cells.data() + static_cast<std::ptrdiff_t>(r) * wider);
         }
         cells_ = std::move(cells);
         stride_ = wider;
+        used_.reserve(static_cast<std::size_t>(wider));
     }
     columnEntity_.push_back(entity);
     place(entity, -1 - column);
@@ -77,10 +82,10 @@ void Tableau::exchange(int row, int column) {
         }
     }
     pivotRow[column] = inverse;
-    for (int r = 0; r < rows(); ++r) {
-        double* cells = cellsOf(r);
+    double* cells = cells_.data();
+    for (int r = 0; r < rows(); ++r, cells += stride_) {
         const double factor = cells[column];
-        if (r == row || factor == 0.0) {
+        if (factor == 0.0 || r == row) {
             continue;
         }
         for (const int j : used_) {
