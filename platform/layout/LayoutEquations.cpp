@@ -95,23 +95,18 @@ std::vector<ConstraintRule> LayoutEquations::rules(const View& owner) const {
     return rules;
 }
 
-bool LayoutEquations::isCurrent(View& owner, bool rightToLeft) const {
-    const auto isSame = [this](const LayoutShape::Member& member, View& view) {
-        const IntrinsicSize size = member.isFixed ? IntrinsicSize{} : intrinsicSizeOf(view);
-        return member.hasWidth == size.width.has_value() && member.hasHeight == size.height.has_value() &&
-               member.priorities == view.contentPriorities();
-    };
+bool LayoutEquations::isCurrent(const View& owner, bool rightToLeft) const {
     if (!plan_ || owner_ != &owner || isRightToLeft() != rightToLeft || hasStrangers_ ||
-        !isSame(plan_->shape().owner, owner)) {
+        !(plan_->shape().owner.priorities == owner.contentPriorities())) {
         return false;
     }
     for (std::size_t i = 0; i < participants_.size(); ++i) {
         const Participant& p = participants_[i];
         const LayoutShape::Member& member = plan_->shape().members[i];
-        View* const view = p.view.get();
+        const View* const view = p.view.get();
         if (!view || view->superview_ != p.superview ||
             view->translatesAutoresizingMaskIntoConstraints() != member.isFixed ||
-            LayoutScope::revisionOf(*view) != p.ownConstraints || !isSame(member, *view)) {
+            LayoutScope::revisionOf(*view) != p.ownConstraints || !(member.priorities == view->contentPriorities())) {
             return false;
         }
     }
@@ -191,8 +186,18 @@ std::vector<LayoutEquations::Content> LayoutEquations::readContents(View& owner)
     return contents;
 }
 
-bool LayoutEquations::readInputs(View& owner) {
-    return writeInputs(readContents(owner));
+std::optional<bool> LayoutEquations::readInputs(View& owner, bool rightToLeft) {
+    if (!isCurrent(owner, rightToLeft)) {
+        return std::nullopt;
+    }
+    const std::vector<Content> contents = readContents(owner);
+    for (int participant = kOwner; const Content& content : contents) {
+        const LayoutShape::Member& member = plan_->member(participant++);
+        if (content.hasWidth != member.hasWidth || content.hasHeight != member.hasHeight) {
+            return std::nullopt;
+        }
+    }
+    return writeInputs(contents);
 }
 
 bool LayoutEquations::readHeightsFor(View& owner, const std::vector<double>& values) {

@@ -2,6 +2,7 @@
 
 #include <limits>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -33,11 +34,10 @@ class LayoutEquations {
     /// Whether the shape says all that the rules said: `rules` gives them back.
     bool holdsRules() const { return plan_ && !hasStrangers_ && !hasNameless_; }
     std::vector<ConstraintRule> rules(const View& owner) const;
-    /// Whether the views are still those that the equations were built for; false asks for a new build.
-    bool isCurrent(View& owner, bool rightToLeft) const;
-    /// Reads the inputs from the views; true when some changed. The height of wrapped content is read for its last
-    /// known width.
-    bool readInputs(View& owner);
+    /// Reads the inputs from the views, each once; true when some changed. The height of wrapped content is read for
+    /// its last known width. None, and the inputs stay as they are, when the views are no longer those that the
+    /// equations were built for: that asks for a new build.
+    std::optional<bool> readInputs(View& owner, bool rightToLeft);
     /// Tells the widths that were solved; true when a wrapped content's height follows with a change of inputs.
     bool readHeightsFor(View& owner, const std::vector<double>& values);
 
@@ -65,6 +65,8 @@ class LayoutEquations {
     void collect(const std::vector<ConstraintRule>& rules, LayoutShape& shape);
     void mention(const ConstraintRule& rule, LayoutShape& shape);
     void mentionOwnSizes(int participant, LayoutShape& shape);
+    /// Whether the views stand as they did when the equations were built, their contents aside.
+    bool isCurrent(const View& owner, bool rightToLeft) const;
     bool isBelowOwner(const View* view) const;
     int participantOf(View& view, LayoutShape& shape);
     Content contentOf(View& view, bool isFixed, double lastWidth) const;

@@ -135,11 +135,11 @@ void LayoutScope::prepare() {
         return;
     }
     isFresh_ = true;
-    if (structure_ && equations_.isCurrent(owner_, rightToLeft)) {
-        if (!equations_.readInputs(owner_)) {
-            return;
-        }
-    } else {
+    const auto isChanged = structure_ ? equations_.readInputs(owner_, rightToLeft) : std::nullopt;
+    if (isChanged == false) {
+        return;
+    }
+    if (!isChanged) {
         rules_ = rules();
         std::erase_if(rules_, [](const ConstraintRule& rule) { return rule.isOrphaned(); });
         structure_ = equations_.build(owner_, rules_, rightToLeft);

@@ -137,4 +137,29 @@ TEST_F(LayoutStructureTest, GoesWithTheLastOfItsRows) {
     EXPECT_TRUE(structure.expired());
 }
 
+// A list is measured at each answer: what a content costs to measure is paid once.
+TEST_F(LayoutStructureTest, ContentThatChanged_IsMeasuredOnce) {
+    struct Counting : View {
+        IntrinsicSize intrinsicContentSize(double) const override {
+            ++measured;
+            return {width, 20.0};
+        }
+        double width = 50.0;
+        mutable int measured = 0;
+    };
+    const auto view = create<View>(&View::initWithFrame, Rect{0.0, 0.0, 400.0, 40.0});
+    const auto content = std::make_shared<Counting>();
+    content->setTranslatesAutoresizingMaskIntoConstraints(false);
+    view->addSubview(content);
+    view->addConstraint(content->leadingAnchor().constraintEqualTo(view->leadingAnchor(), 15.0));
+    view->layoutIfNeeded();
+    EXPECT_EQ(content->frame().width, 50.0);
+    content->measured = 0;
+    content->width = 60.0;
+    content->invalidateIntrinsicContentSize();
+    view->layoutIfNeeded();
+    EXPECT_EQ(content->frame().width, 60.0);
+    EXPECT_EQ(content->measured, 1);
+}
+
 }  // namespace ktr::test
