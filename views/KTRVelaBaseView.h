@@ -90,13 +90,14 @@ class KTRVelaBaseView : public platform::View {
     bool axSize_ = false;
     bool isRTLUI_ = false;
     bool separatorEnabled_ = false;
-    std::weak_ptr<ViewURLHandler> urlHandler_;
-    std::weak_ptr<FriendViewDelegate> viewDelegate_;
+    // A list has a thousand of these: what is small stands together.
     /// Whether, and which, contact was given to the avatar, which keeps it; none for an empty one.
     bool hasContact_ = false;
-    const platform::Contact* contact_ = nullptr;
     /// How many contacts are on their way to it.
     int contactsAwaited_ = 0;
+    const platform::Contact* contact_ = nullptr;
+    std::weak_ptr<ViewURLHandler> urlHandler_;
+    std::weak_ptr<FriendViewDelegate> viewDelegate_;
     std::shared_ptr<platform::ContactAvatarController> avatarViewController_;
     std::shared_ptr<platform::View> friendIconView_;
     std::shared_ptr<platform::View> separatorView_;

@@ -79,15 +79,15 @@ class KTRVelaFriendView : public KTRVelaBaseView, public platform::Accessibility
     void updateAge();
     void updateDistance();
 
-    std::weak_ptr<CurrentLocationDelegate> currentLocationDelegate_;
-    std::shared_ptr<KTRVALocation> location_;
     bool isRefreshingLocation_ = false;
     bool isVisibility_ = false;
+    bool constraintSetupCompleted_ = false;
+    std::weak_ptr<CurrentLocationDelegate> currentLocationDelegate_;
+    std::shared_ptr<KTRVALocation> location_;
     std::shared_ptr<platform::Label> nameLabel_;
     std::shared_ptr<platform::Label> locationLabel_;
     std::shared_ptr<platform::Label> timeLabel_;
     std::shared_ptr<platform::Label> distanceLabel_;
-    bool constraintSetupCompleted_ = false;
     platform::NotificationCenter::Token currentLocationUpdated_;
 };
 

@@ -32,8 +32,11 @@ QRawFont sharedFont(const QRawFont& font) {
 }  // namespace
 
 int PlacedGlyphs::Maker::addColor(std::optional<platform::Color> color) {
-    glyphs_.colors_.push_back(color);
-    return static_cast<int>(glyphs_.colors_.size()) - 1;
+    if (!glyphs_.colors_) {
+        glyphs_.colors_ = std::make_unique<std::vector<std::optional<platform::Color>>>();
+    }
+    glyphs_.colors_->push_back(color);
+    return static_cast<int>(glyphs_.colors_->size()) - 1;
 }
 
 void PlacedGlyphs::Maker::add(const QRawFont& font, const quint32* indexes, const QPointF* positions, int count,
@@ -82,7 +85,7 @@ void PlacedGlyphs::draw(QPainter& painter, const QColor& color, const Palette& p
             indexes[i] = i % 2 == 0 ? *word & 0xFFFFU : *word++ >> 16U;
         }
         word += part.count % 2;
-        const auto* own = part.color < 0 ? nullptr : &colors_[static_cast<std::size_t>(part.color)];
+        const auto* own = part.color < 0 ? nullptr : &(*colors_)[static_cast<std::size_t>(part.color)];
         painter.setPen(own != nullptr && own->has_value() ? palette.resolve(**own) : color);
         run.setRawFont(part.font);
         run.setRawData(indexes.constData(), positions.constData(), part.count);

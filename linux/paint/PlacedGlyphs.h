@@ -38,7 +38,8 @@ class PlacedGlyphs {
     /// By run: the glyphs' x, their y where these differ, and their indexes, two in a word. A line is at most 32,000
     /// points wide, and a float holds every 64th of a pixel of it.
     std::unique_ptr<quint32[]> words_;
-    std::vector<std::optional<platform::Color>> colors_;
+    /// None for a text in one colour, as nearly all are.
+    std::unique_ptr<std::vector<std::optional<platform::Color>>> colors_;
 };
 
 /// Takes runs in the order in which they are drawn. Main thread.
