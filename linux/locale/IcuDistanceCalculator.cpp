@@ -30,11 +30,6 @@ constexpr std::string_view kNoBreakSpace = "\u00a0";
 constexpr double kStep = 10.0;
 constexpr double kLeastInTens = 10.0;
 
-/// Of all friends of a long list, some 100 bytes each.
-constexpr std::size_t kMostKnown = 16384;
-/// An odd number without a pattern (2^64 divided by the golden ratio).
-constexpr std::size_t kHashFactor = 0x9E3779B97F4A7C15U;
-
 /// The units of short distances.
 bool isShortUnit(const icu::MeasureUnit& unit) {
     const std::string_view name = unit.getIdentifier();
@@ -192,6 +187,8 @@ struct IcuDistanceCalculator::Formatter {
 
     /// The words of a distance in a unit that serves for it, or none when no such unit is known.
     std::optional<std::string> known(double metres, UErrorCode& status);
+    /// The words of all distances between these two; none where there are several, or where they were never asked for.
+    const std::string* known(const platform::Geodesy::Bounds& bounds) const;
     void learn(const icu::MeasureUnit& unit, double metres);
 
     /// Chooses the unit.
@@ -202,6 +199,18 @@ struct IcuDistanceCalculator::Formatter {
     std::vector<Stretch> stretches;
     bool usable = false;
 };
+
+const std::string* IcuDistanceCalculator::Formatter::known(const platform::Geodesy::Bounds& bounds) const {
+    for (const Stretch& stretch : stretches) {
+        if (bounds.least >= stretch.from && bounds.most <= stretch.to) {
+            const auto least = roundedNumber(bounds.least / stretch.metres, stretch.isInTens);
+            const auto most = roundedNumber(bounds.most / stretch.metres, stretch.isInTens);
+            const auto words = least && least == most ? stretch.words.find(*least) : stretch.words.end();
+            return words == stretch.words.end() ? nullptr : &words->second;
+        }
+    }
+    return nullptr;
+}
 
 std::optional<std::string> IcuDistanceCalculator::Formatter::known(double metres, UErrorCode& status) {
     const auto found = std::find_if(stretches.begin(), stretches.end(), [metres](const Stretch& stretch) {
@@ -248,6 +257,7 @@ IcuDistanceCalculator::IcuDistanceCalculator(Settings settings, std::optional<Un
       system_(UnitSystem::Metric),
       geodesy_(std::move(geodesy)),
       frame_(frameIn(settings_.localizationDelegate)),
+      isPlain_(frame_ == kPlainFrame),
       formatter_(std::make_unique<Formatter>()) {
     const icu::Locale units = localeOf(settings_.measurementSystemLocale);
     if (!override) {
@@ -271,29 +281,15 @@ IcuDistanceCalculator::IcuDistanceCalculator(Settings settings, std::optional<Un
 
 IcuDistanceCalculator::~IcuDistanceCalculator() = default;
 
-std::size_t IcuDistanceCalculator::EndsHash::operator()(const Ends& ends) const {
-    std::size_t hash = 0;
-    for (const double part : {ends.from.latitude, ends.from.longitude, ends.to.latitude, ends.to.longitude}) {
-        hash = hash * kHashFactor + std::hash<double>()(part);
-    }
-    return hash ^ (hash >> 32U);
-}
-
 std::optional<std::string> IcuDistanceCalculator::localizedDistance(const platform::PlatformLocation& from,
                                                                     const platform::PlatformLocation& to) {
-    const Ends ends{from.coordinate(), to.coordinate()};
-    if (const auto found = known_.find(ends); found != known_.end()) {
-        return framed(found->second);
+    // A geodesic is measured to nanometres, of which two or three digits are shown.
+    if (const auto bounds = geodesy_->distanceBounds(from.coordinate(), to.coordinate())) {
+        if (const std::string* words = formatter_->known(*bounds)) {
+            return framed(*words);
+        }
     }
-    const std::string text = worded(geodesy_->distance(ends.from, ends.to));
-    if (text.empty()) {
-        return std::nullopt;
-    }
-    if (known_.size() == kMostKnown) {
-        known_.clear();
-    }
-    known_.emplace(ends, text);
-    return framed(text);
+    return localizedDistance(geodesy_->distance(from.coordinate(), to.coordinate()));
 }
 
 std::optional<std::string> IcuDistanceCalculator::localizedDistance(double metres) const {
@@ -322,7 +318,7 @@ std::string IcuDistanceCalculator::worded(double metres) const {
 }
 
 std::string IcuDistanceCalculator::framed(const std::string& text) const {
-    return frame_ == kPlainFrame ? text : platform::filled(frame_, {text});
+    return isPlain_ ? text : platform::filled(frame_, {text});
 }
 
 long IcuDistanceCalculator::measurementSystem() const {

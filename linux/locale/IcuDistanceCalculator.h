@@ -3,7 +3,6 @@
 #include <memory>
 #include <optional>
 #include <string>
-#include <unordered_map>
 
 #include "platform/client/DistanceCalculator.h"
 #include "platform/location/Geodesy.h"
@@ -33,15 +32,6 @@ class IcuDistanceCalculator : public platform::DistanceCalculator {
 
   private:
     struct Formatter;
-    struct Ends {
-        platform::Coordinate from;
-        platform::Coordinate to;
-        bool operator==(const Ends&) const = default;
-    };
-    struct EndsHash {
-        std::size_t operator()(const Ends& ends) const;
-    };
-
     /// Without the host's frame; empty for a distance that is negative or not finite.
     std::string worded(double metres) const;
     std::string framed(const std::string& text) const;
@@ -51,9 +41,9 @@ class IcuDistanceCalculator : public platform::DistanceCalculator {
     std::shared_ptr<platform::Geodesy> geodesy_;
     /// The host's, read once.
     std::string frame_;
+    /// Whether it is the distance and nothing else.
+    bool isPlain_ = true;
     std::unique_ptr<Formatter> formatter_;
-    /// Cached words of late distances: at each refresh most friends are where they were.
-    std::unordered_map<Ends, std::string, EndsHash> known_;
 };
 
 }  // namespace ktr::linux_

@@ -2,9 +2,11 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cmath>
 #include <limits>
 #include <random>
+#include <utility>
 
 #include <unicode/locid.h>
 #include <unicode/numberformatter.h>
@@ -104,36 +106,65 @@ TEST_F(IcuDistanceCalculatorTest, ManyDistances_AreWordedAsIcuWordsRoads) {
     }
 }
 
-TEST_F(IcuDistanceCalculatorTest, SamePlacesAgain_AreNotMeasuredAgain) {
-    struct CountingGeodesy : GeographicLibGeodesy {
-        double distance(const platform::Coordinate& from, const platform::Coordinate& to) const override {
-            ++asked;
-            return GeographicLibGeodesy::distance(from, to);
-        }
-        mutable int asked = 0;
-    };
+namespace {
+
+struct CountingGeodesy : GeographicLibGeodesy {
+    double distance(const platform::Coordinate& from, const platform::Coordinate& to) const override {
+        ++asked;
+        return GeographicLibGeodesy::distance(from, to);
+    }
+    mutable int asked = 0;
+};
+
+/// Tells nothing without measuring.
+struct MeasuringGeodesy : GeographicLibGeodesy {
+    std::optional<Bounds> distanceBounds(const platform::Coordinate&, const platform::Coordinate&) const override {
+        return std::nullopt;
+    }
+};
+
+platform::PlatformLocation at(double latitude, double longitude) {
+    platform::PlatformLocation::Fix fix;
+    fix.coordinate = {latitude, longitude};
+    return platform::PlatformLocation(fix);
+}
+
+}  // namespace
+
+TEST_F(IcuDistanceCalculatorTest, WordsThatAreKnown_AreFoundWithoutMeasuring) {
     const auto geodesy = std::make_shared<CountingGeodesy>();
     IcuDistanceCalculator calculator({"group", "en-GB", "de-DE", nullptr}, std::nullopt, geodesy);
-    const auto at = [](double latitude, double longitude) {
-        platform::PlatformLocation::Fix fix;
-        fix.coordinate = {latitude, longitude};
-        return platform::PlatformLocation(fix);
-    };
     const auto user = at(50.0, 8.0);
-    EXPECT_EQ(calculator.localizedDistance(user, at(51.0, 8.0)), "111\u00a0km");
-    EXPECT_EQ(calculator.localizedDistance(user, at(51.0, 8.0)), "111\u00a0km");
-    EXPECT_EQ(geodesy->asked, 1);
-    EXPECT_EQ(calculator.localizedDistance(user, at(52.0, 8.0)), "222\u00a0km");
-    EXPECT_EQ(calculator.localizedDistance(at(51.0, 8.0), user), "111\u00a0km");
-    EXPECT_EQ(calculator.localizedDistance(at(8.0, 51.0), user), calculator.localizedDistance(user, at(8.0, 51.0)));
-    EXPECT_EQ(geodesy->asked, 5);
+    const auto wordAll = [&](double walked) {
+        for (int i = 0; i < 1000; ++i) {
+            calculator.localizedDistance(user, at(50.01 + 0.0007 * i + walked, 8.0 - walked));
+        }
+        return std::exchange(geodesy->asked, 0);
+    };
+    wordAll(0.0);
+    // Everybody walks on, to distances that were not worded yet as well: a few are measured, where a digit turns.
+    EXPECT_LT(wordAll(0.0003), 100);
+    EXPECT_LT(wordAll(0.0003), 20) << "and the same once more";
     EXPECT_EQ(calculator.localizedDistance(user, at(NAN, 8.0)), std::nullopt);
-    // More than are kept: each is still its own.
-    for (int i = 0; i < 20000; ++i) {
-        calculator.localizedDistance(user, at(50.0 + 0.0001 * i, 8.0));
+}
+
+TEST_F(IcuDistanceCalculatorTest, Words_AreThoseOfTheMeasuredDistance) {
+    std::mt19937 random(7);
+    std::uniform_real_distribution<double> unit(-1.0, 1.0);
+    for (const char* tag : {"de-DE", "en-GB", "en-US", "sv-SE", "ar-EG", "ja-JP"}) {
+        const platform::DistanceCalculator::Settings settings{"group", std::nullopt, tag, nullptr};
+        IcuDistanceCalculator quick(settings, std::nullopt, std::make_shared<GeographicLibGeodesy>());
+        IcuDistanceCalculator exact(settings, std::nullopt, std::make_shared<MeasuringGeodesy>());
+        for (const double degrees : {1e-4, 1e-3, 0.02, 0.5, 10.0, 90.0}) {
+            for (int i = 0; i < 1000; ++i) {
+                const auto from = at(80.0 * unit(random), 180.0 * unit(random));
+                const auto to = at(std::clamp(from.coordinate().latitude + degrees * unit(random), -90.0, 90.0),
+                                   std::remainder(from.coordinate().longitude + degrees * unit(random), 360.0));
+                ASSERT_EQ(quick.localizedDistance(from, to), exact.localizedDistance(from, to))
+                    << tag << ", " << GeographicLibGeodesy().distance(from.coordinate(), to.coordinate()) << " m";
+            }
+        }
     }
-    EXPECT_EQ(calculator.localizedDistance(user, at(51.0, 8.0)), "111\u00a0km");
-    EXPECT_EQ(calculator.localizedDistance(user, at(52.0, 8.0)), "222\u00a0km");
 }
 
 TEST_F(IcuDistanceCalculatorTest, EveryBlankIsOneThatDoesNotBreak) {
