@@ -91,13 +91,19 @@ class LiveWindowTest(WindowCase):
 
     def url_of(self, at):
         """The URL of what stands there once it can be pressed."""
+        before = len(self.output.read_text().split())
+
         def pressed():
             self.click(at)
             time.sleep(0.2)
-            return self.output.read_text().split()
-        url = wait_for(f"a link at {at}", pressed)[-1]
+            return self.output.read_text().split()[before:]
+        urls = wait_for(f"a link at {at}", pressed)
+        # What several clicks gave comes at its own time.
+        written = None
+        while written != (written := self.output.read_text()):
+            time.sleep(0.3)
         self.xdotool("mousemove", "--window", self.window, 200, 700)
-        return url
+        return urls[-1]
 
     def wait_for_change(self, what, part):
         first = self.picture(part)
@@ -149,7 +155,7 @@ class LiveWindowTest(WindowCase):
         self.xdotool("key", "Escape")
         self.xdotool("type", "--delay", 5, "otto")
         self.xdotool("key", "Return")
-        self.assertEqual(self.url_of(ON_MAP), otto)
+        wait_for("the second answer", lambda: self.url_of(ON_MAP) == otto)
         # Beyond the newest answer's row and map stands the button, beyond that the settings', and beyond that the field.
         self.click(FIELD)
         self.xdotool("type", "--delay", 5, "where is ")
