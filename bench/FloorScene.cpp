@@ -94,6 +94,11 @@ void FloorScene::build(const RowsFile& file, std::size_t count, double width) {
     }
 }
 
+void FloorScene::shapeName(const std::string& name) {
+    double ignored = 0.0;
+    shaped(QString::fromStdString(name), nameFont(), ignored);
+}
+
 void FloorScene::updateAll(bool next) {
     for (Row& row : rows_) {
         fill(row, next);

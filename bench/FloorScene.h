@@ -19,6 +19,7 @@ class FloorScene : public Scene {
     double height() const override;
     void paint(QImage& image, double scale) override;
     void clear() override { rows_.clear(); }
+    void shapeName(const std::string& name) override;
 
   private:
     struct Text {

@@ -187,6 +187,16 @@ bool KtrScene::write(const QImage& image, const QString& path) {
     return file.open(QIODevice::WriteOnly) && file.write(data) == data.size();
 }
 
+void KtrScene::shapeName(const std::string& name) {
+    if (!platform_) {
+        installPlatform();
+    }
+    TextContainer oneLine;
+    oneLine.maximumLines = 1;
+    oneLine.lineBreakMode = LineBreakMode::TruncatingTail;
+    platform_->textEngine->layOut(AttributedString(name, preferredFont(TextStyle::Headline)), oneLine);
+}
+
 void KtrScene::clear() {
     rows_.clear();
     stack_.reset();

@@ -26,6 +26,7 @@ class KtrScene : public Scene {
     void paint(QImage& image, double scale) override;
     void clear() override;
     bool write(const QImage& image, const QString& path) override;
+    void shapeName(const std::string& name) override;
 
   private:
     void installPlatform();

@@ -2,6 +2,7 @@
 
 #include <QImage>
 #include <cstddef>
+#include <string>
 
 #include "bench/RowsFile.h"
 
@@ -22,11 +23,13 @@ class Scene {
     /// Paints everything into an image of the scene's size times `scale`.
     virtual void paint(QImage& image, double scale) = 0;
     virtual void clear() = 0;
+    /// Shapes a name on one line, as a row's label has it, and drops it.
+    virtual void shapeName(const std::string& name) = 0;
     /// Writes a PNG; false when that fails.
     virtual bool write(const QImage& image, const QString& path) { return image.save(path, "PNG"); }
 };
 
-/// The command line of a bench program: `--json FILE --png FILE` or `--json FILE --bench MS`.
+/// The command line of a bench program: `--json FILE` and what to do with it.
 int runBenchProgram(int argc, char** argv, Scene& scene);
 
 }  // namespace ktr::bench
