@@ -32,6 +32,8 @@ class LineShaper {
     std::optional<Line> shaped(const PreparedText& text, const FontChoice& fonts, int pixelSize, bool rightToLeft,
                                double baseline);
     std::size_t shapedWords() const { return words_.shapedCount(); }
+    /// Those of them that took Qt's layout.
+    std::size_t wordsShapedByQt() const { return words_.shapedByQtCount(); }
 
   private:
     /// Part of the text in one family, script and direction, blanks or none.

@@ -42,6 +42,10 @@ quint16 fontNumber(const QRawFont& font) {
     return static_cast<quint16>(found - known.begin());
 }
 
+bool belongsToEveryScript(QStringView word) {
+    return std::all_of(word.begin(), word.end(), [](QChar c) { return c.script() == QChar::Script_Common; });
+}
+
 }  // namespace
 
 const QRawFont& WordShaper::font(quint16 number) {
@@ -84,7 +88,11 @@ const WordShaper::Word* WordShaper::keep(Key key, Word word) {
 }
 
 WordShaper::Word WordShaper::shapedOnce(const Setting& setting, QStringView word) {
-    WordFont* const font = WordFont::of(setting.font, setting.script);
+    WordFont* font = WordFont::of(setting.font, setting.script);
+    if (font == nullptr && !setting.rightToLeft && belongsToEveryScript(word)) {
+        // A number beside letters of another family: alone, as Qt would be given it, it has no script.
+        font = WordFont::of(setting.font, QChar::Script_Common);
+    }
     const auto letters = font != nullptr ? font->shaped(word, setting.rightToLeft) : std::nullopt;
     Word made;
     if (letters) {
@@ -105,7 +113,11 @@ WordShaper::Word WordShaper::shapedOnce(const Setting& setting, QStringView word
     };
     const auto characters = word.toUcs4();
     made.isCertain = std::all_of(characters.begin(), characters.end(), letterIn);
-    return made.isCertain ? shapedByQt(setting, word) : made;
+    if (!made.isCertain) {
+        return made;
+    }
+    ++shapedByQt_;
+    return shapedByQt(setting, word);
 }
 
 WordShaper::Word WordShaper::shapedByQt(const Setting& setting, QStringView word) {

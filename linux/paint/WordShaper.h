@@ -36,6 +36,8 @@ class WordShaper {
     const Word* shaped(const FontSpec& font, QChar::Script script, QStringView word, bool rightToLeft);
     /// How many words were shaped.
     std::size_t shapedCount() const { return shaped_; }
+    /// Of these, how many Qt's layout shaped, which takes several times as long.
+    std::size_t shapedByQtCount() const { return shapedByQt_; }
     /// A font by its number in a word; valid until the application ends.
     static const QRawFont& font(quint16 number);
 
@@ -68,7 +70,7 @@ class WordShaper {
     };
     std::size_t numberOf(const Setting& setting);
     const Word* keep(Key key, Word word);
-    static Word shapedOnce(const Setting& setting, QStringView word);
+    Word shapedOnce(const Setting& setting, QStringView word);
     static Word shapedByQt(const Setting& setting, QStringView word);
 
     std::vector<Setting> settings_;
@@ -78,6 +80,7 @@ class WordShaper {
     Words words_;
     Words older_;
     std::size_t shaped_ = 0;
+    std::size_t shapedByQt_ = 0;
 };
 
 }  // namespace ktr::linux_

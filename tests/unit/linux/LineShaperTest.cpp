@@ -108,6 +108,25 @@ TEST_F(LineShaperTest, Words_AreShapedOnce) {
     EXPECT_EQ(shaper_.shapedWords(), 5U);
 }
 
+// Names have numbers, distances are numbers: beside letters of any script each new one took Qt's layout.
+TEST_F(LineShaperTest, NewNumbersBesideAnyScript_AreSetWithoutQtsLayout) {
+    const std::vector<std::string> names = {"Ann", "Юлия", "ليلى حداد", "נועם ברק", "佐藤 美咲", "さくら", "김 민준"};
+    const auto setBeside = [&](int number) {
+        for (const std::string& name : names) {
+            const Label label{name + " " + std::to_string(number++)};
+            const auto line = shaped(label);
+            ASSERT_TRUE(line) << label;
+            EXPECT_DOUBLE_EQ(line->width, byQt(label).lines.front().box.width) << label;
+        }
+    };
+    setBeside(100);
+    const std::size_t before = shaper_.wordsShapedByQt();
+    const std::size_t words = shaper_.shapedWords();
+    setBeside(200);
+    EXPECT_EQ(shaper_.shapedWords(), words + names.size()) << "the numbers alone are new";
+    EXPECT_EQ(shaper_.wordsShapedByQt(), before);
+}
+
 // What was asked for lately stays; all else goes.
 TEST_F(LineShaperTest, ManyWords_AreForgottenButTheLatest) {
     for (int i = 0; i < 10000; ++i) {
