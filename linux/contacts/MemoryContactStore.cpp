@@ -87,9 +87,7 @@ MemoryContactStore::MemoryContactStore(Contacts contacts, std::shared_ptr<Phonen
 
 MemoryContactStore::~MemoryContactStore() = default;
 
-platform::ContactStore::Contacts MemoryContactStore::contactsAt(std::vector<std::size_t> positions) const {
-    std::sort(positions.begin(), positions.end());
-    positions.erase(std::unique(positions.begin(), positions.end()), positions.end());
+platform::ContactStore::Contacts MemoryContactStore::contactsAt(const std::vector<std::size_t>& positions) const {
     Contacts out;
     out.reserve(positions.size());
     for (const std::size_t position : positions) {
@@ -130,7 +128,7 @@ platform::ContactFetch<platform::ContactStore::Contacts> MemoryContactStore::uni
             positions.push_back(candidate.contact);
         }
     }
-    return {contactsAt(std::move(positions)), std::nullopt};
+    return {contactsAt(positions), std::nullopt};
 }
 
 platform::ContactFetch<std::shared_ptr<platform::Contact>> MemoryContactStore::unifiedContactWithIdentifier(

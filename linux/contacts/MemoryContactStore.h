@@ -42,8 +42,8 @@ class MemoryContactStore : public platform::ContactStore {
 
     bool matches(const std::string& stored, const std::string& asked,
                  const std::optional<PhoneNumberParts>& askedParts) const;
-    /// The contacts at these positions, each once, in the store's order.
-    Contacts contactsAt(std::vector<std::size_t> positions) const;
+    /// The contacts at these positions, which are in the store's order, each once.
+    Contacts contactsAt(const std::vector<std::size_t>& positions) const;
 
     Contacts contacts_;
     std::shared_ptr<PhonenumberLibrary> phoneNumbers_;
