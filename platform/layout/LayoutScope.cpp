@@ -56,13 +56,10 @@ void LayoutScope::remove(const ConstraintRule& rule) {
         return;
     }
     held.erase(found);
-    std::erase_if(remembered_, [&rule](LayoutConstraint* constraint) {
-        const bool isRemoved = constraint->rule() == rule;
-        if (isRemoved) {
-            constraint->owner_ = ViewReference();
-        }
-        return isRemoved;
-    });
+    while (LayoutConstraint* const removed = remembered(rule)) {
+        removed->owner_ = ViewReference();
+        forget(*removed);
+    }
     arrangesSubviews_ =
         std::any_of(held.begin(), held.end(), [this](const auto& other) { return isAboutOthers(other); });
     setRules(std::move(held));
@@ -74,20 +71,25 @@ bool LayoutScope::holds(const ConstraintRule& rule) const {
 }
 
 void LayoutScope::remember(LayoutConstraint& constraint) {
-    remembered_.push_back(&constraint);
+    if (!remembered_) {
+        remembered_ = std::make_unique<std::vector<LayoutConstraint*>>();
+    }
+    remembered_->push_back(&constraint);
 }
 
 void LayoutScope::forget(const LayoutConstraint& constraint) {
-    std::erase(remembered_, &constraint);
-    if (remembered_.empty()) {
-        remembered_.shrink_to_fit();
+    if (remembered_ && std::erase(*remembered_, &constraint) > 0 && remembered_->empty()) {
+        remembered_.reset();
     }
 }
 
 LayoutConstraint* LayoutScope::remembered(const ConstraintRule& rule) const {
-    const auto found = std::find_if(remembered_.begin(), remembered_.end(),
+    if (!remembered_) {
+        return nullptr;
+    }
+    const auto found = std::find_if(remembered_->begin(), remembered_->end(),
                                     [&rule](const LayoutConstraint* known) { return known->rule() == rule; });
-    return found == remembered_.end() ? nullptr : *found;
+    return found == remembered_->end() ? nullptr : *found;
 }
 
 /// Whether a rule mentions another view than the owner.

@@ -69,7 +69,8 @@ class KTR_API LayoutScope {
     View& owner_;
     /// Empty while the equations hold them: rows of one class share what their rules say.
     std::vector<ConstraintRule> rules_;
-    std::vector<LayoutConstraint*> remembered_;
+    /// None where none said what is held, as in the rows of lists.
+    std::unique_ptr<std::vector<LayoutConstraint*>> remembered_;
     LayoutEquations equations_;
     std::shared_ptr<LayoutStructure> structure_;  // none: to be built
     std::vector<Fitting> fittings_;               // what was asked since an input changed

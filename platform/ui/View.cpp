@@ -118,7 +118,12 @@ void View::addSubview(const std::shared_ptr<View>& view) {
     }
     view->removeFromSuperview();
     view->superview_ = this;
-    madeChildren().subviews.push_back(view);
+    auto& views = madeChildren().subviews;
+    if (views.size() == views.capacity()) {
+        // By half and not twice as many: lists are made of thousands of views with few subviews each.
+        views.reserve(views.size() + std::max<std::size_t>(1, views.size() / 2));
+    }
+    views.push_back(view);
     subviewsChanged();
     LayoutScope::inputChanged(*this);
     if (view->isMarked()) {

@@ -63,6 +63,20 @@ TEST_F(LayoutScopeTest, EqualConstraints_AreHeldOnce) {
     EXPECT_EQ(view->frame().x, 6.0);
 }
 
+TEST_F(LayoutScopeTest, EqualConstraints_AreTakenAwayTogether) {
+    const auto view = subview(root);
+    const auto one = view->leftAnchor().constraintEqualTo(root->leftAnchor(), 5);
+    const auto another = view->leftAnchor().constraintEqualTo(root->leftAnchor(), 5);
+    root->addConstraints({one, another});
+    EXPECT_TRUE(one->isActive());
+    EXPECT_TRUE(another->isActive());
+    root->removeConstraint(one);
+    EXPECT_TRUE(root->constraints().empty());
+    root->addConstraint(view->leftAnchor().constraintEqualTo(root->leftAnchor(), 5));
+    EXPECT_FALSE(one->isActive());
+    EXPECT_FALSE(another->isActive());
+}
+
 TEST_F(LayoutScopeTest, Active_IsHeldByTheNearestCommonAncestor) {
     const auto middle = subview(root);
     const auto a = subview(middle);
