@@ -1,7 +1,9 @@
 #include "app/AddedMaps.h"
 
 #include <algorithm>
+#include <map>
 #include <system_error>
+#include <tuple>
 
 #include "documents/AtomicFile.h"
 #include "host/Resources.h"
@@ -9,6 +11,7 @@
 #include "linux/locale/LocaleRegion.h"
 #include "linux/maps/MapFile.h"
 #include "linux/maps/MbtilesLoader.h"
+#include "tiles/TilesetFacts.h"
 
 namespace ktr::app {
 
@@ -20,6 +23,23 @@ constexpr const char* kEnding = ".mbtiles";
 
 fs::path folder() {
     return linux_::XdgFolders::data() / "maps";
+}
+
+std::string fileName(const fs::path& place) {
+    return tiles::TilesetFacts::plainText(place.stem().string());
+}
+
+/// What one program has made often bears that program's name.
+void tellApart(std::vector<AddedMaps::Map>& maps) {
+    std::map<std::string, int> times;
+    for (const auto& map : maps) {
+        ++times[map.name];
+    }
+    for (auto& map : maps) {
+        if (const std::string file = fileName(map.place); times[map.name] > 1 && file != map.name) {
+            map.name += " (" + file + ")";
+        }
+    }
 }
 
 /// A link takes the place of whatever is there in one step.
@@ -61,11 +81,21 @@ std::vector<AddedMaps::Map> AddedMaps::list() {
         if (at->path().extension() == kEnding) {
             std::error_code gone;
             const auto bytes = fs::file_size(at->path(), gone);
-            maps.push_back({at->path(), at->path().stem().string(), gone ? 0 : bytes});
+            maps.push_back({at->path(), nameOf(at->path()), gone ? 0 : bytes});
         }
     }
-    std::sort(maps.begin(), maps.end(), [](const Map& one, const Map& other) { return one.name < other.name; });
+    tellApart(maps);
+    std::sort(maps.begin(), maps.end(), [](const Map& one, const Map& other) {
+        return std::tie(one.name, one.place) < std::tie(other.name, other.place);
+    });
     return maps;
+}
+
+std::string AddedMaps::nameOf(const fs::path& place) {
+    std::string error;
+    const auto file = linux_::MbtilesLoader::open(place.string(), error);
+    const std::string name = file ? tiles::TilesetFacts::of(file->metadata()).name : "";
+    return name.empty() ? fileName(place) : name;
 }
 
 std::variant<std::string, AddedMaps::Problem> AddedMaps::add(const std::string& given) {

@@ -14,12 +14,15 @@ class AddedMaps {
   public:
     struct Map {
         std::filesystem::path place;  ///< in the folder of maps
-        std::string name;             ///< of the file, without its ending
+        std::string name;             ///< see `nameOf`
         std::uintmax_t bytes = 0;     ///< 0: it is not there any more
     };
 
-    /// By name.
+    /// By name. What several maps are called is followed by the names of their files.
     static std::vector<Map> list();
+    /// What the map says that it is called, as a short line; the file's name without its ending where it says nothing
+    /// or cannot be read.
+    static std::string nameOf(const std::filesystem::path& place);
 
     struct Problem {
         std::string why;  ///< one line

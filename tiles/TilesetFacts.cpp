@@ -63,9 +63,10 @@ TilesetFacts TilesetFacts::of(const std::map<std::string, std::string>& metadata
     facts.coarsest = levelOf(valueOf(metadata, "minzoom"));
     facts.finest = levelOf(valueOf(metadata, "maxzoom"));
     facts.bounds = boundsOf(valueOf(metadata, "bounds"));
+    facts.name = plainText(valueOf(metadata, "name"));
     facts.attribution = plainText(valueOf(metadata, "attribution"));
     if (facts.attribution.empty()) {
-        facts.attribution = plainText(valueOf(metadata, "name"));
+        facts.attribution = facts.name;
     }
     if (facts.attribution.empty()) {
         facts.attribution = "Offline map";

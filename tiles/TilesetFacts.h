@@ -19,6 +19,7 @@ struct TilesetFacts {
     std::optional<int> coarsest;  ///< levels, 0 to 30
     std::optional<int> finest;
     std::optional<Bounds> bounds;  ///< none for one that says nothing, or nonsense
+    std::string name;              ///< plain text; empty when it has none
     std::string attribution;       ///< plain text; without one the set's name, or "Offline map"
 
     static TilesetFacts of(const std::map<std::string, std::string>& metadata);

@@ -23,8 +23,8 @@ namespace {
 constexpr int kFrame = 16;  // milliseconds
 /// Scrolling rests after so long: what only passes by is told nothing. Milliseconds.
 constexpr int kRest = 250;
-/// A lower window shows no times.
-constexpr int kLowestWithTimes = 300;
+/// A lower window shows no times, and leaves the room above the first turn scrolled away.
+constexpr int kLowestUsual = 300;
 
 }  // namespace
 
@@ -65,6 +65,7 @@ ConversationWidget::ConversationWidget(host::Host& host, QWidget* parent)
     connect(bar_, &QScrollBar::valueChanged, this, [this] {
         update();
         AccessibleConversation::moved(*this);
+        tellMoved();
         lookLater();
     });
     restTimer_.setSingleShot(true);
@@ -137,7 +138,7 @@ void ConversationWidget::layOut() {
     const auto turn = anchor();
     const double before = turn ? host_.conversation()->topOf(*turn) : 0.0;
     host_.conversation()->advance(seconds());
-    host_.conversation()->setShowsTimes(window()->height() >= kLowestWithTimes);
+    host_.conversation()->setShowsTimes(!isLow());
     contentHeight_ = host_.layOut(width());
     layingOut_ = false;
     updateBar();
@@ -147,6 +148,7 @@ void ConversationWidget::layOut() {
     rings_.update();
     update();
     rowsChanged();
+    tellMoved();
     lookLater();
     if (heightsChanged_) {
         requestLayout();
@@ -209,6 +211,7 @@ void ConversationWidget::move() {
         }
     }
     update();
+    tellMoved();
     if (!moves && !scrollFrom_) {
         motionTimer_.stop();
         AccessibleConversation::changed(*this);
@@ -290,7 +293,7 @@ void ConversationWidget::scrollTo(double y) {
 double ConversationWidget::newestTop() const {
     const auto& turns = host_.conversation()->turns();
     if (turns.size() < 2) {
-        return 0.0;
+        return isLow() ? host_.conversation()->head() : 0.0;
     }
     // Side by side, question and card begin at their turn's very top: the space above them belongs to neither.
     const double above = width() >= host::measures::kWideFrom ? host::measures::kCardToQuestion : 0.0;
@@ -298,7 +301,7 @@ double ConversationWidget::newestTop() const {
 }
 
 void ConversationWidget::scrollToNewest(bool moves) {
-    if (host_.conversation()->turns().size() < 2) {
+    if (host_.conversation()->turns().size() < 2 && newestTop() == 0.0) {
         return;
     }
     if (moves && host_.conversation()->motionStyle() == host::MotionStyle::Full) {
@@ -339,6 +342,27 @@ void ConversationWidget::setHighContrast(bool high) {
         host_.setDesktopHighContrast(high);
         choosePalette();
     }
+}
+
+bool ConversationWidget::isLow() const {
+    return window()->height() < kLowestUsual;
+}
+
+void ConversationWidget::tellMoved() const {
+    if (moved_) {
+        moved_();
+    }
+}
+
+void ConversationWidget::setCorner(const QSizeF& corner) {
+    if (std::exchange(corner_, corner) != corner) {
+        host_.conversation()->setCorner({corner.width(), corner.height()});
+        layOut();
+    }
+}
+
+bool ConversationWidget::showsSomethingIn(const QRectF& rect) const {
+    return host_.conversation()->showsSomethingIn({rect.x(), rect.y() + scrolled(), rect.width(), rect.height()});
 }
 
 bool ConversationWidget::isOnScreen(const host::TurnView& turn) const {

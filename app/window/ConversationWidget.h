@@ -56,6 +56,12 @@ class ConversationWidget : public QWidget {
     /// Called after the colours have become others.
     void setPaletteChanged(std::function<void()> changed) { paletteChanged_ = std::move(changed); }
     const RowFocus& rows() const { return rows_; }
+    /// Called when what is shown may stand elsewhere than before.
+    void setMoved(std::function<void()> moved) { moved_ = std::move(moved); }
+    /// What stands over the top end corner reaches so far from both edges.
+    void setCorner(const QSizeF& corner);
+    /// Whether something is said or shown in a rectangle of the widget.
+    bool showsSomethingIn(const QRectF& rect) const;
     /// The host has made everything anew: cards are others, and the language may be.
     void remade();
     /// Made once somebody asks for it; from then on it hears what changes.
@@ -104,12 +110,14 @@ class ConversationWidget : public QWidget {
     void lookLater();
     void look();
     bool isOnScreen(const host::TurnView& turn) const;
+    bool isLow() const;
     /// Where the turn stands on screen that the reader's eye is on: the first that is seen.
     std::shared_ptr<host::TurnView> anchor() const;
     void keepInPlace(const std::shared_ptr<host::TurnView>& turn, double before);
     /// Lays out again after a card's height changed; its top, or else its bottom, stays where it is on screen.
     void resizeCard(platform::HostSnippetViewController& controller, bool pinTop);
     void updateBar();
+    void tellMoved() const;
     /// How far is scrolled when the newest turn is at the top, points.
     double newestTop() const;
     void choosePalette();
@@ -136,6 +144,8 @@ class ConversationWidget : public QWidget {
     std::optional<QColor> accent_;
     linux_::Palette palette_ = linux_::Palette::of(linux_::ColorScheme::Light);
     std::function<void()> paletteChanged_;
+    std::function<void()> moved_;
+    QSizeF corner_;
     std::unique_ptr<Voice> voice_;
     bool reducedMotion_ = false;
     QScrollBar* bar_;

@@ -44,7 +44,7 @@ ConversationWindow::ConversationWindow(host::Host& host)
     }
     pages_ = new PageStack(this);
     pages_->setBelow([this](bool isSeen) {
-        for (QWidget* part : std::initializer_list<QWidget*>{conversation_, field_, status_, settings_}) {
+        for (QWidget* part : std::initializer_list<QWidget*>{conversation_, field_, status_}) {
             if (part != nullptr) {
                 part->setVisible(isSeen && (part != status_ || !isVeryLow()));
             }
@@ -55,6 +55,9 @@ ConversationWindow::ConversationWindow(host::Host& host)
         cover(!isSeen);
         if (isSeen && live_) {
             greet(live_->status());
+        }
+        if (settings_ != nullptr) {
+            settings_->look();
         }
     });
     notice_ = new Notice(this);
@@ -100,7 +103,7 @@ void ConversationWindow::addField() {
     field_->edit().installEventFilter(this);
     status_ = new StatusLine(this);
     status_->setHelped([this] { help(); });
-    settings_ = new IconButton(Icon::Settings, IconButton::Tone::Soft, this);
+    settings_ = new SettingsButton(*conversation_, this);
     settings_->setPressed([this] { showSettings(); });
     settings_->setName(QString::fromStdString(host_.text("SETTINGS")));
     // From the field to the newest answer, and on to the buttons.
@@ -365,10 +368,7 @@ void ConversationWindow::place() {
     status_->place({x, y + fieldHeight + kFieldToStatus, across, status_->heightForWidth(across)});
     status_->setVisible(!isVeryLow() && !conversation_->isHidden());
     field_->raise();
-    constexpr int kSettingsTop = 8;
-    const int side = IconButton::side();
-    const int end = static_cast<int>(host::measures::kGutter);
-    settings_->placeShape({host_.rightToLeft() ? end : width() - end - side, kSettingsTop, side, side});
+    settings_->place();
     settings_->raise();
     pages_->raise();
     notice_->raise();

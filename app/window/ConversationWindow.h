@@ -13,9 +13,9 @@
 #include "app/window/LinkOpener.h"
 #include "app/window/Notice.h"
 #include "app/window/PlainWidget.h"
+#include "app/window/SettingsButton.h"
 #include "app/window/StatusLine.h"
 #include "app/window/WindowSight.h"
-#include "app/window/blocks/IconButton.h"
 #include "app/window/friend/SharingRow.h"
 #include "app/window/pages/PageStack.h"
 #include "host/live/LiveConversation.h"
@@ -48,7 +48,7 @@ class ConversationWindow : public PlainWidget {
     AskField* field() const { return field_; }
     StatusLine* status() const { return status_; }
     /// Opens the settings; none where nothing is live.
-    IconButton* settings() const { return settings_; }
+    SettingsButton* settings() const { return settings_; }
     /// What covers the conversation: settings, a friend, signing in.
     PageStack& pages() const { return *pages_; }
 
@@ -105,7 +105,7 @@ class ConversationWindow : public PlainWidget {
     AskField* field_ = nullptr;
     StatusLine* status_ = nullptr;
     PageStack* pages_;
-    IconButton* settings_ = nullptr;  ///< none where nothing is live
+    SettingsButton* settings_ = nullptr;  ///< none where nothing is live
     /// None where nothing is live, and once something was asked.
     Greeting* greeting_ = nullptr;
     Notice* notice_;

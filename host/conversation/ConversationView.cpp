@@ -1,11 +1,13 @@
 #include "host/conversation/ConversationView.h"
 
 #include <QPainter>
+#include <algorithm>
 #include <utility>
 
 #include "host/conversation/Measures.h"
 #include "host/conversation/Shapes.h"
 #include "linux/paint/QtAppearance.h"
+#include "platform/assistant/AssistantSettings.h"
 #include "platform/base/Platform.h"
 
 namespace ktr::host {
@@ -46,13 +48,31 @@ double ConversationView::layOut(double width) {
         turn->setShowsTime(showsTimes_);
         turn->layOut(width, turn == turns_.front());
     }
+    head_ = headFor(width);
     stack(width);
     return frame().height;
 }
 
+double ConversationView::headFor(double width) const {
+    if (width >= measures::kWideFrom || turns_.empty()) {
+        return 0.0;
+    }
+    const platform::Rect corner{width - corner_.width, 0.0, corner_.width, corner_.height};
+    const bool isRightToLeft = platform::Platform::installed()->assistant->languageIsRightToLeft();
+    const bool isMet = turns_.front()->showsSomethingIn(mirrored(corner, width, isRightToLeft));
+    return isMet ? corner_.height + measures::kCornerToTurn - measures::kTimeAbove : 0.0;
+}
+
+bool ConversationView::showsSomethingIn(const platform::Rect& rect) const {
+    return std::any_of(turns_.begin(), turns_.end(), [&](const auto& turn) {
+        return turn->frame().intersects(rect) &&
+               turn->showsSomethingIn(rect.offsetBy(-turn->frame().x, -turn->frame().y));
+    });
+}
+
 void ConversationView::stack(double width) {
     const bool wide = width >= measures::kWideFrom;
-    double y = wide ? measures::kWideTop : 0.0;
+    double y = wide ? measures::kWideTop : head_;
     for (const auto& turn : turns_) {
         if (wide && turn != turns_.front()) {
             y += measures::kCardToQuestion;

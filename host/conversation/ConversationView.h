@@ -26,6 +26,13 @@ class ConversationView : public platform::View {
     void setGetStreets(std::function<void()> get);
     /// Whether a narrow conversation has room for its times; laid out with the next width.
     void setShowsTimes(bool shows) { showsTimes_ = shows; }
+    /// What a host puts over the top end corner reaches so far from both edges; nothing at first. In a narrow
+    /// conversation the first turn begins below it where the two would meet; laid out with the next width.
+    void setCorner(const platform::Size& corner) { corner_ = corner; }
+    /// How much room that takes above the first turn, points.
+    double head() const { return head_; }
+    /// Whether something is said or shown in a rectangle of this view.
+    bool showsSomethingIn(const platform::Rect& rect) const;
     /// What may move from now on; no turn does, until this is called. Pins and maps do not glide in reduced motion.
     void setMotionStyle(MotionStyle style);
     MotionStyle motionStyle() const { return style_; }
@@ -43,10 +50,13 @@ class ConversationView : public platform::View {
   private:
     /// Puts the turns one under the other, and takes the height that this needs.
     void stack(double width);
+    double headFor(double width) const;
 
     MotionStyle style_ = MotionStyle::None;
     bool moves_ = false;
     bool showsTimes_ = true;
+    platform::Size corner_;
+    double head_ = 0.0;
     std::vector<std::shared_ptr<TurnView>> turns_;
     const linux_::Palette* palette_ = nullptr;
     std::function<void()> getStreets_;

@@ -43,6 +43,7 @@ inline constexpr double kFocusCorner = 17.0;
 inline constexpr double kGutter = 12.0;
 inline constexpr double kTimeAbove = 16.0;
 inline constexpr double kTimeBelow = 12.0;
+inline constexpr double kCornerToTurn = 8.0;  ///< from what a host puts over the top end corner
 inline constexpr double kBubbleShare = 0.76;  ///< of the window's width
 inline constexpr double kSentenceStart = 27.0;
 inline constexpr double kSentenceToCard = 10.0;

@@ -343,6 +343,20 @@ double TurnView::riseOf(const Motion& arrival) const {
     return style_ == MotionStyle::Full ? motions::kRise * (1.0 - arrival.at(now_)) : 0.0;
 }
 
+bool TurnView::showsSomethingIn(const Rect& rect) const {
+    const Rect whole = frameInRoot();
+    const auto meets = [&](const View& view, const Rect& shown) {
+        const Rect there = view.frameInRoot();
+        return !view.hidden() && shown.offsetBy(there.x - whole.x, there.y - whole.y).intersects(rect);
+    };
+    const auto isIn = [&](const std::shared_ptr<View>& view) { return view && meets(*view, view->bounds()); };
+    // The time's label is as wide as the conversation, and the offers have a line each.
+    const auto& offers = offers_->subviews();
+    return meets(*time_, time_->drawnTextRect()) || isIn(bubble_) || isIn(ring_) || isIn(mark_) ||
+           (!sentence_->hidden() && isIn(sentenceFade_)) || isIn(card_) || isIn(streets_) ||
+           (!offers_->hidden() && std::any_of(offers.begin(), offers.end(), isIn));
+}
+
 double TurnView::cardOpacity() const {
     return arrival_.at(now_) * answerArrival_.at(now_);
 }

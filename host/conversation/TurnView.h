@@ -89,6 +89,8 @@ class TurnView : public platform::View {
     double height() const { return height_; }
     /// How far the turn still is below its place, points.
     double rise() const { return riseOf(arrival_); }
+    /// Whether something of the turn is said or shown in a rectangle of this view.
+    bool showsSomethingIn(const platform::Rect& rect) const;
     /// How much of the card's shadow is seen, from 0 to 1.
     double cardOpacity() const;
 

@@ -14,7 +14,7 @@ class Canvas;
 
 /// The ground of one map: asks the installed source for pictures, at most one at a time, and draws the ones it has
 /// where the map is at the moment. Main thread.
-class MapBackdrop {
+class KTR_API MapBackdrop {
   public:
     /// `changed` is called when it has to be painted again; it may outlive nothing that it uses.
     explicit MapBackdrop(std::function<void()> changed);

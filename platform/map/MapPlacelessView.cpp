@@ -1,6 +1,9 @@
 #include "platform/map/MapPlacelessView.h"
 
+#include <algorithm>
 #include <limits>
+#include <memory>
+#include <vector>
 
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/assistant/Localization.h"
@@ -17,7 +20,9 @@ constexpr double kRadius = 34.0;
 constexpr double kCentreDown = 88.0;  ///< of a map that is kUsualHeight high; of others the same share
 constexpr double kUsualHeight = 219.0;
 constexpr double kStroke = 1.8;
-constexpr double kWordsBelow = 70.0;  ///< the centre
+constexpr double kWordsBelow = 70.0;  ///< their lower edge, below the centre
+constexpr double kToWords = 6.0;      ///< at least, from the circle
+constexpr double kMargin = 8.0;       ///< of the circle and of the words, above and below
 /// Twenty dashes of 6.1 points, with 4.58 between them.
 constexpr int kDashes = 20;
 constexpr double kDashShare = 6.1 / (6.1 + 4.58);
@@ -44,6 +49,36 @@ void drawCircle(Canvas& canvas, Point centre) {
     canvas.stroke(shoulders, edge, {kStroke, true});
 }
 
+/// Where a line begins that is in the middle of what is left and right of what it would touch.
+double clearOf(const std::vector<Rect>& taken, const Rect& line, const Rect& free) {
+    double from = free.x;
+    double to = free.maxX();
+    for (const Rect& rect : taken) {
+        if (!rect.intersects(line)) {
+            continue;
+        }
+        const double before = rect.x - from;
+        const double after = to - rect.maxX();
+        (before < after ? from : to) = before < after ? rect.maxX() : rect.x;
+    }
+    return from == free.x && to == free.maxX() ? line.x : (from + to - line.width) / 2.0;
+}
+
+std::shared_ptr<const TextLayout> layOutWords() {
+    const auto installed = Platform::installed();
+    if (!installed || !installed->localization || !installed->textEngine) {
+        return nullptr;
+    }
+    const auto& texts = *installed->localization;
+    TextContainer container;
+    container.width = std::numeric_limits<double>::infinity();
+    container.rightToLeft = installed->assistant && installed->assistant->languageIsRightToLeft();
+    container.alignment = TextAlignment::Left;
+    return installed->textEngine->layOut(AttributedString(texts.text("MAP_NO_PLACE", texts.hostBundleIdentifier()),
+                                                          preferredFont(TextStyle::Subheadline)),
+                                         container);
+}
+
 }  // namespace
 
 bool MapPlacelessView::initWithFrame(const Rect& frame) {
@@ -51,26 +86,34 @@ bool MapPlacelessView::initWithFrame(const Rect& frame) {
     return View::initWithFrame(frame);
 }
 
+void MapPlacelessView::setFree(const Rect& free, const std::vector<Rect>& taken) {
+    if (free_ != free || taken_ != taken) {
+        free_ = free;
+        taken_ = taken;
+        setNeedsDisplay();
+    }
+}
+
 void MapPlacelessView::draw(Canvas& canvas) const {
     canvas.fill(bounds(), Color::ofRole(ColorRole::MapLand));
-    const Point centre{bounds().width / 2.0, bounds().height * kCentreDown / kUsualHeight};
-    drawCircle(canvas, centre);
-    const auto installed = Platform::installed();
-    if (!installed || !installed->localization || !installed->textEngine) {
-        return;
+    const Rect free = free_.value_or(bounds());
+    const auto words = layOutWords();
+    const Size size = words ? words->usedSize() : Size{};
+    const double toWords =
+        std::max(kWordsBelow - preferredFont(TextStyle::Subheadline).lineHeight(), kRadius + kToWords);
+    const double below = words ? toWords + size.height : kRadius;
+    Point centre{free.x + free.width / 2.0, free.y + free.height * kCentreDown / kUsualHeight};
+    const double highest = free.y + kMargin + kRadius;
+    const double lowest = free.maxY() - kMargin - below;
+    Rect line{centre.x - size.width / 2.0, free.y + (free.height - size.height) / 2.0, size.width, size.height};
+    if (highest <= lowest) {
+        centre.y = std::clamp(centre.y, highest, lowest);
+        drawCircle(canvas, centre);
+        line.y = centre.y + toWords;
     }
-    const auto& texts = *installed->localization;
-    TextContainer container;
-    container.width = std::numeric_limits<double>::infinity();
-    container.rightToLeft = installed->assistant && installed->assistant->languageIsRightToLeft();
-    container.alignment = TextAlignment::Left;
-    const Font font = preferredFont(TextStyle::Subheadline);
-    const auto words = installed->textEngine->layOut(
-        AttributedString(texts.text("MAP_NO_PLACE", texts.hostBundleIdentifier()), font), container);
-    if (words) {
-        const Size size = words->usedSize();
-        canvas.draw(*words, {centre.x - size.width / 2.0, centre.y + kWordsBelow - font.lineHeight()},
-                    Color::ofRole(ColorRole::StandardText));
+    line.x = clearOf(taken_, line, free);
+    if (words && size.height <= free.height) {
+        canvas.draw(*words, {line.x, line.y}, Color::ofRole(ColorRole::StandardText));
     }
 }
 

@@ -1,5 +1,8 @@
 #pragma once
 
+#include <optional>
+#include <vector>
+
 #include "platform/ui/View.h"
 
 namespace ktr::platform {
@@ -9,9 +12,16 @@ namespace ktr::platform {
 class MapPlacelessView : public View {
   public:
     bool initWithFrame(const Rect& frame) override;
+    /// Where the circle and the words go: the words alone where there is no room for both, and nothing where there is
+    /// none for them. All of the view at first. Words keep clear of what else stands over it.
+    void setFree(const Rect& free, const std::vector<Rect>& taken);
 
   protected:
     void draw(Canvas& canvas) const override;
+
+  private:
+    std::optional<Rect> free_;
+    std::vector<Rect> taken_;
 };
 
 }  // namespace ktr::platform

@@ -302,6 +302,7 @@ Rect PlatformMapView::chromeFrame() const {
 void PlatformMapView::placeChrome() {
     if (placeless_) {
         placeless_->setFrame(bounds());
+        placeless_->setFree(chromeFrame(), surroundings_.taken);
     }
     chrome_->setFrame(chromeFrame());
     MapViewport within = shown_;

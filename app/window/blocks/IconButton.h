@@ -16,6 +16,9 @@ class IconButton : public PressBlock {
     /// Of its target.
     static int side() { return controlHeight(kSide); }
 
+    /// Of what is painted of the icon in its middle: icons keep a margin in their square.
+    static double inkSideOf(Icon icon) { return kInkShare * grown(iconSide(icon)); }
+
     int around() const override { return 0; }
     int shapeHeight(int /*width*/) const override { return side(); }
     int naturalWidth() const override { return side(); }
@@ -25,6 +28,7 @@ class IconButton : public PressBlock {
 
   private:
     static constexpr int kSide = 44;
+    static constexpr double kInkShare = 0.7;
 
     const Icon icon_;
     const Tone tone_;

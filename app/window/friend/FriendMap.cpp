@@ -20,9 +20,9 @@ constexpr double kFirstMetres = 1.5;  ///< a point, where the map is first seen
 constexpr double kPinDown = 0.52;     ///< of the free height
 constexpr double kPinDownLow = 0.6;
 constexpr int kLowMap = 420;
-constexpr double kCircleShare = 0.8;     ///< of the smaller side of what is free
-constexpr double kGlide = 0.5;           ///< seconds
-constexpr double kNearMetres = 40000.0;  ///< across: from farther out a map is said to have streets anywhere
+constexpr double kCircleShare = 0.8;  ///< of the smaller side of what is free
+constexpr double kGlide = 0.5;        ///< seconds
+constexpr double kSpot = 32.0;        ///< the side of what is looked at for streets, points
 
 }  // namespace
 
@@ -90,12 +90,13 @@ void FriendMap::build() {
     window_->addSubview(map_);
     window_->setClient(client_);
     coarse_.reset();
-    lacksStreets_ = false;
+    lackedStreets_ = false;
+    spot_ = std::make_unique<MapBackdrop>([this] { streetsLookedFor(); });
     if (const auto installed = Platform::installed()) {
         streets_ = installed->notificationCenter->addObserver(kMapStreetsChangedNotification,
                                                               [this](const Notification& told) {
                                                                   if (told.sender == map_) {
-                                                                      streetsChanged();
+                                                                      goFartherOut();
                                                                   }
                                                               });
     }
@@ -107,6 +108,7 @@ void FriendMap::letGo() {
     frames_.stop();
     rest_.stop();
     streets_.remove();
+    spot_.reset();
     if (window_) {
         window_->setClient({});
     }
@@ -150,13 +152,14 @@ void FriendMap::setPlace(const std::optional<Place>& place) {
     }
     map_->addAnnotation(pin_);
     updateCircle();
+    lookForStreets();
     if (!isPlaced_ && free_.isValid()) {
         isPlaced_ = true;
         camera_.put(onMap_, pinPoint(), firstZoom());
         show(PlatformMapView::Hand::Resting);
         tell();
     } else if (isPlaced_ && !isTouched_) {
-        camera_.flyTo(onMap_, pinPoint(), camera_.shown().zoom, seconds(), isStill_ ? 0.0 : kGlide);
+        camera_.flyTo(onMap_, pinPoint(), camera_.zoomAtRest(), seconds(), isStill_ ? 0.0 : kGlide);
         startMoving();
     }
 }
@@ -176,38 +179,50 @@ Point FriendMap::pinPoint() const {
 }
 
 double FriendMap::firstZoom() const {
-    const double room = std::min(free_.width(), free_.height()) * kCircleShare;
-    const double across = 2.0 * place_->accuracy.value_or(0.0);
-    const double zoom = MapCamera::zoomFor(onMap_, std::max(kFirstMetres, room > 0.0 ? across / room : 0.0));
-    return coarse_ ? std::min(zoom, *coarse_) : zoom;
+    return coarse_ ? std::min(nearZoom(), *coarse_) : nearZoom();
 }
 
-/// What is seen elsewhere says nothing of the pin's place, and from farther out nobody misses streets.
-void FriendMap::noteStreets() {
-    const MapViewport& shown = camera_.shown();
-    if (!map_->hasStreets() && !isTouched_) {
-        lacksStreets_ = true;
-    } else if (map_->hasStreets() && place_) {
-        const bool isNear = std::min(shown.size.width, shown.size.height) * shown.metresPerPoint() < kNearMetres;
-        const bool isThere = Rect{0.0, 0.0, shown.size.width, shown.size.height}.contains(shown.pointFor(onMap_));
-        lacksStreets_ = lacksStreets_ && !(isNear && isThere);
+double FriendMap::nearZoom() const {
+    const double room = std::min(free_.width(), free_.height()) * kCircleShare;
+    const double across = 2.0 * place_->accuracy.value_or(0.0);
+    return MapCamera::zoomFor(onMap_, std::max(kFirstMetres, room > 0.0 ? across / room : 0.0));
+}
+
+/// From as near as the pin is first seen where there are streets.
+void FriendMap::lookForStreets() {
+    if (!spot_ || !place_ || !free_.isValid()) {
+        return;
     }
+    MapPictureRequest request;
+    request.viewport = {onMap_, nearZoom(), {kSpot, kSpot}};
+    spot_->want(request);
+}
+
+bool FriendMap::lacksStreets() const {
+    return place_.has_value() && spot_ && !spot_->hasStreets();
+}
+
+void FriendMap::streetsLookedFor() {
+    const bool came = std::exchange(lackedStreets_, lacksStreets()) && !lacksStreets();
+    if (came) {
+        coarse_.reset();
+        if (isPlaced_ && !isTouched_ && !isStepped_) {
+            camera_.flyTo(onMap_, pinPoint(), firstZoom(), seconds(), isStill_ ? 0.0 : kGlide);
+            startMoving();
+        }
+    }
+    goFartherOut();
+    tell();
 }
 
 /// Where there are no streets, the map is first seen from as far as a town to name is; a hand may go anywhere.
-void FriendMap::streetsChanged() {
-    noteStreets();
-    tell();
-    if (map_->hasStreets()) {
-        coarse_.reset();
-        return;
-    }
+void FriendMap::goFartherOut() {
     // Once: whoever looks closer then wants to.
-    if (coarse_ || !map_->coarseZoom()) {
+    if (!lacksStreets() || coarse_ || !map_->coarseZoom()) {
         return;
     }
     coarse_ = map_->coarseZoom();
-    if (isPlaced_ && place_ && !isTouched_) {
+    if (isPlaced_ && !isTouched_ && !isStepped_) {
         camera_.put(onMap_, pinPoint(), firstZoom());
         show(PlatformMapView::Hand::Resting);
         tell();
@@ -232,7 +247,12 @@ void FriendMap::setFree(const QRect& free, const std::vector<QRect>& taken) {
         return;
     }
     free_ = free;
+    lookForStreets();
     if (place_ && !isTouched_) {
+        if (camera_.isMoving(seconds())) {
+            camera_.flyTo(onMap_, pinPoint(), camera_.zoomAtRest(), seconds(), kGlide);
+            return;
+        }
         camera_.put(onMap_, pinPoint(), isPlaced_ ? camera_.shown().zoom : firstZoom());
         isPlaced_ = true;
         show(PlatformMapView::Hand::Resting);
@@ -356,6 +376,7 @@ void FriendMap::zoom(double steps, QPointF at) {
 
 void FriendMap::step(bool closer) {
     velocity_ = {};
+    isStepped_ = true;
     constexpr double kStep = 0.2;  // seconds
     // Nobody asks to see something else by looking closer: the pin stays where it is.
     const QPointF middle = QRectF(free_).center();
@@ -369,6 +390,7 @@ void FriendMap::showPin() {
     if (place_) {
         velocity_ = {};
         isTouched_ = false;
+        isStepped_ = false;
         camera_.flyTo(onMap_, pinPoint(), firstZoom(), seconds(), isStill_ ? 0.0 : kGlide);
         startMoving();
         tell();

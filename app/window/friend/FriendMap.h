@@ -12,6 +12,7 @@
 #include "app/window/friend/MapCamera.h"
 #include "linux/paint/Palette.h"
 #include "platform/base/NotificationCenter.h"
+#include "platform/map/MapBackdrop.h"
 #include "platform/map/PlatformMapView.h"
 #include "platform/ui/Window.h"
 
@@ -51,8 +52,8 @@ class FriendMap : public PlainWidget {
     bool isTouched() const { return isTouched_; }
     bool isCoarsest() const { return camera_.isCoarsest(); }
     bool isFinest() const { return camera_.isFinest(); }
-    /// There are no streets where the pin is, as was seen when the map last showed it from near enough.
-    bool lacksStreets() const { return place_.has_value() && lacksStreets_; }
+    /// There are no streets where the pin is, wherever the map has been moved to since.
+    bool lacksStreets() const;
     const platform::MapViewport& shown() const { return camera_.shown(); }
     /// Called when `isTouched`, `isCoarsest`, `isFinest` or `lacksStreets` may have become another.
     void setChanged(std::function<void()> changed) { changed_ = std::move(changed); }
@@ -88,8 +89,10 @@ class FriendMap : public PlainWidget {
     void updateCircle();
     platform::Point pinPoint() const;
     double firstZoom() const;
-    void noteStreets();
-    void streetsChanged();
+    double nearZoom() const;
+    void lookForStreets();
+    void streetsLookedFor();
+    void goFartherOut();
     double seconds() const { return static_cast<double>(clock_.nsecsElapsed()) * 1e-9; }
 
     std::shared_ptr<Client> client_;
@@ -105,9 +108,13 @@ class FriendMap : public PlainWidget {
     MapCamera camera_;
     platform::NotificationCenter::Token streets_;
     std::optional<double> coarse_;  ///< the zoom at which a map without streets is first seen
-    bool lacksStreets_ = false;
-    bool isPlaced_ = false;  ///< the camera has been brought to the pin
+    /// A few points around the pin from near, drawn for what they tell: the map may show another place, or be so far
+    /// out that nobody looks for streets.
+    std::unique_ptr<platform::MapBackdrop> spot_;
+    bool lackedStreets_ = false;  ///< when that was looked at last
+    bool isPlaced_ = false;       ///< the camera has been brought to the pin
     bool isTouched_ = false;
+    bool isStepped_ = false;  ///< the scale was chosen by hand since then; the pin stays where it is
     bool isRingShown_ = false;
     QElapsedTimer clock_;
     QTimer frames_;

@@ -25,6 +25,7 @@ constexpr int kBesideFrom = 700;   ///< the width, where the window is lower tha
 constexpr int kBesideBelow = 480;
 constexpr int kAlwaysBesideFrom = 900;
 constexpr int kZoomAboveSheet = 38;
+constexpr int kBackToSheet = 8;
 constexpr double kMostSheet = 0.62;  ///< of the height, below the map
 constexpr int kCopied = 2000;        ///< milliseconds
 constexpr double kFace = 54.0;
@@ -281,7 +282,9 @@ void FriendPage::place() {
     const bool isBeside = width() >= kAlwaysBesideFrom || (width() >= kBesideFrom && height() < kBesideBelow);
     const int across = isBeside ? kSheetBeside : width() - 2 * kEdge;
     const int wanted = sheet_->shapeHeight(across);
-    const int most = isBeside ? height() - 2 * kEdge : static_cast<int>(height() * kMostSheet);
+    // The way back stays above it.
+    const int belowBack = height() - 2 * kEdge - leave_->naturalWidth() - kBackToSheet;
+    const int most = isBeside ? height() - 2 * kEdge : std::min(static_cast<int>(height() * kMostSheet), belowBack);
     const int high = std::clamp(wanted, 1, std::max(most, 1));
     const QRect upright(kEdge, isBeside ? kEdge : height() - kEdge - high, across, high);
     const QRect sheet = mirrored(upright).toRect();

@@ -18,6 +18,8 @@ class MapCamera {
     void setSize(const platform::Size& size) { shown_.size = size; }
     const platform::MapViewport& shown() const { return shown_; }
     bool isMoving(double now) const { return flight_ && !flight_->share.isOver(now); }
+    /// Of what is shown once it has arrived.
+    double zoomAtRest() const { return target().zoom; }
     bool isCoarsest() const { return target().zoom <= kCoarsest; }
     bool isFinest() const { return target().zoom >= kFinest; }
 

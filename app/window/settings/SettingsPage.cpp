@@ -339,7 +339,7 @@ void SettingsPage::listMaps() {
 void SettingsPage::showMaps(const std::vector<AddedMaps::Map>& maps) {
     // What has the focus stays: rows are made anew where there are others.
     const auto isSame = [](const AddedMaps::Map& one, const AddedMaps::Map& other) {
-        return one.place == other.place && one.bytes == other.bytes;
+        return one.place == other.place && one.name == other.name && one.bytes == other.bytes;
     };
     if (addMap_ == nullptr || !std::equal(maps.begin(), maps.end(), listed_.begin(), listed_.end(), isSame)) {
         listed_ = maps;

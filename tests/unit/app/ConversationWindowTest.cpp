@@ -1,16 +1,15 @@
 // The live window: what its parts take of it, and what it asks of nobody while a page covers the conversation.
 #include "app/window/ConversationWindow.h"
 
+#include <QAccessible>
 #include <QApplication>
-#include <QDeadlineTimer>
-#include <QTemporaryDir>
-#include <fstream>
-#include <functional>
-#include <memory>
+#include <QKeyEvent>
+#include <QScrollBar>
+#include <cmath>
+#include <string>
 
-#include "host/scenario/ScenarioReader.h"
-#include "linux/configuration/ConfigurationReader.h"
-#include "tests/support/EnvironmentVariable.h"
+#include "tests/unit/app/LiveWindowFixture.h"
+#include "tests/unit/app/TestHost.h"
 
 #include <gtest/gtest.h>
 
@@ -27,71 +26,28 @@ constexpr const char* kFriends =
     {"friend": {"data": "otto@mail.example", "object": {"fullName": "Otto Brandt",
      "emails": [{"emailAddress": "otto@mail.example"}]}}}]}})";
 
-class KTRConversationWindowTest : public ::testing::Test {
+constexpr const char* kAnswer =
+    R"({"question": "Where is Ann?", "sentence": "Ann is on Salt Lane, 170 yards away.", "clock":
+    "2026-05-16T17:44:00+01:00", "snippet": {"kind": "VAKtrLocationSnippet", "searchContext":
+    "ktrServerContext://serverContext?clientId=demo&", "locations": [{"friend": {"data": "ann@harbour.example",
+    "object": {"fullName": "Ann Marsh"}}, "latitude": 50.2104, "longitude": -3.12, "accuracy": 30, "ageSeconds": 300,
+    "city": "Brinmouth"}]}})";
+
+class KTRConversationWindowTest : public LiveWindowFixture {
   protected:
-    KTRConversationWindowTest()
-        : state("XDG_STATE_HOME", folder.filePath(QStringLiteral("state")).toUtf8().constData()) {
-        std::ofstream(file()) << R"({"account": {"personId": "1000", "host": "service.example"},
-                                     "positions": {"source": "none"}, "language": "en-GB"})";
-    }
-    std::string file() const { return folder.filePath(QStringLiteral("config.json")).toStdString(); }
-    void open(platform::ContentSizeCategory size = platform::ContentSizeCategory::L) {
-        window.reset();
-        host.reset();
-        host::HostSettings settings;
-        settings.liveConfiguration = file();
-        settings.follow(std::get<linux_::Configuration>(linux_::ConfigurationReader::readFile(file())));
-        settings.textSize = size;
-        auto made = host::Host::make(settings, host::Host::Time::Running, KTR_PLUGIN_FILE);
-        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made)) << std::get<host::Failure>(made).line;
-        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
-        bool isReady = false;
-        host->live()->start([&isReady] { isReady = true; });
-        ASSERT_TRUE(eventually([&isReady] { return isReady; }));
-        window = std::make_unique<ConversationWindow>(*host);
-        window->openLinks(desktop);
-        window->pages().setMotion(host::MotionStyle::None);
-        // Nobody has signed in, which is another test's matter.
-        window->pages().closeAll();
-    }
-    void TearDown() override {
-        window.reset();
-        host.reset();
-    }
-    static bool eventually(const std::function<bool()>& condition, int milliseconds = 10000) {
-        const QDeadlineTimer deadline(milliseconds);
-        while (!condition() && !deadline.hasExpired()) {
-            QApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents, 20);
-        }
-        return condition();
-    }
-    void addCard() {
-        const auto read = host::ScenarioReader({0.0}, host::ScenarioReader::Clock::Present).readText(kFriends, "test");
-        ASSERT_TRUE(std::holds_alternative<host::Scenario>(read));
-        ASSERT_FALSE(host->addTurn(std::get<host::Scenario>(read)));
-        host->layOut(400.0);
-    }
     int asked() const {
         const auto notes = host->live()->service().notes();
         return notes.underWay + notes.failures;
     }
-
-    QTemporaryDir folder;
-    test::EnvironmentVariable state;
-    linux_::DesktopOpener desktop{QString(), [](const std::string&) { return false; }};
-    std::unique_ptr<host::Host> host;
-    std::unique_ptr<ConversationWindow> window;
 };
 
 }  // namespace
 
 TEST_F(KTRConversationWindowTest, CardsUnderAPage_AskNothingUntilItHasGone) {
-    open();
-    window->resize(400, 700);
-    window->show();
+    openWindow({400, 700});
     host->delegate().open(platform::Url("wayloc://friends"));
     ASSERT_TRUE(window->pages().isOpen());
-    addCard();
+    addTurn(kFriends);
     eventually([] { return false; }, 600);
     EXPECT_EQ(asked(), 0) << "nobody sees the card";
     window->pages().back();
@@ -99,10 +55,8 @@ TEST_F(KTRConversationWindowTest, CardsUnderAPage_AskNothingUntilItHasGone) {
 }
 
 TEST_F(KTRConversationWindowTest, AFriendsPage_AsksAboutThatFriendAlone) {
-    open();
-    window->resize(400, 700);
-    window->show();
-    addCard();
+    openWindow({400, 700});
+    addTurn(kFriends);
     host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
     const auto* page = dynamic_cast<FriendPage*>(window->pages().current());
     ASSERT_NE(page, nullptr);
@@ -113,9 +67,7 @@ TEST_F(KTRConversationWindowTest, AFriendsPage_AsksAboutThatFriendAlone) {
 }
 
 TEST_F(KTRConversationWindowTest, QuestionThatIsTooLong_IsNotAskedInPart_AndStaysToBeMadeShorter) {
-    open();
-    window->resize(400, 700);
-    window->show();
+    openWindow({400, 700});
     const QString longest(static_cast<int>(host::LiveConversation::kLongestQuestion), u'x');
     const std::size_t before = host->conversation()->turns().size();
     window->field()->edit().setText(longest + u'x');
@@ -129,22 +81,83 @@ TEST_F(KTRConversationWindowTest, QuestionThatIsTooLong_IsNotAskedInPart_AndStay
 }
 
 TEST_F(KTRConversationWindowTest, StatusWithoutHelp_HasAButtonWithARealNameAllTheSame) {
-    open();
-    window->resize(400, 700);
-    window->show();
+    openWindow({400, 700});
     ASSERT_EQ(window->status()->help().words(), QString());
     EXPECT_FALSE(window->status()->help().isVisible());
     EXPECT_EQ(window->status()->help().accessibleName(), QStringLiteral("Check-up"));
 }
 
+/// Of a widget's colours beneath a button, the conversation's own ground is the only one; a card's shadow may reach
+/// there.
+bool isGround(ConversationWindow& window) {
+    const QImage picture = window.conversation().grab().toImage().convertToFormat(QImage::Format_RGB32);
+    const double side = IconButton::inkSideOf(Icon::Settings);
+    QRectF icon(0.0, 0.0, side, side);
+    icon.moveCenter(QRectF(window.settings()->geometry()).center());
+    const QColor ground = window.conversation().colors().window;
+    const QRect bar = window.conversation().findChild<QScrollBar*>()->geometry();
+    for (int y = static_cast<int>(icon.top()); y < static_cast<int>(icon.bottom()); ++y) {
+        for (int x = static_cast<int>(icon.left()); x < static_cast<int>(icon.right()); ++x) {
+            constexpr int kShadow = 16;
+            if (bar.contains(x, y)) {
+                return false;
+            }
+            const QColor there = picture.pixelColor(x, y);
+            if (std::abs(there.lightness() - ground.lightness()) > kShadow ||
+                std::abs(there.red() - ground.red()) > kShadow) {
+                return false;
+            }
+        }
+    }
+    return true;
+}
+
+TEST_F(KTRConversationWindowTest, EveryShape_TheSettingsButtonStandsOnNothingThatIsSaid_AndIsThereAtTheTop) {
+    for (const std::string language : {"en-GB", "ar"}) {
+        for (const std::string size : {"L", "AX5"}) {
+            openWindow({400, 820}, R"(, "language": ")" + language + R"(", "textSize": ")" + size + '"');
+            addTurn(kAnswer);
+            for (const QSize& shape :
+                 {QSize(320, 200), QSize(320, 239), QSize(400, 240), QSize(400, 299), QSize(320, 420), QSize(400, 820),
+                  QSize(900, 200), QSize(900, 420), QSize(1100, 300)}) {
+                const std::string name =
+                    language + "-" + size + "-" + std::to_string(shape.width()) + "x" + std::to_string(shape.height());
+                window->resize(shape);
+                window->conversation().scrollToNewest();
+                QApplication::processEvents();
+                keepPicture(*window, "settings-button-" + name);
+                const bool isSeen = window->settings()->isVisible();
+                EXPECT_EQ(isSeen, isGround(*window)) << name;
+                EXPECT_EQ(!isSeen, QAccessible::queryAccessibleInterface(window->settings())->state().invisible);
+                window->conversation().scrollTo(0.0);
+                EXPECT_TRUE(window->settings()->isVisible()) << name;
+                EXPECT_TRUE(isGround(*window)) << name;
+            }
+        }
+    }
+}
+
+TEST_F(KTRConversationWindowTest, LowWindow_BeginsWithTheQuestion_AndTheKeyLeadsToTheSettingsAllTheSame) {
+    openWindow({320, 200});
+    addTurn(kAnswer);
+    window->conversation().scrollToNewest();
+    EXPECT_GT(window->conversation().scrolled(), 0.0) << "the room for the button is scrolled away";
+    EXPECT_FALSE(window->settings()->isVisible());
+    QKeyEvent key(QEvent::KeyPress, Qt::Key_Comma, Qt::ControlModifier);
+    QApplication::sendEvent(window.get(), &key);
+    EXPECT_TRUE(window->pages().isOpen());
+    window->pages().back();
+    EXPECT_FALSE(window->settings()->isVisible()) << "a page that goes brings nothing back";
+    window->conversation().scrollTo(0.0);
+    EXPECT_TRUE(window->settings()->isVisible());
+}
+
 TEST_F(KTRConversationWindowTest, EveryShape_FieldAndConversationNeverOverlap) {
-    using platform::ContentSizeCategory;
-    for (const auto size : {ContentSizeCategory::L, ContentSizeCategory::XXXL, ContentSizeCategory::AX3}) {
-        open(size);
+    for (const std::string size : {"L", "XXXL", "AX3"}) {
+        openWindow({400, 700}, R"(, "language": "en-GB", "textSize": ")" + size + '"');
         for (const QSize& shape :
              {QSize(320, 200), QSize(320, 239), QSize(320, 240), QSize(400, 300), QSize(900, 200), QSize(1600, 900)}) {
             window->resize(shape);
-            window->show();
             QApplication::processEvents();
             ASSERT_EQ(window->size(), shape) << "a window of " << shape.height() << " is possible";
             constexpr int kAround = AskField::kAround;
@@ -153,7 +166,7 @@ TEST_F(KTRConversationWindowTest, EveryShape_FieldAndConversationNeverOverlap) {
             EXPECT_GT(conversation.height(), 0);
             EXPECT_FALSE(field.intersects(conversation))
                 << shape.width() << "x" << shape.height() << ": field from " << field.y() << ", conversation to "
-                << conversation.bottom() << ", size " << static_cast<int>(size);
+                << conversation.bottom() << ", size " << size;
             EXPECT_TRUE(window->rect().contains(field));
             const bool isLow = shape.height() < 240;
             EXPECT_EQ(window->status()->isVisible(), !isLow) << shape.height();

@@ -9,6 +9,7 @@
 #include <QTouchEvent>
 #include <QWheelEvent>
 #include <algorithm>
+#include <iterator>
 #include <memory>
 #include <mutex>
 
@@ -31,9 +32,11 @@ using host::LinkPolicy;
 class FriendPageTest : public ::testing::Test {
   public:
     void open(const std::vector<std::string>& names, const std::string& language = "en-GB", int width = 400,
-              int height = 700, bool isDark = false) {
+              int height = 700, bool isDark = false,
+              platform::ContentSizeCategory textSize = platform::ContentSizeCategory::L) {
         host::HostOptions options;
         options.dark = isDark;
+        options.textSize = textSize;
         options.language = language;
         host = testHost(options, demoScenarios(names), host::Host::Time::Running);
         ASSERT_TRUE(host);
@@ -326,6 +329,48 @@ TEST_F(FriendPageTest, AFriendWithoutAPlaceHasNoPin_AndASentence) {
     ASSERT_NE(page(), nullptr);
     EXPECT_FALSE(page()->map().place());
     EXPECT_FALSE(page()->sheet().hasPlace());
+}
+
+/// The circle and its words, as they are painted, whatever says where they should be.
+TEST_F(FriendPageTest, WithoutAPlace_NothingLiesUnderTheSheet_OrTouchesAnything) {
+    using platform::ContentSizeCategory;
+    for (const auto size : {ContentSizeCategory::L, ContentSizeCategory::AX1, ContentSizeCategory::AX5}) {
+        for (const auto& [language, shape] :
+             {std::pair("en-GB", QSize(320, 200)), std::pair("de", QSize(320, 200)), std::pair("ar", QSize(400, 240)),
+              std::pair("ja", QSize(320, 420)), std::pair("en-GB", QSize(400, 820)), std::pair("ar", QSize(900, 200)),
+              std::pair("en-GB", QSize(900, 420)), std::pair("de", QSize(1600, 900))}) {
+            const std::string name = std::string("no-place-") + language + "-" + std::to_string(shape.width()) + "x" +
+                                     std::to_string(shape.height()) + "-" + std::to_string(static_cast<int>(size));
+            open({"dinner"}, language, shape.width(), shape.height(), false, size);
+            window->open("wayloc://friend/ann@harbour.example", LinkPolicy::From::Outside);
+            ASSERT_NE(page(), nullptr) << name;
+            settle();
+            keepPicture(*window, name);
+            QWidget& widget = page()->map();
+            const QImage map = widget.grab().toImage().convertToFormat(QImage::Format_RGB32);
+            const QRgb land = linux_::Palette::of(linux_::ColorScheme::Light).mapLand.rgb();
+            QRegion painted;
+            for (int y = 0; y < map.height(); ++y) {
+                const auto* row = reinterpret_cast<const QRgb*>(map.constScanLine(y));
+                const auto* end = row + map.width();
+                const auto* first = std::find_if(row, end, [&](QRgb there) { return there != land; });
+                if (first != end) {
+                    const auto* last =
+                        std::find_if(std::reverse_iterator(end), std::reverse_iterator(first), [&](QRgb there) {
+                            return there != land;
+                        }).base();
+                    painted += QRect(static_cast<int>(first - row), y, static_cast<int>(last - first), 1);
+                }
+            }
+            EXPECT_FALSE(painted.isEmpty()) << name << ": it says that there is no place";
+            const QRect back = page()->back().parentWidget()->geometry();
+            EXPECT_FALSE(painted.intersects(page()->sheet().geometry())) << name;
+            EXPECT_FALSE(painted.intersects(back)) << name;
+            EXPECT_FALSE(page()->sheet().geometry().intersects(back)) << name;
+            EXPECT_FALSE(page()->zoom().isVisible() && painted.intersects(page()->zoom().geometry())) << name;
+            TearDown();
+        }
+    }
 }
 
 TEST_F(FriendPageTest, AnotherPlatformTakesThePlaceOfThisOne_AndThePageGoesOn) {

@@ -14,16 +14,14 @@
 #include <fstream>
 #include <memory>
 
-#include "app/window/ConversationWindow.h"
 #include "app/window/checkup/CheckUpPage.h"
 #include "app/window/settings/ChoicePage.h"
 #include "app/window/settings/MapPage.h"
 #include "host/Resources.h"
 #include "linux/configuration/ConfigurationFile.h"
 #include "linux/configuration/ConfigurationReader.h"
-#include "tests/support/EnvironmentVariable.h"
-#include "tests/support/TemporaryFolder.h"
 #include "tests/support/qt/PrivateBus.h"
+#include "tests/unit/app/LiveWindowFixture.h"
 
 #include <gtest/gtest.h>
 
@@ -34,53 +32,30 @@ namespace {
 using linux_::Configuration;
 using platform::ContentSizeCategory;
 
-class SettingsPageTest : public ::testing::Test {
+class SettingsPageTest : public LiveWindowFixture {
   protected:
-    SettingsPageTest()
-        : data("XDG_DATA_HOME", (folder.path() / "data").c_str()),
-          state("XDG_STATE_HOME", (folder.path() / "state").c_str()) {}
-
     void open(const std::string& members = "", QSize size = {400, 780}) {
-        std::filesystem::create_directories(file.parent_path());
-        std::ofstream(file)
-            << R"({"account": {"personId": "mara@brin.example", "host": "127.0.0.1:9", "userName": "Mara Lind"},)"
-            << R"( "addressBooks": false, "positions": {"source": "none"}, "language": "en-GB")" << members << "}";
+        std::filesystem::create_directories(token.parent_path());
         std::ofstream(token) << "s3cret\n";
+        std::ofstream(file).close();
         for (const auto& one : {file, token}) {
             std::filesystem::permissions(one, std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
         }
-        const auto read = linux_::ConfigurationReader::readFile(file);
-        auto decided = host::HostSettings::decide({}, {}, {}, std::get<Configuration>(read));
-        auto settings = std::get<host::HostSettings>(decided);
-        settings.liveConfiguration = file;
-        auto made = host::Host::make(settings, host::Host::Time::Running, KTR_PLUGIN_FILE);
-        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
-        window = std::make_unique<ConversationWindow>(*host);
-        window->pages().setMotion(host::MotionStyle::None);
-        window->resize(size);
-        window->show();
+        openWindowOf(R"({"account": {"personId": "mara@brin.example", "host": "127.0.0.1:9", "userName": "Mara Lind"},)"
+                     R"( "addressBooks": false, "positions": {"source": "none"}, "language": "en-GB")" +
+                         members + "}",
+                     size);
         window->start({}, {});
         ASSERT_TRUE(eventually([this] { return host->live()->isSignedIn(); }));
         window->settings()->press();
         ASSERT_NE(page(), nullptr);
         settle();
     }
-    void TearDown() override {
-        window.reset();
-        host.reset();
-    }
     SettingsPage* page() const { return dynamic_cast<SettingsPage*>(window->pages().current()); }
     static void settle() {
         for (int i = 0; i < 5; ++i) {
             QApplication::processEvents();
         }
-    }
-    static bool eventually(const std::function<bool()>& condition) {
-        const QDeadlineTimer deadline(20000);
-        while (!condition() && !deadline.hasExpired()) {
-            QApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents, 20);
-        }
-        return condition();
     }
     Configuration written() const {
         const auto read = linux_::ConfigurationReader::readFile(file);
@@ -99,13 +74,7 @@ class SettingsPageTest : public ::testing::Test {
     }
     static QString nameOf(const QWidget& row) { return row.accessibleName(); }
 
-    test::TemporaryFolder folder;
-    test::EnvironmentVariable data;
-    test::EnvironmentVariable state;
-    const std::filesystem::path file = folder.path() / "ktr" / "config.json";
     const std::filesystem::path token = file.parent_path() / "token";
-    std::unique_ptr<host::Host> host;
-    std::unique_ptr<ConversationWindow> window;
 };
 
 }  // namespace
@@ -207,7 +176,7 @@ TEST_F(SettingsPageTest, Maps_AreAddedListedAndRemoved_AndWhatIsNoneIsSaid) {
         [this] { return window->notice().sentence() == QStringLiteral("This file isn’t a map that can be drawn."); }));
     page()->addMap(QString::fromStdString(town.string()));
     ASSERT_TRUE(eventually([&] { return maps() == 3; }));
-    EXPECT_TRUE(nameOf(*page()->maps().rows()[0]).startsWith(QStringLiteral("brinmouth, Streets, ")))
+    EXPECT_TRUE(nameOf(*page()->maps().rows()[0]).startsWith(QStringLiteral("Brinmouth, Streets, ")))
         << nameOf(*page()->maps().rows()[0]).toStdString();
     keep("maps");
     page()->maps().rows()[0]->press();

@@ -10,18 +10,14 @@
 #include <algorithm>
 #include <cmath>
 #include <filesystem>
-#include <fstream>
 #include <memory>
 #include <numbers>
 
-#include "app/window/ConversationWindow.h"
+#include "app/AddedMaps.h"
 #include "app/window/friend/FriendPage.h"
 #include "app/window/settings/SettingsPage.h"
-#include "host/scenario/ScenarioReader.h"
-#include "linux/configuration/ConfigurationReader.h"
-#include "tests/support/EnvironmentVariable.h"
-#include "tests/support/TemporaryFolder.h"
 #include "tests/support/maps/MbtilesWriter.h"
+#include "tests/unit/app/LiveWindowFixture.h"
 #include "tests/unit/app/TestHost.h"
 
 #include <gtest/gtest.h>
@@ -31,61 +27,27 @@ namespace ktr::app {
 namespace {
 
 /// East of Berlin, where no map that comes along has streets.
-constexpr double kLatitude = 52.42;
-constexpr double kLongitude = 13.95;
+constexpr platform::Coordinate kNearBerlin{52.42, 13.95};
+/// So far from any town that a map begins as far out as maps do.
+constexpr platform::Coordinate kDesert{23.5, 10.5};
 constexpr QRgb kMagenta = qRgb(255, 0, 255);
 
-constexpr const char* kAnn =
-    R"({"question": "Where is Ann?", "sentence": "Ann is near Berlin, 23 kilometres away.", "clock": "2026-05-16T17:44:00+01:00",
+std::string annAt(const platform::Coordinate& place) {
+    return R"({"question": "Where is Ann?", "sentence": "Ann is far away.", "clock": "2026-05-16T17:44:00+01:00",
     "snippet": {"kind": "VAKtrLocationSnippet", "searchContext": "ktrServerContext://serverContext?clientId=demo&",
     "locations": [{"friend": {"data": "ann@harbour.example", "object": {"fullName": "Ann Marsh", "firstName": "Ann",
-     "emails": [{"emailAddress": "ann@harbour.example"}]}}, "latitude": 52.42, "longitude": 13.95, "accuracy": 30,
-     "ageSeconds": 300, "city": "Grünheide"}]}})";
+     "emails": [{"emailAddress": "ann@harbour.example"}]}}, "accuracy": 30, "ageSeconds": 300, "city": "Grünheide",
+     "latitude": )" +
+           std::to_string(place.latitude) + R"(, "longitude": )" + std::to_string(place.longitude) + "}]}}";
+}
 
-class StreetsRowTest : public ::testing::Test {
+class StreetsRowTest : public LiveWindowFixture {
   protected:
-    StreetsRowTest()
-        : data("XDG_DATA_HOME", (folder.path() / "data").c_str()),
-          state("XDG_STATE_HOME", (folder.path() / "state").c_str()) {}
-
-    void open(QSize size = {400, 780}, const std::string& members = "") {
-        TearDown();
-        const auto file = folder.path() / "config.json";
-        std::ofstream(file) << R"({"account": {"personId": "1000", "host": "127.0.0.1:9"}, "addressBooks": false,)"
-                            << R"( "positions": {"source": "none"})" << members << "}";
-        const auto read = linux_::ConfigurationReader::readFile(file);
-        auto settings =
-            std::get<host::HostSettings>(host::HostSettings::decide({}, {}, {}, std::get<linux_::Configuration>(read)));
-        settings.liveConfiguration = file;
-        auto made = host::Host::make(settings, host::Host::Time::Running, KTR_PLUGIN_FILE);
-        ASSERT_TRUE(std::holds_alternative<std::unique_ptr<host::Host>>(made)) << std::get<host::Failure>(made).line;
-        host = std::move(std::get<std::unique_ptr<host::Host>>(made));
-        bool isReady = false;
-        host->live()->start([&isReady] { isReady = true; });
-        ASSERT_TRUE(eventually([&isReady] { return isReady; }));
-        window = std::make_unique<ConversationWindow>(*host);
-        window->openLinks(desktop);
-        window->pages().setMotion(host::MotionStyle::None);
-        // Nobody has signed in, which is another test's matter.
-        window->pages().closeAll();
-        window->resize(size);
-        window->show();
-        const auto ann = host::ScenarioReader({0.0}, host::ScenarioReader::Clock::Present).readText(kAnn, "test");
-        ASSERT_TRUE(std::holds_alternative<host::Scenario>(ann));
-        ASSERT_FALSE(host->addTurn(std::get<host::Scenario>(ann)));
-        window->conversation().turnsChanged();
+    void open(QSize size = {400, 780}, const std::string& members = R"(, "language": "en-GB")") {
+        openWindow(size, members);
+        addTurn(annAt(where));
     }
-    void TearDown() override {
-        window.reset();
-        host.reset();
-    }
-    static bool eventually(const std::function<bool()>& condition) {
-        const QDeadlineTimer deadline(20000);
-        while (!condition() && !deadline.hasExpired()) {
-            QApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents, 20);
-        }
-        return condition();
-    }
+    void openAnn() const { host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example")); }
     std::shared_ptr<host::StreetsLine> line() const { return host->conversation()->turns().back()->streets(); }
     bool isOffered() const { return line() && !line()->hidden(); }
     FriendPage* friendPage() const { return dynamic_cast<FriendPage*>(window->pages().current()); }
@@ -94,8 +56,8 @@ class StreetsRowTest : public ::testing::Test {
         QKeyEvent event(QEvent::KeyPress, code, Qt::NoModifier);
         QApplication::sendEvent(&window->conversation(), &event);
     }
-    /// A file with a map around Ann, all of one colour.
-    std::filesystem::path region() {
+    /// A file with a map around Ann, all of one colour, from this level on.
+    std::filesystem::path region(int coarsest = 9) const {
         const auto path = folder.path() / "region.mbtiles";
         QImage tile(256, 256, QImage::Format_RGB32);
         tile.fill(kMagenta);
@@ -106,11 +68,14 @@ class StreetsRowTest : public ::testing::Test {
         test::MbtilesWriter writer(path.string());
         writer.makeTables();
         writer.putMetadata("format", "png");
-        writer.putMetadata("bounds", "13.45,52.22,14.45,52.62");
-        for (int level = 9; level <= 14; ++level) {
+        const auto corner = [this](double side) {
+            return std::to_string(where.longitude + side) + "," + std::to_string(where.latitude + side * 0.4);
+        };
+        writer.putMetadata("bounds", corner(-0.5) + "," + corner(0.5));
+        for (int level = coarsest; level <= 14; ++level) {
             const int count = 1 << level;
-            const double latitude = kLatitude * std::numbers::pi / 180.0;
-            const int x = static_cast<int>((kLongitude / 360.0 + 0.5) * count);
+            const double latitude = where.latitude * std::numbers::pi / 180.0;
+            const int x = static_cast<int>((where.longitude / 360.0 + 0.5) * count);
             const int y = static_cast<int>((0.5 - std::asinh(std::tan(latitude)) / (2.0 * std::numbers::pi)) * count);
             for (int dx = -3; dx <= 3; ++dx) {
                 for (int dy = -3; dy <= 3; ++dy) {
@@ -131,12 +96,7 @@ class StreetsRowTest : public ::testing::Test {
         return count;
     }
 
-    test::TemporaryFolder folder;
-    test::EnvironmentVariable data;
-    test::EnvironmentVariable state;
-    linux_::DesktopOpener desktop{QString(), [](const std::string&) { return false; }};
-    std::unique_ptr<host::Host> host;
-    std::unique_ptr<ConversationWindow> window;
+    platform::Coordinate where = kNearBerlin;
 };
 
 }  // namespace
@@ -166,7 +126,7 @@ TEST_F(StreetsRowTest, UnderACard_AKeyLeadsToWhereAMapIsAdded_AndTheMapTakesTheL
 
 TEST_F(StreetsRowTest, OnAFriendsPage_TheSameIsOffered_AndTheWayBackLeadsThere) {
     open();
-    host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+    openAnn();
     ASSERT_NE(friendPage(), nullptr);
     auto& sheet = friendPage()->sheet();
     ASSERT_TRUE(eventually([&] { return sheet.streets().isVisible(); }));
@@ -181,13 +141,34 @@ TEST_F(StreetsRowTest, OnAFriendsPage_TheSameIsOffered_AndTheWayBackLeadsThere) 
     ASSERT_EQ(friendPage(), page);
 }
 
+/// Also where the map begins farther out than anybody looks for streets, and where the new one has none from there.
+TEST_F(StreetsRowTest, OnAFriendsPage_TheRowGoesOnceThereAreStreets_WhichAreShown) {
+    for (const auto& [place, coarsest] : {std::pair(kNearBerlin, 9), std::pair(kDesert, 9), std::pair(kDesert, 13)}) {
+        where = place;
+        open();
+        openAnn();
+        ASSERT_NE(friendPage(), nullptr);
+        auto& sheet = friendPage()->sheet();
+        FriendMap& map = friendPage()->map();
+        const auto across = [&map] { return map.shown().size.width * map.shown().metresPerPoint(); };
+        ASSERT_TRUE(eventually([&] { return sheet.streets().isVisible() && across() > 10000.0; })) << place.latitude;
+        const auto added = AddedMaps::add(region(coarsest).string());
+        ASSERT_FALSE(std::holds_alternative<AddedMaps::Problem>(added)) << std::get<AddedMaps::Problem>(added).why;
+        EXPECT_TRUE(eventually([&] { return !sheet.streets().isVisible(); })) << place.latitude;
+        EXPECT_TRUE(eventually([&] { return across() < 2000.0 && pixelsOfTheMap(*window) > 10000; }));
+        keepPicture(*window, "streets-row-gone-" + std::to_string(coarsest));
+        std::filesystem::remove_all(folder.path() / "data");
+        std::filesystem::remove(folder.path() / "region.mbtiles");
+    }
+}
+
 TEST_F(StreetsRowTest, OnAFriendsPage_LookingElsewhereChangesNothingOfWhatIsSaidOfThePlace) {
     open();
-    host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+    openAnn();
     auto& sheet = friendPage()->sheet();
     ASSERT_TRUE(eventually([&] { return sheet.streets().isVisible(); }));
     // So far out that nobody misses streets.
-    for (int i = 0; i < 12; ++i) {
+    for (int i = 0; i < 20; ++i) {
         friendPage()->map().step(false);
     }
     ASSERT_TRUE(eventually([&] { return friendPage()->map().isCoarsest(); }));
@@ -222,7 +203,7 @@ TEST_F(StreetsRowTest, EveryShapeAndLanguage_CutsNothing) {
             EXPECT_LE(part.maxY(), whole.maxY()) << one.name;
         }
         EXPECT_FALSE(words.intersects(action)) << one.name;
-        host->delegate().open(platform::Url("wayloc://friend/ann@harbour.example"));
+        openAnn();
         ASSERT_NE(friendPage(), nullptr);
         auto& streets = friendPage()->sheet().streets();
         ASSERT_TRUE(eventually([&] { return !streets.isHidden(); })) << one.name;

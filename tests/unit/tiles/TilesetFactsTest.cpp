@@ -35,6 +35,7 @@ TEST(TilesetFactsTest, Metadata_IsRead) {
                                          {"name", "Town"},
                                          {"attribution", "&copy; <a href=\"x>y\">Map   contributors</a>"}});
     EXPECT_EQ(facts.format, "pbf");
+    EXPECT_EQ(facts.name, "Town");
     EXPECT_EQ(facts.coarsest, 3);
     EXPECT_EQ(facts.finest, 14);
     ASSERT_TRUE(facts.bounds.has_value());
