@@ -76,8 +76,8 @@ linux_::Configuration configurationOf(const std::filesystem::path& file) {
 /// The configured maps for a conversation that stands for itself: those in files, since nothing is fetched for it. What
 /// is not used is said.
 linux_::Configuration::Maps mapsIn(const std::filesystem::path& file) {
-    std::error_code failed;
-    if (!std::filesystem::exists(file, failed)) {
+    // A loop of links is one that cannot be looked at.
+    if (std::error_code failed; !std::filesystem::exists(file, failed) && !failed) {
         return {};
     }
     auto read = linux_::ConfigurationReader::readFile(file, nullptr);
@@ -89,7 +89,8 @@ linux_::Configuration::Maps mapsIn(const std::filesystem::path& file) {
     std::erase_if(maps.sources, [](const linux_::Configuration::Maps::Source& source) {
         if (!source.url.empty()) {
             tell("warning: the map " + documents::inQuotes(source.url) + " is not used: nothing is fetched here");
-        } else if (std::error_code missing; !std::filesystem::is_regular_file(source.file, missing)) {
+        } else if (std::error_code failed; !std::filesystem::exists(source.file, failed)) {
+            // What is there and no map is said by who reads it.
             tell("warning: the map " + documents::inQuotes(source.file) + " is not there");
         }
         return !source.url.empty();

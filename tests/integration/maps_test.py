@@ -72,6 +72,17 @@ class MapsTest(unittest.TestCase):
         _, said = self.draw()
         self.assertIn("warning: the configured maps are not used: ", said)
         self.assertEqual(said.count("\n"), 1)
+        self.config.unlink()
+        self.config.symlink_to(self.config)
+        _, said = self.draw()
+        self.assertIn("warning: the configured maps are not used: ", said)
+        self.assertEqual(said.count("\n"), 1)
+
+    def test_map_that_is_a_folder_is_called_no_file_and_not_missing(self):
+        self.config.write_text(json.dumps({"maps": {"sources": [{"file": str(self.folder), "attribution": "-"}]}}))
+        _, said = self.draw()
+        self.assertIn(f"The map {self.folder} cannot be read: not a file", said)
+        self.assertEqual(said.count("\n"), 1)
 
     def test_a_place_beyond_all_streets_has_a_town_on_its_map(self):
         drawing, said = self.draw("a.svg")
