@@ -82,21 +82,15 @@ void Optimizer::guard(int e, Guard guard) {
 /// columns that worsen nothing are ever exchanged.
 void Optimizer::exchange(int row, int column) {
     const int leaving = state_.tableau->rowEntity(row);
-    ownTableau().exchange(row, column);
+    ownTableau().exchange(row, column, moved_);
     open_ += locks_[column] == (kUp | kDown) ? 1 : 0;
     locks_[column] = 0;
     guard(leaving, guards_[leaving]);
 }
 
-/// What moves with a column: the few rows that `firstStop`, `collectBreaks` and `advance` look at.
+/// What moves with a column: the few rows that `firstStop`, `collectBreaks`, `advance` and `exchange` look at.
 void Optimizer::findMoved(int column) {
-    const Tableau& t = *state_.tableau;
-    moved_.clear();
-    for (int r = 0; r < t.rows(); ++r) {
-        if (t.at(r, column) != 0.0) {
-            moved_.push_back(r);
-        }
-    }
+    state_.tableau->findMoved(column, moved_);
 }
 
 void Optimizer::advance(int column, int direction, double distance) {
@@ -284,6 +278,7 @@ void Optimizer::fix(int e) {
         return;
     }
     state_.values[e] = 0.0;
+    findMoved(best);
     exchange(row, best);
 }
 

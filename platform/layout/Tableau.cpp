@@ -70,7 +70,23 @@ void Tableau::removeRow(int row) {
     cells_.resize(static_cast<std::size_t>(last) * stride_);
 }
 
+void Tableau::findMoved(int column, std::vector<int>& moved) const {
+    moved.clear();
+    const double* cell = cells_.data() + column;
+    for (int r = 0; r < rows(); ++r, cell += stride_) {
+        if (*cell != 0.0) {
+            moved.push_back(r);
+        }
+    }
+}
+
 void Tableau::exchange(int row, int column) {
+    std::vector<int> moved;
+    findMoved(column, moved);
+    exchange(row, column, moved);
+}
+
+void Tableau::exchange(int row, int column, std::span<const int> moved) {
     double* pivotRow = cellsOf(row);
     const double inverse = 1.0 / pivotRow[column];
     // The pivot's row solved for the column's entity: only its few non-zero cells touch the other rows.
@@ -82,12 +98,12 @@ void Tableau::exchange(int row, int column) {
         }
     }
     pivotRow[column] = inverse;
-    double* cells = cells_.data();
-    for (int r = 0; r < rows(); ++r, cells += stride_) {
-        const double factor = cells[column];
-        if (factor == 0.0 || r == row) {
+    for (const int r : moved) {
+        if (r == row) {
             continue;
         }
+        double* cells = cellsOf(r);
+        const double factor = cells[column];
         for (const int j : used_) {
             const double add = factor * pivotRow[j];
             const double sum = cells[j] + add;

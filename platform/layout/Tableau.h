@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <span>
 #include <vector>
 
 namespace ktr::platform {
@@ -31,6 +32,10 @@ class Tableau {
     void removeRow(int row);
     /// Swaps roles: the row's entity becomes independent, the column's dependent. at(row, column) must not be zero.
     void exchange(int row, int column);
+    /// The same by somebody who knows the rows that the column moves.
+    void exchange(int row, int column, std::span<const int> moved);
+    /// The rows that the column moves: those whose cell is not zero.
+    void findMoved(int column, std::vector<int>& moved) const;
 
     /// Exchanges that rounding has grown with.
     int exchanges() const { return exchanges_; }
