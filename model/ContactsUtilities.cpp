@@ -5,6 +5,7 @@
 
 #include "model/LogCategory.h"
 #include "platform/base/Assert.h"
+#include "platform/base/CurrentPlatform.h"
 #include "platform/base/Platform.h"
 #include "platform/contacts/MonogramMaker.h"
 
@@ -40,8 +41,8 @@ const ContactKeys& sharedKeys() {
 }  // namespace
 
 std::shared_ptr<ContactStore> ContactsUtilities::contactStore() {
-    const auto installed = Platform::installed();
-    return installed ? installed->contactStore : nullptr;
+    const Platform* const installed = platform::currentPlatform();
+    return installed != nullptr ? installed->contactStore : nullptr;
 }
 
 ContactKeys ContactsUtilities::contactKeys() {

@@ -4,6 +4,7 @@
 #include "model/LogCategory.h"
 #include "model/PluginBundle.h"
 #include "platform/assistant/AssistantSettings.h"
+#include "platform/base/CurrentPlatform.h"
 #include "platform/base/FilledText.h"
 #include "platform/base/Platform.h"
 #include "platform/base/Utf8.h"
@@ -199,7 +200,7 @@ std::shared_ptr<VAPerson> KTRVALocation::personForPhoneFromContacts(const std::o
 }
 
 std::shared_ptr<platform::NumberFormatter> KTRVALocation::numberFormatter() {
-    return Platform::installed()->decimalNumbers;
+    return platform::currentPlatform()->decimalNumbers;
 }
 
 const VAPerson* KTRVALocation::person() const {

@@ -144,9 +144,9 @@ platform::VisualFormatMetrics KTRVelaBaseView::layoutMetrics() {
 }
 
 void KTRVelaBaseView::assignContactLater(std::shared_ptr<platform::Contact> contact) {
-    const auto installed = Platform::installed();
     const bool isGiven = contactsAwaited_ == 0 && hasContact_ && contact_ == contact.get();
-    if (isGiven || !installed || !installed->mainLoop) {
+    const auto installed = isGiven ? nullptr : Platform::installed();
+    if (!installed || !installed->mainLoop) {
         return;
     }
     ++contactsAwaited_;
