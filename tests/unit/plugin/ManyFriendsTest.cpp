@@ -1,4 +1,5 @@
 // One answer with thousands of friends: what is shown of it costs what is shown, and all of it no more than its share.
+#include <malloc.h>
 #include <time.h>
 
 #include <algorithm>
@@ -114,6 +115,28 @@ TEST_F(ManyFriendsTest, OneFriendWhoMoved_ShapesTheTextsOfOneRow) {
     }
     EXPECT_GT(shaped[10], 0);
     EXPECT_EQ(shaped[2000], shaped[10]);
+}
+
+// What the C library has given out, whatever the machine does besides: a member more in a view is nine a row.
+TEST_F(ManyFriendsTest, EachFriend_KeepsHerShareOfMemory) {
+    const auto given = [] { return static_cast<double>(mallinfo2().uordblks + mallinfo2().hblkhd); };
+    if (given() == 0.0) {
+        GTEST_SKIP() << "a sanitizer's heap does not count";
+    }
+    constexpr int kFew = 1000;
+    std::map<int, double> kept;
+    open(10);
+    close();
+    for (const int count : {kFew, 2 * kFew}) {
+        const double before = given();
+        open(count);
+        kept[count] = given() - before;
+        close();
+    }
+    const double aFriend = (kept[2 * kFew] - kept[kFew]) / kFew;
+    EXPECT_GT(aFriend, 1000.0);
+    // Row, record, texts and contact were 6,783 when this was written.
+    EXPECT_LT(aFriend, 6900.0);
 }
 
 TEST_F(ManyFriendsTest, Point_FindsItsRowAnywhere) {
