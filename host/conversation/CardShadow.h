@@ -20,6 +20,8 @@ class CardShadow {
     /// The same where a card of this shape, which nothing shows through, is painted over it at once: what the card
     /// hides is left out, which is nearly all of a tall card's shadow. A painter that is not opaque paints all of it.
     void paintAround(linux_::QtCanvas& canvas, const QRectF& card, double corner);
+    /// How many shapes were blurred.
+    std::size_t blurs() const { return kept_.size(); }
 
   private:
     /// What is not seen; empty for nothing. `tall` reaches nearly to the left and right edge, `wide` to top and bottom.

@@ -16,7 +16,7 @@ Block::Block(QWidget* parent) : QWidget(parent) {
     AccessibleBlock::install();
 }
 
-void Block::paintUnder(QPainter&, const QRectF&) const {}
+void Block::paintUnder(QPainter&, const QRectF&, host::CardShadow&) const {}
 
 void Block::setLook(const Look& look) {
     look_ = look;

@@ -6,6 +6,10 @@
 
 #include "linux/paint/Palette.h"
 
+namespace ktr::host {
+class CardShadow;
+}
+
 namespace ktr::app {
 
 /// How everything in a window looks now.
@@ -26,8 +30,9 @@ class Block : public QWidget {
     virtual int shapeHeight(int width) const = 0;
     /// Of the shape, where nothing else says how wide it is.
     virtual int naturalWidth() const { return 0; }
-    /// What lies under a shape without being part of it, in its parent's coordinates: a shadow.
-    virtual void paintUnder(QPainter& painter, const QRectF& shape) const;
+    /// What lies under a shape without being part of it, in its parent's coordinates: a shadow. The parent keeps what
+    /// was blurred, for all that stands on it.
+    virtual void paintUnder(QPainter& painter, const QRectF& shape, host::CardShadow& shadow) const;
 
     const linux_::Palette& colors() const { return *look_.palette; }
     const Look& look() const { return look_; }

@@ -102,7 +102,8 @@ void Column::paintEvent(QPaintEvent*) {
     for (const Item& item : items_) {
         if (!item.block->isHidden()) {
             const int around = item.block->around();
-            item.block->paintUnder(painter, QRectF(item.block->geometry().adjusted(around, around, -around, -around)));
+            item.block->paintUnder(painter, QRectF(item.block->geometry().adjusted(around, around, -around, -around)),
+                                   shadow_);
         }
     }
 }

@@ -3,6 +3,7 @@
 #include <vector>
 
 #include "app/window/blocks/Block.h"
+#include "host/conversation/CardShadow.h"
 
 namespace ktr::app {
 
@@ -30,6 +31,8 @@ class Column : public Block {
     void setAbove(const Block* block, int above);
 
     int shapeHeight(int width) const override;
+    /// What is painted under its cards.
+    const host::CardShadow& shadow() const { return shadow_; }
 
   protected:
     void paintEvent(QPaintEvent* event) override;
@@ -50,6 +53,7 @@ class Column : public Block {
     int mostWidth_ = 0;
     int top_ = 0;
     int bottom_ = 0;
+    host::CardShadow shadow_;
 };
 
 }  // namespace ktr::app

@@ -74,10 +74,10 @@ bool ListCard::event(QEvent* event) {
     return Block::event(event);
 }
 
-void ListCard::paintUnder(QPainter& painter, const QRectF& shape) const {
+void ListCard::paintUnder(QPainter& painter, const QRectF& shape, host::CardShadow& shadow) const {
     if (colors().cardShadow.alpha() > 0) {
         linux_::QtCanvas canvas(painter, colors());
-        host::CardShadow().paint(canvas, shape, kCardCorner);
+        shadow.paint(canvas, shape, kCardCorner);
     }
 }
 

@@ -22,7 +22,7 @@ class ListCard : public Block {
     void setParted(bool isParted) { isParted_ = isParted; }
 
     int shapeHeight(int width) const override;
-    void paintUnder(QPainter& painter, const QRectF& shape) const override;
+    void paintUnder(QPainter& painter, const QRectF& shape, host::CardShadow& shadow) const override;
 
   protected:
     void paintEvent(QPaintEvent* event) override;

@@ -210,6 +210,21 @@ TEST_F(KTRBlocksTest, Gallery_EveryAppearanceFitsItsWidth) {
     }
 }
 
+TEST_F(KTRBlocksTest, Shadows_AreBlurredOnceForAllCardsAndPaintings) {
+    open();
+    for (int card = 0; card < 3; ++card) {
+        add<ListCard>({20})->add(new ListRow(ListRow::Kind::Plain, QStringLiteral("Units")));
+    }
+    lay(400, Palette::of(ColorScheme::Light));
+    paper->grab();
+    // Two lie under each card.
+    EXPECT_EQ(paper->shadow().blurs(), 2U);
+    paper->grab();
+    lay(520, Palette::of(ColorScheme::Light));
+    paper->grab();
+    EXPECT_EQ(paper->shadow().blurs(), 2U);
+}
+
 TEST_F(KTRBlocksTest, Button_IsPressedByKeysMouseAndAssistiveTechnology) {
     open();
     auto* button = add<Button>({}, Button::Kind::Quiet, QStringLiteral("Try again"));
