@@ -169,6 +169,8 @@ void Gazetteer::load() {
         }
     }
     towns_.shrink_to_fit();
+    std::stable_sort(towns_.begin(), towns_.end(),
+                     [](const Town& one, const Town& other) { return one.latitude < other.latitude; });
     directions_.reserve(towns_.size());
     for (const Town& town : towns_) {
         directions_.push_back(directionOf(town.latitude, town.longitude));
@@ -180,22 +182,51 @@ std::size_t Gazetteer::count() {
     return towns_.size();
 }
 
+/// The towns among which the nearest is, by their numbers. The angle between two places is no less than that between
+/// their latitudes: going away from here to the south and to the north, nothing nearer comes once those alone are
+/// farther than what was found.
+std::vector<std::size_t> Gazetteer::near(double latitude, double longitude) {
+    const Direction here = directionOf(latitude, longitude);
+    const auto first = std::lower_bound(towns_.begin(), towns_.end(), latitude,
+                                        [](const Town& town, double wanted) { return town.latitude < wanted; });
+    const auto away = [&](std::size_t number) {
+        return std::abs(towns_[number].latitude - latitude) * std::numbers::pi / 180.0;
+    };
+    auto north = static_cast<std::size_t>(first - towns_.begin());
+    std::size_t south = north;                           // the town before it comes next
+    std::vector<std::pair<double, std::size_t>> looked;  // the cosine of the angle between here and there
+    double most = -1.0;
+    double reach = std::numbers::pi;
+    while (south > 0 || north < towns_.size()) {
+        const bool goesNorth = south == 0 || (north < towns_.size() && away(north) < away(south - 1));
+        const std::size_t number = goesNorth ? north++ : --south;
+        if (away(number) > reach) {
+            break;
+        }
+        ++compared_;
+        const Direction& there = directions_[number];
+        const double alike = here[0] * there[0] + here[1] * there[1] + here[2] * there[2];
+        looked.emplace_back(alike, number);
+        if (alike > most) {
+            most = alike;
+            reach = std::min(std::acos(std::clamp(most, -1.0, 1.0)) * kFlatter + kRounding, std::numbers::pi);
+        }
+    }
+    const double least = std::cos(reach);
+    std::vector<std::size_t> numbers;
+    for (const auto& [alike, number] : looked) {
+        if (alike >= least) {
+            numbers.push_back(number);
+        }
+    }
+    std::sort(numbers.begin(), numbers.end());
+    return numbers;
+}
+
 Gazetteer::Nearest Gazetteer::nearest(double latitude, double longitude) {
     load();
-    const Direction here = directionOf(latitude, longitude);
-    std::vector<double> alike;  // cosines of the angles between here and there
-    alike.reserve(directions_.size());
-    for (const Direction& there : directions_) {
-        alike.push_back(here[0] * there[0] + here[1] * there[1] + here[2] * there[2]);
-    }
-    const double most = *std::max_element(alike.begin(), alike.end());
-    const double least =
-        std::cos(std::min(std::acos(std::clamp(most, -1.0, 1.0)) * kFlatter + kRounding, std::numbers::pi));
     Nearest nearest{nullptr, std::numeric_limits<double>::infinity()};
-    for (std::size_t number = 0; number < towns_.size(); ++number) {
-        if (alike[number] < least) {
-            continue;
-        }
+    for (const std::size_t number : near(latitude, longitude)) {
         double metres = 0.0;
         GeographicLib::Geodesic::WGS84().Inverse(latitude, longitude, towns_[number].latitude, towns_[number].longitude,
                                                  metres);

@@ -2,6 +2,7 @@
 
 #include <array>
 #include <cstddef>
+#include <cstdint>
 #include <map>
 #include <memory>
 #include <string>
@@ -40,17 +41,21 @@ class Gazetteer {
     std::string name(const Town& town, const std::string& language);
     std::size_t count();
     std::size_t bytes() const;
+    /// How many towns were compared with places so far.
+    std::uint64_t compared() const { return compared_; }
 
   private:
     using Direction = std::array<double, 3>;  ///< from the earth's middle, of length 1
 
     void load();
+    std::vector<std::size_t> near(double latitude, double longitude);
     const MessageCatalogue* catalogue(const std::string& language);
 
     const Files files_;
     bool isLoaded_ = false;
-    std::vector<Town> towns_;
+    std::vector<Town> towns_;            ///< from south to north
     std::vector<Direction> directions_;  ///< of the towns
+    std::uint64_t compared_ = 0;
     std::map<std::string, std::shared_ptr<const MessageCatalogue>> catalogues_;
 };
 

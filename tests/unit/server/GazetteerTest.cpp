@@ -2,7 +2,12 @@
 
 #include <gtest/gtest.h>
 
+#include <GeographicLib/Geodesic.hpp>
+#include <algorithm>
 #include <random>
+#include <sstream>
+#include <utility>
+#include <vector>
 
 #include "server/page/PageTexts.h"
 #include "tests/support/TemporaryFolder.h"
@@ -42,6 +47,42 @@ TEST(GazetteerTest, Towns_AreRead) {
     EXPECT_EQ(cairo.town->latitude, 30.05) << "its own place, not its airport's";
 }
 
+TEST(GazetteerTest, Nearest_IsTheOneOfAllTowns) {
+    std::mt19937 chance(5);
+    std::uniform_real_distribution<double> latitude(-90.0, 90.0), longitude(-180.0, 180.0);
+    struct Place {
+        double latitude, longitude;
+    };
+    const auto somewhere = [&] { return Place{latitude(chance), longitude(chance)}; };
+    std::vector<Place> all;
+    std::ostringstream document;
+    document.precision(17);
+    document << "<gweather>";
+    for (int number = 0; number < 400; ++number) {
+        all.push_back(somewhere());
+        document << "<city><_name>" << number << "</_name><coordinates>" << all.back().latitude << ' '
+                 << all.back().longitude << "</coordinates></city>";
+    }
+    document << "</gweather>";
+    const test::TemporaryFolder folder;
+    Gazetteer towns({folder.write("towns.xml", document.str()).string(), folder.path().string()});
+    std::vector<Place> asked = {{90.0, 0.0}, {-90.0, 0.0}, {0.0, 180.0}, {0.0, -180.0}, {89.999, -3.0}};
+    for (int times = 0; times < 1000; ++times) {
+        asked.push_back(somewhere());
+    }
+    for (const Place& here : asked) {
+        double least = 1e9;
+        for (const Place& there : all) {
+            double metres = 0.0;
+            GeographicLib::Geodesic::WGS84().Inverse(here.latitude, here.longitude, there.latitude, there.longitude,
+                                                     metres);
+            least = std::min(least, metres);
+        }
+        EXPECT_DOUBLE_EQ(towns.nearest(here.latitude, here.longitude).metres, least)
+            << here.latitude << ' ' << here.longitude;
+    }
+}
+
 TEST(GazetteerTest, WhatIsNoSuchFile_LeavesTheBuiltInTowns) {
     const test::TemporaryFolder folder;
     const std::string bomb = R"(<?xml version="1.0"?><!DOCTYPE g [<!ENTITY a "aaaaaaaaaa"><!ENTITY b "&a;&a;&a;&a;">]>
@@ -68,6 +109,14 @@ TEST_F(InstalledGazetteerTest, ItHasTheWorldsTowns) {
     EXPECT_GT(towns_.count(), 4000U);
     EXPECT_EQ(nearestTo(towns_, 50.60, -3.60), "Exeter");
     EXPECT_EQ(nearestTo(towns_, 48.1, 11.5), "Munich");
+}
+
+TEST_F(InstalledGazetteerTest, NearATown_FewTownsAreCompared) {
+    for (const auto& [latitude, longitude] : {std::pair(50.7, -3.5), {48.1, 11.5}, {35.7, 139.7}, {-33.9, 151.2}}) {
+        const std::uint64_t before = towns_.compared();
+        towns_.nearest(latitude, longitude);
+        EXPECT_LT(towns_.compared() - before, towns_.count() / 20) << latitude;
+    }
 }
 
 TEST_F(InstalledGazetteerTest, Names_AreInTheViewersLanguage) {
