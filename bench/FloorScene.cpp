@@ -145,4 +145,11 @@ void FloorScene::paint(QImage& image, double scale) {
     }
 }
 
+bool FloorScene::write(const QString& path, double scale) {
+    QImage image(static_cast<int>(width_ * scale), static_cast<int>(height() * scale),
+                 QImage::Format_ARGB32_Premultiplied);
+    paint(image, scale);
+    return image.save(path, "PNG");
+}
+
 }  // namespace ktr::bench

@@ -20,6 +20,7 @@ class FloorScene : public Scene {
     void paint(QImage& image, double scale) override;
     void clear() override { rows_.clear(); }
     void shapeName(const std::string& name) override;
+    bool write(const QString& path, double scale) override;
 
   private:
     struct Text {

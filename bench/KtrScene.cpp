@@ -1,12 +1,13 @@
 #include "bench/KtrScene.h"
 
-#include <QFile>
 #include <QPainter>
+#include <algorithm>
+#include <cmath>
 
-#include "linux/paint/PngEncoder.h"
 #include "linux/paint/QtCanvas.h"
 #include "linux/paint/QtImage.h"
 #include "linux/paint/QtTextEngine.h"
+#include "linux/paint/ScenePainter.h"
 #include "platform/assistant/AssistantSettings.h"
 #include "platform/base/Log.h"
 #include "platform/base/VirtualTime.h"
@@ -178,13 +179,21 @@ void KtrScene::paint(QImage& image, double scale) {
     window_->paint(canvas, window_->bounds());
 }
 
-bool KtrScene::write(const QImage& image, const QString& path) {
-    QFile file(path);
-    const QByteArray data = linux_::encodedAsPng(image);
-    if (data.isEmpty()) {
-        return image.save(path, "PNG");
+/// As `ktr render` does: what is too tall for one picture becomes several.
+bool KtrScene::write(const QString& path, double scale) {
+    const double whole = height();
+    const double most = std::floor(linux_::ScenePainter::kMostPixels / scale);
+    bool isGood = true;
+    for (double top = 0.0; isGood && top < whole; top += most) {
+        linux_::ScenePainter painter({width_, std::min(most, whole - top)}, scale, palette_);
+        painter.setBackground(palette_.card);
+        const QString file = top > 0.0 ? path + QString::number(top) + QStringLiteral(".png") : path;
+        isGood = !painter.write(file.toStdString(), [&](linux_::QtCanvas& canvas) {
+            canvas.translate(0.0, -top);
+            window_->paint(canvas, canvas.seen(window_->bounds()));
+        });
     }
-    return file.open(QIODevice::WriteOnly) && file.write(data) == data.size();
+    return isGood;
 }
 
 void KtrScene::shapeName(const std::string& name) {

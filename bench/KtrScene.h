@@ -25,8 +25,8 @@ class KtrScene : public Scene {
     double height() const override;
     void paint(QImage& image, double scale) override;
     void clear() override;
-    bool write(const QImage& image, const QString& path) override;
     void shapeName(const std::string& name) override;
+    bool write(const QString& path, double scale) override;
 
   private:
     void installPlatform();

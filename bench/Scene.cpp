@@ -55,9 +55,7 @@ QImage imageFor(const Scene& scene, const RowsFile& file) {
 
 int writePicture(Scene& scene, const RowsFile& file, const char* path) {
     scene.build(file, file.friends.size(), file.width);
-    QImage image = imageFor(scene, file);
-    scene.paint(image, file.scale);
-    if (!scene.write(image, QString::fromLocal8Bit(path))) {
+    if (!scene.write(QString::fromLocal8Bit(path), file.scale)) {
         std::fprintf(stderr, "%s: cannot be written\n", path);
         return 1;
     }

@@ -25,8 +25,8 @@ class Scene {
     virtual void clear() = 0;
     /// Shapes a name on one line, as a row's label has it, and drops it.
     virtual void shapeName(const std::string& name) = 0;
-    /// Writes a PNG; false when that fails.
-    virtual bool write(const QImage& image, const QString& path) { return image.save(path, "PNG"); }
+    /// Paints everything into a PNG file; false when that fails.
+    virtual bool write(const QString& path, double scale) = 0;
 };
 
 /// The command line of a bench program: `--json FILE` and what to do with it.

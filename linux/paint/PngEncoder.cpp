@@ -19,16 +19,6 @@ int append(spng_ctx*, void* file, void* bytes, std::size_t size) {
     return 0;
 }
 
-bool isOpaque(const QImage& picture) {
-    for (int y = 0; picture.hasAlphaChannel() && y < picture.height(); ++y) {
-        const auto* row = reinterpret_cast<const QRgb*>(picture.constScanLine(y));
-        if (std::any_of(row, row + picture.width(), [](QRgb pixel) { return qAlpha(pixel) != 0xFF; })) {
-            return false;
-        }
-    }
-    return true;
-}
-
 }  // namespace
 
 PngEncoder::PngEncoder(int width, int height, bool opaque)
@@ -51,9 +41,11 @@ PngEncoder::~PngEncoder() = default;
 void PngEncoder::add(const QImage& picture, int count) {
     const auto format = opaque_ ? QImage::Format_RGB888 : QImage::Format_RGBA8888;
     const auto bytes = static_cast<std::size_t>(width_) * (opaque_ ? 3U : 4U);
-    failed_ = failed_ || picture.width() != width_;
+    failed_ = failed_ || picture.width() != width_ || picture.height() < count;
     for (int top = 0; !failed_ && top < count; top += kRows) {
-        const QImage rows = picture.copy(0, top, width_, std::min(kRows, count - top)).convertToFormat(format);
+        const QImage rows = QImage(picture.constScanLine(top), width_, std::min(kRows, count - top),
+                                   picture.bytesPerLine(), picture.format())
+                                .convertToFormat(format);
         failed_ = rows.isNull();
         for (int y = 0; !failed_ && y < rows.height(); ++y) {
             const int told = spng_encode_scanline(context_.get(), rows.constScanLine(y), bytes);
@@ -65,13 +57,6 @@ void PngEncoder::add(const QImage& picture, int count) {
 
 QByteArray PngEncoder::file() {
     return finished_ && !failed_ ? file_ : QByteArray();
-}
-
-QByteArray encodedAsPng(const QImage& given) {
-    const QImage picture = given.convertToFormat(QImage::Format_ARGB32_Premultiplied);
-    PngEncoder encoder(picture.width(), picture.height(), isOpaque(picture));
-    encoder.add(picture, picture.height());
-    return encoder.file();
 }
 
 }  // namespace ktr::linux_

@@ -33,7 +33,4 @@ class PngEncoder {
     std::unique_ptr<spng_ctx, void (*)(spng_ctx*)> context_;
 };
 
-/// A whole picture as a file; empty when it is none.
-QByteArray encodedAsPng(const QImage& picture);
-
 }  // namespace ktr::linux_

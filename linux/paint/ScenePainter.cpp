@@ -7,7 +7,10 @@
 #include <QPdfWriter>
 #include <QSvgGenerator>
 #include <algorithm>
+#include <array>
 #include <cmath>
+#include <cstddef>
+#include <future>
 
 #include "linux/paint/PngEncoder.h"
 
@@ -168,11 +171,27 @@ QByteArray ScenePainter::png(const Paint& paint) const {
     const int height = pixels(size_.height, scale_);
     const int most = std::clamp(kBandPixels / width, kLeastBand, std::max(kLeastBand, height));
     PngEncoder encoder(width, height, background_.alpha() == 0xFF);
-    QImage band(width, std::min(most, height), QImage::Format_ARGB32_Premultiplied);
-    for (int top = 0; !band.isNull() && top < height; top += most) {
+    // While one band is painted the one before it is packed, which takes several times as long; where no thread is to
+    // be had this one packs it.
+    std::array<QImage, 2> bands;
+    std::future<void> packed;
+    for (int top = 0; top < height; top += most) {
+        QImage& band = bands[static_cast<std::size_t>(top / most % 2)];
+        if (band.isNull()) {
+            band = QImage(width, std::min(most, height - top), QImage::Format_ARGB32_Premultiplied);
+        }
+        if (band.isNull()) {
+            break;
+        }
         band.fill(Qt::transparent);
         paintOn(band, scale_, 1.0, paint, top);
-        encoder.add(band, std::min(most, height - top));
+        if (packed.valid()) {
+            packed.get();
+        }
+        packed = std::async([&encoder, &band, rows = std::min(most, height - top)] { encoder.add(band, rows); });
+    }
+    if (packed.valid()) {
+        packed.get();
     }
     return encoder.file();
 }

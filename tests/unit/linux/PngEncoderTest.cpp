@@ -5,6 +5,7 @@
 #include <QBuffer>
 #include <QImageWriter>
 #include <QPainter>
+#include <algorithm>
 #include <random>
 #include <vector>
 
@@ -12,8 +13,25 @@ namespace ktr::test {
 
 namespace {
 
-using linux_::encodedAsPng;
 using linux_::PngEncoder;
+
+bool isOpaque(const QImage& picture) {
+    for (int y = 0; picture.hasAlphaChannel() && y < picture.height(); ++y) {
+        const auto* row = reinterpret_cast<const QRgb*>(picture.constScanLine(y));
+        if (std::any_of(row, row + picture.width(), [](QRgb pixel) { return qAlpha(pixel) != 0xFF; })) {
+            return false;
+        }
+    }
+    return true;
+}
+
+/// A whole picture as a file; empty when it is none.
+QByteArray encodedAsPng(const QImage& given) {
+    const QImage picture = given.convertToFormat(QImage::Format_ARGB32_Premultiplied);
+    PngEncoder encoder(picture.width(), picture.height(), isOpaque(picture));
+    encoder.add(picture, picture.height());
+    return encoder.file();
+}
 
 QImage painted(QColor background) {
     QImage image(320, 200, QImage::Format_ARGB32_Premultiplied);
@@ -89,6 +107,13 @@ TEST(PngEncoderTest, RowsOfAnotherWidth_AreNoFile) {
     const QImage image = painted(Qt::white);
     PngEncoder encoder(image.width() + 1, image.height(), true);
     encoder.add(image, image.height());
+    EXPECT_TRUE(encoder.file().isEmpty());
+}
+
+TEST(PngEncoderTest, FewerRowsThanSaid_AreNoFile) {
+    const QImage image = painted(Qt::white);
+    PngEncoder encoder(image.width(), image.height() + 1, true);
+    encoder.add(image, image.height() + 1);
     EXPECT_TRUE(encoder.file().isEmpty());
 }
 
