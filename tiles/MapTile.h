@@ -51,7 +51,8 @@ struct MapTile {
         Shape shape = Shape::Points;
         /// A place's PlaceRank; a boundary's level (2 for a country); a water line's width in metres; else 0.
         std::uint8_t rank = 0;
-        std::int32_t name = -1;  ///< of `names`; -1 for none
+        bool isNameOnly = false;  ///< there for its name: another feature is what is drawn
+        std::int32_t name = -1;   ///< of `names`; -1 for none
         std::uint32_t firstPart = 0;
         std::uint32_t partCount = 0;
         float left = 0.0F, top = 0.0F, right = 0.0F, bottom = 0.0F;  ///< what it covers

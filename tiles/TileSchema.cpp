@@ -390,15 +390,22 @@ bool TileSchema::isDrawn(std::string_view layer) const {
 
 std::optional<TileSchema::Meaning> TileSchema::meaning(std::string_view layer, const Attributes& attributes,
                                                        MapTile::Shape shape) const {
+    Answer found;
     switch (kind_) {
         case Kind::Shortbread:
-            return shortbread(layer, attributes, shape);
+            found = shortbread(layer, attributes, shape);
+            break;
         case Kind::OpenMapTiles:
-            return openMapTiles(layer, attributes, shape);
+            found = openMapTiles(layer, attributes, shape);
+            break;
         case Kind::Protomaps:
-            return protomaps(layer, attributes, shape);
+            found = protomaps(layer, attributes, shape);
+            break;
     }
-    return std::nullopt;
+    if (found) {
+        found->isNameOnly = isOneOf(layer, {"street_labels", "water_lines_labels", "transportation_name"});
+    }
+    return found;
 }
 
 }  // namespace ktr::tiles

@@ -33,6 +33,8 @@ class TileSchema {
     struct Meaning {
         MapKind kind = MapKind::BuiltUp;
         std::uint8_t rank = 0;
+        /// Of a layer that repeats the lines of another one for the names on them.
+        bool isNameOnly = false;
     };
 
     /// By the names of the layers: each known name is a vote. A tile that speaks for none is read as Shortbread.

@@ -339,6 +339,7 @@ void Builder::add(const Layer& layer, const TileSchema& schema, std::string_view
     MapTile::Feature feature;
     feature.kind = meaning->kind;
     feature.rank = meaning->rank;
+    feature.isNameOnly = meaning->isNameOnly;
     feature.shape = shape;
     if (readGeometry(geometry, feature, layer.extent)) {
         feature.name = nameIndex(name);

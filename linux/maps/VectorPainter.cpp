@@ -40,7 +40,7 @@ void VectorPainter::each(tiles::MapKind kind, tiles::MapTile::Shape shape, const
     for (const auto& visible : tiles_) {
         const TileGeometry geometry(visible);
         eachOf(*visible.tile, kind, [&](const tiles::MapTile::Feature& feature) {
-            if (feature.shape == shape && geometry.isVisible(feature)) {
+            if (feature.shape == shape && !feature.isNameOnly && geometry.isVisible(feature)) {
                 receive(geometry, feature);
             }
         });

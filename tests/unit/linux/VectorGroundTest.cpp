@@ -150,6 +150,30 @@ TEST_F(VectorGroundTest, Neighbours_MeetWithoutASeam) {
     }
 }
 
+/// A soft edge that is drawn twice is a harder one, and drawing is what a picture costs.
+TEST_F(VectorGroundTest, LinesThatCarryNames_AreNotDrawnAgain) {
+    const LayerWriter::Spots street = {{-80, 900}, {4176, 1740}};
+    const LayerWriter::Spots brook = {{-80, 2900}, {4176, 3740}};
+    const auto drawn = [&](const std::vector<LayerWriter>& layers) {
+        makeFile({{"format", "pbf"}}, {{kMiddle, tileOf(layers)}});
+        auto result = MapDrawer::draw(request(), {std::make_shared<VectorGround>(path())}, {});
+        QFile::remove(QString::fromStdString(path()));
+        return result->pixels;
+    };
+    const auto streets = LayerWriter("streets").line(street, {{"kind", "residential"}});
+    const auto brooks = LayerWriter("water_lines").line(brook, {{"kind", "river"}});
+    const QImage once = drawn({streets, brooks});
+    EXPECT_NE(once, drawn({streets}));
+    EXPECT_EQ(once,
+              drawn({streets, brooks,
+                     LayerWriter("street_labels").line(street, {{"kind", "residential"}, {"name", "High Street"}}),
+                     LayerWriter("water_lines_labels").line(brook, {{"kind", "river"}, {"name", "Brin"}})}));
+    const auto roads = LayerWriter("transportation").line(street, {{"class", "minor"}});
+    EXPECT_EQ(
+        drawn({roads}),
+        drawn({roads, LayerWriter("transportation_name").line(street, {{"class", "minor"}, {"name", "High Street"}})}));
+}
+
 TEST_F(VectorGroundTest, MissingTile_IsFilledFromACoarserLevel) {
     makeFile({{"format", "pbf"}, {"minzoom", "12"}, {"maxzoom", "14"}}, {{kMiddle.parent(12), gzipped(lakeTile())}});
     // Of the parent's four columns the first two are lake.
