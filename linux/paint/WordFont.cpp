@@ -134,7 +134,9 @@ WordFont::WordFont(const QRawFont& raw, std::shared_ptr<hb_face_t> face, QChar::
       face_(std::move(face)),
       unrounded_(hb_font_create(face_.get()), hb_font_destroy),
       font_(nullptr, hb_font_destroy),
-      buffer_(hb_buffer_create(), hb_buffer_destroy) {
+      buffer_(hb_buffer_create(), hb_buffer_destroy),
+      leftwards_(nullptr, hb_shape_plan_destroy),
+      rightwards_(nullptr, hb_shape_plan_destroy) {
     // Downwards is positive, as in Qt: the other sign would round the other way.
     const auto pixels = static_cast<unsigned>(raw_.pixelSize());
     const int scale = static_cast<int>(raw_.pixelSize() * kUnits);
@@ -194,6 +196,16 @@ int WordFont::overhang(quint32 glyph) {
     });
 }
 
+hb_shape_plan_t* WordFont::plan(bool rightToLeft) {
+    Plan& plan = rightToLeft ? leftwards_ : rightwards_;
+    if (!plan) {
+        hb_segment_properties_t properties;
+        hb_buffer_get_segment_properties(buffer_.get(), &properties);
+        plan.reset(hb_shape_plan_create_cached(face_.get(), &properties, nullptr, 0, nullptr));
+    }
+    return plan.get();
+}
+
 std::optional<WordFont::Word> WordFont::shaped(QStringView word, bool rightToLeft) {
     // A letter that the font lacks would be put together from others that it has; Qt takes another font.
     if (!std::all_of(word.begin(), word.end(), [this](QChar c) { return isALetter(c) && raw_.supportsCharacter(c); })) {
@@ -206,7 +218,7 @@ std::optional<WordFont::Word> WordFont::shaped(QStringView word, bool rightToLef
     hb_buffer_set_direction(buffer, rightToLeft ? HB_DIRECTION_RTL : HB_DIRECTION_LTR);
     hb_buffer_set_script(buffer, plain(script_)->tag);
     hb_buffer_set_language(buffer, hb_language_get_default());
-    hb_shape(font_.get(), buffer, nullptr, 0);
+    hb_shape_plan_execute(plan(rightToLeft), font_.get(), buffer, nullptr, 0);
     unsigned count = 0;
     const hb_glyph_info_t* const infos = hb_buffer_get_glyph_infos(buffer, &count);
     const hb_glyph_position_t* const positions = hb_buffer_get_glyph_positions(buffer, &count);

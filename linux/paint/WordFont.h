@@ -12,6 +12,7 @@
 struct hb_buffer_t;
 struct hb_face_t;
 struct hb_font_t;
+struct hb_shape_plan_t;
 
 namespace ktr::linux_ {
 
@@ -55,7 +56,11 @@ class WordFont {
     static constexpr std::size_t kPage = 256;
     using Page = std::array<int, kPage>;
 
+    using Plan = std::unique_ptr<hb_shape_plan_t, void (*)(hb_shape_plan_t*)>;
+
     int advance(quint32 glyph);
+    /// How the font's rules are gone through for what the buffer is said to hold; made once for each direction.
+    hb_shape_plan_t* plan(bool rightToLeft);
 
     QRawFont raw_;
     QChar::Script script_;
@@ -64,6 +69,8 @@ class WordFont {
     std::unique_ptr<hb_font_t, void (*)(hb_font_t*)> unrounded_;
     std::unique_ptr<hb_font_t, void (*)(hb_font_t*)> font_;
     std::unique_ptr<hb_buffer_t, void (*)(hb_buffer_t*)> buffer_;
+    Plan leftwards_;
+    Plan rightwards_;
     std::array<std::unique_ptr<Page>, kPage> advances_;
     std::array<std::unique_ptr<Page>, kPage> overhangs_;
 };
