@@ -62,6 +62,13 @@ class UnitTest(unittest.TestCase):
         about = [line for line in text.splitlines() if "sysinit.target" not in line and "not found" not in line]
         self.assertEqual(about, [], text)
 
+    def test_the_users_unit_may_write_where_its_state_is(self):
+        """Wherever that is in the user's home: systemd names another folder before version 254 than from then on."""
+        unit = (PACKAGING / "ktr-watch.service.in").read_text()
+        directives = dict(re.findall(r"^(\w+)=(.*)$", unit, re.MULTILINE))
+        self.assertEqual(directives["ProtectSystem"], "full", "strict closes the home as well")
+        self.assertEqual(directives.keys() & {"ProtectHome", "ReadOnlyPaths", "InaccessiblePaths", "ReadWritePaths"}, set())
+
     def test_commands_of_the_units_are_those_of_the_program(self):
         words = " ".join(re.findall(r"^ExecStart=(.*\S)", (PACKAGING / "ktr-service.service").read_text()
                                     + (PACKAGING / "home-network.conf").read_text(), re.MULTILINE)).split()
