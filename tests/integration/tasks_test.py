@@ -239,7 +239,7 @@ class TasksTest(live_window_test.LiveWindowTest):
         added = wait_for("a map", lambda: list((self.folder / "data").rglob("*.mbtiles")))
         self.assertEqual(len(added), 1)
         self.xdotool("windowfocus", "--sync", self.window)
-        self.await_seen("brinmouth, Streets", "push button")
+        self.await_seen("Brinmouth, Streets", "push button")
 
     def test_task_change_text_size(self):
         self.serve()

@@ -81,23 +81,46 @@ bool ColumnPage::eventFilter(QObject* object, QEvent* event) {
     return Page::eventFilter(object, event);
 }
 
+int ColumnPage::placeLower(int above, int columnHeight) {
+    if (lower_ == nullptr) {
+        return 0;
+    }
+    const int across = std::min(width(), mostWidth()) - 2 * kGutter;
+    const int high = lower_->shapeHeight(across);
+    const int all = kAboveLower + high + kBelowLower;
+    const bool isFixed = height() - above - all >= all;
+    moveLower(isFixed ? static_cast<QWidget*>(this) : column_);
+    const int y = isFixed ? height() - kBelowLower - high : columnHeight + kAboveLower;
+    lower_->placeShape({(width() - across) / 2, y, across, high});
+    return all;
+}
+
+void ColumnPage::moveLower(QWidget* parent) {
+    if (lower_->parentWidget() == parent) {
+        return;
+    }
+    // What is moved is hidden on the way, and a button in it would lose the focus.
+    QWidget* const last = focusWidget();
+    QWidget* const focused = last != nullptr && last->hasFocus() && lower_->isAncestorOf(last) ? last : nullptr;
+    lower_->setParent(parent);
+    lower_->show();
+    if (focused != nullptr) {
+        focused->setFocus(Qt::OtherFocusReason);
+    }
+}
+
 void ColumnPage::place() {
     const int above = bar_ == nullptr ? 0 : bar_->shapeHeight(width());
     if (bar_ != nullptr) {
         bar_->placeShape({0, 0, width(), above});
     }
     column_->setMostWidth(mostWidth());
-    int below = 0;
-    if (lower_ != nullptr) {
-        const int column = std::min(width(), mostWidth());
-        const int across = column - 2 * kGutter;
-        const int high = lower_->shapeHeight(across);
-        below = high + kAboveLower + kBelowLower;
-        lower_->placeShape({(width() - across) / 2, height() - kBelowLower - high, across, high});
-    }
-    const int room = std::max(height() - above - below, 0);
+    const int wanted = column_->shapeHeight(width());
+    const int lower = placeLower(above, wanted);
+    const bool isFixed = lower_ != nullptr && lower_->parentWidget() == this;
+    const int room = std::max(height() - above - (isFixed ? lower : 0), 0);
     area_->setGeometry(0, above, width(), room);
-    column_->resize(width(), std::max(column_->shapeHeight(width()), room));
+    column_->resize(width(), std::max(wanted + (isFixed ? 0 : lower), room));
     QScrollBar* scrolled = area_->verticalScrollBar();
     handle_->setPageStep(room);
     handle_->setRange(scrolled->minimum(), scrolled->maximum());

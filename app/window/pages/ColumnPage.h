@@ -19,7 +19,8 @@ class ColumnPage : public Page {
     Column& column() const { return *column_; }
     /// None without one.
     PageBar* bar() const { return bar_; }
-    /// Takes over what stays at the lower edge.
+    /// Takes over what stays at the lower edge, where that leaves at least as much room as it takes; else it scrolls
+    /// along, below all else.
     void setLower(Block* lower);
     /// Scrolls so that a block is seen.
     void reveal(const QWidget& block);
@@ -35,6 +36,9 @@ class ColumnPage : public Page {
 
   private:
     void place();
+    /// At the lower edge of so much room, or in the column, below so much; the height that it takes there.
+    int placeLower(int above, int columnHeight);
+    void moveLower(QWidget* parent);
 
     PageBar* bar_ = nullptr;
     PageArea* area_;

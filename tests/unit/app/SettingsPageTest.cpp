@@ -211,6 +211,44 @@ TEST_F(SettingsPageTest, AMapThatIsDropped_IsAdded_AndWhatIsNoFileIsNotTaken) {
     EXPECT_TRUE(eventually([this] { return page()->maps().rows().size() == 3; }));
 }
 
+TEST_F(SettingsPageTest, CheckUpInAnyShape_ItsButtonsLeaveRoomForWhatItSays_AndCanBeReached) {
+    for (const std::string size : {"L", "AX5"}) {
+        for (const QSize& shape :
+             {QSize(320, 200), QSize(400, 240), QSize(320, 420), QSize(400, 820), QSize(900, 200)}) {
+            const std::string name = size + "-" + std::to_string(shape.width()) + "x" + std::to_string(shape.height());
+            open(R"(, "textSize": ")" + size + '"', shape);
+            page()->checkUp().press();
+            auto* check = dynamic_cast<CheckUpPage*>(window->pages().current());
+            ASSERT_NE(check, nullptr);
+            window->activateWindow();
+            check->copy().setFocus(Qt::TabFocusReason);
+            settle();
+            EXPECT_TRUE(check->copy().hasFocus()) << name;
+            keep(("check-up-" + name).c_str());
+            EXPECT_FALSE(check->title().visibleRegion().isEmpty()) << name;
+            const auto placeOf = [check](const QWidget& widget) {
+                return QRect(widget.mapTo(check, QPoint()), widget.size());
+            };
+            for (const Button* button : {&check->again(), &check->copy()}) {
+                EXPECT_FALSE(button->visibleRegion()
+                                 .boundingRect()
+                                 .translated(placeOf(*button).topLeft())
+                                 .intersects(check->bar()->geometry()))
+                    << name;
+                check->reveal(*button);
+                EXPECT_TRUE(check->rect().contains(placeOf(*button).center())) << name;
+                EXPECT_FALSE(button->visibleRegion().isEmpty()) << name;
+            }
+            // Larger and back again: whoever has the focus keeps it.
+            window->resize(400, 820);
+            settle();
+            window->resize(shape);
+            settle();
+            EXPECT_TRUE(check->copy().hasFocus()) << name;
+        }
+    }
+}
+
 TEST_F(SettingsPageTest, CheckUp_TellsWhatIsWrong_EachOnceWithItsButton) {
     open();
     page()->checkUp().press();
