@@ -16,6 +16,11 @@ namespace {
 constexpr int kTextInset = 27;
 constexpr int kIconSide = 56;
 constexpr int kIconTop = 44;
+constexpr int kIconToTitle = 18;
+constexpr int kLowTop = 16;
+/// A lower window has no icon, and one that is lower still no line: what is to be filled in is seen.
+constexpr int kLow = 420;
+constexpr int kVeryLow = 300;
 constexpr int kLowerMargin = 20;
 constexpr int kWideFrom = 900;
 constexpr double kWideTop = 0.2;  ///< of the height
@@ -45,7 +50,7 @@ SignInPage::SignInPage(host::Host& host, std::unique_ptr<linux_::SignIn> signIn,
     footnote_->setAlignment(BlockAlignment::Centre);
     note_->setWarning(true);
     column().add(icon_, {kIconTop, kTextInset, kTextInset, false});
-    column().add(title_, {18, kTextInset, kTextInset});
+    column().add(title_, {kIconToTitle, kTextInset, kTextInset});
     column().add(line_, {6, kTextInset, kTextInset});
     column().add(link_, {24});
     column().add(address_, {24});
@@ -127,7 +132,12 @@ void SignInPage::refreshed() {
 
 void SignInPage::resizeEvent(QResizeEvent* event) {
     const int top = width() >= kWideFrom ? static_cast<int>(height() * kWideTop) : kIconTop;
+    const bool isLow = height() < kLow;
     column().setAbove(icon_, top);
+    column().setAbove(title_, isLow ? kLowTop : kIconToTitle);
+    icon_->setVisible(!isLow);
+    // In the place of the line, whoever was signed in before reads why they are asked.
+    line_->setVisible(height() >= kVeryLow || isAgain_);
     ColumnPage::resizeEvent(event);
 }
 

@@ -95,6 +95,19 @@ TEST_F(KTRSignInPageTest, EmptyPage_IsNotReadyAndBeginsInTheFirstEmptyField) {
     EXPECT_EQ(page->secret().edit().echoMode(), QLineEdit::Password);
 }
 
+TEST_F(KTRSignInPageTest, LowWindow_ShowsTheFieldThatHasTheFocus_Whole) {
+    for (const QSize& shape : {QSize(320, 200), QSize(400, 240), QSize(900, 200), QSize(320, 300), QSize(320, 419)}) {
+        for (const char* language : {"en-GB", "de", "ar", "ja"}) {
+            const std::string name =
+                std::string(language) + "-" + std::to_string(shape.width()) + "x" + std::to_string(shape.height());
+            open(language, ContentSizeCategory::L, {}, shape);
+            keep(("low-" + name).c_str());
+            const QLineEdit& edit = page->address().edit();
+            EXPECT_EQ(edit.visibleRegion().boundingRect(), edit.rect()) << name;
+        }
+    }
+}
+
 TEST_F(KTRSignInPageTest, WhoWasSignedInBefore_IsFilledInAndOnlyThenItSaysAgain) {
     open("en-GB", ContentSizeCategory::L, {"brin.example", "mara"});
     EXPECT_EQ(page->address().text(), QStringLiteral("brin.example"));
