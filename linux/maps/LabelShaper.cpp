@@ -8,6 +8,7 @@
 
 #include "linux/maps/LabelHalo.h"
 #include "linux/paint/FontChoice.h"
+#include "linux/paint/OpenedFont.h"
 #include "platform/ui/Font.h"
 
 namespace ktr::linux_ {
@@ -69,12 +70,6 @@ QList<QTextLayout::FormatRange> formats(const QString& text, bool isBold, const 
         ranges.append(range);
     }
     return ranges;
-}
-
-/// Whether the font's file could be opened: in place of any other the library has one of boxes, which has no name, and
-/// being asked for that ends the process with a signal. Each file has this table (OpenType, "head").
-bool isOpened(const QRawFont& font) {
-    return font.isValid() && !font.fontTable("head").isEmpty();
 }
 
 }  // namespace

@@ -9,6 +9,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include "linux/paint/OpenedFont.h"
+
 namespace ktr::linux_ {
 
 namespace {
@@ -63,10 +65,8 @@ QRawFont fontThatQtTakes(const FontSpec& spec, char16_t sample) {
     layout.createLine().setLineWidth(spec.pixelSize * 4.0);
     layout.endLayout();
     const auto runs = layout.lineAt(0).glyphRuns();
-    if (runs.size() != 1 || runs.front().rawFont().familyName() != spec.family) {
-        return {};
-    }
-    return runs.front().rawFont();
+    const QRawFont taken = runs.size() == 1 ? runs.front().rawFont() : QRawFont();
+    return isOpened(taken) && taken.familyName() == spec.family ? taken : QRawFont();
 }
 
 /// The fonts that were asked for, and the files' tables, which do not depend on the size.

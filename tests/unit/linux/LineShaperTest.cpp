@@ -3,6 +3,7 @@
 
 #include <random>
 
+#include "tests/support/NoMoreFiles.h"
 #include "tests/unit/linux/LabelsBesideQt.h"
 
 namespace ktr::linux_ {
@@ -125,6 +126,15 @@ TEST_F(LineShaperTest, NewNumbersBesideAnyScript_AreSetWithoutQtsLayout) {
     setBeside(200);
     EXPECT_EQ(shaper_.shapedWords(), words + names.size()) << "the numbers alone are new";
     EXPECT_EQ(shaper_.wordsShapedByQt(), before);
+}
+
+// Its library gives one of boxes then, which ends the program when it is asked for its name.
+TEST_F(LineShaperTest, FontThatCannotBeOpened_IsLeftToQt) {
+    if (!test::NoMoreFiles::kIsPossible) {
+        GTEST_SKIP() << "not under this sanitizer";
+    }
+    const test::NoMoreFiles none;
+    EXPECT_FALSE(shaped({"ليلى"})) << "a font that no other test has opened before";
 }
 
 // What was asked for lately stays; all else goes.
