@@ -68,6 +68,11 @@ std::variant<std::vector<host::Scenario>, host::Failure> readScenarios(const Opt
 linux_::Configuration configurationOf(const std::filesystem::path& file) {
     documents::DocumentWarnings warnings;
     auto read = linux_::ConfigurationReader::readFile(file, &warnings);
+    if (std::holds_alternative<linux_::ConfigurationReader::Error>(read)) {
+        // The account is read later: where a disk failed but once, it would be asked for friends whom nobody knows.
+        warnings = {};
+        read = linux_::ConfigurationReader::readFile(file, &warnings);
+    }
     tell(warnings);
     auto* configuration = std::get_if<linux_::Configuration>(&read);
     return configuration == nullptr ? linux_::Configuration() : std::move(*configuration);
