@@ -107,7 +107,8 @@ class FileWatch::Events {
         if (descriptor_ < 0) {
             return addToLookedAt(path);
         }
-        const int watch = inotify_add_watch(descriptor_, path.c_str(), what);
+        // A folder that is followed for what is in it may be one of the files as well: neither takes the other's place.
+        const int watch = inotify_add_watch(descriptor_, path.c_str(), what | IN_MASK_ADD);
         if (watch >= 0) {
             // The system gives each another number, and the same one twice the same.
             return known_.insert(watch).second;

@@ -23,10 +23,12 @@ class FolderGround::Follower : public QObject {
     }
 
   private:
-    /// The folder may come later, and so may those that it stands in.
+    /// The folder may come later, and so may those that it stands in: what came into a new one before it was watched
+    /// is to be watched too.
     void follow() {
         const auto above = folder_.parent_path();
-        watch_.watch({folder_ / "maps", folder_, above, above.parent_path()}, [this](bool) { look(); });
+        watch_.watch({folder_ / "maps", folder_, above, above.parent_path()},
+                     [this](bool isFolderNew) { isFolderNew ? follow() : look(); });
     }
     /// What else changes beside the folder draws nothing anew.
     void look() {
