@@ -23,7 +23,7 @@ constexpr int kBetweenQuestions = 10;
 constexpr int kLeastTop = 60;
 constexpr double kMiddle = 0.45;  ///< of the height, where the block's own middle stands
 constexpr int kLow = 420;         ///< no icon and no line below it
-constexpr int kVeryLow = 300;     ///< two questions
+constexpr int kVeryLow = 300;     ///< two questions at most
 constexpr int kNoon = 12;
 constexpr int kEvening = 18;
 
@@ -90,17 +90,30 @@ void Greeting::place() {
     const int across = isWide ? static_cast<int>(columns.cardWidth) : width() - 2 * kGutter;
     const int textStart = start + kTextInset - kGutter;
     const int textAcross = across - 2 * (kTextInset - kGutter);
-    const bool isLow = window()->height() < kLow;
-    icon_->setVisible(!isLow);
-    line_->setVisible(!isLow);
-    for (std::size_t i = 2; i < questions_.size(); ++i) {
-        questions_[i]->setVisible(window()->height() >= kVeryLow);
-    }
     const int title = title_->shapeHeight(textAcross);
     const int line = line_->shapeHeight(textAcross);
+    const bool isLowWindow = window()->height() < kLow;
+    const int toQuestions = isLowWindow ? kLowToQuestions : kToQuestions;
+    const auto heightOf = [&](bool isWhole, std::size_t questions) {
+        int all = (isWhole ? kIconSide + kIconToTitle + kTitleToLine + line : 0) + title + toQuestions;
+        for (std::size_t i = 0; i < questions; ++i) {
+            all += (i > 0 ? kBetweenQuestions : 0) + questions_[i]->shapeHeight(across);
+        }
+        return all;
+    };
+    std::size_t shown = window()->height() < kVeryLow ? std::min<std::size_t>(questions_.size(), 2) : questions_.size();
+    const bool isLow = isLowWindow || heightOf(true, shown) > height();
+    // Nothing is cut by the field: there are fewer questions then.
+    while (shown > 1 && heightOf(!isLow, shown) > height()) {
+        --shown;
+    }
+    icon_->setVisible(!isLow);
+    line_->setVisible(!isLow);
+    for (std::size_t i = 0; i < questions_.size(); ++i) {
+        questions_[i]->setVisible(i < shown);
+    }
     const int questions = flow_->shapeHeight(across);
-    const int toQuestions = isLow ? kLowToQuestions : kToQuestions;
-    const int all = (isLow ? 0 : kIconSide + kIconToTitle + kTitleToLine + line) + title + toQuestions + questions;
+    const int all = heightOf(!isLow, shown);
     const int middle = static_cast<int>(height() * kMiddle) - all / 2;
     // Where it does not fit in the middle it ends at the lower edge, or begins at the upper one.
     int y = std::max(std::min(std::max(middle, isLow ? 0 : kLeastTop), height() - all), 0);

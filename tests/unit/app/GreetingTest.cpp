@@ -102,4 +102,38 @@ TEST_F(KTRGreetingTest, EveryWindow_HasRoomForWhatItShows) {
     }
 }
 
+// The field takes its part of the window: what has no room above it is left out, and never cut.
+TEST_F(KTRGreetingTest, AboveAField_NothingIsCut) {
+    // With the status line below it, which low windows have not.
+    const auto ofField = [](const QSize& window) { return window.height() < 240 ? 73 : 98; };
+    for (const char* language : {"en-GB", "de", "ar", "ja"}) {
+        for (const QSize size : {QSize(320, 200), QSize(400, 240), QSize(900, 200), QSize(320, 300), QSize(320, 420),
+                                 QSize(320, 480), QSize(900, 420)}) {
+            const std::string name =
+                std::string(language) + " " + std::to_string(size.width()) + " x " + std::to_string(size.height());
+            open(language, size);
+            QWidget window;
+            window.resize(size);
+            greeting->setParent(&window);
+            greeting->setGeometry(0, 0, size.width(), size.height() - ofField(size));
+            greeting->show();
+            window.show();
+            QApplication::processEvents();
+            int questions = 0;
+            for (const QWidget* part : greeting->findChildren<QWidget*>()) {
+                const bool isQuestion = dynamic_cast<const UnaskedQuestion*>(part) != nullptr;
+                if (part->isVisible() && (isQuestion || !part->accessibleName().isEmpty())) {
+                    questions += isQuestion ? 1 : 0;
+                    const QRect at(part->mapTo(greeting.get(), QPoint(0, 0)), part->size());
+                    EXPECT_TRUE(greeting->rect().adjusted(-6, -6, 6, 6).contains(at))
+                        << name << ": " << part->accessibleName().toStdString() << ' ' << at.y() << ' ' << at.height();
+                }
+            }
+            EXPECT_GE(questions, 1) << name;
+            EXPECT_TRUE(size.height() < 420 || questions == 3) << name << " has room for all: " << questions;
+            greeting->setParent(nullptr);
+        }
+    }
+}
+
 }  // namespace ktr::app
