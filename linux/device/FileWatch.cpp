@@ -22,7 +22,9 @@ namespace ktr::linux_ {
 namespace {
 
 // Editors replace files: the folders tell of the new file, the files of changes in place.
+// A folder among the files is followed for whether it is there: what is written in it is another's matter.
 constexpr std::uint32_t kOfFile = IN_MODIFY | IN_ATTRIB | IN_MOVE_SELF | IN_DELETE_SELF;
+constexpr std::uint32_t kOfFolderItself = IN_MOVE_SELF | IN_DELETE_SELF | IN_ONLYDIR;
 constexpr std::uint32_t kOfFolder = IN_CREATE | IN_DELETE | IN_MOVE | IN_DELETE_SELF | IN_MOVE_SELF | IN_ONLYDIR;
 
 void warn(const char* what, int number) {
@@ -67,7 +69,8 @@ class FileWatch::Events {
         const std::lock_guard<std::mutex> lock(mutex_);
         bool isFolderNew = false;
         for (const std::filesystem::path& file : files) {
-            add(file, kOfFile);
+            std::error_code failed;
+            add(file, std::filesystem::is_directory(file, failed) ? kOfFolderItself : kOfFile);
             isFolderNew = add(file.parent_path(), kOfFolder) || isFolderNew;
         }
         return isFolderNew;

@@ -98,6 +98,23 @@ TEST_P(FileWatchTest, FolderThatIsNotThere_IsNewOnceItIs) {
     EXPECT_FALSE(watch({file}));
 }
 
+// Programs write all the time into the folders that maps' folder stands in.
+TEST_P(FileWatchTest, FolderAmongTheFiles_IsNotFollowedForWhatIsWrittenInIt) {
+    if (GetParam() == System::HasNoneLeft) {
+        GTEST_SKIP() << "what is looked at every so often wakes nobody";
+    }
+    std::filesystem::create_directory(folder.path() / "data");
+    folder.write("data/one", "1");
+    watch({folder.path() / "data"});
+    settle();
+    changes = 0;
+    append(folder.path() / "data" / "one");
+    settle();
+    EXPECT_EQ(changes, 0);
+    std::filesystem::rename(folder.path() / "data", folder.path() / "gone");
+    EXPECT_TRUE(comes([this] { return changes > 0; }));
+}
+
 TEST_P(FileWatchTest, WhoHasGone_IsToldNothing) {
     auto mine = made();
     bool isTold = false;
