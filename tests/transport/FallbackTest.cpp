@@ -1,4 +1,7 @@
 // The host that takes a command when the one it was meant for cannot be reached; and what the log says of trouble.
+#include <QHostAddress>
+#include <QTcpSocket>
+
 #include "tests/transport/TransportTest.h"
 
 namespace ktr::test {
@@ -7,6 +10,16 @@ namespace {
 using platform::HttpAnswer;
 using platform::HttpFailure;
 using platform::LogLevel;
+
+/// A port that nobody listens at, and that nobody else gets meanwhile.
+class ClosedPort {
+  public:
+    ClosedPort() { EXPECT_TRUE(socket_.bind(QHostAddress::LocalHost)); }
+    std::string address() const { return "127.0.0.1:" + std::to_string(socket_.localPort()); }
+
+  private:
+    QTcpSocket socket_;
+};
 
 class FallbackTest : public TransportTest {
   protected:
@@ -27,8 +40,8 @@ TEST_F(FallbackTest, HostThatCannotBeAsked_TheSameCommandGoesOn) {
     TestServer broken(options, gladly());
     TestServer foreign(tls("foreign"), gladly());
     TestServer silent(TestServer::Options{}, nullptr);
-    std::string closed;
-    { closed = addressOf(TestServer(tls(), gladly())); }
+    const ClosedPort port;
+    const std::string closed = port.address();
     for (const std::string& host :
          {std::string("nobody.invalid"), closed, addressOf(broken), addressOf(foreign), addressOf(silent)}) {
         serve(gladly());
@@ -87,11 +100,12 @@ TEST_F(FallbackTest, OnceAByteHasLeft_NobodyElseIsAsked) {
 }
 
 TEST_F(FallbackTest, NeitherIsThere) {
-    std::string closed;
-    { closed = addressOf(TestServer(tls(), gladly())); }
+    const ClosedPort first;
+    const ClosedPort second;
     serve(gladly());
-    auto one = requestFor(closed);
-    server.reset();
+    auto one = requestFor(first.address());
+    settings.serviceHost = second.address();
+    one.fallbackHost = second.address();
     const HttpAnswer answer = ask(one);
     EXPECT_EQ(answer.failure, HttpFailure::Network);
     EXPECT_TRUE(answer.fromFallback);

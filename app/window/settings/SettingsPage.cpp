@@ -257,6 +257,7 @@ void SettingsPage::stepTextSize(int by) {
 void SettingsPage::chooseColors() {
     const auto offer = [this] {
         std::vector<ChoicePage::Choice> choices;
+        choices.reserve(kColorKeys.size());
         for (const char* key : kColorKeys) {
             choices.push_back({text(key)});
         }
@@ -273,6 +274,7 @@ void SettingsPage::chooseColors() {
 void SettingsPage::chooseDistances() {
     const auto offer = [this] {
         std::vector<ChoicePage::Choice> choices;
+        choices.reserve(kDistanceKeys.size());
         for (const char* key : kDistanceKeys) {
             choices.push_back({text(key)});
         }
