@@ -231,7 +231,7 @@ void QtCanvas::draw(const platform::Image& image, const platform::Rect& rect) {
 
 void QtCanvas::drawMoving(const platform::Image& image, const platform::Rect& rect) {
     if (const auto* picture = dynamic_cast<const QtImage*>(&image); picture != nullptr && rect.width > 0.0) {
-        picture->draw(painter_, {rect.x, rect.y, rect.width, rect.height}, palette_);
+        picture->drawMoving(painter_, {rect.x, rect.y, rect.width, rect.height}, palette_);
     }
 }
 

@@ -23,4 +23,11 @@ void RasterImage::draw(QPainter& painter, const QRectF& rect, const Palette& /*p
     painter.restore();
 }
 
+void RasterImage::drawMoving(QPainter& painter, const QRectF& rect, const Palette& /*palette*/) const {
+    painter.save();
+    painter.setRenderHint(QPainter::SmoothPixmapTransform);
+    painter.drawImage(rect, pixels_);
+    painter.restore();
+}
+
 }  // namespace ktr::linux_

@@ -14,6 +14,7 @@ class RasterImage final : public QtImage {
 
     platform::Size size() const override { return size_; }
     void draw(QPainter& painter, const QRectF& rect, const Palette& palette) const override;
+    void drawMoving(QPainter& painter, const QRectF& rect, const Palette& palette) const override;
 
   private:
     QImage pixels_;

@@ -5,6 +5,9 @@
 #include <QImage>
 #include <QPainter>
 
+#include "linux/paint/QtImage.h"
+#include "linux/paint/RasterImage.h"
+
 namespace ktr::linux_ {
 
 using platform::Color;
@@ -33,6 +36,19 @@ class QtCanvasTest : public ::testing::TestWithParam<double> {
         }
         return rows;
     }
+
+    /// Notes how it is drawn.
+    struct Noting : QtImage {
+        platform::Size size() const override { return {10.0, 10.0}; }
+        void draw(QPainter& /*painter*/, const QRectF& /*rect*/, const Palette& /*palette*/) const override {
+            ++stills;
+        }
+        void drawMoving(QPainter& /*painter*/, const QRectF& /*rect*/, const Palette& /*palette*/) const override {
+            ++frames;
+        }
+        mutable int stills = 0;
+        mutable int frames = 0;
+    };
 
     QImage image_{60, 400, QImage::Format_ARGB32_Premultiplied};
     QPainter painter_;
@@ -95,6 +111,23 @@ TEST_P(QtCanvasTest, Clip_LimitsWhatIsPaintedUntilRestored) {
 
 TEST_P(QtCanvasTest, Pixel_IsADevicePixel) {
     EXPECT_DOUBLE_EQ(canvas_.pixel(), 1.0 / GetParam());
+}
+
+// A map that is zoomed has another size in each frame: scaling all of it for each took longer than a frame.
+TEST_P(QtCanvasTest, MovingPicture_IsDrawnForThisFrameAlone) {
+    const Noting image;
+    canvas_.drawMoving(image, {0.0, 0.0, 20.0, 20.0});
+    EXPECT_EQ(image.frames, 1);
+    EXPECT_EQ(image.stills, 0);
+}
+
+TEST_P(QtCanvasTest, MovingPixels_FillTheirPlace) {
+    QImage pixels(100, 100, QImage::Format_ARGB32_Premultiplied);
+    pixels.fill(Qt::black);
+    canvas_.drawMoving(RasterImage(pixels, {100.0, 100.0}), {0.0, 4.0, 20.0, 20.0});
+    const auto rows = paintedRows();
+    ASSERT_EQ(rows.size(), static_cast<std::size_t>(20.0 * GetParam()));
+    EXPECT_EQ(rows.front(), static_cast<int>(4.0 * GetParam()));
 }
 
 INSTANTIATE_TEST_SUITE_P(Scales, QtCanvasTest, ::testing::Values(1.0, 1.5, 2.0, 3.0));
