@@ -28,7 +28,8 @@ constexpr std::uint32_t kOfFolderItself = IN_MOVE_SELF | IN_DELETE_SELF | IN_ONL
 constexpr std::uint32_t kOfFolder = IN_CREATE | IN_DELETE | IN_MOVE | IN_DELETE_SELF | IN_MOVE_SELF | IN_ONLYDIR;
 
 void warn(const char* what, int number) {
-    platform::platformLog().write(platform::LogLevel::Error, "files are looked at now and then, not followed: %@: %@",
+    // Nobody misses anything: what changes is noticed some seconds later.
+    platform::platformLog().write(platform::LogLevel::Info, "files are looked at now and then, not followed: %@: %@",
                                   platform::FormatArgument(std::string(what)),
                                   platform::FormatArgument(std::generic_category().message(number)));
 }
