@@ -2,11 +2,15 @@
 #include "app/window/WindowSight.h"
 
 #include <gtest/gtest.h>
+#include <sys/inotify.h>
+#include <unistd.h>
 
 #include <QApplication>
 #include <QLineEdit>
 #include <QTemporaryDir>
 #include <QWidget>
+#include <algorithm>
+#include <array>
 #include <fstream>
 #include <memory>
 
@@ -88,6 +92,15 @@ TEST_F(CaretRestTest, End_GivesTheDesktopsTimeBack) {
 }
 
 /// The live window with an account whose service nobody asks: what is on screen asks nothing by itself.
+/// Whether the system has watches to give, for each of those that follow files.
+static bool hasWatches() {
+    std::array<int, 8> descriptors{};
+    std::generate(descriptors.begin(), descriptors.end(), [] { return inotify_init1(IN_CLOEXEC); });
+    const bool all = std::find(descriptors.begin(), descriptors.end(), -1) == descriptors.end();
+    std::for_each(descriptors.begin(), descriptors.end(), [](int descriptor) { ::close(descriptor); });
+    return all;
+}
+
 class IdleWindowTest : public ::testing::Test {
   protected:
     IdleWindowTest() : state("XDG_STATE_HOME", folder.filePath(QStringLiteral("state")).toUtf8().constData()) {
@@ -116,6 +129,9 @@ class IdleWindowTest : public ::testing::Test {
 };
 
 TEST_F(IdleWindowTest, WindowThatNobodyUses_DoesNotWake) {
+    if (!hasWatches()) {
+        GTEST_SKIP() << "other programs have used up the system's watches: files are looked at every few seconds";
+    }
     EXPECT_TRUE(eventually([&] { return !window->status()->words().isEmpty(); })) << "the account is read";
     EXPECT_TRUE(eventually([] { return QApplication::cursorFlashTime() == 0; })) << "the caret rests";
     wakesIn(1000);
