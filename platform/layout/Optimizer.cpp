@@ -151,8 +151,7 @@ bool Optimizer::spendStep(double distance) {
     return --steps_ > 0;
 }
 
-// --- one constraint at a time
-// -----------------------------------------------------------------------------------------
+// One constraint at a time
 
 void Optimizer::require(int e) {
     approach(e);
@@ -307,8 +306,7 @@ void Optimizer::settleVariable(int e) {
     }
 }
 
-// --- one level's sum of errors
-// ----------------------------------------------------------------------------------------
+// One level's sum of errors
 
 void Optimizer::level(std::size_t begin, std::size_t end) {
     const std::vector<int>& order = state_.problem->order;
