@@ -27,7 +27,7 @@ constexpr std::uint32_t kOfFile = IN_MODIFY | IN_ATTRIB | IN_MOVE_SELF | IN_DELE
 constexpr std::uint32_t kOfFolderItself = IN_MOVE_SELF | IN_DELETE_SELF | IN_ONLYDIR;
 constexpr std::uint32_t kOfFolder = IN_CREATE | IN_DELETE | IN_MOVE | IN_DELETE_SELF | IN_MOVE_SELF | IN_ONLYDIR;
 
-void warn(const char* what, int number) {
+void note(const char* what, int number) {
     // Nobody misses anything: what changes is noticed some seconds later.
     platform::platformLog().write(platform::LogLevel::Info, "files are looked at now and then, not followed: %@: %@",
                                   platform::FormatArgument(std::string(what)),
@@ -53,7 +53,7 @@ class FileWatch::Events {
   public:
     Events() : descriptor_(inotify_init1(IN_NONBLOCK | IN_CLOEXEC)) {
         if (descriptor_ < 0) {
-            warn("inotify", errno);
+            note("inotify", errno);
         }
     }
     ~Events() {
@@ -121,7 +121,7 @@ class FileWatch::Events {
             return false;
         }
         if (lookedAt_.empty()) {
-            warn(path.c_str(), ENOSPC);
+            note(path.c_str(), ENOSPC);
         }
         return addToLookedAt(path);
     }
